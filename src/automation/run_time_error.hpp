@@ -1,0 +1,65 @@
+#pragma once
+
+#include <cstdint>
+#include <exception>
+#include <string_view>
+
+#include "automation/text.hpp"
+
+namespace talutil {
+
+/// The standard run-time errors that hosts know by number. The texts are those that hosts show.
+enum class ErrorNumber : std::int32_t {
+  invalid_procedure_call = 5,
+  overflow = 6,
+  out_of_memory = 7,
+  subscript_out_of_range = 9,
+  array_fixed_or_locked = 10,
+  division_by_zero = 11,
+  type_mismatch = 13,
+  internal_error = 51,
+  bad_file_name_or_number = 52,
+  file_not_found = 53,
+  file_already_open = 55,
+  device_io_error = 57,
+  file_already_exists = 58,
+  disk_full = 61,
+  input_past_end_of_file = 62,
+  too_many_files = 67,
+  permission_denied = 70,
+  disk_not_ready = 71,
+  path_file_access = 75,
+  path_not_found = 76,
+  object_variable_not_set = 91,
+  invalid_use_of_null = 94,
+  object_required = 424,
+  cannot_create_object = 429,
+  member_not_supported = 438,
+  action_not_supported = 445,
+  named_argument_not_found = 448,
+  argument_not_optional = 449,
+  wrong_argument_count = 450,
+};
+
+/// The standard text of a number; the text of an unknown number is "Application-defined or object-defined error".
+[[nodiscard]] std::string_view standard_description(std::int32_t number) noexcept;
+
+/// The one exception of the library: what a host sees as Err.Number and Err.Description.
+class RunTimeError : public std::exception {
+ public:
+  explicit RunTimeError(ErrorNumber number);
+  RunTimeError(std::int32_t number, Text description);
+
+  [[nodiscard]] std::int32_t number() const noexcept { return number_; }
+  [[nodiscard]] const Text& description() const noexcept { return description_; }
+  [[nodiscard]] const char* what() const noexcept override { return narrow_.c_str(); }
+
+ private:
+  std::int32_t number_;
+  Text description_;
+  std::string narrow_;
+};
+
+[[noreturn]] void raise(ErrorNumber number);
+
+}  // namespace talutil

@@ -1,0 +1,42 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+namespace talutil {
+
+/// Counted UTF-16 text, the wide string of automation. Empty and missing are the same.
+using Text = std::u16string;
+using TextView = std::u16string_view;
+
+/// Removes blanks (code 32) at both ends. Tabs, line breaks and no-break blanks stay, as in the hosts' Trim.
+[[nodiscard]] TextView trim_blanks(TextView text) noexcept;
+
+/// The code that the platform's Asc primitive gives for one code unit: its byte in code page 1252 (0 to
+/// 255), with the code page's best fit for characters it does not hold (U+0100 counts as "A") and 63, the
+/// question mark, where there is none. Source: the platform's own conversion, see ansi_code_page.cpp.
+[[nodiscard]] std::uint8_t ansi_code(char16_t unit) noexcept;
+
+/// The code of the first character, as Asc gives it. Raises 5 for an empty text.
+[[nodiscard]] std::int16_t asc(TextView text);
+
+/// The one-character text of a code of code page 1252, 0 to 255. Raises 5 outside that range.
+[[nodiscard]] Text chr(std::int32_t code);
+
+/// The bytes of a text in code page 1252, and back. Every code unit becomes one byte.
+[[nodiscard]] std::string to_ansi(TextView text);
+[[nodiscard]] Text from_ansi(std::string_view bytes);
+
+/// Upper and lower case, code unit by code unit, by the platform's own table (no locale, no one-to-many
+/// mappings: the sharp s stays). Source: see letter_case.cpp.
+[[nodiscard]] char16_t upper_case(char16_t unit) noexcept;
+[[nodiscard]] char16_t lower_case(char16_t unit) noexcept;
+[[nodiscard]] Text upper_case(TextView text);
+[[nodiscard]] Text lower_case(TextView text);
+
+/// UTF-8 for the command line, logs and messages of our own. Lone surrogates and bad bytes become U+FFFD.
+[[nodiscard]] std::string to_utf8(TextView text);
+[[nodiscard]] Text from_utf8(std::string_view bytes);
+
+}  // namespace talutil

@@ -1,0 +1,165 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <variant>
+#include <vector>
+
+#include "automation/boolean.hpp"
+#include "automation/date.hpp"
+#include "automation/locale.hpp"
+#include "automation/numbers.hpp"
+#include "automation/object.hpp"
+#include "automation/text.hpp"
+
+namespace talutil {
+
+/// A one-dimensional array of texts with its lower bound. An array that was never allocated has no bounds,
+/// which is not the same as one with no elements.
+struct TextArray {
+  std::vector<Text> items;
+  std::int32_t lower_bound = 0;
+  bool allocated = false;
+
+  /// The highest index. Raises 9 for an unallocated array.
+  [[nodiscard]] std::int32_t upper_bound() const;
+
+  /// The element at an index. Raises 9 outside the bounds.
+  [[nodiscard]] const Text& at(std::int32_t index) const;
+
+  friend bool operator==(const TextArray&, const TextArray&) = default;
+};
+
+struct Null {
+  friend constexpr bool operator==(Null, Null) noexcept = default;
+};
+
+/// An error value; an argument that a caller left out is one too.
+struct ErrorValue {
+  std::int32_t code = 0;
+  friend constexpr bool operator==(ErrorValue, ErrorValue) noexcept = default;
+};
+
+/// An array that is not one of texts. It can be carried, but nothing converts it.
+struct ForeignArray {
+  friend constexpr bool operator==(ForeignArray, ForeignArray) noexcept = default;
+};
+
+/// The automation variant as a value. Conversions follow automation's rules: halves round to even, out of
+/// range is error 6, unconvertible 13, Null 94, an empty object reference 91. An object stands for the value
+/// of its default member.
+class Variant {
+ public:
+  enum class Kind : std::uint8_t {
+    empty, null, boolean, byte, int16, int32, single, double_, currency, date, text, error, text_array,
+    foreign_array, object
+  };
+
+  Variant() noexcept = default;
+  Variant(Null value) noexcept : storage_(value) {}
+  Variant(Boolean value) noexcept : storage_(value) {}
+  Variant(std::uint8_t value) noexcept : storage_(value) {}
+  Variant(std::int16_t value) noexcept : storage_(value) {}
+  Variant(std::int32_t value) noexcept : storage_(value) {}
+  Variant(float value) noexcept : storage_(value) {}
+  Variant(double value) noexcept : storage_(value) {}
+  Variant(Currency value) noexcept : storage_(value) {}
+  Variant(Date value) noexcept : storage_(value) {}
+  Variant(Text value) noexcept : storage_(std::move(value)) {}
+  Variant(TextView value) : storage_(Text(value)) {}
+  Variant(const char16_t* value) : storage_(Text(value)) {}
+  Variant(ErrorValue value) noexcept : storage_(value) {}
+  Variant(TextArray value) noexcept : storage_(std::move(value)) {}
+  Variant(ForeignArray value) noexcept : storage_(value) {}
+  Variant(ObjectRef value) noexcept : storage_(std::move(value)) {}
+  Variant(bool) = delete;
+  Variant(const void*) = delete;
+
+  [[nodiscard]] Kind kind() const noexcept { return static_cast<Kind>(storage_.index()); }
+  [[nodiscard]] bool is(Kind wanted) const noexcept { return kind() == wanted; }
+
+  template <class T>
+  [[nodiscard]] const T* get_if() const noexcept { return std::get_if<T>(&storage_); }
+  template <class T>
+  [[nodiscard]] T* get_if() noexcept { return std::get_if<T>(&storage_); }
+
+  /// The value itself, or that of an object's default member (through several objects if need be). Raises 91
+  /// for an empty object reference and 438 for an object without a default member.
+  [[nodiscard]] Variant value() const;
+
+  [[nodiscard]] Text to_text(const Locale& locale = {}) const;
+  [[nodiscard]] std::int16_t to_int16(const Locale& locale = {}) const;
+  [[nodiscard]] std::int32_t to_int32(const Locale& locale = {}) const;
+  [[nodiscard]] float to_single(const Locale& locale = {}) const;
+  [[nodiscard]] double to_double(const Locale& locale = {}) const;
+  [[nodiscard]] Currency to_currency(const Locale& locale = {}) const;
+  [[nodiscard]] Boolean to_boolean(const Locale& locale = {}) const;
+
+  /// Text is read day first. Numbers are days.
+  [[nodiscard]] Date to_date(const Locale& locale = {}) const;
+
+  /// True for a date and for a text that reads as one; never for a number, Null or Empty.
+  [[nodiscard]] bool is_date(const Locale& locale = {}) const;
+
+  /// True for Null itself (an object answers for its default member).
+  [[nodiscard]] bool is_null() const;
+
+  /// Compares with a text, code by code, as hosts compare a variant with a text: every kind is converted to
+  /// text first, Empty equals the empty text, Null equals nothing. Raises 13 for an error value or an array.
+  [[nodiscard]] bool equals_text(TextView text, const Locale& locale = {}) const;
+
+  /// Same kind and same value; objects by identity.
+  friend bool operator==(const Variant&, const Variant&) = default;
+
+ private:
+  // In the order of Kind.
+  std::variant<std::monostate, Null, Boolean, std::uint8_t, std::int16_t, std::int32_t, float, double, Currency, Date,
+               Text, ErrorValue, TextArray, ForeignArray, ObjectRef>
+      storage_;
+};
+
+/// The error value that stands for an argument left out.
+inline constexpr ErrorValue missing_argument{static_cast<std::int32_t>(0x80020004U)};
+
+/// A late-bound object as members use it: `grid.get<std::int32_t>(u"Rows")`, `grid.put(u"ColWidth", {c}, width)`.
+/// One read a statement: the host's control sees the order.
+class Control {
+ public:
+  /// Raises 424 for a variant that holds no object, 91 for an empty reference.
+  explicit Control(const Variant& holder);
+  explicit Control(ObjectRef object);
+
+  template <class T = Variant>
+  [[nodiscard]] T get(TextView member, std::initializer_list<Variant> indexes = {}) const;
+  template <class T = Variant>
+  [[nodiscard]] T get(std::int32_t member, std::initializer_list<Variant> indexes = {}) const;
+
+  void put(TextView member, const Variant& value) const { put(member, {}, value); }
+  void put(TextView member, std::initializer_list<Variant> indexes, const Variant& value) const;
+  void put(std::int32_t member, const Variant& value) const;
+  Variant call(TextView member, std::initializer_list<Variant> arguments = {}) const;
+
+  [[nodiscard]] const ObjectRef& object() const noexcept { return object_; }
+
+ private:
+  ObjectRef object_;
+};
+
+template <>
+Variant Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
+template <>
+Text Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
+template <>
+std::int16_t Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
+template <>
+std::int32_t Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
+template <>
+double Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
+
+template <class T>
+T Control::get(TextView member, std::initializer_list<Variant> indexes) const {
+  return get<T>(object_->member_id(member), indexes);
+}
+
+}  // namespace talutil

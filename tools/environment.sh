@@ -1,0 +1,143 @@
+# What ./test, ./demo and ./bench share: the packages, the Wine root and how to run things in it.
+# Sourced by bash scripts that have set -euo pipefail; needs a Debian 12 machine and, only while
+# something is missing, root rights and the machine's own package mirror.
+
+talutil_top=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)
+talutil_build=${TALUTIL_BUILD:-$talutil_top/build}
+talutil_cache=${XDG_CACHE_HOME:-$HOME/.cache}/talutil
+
+native_packages="build-essential cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev"
+windows_packages="binutils debootstrap debian-archive-keyring g++-mingw-w64-i686-posix mingw-w64-tools xvfb xauth"
+
+fail() {
+  printf '%s: %s\n' "$(basename "$0")" "$*" >&2
+  exit 1
+}
+
+say() { printf '== %s\n' "$*"; }
+
+# Installs those of the named packages that the machine lacks.
+need_packages() {
+  local missing=() package
+  for package in "$@"; do
+    [ "$(dpkg-query -W -f '${db:Status-Status}' "$package" 2>/dev/null)" = installed ] || missing+=("$package")
+  done
+  [ ${#missing[@]} -gt 0 ] || return 0
+  [ "$(id -u)" = 0 ] || fail "missing packages: ${missing[*]}; install them or run as root"
+  say "installing ${missing[*]}"
+  apt-get update -qq
+  DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null ||
+    fail "could not install: ${missing[*]}"
+}
+
+# The Wine root: a small i386 Debian of its own, because 32-bit Wine cannot stand beside the 64-bit
+# packages. Its folder is named by a hash of the recipe, so every checkout on the machine shares it and
+# a changed recipe makes a new one. The folder appears under its name only when it is complete.
+wine_root_suite=bookworm
+wine_root_include=wine32,libgnutls30,fonts-liberation,fonts-dejavu-core
+wine_root_recipe="$wine_root_suite i386 minbase $wine_root_include 1"
+wine_root=$talutil_cache/wine-$(printf %s "$wine_root_recipe" | sha256sum | cut -c1-12)
+
+# The mirror that the machine itself installs the named suite of Debian from.
+debian_mirror() {
+  apt-get indextargets --format '$(REPO_URI) $(RELEASE)' 'Created-By: Packages' |
+    awk -v suite="$1" '$2 == suite && !found { found = 1; print $1 }'
+}
+
+# Some virtual machines refuse 32-bit programs. There the root runs under QEMU's user-mode emulator
+# (version 10 of the backports: version 7 hangs in Wine's services), registered with the kernel until
+# the next boot. Everything still passes, at about a fifth of the speed.
+runs_i386() {
+  local probe status=0
+  probe=$(mktemp -d)
+  printf '.globl _start\n_start: mov $1, %%eax\n xor %%ebx, %%ebx\n int $0x80\n' >"$probe/a.s"
+  { as --32 "$probe/a.s" -o "$probe/a.o" && ld -m elf_i386 "$probe/a.o" -o "$probe/a"; } || status=1
+  [ $status != 0 ] || "$probe/a" 2>/dev/null || status=1
+  rm -rf "$probe"
+  return $status
+}
+
+emulator_suite=bookworm-backports
+emulator=$talutil_cache/qemu-user-10/usr/bin/qemu-i386
+
+fetch_emulator() {
+  [ ! -x "$emulator" ] || return 0
+  local mirror work
+  mirror=$(debian_mirror "$wine_root_suite")
+  work=$(mktemp -d)
+  say "this machine runs no 32-bit programs: fetching the emulator (once)"
+  mkdir -p "$work/lists/partial" "$talutil_cache"
+  echo "deb [signed-by=/usr/share/keyrings/debian-archive-keyring.gpg] $mirror $emulator_suite main" >"$work/sources"
+  local options=(-qq -o "Dir::Etc::sourcelist=$work/sources" -o Dir::Etc::sourceparts=/dev/null
+    -o "Dir::State::lists=$work/lists" -o "Dir::Cache::pkgcache=" -o "Dir::Cache::srcpkgcache="
+    -o APT::Sandbox::User=root)
+  apt-get "${options[@]}" update && (cd "$work" && apt-get "${options[@]}" download qemu-user) &&
+    dpkg -x "$work"/qemu-user_*.deb "$work/unpacked" || fail "could not fetch qemu-user from $emulator_suite"
+  mv -T "$work/unpacked" "$talutil_cache/qemu-user-10" 2>/dev/null || true
+  rm -rf "$work"
+  [ -x "$emulator" ] || fail "$emulator is missing after unpacking qemu-user"
+}
+
+ensure_i386() {
+  runs_i386 && return 0
+  [ "$(id -u)" = 0 ] || fail "this machine runs no 32-bit programs, and registering the emulator needs root"
+  fetch_emulator
+  local registry=/proc/sys/fs/binfmt_misc
+  [ -e $registry/register ] || mount -t binfmt_misc binfmt_misc $registry
+  # The header of a 32-bit executable or shared object for the i386; F keeps the emulator open, so that
+  # it is found inside the root too.
+  printf '%s' ':talutil-i386:M::\x7fELF\x01\x01\x01\x00\x00\x00\x00\x00\x00\x00\x00\x00\x02\x00\x03\x00:\xff\xff\xff\xff\xff\xfe\xfe\x00\xff\xff\xff\xff\xff\xff\xff\xff\xfe\xff\xff\xff:'"$emulator"':F' \
+    >$registry/register
+  runs_i386 || fail "the emulator is registered but 32-bit programs still do not run"
+}
+
+make_wine_root() {
+  ensure_i386
+  [ ! -d "$wine_root" ] || return 0
+  [ "$(id -u)" = 0 ] || fail "no Wine root in $wine_root yet; making it needs root"
+  local mirror unfinished=$wine_root.$$
+  mirror=$(debian_mirror "$wine_root_suite")
+  [ -n "$mirror" ] || fail "apt knows no mirror for $wine_root_suite; the Wine root cannot be made"
+  say "making the Wine root (once, one to four minutes)"
+  mkdir -p "$talutil_cache"
+  debootstrap --arch=i386 --variant=minbase --include="$wine_root_include" \
+    "$wine_root_suite" "$unfinished" "$mirror" >"$unfinished.log" 2>&1 ||
+    { tail -5 "$unfinished.log" >&2; fail "debootstrap failed; its log is $unfinished.log"; }
+  mkdir -p "$unfinished/checkout" "$unfinished/build"
+  rm -f "$unfinished.log"
+  # Another run may have finished first; both made the same thing.
+  mv -T "$unfinished" "$wine_root" 2>/dev/null || rm -rf "$unfinished"
+}
+
+# Runs a command inside the Wine root, with the checkout under /checkout (Z:\checkout) and the build
+# folder under /build (Z:\build). Mounts live in a namespace of their own and end with the command.
+in_wine_root() {
+  mkdir -p "$talutil_build"
+  local limit=${WINE_TIMEOUT:-120}
+  # shellcheck disable=SC2016
+  timeout --kill-after=5 "$limit" unshare --mount bash -euc '
+    root=$1 top=$2 build=$3
+    shift 3
+    mount --bind "$top" "$root/checkout"
+    mount --bind "$build" "$root/build"
+    mount --rbind /dev "$root/dev"
+    mount -t proc proc "$root/proc"
+    exec chroot "$root" env -i HOME=/root USER=root PATH=/usr/bin:/bin:/usr/sbin:/sbin LANG=C.UTF-8 \
+      ${DISPLAY:+DISPLAY=$DISPLAY} WINEARCH=win32 WINEPREFIX=/build/wine-prefix WINEDEBUG=${WINEDEBUG:--all} \
+      WINEDLLOVERRIDES="winedbg.exe=d;mscoree=d;mshtml=d" "$@"
+  ' in_wine_root "$wine_root" "$talutil_top" "$talutil_build" "$@"
+}
+
+wine() { in_wine_root /usr/lib/wine/wine "$@"; }
+
+# Makes the prefix when it is missing and keeps the Wine server for a minute after the last program,
+# so that a script host starts in a fraction of a second.
+start_wine() {
+  make_wine_root
+  if [ ! -f "$talutil_build/wine-prefix/system.reg" ]; then
+    say "making the Wine prefix (once a build folder)"
+    WINE_TIMEOUT=180 wine wineboot --init >/dev/null 2>&1 || fail "wineboot failed in $wine_root"
+    in_wine_root /usr/lib/wine/wineserver32 -w || true
+  fi
+  in_wine_root /usr/lib/wine/wineserver32 -p60 2>/dev/null || true
+}
