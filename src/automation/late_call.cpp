@@ -1,0 +1,131 @@
+#include "automation/late_call.hpp"
+
+#include <algorithm>
+#include <vector>
+
+#include "automation/run_time_error.hpp"
+
+namespace talutil {
+
+template <>
+Boolean convert(const Variant& value, const Locale& locale) {
+  return value.to_boolean(locale);
+}
+
+template <>
+std::int16_t convert(const Variant& value, const Locale& locale) {
+  return value.to_int16(locale);
+}
+
+template <>
+std::int32_t convert(const Variant& value, const Locale& locale) {
+  return value.to_int32(locale);
+}
+
+template <>
+float convert(const Variant& value, const Locale& locale) {
+  return value.to_single(locale);
+}
+
+template <>
+Date convert(const Variant& value, const Locale& locale) {
+  return value.to_date(locale);
+}
+
+template <>
+Text convert(const Variant& value, const Locale& locale) {
+  return value.to_text(locale);
+}
+
+template <>
+Variant convert(const Variant& value, const Locale& /*locale*/) {
+  return value;
+}
+
+template <>
+TextArray convert(const Variant& value, const Locale& /*locale*/) {
+  if (value.is(Variant::Kind::empty)) return {};
+  if (const auto* const array = value.get_if<TextArray>()) return *array;
+  raise(ErrorNumber::type_mismatch);
+}
+
+template <>
+ObjectRef convert(const Variant& value, const Locale& /*locale*/) {
+  if (const auto* const object = value.get_if<ObjectRef>()) return *object;
+  raise(ErrorNumber::type_mismatch);
+}
+
+Variant Parameter::default_value() const {
+  switch (type) {
+    case ValueType::boolean: return Boolean(default_number != 0);
+    case ValueType::int16: return static_cast<std::int16_t>(default_number);
+    case ValueType::int32: return default_number;
+    case ValueType::text: return Text(default_text.begin(), default_text.end());
+    default: return missing_argument;
+  }
+}
+
+Variant detail::late_pending(void* /*target*/, std::span<Argument> /*arguments*/, const Locale& /*locale*/) {
+  raise(ErrorNumber::action_not_supported);
+}
+
+std::int32_t LateInterface::identifier_of(TextView name) const {
+  const std::int32_t slot = find(name);
+  if (slot < 0) raise(ErrorNumber::member_not_supported);
+  return members[static_cast<std::size_t>(slot)].identifier;
+}
+
+std::int32_t LateInterface::slot_of(std::int32_t identifier, Access access) const noexcept {
+  const auto fits = [&](const Member& member) {
+    return member.identifier == identifier &&
+           (member.access == access || (access == Access::call && member.access == Access::get));
+  };
+  // Identifiers count the slots, so the first guess is nearly always right.
+  const auto guess = static_cast<std::size_t>(identifier - members.front().identifier);
+  if (guess < members.size() && fits(members[guess])) return static_cast<std::int32_t>(guess);
+  const auto found = std::ranges::find_if(members, fits);
+  return found == members.end() ? -1 : static_cast<std::int32_t>(found - members.begin());
+}
+
+Variant LateInterface::call(void* target, std::int32_t slot, std::span<Argument> arguments,
+                            const Locale& locale) const {
+  const Member& member = members[static_cast<std::size_t>(slot)];
+  const LateCall function = calls[static_cast<std::size_t>(slot)];
+  const std::span<const Parameter> parameters = member.parameters();
+  if (arguments.size() > parameters.size()) raise(ErrorNumber::wrong_argument_count);
+
+  const auto is_missing = [](const Argument& argument) {
+    const auto* const error = argument.value.get_if<ErrorValue>();
+    return error != nullptr && *error == missing_argument;
+  };
+  const bool complete =
+      arguments.size() == parameters.size() && std::ranges::none_of(arguments, is_missing);
+  if (complete) return function(target, arguments, locale);
+
+  // What is left out gets a place of its own, so that a default that a member writes to goes nowhere.
+  std::array<Argument, most_parameters> all;
+  std::array<bool, most_parameters> is_given{};
+  for (std::size_t i = 0; i < parameters.size(); ++i) {
+    is_given[i] = i < arguments.size() && !is_missing(arguments[i]);
+    if (is_given[i]) continue;
+    if (!parameters[i].is_optional) raise(ErrorNumber::argument_not_optional);
+    all[i].value = parameters[i].default_value();
+  }
+  struct Exchange {
+    std::span<Argument> theirs;
+    std::array<Argument, most_parameters>& ours;
+    const std::array<bool, most_parameters>& is_given;
+
+    void run() const noexcept {
+      for (std::size_t i = 0; i < theirs.size(); ++i) {
+        if (is_given[i]) std::swap(theirs[i], ours[i]);
+      }
+    }
+    ~Exchange() { run(); }
+  };
+  const Exchange exchange{arguments, all, is_given};
+  exchange.run();
+  return function(target, std::span(all).first(parameters.size()), locale);
+}
+
+}  // namespace talutil

@@ -1,0 +1,209 @@
+#pragma once
+
+#include <array>
+#include <span>
+#include <tuple>
+#include <utility>
+
+#include "automation/member_table.hpp"
+
+/// Late binding: members called with variants, whatever the types of their signature.
+namespace talutil {
+
+/// An argument of a late-bound call. A parameter that is written back changes `value` in place, and only if
+/// the member changed it, so that a caller's variable keeps its type otherwise.
+struct Argument {
+  Argument() = default;
+  Argument(Variant given) : value(std::move(given)) {}
+
+  Variant value;
+  bool is_changed = false;
+};
+
+/// Calls one slot. The arguments are complete: defaults are filled in, the count is right.
+using LateCall = Variant (*)(void* target, std::span<Argument> arguments, const Locale& locale);
+
+/// Coerces a variant to a type of the interface. Raises what the conversions of Variant raise.
+template <class T>
+[[nodiscard]] T convert(const Variant& value, const Locale& locale);
+
+template <>
+Boolean convert(const Variant& value, const Locale& locale);
+template <>
+std::int16_t convert(const Variant& value, const Locale& locale);
+template <>
+std::int32_t convert(const Variant& value, const Locale& locale);
+template <>
+float convert(const Variant& value, const Locale& locale);
+template <>
+Date convert(const Variant& value, const Locale& locale);
+template <>
+Text convert(const Variant& value, const Locale& locale);
+template <>
+Variant convert(const Variant& value, const Locale& locale);
+
+/// Empty is an array that was never allocated. Raises 13 for anything but an array of texts.
+template <>
+TextArray convert(const Variant& value, const Locale& locale);
+
+/// An object, or an empty reference. Raises 13 for anything else; an object is never asked for its value.
+template <>
+ObjectRef convert(const Variant& value, const Locale& locale);
+
+namespace detail {
+
+/// One parameter during a call: the argument's own value where its type fits, else a converted copy.
+template <class A>
+class Cell {
+ public:
+  using T = std::remove_cvref_t<A>;
+  static constexpr bool is_written_back = passing<A>() == Passing::written_back;
+
+  void bind(Argument& argument, const Locale& locale) {
+    argument_ = &argument;
+    if constexpr (std::is_same_v<T, Variant>) {
+      used_ = &argument.value;
+    } else if (T* const held = argument.value.get_if<T>()) {
+      used_ = held;
+    } else {
+      converted_ = convert<T>(argument.value, locale);
+      used_ = &converted_;
+    }
+    if constexpr (is_written_back) before_ = *used_;
+  }
+
+  /// What the member wrote is kept however it ended.
+  ~Cell() {
+    if constexpr (is_written_back) {
+      if (used_ == nullptr || *used_ == before_) return;
+      argument_->is_changed = true;
+      if constexpr (!std::is_same_v<T, Variant>) {
+        if (used_ == &converted_) argument_->value = Variant(std::move(converted_));
+      }
+    }
+  }
+
+  [[nodiscard]] T& value() noexcept { return *used_; }
+
+ private:
+  struct Nothing {};
+
+  Argument* argument_ = nullptr;
+  T* used_ = nullptr;
+  T converted_{};
+  [[no_unique_address]] std::conditional_t<is_written_back, T, Nothing> before_{};
+};
+
+/// The object that a member pointer applies to: the target itself, or the settings it shares.
+template <class Class, class Target>
+Class& part_of(Target& target) {
+  if constexpr (std::is_base_of_v<Class, Target>) return target;
+  else return target.settings();
+}
+
+template <class Target, auto M>
+Variant late_method(void* target, std::span<Argument> arguments, const Locale& locale) {
+  using Traits = MemberTraits<M>;
+  auto& object = part_of<typename Traits::Class>(*static_cast<Target*>(target));
+  return Traits::with_arguments([&]<class... A>() -> Variant {
+    std::tuple<Cell<A>...> cells;
+    return std::apply(
+        [&](Cell<A>&... cell) -> Variant {
+          std::size_t next = 0;
+          (cell.bind(arguments[next++], locale), ...);
+          if constexpr (std::is_void_v<typename Traits::Result>) {
+            (object.*M)(cell.value()...);
+            return {};
+          } else {
+            return (object.*M)(cell.value()...);
+          }
+        },
+        cells);
+  });
+}
+
+template <class Target, auto M>
+Variant late_get(void* target, std::span<Argument> /*arguments*/, const Locale& /*locale*/) {
+  using Traits = MemberTraits<M>;
+  auto& object = part_of<typename Traits::Class>(*static_cast<Target*>(target));
+  if constexpr (Traits::is_function) return (object.*M)();
+  else return object.*M;
+}
+
+template <class Target, auto M>
+Variant late_put(void* target, std::span<Argument> arguments, const Locale& locale) {
+  using Traits = MemberTraits<M>;
+  auto& object = part_of<typename Traits::Class>(*static_cast<Target*>(target));
+  object.*M = convert<typename Traits::Result>(arguments[0].value, locale);
+  return {};
+}
+
+Variant late_pending(void* target, std::span<Argument> arguments, const Locale& locale);
+
+}  // namespace detail
+
+/// The policy that makes the functions behind late binding, slot by slot.
+template <class Target>
+struct LateCalls {
+  template <auto M>
+  static constexpr std::array<LateCall, 1> get_only(MemberName, const char*) {
+    return {&detail::late_get<Target, M>};
+  }
+
+  template <auto M>
+  static constexpr std::array<LateCall, 1> put_only(MemberName, const char*) {
+    return {&detail::late_put<Target, M>};
+  }
+
+  template <auto M>
+  static constexpr std::array<LateCall, 2> property(MemberName, const char*) {
+    return {&detail::late_get<Target, M>, &detail::late_put<Target, M>};
+  }
+
+  template <auto M>
+  static constexpr std::array<LateCall, 2> property_put_first(MemberName, const char*) {
+    return {&detail::late_put<Target, M>, &detail::late_get<Target, M>};
+  }
+
+  template <auto M, class... Names>
+  static constexpr std::array<LateCall, 1> method(MemberName, const char*, Names...) {
+    return {&detail::late_method<Target, M>};
+  }
+
+  template <auto M, class... Names>
+  static constexpr std::array<LateCall, 1> pending(MemberName, const char*, Names...) {
+    return {&detail::late_pending};
+  }
+
+  template <class... Rows>
+  static constexpr auto rows(const Rows&... parts) {
+    return detail::join(parts...);
+  }
+};
+
+/// The members of a class for late binding, without the class: what a dispatcher needs.
+struct LateInterface {
+  std::span<const Member> members;
+  std::span<const LateCall> calls;
+  std::int32_t (*find)(TextView name);  ///< The first slot of a name; -1 when there is none.
+
+  /// The identifier of a name. Raises 438 for an unknown one.
+  [[nodiscard]] std::int32_t identifier_of(TextView name) const;
+
+  /// The slot for an access of a member; -1 when the member has none. A call also reaches a property's get.
+  [[nodiscard]] std::int32_t slot_of(std::int32_t identifier, Access access) const noexcept;
+
+  /// Calls a slot with the arguments as given: defaults stand in for those left out at the end or marked
+  /// missing. Raises 450 for too many, 449 for a missing one that is not optional.
+  Variant call(void* target, std::int32_t slot, std::span<Argument> arguments, const Locale& locale) const;
+};
+
+template <class C>
+[[nodiscard]] const LateInterface& late_interface() {
+  static constexpr auto calls = members_of<LateCalls<C>>(std::type_identity<C>{});
+  static constexpr LateInterface interface{
+      described<C>, calls, [](TextView name) { return name_index<C>.find(std::span<const Member>(described<C>), name); }};
+  return interface;
+}
+
+}  // namespace talutil

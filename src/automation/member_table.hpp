@@ -1,0 +1,313 @@
+#pragma once
+
+#include <algorithm>
+#include <array>
+#include <bit>
+#include <cstdint>
+#include <span>
+#include <string_view>
+#include <type_traits>
+
+#include "automation/object.hpp"
+#include "automation/system_time.hpp"
+#include "automation/variant.hpp"
+
+/// A class that is driven through automation has one table of its members, a function template over a policy:
+///
+///     template <class P>
+///     constexpr auto members_of(std::type_identity<Thing>) {
+///       return P::rows(P::template property<&Thing::Width>("Width", "The width, in twips."),
+///                      P::template method<&Thing::Move>("Move", "Moves it.", "X", optional("Y", 0)));
+///     }
+///
+/// A policy makes something of every row: Describe the names and types, LateCalls the functions behind late
+/// binding, the COM face its slots. A property is two slots, one for each access.
+namespace talutil {
+
+/// The types of the interface. None is the result of a member that gives nothing.
+enum class ValueType : std::uint8_t {
+  none, boolean, int16, int32, single, date, text, variant, text_array, system_time, object
+};
+
+template <class T>
+consteval ValueType value_type() {
+  if constexpr (std::is_void_v<T>) return ValueType::none;
+  else if constexpr (std::is_same_v<T, Boolean>) return ValueType::boolean;
+  else if constexpr (std::is_same_v<T, std::int16_t>) return ValueType::int16;
+  else if constexpr (std::is_same_v<T, std::int32_t>) return ValueType::int32;
+  else if constexpr (std::is_same_v<T, float>) return ValueType::single;
+  else if constexpr (std::is_same_v<T, Date>) return ValueType::date;
+  else if constexpr (std::is_same_v<T, Text>) return ValueType::text;
+  else if constexpr (std::is_same_v<T, Variant>) return ValueType::variant;
+  else if constexpr (std::is_same_v<T, TextArray>) return ValueType::text_array;
+  else if constexpr (std::is_same_v<T, SystemTime>) return ValueType::system_time;
+  else if constexpr (std::is_same_v<T, ObjectRef>) return ValueType::object;
+  else static_assert(!sizeof(T*), "not a type of the interface");
+}
+
+/// How an argument travels: `T`, `const T&` and `T&` of the C++ signature.
+enum class Passing : std::uint8_t { by_value, by_reference, written_back };
+
+template <class P>
+consteval Passing passing() {
+  if constexpr (!std::is_reference_v<P>) return Passing::by_value;
+  else return std::is_const_v<std::remove_reference_t<P>> ? Passing::by_reference : Passing::written_back;
+}
+
+/// What a row says of a parameter: its published name and, for one that callers may leave out, its default.
+struct ParameterName {
+  constexpr ParameterName(const char* parameter) : name(parameter) {}
+
+  const char* name;
+  bool is_optional = false;
+  std::int32_t number = 0;
+  const char* text = "";
+};
+
+constexpr ParameterName optional(const char* name, std::int32_t number) {
+  ParameterName result(name);
+  result.is_optional = true;
+  result.number = number;
+  return result;
+}
+
+constexpr ParameterName optional(const char* name, const char* text) {
+  ParameterName result(name);
+  result.is_optional = true;
+  result.text = text;
+  return result;
+}
+
+/// The published name of a member and, where it must have a certain one, its dispatch identifier.
+struct MemberName {
+  constexpr MemberName(const char* member) : name(member) {}
+  constexpr MemberName(const char* member, std::int32_t id) : name(member), identifier(id) {}
+
+  const char* name;
+  std::int32_t identifier = 0;
+};
+
+struct Parameter {
+  std::string_view name;
+  ValueType type = ValueType::none;
+  Passing passing = Passing::by_value;
+  bool is_optional = false;
+  std::int32_t default_number = 0;
+  std::string_view default_text;
+
+  /// The value of an optional parameter that a caller left out.
+  [[nodiscard]] Variant default_value() const;
+};
+
+constexpr std::size_t most_parameters = 9;
+
+/// One slot of an interface in words.
+struct Member {
+  std::string_view name;
+  std::string_view help;
+  std::int32_t identifier = 0;
+  Access access = Access::call;
+  bool is_pending = false;  ///< Has its slot but answers 445 for now.
+  ValueType result = ValueType::none;
+  std::uint8_t parameter_count = 0;
+  std::array<Parameter, most_parameters> all_parameters{};
+
+  [[nodiscard]] constexpr std::span<const Parameter> parameters() const noexcept {
+    return {all_parameters.data(), parameter_count};
+  }
+};
+
+namespace detail {
+
+template <class M>
+struct MemberPointer;
+
+template <class C, class R, class... A>
+struct MemberPointer<R (C::*)(A...)> {
+  using Class = C;
+  using Result = R;
+  static constexpr std::size_t arity = sizeof...(A);
+  static constexpr bool is_function = true;
+
+  template <class Visitor>
+  static constexpr decltype(auto) with_arguments(Visitor&& visitor) {
+    return visitor.template operator()<A...>();
+  }
+};
+
+template <class C, class R, class... A>
+struct MemberPointer<R (C::*)(A...) const> : MemberPointer<R (C::*)(A...)> {};
+
+template <class C, class T>
+  requires(!std::is_function_v<T>)
+struct MemberPointer<T C::*> {
+  using Class = C;
+  using Result = T;
+  static constexpr bool is_function = false;
+};
+
+template <class T, std::size_t... N>
+constexpr auto join(const std::array<T, N>&... parts) {
+  std::array<T, (N + ... + 0)> all{};
+  std::size_t next = 0;
+  ((std::copy(parts.begin(), parts.end(), all.begin() + next), next += N), ...);
+  return all;
+}
+
+}  // namespace detail
+
+template <auto M>
+using MemberTraits = detail::MemberPointer<decltype(M)>;
+
+/// The type that a property has in the interface: object references travel as variants.
+template <auto M>
+using PropertyType = std::conditional_t<std::is_same_v<typename MemberTraits<M>::Result, ObjectRef>, Variant,
+                                        typename MemberTraits<M>::Result>;
+
+/// Describes each slot.
+struct Describe {
+  template <auto M>
+  static constexpr std::array<Member, 1> get_only(MemberName name, const char* help) {
+    return {accessor(name, help, Access::get, value_type<PropertyType<M>>())};
+  }
+
+  template <auto M>
+  static constexpr std::array<Member, 1> put_only(MemberName name, const char* help) {
+    Member member = accessor(name, help, Access::put, ValueType::none);
+    member.parameter_count = 1;
+    member.all_parameters[0].name = "value";
+    member.all_parameters[0].type = value_type<PropertyType<M>>();
+    return {member};
+  }
+
+  template <auto M>
+  static constexpr std::array<Member, 2> property(MemberName name, const char* help) {
+    return {get_only<M>(name, help)[0], put_only<M>(name, help)[0]};
+  }
+
+  template <auto M>
+  static constexpr std::array<Member, 2> property_put_first(MemberName name, const char* help) {
+    return {put_only<M>(name, help)[0], get_only<M>(name, help)[0]};
+  }
+
+  template <auto M, class... Names>
+  static constexpr std::array<Member, 1> method(MemberName name, const char* help, Names... names) {
+    using Traits = MemberTraits<M>;
+    static_assert(sizeof...(Names) == Traits::arity, "a name for each parameter");
+    Member member = accessor(name, help, Access::call, value_type<typename Traits::Result>());
+    const std::array<ParameterName, sizeof...(Names) + 1> given{ParameterName(names)..., ParameterName("")};
+    Traits::with_arguments([&]<class... A>() {
+      ((member.all_parameters[member.parameter_count] = parameter<A>(given[member.parameter_count]),
+        ++member.parameter_count),
+       ...);
+    });
+    return {member};
+  }
+
+  template <auto M, class... Names>
+  static constexpr std::array<Member, 1> pending(MemberName name, const char* help, Names... names) {
+    std::array<Member, 1> slot = method<M>(name, help, names...);
+    slot[0].is_pending = true;
+    return slot;
+  }
+
+  template <class... Rows>
+  static constexpr auto rows(const Rows&... parts) {
+    return detail::join(parts...);
+  }
+
+ private:
+  static constexpr Member accessor(MemberName name, const char* help, Access access, ValueType result) {
+    Member member;
+    member.name = name.name;
+    member.help = help;
+    member.identifier = name.identifier;
+    member.access = access;
+    member.result = result;
+    return member;
+  }
+
+  template <class A>
+  static constexpr Parameter parameter(const ParameterName& given) {
+    return {given.name,        value_type<std::remove_cvref_t<A>>(), passing<A>(), given.is_optional, given.number,
+            given.text};
+  }
+};
+
+constexpr char fold_case(char c) noexcept { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; }
+
+/// Names of the interface are ASCII and compared without case.
+constexpr bool same_name(std::string_view a, std::string_view b) noexcept {
+  return std::equal(a.begin(), a.end(), b.begin(), b.end(),
+                    [](char x, char y) { return fold_case(x) == fold_case(y); });
+}
+
+/// Gives every member without an identifier one of its own, the same for all accesses of a name, and checks
+/// the table while compiling: no access of a name twice, optional parameters last.
+template <std::size_t N>
+consteval std::array<Member, N> numbered(std::array<Member, N> members, std::int32_t first_identifier) {
+  for (std::size_t i = 0; i < N; ++i) {
+    bool optionals = false;
+    for (const Parameter& parameter : members[i].parameters()) {
+      if (optionals && !parameter.is_optional) throw "an optional parameter stands before a required one";
+      optionals = optionals || parameter.is_optional;
+    }
+    if (members[i].identifier == 0) members[i].identifier = first_identifier + static_cast<std::int32_t>(i);
+    for (std::size_t j = 0; j < i; ++j) {
+      if (!same_name(members[i].name, members[j].name)) continue;
+      if (members[i].access == members[j].access || members[i].access == Access::call) throw "a name stands twice";
+      members[i].identifier = members[j].identifier;
+    }
+  }
+  return members;
+}
+
+/// The members of a class, slot by slot.
+template <class C>
+inline constexpr auto described = numbered(members_of<Describe>(std::type_identity<C>{}), 0x60030000);
+
+/// Finds members by name with one hash, so that a script's call costs no search through the table.
+template <std::size_t Slots>
+class NameIndex {
+ public:
+  template <std::size_t N>
+  explicit consteval NameIndex(const std::array<Member, N>& members) {
+    static_assert(2 * N <= Slots && (Slots & (Slots - 1)) == 0);
+    for (std::size_t i = 0; i < N; ++i) {
+      std::size_t at = hash(members[i].name) % Slots;
+      while (slots_[at] != 0 && !same_name(members[slots_[at] - 1].name, members[i].name)) at = (at + 1) % Slots;
+      if (slots_[at] == 0) slots_[at] = static_cast<std::uint16_t>(i + 1);
+    }
+  }
+
+  /// The index of the first slot of a name; -1 when there is none.
+  template <class Char>
+  [[nodiscard]] constexpr std::int32_t find(std::span<const Member> members,
+                                            std::basic_string_view<Char> name) const noexcept {
+    for (std::size_t at = hash(name) % Slots; slots_[at] != 0; at = (at + 1) % Slots) {
+      const std::string_view candidate = members[slots_[at] - 1].name;
+      if (std::equal(candidate.begin(), candidate.end(), name.begin(), name.end(), [](char a, Char b) {
+            return b < 0x80 && fold_case(a) == fold_case(static_cast<char>(b));
+          })) {
+        return slots_[at] - 1;
+      }
+    }
+    return -1;
+  }
+
+ private:
+  // FNV-1a over the folded names.
+  template <class Char>
+  static constexpr std::uint32_t hash(std::basic_string_view<Char> name) noexcept {
+    std::uint32_t value = 2166136261U;
+    for (const Char c : name) value = (value ^ static_cast<std::uint8_t>(fold_case(static_cast<char>(c)))) * 16777619U;
+    return value;
+  }
+
+  std::array<std::uint16_t, Slots> slots_{};
+};
+
+template <class C>
+inline constexpr NameIndex<std::bit_ceil(2 * described<C>.size())> name_index{described<C>};
+
+}  // namespace talutil

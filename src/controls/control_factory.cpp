@@ -1,0 +1,39 @@
+#include "controls/control_factory.hpp"
+
+#include "automation/run_time_error.hpp"
+#include "controls/common_dialog.hpp"
+#include "controls/control.hpp"
+#include "controls/system_information.hpp"
+
+namespace talutil {
+
+namespace {
+
+template <class Made>
+ObjectRef make(const Platform& platform) {
+  return std::make_shared<Made>(platform);
+}
+
+}  // namespace
+
+ControlFactory::ControlFactory(const Platform& platform)
+    : platform_(platform),
+      makers_{
+          {u"PolarCryptoLibCtl.Crypto", &make<ReservedControl>},
+          {u"MSComDlg.CommonDialog", &make<CommonDialog>},
+          {u"VSFlex8Ctl.VSFlexGrid", &make<ReservedControl>},
+          {u"SystemInfoControl.MSysInfo", &make<SystemInformation>},
+          {u"DUZACTXLibCtl.duzactxctrl", &make<ReservedControl>},
+          {u"DZACTXLibCtl.dzactxctrl", &make<ReservedControl>},
+      } {}
+
+void ControlFactory::register_maker(TextView class_name, Maker maker) { makers_[Text(class_name)] = maker; }
+
+ObjectRef ControlFactory::create(TextView class_name) const {
+  if (ObjectRef theirs = platform_.control_makers.create(class_name)) return theirs;
+  const auto found = makers_.find(class_name);
+  if (found == makers_.end()) raise(ErrorNumber::cannot_create_object);
+  return found->second(platform_);
+}
+
+}  // namespace talutil

@@ -1,0 +1,26 @@
+#pragma once
+
+#include "controls/control.hpp"
+
+namespace talutil {
+
+/// The system information control, as far as the library needs it: the name of the computer.
+class SystemInformation final : public TableObject<SystemInformation> {
+ public:
+  explicit SystemInformation(const Platform& platform) : computer_(platform.computer) {}
+
+  /// Read each time it is asked for.
+  [[nodiscard]] Text computer_name() const { return computer_.name(); }
+
+ private:
+  Computer& computer_;
+};
+
+template <class P>
+constexpr auto members_of(std::type_identity<SystemInformation>) {
+  // Forms read the name by this identifier and not by name.
+  return P::rows(P::template get_only<&SystemInformation::computer_name>({"ComputerName", 0x68030010},
+                                                                         "The name of the computer."));
+}
+
+}  // namespace talutil

@@ -1,0 +1,75 @@
+#include "infoforms/frm_components.hpp"
+
+#include <algorithm>
+
+#include "automation/run_time_error.hpp"
+#include "automation/variant.hpp"
+#include "controls/control_factory.hpp"
+
+namespace talutil {
+
+namespace {
+
+// The text property of the system information control that holds the machine's name. The control publishes
+// it by this identifier alone.
+constexpr std::int32_t computer_name_property = 0x68030010;
+
+// The data connection's number for a connection that is gone for good: restarting is all a user can do.
+constexpr std::int32_t connection_terminated = 17142;
+
+}  // namespace
+
+FrmComponents::FrmComponents(const Platform& platform, const ControlFactory& factory, SharedSettings& settings)
+    : platform_(platform), factory_(factory), settings_(settings) {}
+
+void FrmComponents::load() {
+  if (is_loaded()) return;
+  // Everything is made before anything is kept, so that a control that cannot be made leaves no half window.
+  auto window = platform_.form_windows.make_hidden(caption);
+  std::array<ObjectRef, places.size()> controls;
+  std::ranges::transform(places, controls.begin(), [this](const Place& place) {
+    return factory_.create(place.class_name);
+  });
+  window_ = std::move(window);
+  controls_ = std::move(controls);
+  last_database_error_ = 0;
+
+  const Control dialog(control(u"dlgSave2"));
+  dialog.put(u"DialogTitle", u"Save Data to File");
+  dialog.put(u"Filter", u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");
+  settings_.ComputerName = Control(control(u"MSysInfo1")).get<Text>(computer_name_property);
+}
+
+void FrmComponents::unload() {
+  load();
+  controls_ = {};
+  window_.reset();
+  last_database_error_ = 0;
+}
+
+ObjectRef FrmComponents::control(TextView name) {
+  load();
+  const auto* const place = std::ranges::find(places, name, &Place::name);
+  if (place == places.end()) raise(ErrorNumber::member_not_supported);
+  return controls_[static_cast<std::size_t>(place - places.begin())];
+}
+
+std::intptr_t FrmComponents::owner_handle() {
+  load();
+  return window_->handle();
+}
+
+void FrmComponents::report_database_error(std::int32_t number, const Text& description, std::int32_t /*code*/,
+                                          const Text& source, const Text& help_file, const Text& /*context*/) {
+  load();
+  // "TData Error:" is spelled as hosts' users know it.
+  const Text message =
+      number == connection_terminated
+          ? u"An error has caused the database connection to be terminated. Please restart ORV.  If the problem "
+            u"persists, contact tech support."
+          : u"TData Error:" + number_to_text(number) + u" - " + description + u"  " + source + u"  " + help_file;
+  platform_.message_boxes.show(message, MessageButtons::ok, {});
+  last_database_error_ = number;
+}
+
+}  // namespace talutil

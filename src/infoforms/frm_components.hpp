@@ -1,0 +1,68 @@
+#pragma once
+
+#include <array>
+#include <memory>
+
+#include "automation/object.hpp"
+#include "library/shared_settings.hpp"
+#include "platform/platform.hpp"
+
+namespace talutil {
+
+class ControlFactory;
+
+/// The window that is never shown: it holds the non-visual controls that members drive, and owns the
+/// library's dialogs. It is made when something first asks for it and closed by Terminate.
+class FrmComponents {
+ public:
+  static constexpr TextView caption = u"Form1";
+
+  struct Place {
+    TextView name;
+    TextView class_name;
+  };
+
+  /// The controls in their order on the window.
+  static constexpr std::array<Place, 7> places{{
+      {u"Crypto1", u"PolarCryptoLibCtl.Crypto"},
+      {u"Open1", u"MSComDlg.CommonDialog"},
+      {u"dlgSave2", u"MSComDlg.CommonDialog"},
+      {u"Grid1", u"VSFlex8Ctl.VSFlexGrid"},
+      {u"MSysInfo1", u"SystemInfoControl.MSysInfo"},
+      {u"UnZipCtrl", u"DUZACTXLibCtl.duzactxctrl"},
+      {u"ZipCtrl", u"DZACTXLibCtl.dzactxctrl"},
+  }};
+
+  FrmComponents(const Platform& platform, const ControlFactory& factory, SharedSettings& settings);
+
+  [[nodiscard]] bool is_loaded() const noexcept { return window_ != nullptr; }
+
+  /// Makes the window and its controls if there are none, and reads ComputerName from MSysInfo1.
+  void load();
+
+  /// Closes the window with its controls. One that is not loaded is loaded first, as hosts observe.
+  void unload();
+
+  /// A control by name, on a window that is loaded if need be. Raises 438 for a name that is not on it.
+  [[nodiscard]] ObjectRef control(TextView name);
+
+  /// The handle for dialogs to be owned by; loads the window if need be.
+  [[nodiscard]] std::intptr_t owner_handle();
+
+  /// What the host's data connection calls when it reports an error: shows it and keeps its number.
+  void report_database_error(std::int32_t number, const Text& description, std::int32_t code, const Text& source,
+                             const Text& help_file, const Text& context);
+
+  /// The number of the last error reported on the loaded window; 0 when there was none.
+  [[nodiscard]] std::int32_t last_database_error() const noexcept { return last_database_error_; }
+
+ private:
+  const Platform& platform_;
+  const ControlFactory& factory_;
+  SharedSettings& settings_;
+  std::unique_ptr<HiddenWindow> window_;
+  std::array<ObjectRef, places.size()> controls_;
+  std::int32_t last_database_error_ = 0;
+};
+
+}  // namespace talutil

@@ -1,0 +1,42 @@
+#pragma once
+
+#include <memory>
+
+#include "automation/locale.hpp"
+#include "library/shared_settings.hpp"
+#include "platform/platform.hpp"
+
+namespace talutil {
+
+class ControlFactory;
+class FrmComponents;
+
+/// One loaded library: the shared settings, the platform and the components window. The DLL has exactly one.
+class Library {
+ public:
+  explicit Library(const Platform& platform);
+  Library(const Library&) = delete;
+  Library& operator=(const Library&) = delete;
+  ~Library();
+
+  /// The start-up routine, run once and before the first object is handed out: loads the components window,
+  /// which fills ComputerName, then reads the screen's twips per pixel (rounded, halves to even).
+  void start();
+
+  [[nodiscard]] SharedSettings& settings() noexcept { return settings_; }
+  [[nodiscard]] const Platform& platform() const noexcept { return platform_; }
+  [[nodiscard]] FrmComponents& components() noexcept { return *components_; }
+  [[nodiscard]] ControlFactory& controls() noexcept { return *controls_; }
+
+  /// The user's separators as they were at start-up, with the current year of the clock.
+  [[nodiscard]] Locale locale() const;
+
+ private:
+  Platform platform_;
+  SharedSettings settings_;
+  Locale locale_;
+  std::unique_ptr<ControlFactory> controls_;
+  std::unique_ptr<FrmComponents> components_;
+};
+
+}  // namespace talutil

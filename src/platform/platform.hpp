@@ -1,0 +1,88 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+
+#include "automation/date.hpp"
+#include "automation/locale.hpp"
+#include "automation/object.hpp"
+#include "automation/text.hpp"
+
+/// The seam between the core and the platform: one small interface a concern, so that a fake fits on a page.
+namespace talutil {
+
+enum class MessageButtons : std::uint8_t { ok, yes_no };
+enum class MessageAnswer : std::uint8_t { ok, cancel, yes, no };
+
+class MessageBoxes {
+ public:
+  virtual ~MessageBoxes() = default;
+
+  /// Shows a modal message and waits for its answer. An empty title stands for the host application's own.
+  /// Where there is nobody to ask, the answer is the one of a box that was closed (cancel, or no).
+  virtual MessageAnswer show(TextView text, MessageButtons buttons, TextView title) = 0;
+};
+
+class Screen {
+ public:
+  virtual ~Screen() = default;
+
+  /// Twips (1/1440 inch) per pixel, across and down; 15 at 96 dots an inch.
+  [[nodiscard]] virtual float twips_per_pixel_x() = 0;
+  [[nodiscard]] virtual float twips_per_pixel_y() = 0;
+};
+
+class Computer {
+ public:
+  virtual ~Computer() = default;
+
+  /// The machine's own name; empty where it has none.
+  [[nodiscard]] virtual Text name() = 0;
+
+  /// The user's separators. The year in it is not the platform's to fill.
+  [[nodiscard]] virtual Locale locale() = 0;
+};
+
+class Clock {
+ public:
+  virtual ~Clock() = default;
+
+  /// The current local date and time, to the second.
+  [[nodiscard]] virtual Date now() = 0;
+};
+
+/// A window that is never shown. It closes when the object ends.
+class HiddenWindow {
+ public:
+  virtual ~HiddenWindow() = default;
+
+  /// The platform's window handle, for dialogs that want an owner; 0 where there are no windows.
+  [[nodiscard]] virtual std::intptr_t handle() const noexcept = 0;
+};
+
+class FormWindows {
+ public:
+  virtual ~FormWindows() = default;
+  [[nodiscard]] virtual std::unique_ptr<HiddenWindow> make_hidden(TextView caption) = 0;
+};
+
+class ControlMakers {
+ public:
+  virtual ~ControlMakers() = default;
+
+  /// Another maker's control that the user has registered to stand for a class name; nothing where none is.
+  /// Raises 429 when one is registered but cannot be created.
+  [[nodiscard]] virtual ObjectRef create(TextView class_name) = 0;
+};
+
+/// What the library needs of the platform. The parts are the caller's and outlive the library.
+struct Platform {
+  MessageBoxes& message_boxes;
+  Screen& screen;
+  Computer& computer;
+  Clock& clock;
+  FormWindows& form_windows;
+  ControlMakers& control_makers;
+};
+
+}  // namespace talutil
