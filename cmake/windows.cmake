@@ -1,7 +1,47 @@
-# The Windows side: the platform, the DLL with its type library, and what the host tests need.
+# The Windows side: the platform, the type library made from the interface table, and TALUtil.dll.
+add_compile_definitions(UNICODE _UNICODE WINVER=0x0601 _WIN32_WINNT=0x0601)
+
 file(GLOB win32_sources CONFIGURE_DEPENDS src/platform/win32/*.cpp)
-if(win32_sources)
-  add_library(talutil_platform STATIC ${win32_sources})
-  target_link_libraries(talutil_platform PUBLIC talutil_core)
-  target_compile_definitions(talutil_platform PUBLIC UNICODE _UNICODE WINVER=0x0601 _WIN32_WINNT=0x0601)
-endif()
+add_library(talutil_platform STATIC ${win32_sources})
+target_link_libraries(talutil_platform PUBLIC talutil_core)
+
+# The type library: the table is printed as IDL by a program of the building machine, compiled, and mended.
+# It refers to the platform's stdole2.tlb, which the compiler looks for in the folder below.
+set(TALUTIL_STDOLE_DIR "" CACHE PATH "The folder with stdole2.tlb (the Wine root has one)")
+find_program(host_compiler NAMES c++ g++ REQUIRED NO_CMAKE_FIND_ROOT_PATH)
+find_program(idl_compiler i686-w64-mingw32-widl REQUIRED NO_CMAKE_FIND_ROOT_PATH)
+set(generated ${CMAKE_BINARY_DIR}/generated)
+file(MAKE_DIRECTORY ${generated})
+file(GLOB table_headers CONFIGURE_DEPENDS src/automation/*.hpp src/library/*.hpp src/forms/c_control_position.hpp)
+set(host_compile ${host_compiler} -std=c++20 -O0 -I${CMAKE_SOURCE_DIR}/src)
+
+add_custom_command(
+  OUTPUT ${generated}/write_idl
+  COMMAND ${host_compile} ${CMAKE_SOURCE_DIR}/tools/write_idl.cpp
+          ${CMAKE_SOURCE_DIR}/src/library/interface_definition.cpp -o ${generated}/write_idl
+  DEPENDS tools/write_idl.cpp src/library/interface_definition.cpp ${table_headers})
+add_custom_command(
+  OUTPUT ${generated}/mend_typelib
+  COMMAND ${host_compile} ${CMAKE_SOURCE_DIR}/tools/mend_typelib.cpp -o ${generated}/mend_typelib
+  DEPENDS tools/mend_typelib.cpp ${table_headers})
+add_custom_command(
+  OUTPUT ${generated}/TALUtil.tlb ${generated}/TALUtil.h ${CMAKE_BINARY_DIR}/TALUtil.manifest
+  COMMAND ${generated}/write_idl idl > ${generated}/TALUtil.idl
+  COMMAND ${generated}/write_idl manifest > ${CMAKE_BINARY_DIR}/TALUtil.manifest
+  COMMAND ${idl_compiler} -m32 --win32 -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
+          -t -o ${generated}/TALUtil.tlb ${generated}/TALUtil.idl
+  COMMAND ${generated}/mend_typelib ${generated}/TALUtil.tlb
+  COMMAND ${idl_compiler} -m32 --win32 -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
+          -h -o ${generated}/TALUtil.h ${generated}/TALUtil.idl
+  DEPENDS ${generated}/write_idl ${generated}/mend_typelib tools/base.idl
+  COMMENT "Making the type library")
+
+enable_language(RC)
+configure_file(src/com/talutil.rc.in ${generated}/talutil.rc)
+set_source_files_properties(${generated}/talutil.rc PROPERTIES OBJECT_DEPENDS ${generated}/TALUtil.tlb)
+file(GLOB com_sources CONFIGURE_DEPENDS src/com/*.cpp)
+add_library(TALUtil SHARED ${com_sources} src/com/talutil.def ${generated}/talutil.rc ${generated}/TALUtil.h)
+set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
+target_include_directories(TALUtil PRIVATE ${generated})
+target_link_libraries(TALUtil PRIVATE talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)
+target_link_options(TALUtil PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup)

@@ -141,3 +141,6 @@ start_wine() {
   fi
   in_wine_root /usr/lib/wine/wineserver32 -p60 2>/dev/null || true
 }
+
+# Where the cross build finds the platform's own type library.
+export TALUTIL_STDOLE_DIR=$wine_root/usr/lib/i386-linux-gnu/wine/i386-windows

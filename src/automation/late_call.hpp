@@ -201,9 +201,9 @@ struct LateInterface {
 template <class C>
 [[nodiscard]] const LateInterface& late_interface() {
   static constexpr auto calls = members_of<LateCalls<C>>(std::type_identity<C>{});
-  static constexpr LateInterface interface{
+  static constexpr LateInterface table{
       described<C>, calls, [](TextView name) { return name_index<C>.find(std::span<const Member>(described<C>), name); }};
-  return interface;
+  return table;
 }
 
 }  // namespace talutil

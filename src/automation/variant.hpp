@@ -84,6 +84,11 @@ class Variant {
   template <class T>
   [[nodiscard]] T* get_if() noexcept { return std::get_if<T>(&storage_); }
 
+  template <class Visitor>
+  decltype(auto) visit(Visitor&& visitor) const {
+    return std::visit(std::forward<Visitor>(visitor), storage_);
+  }
+
   /// The value itself, or that of an object's default member (through several objects if need be). Raises 91
   /// for an empty object reference and 438 for an object without a default member.
   [[nodiscard]] Variant value() const;

@@ -18,11 +18,11 @@ class TableObject : public Object {
   std::int32_t member_id(TextView name) override { return late_interface<Derived>().identifier_of(name); }
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
-    const LateInterface& interface = late_interface<Derived>();
-    const std::int32_t slot = interface.slot_of(member, access);
+    const LateInterface& table = late_interface<Derived>();
+    const std::int32_t slot = table.slot_of(member, access);
     if (slot < 0) raise(ErrorNumber::member_not_supported);
     std::vector<Argument> given(arguments.begin(), arguments.end());
-    return interface.call(static_cast<Derived*>(this), slot, given, Locale{});
+    return table.call(static_cast<Derived*>(this), slot, given, Locale{});
   }
 };
 

@@ -1,0 +1,36 @@
+#pragma once
+
+#include "automation/run_time_error.hpp"
+#include "platform/win32/windows.hpp"
+
+/// The edge between exceptions and automation's results. No exception crosses it.
+namespace talutil::com {
+
+/// The HRESULT of a run-time number: 0x800A0000 and the number. What came from another object as an HRESULT
+/// stays what it was.
+[[nodiscard]] HRESULT result_of(std::int32_t number) noexcept;
+
+/// A run-time error from the failed result of another object, with what it told of it.
+[[nodiscard]] RunTimeError error_of(HRESULT result, TextView description);
+
+/// The exception being handled as a run-time error: a failed allocation is 7, one of no kind we know 51.
+[[nodiscard]] RunTimeError current_error() noexcept;
+
+/// Hands the exception being handled to the caller's thread as error information, and gives its HRESULT.
+[[nodiscard]] HRESULT report_current_exception() noexcept;
+
+/// The same as a late-bound caller takes it.
+[[nodiscard]] HRESULT report_current_exception(EXCEPINFO* information) noexcept;
+
+/// Runs a function at the boundary.
+template <class Function>
+[[nodiscard]] HRESULT guarded(Function&& function) noexcept {
+  try {
+    function();
+    return S_OK;
+  } catch (...) {
+    return report_current_exception();
+  }
+}
+
+}  // namespace talutil::com

@@ -1,0 +1,17 @@
+#pragma once
+
+#include "automation/object.hpp"
+#include "platform/win32/windows.hpp"
+
+/// Objects on their way between automation and the library, in both directions.
+namespace talutil::com {
+
+/// A host's object, or another maker's control, as ours. An empty pointer is an empty reference. Raises 13 for
+/// an object that cannot be driven late-bound.
+[[nodiscard]] ObjectRef object_from(IUnknown* object);
+
+/// An object for a host: its own where it came from one, else a dispatcher over ours. The reference is the
+/// caller's to release.
+[[nodiscard]] IDispatch* dispatch_from(const ObjectRef& object);
+
+}  // namespace talutil::com

@@ -1,0 +1,161 @@
+// The entry points of TALUtil.dll and the state of the loaded module.
+#include <array>
+#include <mutex>
+#include <optional>
+
+#include "com/boundary.hpp"
+#include "com/classes.hpp"
+#include "com/module.hpp"
+#include "com/pointer.hpp"
+#include "com/registered_controls.hpp"
+#include "com/registration.hpp"
+#include "infoforms/frm_components.hpp"
+#include "platform/win32/win32_platform.hpp"
+
+namespace talutil::com {
+
+namespace {
+
+/// The platform of the DLL and the library on it.
+struct LoadedLibrary {
+  win32::Win32MessageBoxes message_boxes;
+  win32::Win32Screen screen;
+  win32::Win32Computer computer;
+  win32::Win32Clock clock;
+  win32::Win32FormWindows form_windows;
+  RegisteredControls control_makers;
+  Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers}};
+};
+
+struct Module {
+  HINSTANCE handle = nullptr;
+  std::atomic<long> references = 0;
+  std::mutex starting;
+  // Never ended by us: what hosts put into the settings is not to be released under the loader's lock.
+  LoadedLibrary* loaded = nullptr;
+};
+
+Module module_state;
+
+/// True when nothing of the library would be missed: no object, no lock, no object of a host in the settings.
+bool nothing_is_held(Library& library) {
+  const SharedSettings& settings = library.settings();
+  return !settings.FolderBrowseForm && !settings.SplashForm && !settings.DrawTextPictureBox;
+}
+
+template <class C>
+HRESULT create_object(REFIID id, void** out) noexcept {
+  return guarded([&] {
+    auto* const made = new ComObject<C>(module_library());
+    const HRESULT result = ComObject<C>::query_interface(made, &id, out);
+    ComObject<C>::release(made);
+    if (FAILED(result)) throw error_of(result, {});
+  });
+}
+
+/// One for each class, for as long as the DLL is loaded.
+class ClassObject final : public IClassFactory {
+ public:
+  using Create = HRESULT (*)(REFIID id, void** out) noexcept;
+
+  constexpr explicit ClassObject(Create create) noexcept : create_(create) {}
+
+  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override {
+    if (out == nullptr) return E_POINTER;
+    *out = id == IID_IUnknown || id == IID_IClassFactory ? this : nullptr;
+    if (*out == nullptr) return E_NOINTERFACE;
+    AddRef();
+    return S_OK;
+  }
+
+  ULONG STDMETHODCALLTYPE AddRef() override { return static_cast<ULONG>(++module_state.references); }
+
+  ULONG STDMETHODCALLTYPE Release() override { return static_cast<ULONG>(--module_state.references); }
+
+  HRESULT STDMETHODCALLTYPE CreateInstance(IUnknown* outer, REFIID id, void** out) override {
+    if (out == nullptr) return E_POINTER;
+    *out = nullptr;
+    return outer != nullptr ? CLASS_E_NOAGGREGATION : create_(id, out);
+  }
+
+  HRESULT STDMETHODCALLTYPE LockServer(BOOL lock) override {
+    if (lock != FALSE) AddRef();
+    else Release();
+    return S_OK;
+  }
+
+ private:
+  Create create_;
+};
+
+ClassObject orv_utils_class(&create_object<ORVUtils>);
+ClassObject control_position_class(&create_object<cControlPosition>);
+
+}  // namespace
+
+ModuleReference::ModuleReference() noexcept { ++module_state.references; }
+
+ModuleReference::~ModuleReference() { --module_state.references; }
+
+HINSTANCE module_handle() noexcept { return module_state.handle; }
+
+Library& module_library() {
+  const std::lock_guard lock(module_state.starting);
+  if (module_state.loaded == nullptr) {
+    auto loaded = std::make_unique<LoadedLibrary>();
+    loaded->library.start();
+    module_state.loaded = loaded.release();
+  }
+  return module_state.loaded->library;
+}
+
+HRESULT type_information(const GUID& identifier, ITypeInfo** out) noexcept {
+  std::array<wchar_t, MAX_PATH> path{};
+  GetModuleFileNameW(module_state.handle, path.data(), static_cast<DWORD>(path.size()));
+  Pointer<ITypeLib> library;
+  const HRESULT result = LoadTypeLibEx(path.data(), REGKIND_NONE, library.receive());
+  return FAILED(result) ? result : library->GetTypeInfoOfGuid(identifier, out);
+}
+
+}  // namespace talutil::com
+
+using namespace talutil;
+using namespace talutil::com;
+
+extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, void* /*reserved*/) {
+  // Nothing else here: the loader's lock is held.
+  if (reason == DLL_PROCESS_ATTACH) {
+    module_state.handle = instance;
+    DisableThreadLibraryCalls(instance);
+  }
+  return TRUE;
+}
+
+STDAPI DllGetClassObject(REFCLSID class_id, REFIID id, void** out) {
+  if (out == nullptr) return E_POINTER;
+  *out = nullptr;
+  if (class_id == ClassTraits<ORVUtils>::class_id) return orv_utils_class.QueryInterface(id, out);
+  if (class_id == ClassTraits<cControlPosition>::class_id) return control_position_class.QueryInterface(id, out);
+  return CLASS_E_CLASSNOTAVAILABLE;
+}
+
+STDAPI DllCanUnloadNow() {
+  if (module_state.references != 0) return S_FALSE;
+  if (module_state.loaded == nullptr) return S_OK;
+  Library& library = module_state.loaded->library;
+  if (!nothing_is_held(library)) return S_FALSE;
+  // The window may not outlive the code that made it; a member that needs it again loads it again.
+  if (library.components().is_loaded()) library.components().unload();
+  return S_OK;
+}
+
+STDAPI DllRegisterServer() { return register_library(RegistrationScope::machine); }
+
+STDAPI DllUnregisterServer() { return unregister_library(RegistrationScope::machine); }
+
+// "regsvr32 /n /i:user TALUtil.dll" registers for the user alone, without administrator rights.
+STDAPI DllInstall(BOOL install, LPCWSTR command_line) {
+  const bool for_user = command_line != nullptr && lstrcmpiW(command_line, L"user") == 0;
+  const auto scope = for_user ? RegistrationScope::user : RegistrationScope::machine;
+  return install != FALSE ? register_library(scope) : unregister_library(scope);
+}

@@ -1,0 +1,249 @@
+#include "com/invoke.hpp"
+
+#include <algorithm>
+#include <array>
+#include <optional>
+
+#include "com/boundary.hpp"
+#include "com/variant_bridge.hpp"
+
+namespace talutil::com {
+
+namespace {
+
+constexpr WORD put_flags = DISPATCH_PROPERTYPUT | DISPATCH_PROPERTYPUTREF;
+
+/// Where each parameter's argument stands in the caller's list; -1 for one that was left out.
+struct Placement {
+  std::array<int, most_parameters> argument{};
+  std::size_t count = 0;  ///< Parameters up to the last one given.
+};
+
+HRESULT place_arguments(const Member& member, const DISPPARAMS& given, UINT* bad_argument, Placement& placement) {
+  placement.argument.fill(-1);
+  const UINT positional = given.cArgs - given.cNamedArgs;
+  if (given.cArgs > member.parameter_count) return DISP_E_BADPARAMCOUNT;
+  // The caller's list starts with the named arguments; the positional ones follow, the last one first.
+  for (UINT i = 0; i < positional; ++i) placement.argument[i] = static_cast<int>(given.cArgs - 1 - i);
+  placement.count = positional;
+  for (UINT i = 0; i < given.cNamedArgs; ++i) {
+    const DISPID id = given.rgdispidNamedArgs[i];
+    const bool is_value = member.access == Access::put && id == DISPID_PROPERTYPUT;
+    const std::size_t place = is_value ? member.parameter_count - 1U : static_cast<std::size_t>(id);
+    if (place >= member.parameter_count || placement.argument[place] != -1) {
+      if (bad_argument != nullptr) *bad_argument = i;
+      return DISP_E_PARAMNOTFOUND;
+    }
+    placement.argument[place] = static_cast<int>(i);
+    placement.count = std::max(placement.count, place + 1);
+  }
+  return S_OK;
+}
+
+bool is_missing(const VARIANT& value) noexcept {
+  return V_VT(&value) == VT_ERROR && V_ERROR(&value) == DISP_E_PARAMNOTFOUND;
+}
+
+/// The argument as the parameter wants it. Arrays need the parameter's word: a script's array holds variants.
+Variant argument_value(const Parameter& parameter, const VARIANT& given, const Locale& locale) {
+  const VARIANT& source = resolved(given);
+  const bool is_array = (V_VT(&source) & VT_ARRAY) != 0;
+  if (parameter.type != ValueType::text_array || !is_array) return variant_from(source);
+  const bool by_reference = (V_VT(&source) & VT_BYREF) != 0;
+  if (by_reference && V_ARRAYREF(&source) == nullptr) raise(ErrorNumber::invalid_procedure_call);
+  return array_from(by_reference ? *V_ARRAYREF(&source) : V_ARRAY(&source), locale);
+}
+
+/// A value on its way back to a caller's variable: made first, stored when all are made.
+class WriteBack {
+ public:
+  WriteBack(const VARIANT& target, const Variant& value, const Locale& locale) {
+    if (V_VT(&target) == (VT_BYREF | VT_VARIANT)) {
+      variable_ = const_cast<VARIANT*>(&resolved(target));
+      if ((V_VT(variable_) & VT_BYREF) == 0) {
+        if ((V_VT(variable_) & VT_ARRAY) != 0) require_resizable(V_ARRAY(variable_));
+        native_ = native_from(value, ArrayStyle::of_variants);
+        return;
+      }
+    } else {
+      variable_ = const_cast<VARIANT*>(&target);
+    }
+    make_typed(value, locale);
+  }
+
+  void store() noexcept {
+    if ((V_VT(variable_) & VT_BYREF) == 0) {
+      std::swap(*variable_, native_.get());
+    } else if ((V_VT(variable_) & VT_ARRAY) != 0) {
+      std::swap(*V_ARRAYREF(variable_), V_ARRAY(&native_.get()));
+      if (V_ARRAY(&native_.get()) == nullptr) V_VT(&native_.get()) = VT_EMPTY;
+    } else {
+      store_typed();
+    }
+  }
+
+ private:
+  /// The variable has a type of its own, which it keeps.
+  void make_typed(const Variant& value, const Locale& locale) {
+    const VARTYPE type = V_VT(variable_) & ~VT_BYREF;
+    if ((type & VT_ARRAY) != 0) {
+      require_resizable(*V_ARRAYREF(variable_));
+      const VARTYPE element = type & VT_TYPEMASK;
+      if (element != VT_BSTR && element != VT_VARIANT) raise(ErrorNumber::type_mismatch);
+      native_ = native_from(value, element == VT_BSTR ? ArrayStyle::of_texts : ArrayStyle::of_variants);
+      return;
+    }
+    native_ = native_from(type == VT_BSTR ? Variant(value.to_text(locale)) : value, ArrayStyle::of_variants);
+    if (V_VT(&native_.get()) == type) return;
+    const HRESULT result = VariantChangeType(&native_.get(), &native_.get(), 0, type);
+    if (FAILED(result)) throw error_of(result, {});
+  }
+
+  void store_typed() noexcept {
+    VARIANT& native = native_.get();
+    switch (V_VT(&native)) {
+      case VT_BSTR: std::swap(*V_BSTRREF(variable_), V_BSTR(&native)); break;
+      case VT_DISPATCH: std::swap(*V_DISPATCHREF(variable_), V_DISPATCH(&native)); break;
+      case VT_UNKNOWN: std::swap(*V_UNKNOWNREF(variable_), V_UNKNOWN(&native)); break;
+      case VT_UI1:
+      case VT_I1: *V_UI1REF(variable_) = V_UI1(&native); break;
+      case VT_I2:
+      case VT_UI2:
+      case VT_BOOL: *V_I2REF(variable_) = V_I2(&native); break;
+      case VT_I4:
+      case VT_UI4:
+      case VT_INT:
+      case VT_UINT:
+      case VT_ERROR:
+      case VT_R4: *V_I4REF(variable_) = V_I4(&native); break;
+      case VT_DECIMAL: *V_DECIMALREF(variable_) = V_DECIMAL(&native); break;
+      default: *V_I8REF(variable_) = V_I8(&native); break;
+    }
+  }
+
+  VARIANT* variable_ = nullptr;
+  OwnedVariant native_;
+};
+
+/// One call: its arguments, and the way back of what the member wrote.
+class Call {
+ public:
+  Call(const Member& member, const Invocation& invocation, const Placement& placement, const Locale& locale)
+      : invocation_(invocation), placement_(placement), locale_(locale) {
+    for (std::size_t i = 0; i < placement.count; ++i) {
+      const int at = placement.argument[i];
+      if (at < 0) {
+        arguments_[i].value = missing_argument;
+        continue;
+      }
+      if (invocation.bad_argument != nullptr) *invocation.bad_argument = static_cast<UINT>(at);
+      arguments_[i].value = argument_value(member.parameters()[i], invocation.parameters->rgvarg[at], locale);
+    }
+  }
+
+  [[nodiscard]] std::span<Argument> arguments() noexcept { return std::span(arguments_).first(placement_.count); }
+
+  void write_back() {
+    std::array<std::optional<WriteBack>, most_parameters> changes;
+    for (std::size_t i = 0; i < placement_.count; ++i) {
+      if (!arguments_[i].is_changed || placement_.argument[i] < 0) continue;
+      const VARIANT& target = invocation_.parameters->rgvarg[placement_.argument[i]];
+      if ((V_VT(&target) & VT_BYREF) != 0) changes[i].emplace(target, arguments_[i].value, locale_);
+    }
+    for (auto& change : changes) {
+      if (change) change->store();
+    }
+  }
+
+ private:
+  const Invocation& invocation_;
+  const Placement& placement_;
+  const Locale& locale_;
+  std::array<Argument, most_parameters> arguments_;
+};
+
+HRESULT check_required(const Member& member, const Invocation& invocation, const Placement& placement) {
+  for (std::size_t i = 0; i < member.parameter_count; ++i) {
+    const int at = placement.argument[i];
+    if (member.all_parameters[i].is_optional || (at >= 0 && !is_missing(invocation.parameters->rgvarg[at]))) continue;
+    if (at >= 0 && invocation.bad_argument != nullptr) *invocation.bad_argument = static_cast<UINT>(at);
+    return DISP_E_PARAMNOTOPTIONAL;
+  }
+  return S_OK;
+}
+
+/// The slot for the way a caller uses a member; -1 when the member has none.
+std::int32_t slot_for(const LateInterface& table, DISPID member, WORD flags) noexcept {
+  if ((flags & put_flags) == 0) return table.slot_of(member, (flags & DISPATCH_METHOD) != 0 ? Access::call : Access::get);
+  const std::int32_t slot = table.slot_of(member, Access::put);
+  // A reference is put only where an object is kept.
+  const bool by_reference_only = (flags & put_flags) == DISPATCH_PROPERTYPUTREF;
+  if (slot < 0 || !by_reference_only) return slot;
+  return table.members[static_cast<std::size_t>(slot)].parameters()[0].type == ValueType::variant ? slot : -1;
+}
+
+}  // namespace
+
+HRESULT find_identifiers(const LateInterface& table, wchar_t** names, UINT count, DISPID* ids) noexcept {
+  if (names == nullptr || ids == nullptr || count == 0) return E_POINTER;
+  std::fill_n(ids, count, DISPID_UNKNOWN);
+  const auto name_at = [names](UINT i) {
+    return names[i] == nullptr ? TextView() : win32::view(names[i], std::char_traits<wchar_t>::length(names[i]));
+  };
+  const std::int32_t slot = table.find(name_at(0));
+  if (slot < 0) return DISP_E_UNKNOWNNAME;
+  const Member& member = table.members[static_cast<std::size_t>(slot)];
+  ids[0] = member.identifier;
+  HRESULT result = S_OK;
+  for (UINT i = 1; i < count; ++i) {
+    const auto parameters = member.parameters();
+    const auto found = std::ranges::find_if(parameters, [&](const Parameter& parameter) {
+      const TextView name = name_at(i);
+      return same_name(parameter.name, to_utf8(name));
+    });
+    if (found == parameters.end()) result = DISP_E_UNKNOWNNAME;
+    else ids[i] = static_cast<DISPID>(found - parameters.begin());
+  }
+  return result;
+}
+
+HRESULT invoke(const LateInterface& table, void* target, const Locale& locale,
+               const Invocation& invocation) noexcept {
+  const DISPPARAMS* const given = invocation.parameters;
+  if (given == nullptr || (given->cArgs != 0 && given->rgvarg == nullptr) || given->cNamedArgs > given->cArgs ||
+      (given->cNamedArgs != 0 && given->rgdispidNamedArgs == nullptr)) {
+    return E_POINTER;
+  }
+  const std::int32_t slot = slot_for(table, invocation.member, invocation.flags);
+  if (slot < 0) return DISP_E_MEMBERNOTFOUND;
+  const Member& member = table.members[static_cast<std::size_t>(slot)];
+  if (member.is_pending) {
+    try {
+      raise(ErrorNumber::action_not_supported);
+    } catch (...) {
+      return report_current_exception(invocation.exception);
+    }
+  }
+  Placement placement;
+  HRESULT result = place_arguments(member, *given, invocation.bad_argument, placement);
+  if (SUCCEEDED(result)) result = check_required(member, invocation, placement);
+  if (FAILED(result)) return result;
+  try {
+    Call call(member, invocation, placement, locale);
+    Variant answer;
+    try {
+      answer = table.call(target, slot, call.arguments(), locale);
+    } catch (...) {
+      call.write_back();
+      throw;
+    }
+    OwnedVariant native = native_from(answer, ArrayStyle::of_variants);
+    call.write_back();
+    if (invocation.result != nullptr) *invocation.result = native.release();
+    return S_OK;
+  } catch (...) {
+    return report_current_exception(invocation.exception);
+  }
+}
+
+}  // namespace talutil::com

@@ -1,0 +1,43 @@
+#pragma once
+
+#include "library/library.hpp"
+#include "platform/win32/windows.hpp"
+
+/// The loaded DLL: the one place with state that outlives a call.
+namespace talutil::com {
+
+/// Keeps the DLL loaded while it exists: every object and every lock of a host has one.
+class ModuleReference {
+ public:
+  ModuleReference() noexcept;
+  ModuleReference(const ModuleReference&) = delete;
+  ModuleReference& operator=(const ModuleReference&) = delete;
+  ~ModuleReference();
+};
+
+[[nodiscard]] HINSTANCE module_handle() noexcept;
+
+/// The one library, made and started by the first call, before the first object is handed out. Not from
+/// DllMain: the start-up makes a window, which the loader's lock forbids. Raises what the start-up raises, and
+/// then tries again at the next call.
+[[nodiscard]] Library& module_library();
+
+/// The type information of one of the type library's interfaces or classes, from the DLL's own resource.
+[[nodiscard]] HRESULT type_information(const GUID& identifier, ITypeInfo** out) noexcept;
+
+/// A class or interface identifier of library/identity.hpp.
+[[nodiscard]] constexpr GUID guid_of(std::string_view text) {
+  const auto digit = [](char c) { return static_cast<unsigned>(c <= '9' ? c - '0' : (c | 0x20) - 'a' + 10); };
+  const auto number = [&](std::size_t at, std::size_t digits) {
+    unsigned long value = 0;
+    for (std::size_t i = 0; i < digits; ++i) value = value * 16 + digit(text[at + i]);
+    return value;
+  };
+  GUID result{number(0, 8), static_cast<WORD>(number(9, 4)), static_cast<WORD>(number(14, 4)), {}};
+  for (std::size_t i = 0; i < 8; ++i) {
+    result.Data4[i] = static_cast<BYTE>(number(i < 2 ? 19 + 2 * i : 20 + 2 * i, 2));
+  }
+  return result;
+}
+
+}  // namespace talutil::com

@@ -1,0 +1,45 @@
+#include "com/registered_controls.hpp"
+
+#include <array>
+
+#include "automation/run_time_error.hpp"
+#include "com/dispatch_object.hpp"
+#include "com/pointer.hpp"
+#include "platform/win32/windows.hpp"
+
+namespace talutil::com {
+
+namespace {
+
+constexpr const wchar_t* key_name = L"Software\\TALUtil\\Controls";
+
+/// The class that stands for a name below one root; an empty text where none does.
+Text registered_class(HKEY root, const Text& class_name) {
+  std::array<wchar_t, 256> value{};
+  DWORD size = sizeof value;
+  const LSTATUS status = RegGetValueW(root, key_name, win32::wide(class_name), RRF_RT_REG_SZ, nullptr, value.data(), &size);
+  return status == ERROR_SUCCESS ? Text(win32::view(value.data(), size / sizeof(wchar_t) - 1)) : Text();
+}
+
+}  // namespace
+
+ObjectRef RegisteredControls::create(TextView class_name) {
+  const Text name(class_name);
+  Text replacement = registered_class(HKEY_CURRENT_USER, name);
+  if (replacement.empty()) replacement = registered_class(HKEY_LOCAL_MACHINE, name);
+  if (replacement.empty()) return {};
+
+  CLSID class_id;
+  Pointer<IUnknown> object;
+  // A registration that does not work is the user's to know of; falling back silently would hide it.
+  if (FAILED(CLSIDFromString(win32::wide(replacement), &class_id)) ||
+      FAILED(CoCreateInstance(class_id, nullptr, CLSCTX_INPROC_SERVER, IID_IUnknown, object.receive_untyped()))) {
+    const Text description = u"ActiveX component can't create object: " + replacement + u" is registered in " +
+                             Text(u"Software\\TALUtil\\Controls") + u" to stand for " + name +
+                             u"; install it or remove the value";
+    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::cannot_create_object), description);
+  }
+  return object_from(object.get());
+}
+
+}  // namespace talutil::com

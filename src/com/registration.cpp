@@ -1,0 +1,132 @@
+#include "com/registration.hpp"
+
+#include <array>
+#include <string>
+
+#include "com/boundary.hpp"
+#include "com/classes.hpp"
+#include "com/module.hpp"
+#include "com/pointer.hpp"
+
+// In the platform's library, but not in the headers of the tool chain.
+extern "C" HRESULT WINAPI RegisterTypeLibForUser(ITypeLib* library, OLECHAR* path, OLECHAR* help_folder);
+extern "C" HRESULT WINAPI UnRegisterTypeLibForUser(REFGUID library, WORD major, WORD minor, LCID locale, SYSKIND kind);
+
+namespace talutil::com {
+
+namespace {
+
+/// A registry key, open for writing.
+class Key {
+ public:
+  explicit Key(HKEY handle) noexcept : handle_(handle) {}
+  Key(const Key&) = delete;
+  Key& operator=(const Key&) = delete;
+  ~Key() { RegCloseKey(handle_); }
+
+  static Key create(HKEY parent, const std::wstring& path) {
+    HKEY handle = nullptr;
+    check(RegCreateKeyExW(parent, path.c_str(), 0, nullptr, 0, KEY_WRITE, nullptr, &handle, nullptr));
+    return Key(handle);
+  }
+
+  void set(const wchar_t* name, const std::wstring& value) const {
+    check(RegSetValueExW(handle_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(value.c_str()),
+                         static_cast<DWORD>((value.size() + 1) * sizeof(wchar_t))));
+  }
+
+  static void check(LSTATUS status) {
+    if (status != ERROR_SUCCESS) throw error_of(HRESULT_FROM_WIN32(static_cast<DWORD>(status)), {});
+  }
+
+ private:
+  HKEY handle_;
+};
+
+std::wstring text_of(const GUID& identifier) {
+  std::array<wchar_t, 40> text{};
+  StringFromGUID2(identifier, text.data(), static_cast<int>(text.size()));
+  return text.data();
+}
+
+std::wstring module_path() {
+  std::array<wchar_t, MAX_PATH> path{};
+  if (GetModuleFileNameW(module_handle(), path.data(), static_cast<DWORD>(path.size())) == 0) {
+    throw error_of(HRESULT_FROM_WIN32(GetLastError()), {});
+  }
+  return path.data();
+}
+
+HKEY root_of(RegistrationScope scope) noexcept {
+  return scope == RegistrationScope::user ? HKEY_CURRENT_USER : HKEY_LOCAL_MACHINE;
+}
+
+const std::wstring classes = L"Software\\Classes\\";
+
+struct ClassEntry {
+  GUID class_id;
+  const wchar_t* program_id;
+};
+
+constexpr ClassEntry entries[] = {
+    {ClassTraits<ORVUtils>::class_id, ClassTraits<ORVUtils>::program_id},
+    {ClassTraits<cControlPosition>::class_id, ClassTraits<cControlPosition>::program_id},
+};
+
+void register_class(HKEY root, const ClassEntry& entry, const std::wstring& path) {
+  const std::wstring identifier = text_of(entry.class_id);
+  const std::wstring key = classes + L"CLSID\\" + identifier;
+  Key::create(root, classes + entry.program_id).set(nullptr, entry.program_id);
+  Key::create(root, classes + entry.program_id + L"\\CLSID").set(nullptr, identifier);
+  Key::create(root, key).set(nullptr, entry.program_id);
+  const Key server = Key::create(root, key + L"\\InprocServer32");
+  server.set(nullptr, path);
+  server.set(L"ThreadingModel", L"Apartment");
+  Key::create(root, key + L"\\ProgID").set(nullptr, entry.program_id);
+  Key::create(root, key + L"\\TypeLib").set(nullptr, text_of(guid_of(identity::type_library)));
+  Key::create(root, key + L"\\Version")
+      .set(nullptr, std::to_wstring(identity::type_library_major) + L"." + std::to_wstring(identity::type_library_minor));
+  Key::create(root, key + L"\\Programmable").set(nullptr, L"");
+}
+
+void register_type_library(RegistrationScope scope, const std::wstring& path) {
+  Pointer<ITypeLib> library;
+  HRESULT result = LoadTypeLibEx(path.c_str(), REGKIND_NONE, library.receive());
+  if (SUCCEEDED(result)) {
+    auto* const name = const_cast<wchar_t*>(path.c_str());
+    result = scope == RegistrationScope::user ? RegisterTypeLibForUser(library.get(), name, nullptr)
+                                              : RegisterTypeLib(library.get(), name, nullptr);
+  }
+  if (FAILED(result)) throw error_of(result, {});
+}
+
+}  // namespace
+
+HRESULT register_library(RegistrationScope scope) noexcept {
+  const HRESULT result = guarded([scope] {
+    const std::wstring path = module_path();
+    for (const ClassEntry& entry : entries) register_class(root_of(scope), entry, path);
+    register_type_library(scope, path);
+  });
+  if (FAILED(result)) static_cast<void>(unregister_library(scope));
+  return result;
+}
+
+HRESULT unregister_library(RegistrationScope scope) noexcept {
+  return guarded([scope] {
+    const auto remove = [root = root_of(scope)](const std::wstring& key) {
+      const LSTATUS status = RegDeleteTreeW(root, key.c_str());
+      if (status != ERROR_FILE_NOT_FOUND) Key::check(status);
+    };
+    for (const ClassEntry& entry : entries) {
+      remove(classes + entry.program_id);
+      remove(classes + L"CLSID\\" + text_of(entry.class_id));
+    }
+    const GUID library = guid_of(identity::type_library);
+    const auto unregister = scope == RegistrationScope::user ? &UnRegisterTypeLibForUser : &UnRegisterTypeLib;
+    const HRESULT result = unregister(library, identity::type_library_major, identity::type_library_minor, 0, SYS_WIN32);
+    if (FAILED(result) && result != TYPE_E_REGISTRYACCESS && result != TYPE_E_LIBNOTREGISTERED) throw error_of(result, {});
+  });
+}
+
+}  // namespace talutil::com

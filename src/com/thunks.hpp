@@ -1,0 +1,266 @@
+#pragma once
+
+#include <tuple>
+
+#include "automation/member_table.hpp"
+#include "com/boundary.hpp"
+#include "com/com_object.hpp"
+#include "com/variant_bridge.hpp"
+
+/// The vtable, made from the interface table: for each row a function that takes automation's own types, calls
+/// the member and marshals back. Nothing is written per member.
+namespace talutil::com {
+
+/// How a type of the interface stands in a vtable call, and how it is converted.
+template <class T>
+struct Wire {  // Numbers and records are the same on both sides.
+  using Type = T;
+  static T from(const Type& value) { return value; }
+  static Type to(const T& value) { return value; }
+  static void store(Type& place, Type value) noexcept { place = value; }
+};
+
+template <>
+struct Wire<Boolean> {
+  using Type = VARIANT_BOOL;
+  static Boolean from(Type value) { return Boolean::from_bits(value); }
+  static Type to(Boolean value) { return value.bits(); }
+  static void store(Type& place, Type value) noexcept { place = value; }
+};
+
+template <>
+struct Wire<Date> {
+  using Type = DATE;
+  static Date from(Type value) { return {value}; }
+  static Type to(Date value) { return value.days; }
+  static void store(Type& place, Type value) noexcept { place = value; }
+};
+
+template <>
+struct Wire<Text> {
+  using Type = BSTR;
+  static Text from(Type value) { return text_from(value); }
+  static OwnedText to(const Text& value) { return OwnedText(value); }
+  static void store(Type& place, OwnedText value) noexcept {
+    SysFreeString(place);
+    place = value.release();
+  }
+};
+
+template <>
+struct Wire<Variant> {
+  using Type = VARIANT;
+  static Variant from(const Type& value) { return variant_from(value); }
+  static OwnedVariant to(const Variant& value) { return native_from(value, ArrayStyle::of_texts); }
+  static void store(Type& place, OwnedVariant value) noexcept { std::swap(place, value.get()); }
+};
+
+template <>
+struct Wire<TextArray> {
+  using Type = SAFEARRAY*;
+  static TextArray from(Type value) { return array_from(value, {}); }
+  static OwnedArray to(const TextArray& value) { return {value, ArrayStyle::of_texts}; }
+  static void store(Type& place, OwnedArray value) noexcept {
+    if (place != nullptr) SafeArrayDestroy(place);
+    place = value.release();
+  }
+};
+
+/// The caller's type of a parameter: by value, or a pointer to it.
+template <class A>
+using WireParameter =
+    std::conditional_t<passing<A>() == Passing::by_value, typename Wire<std::remove_cvref_t<A>>::Type,
+                       typename Wire<std::remove_cvref_t<A>>::Type*>;
+
+/// One argument of a vtable call.
+template <class A>
+class WireCell {
+ public:
+  using T = std::remove_cvref_t<A>;
+  using Native = decltype(Wire<T>::to(std::declval<const T&>()));
+  static constexpr bool is_written_back = passing<A>() == Passing::written_back;
+
+  explicit WireCell(WireParameter<A> given) {
+    if constexpr (std::is_pointer_v<WireParameter<A>> && passing<A>() != Passing::by_value) {
+      place_ = given;
+      value_ = Wire<T>::from(*given);
+    } else {
+      value_ = Wire<T>::from(given);
+    }
+    if constexpr (is_written_back) before_ = value_;
+  }
+
+  [[nodiscard]] T& value() noexcept { return value_; }
+
+  /// Makes what goes back, if anything does. Nothing is stored before everything is made.
+  void prepare() {
+    if constexpr (is_written_back) {
+      is_changed_ = value_ != before_;
+      if (!is_changed_) return;
+      if constexpr (std::is_same_v<T, TextArray>) require_resizable(*place_);
+      native_ = Wire<T>::to(value_);
+    }
+  }
+
+  void store() noexcept {
+    if constexpr (is_written_back) {
+      if (is_changed_) Wire<T>::store(*place_, std::move(native_));
+    }
+  }
+
+ private:
+  struct Nothing {};
+
+  typename Wire<T>::Type* place_ = nullptr;
+  T value_{};
+  [[no_unique_address]] std::conditional_t<is_written_back, T, Nothing> before_{};
+  [[no_unique_address]] std::conditional_t<is_written_back, Native, Nothing> native_{};
+  bool is_changed_ = false;
+};
+
+template <class... A>
+void write_back(std::tuple<WireCell<A>...>& cells) {
+  std::apply(
+      [](WireCell<A>&... cell) {
+        (cell.prepare(), ...);
+        (cell.store(), ...);
+      },
+      cells);
+}
+
+/// Runs a member; what it wrote back by then is stored even if it fails.
+template <class Function, class... A>
+auto run(std::tuple<WireCell<A>...>& cells, Function&& function) {
+  if constexpr (!(WireCell<A>::is_written_back || ...)) {
+    return function();
+  } else {
+    try {
+      return function();
+    } catch (...) {
+      write_back(cells);
+      throw;
+    }
+  }
+}
+
+template <class A>
+constexpr bool is_null(const WireParameter<A>& given) noexcept {
+  if constexpr (passing<A>() != Passing::by_value) return given == nullptr;
+  else return false;
+}
+
+template <class T>
+void initialize(T& place) noexcept {
+  place = T{};
+}
+
+template <class C, auto M, class Signature = decltype(M)>
+struct MethodThunk;
+
+template <class C, auto M, class Owner, class R, class... A>
+struct MethodThunk<C, M, R (Owner::*)(A...)> {
+  static HRESULT STDMETHODCALLTYPE call(ComObject<C>* self, WireParameter<A>... given,
+                                        typename Wire<R>::Type* result) noexcept {
+    if (result == nullptr) return E_POINTER;
+    initialize(*result);
+    if ((is_null<A>(given) || ...)) return E_POINTER;
+    return guarded([&] {
+      std::tuple<WireCell<A>...> cells{WireCell<A>(given)...};
+      const R answer = run(cells, [&] {
+        return std::apply([&](WireCell<A>&... cell) { return (self->object.*M)(cell.value()...); }, cells);
+      });
+      auto native = Wire<R>::to(answer);
+      write_back(cells);
+      Wire<R>::store(*result, std::move(native));
+    });
+  }
+};
+
+template <class C, auto M, class Owner, class... A>
+struct MethodThunk<C, M, void (Owner::*)(A...)> {
+  static HRESULT STDMETHODCALLTYPE call(ComObject<C>* self, WireParameter<A>... given) noexcept {
+    if ((is_null<A>(given) || ...)) return E_POINTER;
+    return guarded([&] {
+      std::tuple<WireCell<A>...> cells{WireCell<A>(given)...};
+      run(cells, [&] { std::apply([&](WireCell<A>&... cell) { (self->object.*M)(cell.value()...); }, cells); });
+      write_back(cells);
+    });
+  }
+};
+
+template <class C, auto M>
+struct PropertyThunk {
+  using Field = typename MemberTraits<M>::Result;
+  using Type = typename Wire<PropertyType<M>>::Type;
+
+  static Field& field(ComObject<C>* self) noexcept {
+    return detail::part_of<typename MemberTraits<M>::Class>(self->object).*M;
+  }
+
+  static HRESULT STDMETHODCALLTYPE get(ComObject<C>* self, Type* result) noexcept {
+    if (result == nullptr) return E_POINTER;
+    initialize(*result);
+    return guarded([&] { Wire<Field>::store(*result, Wire<Field>::to(field(self))); });
+  }
+
+  static HRESULT STDMETHODCALLTYPE put(ComObject<C>* self, Type value) noexcept {
+    return guarded([&] {
+      if constexpr (std::is_same_v<Field, ObjectRef>) field(self) = convert<ObjectRef>(variant_from(value), {});
+      else field(self) = Wire<Field>::from(value);
+    });
+  }
+};
+
+/// A list of slots as a type: the functions have as many signatures as there are members.
+template <auto... Functions>
+struct SlotList {};
+
+template <auto... A, auto... B>
+constexpr SlotList<A..., B...> operator+(SlotList<A...>, SlotList<B...>) {
+  return {};
+}
+
+/// The policy that names the function of each slot. Only its types are used.
+template <class C>
+struct Vtable {
+  template <auto M>
+  static constexpr SlotList<&PropertyThunk<C, M>::get> get_only(MemberName, const char*) {
+    return {};
+  }
+
+  template <auto M>
+  static constexpr SlotList<&PropertyThunk<C, M>::put> put_only(MemberName, const char*) {
+    return {};
+  }
+
+  template <auto M>
+  static constexpr SlotList<&PropertyThunk<C, M>::get, &PropertyThunk<C, M>::put> property(MemberName, const char*) {
+    return {};
+  }
+
+  template <auto M>
+  static constexpr SlotList<&PropertyThunk<C, M>::put, &PropertyThunk<C, M>::get> property_put_first(MemberName,
+                                                                                                      const char*) {
+    return {};
+  }
+
+  template <auto M, class... Names>
+  static constexpr SlotList<&MethodThunk<C, M>::call> method(MemberName, const char*, Names...) {
+    return {};
+  }
+
+  template <auto M, class... Names>
+  static constexpr SlotList<&MethodThunk<C, M>::call> pending(MemberName, const char*, Names...) {
+    return {};
+  }
+
+  template <class... Rows>
+  static constexpr auto rows(const Rows&...) -> decltype((SlotList<>{} + ... + Rows{})) {
+    return {};
+  }
+};
+
+template <class C>
+using SlotsOf = decltype(members_of<Vtable<C>>(std::type_identity<C>{}));
+
+}  // namespace talutil::com

@@ -1,0 +1,102 @@
+#include "platform/win32/win32_platform.hpp"
+
+#include <array>
+
+#include "automation/run_time_error.hpp"
+#include "platform/win32/windows.hpp"
+
+namespace talutil::win32 {
+
+namespace {
+
+/// The host application's title: the name of its program, without folder and extension.
+Text host_title() {
+  std::array<wchar_t, MAX_PATH> path{};
+  const DWORD length = GetModuleFileNameW(nullptr, path.data(), static_cast<DWORD>(path.size()));
+  TextView name = view(path.data(), length);
+  name.remove_prefix(name.find_last_of(u'\\') + 1);
+  return Text(name.substr(0, name.find_last_of(u'.')));
+}
+
+constexpr float twips_per_inch = 1440;
+
+float twips_per_pixel(int capability) {
+  const HDC screen = GetDC(nullptr);
+  if (screen == nullptr) raise(ErrorNumber::internal_error);
+  const int dots_per_inch = GetDeviceCaps(screen, capability);
+  ReleaseDC(nullptr, screen);
+  return twips_per_inch / static_cast<float>(dots_per_inch);
+}
+
+class Window final : public HiddenWindow {
+ public:
+  explicit Window(HWND handle) noexcept : handle_(handle) {}
+  Window(const Window&) = delete;
+  Window& operator=(const Window&) = delete;
+  ~Window() override { DestroyWindow(handle_); }
+
+  [[nodiscard]] std::intptr_t handle() const noexcept override { return reinterpret_cast<std::intptr_t>(handle_); }
+
+ private:
+  HWND handle_;
+};
+
+/// The first character of a setting of the user's locale; the given one where it is empty.
+char16_t user_character(LCTYPE setting, char16_t otherwise) {
+  std::array<wchar_t, 16> text{};
+  const int length = GetLocaleInfoW(LOCALE_USER_DEFAULT, setting, text.data(), static_cast<int>(text.size()));
+  return length > 1 ? static_cast<char16_t>(text[0]) : otherwise;
+}
+
+}  // namespace
+
+MessageAnswer Win32MessageBoxes::show(TextView text, MessageButtons buttons, TextView title) {
+  const Text caption = title.empty() ? host_title() : Text(title);
+  const UINT style = buttons == MessageButtons::ok ? MB_OK : MB_YESNO;
+  switch (MessageBoxW(GetActiveWindow(), wide(Text(text)), wide(caption), style | MB_TASKMODAL)) {
+    case IDOK: return MessageAnswer::ok;
+    case IDYES: return MessageAnswer::yes;
+    case IDNO: return MessageAnswer::no;
+    default: return buttons == MessageButtons::ok ? MessageAnswer::cancel : MessageAnswer::no;
+  }
+}
+
+float Win32Screen::twips_per_pixel_x() { return twips_per_pixel(LOGPIXELSX); }
+
+float Win32Screen::twips_per_pixel_y() { return twips_per_pixel(LOGPIXELSY); }
+
+Text Win32Computer::name() {
+  std::array<wchar_t, MAX_COMPUTERNAME_LENGTH + 1> name{};
+  auto length = static_cast<DWORD>(name.size());
+  return GetComputerNameW(name.data(), &length) != 0 ? Text(view(name.data(), length)) : Text();
+}
+
+Locale Win32Computer::locale() {
+  const Locale standard;
+  Locale result;
+  result.decimal_separator = user_character(LOCALE_SDECIMAL, standard.decimal_separator);
+  result.thousands_separator = user_character(LOCALE_STHOUSAND, standard.thousands_separator);
+  result.currency_symbol = user_character(LOCALE_SCURRENCY, standard.currency_symbol);
+  return result;
+}
+
+Date Win32Clock::now() {
+  SYSTEMTIME now;
+  GetLocalTime(&now);
+  return date_from_parts({now.wYear, now.wMonth, now.wDay, now.wHour, now.wMinute, now.wSecond}).value_or(Date{});
+}
+
+std::unique_ptr<HiddenWindow> Win32FormWindows::make_hidden(TextView caption) {
+  // A class of the system's own: its window procedure stays where it is when the library is unloaded.
+  const auto make = [caption = Text(caption)](HWND parent) {
+    return CreateWindowExW(0, L"Static", wide(caption), WS_OVERLAPPEDWINDOW, CW_USEDEFAULT, 0, CW_USEDEFAULT, 0, parent,
+                           nullptr, nullptr, nullptr);
+  };
+  HWND window = make(nullptr);
+  // Where there is no desktop to put windows on, one that only takes messages does for everything but dialogs.
+  if (window == nullptr) window = make(HWND_MESSAGE);
+  if (window == nullptr) raise(ErrorNumber::internal_error);
+  return std::make_unique<Window>(window);
+}
+
+}  // namespace talutil::win32

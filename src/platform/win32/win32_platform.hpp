@@ -1,0 +1,35 @@
+#pragma once
+
+#include "platform/platform.hpp"
+
+namespace talutil::win32 {
+
+class Win32MessageBoxes final : public MessageBoxes {
+ public:
+  MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override;
+};
+
+class Win32Screen final : public Screen {
+ public:
+  float twips_per_pixel_x() override;
+  float twips_per_pixel_y() override;
+};
+
+class Win32Computer final : public Computer {
+ public:
+  Text name() override;
+  Locale locale() override;
+};
+
+class Win32Clock final : public Clock {
+ public:
+  Date now() override;
+};
+
+class Win32FormWindows final : public FormWindows {
+ public:
+  /// Raises 51 when the platform makes no window at all.
+  std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
+};
+
+}  // namespace talutil::win32

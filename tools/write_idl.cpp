@@ -1,0 +1,45 @@
+// Writes what the Windows build makes from the interface tables: "idl" the interface definition as the
+// compiler wants it, "manifest" the manifest for use without registration. Built for the machine that builds,
+// also when the library itself is built for Windows.
+#include <cstdio>
+#include <string>
+#include <string_view>
+
+#include "library/identity.hpp"
+#include "library/interface_definition.hpp"
+#include "library/version.hpp"
+
+namespace {
+
+using namespace talutil;
+
+std::string class_entry(std::string_view identifier, std::string_view program_id) {
+  return "    <comClass clsid=\"{" + std::string(identifier) + "}\" progid=\"" + std::string(program_id) +
+         "\" tlbid=\"{" + std::string(identity::type_library) + "}\" threadingModel=\"Apartment\"/>\n";
+}
+
+std::string manifest() {
+  return "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"yes\"?>\n"
+         "<assembly xmlns=\"urn:schemas-microsoft-com:asm.v1\" manifestVersion=\"1.0\">\n"
+         "  <assemblyIdentity type=\"win32\" name=\"TALUtil\" version=\"" +
+         std::string(version_text) +
+         ".0\" processorArchitecture=\"x86\"/>\n"
+         "  <file name=\"TALUtil.dll\">\n" +
+         class_entry(identity::orv_utils_class, "TALUtil.ORVUtils") +
+         class_entry(identity::control_position_class, "TALUtil.cControlPosition") + "    <typelib tlbid=\"{" +
+         std::string(identity::type_library) + "}\" version=\"" + std::to_string(identity::type_library_major) + "." +
+         std::to_string(identity::type_library_minor) + "\" helpdir=\"\"/>\n  </file>\n</assembly>\n";
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  const std::string_view what = argc == 2 ? argv[1] : "";
+  if (what != "idl" && what != "manifest") {
+    std::fputs("usage: write_idl idl|manifest\n", stderr);
+    return 2;
+  }
+  const std::string text =
+      what == "idl" ? "import \"base.idl\";\n\n" + interface_definition(Dialect::compiler) : manifest();
+  return std::fputs(text.c_str(), stdout) < 0 ? 1 : 0;
+}
