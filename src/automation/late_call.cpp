@@ -57,11 +57,16 @@ ObjectRef convert(const Variant& value, const Locale& /*locale*/) {
 
 Variant Parameter::default_value() const {
   switch (type) {
-    case ValueType::boolean: return Boolean(default_number != 0);
-    case ValueType::int16: return static_cast<std::int16_t>(default_number);
-    case ValueType::int32: return default_number;
-    case ValueType::text: return Text(default_text.begin(), default_text.end());
-    default: return missing_argument;
+    case ValueType::boolean:
+      return Boolean(default_number != 0);
+    case ValueType::int16:
+      return static_cast<std::int16_t>(default_number);
+    case ValueType::int32:
+      return default_number;
+    case ValueType::text:
+      return Text(default_text.begin(), default_text.end());
+    default:
+      return missing_argument;
   }
 }
 
@@ -98,8 +103,7 @@ Variant LateInterface::call(void* target, std::int32_t slot, std::span<Argument>
     const auto* const error = argument.value.get_if<ErrorValue>();
     return error != nullptr && *error == missing_argument;
   };
-  const bool complete =
-      arguments.size() == parameters.size() && std::ranges::none_of(arguments, is_missing);
+  const bool complete = arguments.size() == parameters.size() && std::ranges::none_of(arguments, is_missing);
   if (complete) return function(target, arguments, locale);
 
   // What is left out gets a place of its own, so that a default that a member writes to goes nowhere.

@@ -97,8 +97,10 @@ class Cell {
 /// The object that a member pointer applies to: the target itself, or the settings it shares.
 template <class Class, class Target>
 Class& part_of(Target& target) {
-  if constexpr (std::is_base_of_v<Class, Target>) return target;
-  else return target.settings();
+  if constexpr (std::is_base_of_v<Class, Target>)
+    return target;
+  else
+    return target.settings();
 }
 
 template <class Target, auto M>
@@ -126,8 +128,10 @@ template <class Target, auto M>
 Variant late_get(void* target, std::span<Argument> /*arguments*/, const Locale& /*locale*/) {
   using Traits = MemberTraits<M>;
   auto& object = part_of<typename Traits::Class>(*static_cast<Target*>(target));
-  if constexpr (Traits::is_function) return (object.*M)();
-  else return object.*M;
+  if constexpr (Traits::is_function)
+    return (object.*M)();
+  else
+    return object.*M;
 }
 
 template <class Target, auto M>
@@ -201,8 +205,9 @@ struct LateInterface {
 template <class C>
 [[nodiscard]] const LateInterface& late_interface() {
   static constexpr auto calls = members_of<LateCalls<C>>(std::type_identity<C>{});
-  static constexpr LateInterface table{
-      described<C>, calls, [](TextView name) { return name_index<C>.find(std::span<const Member>(described<C>), name); }};
+  static constexpr LateInterface table{described<C>, calls, [](TextView name) {
+                                         return name_index<C>.find(std::span<const Member>(described<C>), name);
+                                       }};
   return table;
 }
 

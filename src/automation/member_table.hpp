@@ -26,23 +26,45 @@ namespace talutil {
 
 /// The types of the interface. None is the result of a member that gives nothing.
 enum class ValueType : std::uint8_t {
-  none, boolean, int16, int32, single, date, text, variant, text_array, system_time, object
+  none,
+  boolean,
+  int16,
+  int32,
+  single,
+  date,
+  text,
+  variant,
+  text_array,
+  system_time,
+  object
 };
 
 template <class T>
 consteval ValueType value_type() {
-  if constexpr (std::is_void_v<T>) return ValueType::none;
-  else if constexpr (std::is_same_v<T, Boolean>) return ValueType::boolean;
-  else if constexpr (std::is_same_v<T, std::int16_t>) return ValueType::int16;
-  else if constexpr (std::is_same_v<T, std::int32_t>) return ValueType::int32;
-  else if constexpr (std::is_same_v<T, float>) return ValueType::single;
-  else if constexpr (std::is_same_v<T, Date>) return ValueType::date;
-  else if constexpr (std::is_same_v<T, Text>) return ValueType::text;
-  else if constexpr (std::is_same_v<T, Variant>) return ValueType::variant;
-  else if constexpr (std::is_same_v<T, TextArray>) return ValueType::text_array;
-  else if constexpr (std::is_same_v<T, SystemTime>) return ValueType::system_time;
-  else if constexpr (std::is_same_v<T, ObjectRef>) return ValueType::object;
-  else static_assert(!sizeof(T*), "not a type of the interface");
+  if constexpr (std::is_void_v<T>)
+    return ValueType::none;
+  else if constexpr (std::is_same_v<T, Boolean>)
+    return ValueType::boolean;
+  else if constexpr (std::is_same_v<T, std::int16_t>)
+    return ValueType::int16;
+  else if constexpr (std::is_same_v<T, std::int32_t>)
+    return ValueType::int32;
+  else if constexpr (std::is_same_v<T, float>)
+    return ValueType::single;
+  else if constexpr (std::is_same_v<T, Date>)
+    return ValueType::date;
+  else if constexpr (std::is_same_v<T, Text>)
+    return ValueType::text;
+  else if constexpr (std::is_same_v<T, Variant>)
+    return ValueType::variant;
+  else if constexpr (std::is_same_v<T, TextArray>)
+    return ValueType::text_array;
+  else if constexpr (std::is_same_v<T, SystemTime>)
+    return ValueType::system_time;
+  else if constexpr (std::is_same_v<T, ObjectRef>)
+    return ValueType::object;
+  else
+    static_assert(!sizeof(T*), "not a type of the interface");
 }
 
 /// How an argument travels: `T`, `const T&` and `T&` of the C++ signature.
@@ -50,8 +72,10 @@ enum class Passing : std::uint8_t { by_value, by_reference, written_back };
 
 template <class P>
 consteval Passing passing() {
-  if constexpr (!std::is_reference_v<P>) return Passing::by_value;
-  else return std::is_const_v<std::remove_reference_t<P>> ? Passing::by_reference : Passing::written_back;
+  if constexpr (!std::is_reference_v<P>)
+    return Passing::by_value;
+  else
+    return std::is_const_v<std::remove_reference_t<P>> ? Passing::by_reference : Passing::written_back;
 }
 
 /// What a row says of a parameter: its published name and, for one that callers may leave out, its default.
@@ -139,8 +163,7 @@ template <class C, class R, class... A>
 struct MemberPointer<R (C::*)(A...) const> : MemberPointer<R (C::*)(A...)> {};
 
 template <class C, class T>
-  requires(!std::is_function_v<T>)
-struct MemberPointer<T C::*> {
+requires(!std::is_function_v<T>) struct MemberPointer<T C::*> {
   using Class = C;
   using Result = T;
   static constexpr bool is_function = false;
@@ -229,7 +252,7 @@ struct Describe {
 
   template <class A>
   static constexpr Parameter parameter(const ParameterName& given) {
-    return {given.name,        value_type<std::remove_cvref_t<A>>(), passing<A>(), given.is_optional, given.number,
+    return {given.name, value_type<std::remove_cvref_t<A>>(), passing<A>(), given.is_optional, given.number,
             given.text};
   }
 };
@@ -286,9 +309,8 @@ class NameIndex {
                                             std::basic_string_view<Char> name) const noexcept {
     for (std::size_t at = hash(name) % Slots; slots_[at] != 0; at = (at + 1) % Slots) {
       const std::string_view candidate = members[slots_[at] - 1].name;
-      if (std::equal(candidate.begin(), candidate.end(), name.begin(), name.end(), [](char a, Char b) {
-            return b < 0x80 && fold_case(a) == fold_case(static_cast<char>(b));
-          })) {
+      if (std::equal(candidate.begin(), candidate.end(), name.begin(), name.end(),
+                     [](char a, Char b) { return b < 0x80 && fold_case(a) == fold_case(static_cast<char>(b)); })) {
         return slots_[at] - 1;
       }
     }

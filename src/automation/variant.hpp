@@ -52,8 +52,21 @@ struct ForeignArray {
 class Variant {
  public:
   enum class Kind : std::uint8_t {
-    empty, null, boolean, byte, int16, int32, single, double_, currency, date, text, error, text_array,
-    foreign_array, object
+    empty,
+    null,
+    boolean,
+    byte,
+    int16,
+    int32,
+    single,
+    double_,
+    currency,
+    date,
+    text,
+    error,
+    text_array,
+    foreign_array,
+    object
   };
 
   Variant() noexcept = default;
@@ -80,9 +93,13 @@ class Variant {
   [[nodiscard]] bool is(Kind wanted) const noexcept { return kind() == wanted; }
 
   template <class T>
-  [[nodiscard]] const T* get_if() const noexcept { return std::get_if<T>(&storage_); }
+  [[nodiscard]] const T* get_if() const noexcept {
+    return std::get_if<T>(&storage_);
+  }
   template <class T>
-  [[nodiscard]] T* get_if() noexcept { return std::get_if<T>(&storage_); }
+  [[nodiscard]] T* get_if() noexcept {
+    return std::get_if<T>(&storage_);
+  }
 
   template <class Visitor>
   decltype(auto) visit(Visitor&& visitor) const {

@@ -33,9 +33,12 @@ class ComObject {
   static HRESULT STDMETHODCALLTYPE query_interface(ComObject* self, const IID* id, void** out) noexcept {
     if (out == nullptr || id == nullptr) return E_POINTER;
     *out = nullptr;
-    if (*id == IID_IUnknown || *id == IID_IDispatch || *id == ClassTraits<C>::interface_id) *out = self;
-    else if (*id == IID_ISupportErrorInfo) *out = static_cast<ISupportErrorInfo*>(&self->error_support_);
-    else if (*id == IID_IProvideClassInfo) *out = static_cast<IProvideClassInfo*>(&self->class_information_);
+    if (*id == IID_IUnknown || *id == IID_IDispatch || *id == ClassTraits<C>::interface_id)
+      *out = self;
+    else if (*id == IID_ISupportErrorInfo)
+      *out = static_cast<ISupportErrorInfo*>(&self->error_support_);
+    else if (*id == IID_IProvideClassInfo)
+      *out = static_cast<IProvideClassInfo*>(&self->class_information_);
     if (*out == nullptr) return E_NOINTERFACE;
     add_reference(self);
     return S_OK;
@@ -73,7 +76,7 @@ class ComObject {
                                                  UINT* bad_argument) noexcept {
     if (id == nullptr) return E_POINTER;
     if (*id != IID_NULL) return DISP_E_UNKNOWNINTERFACE;
-    return invoke(late_interface<C>(), &self->object, self->locale_,
+    return invoke(late_interface<C>(), &self->object, self->object.library().locale(),
                   {member, flags, parameters, result, exception, bad_argument});
   }
 
@@ -83,7 +86,9 @@ class ComObject {
   class Part : public Interface {
    public:
     explicit Part(ComObject* owner) noexcept : owner_(owner) {}
-    HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override { return query_interface(owner_, &id, out); }
+    HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override {
+      return query_interface(owner_, &id, out);
+    }
     ULONG STDMETHODCALLTYPE AddRef() override { return add_reference(owner_); }
     ULONG STDMETHODCALLTYPE Release() override { return release(owner_); }
 
@@ -118,7 +123,6 @@ class ComObject {
   C object;
 
  private:
-  Locale locale_ = object.library().locale();
   ErrorSupport error_support_{this};
   ClassInformation class_information_{this};
   ModuleReference keeps_module_loaded_;

@@ -83,9 +83,12 @@ class DispatchObject final : public Object {
  private:
   static WORD flags_of(Access access) noexcept {
     switch (access) {
-      case Access::put: return DISPATCH_PROPERTYPUT;
-      case Access::get: return DISPATCH_PROPERTYGET;
-      case Access::call: break;
+      case Access::put:
+        return DISPATCH_PROPERTYPUT;
+      case Access::get:
+        return DISPATCH_PROPERTYGET;
+      case Access::call:
+        break;
     }
     return DISPATCH_METHOD;
   }
@@ -146,8 +149,10 @@ class ObjectDispatch final : public IDispatch {
       arguments.reserve(parameters->cArgs);
       for (UINT i = parameters->cArgs; i > 0; --i) arguments.push_back(variant_from(parameters->rgvarg[i - 1]));
       Access access = Access::call;
-      if ((flags & (DISPATCH_PROPERTYPUT | DISPATCH_PROPERTYPUTREF)) != 0) access = Access::put;
-      else if ((flags & DISPATCH_METHOD) == 0) access = Access::get;
+      if ((flags & (DISPATCH_PROPERTYPUT | DISPATCH_PROPERTYPUTREF)) != 0)
+        access = Access::put;
+      else if ((flags & DISPATCH_METHOD) == 0)
+        access = Access::get;
       OwnedVariant answer = native_from(object_->invoke(id, access, arguments), ArrayStyle::of_variants);
       if (result != nullptr) *result = answer.release();
       return S_OK;

@@ -79,8 +79,10 @@ class ClassObject final : public IClassFactory {
   }
 
   HRESULT STDMETHODCALLTYPE LockServer(BOOL lock) override {
-    if (lock != FALSE) AddRef();
-    else Release();
+    if (lock != FALSE)
+      AddRef();
+    else
+      Release();
     return S_OK;
   }
 

@@ -102,22 +102,38 @@ class WriteBack {
   void store_typed() noexcept {
     VARIANT& native = native_.get();
     switch (V_VT(&native)) {
-      case VT_BSTR: std::swap(*V_BSTRREF(variable_), V_BSTR(&native)); break;
-      case VT_DISPATCH: std::swap(*V_DISPATCHREF(variable_), V_DISPATCH(&native)); break;
-      case VT_UNKNOWN: std::swap(*V_UNKNOWNREF(variable_), V_UNKNOWN(&native)); break;
+      case VT_BSTR:
+        std::swap(*V_BSTRREF(variable_), V_BSTR(&native));
+        break;
+      case VT_DISPATCH:
+        std::swap(*V_DISPATCHREF(variable_), V_DISPATCH(&native));
+        break;
+      case VT_UNKNOWN:
+        std::swap(*V_UNKNOWNREF(variable_), V_UNKNOWN(&native));
+        break;
       case VT_UI1:
-      case VT_I1: *V_UI1REF(variable_) = V_UI1(&native); break;
+      case VT_I1:
+        *V_UI1REF(variable_) = V_UI1(&native);
+        break;
       case VT_I2:
       case VT_UI2:
-      case VT_BOOL: *V_I2REF(variable_) = V_I2(&native); break;
+      case VT_BOOL:
+        *V_I2REF(variable_) = V_I2(&native);
+        break;
       case VT_I4:
       case VT_UI4:
       case VT_INT:
       case VT_UINT:
       case VT_ERROR:
-      case VT_R4: *V_I4REF(variable_) = V_I4(&native); break;
-      case VT_DECIMAL: *V_DECIMALREF(variable_) = V_DECIMAL(&native); break;
-      default: *V_I8REF(variable_) = V_I8(&native); break;
+      case VT_R4:
+        *V_I4REF(variable_) = V_I4(&native);
+        break;
+      case VT_DECIMAL:
+        *V_DECIMALREF(variable_) = V_DECIMAL(&native);
+        break;
+      default:
+        *V_I8REF(variable_) = V_I8(&native);
+        break;
     }
   }
 
@@ -174,7 +190,8 @@ HRESULT check_required(const Member& member, const Invocation& invocation, const
 
 /// The slot for the way a caller uses a member; -1 when the member has none.
 std::int32_t slot_for(const LateInterface& table, DISPID member, WORD flags) noexcept {
-  if ((flags & put_flags) == 0) return table.slot_of(member, (flags & DISPATCH_METHOD) != 0 ? Access::call : Access::get);
+  if ((flags & put_flags) == 0)
+    return table.slot_of(member, (flags & DISPATCH_METHOD) != 0 ? Access::call : Access::get);
   const std::int32_t slot = table.slot_of(member, Access::put);
   // A reference is put only where an object is kept.
   const bool by_reference_only = (flags & put_flags) == DISPATCH_PROPERTYPUTREF;
@@ -201,14 +218,15 @@ HRESULT find_identifiers(const LateInterface& table, wchar_t** names, UINT count
       const TextView name = name_at(i);
       return same_name(parameter.name, to_utf8(name));
     });
-    if (found == parameters.end()) result = DISP_E_UNKNOWNNAME;
-    else ids[i] = static_cast<DISPID>(found - parameters.begin());
+    if (found == parameters.end())
+      result = DISP_E_UNKNOWNNAME;
+    else
+      ids[i] = static_cast<DISPID>(found - parameters.begin());
   }
   return result;
 }
 
-HRESULT invoke(const LateInterface& table, void* target, const Locale& locale,
-               const Invocation& invocation) noexcept {
+HRESULT invoke(const LateInterface& table, void* target, const Locale& locale, const Invocation& invocation) noexcept {
   const DISPPARAMS* const given = invocation.parameters;
   if (given == nullptr || (given->cArgs != 0 && given->rgvarg == nullptr) || given->cNamedArgs > given->cArgs ||
       (given->cNamedArgs != 0 && given->rgdispidNamedArgs == nullptr)) {

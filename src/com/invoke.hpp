@@ -8,8 +8,7 @@
 namespace talutil::com {
 
 /// IDispatch::GetIDsOfNames over a member table; the names after the first are parameters of the member.
-[[nodiscard]] HRESULT find_identifiers(const LateInterface& table, wchar_t** names, UINT count,
-                                       DISPID* ids) noexcept;
+[[nodiscard]] HRESULT find_identifiers(const LateInterface& table, wchar_t** names, UINT count, DISPID* ids) noexcept;
 
 struct Invocation {
   DISPID member;

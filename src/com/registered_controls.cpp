@@ -17,7 +17,8 @@ constexpr const wchar_t* key_name = L"Software\\TALUtil\\Controls";
 Text registered_class(HKEY root, const Text& class_name) {
   std::array<wchar_t, 256> value{};
   DWORD size = sizeof value;
-  const LSTATUS status = RegGetValueW(root, key_name, win32::wide(class_name), RRF_RT_REG_SZ, nullptr, value.data(), &size);
+  const LSTATUS status =
+      RegGetValueW(root, key_name, win32::wide(class_name), RRF_RT_REG_SZ, nullptr, value.data(), &size);
   return status == ERROR_SUCCESS ? Text(win32::view(value.data(), size / sizeof(wchar_t) - 1)) : Text();
 }
 

@@ -61,7 +61,7 @@ HKEY root_of(RegistrationScope scope) noexcept {
   return scope == RegistrationScope::user ? HKEY_CURRENT_USER : HKEY_LOCAL_MACHINE;
 }
 
-const std::wstring classes = L"Software\\Classes\\";
+std::wstring class_key(const std::wstring& rest) { return L"Software\\Classes\\" + rest; }
 
 struct ClassEntry {
   GUID class_id;
@@ -75,9 +75,9 @@ constexpr ClassEntry entries[] = {
 
 void register_class(HKEY root, const ClassEntry& entry, const std::wstring& path) {
   const std::wstring identifier = text_of(entry.class_id);
-  const std::wstring key = classes + L"CLSID\\" + identifier;
-  Key::create(root, classes + entry.program_id).set(nullptr, entry.program_id);
-  Key::create(root, classes + entry.program_id + L"\\CLSID").set(nullptr, identifier);
+  const std::wstring key = class_key(L"CLSID\\" + identifier);
+  Key::create(root, class_key(entry.program_id)).set(nullptr, entry.program_id);
+  Key::create(root, class_key(entry.program_id + std::wstring(L"\\CLSID"))).set(nullptr, identifier);
   Key::create(root, key).set(nullptr, entry.program_id);
   const Key server = Key::create(root, key + L"\\InprocServer32");
   server.set(nullptr, path);
@@ -85,7 +85,8 @@ void register_class(HKEY root, const ClassEntry& entry, const std::wstring& path
   Key::create(root, key + L"\\ProgID").set(nullptr, entry.program_id);
   Key::create(root, key + L"\\TypeLib").set(nullptr, text_of(guid_of(identity::type_library)));
   Key::create(root, key + L"\\Version")
-      .set(nullptr, std::to_wstring(identity::type_library_major) + L"." + std::to_wstring(identity::type_library_minor));
+      .set(nullptr,
+           std::to_wstring(identity::type_library_major) + L"." + std::to_wstring(identity::type_library_minor));
   Key::create(root, key + L"\\Programmable").set(nullptr, L"");
 }
 
@@ -119,13 +120,15 @@ HRESULT unregister_library(RegistrationScope scope) noexcept {
       if (status != ERROR_FILE_NOT_FOUND) Key::check(status);
     };
     for (const ClassEntry& entry : entries) {
-      remove(classes + entry.program_id);
-      remove(classes + L"CLSID\\" + text_of(entry.class_id));
+      remove(class_key(entry.program_id));
+      remove(class_key(L"CLSID\\" + text_of(entry.class_id)));
     }
     const GUID library = guid_of(identity::type_library);
     const auto unregister = scope == RegistrationScope::user ? &UnRegisterTypeLibForUser : &UnRegisterTypeLib;
-    const HRESULT result = unregister(library, identity::type_library_major, identity::type_library_minor, 0, SYS_WIN32);
-    if (FAILED(result) && result != TYPE_E_REGISTRYACCESS && result != TYPE_E_LIBNOTREGISTERED) throw error_of(result, {});
+    const HRESULT result =
+        unregister(library, identity::type_library_major, identity::type_library_minor, 0, SYS_WIN32);
+    if (FAILED(result) && result != TYPE_E_REGISTRYACCESS && result != TYPE_E_LIBNOTREGISTERED)
+      throw error_of(result, {});
   });
 }
 

@@ -68,9 +68,8 @@ struct Wire<TextArray> {
 
 /// The caller's type of a parameter: by value, or a pointer to it.
 template <class A>
-using WireParameter =
-    std::conditional_t<passing<A>() == Passing::by_value, typename Wire<std::remove_cvref_t<A>>::Type,
-                       typename Wire<std::remove_cvref_t<A>>::Type*>;
+using WireParameter = std::conditional_t<passing<A>() == Passing::by_value, typename Wire<std::remove_cvref_t<A>>::Type,
+                                         typename Wire<std::remove_cvref_t<A>>::Type*>;
 
 /// One argument of a vtable call.
 template <class A>
@@ -145,8 +144,10 @@ auto run(std::tuple<WireCell<A>...>& cells, Function&& function) {
 
 template <class A>
 constexpr bool is_null(const WireParameter<A>& given) noexcept {
-  if constexpr (passing<A>() != Passing::by_value) return given == nullptr;
-  else return false;
+  if constexpr (passing<A>() != Passing::by_value)
+    return given == nullptr;
+  else
+    return false;
 }
 
 template <class T>
@@ -205,8 +206,10 @@ struct PropertyThunk {
 
   static HRESULT STDMETHODCALLTYPE put(ComObject<C>* self, Type value) noexcept {
     return guarded([&] {
-      if constexpr (std::is_same_v<Field, ObjectRef>) field(self) = convert<ObjectRef>(variant_from(value), {});
-      else field(self) = Wire<Field>::from(value);
+      if constexpr (std::is_same_v<Field, ObjectRef>)
+        field(self) = convert<ObjectRef>(variant_from(value), {});
+      else
+        field(self) = Wire<Field>::from(value);
     });
   }
 };
@@ -240,7 +243,7 @@ struct Vtable {
 
   template <auto M>
   static constexpr SlotList<&PropertyThunk<C, M>::put, &PropertyThunk<C, M>::get> property_put_first(MemberName,
-                                                                                                      const char*) {
+                                                                                                     const char*) {
     return {};
   }
 

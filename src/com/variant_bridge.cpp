@@ -20,7 +20,9 @@ class ArrayAccess {
   ~ArrayAccess() { SafeArrayUnaccessData(array_); }
 
   template <class T>
-  [[nodiscard]] T* as() const noexcept { return static_cast<T*>(data_); }
+  [[nodiscard]] T* as() const noexcept {
+    return static_cast<T*>(data_);
+  }
 
  private:
   SAFEARRAY* array_;
@@ -45,27 +47,46 @@ Variant whole_number(T value) {
 Variant simple_value(VARTYPE type, const void* data) {
   const auto as = [data]<class T>(std::type_identity<T>) { return *static_cast<const T*>(data); };
   switch (type) {
-    case VT_UI1: return as(std::type_identity<std::uint8_t>{});
-    case VT_I2: return as(std::type_identity<std::int16_t>{});
+    case VT_UI1:
+      return as(std::type_identity<std::uint8_t>{});
+    case VT_I2:
+      return as(std::type_identity<std::int16_t>{});
     case VT_I4:
-    case VT_INT: return as(std::type_identity<std::int32_t>{});
-    case VT_R4: return as(std::type_identity<float>{});
-    case VT_R8: return as(std::type_identity<double>{});
-    case VT_CY: return Currency{as(std::type_identity<std::int64_t>{})};
-    case VT_DATE: return Date{as(std::type_identity<double>{})};
-    case VT_BOOL: return Boolean::from_bits(as(std::type_identity<std::int16_t>{}));
-    case VT_ERROR: return ErrorValue{as(std::type_identity<std::int32_t>{})};
-    case VT_BSTR: return text_from(as(std::type_identity<BSTR>{}));
-    case VT_I1: return whole_number(as(std::type_identity<std::int8_t>{}));
-    case VT_UI2: return whole_number(as(std::type_identity<std::uint16_t>{}));
+    case VT_INT:
+      return as(std::type_identity<std::int32_t>{});
+    case VT_R4:
+      return as(std::type_identity<float>{});
+    case VT_R8:
+      return as(std::type_identity<double>{});
+    case VT_CY:
+      return Currency{as(std::type_identity<std::int64_t>{})};
+    case VT_DATE:
+      return Date{as(std::type_identity<double>{})};
+    case VT_BOOL:
+      return Boolean::from_bits(as(std::type_identity<std::int16_t>{}));
+    case VT_ERROR:
+      return ErrorValue{as(std::type_identity<std::int32_t>{})};
+    case VT_BSTR:
+      return text_from(as(std::type_identity<BSTR>{}));
+    case VT_I1:
+      return whole_number(as(std::type_identity<std::int8_t>{}));
+    case VT_UI2:
+      return whole_number(as(std::type_identity<std::uint16_t>{}));
     case VT_UI4:
-    case VT_UINT: return whole_number(as(std::type_identity<std::uint32_t>{}));
-    case VT_I8: return whole_number(as(std::type_identity<std::int64_t>{}));
-    case VT_UI8: return whole_number(as(std::type_identity<std::uint64_t>{}));
-    case VT_DECIMAL: return decimal_to_double(*static_cast<const DECIMAL*>(data));
-    case VT_DISPATCH: return object_from(as(std::type_identity<IDispatch*>{}));
-    case VT_UNKNOWN: return object_from(as(std::type_identity<IUnknown*>{}));
-    default: raise(ErrorNumber::type_mismatch);
+    case VT_UINT:
+      return whole_number(as(std::type_identity<std::uint32_t>{}));
+    case VT_I8:
+      return whole_number(as(std::type_identity<std::int64_t>{}));
+    case VT_UI8:
+      return whole_number(as(std::type_identity<std::uint64_t>{}));
+    case VT_DECIMAL:
+      return decimal_to_double(*static_cast<const DECIMAL*>(data));
+    case VT_DISPATCH:
+      return object_from(as(std::type_identity<IDispatch*>{}));
+    case VT_UNKNOWN:
+      return object_from(as(std::type_identity<IUnknown*>{}));
+    default:
+      raise(ErrorNumber::type_mismatch);
   }
 }
 

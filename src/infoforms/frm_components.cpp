@@ -27,9 +27,8 @@ void FrmComponents::load() {
   // Everything is made before anything is kept, so that a control that cannot be made leaves no half window.
   auto window = platform_.form_windows.make_hidden(caption);
   std::array<ObjectRef, places.size()> controls;
-  std::ranges::transform(places, controls.begin(), [this](const Place& place) {
-    return factory_.create(place.class_name);
-  });
+  std::ranges::transform(places, controls.begin(),
+                         [this](const Place& place) { return factory_.create(place.class_name); });
   window_ = std::move(window);
   controls_ = std::move(controls);
   last_database_error_ = 0;

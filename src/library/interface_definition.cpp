@@ -27,17 +27,27 @@ std::string hexadecimal(std::int32_t value) {
 
 std::string_view type_name(ValueType type) {
   switch (type) {
-    case ValueType::boolean: return "VARIANT_BOOL";
-    case ValueType::int16: return "short";
-    case ValueType::int32: return "long";
-    case ValueType::single: return "float";
-    case ValueType::date: return "DATE";
-    case ValueType::text: return "BSTR";
-    case ValueType::variant: return "VARIANT";
-    case ValueType::text_array: return "SAFEARRAY(BSTR)";
-    case ValueType::system_time: return "SYSTEMTIME";
+    case ValueType::boolean:
+      return "VARIANT_BOOL";
+    case ValueType::int16:
+      return "short";
+    case ValueType::int32:
+      return "long";
+    case ValueType::single:
+      return "float";
+    case ValueType::date:
+      return "DATE";
+    case ValueType::text:
+      return "BSTR";
+    case ValueType::variant:
+      return "VARIANT";
+    case ValueType::text_array:
+      return "SAFEARRAY(BSTR)";
+    case ValueType::system_time:
+      return "SYSTEMTIME";
     case ValueType::none:
-    case ValueType::object: break;
+    case ValueType::object:
+      break;
   }
   return "void";
 }

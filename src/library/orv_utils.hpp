@@ -130,8 +130,7 @@ class ORVUtils {
   virtual Variant ConvertCaseSuburbs(const Variant& vStr);
   virtual void ShowShortCutKeys();
   virtual void ShowCmdLineHelp();
-  virtual Text GenerateFilePassword(const std::int16_t& iMaxLength, const std::int16_t& iMix,
-                                    const std::int16_t& iHex);
+  virtual Text GenerateFilePassword(const std::int16_t& iMaxLength, const std::int16_t& iMix, const std::int16_t& iHex);
   virtual Boolean FileExists(Text sFilename);
   virtual Text ExtractFilename(Text& vSpecIn, const Boolean& bIncludeExt);
   virtual void CopyFileToBackupFile(const Text& sSrcFileName, const Text& sDestFileName);
@@ -144,8 +143,8 @@ class ORVUtils {
   virtual Text ExtractPathName(Text& vSpecIn);
   virtual void SaveTextBox(const Text& sText, const Text& sFilename);
   virtual Text LoadTextBox(const Text& sFilename);
-  virtual Text GetCfgFileData(const Text& sSection, const Text& sItem, const Text& sDefaultData,
-                              const Text& sFilename, const Boolean& bLoadFromFile);
+  virtual Text GetCfgFileData(const Text& sSection, const Text& sItem, const Text& sDefaultData, const Text& sFilename,
+                              const Boolean& bLoadFromFile);
   virtual void SaveCfgFileData(const Text& sSection, const Text& sItem, Text& sOutput, const Text& sFilename,
                                const Boolean& bSaveToFile);
   virtual void CallZIPFiles(const Text& sZipName, const Text& sItems, const std::int16_t& iMultiVolume,

@@ -54,10 +54,14 @@ MessageAnswer Win32MessageBoxes::show(TextView text, MessageButtons buttons, Tex
   const Text caption = title.empty() ? host_title() : Text(title);
   const UINT style = buttons == MessageButtons::ok ? MB_OK : MB_YESNO;
   switch (MessageBoxW(GetActiveWindow(), wide(Text(text)), wide(caption), style | MB_TASKMODAL)) {
-    case IDOK: return MessageAnswer::ok;
-    case IDYES: return MessageAnswer::yes;
-    case IDNO: return MessageAnswer::no;
-    default: return buttons == MessageButtons::ok ? MessageAnswer::cancel : MessageAnswer::no;
+    case IDOK:
+      return MessageAnswer::ok;
+    case IDYES:
+      return MessageAnswer::yes;
+    case IDNO:
+      return MessageAnswer::no;
+    default:
+      return buttons == MessageButtons::ok ? MessageAnswer::cancel : MessageAnswer::no;
   }
 }
 

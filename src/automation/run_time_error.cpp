@@ -1,0 +1,52 @@
+#include "automation/run_time_error.hpp"
+
+namespace talutil {
+
+std::string_view standard_description(std::int32_t number) noexcept {
+  // A switch, so that the compiler asks for the text of every number that is added to the enumeration.
+  // clang-format off
+  switch (static_cast<ErrorNumber>(number)) {
+    case ErrorNumber::invalid_procedure_call: return "Invalid procedure call or argument";  // 5
+    case ErrorNumber::overflow: return "Overflow";  // 6
+    case ErrorNumber::out_of_memory: return "Out of memory";  // 7
+    case ErrorNumber::subscript_out_of_range: return "Subscript out of range";  // 9
+    case ErrorNumber::array_fixed_or_locked: return "This array is fixed or temporarily locked";  // 10
+    case ErrorNumber::division_by_zero: return "Division by zero";  // 11
+    case ErrorNumber::type_mismatch: return "Type mismatch";  // 13
+    case ErrorNumber::internal_error: return "Internal error";  // 51
+    case ErrorNumber::bad_file_name_or_number: return "Bad file name or number";  // 52
+    case ErrorNumber::file_not_found: return "File not found";  // 53
+    case ErrorNumber::file_already_open: return "File already open";  // 55
+    case ErrorNumber::device_io_error: return "Device I/O error";  // 57
+    case ErrorNumber::file_already_exists: return "File already exists";  // 58
+    case ErrorNumber::disk_full: return "Disk full";  // 61
+    case ErrorNumber::input_past_end_of_file: return "Input past end of file";  // 62
+    case ErrorNumber::too_many_files: return "Too many files";  // 67
+    case ErrorNumber::permission_denied: return "Permission denied";  // 70
+    case ErrorNumber::disk_not_ready: return "Disk not ready";  // 71
+    case ErrorNumber::path_file_access: return "Path/File access error";  // 75
+    case ErrorNumber::path_not_found: return "Path not found";  // 76
+    case ErrorNumber::object_variable_not_set: return "Object variable or With block variable not set";  // 91
+    case ErrorNumber::invalid_use_of_null: return "Invalid use of Null";  // 94
+    case ErrorNumber::object_required: return "Object required";  // 424
+    case ErrorNumber::cannot_create_object: return "ActiveX component can't create object";  // 429
+    case ErrorNumber::member_not_supported: return "Object doesn't support this property or method";  // 438
+    case ErrorNumber::action_not_supported: return "Object doesn't support this action";  // 445
+    case ErrorNumber::named_argument_not_found: return "Named argument not found";  // 448
+    case ErrorNumber::argument_not_optional: return "Argument not optional";  // 449
+    case ErrorNumber::wrong_argument_count: return "Wrong number of arguments or invalid property assignment";  // 450
+  }
+  // clang-format on
+  return "Application-defined or object-defined error";
+}
+
+RunTimeError::RunTimeError(ErrorNumber number)
+    : RunTimeError(static_cast<std::int32_t>(number),
+                   from_utf8(standard_description(static_cast<std::int32_t>(number)))) {}
+
+RunTimeError::RunTimeError(std::int32_t number, Text description)
+    : number_(number), description_(std::move(description)), narrow_(to_utf8(description_)) {}
+
+void raise(ErrorNumber number) { throw RunTimeError(number); }
+
+}  // namespace talutil

@@ -1,0 +1,101 @@
+#include "automation/text.hpp"
+
+namespace talutil {
+
+namespace {
+
+constexpr char32_t replacement = 0xFFFD;
+
+constexpr bool is_high_surrogate(char32_t unit) noexcept { return unit >= 0xD800 && unit <= 0xDBFF; }
+constexpr bool is_low_surrogate(char32_t unit) noexcept { return unit >= 0xDC00 && unit <= 0xDFFF; }
+
+void append_utf8(std::string& out, char32_t code) {
+  const auto continuation = [code](int shift) { return static_cast<char>(0x80 | ((code >> shift) & 0x3F)); };
+  if (code < 0x80) {
+    out += static_cast<char>(code);
+  } else if (code < 0x800) {
+    out += static_cast<char>(0xC0 | (code >> 6));
+    out += continuation(0);
+  } else if (code < 0x10000) {
+    out += static_cast<char>(0xE0 | (code >> 12));
+    out += continuation(6);
+    out += continuation(0);
+  } else {
+    out += static_cast<char>(0xF0 | (code >> 18));
+    out += continuation(12);
+    out += continuation(6);
+    out += continuation(0);
+  }
+}
+
+void append_utf16(Text& out, char32_t code) {
+  if (code < 0x10000) {
+    out += static_cast<char16_t>(code);
+    return;
+  }
+  out += static_cast<char16_t>(0xD800 + ((code - 0x10000) >> 10));
+  out += static_cast<char16_t>(0xDC00 + ((code - 0x10000) & 0x3FF));
+}
+
+struct Lead {
+  std::size_t continuations;
+  char32_t bits;
+  char32_t lowest;  ///< Anything below has a shorter form and is refused.
+};
+
+constexpr Lead lead_of(unsigned char byte) noexcept {
+  if (byte >= 0xC2 && byte <= 0xDF) return {1, byte & 0x1FU, 0x80};
+  if (byte >= 0xE0 && byte <= 0xEF) return {2, byte & 0x0FU, 0x800};
+  if (byte >= 0xF0 && byte <= 0xF4) return {3, byte & 0x07U, 0x10000};
+  return {0, replacement, 0};
+}
+
+/// Reads one code point at `at` and moves past it; past the bad byte alone where there is none.
+char32_t next_code(std::string_view bytes, std::size_t& at) noexcept {
+  const auto first = static_cast<unsigned char>(bytes[at++]);
+  if (first < 0x80) return first;
+  const Lead lead = lead_of(first);
+  if (lead.continuations == 0 || bytes.size() - at < lead.continuations) return replacement;
+  char32_t code = lead.bits;
+  for (std::size_t i = 0; i < lead.continuations; ++i) {
+    const auto byte = static_cast<unsigned char>(bytes[at + i]);
+    if ((byte & 0xC0) != 0x80) return replacement;
+    code = (code << 6) | (byte & 0x3FU);
+  }
+  const bool is_surrogate = is_high_surrogate(code) || is_low_surrogate(code);
+  if (code < lead.lowest || code > 0x10FFFF || is_surrogate) return replacement;
+  at += lead.continuations;
+  return code;
+}
+
+}  // namespace
+
+TextView trim_blanks(TextView text) noexcept {
+  const std::size_t first = text.find_first_not_of(u' ');
+  if (first == TextView::npos) return {};
+  return text.substr(first, text.find_last_not_of(u' ') - first + 1);
+}
+
+std::string to_utf8(TextView text) {
+  std::string out;
+  out.reserve(text.size());
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    char32_t code = text[i];
+    if (is_high_surrogate(code) && i + 1 < text.size() && is_low_surrogate(text[i + 1])) {
+      code = 0x10000 + ((code - 0xD800) << 10) + (text[++i] - 0xDC00U);
+    } else if (is_high_surrogate(code) || is_low_surrogate(code)) {
+      code = replacement;
+    }
+    append_utf8(out, code);
+  }
+  return out;
+}
+
+Text from_utf8(std::string_view bytes) {
+  Text out;
+  out.reserve(bytes.size());
+  for (std::size_t at = 0; at < bytes.size();) append_utf16(out, next_code(bytes, at));
+  return out;
+}
+
+}  // namespace talutil

@@ -1,0 +1,193 @@
+#include <gtest/gtest.h>
+
+#include <algorithm>
+
+#include "automation/late_call.hpp"
+#include "controls/control_factory.hpp"
+#include "infoforms/frm_components.hpp"
+#include "library/interface_table.hpp"
+#include "library/library.hpp"
+#include "tests/fakes/fake_platform.hpp"
+
+namespace talutil {
+namespace {
+
+using FakePlatform = talutil::testing::FakePlatform;
+
+/// Another maker's system information control: it knows its identifiers and nothing else.
+class ForeignSystemInformation final : public Object {
+ public:
+  std::int32_t member_id(TextView) override { raise(ErrorNumber::member_not_supported); }
+
+  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
+    if (member != 0x68030010 || access != Access::get || !arguments.empty()) raise(ErrorNumber::member_not_supported);
+    return u"THEIRS";
+  }
+};
+
+class LibraryTest : public ::testing::Test {
+ protected:
+  Variant late(TextView name, Access access, std::vector<Argument> arguments = {}) {
+    const LateInterface& members = late_interface<ORVUtils>();
+    return members.call(&utils, members.slot_of(members.identifier_of(name), access), arguments, library.locale());
+  }
+
+  template <class Function>
+  static std::int32_t error_of(Function&& function) {
+    try {
+      function();
+    } catch (const RunTimeError& error) {
+      return error.number();
+    }
+    return 0;
+  }
+
+  FakePlatform platform;
+  Library library{platform.platform()};
+  ORVUtils utils{library};
+};
+
+TEST_F(LibraryTest, StartUpLoadsTheComponentsWindowAndReadsTheScreen) {
+  platform.twips_x = 14.5F;  // Halves go to the even number.
+  platform.twips_y = 15.5F;
+  EXPECT_EQ(library.settings().ComputerName, u"");
+  library.start();
+  EXPECT_EQ(platform.window_captions, std::vector<Text>{u"Form1"});
+  EXPECT_EQ(library.settings().ComputerName, u"FAKEPC");
+  EXPECT_EQ(library.settings().ScreenTwipsPerPixelX, 14);
+  EXPECT_EQ(library.settings().ScreenTwipsPerPixelY, 16);
+  const std::vector<Text> in_order = {
+      u"PolarCryptoLibCtl.Crypto",   u"MSComDlg.CommonDialog",     u"MSComDlg.CommonDialog",  u"VSFlex8Ctl.VSFlexGrid",
+      u"SystemInfoControl.MSysInfo", u"DUZACTXLibCtl.duzactxctrl", u"DZACTXLibCtl.dzactxctrl"};
+  EXPECT_EQ(platform.controls_asked_for, in_order);
+}
+
+TEST_F(LibraryTest, TerminateUnloadsTheWindowAndSpeaksOnlyInDebugMode1) {
+  library.start();
+  library.settings().DebugMode = -1;
+  utils.Terminate();
+  EXPECT_TRUE(platform.messages.empty());
+  EXPECT_EQ(platform.open_windows, 0);
+
+  // Not loaded now: it is loaded once more, and at once unloaded.
+  library.settings().DebugMode = 1;
+  utils.Terminate();
+  ASSERT_EQ(platform.messages.size(), 1U);
+  EXPECT_EQ(platform.messages[0],
+            (FakePlatform::Message{u"Closing ORVUtils Components form", MessageButtons::ok, u""}));
+  EXPECT_EQ(platform.window_captions.size(), 2U);
+  EXPECT_EQ(platform.open_windows, 0);
+
+  // A member that needs a control loads it again.
+  EXPECT_NE(library.components().control(u"Crypto1"), nullptr);
+  EXPECT_EQ(platform.open_windows, 1);
+}
+
+TEST_F(LibraryTest, ObjectsShareOneBlockOfSettings) {
+  ORVUtils other(library);
+  late(u"sUserName", Access::put, {Variant(u"anne")});
+  EXPECT_EQ(other.settings().sUserName, u"anne");
+  EXPECT_EQ(late(u"WriteServerPerformanceFile", Access::get), Variant(Boolean(false)));
+  EXPECT_EQ(late(u"BookingScreenDate", Access::get), Variant(Date{0}));
+  EXPECT_EQ(error_of([&] { late(u"ComputerName", Access::put, {Variant(u"x")}); }), 438);
+}
+
+TEST_F(LibraryTest, ObjectPropertiesKeepTheirReferenceUntilTheNextPut) {
+  const auto form = std::make_shared<ForeignSystemInformation>();
+  late(u"SplashForm", Access::put, {Variant(ObjectRef(form))});
+  EXPECT_EQ(form.use_count(), 2);
+  EXPECT_EQ(error_of([&] { late(u"SplashForm", Access::put, {Variant(u"a text")}); }), 13);
+  EXPECT_EQ(library.settings().SplashForm, form);
+  late(u"SplashForm", Access::put, {Variant(ObjectRef())});
+  EXPECT_EQ(form.use_count(), 1);
+}
+
+TEST_F(LibraryTest, EveryPendingMemberAnswers445AndNoOther) {
+  const LateInterface& members = late_interface<ORVUtils>();
+  library.settings().DebugMode = 0;
+  for (std::size_t slot = 0; slot < members.members.size(); ++slot) {
+    const Member& member = members.members[slot];
+    std::vector<Argument> arguments;
+    for (const Parameter& parameter : member.parameters()) {
+      arguments.emplace_back(parameter.type == ValueType::text_array ? Variant() : Variant(std::int16_t{0}));
+    }
+    const std::int32_t number =
+        error_of([&] { members.call(&utils, static_cast<std::int32_t>(slot), arguments, Locale{}); });
+    EXPECT_EQ(number == 445, member.is_pending) << member.name;
+  }
+}
+
+TEST_F(LibraryTest, AnotherMakersControlTakesItsPlace) {
+  platform.controls[u"SystemInfoControl.MSysInfo"] = std::make_shared<ForeignSystemInformation>();
+  library.start();
+  EXPECT_EQ(library.settings().ComputerName, u"THEIRS");
+}
+
+TEST_F(LibraryTest, AControlThatCannotBeMadeLeavesNoHalfWindow) {
+  platform.controls[u"DZACTXLibCtl.dzactxctrl"] = nullptr;
+  EXPECT_EQ(error_of([&] { library.start(); }), 429);
+  EXPECT_EQ(platform.open_windows, 0);
+  platform.controls.clear();
+  library.start();
+  EXPECT_EQ(library.settings().ComputerName, u"FAKEPC");
+}
+
+TEST_F(LibraryTest, ControlsOfTheComponentsWindow) {
+  FrmComponents& form = library.components();
+  EXPECT_EQ(Control(form.control(u"dlgSave2")).get<Text>(u"dialogtitle"), u"Save Data to File");
+  EXPECT_EQ(Control(form.control(u"dlgSave2")).get<Text>(u"Filter"),
+            u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");
+  EXPECT_EQ(Control(form.control(u"Open1")).get<Text>(u"Filter"), u"");
+  EXPECT_EQ(Control(form.control(u"MSysInfo1")).get<Text>(u"ComputerName"), u"FAKEPC");
+  for (const TextView name : {u"Crypto1", u"Grid1", u"UnZipCtrl", u"ZipCtrl"}) {
+    EXPECT_EQ(error_of([&] { Control(form.control(name)).call(u"Anything"); }), 438) << to_utf8(name);
+  }
+  EXPECT_EQ(error_of([&] { static_cast<void>(form.control(u"Label1")); }), 438);
+  EXPECT_EQ(form.owner_handle(), platform.window_handle);
+}
+
+TEST_F(LibraryTest, DatabaseErrorReport) {
+  FrmComponents& form = library.components();
+  form.report_database_error(17142, u"gone", 1, u"source", u"help", u"");
+  EXPECT_EQ(form.last_database_error(), 17142);
+  form.report_database_error(-5, u"what", 0, u"where", u"help.hlp", u"third");
+  form.report_database_error(0, u"", 0, u"", u"", u"");
+  ASSERT_EQ(platform.messages.size(), 3U);
+  EXPECT_EQ(platform.messages[0].text,
+            u"An error has caused the database connection to be terminated. Please restart ORV.  If the problem "
+            u"persists, contact tech support.");
+  EXPECT_EQ(platform.messages[1].text, u"TData Error:-5 - what  where  help.hlp");
+  EXPECT_EQ(platform.messages[2].text, u"TData Error:0 -     ");
+  EXPECT_EQ(form.last_database_error(), 0);
+}
+
+// Hosts that are bound early have these positions in their programs. Slots count from 0 after the first seven.
+TEST(InterfaceTable, SlotsStandWhereHostsWereBound) {
+  struct SlotRow {
+    std::size_t slot;
+    std::string_view name;
+    Access access;
+  };
+  const SlotRow rows[] = {
+      {0, "AutomatedEndOfMonth", Access::get},
+      {17, "BookingScreenDate", Access::put},
+      {21, "VersionMajor", Access::put},
+      {24, "VersionMajor", Access::get},
+      {39, "bNewZealand", Access::put},
+      {43, "ComputerName", Access::get},
+      {90, "Terminate", Access::call},
+      {203, "StringReplaceWord", Access::call},
+      {204, "WriteServerPerformanceFile", Access::get},
+      {214, "GetIpAddrTable", Access::call},
+      {215, "VerifyMemField", Access::call},
+  };
+  const auto& members = described<ORVUtils>;
+  ASSERT_EQ(members.size(), 216U);
+  for (const SlotRow& row : rows) {
+    EXPECT_EQ(members[row.slot].name, row.name) << row.slot;
+    EXPECT_EQ(members[row.slot].access, row.access) << row.name;
+  }
+}
+
+}  // namespace
+}  // namespace talutil
