@@ -8,6 +8,10 @@ target_link_libraries(talutil_platform PUBLIC talutil_core)
 # The type library: the table is printed as IDL by a program of the building machine, compiled, and mended.
 # It refers to the platform's stdole2.tlb, which the compiler looks for in the folder below.
 set(TALUTIL_STDOLE_DIR "" CACHE PATH "The folder with stdole2.tlb (the Wine root has one)")
+if(NOT EXISTS "${TALUTIL_STDOLE_DIR}/stdole2.tlb")
+  message(FATAL_ERROR "TALUTIL_STDOLE_DIR (\"${TALUTIL_STDOLE_DIR}\") has no stdole2.tlb: source tools/environment.sh "
+                      "before cmake, and run ./test wine once so that the Wine root exists")
+endif()
 find_program(host_compiler NAMES c++ g++ REQUIRED NO_CMAKE_FIND_ROOT_PATH)
 find_program(idl_compiler i686-w64-mingw32-widl REQUIRED NO_CMAKE_FIND_ROOT_PATH)
 set(generated ${CMAKE_BINARY_DIR}/generated)

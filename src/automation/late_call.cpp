@@ -94,6 +94,7 @@ std::int32_t LateInterface::slot_of(std::int32_t identifier, Access access) cons
 
 Variant LateInterface::call(void* target, std::int32_t slot, std::span<Argument> arguments,
                             const Locale& locale) const {
+  if (slot < 0) raise(ErrorNumber::member_not_supported);
   const Member& member = members[static_cast<std::size_t>(slot)];
   const LateCall function = calls[static_cast<std::size_t>(slot)];
   const std::span<const Parameter> parameters = member.parameters();

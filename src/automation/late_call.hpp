@@ -198,7 +198,7 @@ struct LateInterface {
   [[nodiscard]] std::int32_t slot_of(std::int32_t identifier, Access access) const noexcept;
 
   /// Calls a slot with the arguments as given: defaults stand in for those left out at the end or marked
-  /// missing. Raises 450 for too many, 449 for a missing one that is not optional.
+  /// missing. Raises 438 for slot -1, 450 for too many, 449 for a missing one that is not optional.
   Variant call(void* target, std::int32_t slot, std::span<Argument> arguments, const Locale& locale) const;
 };
 

@@ -19,10 +19,8 @@ class TableObject : public Object {
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
     const LateInterface& table = late_interface<Derived>();
-    const std::int32_t slot = table.slot_of(member, access);
-    if (slot < 0) raise(ErrorNumber::member_not_supported);
     std::vector<Argument> given(arguments.begin(), arguments.end());
-    return table.call(static_cast<Derived*>(this), slot, given, Locale{});
+    return table.call(static_cast<Derived*>(this), table.slot_of(member, access), given, Locale{});
   }
 };
 
