@@ -161,6 +161,10 @@ constexpr auto substitutes = [] {
 }();
 static_assert(std::ranges::adjacent_find(substitutes, {}, &Substitute::unit) == substitutes.end());
 
+constexpr char16_t unit_of(std::uint8_t byte) noexcept {
+  return byte >= 0x80 && byte < 0xA0 ? upper_block[byte - 0x80U] : byte;
+}
+
 }  // namespace
 
 std::uint8_t ansi_code(char16_t unit) noexcept {
@@ -175,14 +179,6 @@ std::int16_t asc(TextView text) {
   if (text.empty()) raise(ErrorNumber::invalid_procedure_call);
   return ansi_code(text.front());
 }
-
-namespace {
-
-constexpr char16_t unit_of(std::uint8_t byte) noexcept {
-  return byte >= 0x80 && byte < 0xA0 ? upper_block[byte - 0x80U] : byte;
-}
-
-}  // namespace
 
 Text chr(std::int32_t code) {
   if (code < 0 || code > 255) raise(ErrorNumber::invalid_procedure_call);

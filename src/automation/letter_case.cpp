@@ -129,4 +129,8 @@ Text lower_case(TextView text) {
   return result;
 }
 
+bool equals_without_case(TextView a, TextView b) noexcept {
+  return std::ranges::equal(a, b, [](char16_t x, char16_t y) { return upper_case(x) == upper_case(y); });
+}
+
 }  // namespace talutil

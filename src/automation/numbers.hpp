@@ -1,5 +1,6 @@
 #pragma once
 
+#include <concepts>
 #include <cstdint>
 #include <optional>
 
@@ -35,6 +36,14 @@ struct Currency {
 
 /// The same, exact to the ten-thousandth. Raises 6 beyond the range of a currency.
 [[nodiscard]] std::optional<Currency> text_to_currency(TextView text, const Locale& locale = {});
+
+/// The same as a whole number, halves to even. &H and &O give the bits, so "&HFFFF" is -1 as a 16-bit number
+/// and 65535 as a 32-bit one. Raises 6 out of range.
+template <std::signed_integral To>
+[[nodiscard]] std::optional<To> text_to_integer(TextView text, const Locale& locale = {});
+
+extern template std::optional<std::int16_t> text_to_integer(TextView text, const Locale& locale);
+extern template std::optional<std::int32_t> text_to_integer(TextView text, const Locale& locale);
 
 /// A number as currency, halves to even. Raises 6 out of range.
 [[nodiscard]] Currency number_to_currency(double value);

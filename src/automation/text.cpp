@@ -76,6 +76,12 @@ TextView trim_blanks(TextView text) noexcept {
   return text.substr(first, text.find_last_not_of(u' ') - first + 1);
 }
 
+bool is_white_space(char16_t unit) noexcept {
+  constexpr TextView others = u"\u00A0\u1680\u2028\u2029\u202F\u205F\u3000";
+  if (unit <= u' ') return unit == u' ' || (unit >= u'\t' && unit <= u'\r');
+  return unit == 0x85 || (unit >= 0x2000 && unit <= 0x200A) || others.find(unit) != TextView::npos;
+}
+
 std::string to_utf8(TextView text) {
   std::string out;
   out.reserve(text.size());

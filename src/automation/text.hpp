@@ -13,6 +13,12 @@ using TextView = std::u16string_view;
 /// Removes blanks (code 32) at both ends. Tabs, line breaks and no-break blanks stay, as in the hosts' Trim.
 [[nodiscard]] TextView trim_blanks(TextView text) noexcept;
 
+/// Blanks, tabs, line breaks and their relatives beyond ASCII: what conversions from text skip at the ends.
+[[nodiscard]] bool is_white_space(char16_t unit) noexcept;
+
+/// Equal but for the case of letters, code unit by code unit.
+[[nodiscard]] bool equals_without_case(TextView a, TextView b) noexcept;
+
 /// The code that the platform's Asc primitive gives for one code unit: its byte in code page 1252 (0 to
 /// 255), with the code page's best fit for characters it does not hold (U+0100 counts as "A") and 63, the
 /// question mark, where there is none. Source: the platform's own conversion, see ansi_code_page.cpp.

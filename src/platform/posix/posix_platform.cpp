@@ -1,0 +1,107 @@
+#include "platform/posix/posix_platform.hpp"
+
+#include <errno.h>
+#include <langinfo.h>
+#include <locale.h>
+#include <time.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
+#include <iostream>
+#include <string>
+#include <type_traits>
+
+namespace talutil::posix {
+
+namespace {
+
+/// A line typed at the terminal; empty optional where there is no terminal or its input has ended.
+std::optional<std::string> ask_terminal(std::string_view prompt) {
+  if (isatty(STDIN_FILENO) == 0) return std::nullopt;
+  std::cerr << prompt << std::flush;
+  std::string line;
+  // An end of input closes this box, not the next one.
+  if (!std::getline(std::cin, line)) {
+    std::cin.clear();
+    return std::nullopt;
+  }
+  return line;
+}
+
+MessageAnswer ask_ok() { return ask_terminal("[Enter] ") ? MessageAnswer::ok : MessageAnswer::cancel; }
+
+MessageAnswer ask_yes_no() {
+  while (const auto line = ask_terminal("Yes or no? [y/n] ")) {
+    const char first = line->empty() ? ' ' : line->front();
+    if (first == 'y' || first == 'Y') return MessageAnswer::yes;
+    if (first == 'n' || first == 'N') return MessageAnswer::no;
+  }
+  return MessageAnswer::no;
+}
+
+struct FreeLocale {
+  void operator()(locale_t locale) const noexcept { freelocale(locale); }
+};
+using LocaleHandle = std::unique_ptr<std::remove_pointer_t<locale_t>, FreeLocale>;
+
+/// The first character of a text of the locale; the given one where it is empty or not UTF-8.
+char16_t first_character(std::string_view text, char16_t otherwise) {
+  const Text decoded = from_utf8(text);
+  return decoded.empty() || decoded.front() == u'\uFFFD' ? otherwise : decoded.front();
+}
+
+class Window final : public HiddenWindow {
+ public:
+  [[nodiscard]] std::intptr_t handle() const noexcept override { return 0; }
+};
+
+}  // namespace
+
+MessageAnswer PosixMessageBoxes::show(TextView text, MessageButtons buttons, TextView title) {
+  const std::string caption = title.empty() ? program_invocation_short_name : to_utf8(title);
+  // What the program has printed so far belongs before the box.
+  std::cout.flush();
+  std::cerr << caption << ": " << to_utf8(text) << '\n';
+  return buttons == MessageButtons::ok ? ask_ok() : ask_yes_no();
+}
+
+Text PosixComputer::name() {
+  std::array<char, 256> name{};
+  if (gethostname(name.data(), name.size() - 1) != 0) return {};
+  const std::string_view full(name.data());
+  return upper_case(from_utf8(full.substr(0, full.find('.'))));
+}
+
+Locale PosixComputer::locale() {
+  Locale result;
+  const LocaleHandle environment(newlocale(LC_CTYPE_MASK | LC_NUMERIC_MASK | LC_MONETARY_MASK, "", nullptr));
+  // An environment that names a locale the machine does not have.
+  if (!environment) return result;
+  const auto item = [&](nl_item wanted) { return std::string_view(nl_langinfo_l(wanted, environment.get())); };
+
+  result.decimal_separator = first_character(item(RADIXCHAR), result.decimal_separator);
+  result.thousands_separator = first_character(item(THOUSEP), result.thousands_separator);
+  // Some locales have a decimal comma and no thousands separator; one character cannot be both.
+  if (result.thousands_separator == result.decimal_separator) {
+    result.thousands_separator = result.decimal_separator == u',' ? u'.' : u',';
+  }
+  // The first character tells the symbol's place.
+  if (const auto currency = item(CRNCYSTR); !currency.empty()) {
+    result.currency_symbol = first_character(currency.substr(1), result.currency_symbol);
+  }
+  return result;
+}
+
+Date PosixClock::now() {
+  const time_t seconds = time(nullptr);
+  struct tm now {};
+  localtime_r(&seconds, &now);
+  return date_from_parts(
+             {now.tm_year + 1900, now.tm_mon + 1, now.tm_mday, now.tm_hour, now.tm_min, std::min(now.tm_sec, 59)})
+      .value_or(Date{});
+}
+
+std::unique_ptr<HiddenWindow> PosixFormWindows::make_hidden(TextView /*caption*/) { return std::make_unique<Window>(); }
+
+}  // namespace talutil::posix

@@ -1,0 +1,61 @@
+#pragma once
+
+#include "platform/platform.hpp"
+
+namespace talutil::posix {
+
+/// Message boxes on the terminal: the text goes to standard error, the answer comes from standard input.
+class PosixMessageBoxes final : public MessageBoxes {
+ public:
+  MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override;
+};
+
+/// There is no screen to ask: 96 dots an inch, which documents and forms are laid out for.
+class PosixScreen final : public Screen {
+ public:
+  float twips_per_pixel_x() override { return standard_twips_per_pixel; }
+  float twips_per_pixel_y() override { return standard_twips_per_pixel; }
+
+ private:
+  static constexpr float standard_twips_per_pixel = 15;
+};
+
+class PosixComputer final : public Computer {
+ public:
+  /// The host's name without its domain, in upper case, as hosts of the library know computers.
+  Text name() override;
+
+  /// From the environment (LC_ALL, LC_NUMERIC and so on); what it leaves open is as in the standard locale.
+  Locale locale() override;
+};
+
+class PosixClock final : public Clock {
+ public:
+  Date now() override;
+};
+
+/// Windows that are never shown need no window system: they are objects without a handle.
+class PosixFormWindows final : public FormWindows {
+ public:
+  std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
+};
+
+/// Controls of other makers exist on Windows only.
+class PosixControlMakers final : public ControlMakers {
+ public:
+  ObjectRef create(TextView /*class_name*/) override { return nullptr; }
+};
+
+/// One of each, for a library to use. Must outlive it.
+struct PosixPlatform {
+  PosixMessageBoxes message_boxes;
+  PosixScreen screen;
+  PosixComputer computer;
+  PosixClock clock;
+  PosixFormWindows form_windows;
+  PosixControlMakers control_makers;
+
+  [[nodiscard]] Platform platform() { return {message_boxes, screen, computer, clock, form_windows, control_makers}; }
+};
+
+}  // namespace talutil::posix

@@ -1,0 +1,81 @@
+#include "text/ansi_finder.hpp"
+
+#include <algorithm>
+
+namespace talutil {
+
+namespace {
+
+constexpr std::size_t block_length = 32;
+constexpr std::size_t code_unit_count = 0x10000;
+
+// Enough of them to make up for 64 KB of answers.
+constexpr std::uint32_t questions_before_keeping = 1024;
+
+/// ASCII and the upper half of Latin-1, whose code is the unit itself.
+constexpr bool is_near(char16_t unit) noexcept { return (unit < 0x80) | (static_cast<char16_t>(unit - 0xA0) < 0x60); }
+
+/// True when a block holds near characters only, none of them `wanted`. Without a branch, for the compiler's
+/// vectors.
+bool is_plain_block(const char16_t* block, char16_t wanted) noexcept {
+  char16_t odd = 0;
+  for (std::size_t i = 0; i < block_length; ++i) {
+    odd = static_cast<char16_t>(odd | (block[i] == wanted) | !is_near(block[i]));
+  }
+  return odd == 0;
+}
+
+}  // namespace
+
+std::size_t AnsiFinder::find(TextView text, std::size_t from) {
+  while (answers_.empty()) {
+    if (from == text.size()) return from;
+    const std::size_t length = std::min(block_length, text.size() - from);
+    if (length < block_length || !is_plain_block(text.data() + from, code_)) {
+      const std::size_t found = find_in_block(text.substr(from, length));
+      if (found < length) return from + found;
+    }
+    from += length;
+  }
+  return skip(no, text, from);
+}
+
+std::size_t AnsiFinder::find_other(TextView text, std::size_t from) {
+  while (answers_.empty()) {
+    if (from == text.size() || !matches(text[from])) return from;
+    ++from;
+  }
+  return skip(yes, text, from);
+}
+
+std::size_t AnsiFinder::find_in_block(TextView block) {
+  std::size_t at = 0;
+  for (; at < block.size(); ++at) {
+    // One branch that seldom goes the other way: the letters around vary too much to guess them.
+    const bool can_match = (block[at] == code_) | !is_near(block[at]);
+    if (can_match && matches(block[at])) break;
+  }
+  return at;
+}
+
+std::size_t AnsiFinder::skip(Answer answer, TextView text, std::size_t from) {
+  for (const Answer* const answers = answers_.data(); from < text.size(); ++from) {
+    if (answers[text[from]] == answer) continue;
+    if (matches(text[from]) != (answer == yes)) break;
+  }
+  return from;
+}
+
+bool AnsiFinder::matches(char16_t unit) {
+  if (answers_.empty()) return is_near(unit) ? unit == code_ : ask(unit);
+  Answer& answer = answers_[unit];
+  if (answer == unknown) answer = ask(unit) ? yes : no;
+  return answer == yes;
+}
+
+bool AnsiFinder::ask(char16_t unit) {
+  if (answers_.empty() && ++questions_ == questions_before_keeping) answers_.assign(code_unit_count, unknown);
+  return ansi_code(unit) == code_;
+}
+
+}  // namespace talutil

@@ -1,0 +1,108 @@
+#include <algorithm>
+#include <cstdint>
+#include <utility>
+
+#include "automation/checked.hpp"
+#include "automation/text.hpp"
+#include "library/orv_utils.hpp"
+#include "text/characters.hpp"
+
+namespace talutil {
+
+namespace {
+
+/// The characters from position `first` to position `last`, both counted from 1, as far as there are any.
+TextView between(TextView text, std::int64_t first, std::int64_t last) noexcept {
+  first = std::max<std::int64_t>(first, 1);
+  last = std::min(last, static_cast<std::int64_t>(text.size()));
+  if (first > last) return {};
+  return text.substr(static_cast<std::size_t>(first - 1), static_cast<std::size_t>(last - first + 1));
+}
+
+/// Calls `use` with each field that a delimiter closes, until it answers false; the text after the last
+/// delimiter is no field. A delimiter of other than one character closes nothing.
+template <class Use>
+void for_each_field(TextView list, TextView delimiter, Use use) {
+  if (delimiter.size() != 1) return;
+  for (std::size_t end = list.find(delimiter.front()); end != TextView::npos; end = list.find(delimiter.front())) {
+    if (!use(list.substr(0, end))) return;
+    list.remove_prefix(end + 1);
+  }
+}
+
+}  // namespace
+
+Text ORVUtils::GetData(const Text& sSrcStr, const std::int32_t& iSt, const std::int32_t& iEn) {
+  if (sSrcStr.empty() || iSt < 0) return {};
+  if (iSt == 0) return Text(between(sSrcStr, 1, std::int64_t{MyPos(u",", sSrcStr, iEn)} - 1));
+  const std::int64_t start = MyPos(u",", sSrcStr, iSt);
+  const std::int64_t end = MyPos(u",", sSrcStr, iEn);
+  if (start < 1 || end < 1) return {};
+  if (end < start + 1) raise(ErrorNumber::invalid_procedure_call);
+  return Text(between(sSrcStr, start + 1, end - 1));
+}
+
+std::int32_t ORVUtils::IndexInList(const TextArray& sFList, const Text& sText) {
+  const std::int32_t last = sFList.upper_bound();
+  // From 0 whatever the lower bound is: an array that starts at 1 has always been an error here.
+  for (std::int32_t index = 0; index <= last; ++index) {
+    if (equals_without_case(TextView(sFList.at(index)).substr(0, sText.size()), sText)) return index;
+  }
+  return -1;
+}
+
+std::int32_t ORVUtils::MyPos(const Text& s1, const Text& s2, const std::int32_t& iCount) {
+  const bool can_match = s1.size() == 1;
+  std::int32_t count = 0;
+  for (std::size_t at = 0; at < s2.size(); ++at) {
+    if (can_match && s2[at] == s1.front()) ++count;
+    // Compared after every character, matched or not, so a count of 0 is met at the first.
+    if (count == iCount) return checked_cast<std::int32_t>(at + 1);
+  }
+  return 0;
+}
+
+std::int32_t ORVUtils::SubStrCount(const Text& sSubStr, const Text& sSrcStr) {
+  if (sSubStr.size() != 1) return 0;
+  return checked_cast<std::int32_t>(std::ranges::count(sSrcStr, sSubStr.front()));
+}
+
+std::int32_t ORVUtils::ReadCommaDelimStrToList(const Text& sTemp, TextArray& sFList, const Text& sDelimiter) {
+  TextArray fields{.items = {}, .lower_bound = 0, .allocated = true};
+  for_each_field(sTemp, sDelimiter, [&](TextView field) {
+    // A resize that keeps the contents cannot move the lower bound.
+    if (sFList.allocated && sFList.lower_bound != 0) raise(ErrorNumber::subscript_out_of_range);
+    fields.items.emplace_back(field);
+    return true;
+  });
+  const auto count = checked_cast<std::int32_t>(fields.items.size());
+  if (count > 0) sFList = std::move(fields);
+  return count;
+}
+
+std::int16_t ORVUtils::StringPosition(const Text& sSource, const std::int16_t& iOption) {
+  if (iOption != 1) return 0;
+  const Text s = upper_case(TextView(sSource));
+  const auto length = static_cast<std::int64_t>(s.size());
+  const std::int32_t blanks = SubStrCount(u" ", s);
+  for (std::int32_t k = 1; k <= blanks; ++k) {
+    const std::int32_t blank = MyPos(u" ", s, k);
+    // The window ends at the length less the blank's position, not at the length: addresses that hosts have
+    // stored were split that way.
+    const TextView window = between(s, std::int64_t{blank} + 1, length - blank);
+    if (std::ranges::none_of(window, is_digit)) return checked_cast<std::int16_t>(blank);
+  }
+  return 0;
+}
+
+Boolean ORVUtils::MyInstrDelim(const Text& sSourceString, const Text& sDestString, const Text& sDelimiter) {
+  require_16_bit_length(sDestString.size());
+  bool found = false;
+  for_each_field(sDestString, sDelimiter, [&](TextView field) {
+    found = field == sSourceString;
+    return !found;
+  });
+  return Boolean(found);
+}
+
+}  // namespace talutil
