@@ -1,0 +1,151 @@
+#include "automation/date.hpp"
+
+#include <gtest/gtest.h>
+
+#include "tests/automation/outcome.hpp"
+
+namespace talutil {
+namespace {
+
+TEST(Date, DaysAndParts) {
+  const struct {
+    const char* name;
+    double days;
+    DateParts parts;
+  } rows[] = {
+      {"day 0", 0, {1899, 12, 30, 0, 0, 0}},
+      {"the fraction counts up before day 0 too", -1.25, {1899, 12, 29, 6, 0, 0}},
+      {"a fraction below 0 on day 0", 0.75, {1899, 12, 30, 18, 0, 0}},
+      {"leap day of a century", 36585, {2000, 2, 29, 0, 0, 0}},
+      {"first", -657434, {100, 1, 1, 0, 0, 0}},
+      {"last of the first day", -657434.99998842592, {100, 1, 1, 23, 59, 59}},
+      {"last", 2958465.99998842592, {9999, 12, 31, 23, 59, 59}},
+  };
+  for (const auto& row : rows) {
+    EXPECT_EQ(parts_of({row.days}), row.parts) << row.name;
+    const auto back = date_from_parts(row.parts);
+    ASSERT_TRUE(back) << row.name;
+    EXPECT_NEAR(back->days, row.days, 1e-9) << row.name;
+  }
+  EXPECT_EQ(parts_of({-0.25}), (DateParts{1899, 12, 30, 6, 0, 0}));
+  EXPECT_EQ(parts_of({39876.999999}), (DateParts{2009, 3, 5, 0, 0, 0}));
+  EXPECT_EQ(parts_of({-1.999999}), (DateParts{1899, 12, 30, 0, 0, 0}));
+}
+
+TEST(Date, OutOfRange) {
+  EXPECT_EQ(outcome([] { return to_date_checked(-657435); }), "error 6");
+  EXPECT_EQ(outcome([] { return to_date_checked(2958465.999999); }), "error 6");
+  EXPECT_EQ(outcome([] { return parts_of({1e300}).day; }), "error 6");
+  const DateParts no_dates[] = {
+      {2009, 2, 29, 0, 0, 0}, {1900, 2, 29, 0, 0, 0}, {2009, 13, 1, 0, 0, 0}, {2009, 0, 1, 0, 0, 0},
+      {2009, 1, 0, 0, 0, 0},  {99, 1, 1, 0, 0, 0},    {10000, 1, 1, 0, 0, 0}, {2009, 1, 1, 24, 0, 0},
+      {2009, 1, 1, 0, 60, 0}, {2009, 1, 1, 0, 0, 60}, {2009, 1, 1, -1, 0, 0}, {2009, 4, 31, 0, 0, 0},
+  };
+  for (const DateParts& parts : no_dates) {
+    EXPECT_FALSE(date_from_parts(parts)) << parts.year << '-' << parts.month << '-' << parts.day << ' ' << parts.hour;
+  }
+}
+
+TEST(Date, TextToDate) {
+  constexpr std::int32_t current_year = 2011;
+  const struct {
+    TextView text;
+    const char* expected;
+  } rows[] = {
+      // Numbers, day first.
+      {u"5/3/2009", "05/03/2009"},
+      {u"05-03-09", "05/03/2009"},
+      {u"5.3.2009", "05/03/2009"},
+      {u" 5 3 2009\t", "05/03/2009"},
+      {u"5 / 3-2009", "05/03/2009"},
+      {u"2009-03-05", "05/03/2009"},
+      {u"99/12/31", "31/12/1999"},
+      {u"1/1/29", "01/01/2029"},
+      {u"1/1/30", "01/01/1930"},
+      {u"1/1/100", "01/01/0100"},
+      {u"5/3", "05/03/2011"},
+      {u"3/2009", "01/03/2009"},
+      {u"2009/3", "01/03/2009"},
+      // Day and month change places only where nothing else is a date.
+      {u"12/11/2009", "12/11/2009"},
+      {u"12/13/2009", "13/12/2009"},
+      {u"2009-13-05", "13/05/2009"},
+      {u"5/13", "13/05/2011"},
+      {u"31/9/12", "none"},
+      // Month names.
+      {u"5 Mar 2009", "05/03/2009"},
+      {u"5mar2009", "05/03/2009"},
+      {u"MARCH 5, 2009", "05/03/2009"},
+      {u"Sept-5-09", "05/09/2009"},
+      {u"2009 Mar 5", "05/03/2009"},
+      {u"5 Mar", "05/03/2011"},
+      {u"Mar 2009", "01/03/2009"},
+      {u"31 Feb", "none"},
+      {u"Marc 5 2009", "none"},
+      {u"5 2009 Mar", "none"},
+      {u"Mar 2009 5", "none"},
+      {u"Mar 5 Mar", "none"},
+      {u"Mar", "none"},
+      // Times.
+      {u"13:45", "13:45"},
+      {u"1 : 5 : 30", "01:05:30"},
+      {u"1:45:30 PM", "13:45:30"},
+      {u"12:30am", "00:30"},
+      {u"12 pm", "12:00"},
+      {u"0:00", "00:00"},
+      {u"13:45 AM", "none"},
+      {u"24:00", "none"},
+      {u"23:60", "none"},
+      {u"23:59:60", "none"},
+      {u"1:", "none"},
+      {u"1:30:", "none"},
+      {u"PM", "none"},
+      {u"10000:00", "none"},
+      // Both, in either order.
+      {u"5/3/2009 13:45", "05/03/2009 13:45"},
+      {u"1:45 PM 5/3/2009", "05/03/2009 13:45"},
+      {u"5 Mar 13:45:01", "05/03/2011 13:45:01"},
+      {u"5/3 1 PM", "05/03/2011 13:00"},
+      {u"29/12/1899 6:00", "29/12/1899 06:00"},
+      {u"5/3/2009 24:00", "none"},
+      {u"5/3/2009 13", "none"},
+      {u"5/3/2009-13:45", "none"},
+      {u"13:45 2009", "none"},
+      {u"13:45 14:45", "none"},
+      // No dates.
+      {u"", "none"},
+      {u"  ", "none"},
+      {u"5", "none"},
+      {u"5.3", "none"},
+      {u"5,3", "none"},
+      {u"5,3,2009", "none"},
+      {u"39000", "none"},
+      {u"-5", "none"},
+      {u"31/2/2009", "none"},
+      {u"29/2", "none"},
+      {u"0/3/2009", "none"},
+      {u"1/1/10000", "none"},
+      {u"1/1/99999", "none"},
+      {u"1/1/-5", "none"},
+      {u"5//3/2009", "none"},
+      {u"5/3/2009/", "none"},
+      {u"1/2/3/4", "none"},
+      {u"5/3/2009x", "none"},
+      {u"5/3/2009 x", "none"},
+      {u"x5/3/2009", "none"},
+  };
+  for (const auto& row : rows) {
+    EXPECT_EQ(outcome([&] { return text_to_date(row.text, current_year); }), row.expected) << to_utf8(row.text);
+  }
+  EXPECT_TRUE(text_to_date(u"29/2", 2012));
+}
+
+TEST(Date, ToText) {
+  EXPECT_EQ(date_to_text({-0.25}), u"06:00");
+  EXPECT_EQ(date_to_text({39876.999999}), u"05/03/2009");  // A second after rounding.
+  EXPECT_EQ(date_to_text({-657434}), u"01/01/0100");
+  EXPECT_EQ(outcome([] { return date_to_text({3e6}); }), "error 6");
+}
+
+}  // namespace
+}  // namespace talutil
