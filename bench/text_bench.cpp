@@ -22,7 +22,7 @@ struct Toolkit {
 };
 
 /// Words of the given letters with blanks, line breaks and commas between them, and one special character in
-/// fifty: text as users type and paste it.
+/// fifty: text as users type and paste it. No blanks stand at the ends, since those would be trimmed.
 Text dirty_text(std::size_t bytes, TextView letters) {
   constexpr TextView specials = u"&\"'\t#><?";
   std::mt19937 random(42);
@@ -43,6 +43,7 @@ Text dirty_text(std::size_t bytes, TextView letters) {
       text += letters[below(letters.size())];
     }
   }
+  text.front() = text.back() = u'x';
   return text;
 }
 
@@ -58,22 +59,30 @@ Text dirty_text(std::int64_t bytes, Letters letters) {
   return dirty_text(static_cast<std::size_t>(bytes), choices[static_cast<std::size_t>(letters)]);
 }
 
-/// The yardstick: the eight replacements as a plain loop over a flat copy, exact code units only.
-Text eight_plain_passes(const Text& text) {
+/// Two flat buffers, each large enough for a text after the replacements.
+struct FlatBuffers {
+  explicit FlatBuffers(std::size_t length)
+      : first(std::make_unique<char16_t[]>(3 * length)), second(std::make_unique<char16_t[]>(3 * length)) {}
+  std::unique_ptr<char16_t[]> first;
+  std::unique_ptr<char16_t[]> second;
+};
+
+/// The yardstick: the eight replacements as a plain loop over a flat copy, in buffers that are there already.
+/// `code_of` says what is compared.
+template <class CodeOf>
+TextView eight_plain_passes(const Text& text, FlatBuffers& buffers, CodeOf code_of) {
   const struct {
     char16_t from;
     TextView to;
   } steps[] = {{u'&', u"and"}, {u'"', u""}, {u'\'', u"\u00B4"}, {u'\t', u""},
                {u'#', u""},    {u'>', u""}, {u'<', u""},        {u'?', u""}};
-  const auto first = std::make_unique_for_overwrite<char16_t[]>(3 * text.size());
-  const auto second = std::make_unique_for_overwrite<char16_t[]>(3 * text.size());
-  char16_t* source = first.get();
-  char16_t* target = second.get();
+  char16_t* source = buffers.first.get();
+  char16_t* target = buffers.second.get();
   std::size_t length = text.copy(source, text.size());
   for (const auto& step : steps) {
     char16_t* end = target;
     for (std::size_t i = 0; i < length; ++i) {
-      if (source[i] == step.from) {
+      if (code_of(source[i]) == step.from) {
         for (const char16_t unit : step.to) *end++ = unit;
       } else {
         *end++ = source[i];
@@ -82,7 +91,7 @@ Text eight_plain_passes(const Text& text) {
     length = static_cast<std::size_t>(end - target);
     std::swap(source, target);
   }
-  return Text(source, length);
+  return {source, length};
 }
 
 void report(benchmark::State& state, std::int64_t bytes) {
@@ -90,10 +99,31 @@ void report(benchmark::State& state, std::int64_t bytes) {
   state.SetBytesProcessed(state.iterations() * bytes);
 }
 
-void eight_passes(benchmark::State& state) {
+template <class CodeOf>
+void measure_yardstick(benchmark::State& state, CodeOf code_of) {
   const Text text = dirty_text(state.range(0), Letters{state.range(1)});
-  for (auto _ : state) benchmark::DoNotOptimize(eight_plain_passes(text));
+  FlatBuffers buffers(text.size());
+  for (auto _ : state) benchmark::DoNotOptimize(eight_plain_passes(text, buffers, code_of));
   report(state, state.range(0));
+}
+
+/// Compares code units: the same for plain and accented letters, but other letters stay where they should go.
+void eight_passes(benchmark::State& state) {
+  measure_yardstick(state, [](char16_t unit) { return unit; });
+}
+
+/// Compares ANSI codes, as the members do, by a table of them all: the same result for all letters.
+void eight_passes_by_code(benchmark::State& state) {
+  std::vector<std::uint8_t> codes;
+  for (std::uint32_t unit = 0; unit <= 0xFFFF; ++unit) codes.push_back(ansi_code(static_cast<char16_t>(unit)));
+  const auto code_of = [&codes](char16_t unit) { return codes[unit]; };
+  measure_yardstick(state, code_of);
+
+  const Text text = dirty_text(state.range(0), Letters{state.range(1)});
+  FlatBuffers buffers(text.size());
+  if (eight_plain_passes(text, buffers, code_of) != Toolkit().utils.VerifyTextData(0, 0, text)) {
+    state.SkipWithError("the yardstick and VerifyTextData differ");
+  }
 }
 
 void verify_text_data(benchmark::State& state) {
@@ -103,12 +133,13 @@ void verify_text_data(benchmark::State& state) {
   report(state, state.range(0));
 }
 
-// A field of 64 bytes, and the megabyte whose two times are to be divided by one another: for plain, accented and
+// A field of 64 bytes, and the megabyte whose times are to be divided by one another: for plain, accented and
 // other letters.
 void sizes_and_letters(benchmark::internal::Benchmark* bench) {
   bench->ArgNames({"bytes", "letters"})->ArgsProduct({{64, megabyte}, {0, 1, 2}});
 }
 BENCHMARK(eight_passes)->Apply(sizes_and_letters);
+BENCHMARK(eight_passes_by_code)->Apply(sizes_and_letters);
 BENCHMARK(verify_text_data)->Apply(sizes_and_letters);
 
 /// One member on texts of growing size; the last lines of its table tell whether its time grows in step.

@@ -169,8 +169,9 @@ constexpr char16_t unit_of(std::uint8_t byte) noexcept {
 
 std::uint8_t ansi_code(char16_t unit) noexcept {
   if (unit < 0x80 || (unit >= 0xA0 && unit <= 0xFF)) return static_cast<std::uint8_t>(unit);
-  if (unit >= first_full_width && unit <= last_full_width)
+  if (unit >= first_full_width && unit <= last_full_width) {
     return static_cast<std::uint8_t>(unit - first_full_width + '!');
+  }
   const auto found = std::ranges::lower_bound(substitutes, unit, {}, &Substitute::unit);
   return found != substitutes.end() && found->unit == unit ? found->byte : no_substitute;
 }

@@ -158,7 +158,7 @@ bool read_elements(Reader& reader, Elements& elements) {
     const bool is_over = mark == 0 && is_time_next(reader);
     if (is_over || !read_element(reader, elements)) {
       reader = before;
-      return mark == 0 && elements.count() == 2;
+      return elements.count() == 2;
     }
     elements.has_comma = elements.has_comma || mark == u',';
     elements.has_point = elements.has_point || mark == u'.';

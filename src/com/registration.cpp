@@ -127,8 +127,11 @@ HRESULT unregister_library(RegistrationScope scope) noexcept {
     const auto unregister = scope == RegistrationScope::user ? &UnRegisterTypeLibForUser : &UnRegisterTypeLib;
     const HRESULT result =
         unregister(library, identity::type_library_major, identity::type_library_minor, 0, SYS_WIN32);
-    if (FAILED(result) && result != TYPE_E_REGISTRYACCESS && result != TYPE_E_LIBNOTREGISTERED)
+    // Wine answers E_INVALIDARG for a library that is not registered.
+    if (FAILED(result) && result != TYPE_E_REGISTRYACCESS && result != TYPE_E_LIBNOTREGISTERED &&
+        result != E_INVALIDARG) {
       throw error_of(result, {});
+    }
   });
 }
 

@@ -51,17 +51,17 @@ std::size_t AnsiFinder::find_other(TextView text, std::size_t from) {
 std::size_t AnsiFinder::find_in_block(TextView block) {
   std::size_t at = 0;
   for (; at < block.size(); ++at) {
-    // One branch that seldom goes the other way: the letters around vary too much to guess them.
-    const bool can_match = (block[at] == code_) | !is_near(block[at]);
-    if (can_match && matches(block[at])) break;
+    // Branches that seldom go the other way: the letters around vary too much to guess them.
+    if ((block[at] == code_ || !is_near(block[at])) && matches(block[at])) break;
   }
   return at;
 }
 
 std::size_t AnsiFinder::skip(Answer answer, TextView text, std::size_t from) {
   for (const Answer* const answers = answers_.data(); from < text.size(); ++from) {
-    if (answers[text[from]] == answer) continue;
-    if (matches(text[from]) != (answer == yes)) break;
+    const Answer known = answers[text[from]];
+    if (known == answer) continue;
+    if (known != unknown || matches(text[from]) != (answer == yes)) break;
   }
   return from;
 }

@@ -158,7 +158,7 @@ TEST(Numbers, TextToCurrencyAndIntegers) {
       {"exact where a double is not", u"922337203685477.5807", "922337203685477.5807"},
       {"lowest", u"-922337203685477.5808", "-922337203685477.5808"},
       {"one more", u"922337203685477.5808", "error 6"},
-      {"far more", u"1e30", "error 6"},
+      {"one digit more than 64 bits hold", u"1e16", "error 6"},
       {"hexadecimal", u"&HFFFF", "65535"},
       {"no number", u"abc", "none"},
   };

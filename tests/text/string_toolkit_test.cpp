@@ -135,6 +135,7 @@ TEST_F(StringToolkit, AddZeros) {
       {"already as long", u"123", 3, -1, u"123"},
       {"longer", u"1234", 3, 1, u"1234"},
       {"negative length", u"", -1, -1, u""},
+      {"other, below -1", u"7", 3, -2, u"7"},
   };
   for (const auto& row : rows) EXPECT_EQ(utils.AddZeros(row.text, row.length, row.justify), row.expected) << row.name;
 }

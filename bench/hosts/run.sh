@@ -1,0 +1,14 @@
+#!/usr/bin/env bash
+# The figures of the Windows side: run.sh [NAME OF THE FOLDER BELOW build]. Needs the windows preset and its target
+# host_bench to be built.
+set -euo pipefail
+. "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
+. "$talutil_top/tests/hosts/screen.sh"
+
+folder=${1:-windows}
+start_wine
+start_screen
+wine regsvr32.exe /s "Z:\\build\\$folder\\TALUtil.dll"
+wine cscript.exe //nologo 'Z:\checkout\bench\hosts\call.vbs'
+wine "Z:\\build\\$folder\\bench\\hosts\\host_bench.exe" "Z:\\build\\$folder"
+wine regsvr32.exe /s /u "Z:\\build\\$folder\\TALUtil.dll"

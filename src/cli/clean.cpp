@@ -1,0 +1,168 @@
+#include <algorithm>
+#include <chrono>
+#include <filesystem>
+#include <iomanip>
+#include <iostream>
+
+#include "cli/cleaner.hpp"
+#include "cli/commands.hpp"
+#include "cli/csv.hpp"
+#include "cli/failure.hpp"
+#include "cli/files.hpp"
+#include "cli/json.hpp"
+#include "cli/plan.hpp"
+
+namespace talutil::cli {
+
+namespace {
+
+/// A column of the file, its steps, and what became of it.
+struct Column {
+  std::string name;
+  std::vector<PlanStep> steps;
+  std::size_t changed = 0;
+  Text before;  ///< The first field that was changed, and what it became.
+  Text after;
+};
+
+/// The columns in the file's order. Each needs exactly one line in the plan, so that nothing passes uncleaned.
+std::vector<Column> match_columns(const std::vector<std::string>& header, std::vector<PlanColumn> plan,
+                                  const std::string& plan_path) {
+  std::vector<Column> columns;
+  for (const std::string& bytes : header) {
+    const std::string name = to_utf8(from_ansi(bytes));
+    const auto found = std::ranges::find(plan, name, &PlanColumn::name);
+    if (found == plan.end()) {
+      const bool twice = std::ranges::find(columns, name, &Column::name) != columns.end();
+      throw run_time_failure("column \"" + name + "\" " + (twice ? "stands twice" : "has no line in " + plan_path));
+    }
+    columns.push_back({name, std::move(found->steps), 0, {}, {}});
+    plan.erase(found);
+  }
+  if (!plan.empty())
+    throw run_time_failure("there is no column \"" + plan.front().name + "\", which " + plan_path + " names");
+  return columns;
+}
+
+bool is_plain_name(std::string_view name) {
+  const auto fits = [](char c) {
+    return c == '_' || (c >= '0' && c <= '9') || (fold_case(c) >= 'a' && fold_case(c) <= 'z');
+  };
+  return !name.empty() && !(name.front() >= '0' && name.front() <= '9') && std::ranges::all_of(name, fits);
+}
+
+std::string in_quotes(std::string_view text, char quote) {
+  std::string result(1, quote);
+  for (const char c : text) result.append(c == quote ? 2 : 1, c);
+  return result + quote;
+}
+
+std::string sql_name(std::string_view name) { return is_plain_name(name) ? std::string(name) : in_quotes(name, '"'); }
+
+std::string insert_opening(const std::string& table, const std::vector<Column>& columns) {
+  std::string opening = "INSERT INTO " + sql_name(table);
+  std::string_view separator = " (";
+  for (const Column& column : columns) {
+    opening += separator;
+    opening += sql_name(to_ansi(from_utf8(column.name)));
+    separator = ", ";
+  }
+  return opening + ") VALUES ";
+}
+
+/// Every value is quoted, numbers too: a number may have the user's decimal comma.
+void append_value(std::string& sql, std::size_t index, const Text& value) {
+  sql += index == 0 ? "(" : ", ";
+  sql += in_quotes(to_ansi(value), '\'');
+}
+
+struct Totals {
+  std::size_t rows = 0;
+  std::string sql;
+};
+
+/// Cleans the rows after the header.
+Totals clean_rows(CsvReader& reader, const std::string& opening, std::vector<Column>& columns, Cleaner& cleaner) {
+  Totals totals;
+  std::vector<std::string> row;
+  while (reader.read(row)) {
+    const std::string place = "line " + std::to_string(reader.line());
+    if (row.size() != columns.size()) {
+      throw run_time_failure(place + ": the row has " + std::to_string(row.size()) + " fields, the header " +
+                             std::to_string(columns.size()));
+    }
+    ++totals.rows;
+    totals.sql += opening;
+    for (std::size_t i = 0; i < row.size(); ++i) {
+      Column& column = columns[i];
+      const Text before = from_ansi(row[i]);
+      Text after =
+          within(place + ", column \"" + column.name + "\"", [&] { return cleaner.clean(column.steps, before); });
+      append_value(totals.sql, i, after);
+      if (after == before) continue;
+      if (++column.changed > 1) continue;
+      column.before = before;
+      column.after = std::move(after);
+    }
+    totals.sql += ");\r\n";
+  }
+  return totals;
+}
+
+/// A text short enough for a line, with its control characters shown.
+std::string sample(TextView text) {
+  constexpr std::size_t longest = 34;
+  const bool is_cut = text.size() > longest;
+  return json::text(text.substr(0, longest)) + (is_cut ? "..." : "");
+}
+
+void print_columns(const std::vector<Column>& columns) {
+  std::size_t width = 0;
+  for (const Column& column : columns) width = std::max(width, column.name.size());
+  for (const Column& column : columns) {
+    std::cout << "  " << std::left << std::setw(static_cast<int>(width)) << column.name << std::right << std::setw(7)
+              << column.changed;
+    if (column.changed > 0) std::cout << "  " << sample(column.before) << " -> " << sample(column.after);
+    std::cout << '\n';
+  }
+}
+
+}  // namespace
+
+void clean(const CleanOptions& options) {
+  const auto start = std::chrono::steady_clock::now();
+  const std::filesystem::path csv_path(options.csv);
+  const std::string output =
+      options.output.empty() ? std::filesystem::path(csv_path).replace_extension(".sql").string() : options.output;
+  const std::string table = options.table.empty() ? csv_path.stem().string() : options.table;
+
+  std::error_code no_such_file;
+  if (std::filesystem::equivalent(csv_path, output, no_such_file)) {
+    throw usage_failure("--output " + output + " is the CSV file itself; name another file");
+  }
+
+  Session session;
+  auto plan = within(options.plan,
+                     [&] { return read_plan(read_bytes(options.plan), Session::members().members, session.locale()); });
+  const std::string bytes = read_bytes(options.csv);
+  CsvReader reader(bytes);
+  Cleaner cleaner(session);
+  std::vector<Column> columns;
+  const Totals totals = within(options.csv, [&] {
+    std::vector<std::string> header;
+    if (!reader.read(header)) throw run_time_failure("is empty; its first row must name the columns");
+    columns = match_columns(header, std::move(plan), options.plan);
+    return clean_rows(reader, insert_opening(table, columns), columns, cleaner);
+  });
+  write_bytes(output, totals.sql);
+  const std::chrono::duration<double> elapsed = std::chrono::steady_clock::now() - start;
+
+  std::cout << totals.rows << " rows of " << columns.size() << " columns; fields changed, with the first of each:\n";
+  print_columns(columns);
+  std::cout << "CounterVerifyText " << session.settings().CounterVerifyText << ", CounterVerifyInt "
+            << session.settings().CounterVerifyInt << '\n'
+            << totals.sql.size() << " bytes of inserts to " << output << " in " << std::fixed << std::setprecision(3)
+            << elapsed.count() << " s\n";
+}
+
+}  // namespace talutil::cli

@@ -1,0 +1,46 @@
+#pragma once
+
+#include <span>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "automation/member_table.hpp"
+
+namespace talutil::cli {
+
+/// A member with all its slots: a property has one for each access.
+struct Entry {
+  const Member* get = nullptr;
+  const Member* put = nullptr;
+  const Member* call = nullptr;
+
+  /// What name, help and type are taken from.
+  [[nodiscard]] const Member& any() const noexcept { return call != nullptr ? *call : get != nullptr ? *get : *put; }
+  [[nodiscard]] bool is_method() const noexcept { return call != nullptr; }
+
+  /// The type of a property's value, or of a method's result.
+  [[nodiscard]] ValueType type() const noexcept {
+    return get == nullptr && put != nullptr ? put->all_parameters[0].type : any().result;
+  }
+};
+
+/// The members in the order of their first slots.
+[[nodiscard]] std::vector<Entry> entries_of(std::span<const Member> members);
+
+/// The member of a name, compared without case. An unknown one fails as wrong usage, with the nearest names.
+[[nodiscard]] Entry find_entry(std::span<const Member> members, std::string_view name);
+
+/// A type as hosts declare it.
+[[nodiscard]] std::string_view type_name(ValueType type) noexcept;
+
+/// "get put", "get", "put" or "call".
+[[nodiscard]] std::string access_words(const Entry& entry);
+
+/// "GetData(sSrcStr As String, iSt As Long, iEn As Long) As String". ByRef marks what is written back.
+[[nodiscard]] std::string signature(const Entry& entry);
+
+/// The default of an optional parameter as one writes it in a program; empty for any other.
+[[nodiscard]] std::string default_words(const Parameter& parameter);
+
+}  // namespace talutil::cli

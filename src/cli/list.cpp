@@ -1,0 +1,64 @@
+#include <algorithm>
+#include <iostream>
+
+#include "cli/commands.hpp"
+#include "cli/entries.hpp"
+#include "cli/json.hpp"
+#include "cli/session.hpp"
+
+namespace talutil::cli {
+
+namespace {
+
+std::string flag(bool value) { return value ? "true" : "false"; }
+
+std::string parameter_json(const Parameter& parameter) {
+  std::vector<json::Field> fields{{"name", json::text(parameter.name)},
+                                  {"type", json::text(type_name(parameter.type))},
+                                  {"written_back", flag(parameter.passing == Passing::written_back)},
+                                  {"optional", flag(parameter.is_optional)}};
+  if (parameter.is_optional) fields.emplace_back("default", json::value(parameter.default_value(), Locale{}));
+  return json::object(fields);
+}
+
+std::string entry_json(const Entry& entry) {
+  const Member& member = entry.any();
+  std::vector<json::Field> fields{{"name", json::text(member.name)},
+                                  {"access", json::text(access_words(entry))},
+                                  {"type", json::text(type_name(entry.type()))},
+                                  {"built", flag(!member.is_pending)},
+                                  {"signature", json::text(signature(entry))},
+                                  {"help", json::text(member.help)}};
+  if (entry.is_method()) {
+    std::vector<std::string> parameters;
+    std::ranges::transform(member.parameters(), std::back_inserter(parameters), parameter_json);
+    fields.emplace_back("parameters", json::array(parameters));
+  }
+  return json::object(fields);
+}
+
+void print_line(const Entry& entry, bool mark_missing) {
+  constexpr std::size_t access_width = 9;
+  std::string line = access_words(entry);
+  line.resize(access_width, ' ');
+  std::cout << line << signature(entry) << (mark_missing && entry.any().is_pending ? "  (not built yet)" : "") << '\n';
+}
+
+}  // namespace
+
+void list(const ListOptions& options) {
+  std::vector<Entry> entries = entries_of(Session::members().members);
+  if (options.missing) std::erase_if(entries, [](const Entry& entry) { return !entry.any().is_pending; });
+  if (!options.json) {
+    for (const Entry& entry : entries) print_line(entry, !options.missing);
+    return;
+  }
+  std::string separator = "[\n";
+  for (const Entry& entry : entries) {
+    std::cout << separator << entry_json(entry);
+    separator = ",\n";
+  }
+  std::cout << (entries.empty() ? "[]\n" : "\n]\n");
+}
+
+}  // namespace talutil::cli

@@ -1,0 +1,153 @@
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <iostream>
+
+#include "automation/member_table.hpp"
+#include "cli/arguments.hpp"
+#include "cli/commands.hpp"
+#include "cli/failure.hpp"
+#include "library/interface_definition.hpp"
+#include "library/version.hpp"
+
+namespace {
+
+using namespace talutil::cli;
+
+/// What the command line asks for: the options of each subcommand and the one that was chosen.
+struct Request {
+  ListOptions list;
+  std::string help_member;
+  CallOptions call;
+  CleanOptions clean;
+  std::function<void()> run;
+};
+
+void add_list(CLI::App& app, Request& request) {
+  auto* const command = app.add_subcommand("list", "List every member with its access and signature");
+  command->add_flag("--missing", request.list.missing, "Only those not built yet");
+  command->add_flag("--json", request.list.json, "As a JSON array");
+  command->callback([&] { request.run = [&] { list(request.list); }; });
+}
+
+void add_help(CLI::App& app, Request& request) {
+  auto* const command = app.add_subcommand("help", "Explain a member, or this command");
+  command->add_option("MEMBER", request.help_member, "The member's name, in any case");
+  command->callback([&] {
+    request.run = [&] {
+      if (request.help_member.empty())
+        std::cout << app.help();
+      else
+        help(request.help_member);
+    };
+  });
+}
+
+void add_call(CLI::App& app, Request& request) {
+  auto* const command = app.add_subcommand("call", "Call a method, read a setting or put one: MEMBER [ARGUMENT]...");
+  // What is no option of ours is an argument, in its order: "-1" and "-x" need no "--" before them.
+  command->allow_extras();
+  command->set_help_flag("--help", "Print this help message and exit");
+  command->add_option("MEMBER", request.call.member, "The member's name, in any case")->required();
+  command->add_option("--set", request.call.settings, "Put a setting before the call; may be repeated")
+      ->allow_extra_args(false)
+      ->type_name("NAME=VALUE");
+  command->add_flag("--json", request.call.json, "Print {\"result\": ..., \"arguments\": {...}}");
+  command->footer("Arguments are texts as typed, and become what the parameter wants. For what a text cannot say:\n" +
+                  written_forms_help() +
+                  "\n\"--\" ends the options: what follows is an argument even if it is --json.");
+  command->callback([&, command] {
+    const auto arguments = command->remaining();
+    request.call.arguments.insert(request.call.arguments.begin(), arguments.begin(), arguments.end());
+    request.run = [&] { call(request.call); };
+  });
+}
+
+void add_clean(CLI::App& app, Request& request) {
+  auto* const command = app.add_subcommand("clean", "Clean a CSV file field by field and write it as SQL inserts");
+  command->add_option("CSV", request.clean.csv, "The file, in code page 1252, its first row the columns' names")
+      ->required();
+  command->add_option("--plan", request.clean.plan, "Which members clean which column (see below)")->required();
+  command->add_option("--output", request.clean.output, "The SQL file; else the CSV file's name with .sql");
+  command->add_option("--table", request.clean.table, "The table; else the CSV file's name");
+  command->footer(
+      "A plan has one line a column: its name, a member and the member's arguments before the value.\n"
+      "\"|\" hands the result to another member, \"list\" cleans each element of a comma list, \"*\" stands\n"
+      "for the value where it is not the last argument, and \"#\" begins a remark:\n"
+      "  Name    VerifyTextData 40 0\n"
+      "  Amount  VerifyTextData 0 1 | VerifyIntData 1\n"
+      "  Tags    list VerifyTextData 20 1\n"
+      "  Code    AddZeros * 6 -1");
+  command->callback([&] { request.run = [&] { clean(request.clean); }; });
+}
+
+void add_printers(CLI::App& app, Request& request) {
+  app.add_subcommand("idl", "Print the interface definition of the type library")->callback([&] {
+    request.run = [] { std::cout << talutil::interface_definition(); };
+  });
+  app.add_subcommand("reference", "Print the reference page of all members, in Markdown")->callback([&] {
+    request.run = [] { reference(); };
+  });
+}
+
+/// Fails for a first word that is no subcommand, naming those there are.
+void check_subcommand(const CLI::App& app, std::string_view word) {
+  std::string names;
+  for (const CLI::App* const command : app.get_subcommands({})) {
+    if (command->get_name() == word) return;
+    names += (names.empty() ? "" : ", ") + command->get_name();
+  }
+  throw usage_failure("there is no subcommand \"" + std::string(word) + "\"; there are " + names);
+}
+
+/// Takes what follows "--" off the command line: arguments of a call that nothing else may look at.
+std::vector<std::string> take_verbatim(std::vector<std::string>& words) {
+  const auto mark = std::ranges::find(words, "--");
+  if (mark == words.end()) return {};
+  std::vector<std::string> verbatim(mark + 1, words.end());
+  words.erase(mark, words.end());
+  return verbatim;
+}
+
+int run(std::vector<std::string> words) {
+  CLI::App app("TALUtil on the command line: its members listed, explained and called.", "talutil");
+  app.set_version_flag("--version", talutil::version_text);
+  app.require_subcommand(1);
+  app.footer("\"talutil help MEMBER\" explains a member, \"talutil call --help\" how arguments are written.");
+  Request request;
+  add_list(app, request);
+  add_help(app, request);
+  add_call(app, request);
+  add_clean(app, request);
+  add_printers(app, request);
+  if (!words.empty() && !words.front().starts_with('-')) check_subcommand(app, words.front());
+  if (!words.empty() && words.front() == "call") request.call.arguments = take_verbatim(words);
+  std::ranges::reverse(words);  // the parser takes them from the back
+  try {
+    app.parse(words);
+  } catch (const CLI::Success& help_or_version) {
+    return app.exit(help_or_version);
+  } catch (const CLI::ParseError& error) {
+    std::string message = error.what();
+    message.front() = talutil::fold_case(message.front());
+    throw usage_failure(message + "; see \"talutil --help\"");
+  }
+  request.run();
+  if (!std::cout.flush()) throw run_time_failure("cannot write the output");
+  return 0;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  try {
+    return run({argv + 1, argv + argc});
+  } catch (const Failure& failure) {
+    std::cerr << "talutil: " << failure.what() << '\n';
+    return failure.status();
+  } catch (const talutil::RunTimeError& error) {
+    std::cerr << "talutil: " << error_words(error) << '\n';
+  } catch (const std::exception& error) {
+    std::cerr << "talutil: " << error.what() << '\n';
+  }
+  return run_time_status;
+}

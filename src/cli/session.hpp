@@ -1,0 +1,31 @@
+#pragma once
+
+#include "automation/late_call.hpp"
+#include "library/interface_table.hpp"
+#include "library/library.hpp"
+#include "platform/posix/posix_platform.hpp"
+
+namespace talutil::cli {
+
+/// A started library with one toolkit object, called late-bound as scripts call it.
+class Session {
+ public:
+  Session() { library_.start(); }
+
+  [[nodiscard]] static const LateInterface& members() { return late_interface<ORVUtils>(); }
+  [[nodiscard]] Locale locale() const { return library_.locale(); }
+  [[nodiscard]] const SharedSettings& settings() noexcept { return library_.settings(); }
+
+  /// Raises RunTimeError as the member does.
+  Variant call(const Member& member, std::span<Argument> arguments) {
+    const auto slot = static_cast<std::int32_t>(&member - members().members.data());
+    return members().call(&utils_, slot, arguments, library_.locale());
+  }
+
+ private:
+  posix::PosixPlatform platform_;
+  Library library_{platform_.platform()};
+  ORVUtils utils_{library_};
+};
+
+}  // namespace talutil::cli

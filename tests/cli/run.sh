@@ -1,0 +1,177 @@
+#!/usr/bin/env bash
+# Runs the command and compares exit status and output: tests/cli/run.sh PATH_TO_TALUTIL
+# The last line is "N passed, N failed".
+set -uo pipefail
+[ $# = 1 ] && [ -x "$1" ] || { echo "usage: tests/cli/run.sh PATH_TO_TALUTIL" >&2; exit 2; }
+talutil=$(realpath "$1")
+top=$(cd "$(dirname "${BASH_SOURCE[0]}")/../.." && pwd)
+work=$(mktemp -d)
+trap 'rm -rf "$work"' EXIT
+cd "$work"
+export LC_ALL=C.UTF-8
+
+passed=0
+failed=0
+
+verdict() {  # name, expected, actual
+  if [ "$2" == "$3" ]; then
+    passed=$((passed + 1))
+  else
+    failed=$((failed + 1))
+    printf 'FAILED: %s\n  expected: %q\n  actual:   %q\n' "$1" "$2" "$3"
+  fi
+}
+
+# What a command line gives: the status, then everything printed. expect NAME STATUS OUTPUT ARGUMENT...
+expect() {
+  local name=$1 status=$2 output=$3 actual
+  shift 3
+  actual=$("$talutil" "$@" 2>&1 </dev/null)
+  verdict "$name" "$status: $output" "$?: $actual"
+}
+
+# The same, where a part of the output tells enough.
+expect_part() {
+  local name=$1 status=$2 part=$3 actual
+  shift 3
+  actual=$("$talutil" "$@" 2>&1 </dev/null)
+  local found=$?
+  [[ $actual == *"$part"* ]] && actual=$part
+  verdict "$name" "$status: $part" "$found: $actual"
+}
+
+nl=$'\n'
+
+# ---- call: results and what is written back
+expect 'text result' 0 B call GetData A,B,C, 1 2
+expect 'name in any case' 0 B call getdata A,B,C, 1 2
+expect 'negative number without --' 0 007 call AddZeros 7 3 -1
+expect 'a dash begins a text' 0 -.5x call StripNulls -.5x
+expect 'a subcommand as text' 0 list call StripNulls list
+expect 'after -- an option is a text' 0 --json call StripNulls -- --json
+expect 'an empty text' 0 '' call StripNulls ''
+expect 'not ASCII' 0 'O´Brien an' call VerifyTextData 10 0 "  O'Brien & Sons  "
+expect 'Boolean' 0 True call MyInstrDelim B A,B, ,
+expect 'array written back' 0 "2${nl}sFList = [\"A\", \"\"]" call ReadCommaDelimStrToList A,,B @empty
+expect 'optional argument given' 0 "1${nl}sFList = [\"A,B\"]" call ReadCommaDelimStrToList 'A,B;' @empty ';'
+expect 'optional argument as missing' 0 "1${nl}sFList = [\"A\"]" call ReadCommaDelimStrToList 'A,B;' @empty @missing
+expect 'written back though unchanged' 0 "0${nl}sFList = [\"x\"]" call ReadCommaDelimStrToList '' @list:x
+expect 'JSON' 0 '{"result": "AB", "arguments": {"sCharacter": " "}}' call RemoveStringsFromNumber 2 'A B' '' --json
+expect 'JSON escapes' 0 '{"result": "\"\\\r\nü😀", "arguments": {}}' call --json StringRestoreCRLF '"\xxü😀' x
+expect 'JSON of no result' 0 '{"result": null, "arguments": {}}' call Terminate --json
+
+# ---- call: written forms
+expect 'Null' 0 0 call VerifyIntData 1 @null
+expect 'Empty is not Null' 0 0 call VerifyIntData 0 @empty
+expect 'number' 0 1.5 call VerifyIntData 0 @num:1.5
+expect 'date, day first' 0 31/03/2009 call VerifyTextData 0 0 @date:31/3/2009
+expect 'list' 0 1 call IndexInList @list:Apple,Banana ban
+expect 'two at signs' 0 @null call StripNulls @@null
+printf 'a\0bü' >"$work/bytes"
+expect 'file' 0 a call StripNulls "@file:$work/bytes"
+verdict 'control characters are raw' "61 00 62 c3 bc 0a" \
+  "$("$talutil" call StringReplaceWord @- x y <"$work/bytes" | od -An -tx1 | sed 's/^ //')"
+expect_part 'unknown form' 2 'StripNulls: s: "@nul" is not a written form; write "@@nul" for the text' call StripNulls @nul
+expect_part 'form with a bad value' 2 'VerifyIntData: vData: "@int:x" is not a 32-bit whole number; write it like @int:5' \
+  call VerifyIntData 0 @int:x
+expect 'file that is not there' 1 \
+  'talutil: StripNulls: s: cannot read "nowhere": No such file or directory' call StripNulls @file:nowhere
+expect_part 'bytes that are not UTF-8' 2 'is not in UTF-8' call StripNulls $'\xff'
+
+# ---- call: settings
+expect 'a setting is read' 0 0 call CounterVerifyText
+expect 'put, then read' 0 anne call --set sUserName=x --set susername=anne sUserName
+expect 'value with an equals sign' 0 a=b call --set sUserName=a=b sUserName
+expect 'a put prints nothing' 0 '' call iBranchID 7
+expect 'read only' 2 'talutil: ComputerName can only be read; leave its value out' call ComputerName x
+expect 'put only' 2 'talutil: SplashForm can only be put; write its value after it' call SplashForm
+expect 'setting out of range' 1 'talutil: iBranchID: "70000" is out of range; write -32768 to 32767' \
+  call --set iBranchID=70000 iBranchID
+expect 'setting without value' 2 'talutil: --set DebugMode: has no value; write --set DebugMode=VALUE' \
+  call --set DebugMode Terminate
+expect 'message box without a terminal' 0 'talutil: Closing ORVUtils Components form' call --set DebugMode=1 Terminate
+
+# ---- call: errors
+expect 'run-time error' 1 'talutil: GetData: error 5: Invalid procedure call or argument' call GetData A,B,C, 2 1
+expect 'not built yet' 1 \
+  "talutil: GetIpAddrTable: error 445: Object doesn't support this action (not built yet; \"talutil list --missing\" shows all such members)" \
+  call GetIpAddrTable
+expect 'not a whole number' 1 \
+  'talutil: GetData: iSt: "x" is not a whole number; write -2147483648 to 2147483647' call GetData A, x 2
+expect 'not a date' 1 \
+  'talutil: BookingScreenDate: "31/31/2009" is not a date; write DD/MM/YYYY, DD/MM/YYYY HH:MM or HH:MM' \
+  call BookingScreenDate 31/31/2009
+expect 'too few' 2 'talutil: GetData takes 3 arguments (sSrcStr, iSt, iEn), not 1; see "talutil help GetData"' call GetData A
+expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, sDelimiter), not 4' \
+  call ReadCommaDelimStrToList 1 2 3 4
+expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
+expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
+expect 'no such subcommand' 2 \
+  'talutil: there is no subcommand "lst"; there are list, help, call, clean, idl, reference' lst
+expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
+
+# ---- list, help
+expect_part 'list: property' 0 "${nl}get put  sUserName As String${nl}" list
+expect_part 'list: put only' 0 "${nl}put      SplashForm As Variant${nl}" list
+expect_part 'list: method' 0 \
+  "${nl}call     ReadCommaDelimStrToList(sTemp As String, ByRef sFList As String(), [sDelimiter As String = \",\"]) As Long${nl}" list
+verdict 'each name once' '' "$("$talutil" list | cut -c10- | sed 's/[( ].*//' | sort | uniq -d)"
+verdict 'missing and built make all' "$("$talutil" list | wc -l)" \
+  $(($("$talutil" list --missing | wc -l) + $("$talutil" list | grep -vc 'not built yet')))
+expect_part 'help: written back, default' 0 'sDelimiter  String; "," when left out' help readcommadelimstrtolist
+if command -v python3 >/dev/null; then
+  verdict 'list --json is JSON' "$("$talutil" list | wc -l)" \
+    "$("$talutil" list --json | python3 -c 'import json, sys; print(len(json.load(sys.stdin)))')"
+fi
+
+# ---- clean
+plan="ID VerifyIntData 0${nl}# a remark${nl}Name VerifyTextData 8 0${nl}Tags list VerifyTextData 0 0${nl}"
+plan+="Code StripNulls | AddZeros * 3 -1${nl}"
+printf %s "$plan" >plan
+clean() { printf "$1" >in.csv; "$talutil" clean in.csv --plan plan --output out.sql --table 't "x"' 2>&1; }
+inserts() { clean "$1" >log && iconv -f CP1252 out.sql | tr -d '\r'; }
+opening='INSERT INTO "t ""x""" (ID, Name, Tags, Code) VALUES '
+
+verdict 'quotes, line breaks, NUL, code page 1252' "$opening('1', 'M´ü', 'a´,b,', '007');" \
+  "$(inserts 'ID,Name,Tags,Code\r\n1,"M'"'"'""\xfc\0""","a'"'"',b",7\0x\r\n')"
+verdict 'line feeds alone, no last one, empty list' "$opening('0', '', '', 'abcd');$nl$opening('2', 'x', ',', '000');" \
+  "$(inserts 'ID,Name,Tags,Code\n,,,abcd\n2,x,",",')"
+verdict 'apostrophes are doubled' "$opening('0', '', '', 'a''b');" "$(inserts "ID,Name,Tags,Code\n,,,a'b\n")"
+verdict 'the summary' 'Name      1  "#" -> ""' "$(clean 'ID,Name,Tags,Code\n0,#,,000\n' | sed -n 's/^  \(Name.*\)/\1/p')"
+verdict 'the counters' 'CounterVerifyText 3, CounterVerifyInt 1' \
+  "$(clean 'ID,Name,Tags,Code\n0,x,"a,b",\n' | grep Counter)"
+
+refused() {  # name, message, CSV
+  local actual
+  actual=$(clean "$3")
+  verdict "$1" "1: talutil: in.csv: $2" "$?: $actual"
+}
+refused 'open quote' 'line 2: a quote is never closed; double the quotes inside a field and close it with one' \
+  'ID,Name,Tags,Code\n"1,2\n'
+refused 'text after a quote' 'line 3: text after a closing quote; double the quotes inside a field' \
+  'ID,Name,Tags,Code\n"1\n"x,2,3,4\n'
+refused 'short row' 'line 4: the row has 2 fields, the header 4' 'ID,Name,Tags,Code\n"\n",,,\n1,2\n'
+refused 'column without plan' 'column "Fax" has no line in plan' 'ID,Fax,Name,Tags,Code\n'
+refused 'plan without column' 'there is no column "Code", which plan names' 'ID,Name,Tags\n'
+refused 'run-time error' \
+  'line 2, column "ID": VerifyIntData: error 6: Overflow; the value is "1E999"' 'ID,Name,Tags,Code\n1E999,,,\n'
+verdict 'nothing is written on errors' 'none' "$(rm -f out.sql; clean 'ID\n' >log; cat out.sql 2>/dev/null || echo none)"
+verdict 'the CSV file is not overwritten' '2: talutil: --output ./in.csv is the CSV file itself; name another file' \
+  "$(printf 'ID\n' >in.csv; m=$("$talutil" clean in.csv --plan plan --output ./in.csv 2>&1); echo "$?: $m")"
+
+bad_plan() {  # name, message, line
+  printf 'ID VerifyIntData 0\n%s\n' "$3" >plan
+  verdict "$1" "2: talutil: plan: line 2: $2" "$(m=$(clean 'ID,Name\n'); echo "$?: $m")"
+}
+bad_plan 'plan: unknown member' 'there is no member "VerifyTextDat"; did you mean VerifyTextData?' 'Name VerifyTextDat 1 0'
+bad_plan 'plan: no member' 'a member is missing; write one such as VerifyTextData 40 0' 'Name list'
+bad_plan 'plan: count' \
+  'VerifyTextData takes 3 arguments and got 2, the column'"'"'s value included; see "talutil help VerifyTextData"' 'Name VerifyTextData 1'
+bad_plan 'plan: column twice' 'column "ID" stands twice' 'ID StripNulls'
+bad_plan 'plan: no result' 'Terminate gives no value back; use a member that does' 'Name Terminate'
+
+cmp -s "$top/examples/data/customers.csv" <("${CXX:-g++}" -std=c++20 -o make "$top/tools/make_customers.cpp" && ./make)
+verdict 'customers.csv is what make_customers writes' 0 $?
+
+printf '%d passed, %d failed\n' "$passed" "$failed"
+[ "$failed" = 0 ]

@@ -1,0 +1,433 @@
+// A client that is bound early: through the vtable, by the header that the interface compiler made.
+#include "forms/c_control_position.hpp"
+#include "library/interface_table.hpp"
+#include "slots.hpp"
+
+using namespace talutil::hosts;
+
+namespace {
+
+using U = _ORVUtils;
+
+void settings_are_shared_and_survive() {
+  Pointer<U> first = create_object();
+  const Pointer<U> second = create_object();
+  check(first.get() != second.get(), "two objects");
+  VARIANT_BOOL unset = 7;
+  check_equal(S_OK, first->get_WriteServerPerformanceFile(&unset), "a Boolean never put");
+  check_equal(VARIANT_FALSE, unset, "a Boolean never put");
+  first->put_sUserName(*Text(L"anne"));
+  first->put_lLoginSessionID(-70000);
+  first = {};
+  const Pointer<U> third = create_object();
+  Text user;
+  LONG session = 0;
+  second->get_sUserName(user);
+  third->get_lLoginSessionID(&session);
+  check_equal(L"anne", user.view(), "sUserName through another object");
+  check_equal(-70000, session, "lLoginSessionID after the release of its object");
+}
+
+void properties_keep_what_they_are_given(U* u) {
+  short narrow_number = 0;
+  float single = 0;
+  DATE date = 0;
+  VARIANT_BOOL bits = 0;
+  Text text(L"old");
+  u->put_iBranchID(-32768);
+  u->get_iBranchID(&narrow_number);
+  check_equal(-32768, narrow_number, "iBranchID");
+  u->put_GSTValue(12.5F);
+  u->get_GSTValue(&single);
+  check_equal(12.5F, single, "GSTValue");
+  u->put_BookingScreenDate(-1.75);
+  u->get_BookingScreenDate(&date);
+  check_equal(-1.75, date, "BookingScreenDate");
+  u->put_bIsProgrammer(1);
+  u->get_bIsProgrammer(&bits);
+  check_equal(1, bits, "a Boolean keeps the bits it was given");
+  u->put_ORV3CFGName(*Text(std::wstring_view(L"a\0b\u00B4\u4E2D", 5)));
+  u->get_ORV3CFGName(text);
+  check_equal(std::wstring_view(L"a\0b\u00B4\u4E2D", 5), text.view(), "ORV3CFGName, with a NUL and wide characters");
+  u->put_ORV3CFGName(nullptr);
+  u->get_ORV3CFGName(text);
+  check_equal(L"", text.view(), "ORV3CFGName put as a null text");
+  u->get_ComputerName(text);
+  std::array<wchar_t, MAX_COMPUTERNAME_LENGTH + 1> name{};
+  auto length = static_cast<DWORD>(name.size());
+  GetComputerNameW(name.data(), &length);
+  check_equal(std::wstring_view(name.data(), length), text.view(), "ComputerName");
+}
+
+void object_properties_hold_references(U* u) {
+  using Put = HRESULT (STDMETHODCALLTYPE U::*)(VARIANT);
+  for (const Put put : {Put{&U::put_FolderBrowseForm}, Put{&U::put_SplashForm}, Put{&U::put_DrawTextPictureBox}}) {
+    HostObject form(HostObject::Kind::with_value);
+    check_equal(S_OK, (u->*put)(Value(&form).get()), "putting an object");
+    check_equal(2U, form.references, "references after the put");
+    check_equal(run_time_error(13), (u->*put)(Value(L"a text").get()), "putting a text");
+    check_equal(L"TALUtil.ORVUtils: Type mismatch", error_text(), "its error");
+    check_equal(run_time_error(13), (u->*put)(Value().get()), "putting Empty");
+    check_equal(2U, form.references, "references after a refused put");
+    VARIANT variable = Value(&form).get();
+    check_equal(S_OK, (u->*put)(Value(&variable).get()), "putting a reference to a variable with an object");
+    check_equal(2U, form.references, "references after putting it again");
+    check_equal(S_OK, (u->*put)(Value(static_cast<IDispatch*>(nullptr)).get()), "putting an empty reference");
+    check_equal(1U, form.references, "references after that");
+  }
+}
+
+struct TextRow {
+  const char* name;
+  const wchar_t* expected;
+  std::function<HRESULT(U*, BSTR*)> call;
+};
+
+void text_members(U* u) {
+  const TextRow rows[] = {
+      {"apostrophe, ampersand, cut to ten", L"O\u00B4Brien an",
+       [](U* o, BSTR* out) { return o->VerifyTextData(Short{10}, Short{0}, Value(L"  O'Brien & Sons  "), out); }},
+      {"commas and blanks", L"123",
+       [](U* o, BSTR* out) { return o->VerifyTextData(Short{0}, Short{3}, Value(L"1, 2 ,3"), out); }},
+      {"marked lines go", L"A\r\nB\r\n",
+       [](U* o, BSTR* out) { return o->VerifyTextData(Short{0}, Short{5}, Value(L"A\r\nx $*$ y\r\n B "), out); }},
+      {"short lines join", L"Unit 5 - Main Rd\r\n",
+       [](U* o, BSTR* out) { return o->VerifyTextData(Short{0}, Short{4}, Value(L"Unit 5\r\nMain Rd"), out); }},
+      {"Null to a number", L"0", [](U* o, BSTR* out) { return o->VerifyIntData(Short{1}, Value::null(), out); }},
+      {"leading number", L"3.5", [](U* o, BSTR* out) { return o->VerifyIntData(Short{0}, Value(L"3.50kg"), out); }},
+      {"memo", L"A\r B", [](U* o, BSTR* out) { return o->VerifyMemField(Text(L"A\r\nB"), out); }},
+      {"NUL ends", L"ab", [](U* o, BSTR* out) { return o->StripNulls(Text(std::wstring_view(L"ab\0cd", 5)), out); }},
+      {"letters stay", L"abC_", [](U* o, BSTR* out) { return o->RemoveNumberFromString(Text(L"a1 b@,C_"), out); }},
+      {"digits and full stops", L"1.2",
+       [](U* o, BSTR* out) { return o->RemoveStringsFromNumber(Short{3}, Text(L"$1.2,"), Text(), out); }},
+      {"one character by many", L"a--b--",
+       [](U* o, BSTR* out) { return o->StringReplace(Text(L"a;b;"), Text(L";x"), Text(L"--"), out); }},
+      {"second field", L"B", [](U* o, BSTR* out) { return o->GetData(Text(L"A,B,C,"), Long{1}, Long{2}, out); }},
+      {"no closing comma", L"", [](U* o, BSTR* out) { return o->GetData(Text(L"A,B,C"), Long{2}, Long{3}, out); }},
+      {"line break to markers", L"AxxB",
+       [](U* o, BSTR* out) { return o->CRLFStringReplace(Text(L"A\r\nB"), Text(L"x"), out); }},
+      {"last marker stays", L"AB\r\nx",
+       [](U* o, BSTR* out) { return o->StringRestoreCRLF(Text(L"ABx"), Text(L"x"), out); }},
+      {"zeros before", L"007", [](U* o, BSTR* out) { return o->AddZeros(Text(L"7"), Short{3}, Short{-1}, out); }},
+      {"backwards", L"cba", [](U* o, BSTR* out) { return o->ReverseString(Text(L"abc"), out); }},
+      {"null text", L"", [](U* o, BSTR* out) { return o->ReverseString(Text(), out); }},
+      {"whole words", L"a-c-",
+       [](U* o, BSTR* out) { return o->StringReplaceWord(Text(L"aBBcBB"), Text(L"BB"), Text(L"-"), out); }},
+  };
+  for (const TextRow& row : rows) {
+    // A result is only written: what stood there before is not the member's to free.
+    BSTR result = reinterpret_cast<BSTR>(0xDEAD);
+    check_equal(S_OK, row.call(u, &result), row.name);
+    check_equal(row.expected, view(result), row.name);
+    SysFreeString(result);
+  }
+}
+
+struct NumberRow {
+  const char* name;
+  LONG expected;
+  std::function<HRESULT(U*, LONG*)> call;
+};
+
+void number_members(U* u) {
+  const NumberRow rows[] = {
+      {"count 0", 1, [](U* o, LONG* out) { return o->MyPos(Text(L","), Text(L"A,B"), Long{0}, out); }},
+      {"second comma", 4, [](U* o, LONG* out) { return o->MyPos(Text(L","), Text(L"A,B,"), Long{2}, out); }},
+      {"occurrences", 2, [](U* o, LONG* out) { return o->SubStrCount(Text(L"a"), Text(L"aAa"), out); }},
+      {"list index", 1,
+       [](U* o, LONG* out) {
+         return o->IndexInList(Array(VT_BSTR, 0, {L"Apple", L"Banana"}), Text(L"ban"), out);
+       }},
+      {"no such entry", -1,
+       [](U* o, LONG* out) { return o->IndexInList(Array(VT_VARIANT, 0, {L"Apple"}), Text(L"ban"), out); }},
+  };
+  for (const NumberRow& row : rows) {
+    LONG result = 77;
+    check_equal(S_OK, row.call(u, &result), row.name);
+    check_equal(row.expected, result, row.name);
+  }
+  short position = 0;
+  u->StringPosition(Text(L"12 SMITH ST"), Short{1}, &position);
+  check_equal(3, position, "StringPosition");
+  VARIANT_BOOL found = 0;
+  u->MyInstrDelim(Text(L"B"), Text(L"A,B,"), Text(L","), &found);
+  check_equal(VARIANT_TRUE, found, "MyInstrDelim");
+}
+
+void blank_is_written_back(U* u) {
+  Text character;
+  Text result;
+  check_equal(S_OK, u->RemoveStringsFromNumber(Short{2}, Text(L"A B"), character, result), "RemoveStringsFromNumber");
+  check_equal(L"AB", result.view(), "result");
+  check_equal(L" ", character.view(), "the character written back");
+}
+
+/// The argument for a text that may be left out; the compiler's header has it by value.
+struct Delimiter {
+  BSTR* place;
+  operator BSTR*() const noexcept { return place; }
+  operator BSTR() const noexcept { return reinterpret_cast<BSTR>(place); }
+};
+
+struct ListRow {
+  const char* name;
+  const wchar_t* text;
+  Array before;
+  HRESULT expected;
+  LONG count;
+  const wchar_t* after;
+};
+
+void lists_are_written_back(U* u) {
+  constexpr auto index = run_time_error(9);
+  constexpr auto mismatch = run_time_error(13);
+  constexpr auto fixed = run_time_error(10);
+  ListRow rows[] = {
+      {"unallocated", L"A,B,C", {}, S_OK, 2, L"[A|B|]"},
+      {"empty field", L"A,,B,", {}, S_OK, 3, L"[A||B|]"},
+      {"shorter than before", L"A,", {VT_BSTR, 0, {L"x", L"y"}}, S_OK, 1, L"[A|]"},
+      {"no delimiter", L"A", {VT_BSTR, 0, {L"x", L"y"}}, S_OK, 0, L"[x|y|]"},
+      {"no delimiter, lower bound 1", L"A", {VT_BSTR, 1, {L"x"}}, S_OK, 0, L"[x|]"},
+      {"lower bound 1", L"A,", {VT_BSTR, 1, {L"x"}}, index, 0, L"[x|]"},
+      {"fixed", L"A,", {VT_BSTR, 0, {L"x"}}, fixed, 0, L"[x|]"},
+      {"locked", L"A,", {VT_BSTR, 0, {L"x"}}, fixed, 0, L"[x|]"},
+      {"array of numbers", L"A,", {VT_I4, 0, {}}, mismatch, 0, nullptr},
+      {"two dimensions", L"A,", Array::square(VT_BSTR), index, 0, nullptr},
+  };
+  for (ListRow& row : rows) {
+    const std::string_view name = row.name;
+    if (name == "fixed") row.before.get()->fFeatures |= FADF_FIXEDSIZE;
+    if (name == "locked") SafeArrayLock(row.before.get());
+    LONG count = 77;
+    Text comma(L",");
+    check_equal(row.expected, u->ReadCommaDelimStrToList(Text(row.text), row.before, Delimiter{comma}, &count),
+                row.name);
+    if (row.expected == S_OK) check_equal(row.count, count, row.name);
+    if (row.after != nullptr) check_equal(row.after, contents(row.before.get()), row.name);
+    if (name == "fixed") row.before.get()->fFeatures &= static_cast<USHORT>(~FADF_FIXEDSIZE);
+    if (name == "locked") SafeArrayUnlock(row.before.get());
+  }
+}
+
+struct ErrorRow {
+  const char* name;
+  int number;
+  const wchar_t* text;
+  std::function<HRESULT(U*)> call;
+};
+
+void errors_have_number_and_text(U* u) {
+  const std::wstring long_text(32768, L'x');
+  const ErrorRow rows[] = {
+      {"empty character", 5, L"Invalid procedure call or argument",
+       [](U* o) { return o->StringReplace(Text(L"a"), Text(), Text(), Text()); }},
+      {"fields backwards", 5, L"Invalid procedure call or argument",
+       [](U* o) { return o->GetData(Text(L"A,B,"), Long{2}, Long{1}, Text()); }},
+      {"32768 characters", 6, L"Overflow", [&](U* o) { return o->ReverseString(Text(long_text), Text()); }},
+      {"unallocated list", 9, L"Subscript out of range",
+       [](U* o) { return o->IndexInList(Array(), Text(L"a"), Long{}); }},
+      {"an object without a value", 438, L"Object doesn't support this property or method",
+       [](U* o) {
+         HostObject object(HostObject::Kind::without_value);
+         return o->VerifyTextData(Short{}, Short{}, Value(&object), Text());
+       }},
+      {"an empty reference", 91, L"Object variable or With block variable not set",
+       [](U* o) { return o->VerifyTextData(Short{}, Short{}, Value(static_cast<IDispatch*>(nullptr)), Text()); }},
+      {"a member to come", 445, L"Object doesn't support this action", [](U* o) { return o->GetNewGuid(Text()); }},
+  };
+  for (const ErrorRow& row : rows) {
+    SetErrorInfo(0, nullptr);
+    check_equal(run_time_error(row.number), row.call(u), row.name);
+    check_equal(L"TALUtil.ORVUtils: " + std::wstring(row.text), error_text(), row.name);
+  }
+}
+
+void counters_count_and_overflow(U* u) {
+  LONG count = 0;
+  HostObject object(HostObject::Kind::without_value);
+  u->put_CounterVerifyText(0);
+  u->put_CounterVerifyInt(0);
+  for (int i = 0; i < 3; ++i) u->VerifyTextData(Short{}, Short{}, Value::null(), Text());
+  u->VerifyTextData(Short{}, Short{}, Value(&object), Text());
+  u->get_CounterVerifyText(&count);
+  check_equal(4, count, "CounterVerifyText, a failed call included");
+  u->put_CounterVerifyText(2147483646);
+  check_equal(S_OK, u->VerifyTextData(Short{}, Short{}, Value(), Text()), "the last call that can be counted");
+  check_equal(run_time_error(6), u->VerifyTextData(Short{}, Short{}, Value(), Text()), "the one after it");
+  check_equal(L"TALUtil.ORVUtils: Overflow", error_text(), "its error");
+  u->get_CounterVerifyText(&count);
+  check_equal(2147483647, count, "CounterVerifyText stays");
+  u->get_CounterVerifyInt(&count);
+  check_equal(0, count, "CounterVerifyInt");
+}
+
+void interfaces_are_one_object(U* u) {
+  const std::array<const IID*, 5> known{&IID_IDispatch, &IID__ORVUtils, &IID_ISupportErrorInfo, &IID_IProvideClassInfo,
+                                        &IID_IUnknown};
+  Pointer<IUnknown> identity;
+  u->QueryInterface(IID_IUnknown, identity.receive_untyped());
+  for (const IID* from : known) {
+    for (const IID* to : known) {
+      Pointer<IUnknown> part;
+      Pointer<IUnknown> other;
+      Pointer<IUnknown> again;
+      u->QueryInterface(*from, part.receive_untyped());
+      check_equal(S_OK, part->QueryInterface(*to, other.receive_untyped()), "from one interface to another");
+      other->QueryInterface(IID_IUnknown, again.receive_untyped());
+      check(again.get() == identity.get(), "the identity of the object");
+    }
+  }
+  void* none = u;
+  check_equal(E_NOINTERFACE, u->QueryInterface(IID_IPersist, &none), "an interface it does not have");
+  check_equal(nullptr, none, "what is given with it");
+  check_equal(E_POINTER, u->QueryInterface(IID_IUnknown, nullptr), "no place for the interface");
+
+  Pointer<ISupportErrorInfo> errors;
+  u->QueryInterface(IID_ISupportErrorInfo, errors.receive_untyped());
+  check_equal(S_OK, errors->InterfaceSupportsErrorInfo(IID__ORVUtils), "error information of _ORVUtils");
+  check_equal(S_FALSE, errors->InterfaceSupportsErrorInfo(IID_IPersist), "of an interface it does not have");
+  Pointer<IProvideClassInfo> classes;
+  Pointer<ITypeInfo> information;
+  u->QueryInterface(IID_IProvideClassInfo, classes.receive_untyped());
+  require(classes->GetClassInfo(information.receive()), "GetClassInfo");
+  Text name;
+  information->GetDocumentation(MEMBERID_NIL, name, nullptr, nullptr, nullptr);
+  check_equal(L"ORVUtils", name.view(), "the class information");
+}
+
+HRESULT call_slot(IUnknown* object, const Slot& slot, std::vector<VARIANT>& arguments) {
+  std::vector<VARTYPE> types;
+  std::vector<VARIANTARG*> places;
+  for (VARIANT& argument : arguments) {
+    types.push_back(V_VT(&argument));
+    places.push_back(&argument);
+  }
+  VARIANT result{};
+  require(DispCallFunc(object, static_cast<ULONG_PTR>(slot.offset), CC_STDCALL, VT_ERROR,
+                       static_cast<UINT>(arguments.size()), types.data(), places.data(), &result),
+          "DispCallFunc");
+  return V_ERROR(&result);
+}
+
+/// Calls a slot with zeros, then once for each of its pointers with that one null.
+void walk_slot(IUnknown* object, const Slot& slot, const talutil::Member& member) {
+  const std::string name(member.name);
+  std::vector<std::array<std::byte, 64>> storage(slot.parameters.size());
+  std::vector<VARIANT> arguments(slot.parameters.size());
+  std::array<std::byte, sizeof(VARIANT)> empty{};
+  for (std::size_t i = 0; i < arguments.size(); ++i) {
+    V_VT(&arguments[i]) = slot.parameters[i].type;
+    if (slot.parameters[i].type == VT_PTR) V_BYREF(&arguments[i]) = storage[i].data();
+    // DispCallFunc passes the VARIANT itself where one is passed by value; a zeroed one is Empty.
+    if (slot.parameters[i].type == VT_VARIANT) std::memcpy(&arguments[i], empty.data(), sizeof(VARIANT));
+  }
+  for (std::size_t i = 0; i < arguments.size(); ++i) {
+    if (slot.parameters[i].type != VT_PTR) continue;
+    void* const place = std::exchange(V_BYREF(&arguments[i]), nullptr);
+    check_equal(E_POINTER, call_slot(object, slot, arguments), name + ", argument " + std::to_string(i) + " null");
+    V_BYREF(&arguments[i]) = place;
+  }
+  if (member.is_pending) {
+    check_equal(run_time_error(445), call_slot(object, slot, arguments), name + ", which is to come");
+  } else if (member.access == talutil::Access::get) {
+    check_equal(S_OK, call_slot(object, slot, arguments), name);
+  }
+}
+
+template <class Table>
+void walk_vtable(IDispatch* object, const Table& table) {
+  const std::vector<Slot> slots = slots_of(object);
+  if (!check_equal(table.size(), slots.size(), "slots in the type library")) return;
+  for (std::size_t i = 0; i < slots.size(); ++i) walk_slot(object, slots[i], table[i]);
+}
+
+void second_class(const Pointer<_cControlPosition>& position) {
+  LONG height = 0;
+  check_equal(S_OK, position->put_Height(-5), "put_Height");
+  position->get_Height(&height);
+  check_equal(-5, height, "get_Height");
+  Pointer<_cControlPosition> other;
+  require(CoCreateInstance(CLSID_cControlPosition, nullptr, CLSCTX_INPROC_SERVER, IID__cControlPosition,
+                           other.receive_untyped()),
+          "creating TALUtil.cControlPosition");
+  other->get_Height(&height);
+  check_equal(0, height, "Height of another object");
+  walk_vtable(position.get(), talutil::described<talutil::cControlPosition>);
+}
+
+void library_can_be_unloaded_only_when_idle(HMODULE module) {
+  const auto can_unload =
+      reinterpret_cast<HRESULT(WINAPI*)()>(reinterpret_cast<void*>(GetProcAddress(module, "DllCanUnloadNow")));
+  const auto get_class = reinterpret_cast<HRESULT(WINAPI*)(REFCLSID, REFIID, void**)>(
+      reinterpret_cast<void*>(GetProcAddress(module, "DllGetClassObject")));
+  check_equal(S_OK, can_unload(), "before any object");
+  Pointer<IClassFactory> factory;
+  require(get_class(CLSID_ORVUtils, IID_IClassFactory, factory.receive_untyped()), "DllGetClassObject");
+  check_equal(S_FALSE, can_unload(), "while a class object is held");
+  check_equal(CLASS_E_CLASSNOTAVAILABLE, get_class(IID_IUnknown, IID_IClassFactory, factory.receive_untyped()),
+              "a class it does not have");
+  require(get_class(CLSID_ORVUtils, IID_IClassFactory, factory.receive_untyped()), "DllGetClassObject");
+  Pointer<U> object;
+  check_equal(CLASS_E_NOAGGREGATION, factory->CreateInstance(factory.get(), IID_IUnknown, object.receive_untyped()),
+              "aggregation");
+  require(factory->CreateInstance(nullptr, IID__ORVUtils, object.receive_untyped()), "CreateInstance");
+  factory->LockServer(TRUE);
+  factory = {};
+  object = {};
+  check_equal(S_FALSE, can_unload(), "while the server is locked");
+  get_class(CLSID_ORVUtils, IID_IClassFactory, factory.receive_untyped());
+  factory->LockServer(FALSE);
+  factory = {};
+  check_equal(S_OK, can_unload(), "after the last lock");
+}
+
+void kept_object_keeps_library(HMODULE module) {
+  const auto can_unload =
+      reinterpret_cast<HRESULT(WINAPI*)()>(reinterpret_cast<void*>(GetProcAddress(module, "DllCanUnloadNow")));
+  HostObject form(HostObject::Kind::without_value);
+  Pointer<U> object = create_object();
+  Pointer<ISupportErrorInfo> part;
+  object->QueryInterface(IID_ISupportErrorInfo, part.receive_untyped());
+  object->put_SplashForm(Value(&form).get());
+  object = {};
+  check_equal(S_FALSE, can_unload(), "while a part of an object is held");
+  part = {};
+  check_equal(S_FALSE, can_unload(), "while the settings hold an object of the host's");
+  object = create_object();
+  object->put_SplashForm(Value(static_cast<IDispatch*>(nullptr)).get());
+  object->Terminate();
+  object = {};
+  check_equal(S_OK, can_unload(), "after the last reference");
+}
+
+}  // namespace
+
+int wmain(int, wchar_t** arguments) {
+  return run_checks([&] {
+    const HMODULE module = LoadLibraryW((std::wstring(arguments[1]) + L"\\TALUtil.dll").c_str());
+    library_can_be_unloaded_only_when_idle(module);
+    settings_are_shared_and_survive();
+    Pointer<U> object = create_object();
+    U* const u = object.get();
+    properties_keep_what_they_are_given(u);
+    object_properties_hold_references(u);
+    text_members(u);
+    number_members(u);
+    blank_is_written_back(u);
+    lists_are_written_back(u);
+    errors_have_number_and_text(u);
+    counters_count_and_overflow(u);
+    interfaces_are_one_object(u);
+    walk_vtable(u, talutil::described<talutil::ORVUtils>);
+    Pointer<_cControlPosition> position;
+    require(CoCreateInstance(CLSID_cControlPosition, nullptr, CLSCTX_INPROC_SERVER, IID__cControlPosition,
+                             position.receive_untyped()),
+            "creating TALUtil.cControlPosition");
+    second_class(position);
+    check_equal(S_OK, u->Terminate(), "Terminate");
+    check_equal(S_OK, u->Terminate(), "Terminate again");
+    position = {};
+    object = {};
+    kept_object_keeps_library(module);
+  });
+}

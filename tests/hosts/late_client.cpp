@@ -1,0 +1,543 @@
+// A client that is bound late, through IDispatch: first what a script may expect, then what nobody should send.
+#include <algorithm>
+#include <climits>
+#include <limits>
+#include <span>
+
+#include "slots.hpp"
+
+using namespace talutil::hosts;
+
+namespace {
+
+// What a late-bound caller can get beside success, whatever it sends.
+constexpr HRESULT documented_results[] = {DISP_E_BADPARAMCOUNT, DISP_E_PARAMNOTOPTIONAL, DISP_E_MEMBERNOTFOUND,
+                                          DISP_E_UNKNOWNNAME,   DISP_E_PARAMNOTFOUND,    E_POINTER};
+// 51, an error of no kind the library knows, is not among them.
+constexpr int documented_numbers[] = {5, 6, 7, 9, 10, 13, 91, 94, 424, 438, 445, 449};
+
+struct Outcome {
+  HRESULT status = S_OK;
+  HRESULT code = S_OK;  ///< Of the exception, where there was one.
+  std::wstring source;
+  std::wstring description;
+  Value result;
+
+  [[nodiscard]] HRESULT error() const { return status == DISP_E_EXCEPTION ? code : status; }
+  [[nodiscard]] bool is_documented() const {
+    if (SUCCEEDED(status)) return true;
+    if (status != DISP_E_EXCEPTION)
+      return std::ranges::find(documented_results, status) != std::end(documented_results);
+    if (source != L"TALUtil.ORVUtils" || description.empty()) return false;
+    return code == HostObject::failure ||
+           std::ranges::any_of(documented_numbers, [this](int number) { return code == run_time_error(number); });
+  }
+};
+
+/// The arguments of one call, the last first, and the identifiers of the named ones, which stand in front.
+Outcome invoke(IDispatch* object, DISPID member, WORD flags, std::span<VARIANT> arguments,
+               std::span<DISPID> named = {}) {
+  Outcome outcome;
+  DISPPARAMS parameters{arguments.data(), named.data(), static_cast<UINT>(arguments.size()),
+                        static_cast<UINT>(named.size())};
+  EXCEPINFO exception{};
+  UINT bad_argument = 0;
+  outcome.status = object->Invoke(member, IID_NULL, LOCALE_USER_DEFAULT, flags, &parameters, outcome.result, &exception,
+                                  &bad_argument);
+  outcome.code = exception.scode;
+  outcome.source = view(exception.bstrSource);
+  outcome.description = view(exception.bstrDescription);
+  SysFreeString(exception.bstrSource);
+  SysFreeString(exception.bstrDescription);
+  return outcome;
+}
+
+DISPID identifier(IDispatch* object, const wchar_t* name) {
+  DISPID id = DISPID_UNKNOWN;
+  auto* names = const_cast<wchar_t*>(name);
+  require(object->GetIDsOfNames(IID_NULL, &names, 1, LOCALE_USER_DEFAULT, &id), "GetIDsOfNames");
+  return id;
+}
+
+/// An argument by reference, as a script passes its variables.
+Value in(Value& variable) { return Value(&variable.get()); }
+
+/// Uses a member as a script does, arguments in their order.
+template <class... Arguments>
+Outcome use(IDispatch* object, const wchar_t* member, Arguments&&... arguments) {
+  std::array<VARIANT, sizeof...(Arguments)> list{arguments.get()...};
+  std::ranges::reverse(list);
+  return invoke(object, identifier(object, member), DISPATCH_METHOD | DISPATCH_PROPERTYGET, list);
+}
+
+Outcome put(IDispatch* object, const wchar_t* member, const Value& value, WORD flags = DISPATCH_PROPERTYPUT) {
+  std::array<VARIANT, 1> list{value.get()};
+  std::array<DISPID, 1> named{DISPID_PROPERTYPUT};
+  return invoke(object, identifier(object, member), flags, list, named);
+}
+
+void properties(IDispatch* u) {
+  check_equal(S_OK, put(u, L"SUSERNAME", Value(L"anne")).error(), "a put by a name in capitals");
+  check_equal(L"anne", use(u, L"sUserName").result.text(), "sUserName");
+  check_equal(S_OK, put(u, L"iBranchID", Value(L"12")).error(), "a text for a number");
+  check_equal(VT_I2, use(u, L"iBranchID").result.type(), "iBranchID, its type");
+  check_equal(run_time_error(13), put(u, L"iBranchID", Value(L"twelve")).error(), "a text that is no number");
+  check_equal(run_time_error(6), put(u, L"iBranchID", Value(40000L)).error(), "too large a number");
+  check_equal(run_time_error(94), put(u, L"sUserName", Value::null()).error(), "Null for a text");
+  check_equal(L"anne", use(u, L"sUserName").result.text(), "sUserName after a refused put");
+  check_equal(DISP_E_MEMBERNOTFOUND, put(u, L"ComputerName", Value(L"x")).error(), "a put on ComputerName");
+  check_equal(DISP_E_MEMBERNOTFOUND, use(u, L"SplashForm").error(), "a get of SplashForm");
+  check_equal(DISP_E_MEMBERNOTFOUND, put(u, L"GetData", Value(L"x")).error(), "a put on a method");
+  HostObject form(HostObject::Kind::with_value);
+  check_equal(S_OK, put(u, L"SplashForm", Value(&form), DISPATCH_PROPERTYPUTREF).error(), "a reference");
+  check_equal(2U, form.references, "references after the put");
+  const auto text_by_reference = put(u, L"sUserName", Value(L"x"), DISPATCH_PROPERTYPUTREF);
+  check_equal(DISP_E_MEMBERNOTFOUND, text_by_reference.error(), "a reference for a text");
+  check_equal(run_time_error(13), put(u, L"SplashForm", Value(L"x")).error(), "a text for an object");
+  check_equal(S_OK, put(u, L"SplashForm", Value(static_cast<IDispatch*>(nullptr))).error(), "an empty reference");
+  check_equal(1U, form.references, "references after that");
+}
+
+void write_back_of_text(IDispatch* u) {
+  const auto filter = [u](const Value& character) {
+    return use(u, L"RemoveStringsFromNumber", Value(short{2}), Value(L"A B"), character);
+  };
+  Value variable;
+  check_equal(L"AB", filter(in(variable)).result.text(), "an Empty variable counts as an empty text");
+  check_equal(L" ", variable.text(), "and gets the blank");
+  variable = Value(short{5});
+  check_equal(L"A B", filter(in(variable)).result.text(), "a number in a variable");
+  check_equal(VT_I2, variable.type(), "an unchanged variable keeps its type");
+  Text text;
+  filter(Value::reference(VT_BSTR, text));
+  check_equal(L" ", text.view(), "a text by reference");
+  Text inner;
+  variable = Value::reference(VT_BSTR, inner);
+  filter(in(variable));
+  check_equal(VT_BYREF | VT_BSTR, variable.type(), "a variable that refers to a text still does");
+  check_equal(L" ", inner.view(), "and the text gets the blank");
+  short number = 7;
+  check_equal(L"A B", filter(Value::reference(VT_I2, &number)).result.text(), "a number by reference");
+  check_equal(7, number, "which stays");
+  check_equal(L"AB", filter(Value(L"")).result.text(), "a text by value");
+  check_equal(run_time_error(94), filter(Value::null()).error(), "Null for a text");
+  check_equal(L"Invalid use of Null", filter(Value::null()).description, "its text");
+}
+
+struct ListRow {
+  const char* name;
+  VARTYPE type;  ///< Of the array that the variable holds; VT_EMPTY for none.
+  HRESULT error;
+  VARTYPE type_after;
+  const wchar_t* after;
+};
+
+void write_back_of_arrays(IDispatch* u) {
+  const ListRow rows[] = {
+      {"none", VT_EMPTY, S_OK, VT_ARRAY | VT_VARIANT, L"[A|B|]"},
+      {"variants", VT_ARRAY | VT_VARIANT, S_OK, VT_ARRAY | VT_VARIANT, L"[A|B|]"},
+      {"texts", VT_ARRAY | VT_BSTR, S_OK, VT_ARRAY | VT_VARIANT, L"[A|B|]"},
+      {"numbers", VT_ARRAY | VT_I4, run_time_error(13), VT_ARRAY | VT_I4, nullptr},
+      {"a text", VT_BSTR, run_time_error(13), VT_BSTR, nullptr},
+  };
+  const auto split = [u](const Value& list) { return use(u, L"ReadCommaDelimStrToList", Value(L"A,B,rest"), list); };
+  for (const ListRow& row : rows) {
+    Value variable = row.type == VT_BSTR ? Value(L"x") : Value();
+    if ((row.type & VT_ARRAY) != 0) {
+      V_ARRAY(&variable.get()) = SafeArrayCreateVector(row.type & VT_TYPEMASK, 0, 0);
+      V_VT(&variable.get()) = row.type;
+    }
+    check_equal(row.error, split(in(variable)).error(), row.name);
+    check_equal(row.type_after, variable.type(), std::string("a variable with ") + row.name);
+    if (row.after != nullptr) check_equal(row.after, contents(V_ARRAY(&variable.get())), row.name);
+  }
+  Array texts;
+  check_equal(S_OK, split(Value::reference(VT_ARRAY | VT_BSTR, texts)).error(), "texts by reference");
+  check_equal(L"[A|B|]", contents(texts.get()), "texts by reference");
+  VARTYPE element = VT_EMPTY;
+  SafeArrayGetVartype(texts.get(), &element);
+  check_equal(VT_BSTR, element, "texts by reference stay texts");
+  Array fixed(VT_BSTR, 0, {L"x"});
+  fixed.get()->fFeatures |= FADF_FIXEDSIZE;
+  check_equal(run_time_error(10), split(Value::reference(VT_ARRAY | VT_BSTR, fixed)).error(), "an array of fixed size");
+  fixed.get()->fFeatures &= static_cast<USHORT>(~FADF_FIXEDSIZE);
+}
+
+void optional_and_named_arguments(IDispatch* u) {
+  const auto count = [](Outcome outcome) { return outcome.error() == S_OK ? V_I4(&outcome.result.get()) : -1; };
+  Value list;
+  check_equal(2, count(use(u, L"ReadCommaDelimStrToList", Value(L"A,B,"), in(list))), "left out");
+  check_equal(1, count(use(u, L"ReadCommaDelimStrToList", Value(L"A,B;"), in(list), Value(L";"))), "given");
+  check_equal(2, count(use(u, L"ReadCommaDelimStrToList", Value(L"A,B,"), in(list), Value::missing())), "missing");
+
+  // By name: the value of sDelimiter, then of sTemp; the list stands in its place in front.
+  std::array<const wchar_t*, 4> names{L"readcommadelimstrtolist", L"SDELIMITER", L"sTemp", L"sFList"};
+  std::array<DISPID, 4> ids{};
+  require(u->GetIDsOfNames(IID_NULL, const_cast<wchar_t**>(names.data()), 4, LOCALE_USER_DEFAULT, ids.data()),
+          "GetIDsOfNames");
+  const Value delimiter(L";");
+  const Value text(L"A;B;C;");
+  const Value place = in(list);
+  std::array<VARIANT, 3> arguments{delimiter.get(), text.get(), place.get()};
+  check_equal(3, count(invoke(u, ids[0], DISPATCH_METHOD, arguments, std::span(ids).subspan(1))), "all by name");
+  std::array<DISPID, 2> twice{ids[1], ids[1]};
+  check_equal(DISP_E_PARAMNOTFOUND, invoke(u, ids[0], DISPATCH_METHOD, arguments, twice).error(), "a name twice");
+  std::array<DISPID, 1> unknown{99};
+  check_equal(DISP_E_PARAMNOTFOUND, invoke(u, ids[0], DISPATCH_METHOD, arguments, unknown).error(), "no such name");
+  std::array<DISPID, 1> known{ids[1]};
+  check_equal(DISP_E_PARAMNOTOPTIONAL, invoke(u, ids[0], DISPATCH_METHOD, std::span(arguments).first(1), known).error(),
+              "only sDelimiter");
+  std::array<const wchar_t*, 2> wrong{L"GetData", L"sNothing"};
+  check_equal(DISP_E_UNKNOWNNAME,
+              u->GetIDsOfNames(IID_NULL, const_cast<wchar_t**>(wrong.data()), 2, LOCALE_USER_DEFAULT, ids.data()),
+              "an unknown name of an argument");
+  check_equal(DISPID_UNKNOWN, ids[1], "its identifier");
+}
+
+void misuse(IDispatch* u) {
+  auto* unknown = const_cast<wchar_t*>(L"NoSuchMember");
+  DISPID id = 0;
+  const DISPID get_data = identifier(u, L"GetData");
+  check_equal(DISP_E_UNKNOWNNAME, u->GetIDsOfNames(IID_NULL, &unknown, 1, 0, &id), "an unknown member");
+  check_equal(DISPID_UNKNOWN, id, "its identifier");
+  check_equal(DISP_E_UNKNOWNINTERFACE, u->GetIDsOfNames(IID_IUnknown, &unknown, 1, 0, &id), "an interface of names");
+  check_equal(E_POINTER, u->GetIDsOfNames(IID_NULL, nullptr, 1, 0, &id), "no names");
+  check_equal(E_POINTER, u->GetIDsOfNames(IID_NULL, &unknown, 1, 0, nullptr), "no place for identifiers");
+  check_equal(DISP_E_MEMBERNOTFOUND, invoke(u, 0, DISPATCH_PROPERTYGET, {}).error(), "the default member");
+  for (const DISPID odd : std::initializer_list<DISPID>{DISPID_UNKNOWN, 0x6002FFFF, 0x60040000, INT_MIN}) {
+    check_equal(DISP_E_MEMBERNOTFOUND, invoke(u, odd, DISPATCH_METHOD, {}).error(), "an unknown identifier");
+  }
+  check_equal(E_POINTER, u->Invoke(get_data, IID_NULL, 0, DISPATCH_METHOD, nullptr, nullptr, nullptr, nullptr),
+              "no arguments at all");
+  DISPPARAMS promised{nullptr, nullptr, 3, 0};
+  check_equal(E_POINTER, u->Invoke(get_data, IID_NULL, 0, DISPATCH_METHOD, &promised, nullptr, nullptr, nullptr),
+              "arguments promised but not given");
+  check_equal(DISP_E_PARAMNOTOPTIONAL, use(u, L"StripNulls").error(), "too few arguments");
+  check_equal(DISP_E_BADPARAMCOUNT, use(u, L"StripNulls", Value(), Value()).error(), "too many arguments");
+  check_equal(DISP_E_PARAMNOTOPTIONAL, use(u, L"StripNulls", Value::missing()).error(), "a missing argument");
+  // Nobody need take the result or the error.
+  const Value number(1L);
+  const Value text(L"A,");
+  std::array<VARIANT, 3> arguments{number.get(), number.get(), text.get()};
+  DISPPARAMS parameters{arguments.data(), nullptr, 3, 0};
+  check_equal(DISP_E_EXCEPTION,
+              u->Invoke(get_data, IID_NULL, 0, DISPATCH_METHOD, &parameters, nullptr, nullptr, nullptr),
+              "an error that nobody takes");
+  V_I4(&arguments[1]) = 0;
+  check_equal(S_OK, u->Invoke(get_data, IID_NULL, 0, DISPATCH_METHOD, &parameters, nullptr, nullptr, nullptr),
+              "a result that nobody takes");
+}
+
+/// Places for what an argument refers to; cleared after the call, whatever the member made of them.
+struct Places {
+  Value cell;
+  VARIANT outer{};
+  Value argument;
+};
+
+struct Hostile {
+  std::string name;
+  std::function<void(Places&)> make;
+};
+
+HostObject with_value(HostObject::Kind::with_value);
+HostObject without_value(HostObject::Kind::without_value);
+HostObject failing(HostObject::Kind::failing);
+
+/// The argument as given, by reference, in a variable, and in a variable by reference.
+void add_all_ways(std::vector<Hostile>& list, const std::string& name, const std::function<Value()>& make) {
+  const auto refer = [](Places& places) {
+    const VARTYPE type = places.cell.type();
+    // A decimal takes the whole of its VARIANT.
+    void* const data = type == VT_DECIMAL ? static_cast<void*>(&places.cell.get()) : &V_I8(&places.cell.get());
+    return Value::reference(type, data);
+  };
+  list.push_back({name, [make](Places& places) { places.argument = make(); }});
+  list.push_back({name + " by reference", [make, refer](Places& places) {
+                    places.cell = make();
+                    places.argument = refer(places);
+                  }});
+  list.push_back({name + " in a variable", [make](Places& places) {
+                    places.cell = make();
+                    places.argument = Value(&places.cell.get());
+                  }});
+  list.push_back({name + " in a variable by reference", [make, refer](Places& places) {
+                    places.cell = make();
+                    places.outer = refer(places).get();
+                    places.argument = Value(&places.outer);
+                  }});
+}
+
+Value array_value(VARTYPE type, LONG lower, std::initializer_list<const wchar_t*> items) {
+  Value result;
+  V_ARRAY(&result.get()) = std::exchange(Array(type, lower, items).get(), nullptr);
+  V_VT(&result.get()) = VT_ARRAY | type;
+  return result;
+}
+
+Value with_bits(VARTYPE type, LONGLONG bits) {
+  Value result = Value::of_type(type);
+  V_I8(&result.get()) = bits;
+  return result;
+}
+
+std::vector<Hostile> hostile_values() {
+  std::vector<Hostile> list;
+  // Every kind of variant there is and some there are not, all of them zero; texts, objects and arrays are null.
+  for (const int type : std::initializer_list<int>{0,
+                                                   1,
+                                                   2,
+                                                   3,
+                                                   4,
+                                                   5,
+                                                   6,
+                                                   7,
+                                                   8,
+                                                   9,
+                                                   10,
+                                                   11,
+                                                   13,
+                                                   14,
+                                                   15,
+                                                   16,
+                                                   17,
+                                                   18,
+                                                   19,
+                                                   20,
+                                                   21,
+                                                   22,
+                                                   23,
+                                                   24,
+                                                   25,
+                                                   26,
+                                                   27,
+                                                   28,
+                                                   29,
+                                                   30,
+                                                   31,
+                                                   36,
+                                                   64,
+                                                   72,
+                                                   VT_ARRAY | VT_BSTR,
+                                                   VT_ARRAY | VT_VARIANT,
+                                                   VT_ARRAY,
+                                                   VT_ARRAY | VT_I4,
+                                                   VT_VECTOR | VT_BSTR,
+                                                   VT_RESERVED | VT_I4}) {
+    add_all_ways(list, "zero of type " + std::to_string(type),
+                 [type] { return Value::of_type(static_cast<VARTYPE>(type)); });
+    list.push_back({"null reference of type " + std::to_string(type), [type](Places& places) {
+                      places.argument = Value::reference(static_cast<VARTYPE>(type), nullptr);
+                    }});
+  }
+  const double infinity = std::numeric_limits<double>::infinity();
+  add_all_ways(list, "number as text", [] { return Value(L"12"); });
+  add_all_ways(list, "text", [] { return Value(std::wstring_view(L"a\0\xD800,", 4)); });
+  add_all_ways(list, "missing", [] { return Value::missing(); });
+  add_all_ways(list, "other error", [] { return with_bits(VT_ERROR, E_FAIL); });
+  add_all_ways(list, "infinity", [infinity] { return Value(infinity); });
+  add_all_ways(list, "not a number", [] { return Value(std::numeric_limits<double>::quiet_NaN()); });
+  add_all_ways(list, "date beyond the calendar", [] { return with_bits(VT_DATE, 0x7FEFFFFFFFFFFFFFLL); });
+  add_all_ways(list, "largest currency", [] { return with_bits(VT_CY, std::numeric_limits<LONGLONG>::max()); });
+  add_all_ways(list, "largest whole number", [] { return with_bits(VT_UI8, -1); });
+  add_all_ways(list, "largest decimal", [] {
+    Value result;
+    result.get().decVal = DECIMAL{};
+    result.get().decVal.Hi32 = result.get().decVal.Lo32 = result.get().decVal.Mid32 = 0xFFFFFFFF;
+    V_VT(&result.get()) = VT_DECIMAL;
+    return result;
+  });
+  add_all_ways(list, "object with a value", [] { return Value(&with_value); });
+  add_all_ways(list, "object without a value", [] { return Value(&without_value); });
+  add_all_ways(list, "object that fails", [] { return Value(&failing); });
+  add_all_ways(list, "texts", [] { return array_value(VT_BSTR, 0, {L"a", L"b"}); });
+  add_all_ways(list, "variants from 1", [] { return array_value(VT_VARIANT, 1, {L"a"}); });
+  add_all_ways(list, "numbers", [] { return array_value(VT_I4, -1, {}); });
+  add_all_ways(list, "two dimensions", [] {
+    Value result;
+    V_ARRAY(&result.get()) = std::exchange(Array::square(VT_VARIANT).get(), nullptr);
+    V_VT(&result.get()) = VT_ARRAY | VT_VARIANT;
+    return result;
+  });
+  list.push_back({"a circle", [](Places& places) {
+                    V_VT(&places.outer) = VT_BYREF | VT_VARIANT;
+                    V_VARIANTREF(&places.outer) = &places.outer;
+                    places.argument = Value(&places.outer);
+                  }});
+  return list;
+}
+
+/// An argument that suits a parameter, for the places beside the hostile one.
+Value suitable(const SlotParameter& parameter) {
+  switch (parameter.type == VT_PTR ? parameter.referenced : parameter.type) {
+    case VT_BSTR:
+      return Value(L"a,b,");
+    case VT_I2:
+    case VT_BOOL:
+      return Value(short{2});
+    case VT_SAFEARRAY:
+      return array_value(VT_BSTR, 0, {L"a"});
+    default:
+      return Value(1L);
+  }
+}
+
+class Walk {
+ public:
+  explicit Walk(IDispatch* object) : object_(object), slots_(slots_of(object)), values_(hostile_values()) {
+    for (Slot& slot : slots_) {
+      std::erase_if(slot.parameters, [](const SlotParameter& p) { return (p.flags & PARAMFLAG_FRETVAL) != 0; });
+    }
+  }
+
+  /// Sends each value to each place of each member; one check a member. A member that is still to come looks at
+  /// none of them, so a sample will do.
+  void send_everything() {
+    constexpr std::size_t sample = 20;
+    for (const Slot& slot : slots_) {
+      std::string fault;
+      for (std::size_t place = 0; place < slot.parameters.size(); ++place) {
+        const std::size_t step = is_to_come(slot) ? sample : 1;
+        for (std::size_t i = 0; i < values_.size(); i += step) {
+          std::string found = send(slot, place, values_[i]);
+          if (fault.empty()) fault = std::move(found);
+        }
+      }
+      if (is_checking_) check(fault.empty(), fault);
+    }
+  }
+
+  /// Members in their number beside zero to twelve arguments.
+  void send_wrong_counts() {
+    for (const Slot& slot : slots_) {
+      std::vector<Value> owned;
+      std::vector<VARIANT> arguments;
+      for (int count = 0; count <= 12; ++count) {
+        put(object_, L"DebugMode", Value(short{0}));
+        const Outcome outcome = invoke(object_, slot.identifier, static_cast<WORD>(slot.kind), arguments);
+        check(outcome.is_documented(),
+              narrow(slot.name) + " with " + std::to_string(count) + " arguments answered " + shown(outcome.error()));
+        owned.push_back(Value(L"1"));
+        arguments.push_back(owned.back().get());
+      }
+    }
+  }
+
+  void stop_checking() { is_checking_ = false; }
+  [[nodiscard]] int calls() const noexcept { return calls_; }
+
+ private:
+  bool is_to_come(const Slot& slot) const {
+    std::vector<Value> owned;
+    std::vector<VARIANT> arguments;
+    for (const SlotParameter& parameter : slot.parameters) owned.push_back(suitable(parameter));
+    for (const Value& argument : owned) arguments.push_back(argument.get());
+    std::ranges::reverse(arguments);
+    return slot.kind == INVOKE_FUNC &&
+           invoke(object_, slot.identifier, DISPATCH_METHOD, arguments).error() == run_time_error(445);
+  }
+
+  std::string send(const Slot& slot, std::size_t place, const Hostile& value) {
+    Places places;
+    value.make(places);
+    std::vector<Value> others;
+    std::vector<VARIANT> arguments;
+    for (std::size_t i = slot.parameters.size(); i > 0; --i) {
+      if (i - 1 != place) others.push_back(suitable(slot.parameters[i - 1]));
+      arguments.push_back(i - 1 == place ? places.argument.get() : others.back().get());
+    }
+    const std::vector<VARIANT> before = arguments;
+    std::array<DISPID, 1> named{DISPID_PROPERTYPUT};
+    const bool is_put = slot.kind == INVOKE_PROPERTYPUT;
+    const Outcome outcome = invoke(object_, slot.identifier, static_cast<WORD>(slot.kind), arguments,
+                                   is_put ? std::span<DISPID>(named) : std::span<DISPID>());
+    ++calls_;
+    const std::string what = narrow(slot.name) + ", argument " + std::to_string(place) + ": " + value.name;
+    if (!outcome.is_documented()) return what + ": answered " + shown(outcome.error()) + " " + narrow(outcome.source);
+    // The list is the caller's: nothing in it may change, only what its references lead to.
+    const std::size_t size = arguments.size() * sizeof(VARIANT);
+    if (std::memcmp(before.data(), arguments.data(), size) != 0) return what + ": the caller's list was changed";
+    return {};
+  }
+
+  IDispatch* object_;
+  std::vector<Slot> slots_;
+  std::vector<Hostile> values_;
+  int calls_ = 0;
+  bool is_checking_ = true;
+};
+
+/// Without the platform's cache of texts, what is left on the heaps is what leaked.
+void free_texts_at_once() {
+  const auto no_cache = GetProcAddress(GetModuleHandleW(L"oleaut32.dll"), "SetOaNoCache");
+  if (check(no_cache != nullptr, "SetOaNoCache")) no_cache();
+}
+
+void release_settings(IDispatch* u) {
+  for (const wchar_t* name : {L"FolderBrowseForm", L"SplashForm", L"DrawTextPictureBox"}) {
+    put(u, name, Value(static_cast<IDispatch*>(nullptr)));
+  }
+  for (const HostObject* object : {&with_value, &without_value, &failing}) {
+    check_equal(1U, object->references, "references to a host's object after all calls");
+  }
+}
+
+/// The bytes in use on all heaps of the process.
+std::size_t bytes_in_use() {
+  std::array<HANDLE, 32> heaps{};
+  const DWORD count = GetProcessHeaps(static_cast<DWORD>(heaps.size()), heaps.data());
+  std::size_t bytes = 0;
+  for (DWORD i = 0; i < count; ++i) {
+    PROCESS_HEAP_ENTRY entry{};
+    while (HeapWalk(heaps[i], &entry) != FALSE) {
+      if ((entry.wFlags & PROCESS_HEAP_ENTRY_BUSY) != 0) bytes += entry.cbData;
+    }
+  }
+  return bytes;
+}
+
+void memory_stays_flat(Walk& walk, IDispatch* u) {
+  constexpr int rounds = 100'000;
+  // Far less than one lost byte a call, far more than what settings of other lengths make of it.
+  constexpr std::size_t tolerance = 4096;
+  release_settings(u);
+  const std::size_t before = bytes_in_use();
+  walk.stop_checking();
+  const int first = walk.calls();
+  while (walk.calls() < first + rounds) walk.send_everything();
+  release_settings(u);
+  const std::size_t after = bytes_in_use();
+  check(before > 0 && after < before + tolerance, std::to_string(walk.calls() - first) + " calls took the heaps from " +
+                                                      std::to_string(before) + " to " + std::to_string(after) +
+                                                      " bytes");
+}
+
+void huge_text(IDispatch* u) {
+  const std::wstring text(std::size_t{32} << 20, L'x');
+  const Outcome outcome = use(u, L"StripNulls", Value(text));
+  check_equal(S_OK, outcome.error(), "a text of 64 MB");
+  check_equal(text.size(), outcome.result.text().size(), "its length");
+  check_equal(run_time_error(6), use(u, L"ReverseString", Value(text)).error(), "a text of 64 MB, reversed");
+}
+
+}  // namespace
+
+int wmain(int, wchar_t**) {
+  return run_checks([] {
+    free_texts_at_once();
+    const Pointer<_ORVUtils> object = create_object();
+    IDispatch* const u = object.get();
+    properties(u);
+    write_back_of_text(u);
+    write_back_of_arrays(u);
+    optional_and_named_arguments(u);
+    misuse(u);
+    huge_text(u);
+    Walk walk(u);
+    walk.send_wrong_counts();
+    walk.send_everything();
+    memory_stays_flat(walk, u);
+    put(u, L"DebugMode", Value(short{0}));
+    check_equal(S_OK, use(u, L"Terminate").error(), "Terminate");
+  });
+}

@@ -1,0 +1,79 @@
+#!/usr/bin/env bash
+# Runs the programs and scripts of this folder against TALUtil.dll: run.sh [NAME OF THE FOLDER BELOW build].
+# Each check that fails is a line; the last line is "N passed, N failed". Needs the windows preset to be built.
+set -euo pipefail
+. "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
+. "$talutil_top/tests/hosts/screen.sh"
+
+folder=${1:-windows}
+dll="Z:\\build\\$folder\\TALUtil.dll"
+pictures=$talutil_build/screenshots
+passed=0
+failed=0
+
+need_packages xvfb imagemagick
+mkdir -p "$pictures"
+rm -f "$pictures"/*.wanted
+
+start_screen
+
+# Runs one command; its own last line is its counts. Without them it has died, which is one failure more.
+run() {
+  local name=$1 log=$talutil_build/hosts-$1.log counts status=0
+  shift
+  WINE_TIMEOUT=120 "$@" >"$log" 2>&1 || status=$?
+  tr -d '\r' <"$log" | grep '^FAILED' || true
+  counts=$(tr -d '\r' <"$log" | tail -1 | grep -oE '^[0-9]+ passed, [0-9]+ failed$') || counts=
+  if [ -z "$counts" ]; then
+    tail -5 "$log"
+    printf 'FAILED %s: expected to end with its counts, ended with status %s; see %s\n' "$name" "$status" "$log"
+    counts="0 passed, 1 failed"
+  fi
+  passed=$((passed + ${counts%% passed*}))
+  counts=${counts#*, }
+  failed=$((failed + ${counts%% failed*}))
+}
+
+# A command that needs nothing but to end well.
+expect_success() {
+  local what=$1 status=0
+  shift
+  WINE_TIMEOUT=60 "$@" >/dev/null 2>&1 || status=$?
+  if [ "$status" = 0 ]; then
+    passed=$((passed + 1))
+  else
+    printf 'FAILED %s: expected status 0, got %s\n' "$what" "$status"
+    failed=$((failed + 1))
+  fi
+}
+
+# Takes a picture of the screen for each file NAME.wanted that a program makes, and removes the file after it.
+take_pictures() {
+  local wanted
+  while sleep 0.2; do
+    for wanted in "$pictures"/*.wanted; do
+      [ -e "$wanted" ] || continue
+      import -window root "${wanted%.wanted}.png" && rm -f "$wanted"
+    done
+  done
+}
+
+client() { run "$1" wine "Z:\\build\\$folder\\tests\\hosts\\${1}_client.exe" "Z:\\build\\$folder"; }
+
+start_wine
+client registration
+expect_success "regsvr32, for the machine and for the user" wine regsvr32.exe /s /i:user "$dll"
+client type_library
+client early
+client late
+client control
+rm -f "$pictures/message_box.png"
+take_pictures &
+pictures_pid=$!
+client window
+kill $pictures_pid
+run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'
+expect_success "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"
+
+printf '%d passed, %d failed\n' "$passed" "$failed"
+[ "$failed" = 0 ]

@@ -1,0 +1,135 @@
+// A client that looks at the library's windows: the components window, and the box that Terminate shows.
+#include <atomic>
+#include <thread>
+
+#include "client.hpp"
+
+using namespace talutil::hosts;
+
+namespace {
+
+struct WindowText {
+  std::wstring class_name;
+  std::wstring text;
+};
+
+WindowText describe(HWND window) {
+  std::array<wchar_t, 256> text{};
+  std::array<wchar_t, 64> name{};
+  GetWindowTextW(window, text.data(), static_cast<int>(text.size()));
+  GetClassNameW(window, name.data(), static_cast<int>(name.size()));
+  return {name.data(), text.data()};
+}
+
+BOOL CALLBACK collect(HWND window, LPARAM list) {
+  reinterpret_cast<std::vector<HWND>*>(list)->push_back(window);
+  return TRUE;
+}
+
+/// The windows of this process without a parent that have the given text as their caption.
+std::vector<HWND> top_windows(std::wstring_view caption) {
+  std::vector<HWND> windows;
+  EnumWindows(&collect, reinterpret_cast<LPARAM>(&windows));
+  std::erase_if(windows, [caption](HWND window) {
+    DWORD process = 0;
+    GetWindowThreadProcessId(window, &process);
+    return process != GetCurrentProcessId() || describe(window).text != caption;
+  });
+  return windows;
+}
+
+/// Asks the script that runs the tests for a picture of the screen, which it takes before it removes the file.
+void take_picture(const std::wstring& folder, const wchar_t* name) {
+  const std::wstring wanted = folder + L"\\" + name + L".wanted";
+  CloseHandle(CreateFileW(wanted.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS, 0, nullptr));
+  for (int i = 0; i < 100 && GetFileAttributesW(wanted.c_str()) != INVALID_FILE_ATTRIBUTES; ++i) Sleep(100);
+  check_equal(INVALID_FILE_ATTRIBUTES, GetFileAttributesW(wanted.c_str()), "a picture was taken");
+}
+
+/// What a user sees of a message box, before pressing its one button.
+struct SeenBox {
+  bool seen = false;
+  std::vector<WindowText> parts;
+};
+
+HWND wait_for_box(const std::atomic<bool>& is_over) {
+  for (int i = 0; i < 200 && !is_over; ++i) {
+    for (const HWND window : top_windows(L"window_client")) {
+      if (describe(window).class_name == L"#32770" && IsWindowVisible(window) != FALSE) return window;
+    }
+    Sleep(50);
+  }
+  return nullptr;
+}
+
+SeenBox look_at_box(HWND box) {
+  SeenBox result{true, {}};
+  std::vector<HWND> children;
+  EnumChildWindows(box, &collect, reinterpret_cast<LPARAM>(&children));
+  for (const HWND child : children) {
+    const auto style = static_cast<DWORD>(GetWindowLongW(child, GWL_STYLE));
+    if ((style & WS_VISIBLE) != 0) result.parts.push_back(describe(child));
+  }
+  return result;
+}
+
+/// Ends the library's use while another thread watches for a box and closes it.
+SeenBox terminate_and_watch(_ORVUtils* u, short debug_mode, const std::wstring& pictures) {
+  SeenBox seen;
+  std::atomic<bool> is_over = false;
+  u->put_DebugMode(debug_mode);
+  std::thread watcher([&] {
+    const HWND box = wait_for_box(is_over);
+    if (box == nullptr) return;
+    seen = look_at_box(box);
+    Sleep(300);  // Until it is painted.
+    take_picture(pictures, L"message_box");
+    PostMessageW(box, WM_COMMAND, IDOK, 0);
+  });
+  check_equal(S_OK, u->Terminate(), "Terminate");
+  is_over = true;
+  watcher.join();
+  return seen;
+}
+
+void components_window_is_hidden(_ORVUtils* u) {
+  const std::vector<HWND> windows = top_windows(L"Form1");
+  if (!check_equal(std::size_t{1}, windows.size(), "windows with the caption Form1")) return;
+  check(IsWindowVisible(windows[0]) == FALSE, "it is not visible");
+  check_equal(GetCurrentThreadId(), GetWindowThreadProcessId(windows[0], nullptr), "the thread of the window");
+  const Pointer<_ORVUtils> second = create_object();
+  check_equal(std::size_t{1}, top_windows(L"Form1").size(), "windows with a second object");
+  u->put_DebugMode(0);
+  u->Terminate();
+  check(IsWindow(windows[0]) == FALSE, "it is gone after Terminate");
+  check_equal(std::size_t{0}, top_windows(L"Form1").size(), "windows after Terminate");
+}
+
+void box_has_text_and_button(const SeenBox& box) {
+  if (!check(box.seen, "a box with the program's name as its title")) return;
+  int texts = 0;
+  int buttons = 0;
+  for (const WindowText& part : box.parts) {
+    if (part.class_name == L"Button") {
+      ++buttons;
+      check(part.text.find(L"OK") != std::wstring::npos, "the button says OK and not " + narrow(part.text));
+    } else if (!part.text.empty()) {
+      ++texts;
+      check_equal(L"Closing ORVUtils Components form", part.text, "the text of the box");
+    }
+  }
+  check_equal(1, buttons, "buttons");
+  check_equal(1, texts, "texts");
+}
+
+}  // namespace
+
+int wmain(int, wchar_t** arguments) {
+  return run_checks([&] {
+    const Pointer<_ORVUtils> object = create_object();
+    components_window_is_hidden(object.get());
+    const std::wstring pictures = std::wstring(arguments[1]) + L"\\..\\screenshots";
+    box_has_text_and_button(terminate_and_watch(object.get(), 1, pictures));
+    check(!terminate_and_watch(object.get(), -1, pictures).seen, "no box with DebugMode -1");
+  });
+}
