@@ -39,14 +39,16 @@ Function CleanFile(files, csvPath, planPath, sqlPath)
 
   CleanFile = 0
   Set output = files.CreateTextFile(sqlPath, True)
-  For rowCount = 0 To 1000000
+  rowCount = 0
+  Do
     count = ReadRow(parts, part, rest, row)
-    If count = 0 Then Exit For
-    If count <> columnCount Then Fail "row " & rowCount + 1 & " has " & count & " fields, the header " & columnCount
+    If count = 0 Then Exit Do
+    rowCount = rowCount + 1
+    If count <> columnCount Then Fail "row " & rowCount & " has " & count & " fields, the header " & columnCount
     insert = opening & CleanRow(row, count, steps, changes, firsts) & ");" & vbCrLf
     CleanFile = CleanFile + Len(insert)
     output.Write insert
-  Next
+  Loop
   output.Close
 
   Say rowCount & " rows of " & columnCount & " columns; fields changed, with the first of each:"

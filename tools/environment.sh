@@ -1,4 +1,4 @@
-# What ./test, ./demo and ./bench share: the packages, the Wine root and how to run things in it.
+# What ./test, ./demo and ./benchmark share: the packages, the Wine root and how to run things in it.
 # Sourced by bash scripts that have set -euo pipefail; needs a Debian 12 machine and, only while
 # something is missing, root rights and the machine's own package mirror.
 

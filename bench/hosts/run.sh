@@ -8,7 +8,7 @@ set -euo pipefail
 folder=${1:-windows}
 start_wine
 start_screen
-wine regsvr32.exe /s "Z:\\build\\$folder\\TALUtil.dll"
-wine cscript.exe //nologo 'Z:\checkout\bench\hosts\call.vbs'
-wine "Z:\\build\\$folder\\bench\\hosts\\host_bench.exe" "Z:\\build\\$folder"
-wine regsvr32.exe /s /u "Z:\\build\\$folder\\TALUtil.dll"
+wine regsvr32.exe /s "Z:\\build\\$folder\\TALUtil.dll" 2>/dev/null
+wine cscript.exe //nologo 'Z:\checkout\bench\hosts\call.vbs' 2>/dev/null
+wine "Z:\\build\\$folder\\bench\\hosts\\host_bench.exe" "Z:\\build\\$folder" 2>/dev/null
+wine regsvr32.exe /s /u "Z:\\build\\$folder\\TALUtil.dll" 2>/dev/null

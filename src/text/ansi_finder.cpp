@@ -15,14 +15,16 @@ constexpr std::uint32_t questions_before_keeping = 1024;
 /// ASCII and the upper half of Latin-1, whose code is the unit itself.
 constexpr bool is_near(char16_t unit) noexcept { return (unit < 0x80) | (static_cast<char16_t>(unit - 0xA0) < 0x60); }
 
-/// True when a block holds near characters only, none of them `wanted`. Without a branch, for the compiler's
-/// vectors.
+/// 1 for a character that may match: the wanted one, and one that is not near. Without a branch, since the
+/// letters around vary too much to be guessed, and for the compiler's vectors.
+constexpr char16_t is_candidate(char16_t unit, char16_t wanted) noexcept {
+  return static_cast<char16_t>(int{unit == wanted} | int{!is_near(unit)});
+}
+
 bool is_plain_block(const char16_t* block, char16_t wanted) noexcept {
-  char16_t odd = 0;
-  for (std::size_t i = 0; i < block_length; ++i) {
-    odd = static_cast<char16_t>(odd | (block[i] == wanted) | !is_near(block[i]));
-  }
-  return odd == 0;
+  char16_t candidates = 0;
+  for (std::size_t i = 0; i < block_length; ++i) candidates |= is_candidate(block[i], wanted);
+  return candidates == 0;
 }
 
 }  // namespace
@@ -51,8 +53,7 @@ std::size_t AnsiFinder::find_other(TextView text, std::size_t from) {
 std::size_t AnsiFinder::find_in_block(TextView block) {
   std::size_t at = 0;
   for (; at < block.size(); ++at) {
-    // Branches that seldom go the other way: the letters around vary too much to guess them.
-    if ((block[at] == code_ || !is_near(block[at])) && matches(block[at])) break;
+    if (is_candidate(block[at], code_) != 0 && matches(block[at])) break;
   }
   return at;
 }

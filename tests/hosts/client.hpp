@@ -190,28 +190,31 @@ constexpr HRESULT run_time_error(int number) {
   return static_cast<HRESULT>(0x800A0000U + static_cast<unsigned>(number));
 }
 
+/// What the clients' own automation objects have in common: they know no names.
+class NamelessObject : public IDispatch {
+ public:
+  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) final {
+    *out = id == IID_IUnknown || id == IID_IDispatch ? this : nullptr;
+    if (*out == nullptr) return E_NOINTERFACE;
+    AddRef();
+    return S_OK;
+  }
+  HRESULT STDMETHODCALLTYPE GetTypeInfoCount(UINT* count) final { return *count = 0, S_OK; }
+  HRESULT STDMETHODCALLTYPE GetTypeInfo(UINT, LCID, ITypeInfo**) final { return DISP_E_BADINDEX; }
+  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) final { return DISP_E_UNKNOWNNAME; }
+};
+
 /// An automation object of the client's: its default member answers a value, or there is none, or it fails; every
 /// other member is unknown. Its references are counted for the client to see.
-class HostObject final : public IDispatch {
+class HostObject final : public NamelessObject {
  public:
   enum class Kind { with_value, without_value, failing };
   explicit HostObject(Kind kind) noexcept : kind_(kind) {}
 
   ULONG references = 1;
 
-  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override {
-    *out = id == IID_IUnknown || id == IID_IDispatch ? this : nullptr;
-    if (*out == nullptr) return E_NOINTERFACE;
-    AddRef();
-    return S_OK;
-  }
   ULONG STDMETHODCALLTYPE AddRef() override { return ++references; }
   ULONG STDMETHODCALLTYPE Release() override { return --references; }
-  HRESULT STDMETHODCALLTYPE GetTypeInfoCount(UINT* count) override { return *count = 0, S_OK; }
-  HRESULT STDMETHODCALLTYPE GetTypeInfo(UINT, LCID, ITypeInfo**) override { return DISP_E_BADINDEX; }
-  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) override {
-    return DISP_E_UNKNOWNNAME;
-  }
   HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO* exception,
                                    UINT*) override {
     if (id != DISPID_VALUE || kind_ == Kind::without_value) return DISP_E_MEMBERNOTFOUND;

@@ -14,29 +14,18 @@ constexpr const wchar_t* program_key = L"Software\\Classes\\TALUtilTest.SystemIn
 constexpr const wchar_t* value_name = L"SystemInfoControl.MSysInfo";
 
 /// The control: an object that knows one identifier and no names.
-class SystemInformation final : public IDispatch {
+class SystemInformation final : public NamelessObject {
  public:
   static inline const wchar_t* answer = L"";
   static inline int alive = 0;
   static inline std::vector<std::pair<DISPID, WORD>> uses;
 
   SystemInformation() { ++alive; }
-  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override {
-    *out = id == IID_IUnknown || id == IID_IDispatch ? this : nullptr;
-    if (*out == nullptr) return E_NOINTERFACE;
-    AddRef();
-    return S_OK;
-  }
   ULONG STDMETHODCALLTYPE AddRef() override { return ++references_; }
   ULONG STDMETHODCALLTYPE Release() override {
     const ULONG left = --references_;
     if (left == 0) delete this;
     return left;
-  }
-  HRESULT STDMETHODCALLTYPE GetTypeInfoCount(UINT* count) override { return *count = 0, S_OK; }
-  HRESULT STDMETHODCALLTYPE GetTypeInfo(UINT, LCID, ITypeInfo**) override { return DISP_E_BADINDEX; }
-  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) override {
-    return DISP_E_UNKNOWNNAME;
   }
   HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS* parameters, VARIANT* result,
                                    EXCEPINFO*, UINT*) override {

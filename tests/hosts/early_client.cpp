@@ -79,40 +79,25 @@ void object_properties_hold_references(U* u) {
 
 struct TextRow {
   const char* name;
-  const wchar_t* expected;
+  std::wstring_view expected;
   std::function<HRESULT(U*, BSTR*)> call;
 };
 
 void text_members(U* u) {
+  // One for each shape of call; what the members do with their texts is the unit tests' business.
   const TextRow rows[] = {
-      {"apostrophe, ampersand, cut to ten", L"O\u00B4Brien an",
+      {"two numbers and a variant", L"O\u00B4Brien an",
        [](U* o, BSTR* out) { return o->VerifyTextData(Short{10}, Short{0}, Value(L"  O'Brien & Sons  "), out); }},
-      {"commas and blanks", L"123",
-       [](U* o, BSTR* out) { return o->VerifyTextData(Short{0}, Short{3}, Value(L"1, 2 ,3"), out); }},
-      {"marked lines go", L"A\r\nB\r\n",
-       [](U* o, BSTR* out) { return o->VerifyTextData(Short{0}, Short{5}, Value(L"A\r\nx $*$ y\r\n B "), out); }},
-      {"short lines join", L"Unit 5 - Main Rd\r\n",
-       [](U* o, BSTR* out) { return o->VerifyTextData(Short{0}, Short{4}, Value(L"Unit 5\r\nMain Rd"), out); }},
-      {"Null to a number", L"0", [](U* o, BSTR* out) { return o->VerifyIntData(Short{1}, Value::null(), out); }},
-      {"leading number", L"3.5", [](U* o, BSTR* out) { return o->VerifyIntData(Short{0}, Value(L"3.50kg"), out); }},
-      {"memo", L"A\r B", [](U* o, BSTR* out) { return o->VerifyMemField(Text(L"A\r\nB"), out); }},
-      {"NUL ends", L"ab", [](U* o, BSTR* out) { return o->StripNulls(Text(std::wstring_view(L"ab\0cd", 5)), out); }},
-      {"letters stay", L"abC_", [](U* o, BSTR* out) { return o->RemoveNumberFromString(Text(L"a1 b@,C_"), out); }},
-      {"digits and full stops", L"1.2",
-       [](U* o, BSTR* out) { return o->RemoveStringsFromNumber(Short{3}, Text(L"$1.2,"), Text(), out); }},
-      {"one character by many", L"a--b--",
+      {"Null", L"0", [](U* o, BSTR* out) { return o->VerifyIntData(Short{1}, Value::null(), out); }},
+      {"a variant number", L"3.5", [](U* o, BSTR* out) { return o->VerifyIntData(Short{0}, Value(3.5), out); }},
+      {"a NUL within", L"ab",
+       [](U* o, BSTR* out) { return o->StripNulls(Text(std::wstring_view(L"ab\0cd", 5)), out); }},
+      {"a NUL in the result", std::wstring_view(L"b\0a", 3),
+       [](U* o, BSTR* out) { return o->ReverseString(Text(std::wstring_view(L"a\0b", 3)), out); }},
+      {"three texts", L"a--b--",
        [](U* o, BSTR* out) { return o->StringReplace(Text(L"a;b;"), Text(L";x"), Text(L"--"), out); }},
-      {"second field", L"B", [](U* o, BSTR* out) { return o->GetData(Text(L"A,B,C,"), Long{1}, Long{2}, out); }},
-      {"no closing comma", L"", [](U* o, BSTR* out) { return o->GetData(Text(L"A,B,C"), Long{2}, Long{3}, out); }},
-      {"line break to markers", L"AxxB",
-       [](U* o, BSTR* out) { return o->CRLFStringReplace(Text(L"A\r\nB"), Text(L"x"), out); }},
-      {"last marker stays", L"AB\r\nx",
-       [](U* o, BSTR* out) { return o->StringRestoreCRLF(Text(L"ABx"), Text(L"x"), out); }},
-      {"zeros before", L"007", [](U* o, BSTR* out) { return o->AddZeros(Text(L"7"), Short{3}, Short{-1}, out); }},
-      {"backwards", L"cba", [](U* o, BSTR* out) { return o->ReverseString(Text(L"abc"), out); }},
+      {"two 32-bit numbers", L"B", [](U* o, BSTR* out) { return o->GetData(Text(L"A,B,C,"), Long{1}, Long{2}, out); }},
       {"null text", L"", [](U* o, BSTR* out) { return o->ReverseString(Text(), out); }},
-      {"whole words", L"a-c-",
-       [](U* o, BSTR* out) { return o->StringReplaceWord(Text(L"aBBcBB"), Text(L"BB"), Text(L"-"), out); }},
   };
   for (const TextRow& row : rows) {
     // A result is only written: what stood there before is not the member's to free.

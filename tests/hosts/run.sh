@@ -50,7 +50,7 @@ expect_success() {
 # Takes a picture of the screen for each file NAME.wanted that a program makes, and removes the file after it.
 take_pictures() {
   local wanted
-  while sleep 0.2; do
+  while sleep 0.2 && kill -0 $$ 2>/dev/null; do
     for wanted in "$pictures"/*.wanted; do
       [ -e "$wanted" ] || continue
       import -window root "${wanted%.wanted}.png" && rm -f "$wanted"
@@ -71,7 +71,7 @@ rm -f "$pictures/message_box.png"
 take_pictures &
 pictures_pid=$!
 client window
-kill $pictures_pid
+kill $pictures_pid || true
 run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'
 expect_success "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"
 

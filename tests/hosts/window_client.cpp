@@ -73,12 +73,25 @@ SeenBox look_at_box(HWND box) {
   return result;
 }
 
+/// A desktop of this client's own. One that other programs have left may belong to a screen that is gone.
+class Desktop {
+ public:
+  Desktop() : desktop_(CreateDesktopW(L"TALUtilTest", nullptr, nullptr, 0, GENERIC_ALL, nullptr)) { enter(); }
+  Desktop(const Desktop&) = delete;
+  Desktop& operator=(const Desktop&) = delete;
+  void enter() const { check(SetThreadDesktop(desktop_) != FALSE, "a desktop for this thread"); }
+
+ private:
+  HDESK desktop_;
+};
+
 /// Ends the library's use while another thread watches for a box and closes it.
-SeenBox terminate_and_watch(_ORVUtils* u, short debug_mode, const std::wstring& pictures) {
+SeenBox terminate_and_watch(_ORVUtils* u, short debug_mode, const Desktop& desktop, const std::wstring& pictures) {
   SeenBox seen;
   std::atomic<bool> is_over = false;
   u->put_DebugMode(debug_mode);
   std::thread watcher([&] {
+    desktop.enter();
     const HWND box = wait_for_box(is_over);
     if (box == nullptr) return;
     seen = look_at_box(box);
@@ -125,11 +138,12 @@ void box_has_text_and_button(const SeenBox& box) {
 }  // namespace
 
 int wmain(int, wchar_t** arguments) {
+  const Desktop desktop;
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
     components_window_is_hidden(object.get());
     const std::wstring pictures = std::wstring(arguments[1]) + L"\\..\\screenshots";
-    box_has_text_and_button(terminate_and_watch(object.get(), 1, pictures));
-    check(!terminate_and_watch(object.get(), -1, pictures).seen, "no box with DebugMode -1");
+    box_has_text_and_button(terminate_and_watch(object.get(), 1, desktop, pictures));
+    check(!terminate_and_watch(object.get(), -1, desktop, pictures).seen, "no box with DebugMode -1");
   });
 }
