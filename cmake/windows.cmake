@@ -31,12 +31,15 @@ add_custom_command(
 add_custom_command(
   OUTPUT ${generated}/TALUtil.tlb ${generated}/TALUtil.h ${CMAKE_BINARY_DIR}/TALUtil.manifest
   COMMAND ${generated}/write_idl idl > ${generated}/TALUtil.idl
+  COMMAND ${generated}/write_idl header > ${generated}/TALUtil-header.idl
   COMMAND ${generated}/write_idl manifest > ${CMAKE_BINARY_DIR}/TALUtil.manifest
   COMMAND ${idl_compiler} -m32 --win32 -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
           -t -o ${generated}/TALUtil.tlb ${generated}/TALUtil.idl
   COMMAND ${generated}/mend_typelib ${generated}/TALUtil.tlb
   COMMAND ${idl_compiler} -m32 --win32 -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
-          -h -o ${generated}/TALUtil.h ${generated}/TALUtil.idl
+          -h -o ${generated}/TALUtil.h ${generated}/TALUtil-header.idl
+  # Clients have the platform's headers in place of the base types.
+  COMMAND sed -i /base.h/d ${generated}/TALUtil.h
   DEPENDS ${generated}/write_idl ${generated}/mend_typelib tools/base.idl
   COMMENT "Making the type library")
 

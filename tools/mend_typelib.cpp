@@ -2,6 +2,7 @@
 //
 // - a text parameter with a default was declared by value, because the compiler refuses a default on one
 //   passed by reference; here it becomes `[in, out, optional, defaultvalue(...)] BSTR*`, as it is published;
+// - the record GUID was given another name, because the compiler takes that one for the platform's own;
 // - the time of the build is taken out, so that the same sources give the same library to the byte.
 //
 // The file is in the MSFT format: a header, an offset for each type, and a directory of segments.
@@ -16,6 +17,7 @@
 #include <string_view>
 
 #include "forms/c_control_position.hpp"
+#include "library/interface_definition.hpp"
 #include "library/interface_table.hpp"
 
 namespace {
@@ -24,6 +26,7 @@ constexpr std::uint32_t format_signature = 0x5446534d;  // "MSFT"
 constexpr std::size_t type_count_offset = 0x20;
 constexpr std::size_t header_size = 0x54;
 constexpr std::size_t segment_entry_size = 16;
+constexpr std::size_t name_segment = 7;
 constexpr std::size_t type_description_segment = 9;
 constexpr std::size_t custom_data_segment = 11;
 
@@ -68,6 +71,15 @@ class TypeLibrary {
       ++mended;
     }
     return mended;
+  }
+
+  /// The stand-in has the hash of the name it stands for, so the name alone is written over.
+  void name_guid_record() {
+    const auto [offset, size] = segment(name_segment);
+    const std::string_view stand_in = talutil::guid_stand_in;
+    const std::size_t at = bytes_.find(stand_in, offset);
+    if (at >= offset + size) throw std::runtime_error("no record " + std::string(stand_in) + " among the names");
+    bytes_.replace(at, stand_in.size(), "GUID");
   }
 
   void remove_build_time() {
@@ -120,6 +132,7 @@ int main(int argc, char** argv) try {
   TypeLibrary library(std::string(std::istreambuf_iterator<char>(input), {}));
   const int mended = library.pass_default_texts_by_reference();
   if (mended != count_default_texts()) throw std::runtime_error("found " + std::to_string(mended) + " default texts");
+  library.name_guid_record();
   library.remove_build_time();
   std::ofstream(argv[1], std::ios::binary) << library.bytes();
   return 0;

@@ -1,6 +1,6 @@
-// Writes what the Windows build makes from the interface tables: "idl" the interface definition as the
-// compiler wants it, "manifest" the manifest for use without registration. Built for the machine that builds,
-// also when the library itself is built for Windows.
+// Writes what the Windows build makes from the interface tables: "idl" and "header" the interface
+// definition as the compiler wants it for the type library and for the header, "manifest" the manifest for use without
+// registration. Built for the machine that builds, also when the library itself is built for Windows.
 #include <cstdio>
 #include <string>
 #include <string_view>
@@ -35,11 +35,14 @@ std::string manifest() {
 
 int main(int argc, char** argv) {
   const std::string_view what = argc == 2 ? argv[1] : "";
-  if (what != "idl" && what != "manifest") {
-    std::fputs("usage: write_idl idl|manifest\n", stderr);
+  const std::string_view import = "import \"base.idl\";\n\n";
+  std::string text;
+  if (what == "idl") text = std::string(import) + interface_definition(Dialect::type_library);
+  if (what == "header") text = std::string(import) + interface_definition(Dialect::header);
+  if (what == "manifest") text = manifest();
+  if (text.empty()) {
+    std::fputs("usage: write_idl idl|header|manifest\n", stderr);
     return 2;
   }
-  const std::string text =
-      what == "idl" ? "import \"base.idl\";\n\n" + interface_definition(Dialect::compiler) : manifest();
   return std::fputs(text.c_str(), stdout) < 0 ? 1 : 0;
 }

@@ -13,6 +13,8 @@ template <class... Visitors>
 struct Overloaded : Visitors... {
   using Visitors::operator()...;
 };
+template <class... Visitors>
+Overloaded(Visitors...) -> Overloaded<Visitors...>;
 
 template <class T>
 [[noreturn]] void refuse(const T& /*value*/) {

@@ -142,8 +142,8 @@ void clean(const CleanOptions& options) {
   }
 
   Session session;
-  auto plan = within(options.plan,
-                     [&] { return read_plan(read_bytes(options.plan), Session::members().members, session.locale()); });
+  const std::string plan_text = read_bytes(options.plan);
+  auto plan = within(options.plan, [&] { return read_plan(plan_text, Session::members().members, session.locale()); });
   const std::string bytes = read_bytes(options.csv);
   CsvReader reader(bytes);
   Cleaner cleaner(session);

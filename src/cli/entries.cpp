@@ -26,7 +26,8 @@ std::size_t edit_distance(std::string_view a, std::string_view b) {
 }
 
 bool contains_without_case(std::string_view text, std::string_view part) {
-  return std::ranges::search(text, part, {}, fold_case, fold_case).begin() != text.end();
+  const auto same = [](char a, char b) { return fold_case(a) == fold_case(b); };
+  return std::search(text.begin(), text.end(), part.begin(), part.end(), same) != text.end();
 }
 
 /// The names that someone who typed this may have meant, the likeliest first.

@@ -52,8 +52,9 @@ std::string_view type_name(ValueType type) {
   return "void";
 }
 
-std::string default_value(const Parameter& parameter) {
+std::string default_value(const Parameter& parameter, Dialect dialect) {
   if (!parameter.is_optional) return {};
+  if (dialect == Dialect::header && parameter.type == ValueType::text) return ", optional";
   const std::string value =
       parameter.type == ValueType::text ? quoted(parameter.default_text) : std::to_string(parameter.default_number);
   return ", optional, defaultvalue(" + value + ")";
@@ -61,10 +62,10 @@ std::string default_value(const Parameter& parameter) {
 
 void write_parameter(std::string& out, const Parameter& parameter, Dialect dialect) {
   const bool default_refused =
-      dialect == Dialect::compiler && parameter.is_optional && parameter.type == ValueType::text;
+      dialect == Dialect::type_library && parameter.is_optional && parameter.type == ValueType::text;
   const bool by_value = parameter.passing == Passing::by_value || default_refused;
   out += by_value ? "[in" : "[in, out";
-  out += default_value(parameter);
+  out += default_value(parameter, dialect);
   out += "] ";
   out += type_name(parameter.type);
   out += by_value ? " " : "* ";
@@ -148,7 +149,7 @@ std::string interface_definition(Dialect dialect) {
                {"short wYear", "short wMonth", "short wDayOfWeek", "short wDay", "short wHour", "short wMinute",
                 "short wSecond", "short wMilliseconds"});
   write_record(out, "FILETIME", identity::file_time_record, {"long dwLowDateTime", "long dwHighDateTime"});
-  write_record(out, "GUID", identity::guid_record,
+  write_record(out, dialect == Dialect::type_library ? guid_stand_in : "GUID", identity::guid_record,
                {"long Data1", "short Data2", "short Data3", "unsigned char Data4[8]"});
   write_record(out, "TRect", identity::rectangle_record, {"long left", "long Top", "long Right", "long Bottom"});
   write_class(out,

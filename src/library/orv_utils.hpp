@@ -82,7 +82,8 @@ class ORVUtils {
   virtual std::int32_t IndexInList(const TextArray& sFList, const Text& sText);
 
   /// The position (from 1) of the iCount-th character of s2 that equals the one-character s1; 0 when there
-  /// are fewer. The count is tested after every character, matched or not, so an iCount of 0 gives 1.
+  /// are fewer. The count is tested after every character, matched or not, so an iCount of 0 gives 1,
+  /// unless the first character matches.
   virtual std::int32_t MyPos(const Text& s1, const Text& s2, const std::int32_t& iCount);
 
   /// How often the one-character sSubStr stands in sSrcStr; 0 for a sSubStr of any other length.

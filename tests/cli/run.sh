@@ -2,12 +2,12 @@
 # Runs the command and compares exit status and output: tests/cli/run.sh PATH_TO_TALUTIL
 # The last line is "N passed, N failed".
 set -uo pipefail
-[ $# = 1 ] && [ -x "$1" ] || { echo "usage: tests/cli/run.sh PATH_TO_TALUTIL" >&2; exit 2; }
+[ -x "${1:-}" ] || { echo "usage: tests/cli/run.sh PATH_TO_TALUTIL" >&2; exit 2; }
 talutil=$(realpath "$1")
 top=$(cd "$(dirname "${BASH_SOURCE[0]}")/../.." && pwd)
 work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
-cd "$work"
+cd "$work" || exit 2
 export LC_ALL=C.UTF-8
 
 passed=0
@@ -128,6 +128,8 @@ fi
 plan="ID VerifyIntData 0${nl}# a remark${nl}Name VerifyTextData 8 0${nl}Tags list VerifyTextData 0 0${nl}"
 plan+="Code StripNulls | AddZeros * 3 -1${nl}"
 printf %s "$plan" >plan
+# The CSV text is a format, for its NULs and code page 1252.
+# shellcheck disable=SC2059
 clean() { printf "$1" >in.csv; "$talutil" clean in.csv --plan plan --output out.sql --table 't "x"' 2>&1; }
 inserts() { clean "$1" >log && iconv -f CP1252 out.sql | tr -d '\r'; }
 opening='INSERT INTO "t ""x""" (ID, Name, Tags, Code) VALUES '

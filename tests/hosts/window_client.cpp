@@ -26,16 +26,21 @@ BOOL CALLBACK collect(HWND window, LPARAM list) {
   return TRUE;
 }
 
-/// The windows of this process without a parent that have the given text as their caption.
-std::vector<HWND> top_windows(std::wstring_view caption) {
+/// The windows of this process without a parent that the condition holds for.
+template <class Condition>
+std::vector<HWND> top_windows(Condition&& condition) {
   std::vector<HWND> windows;
   EnumWindows(&collect, reinterpret_cast<LPARAM>(&windows));
-  std::erase_if(windows, [caption](HWND window) {
+  std::erase_if(windows, [&](HWND window) {
     DWORD process = 0;
     GetWindowThreadProcessId(window, &process);
-    return process != GetCurrentProcessId() || describe(window).text != caption;
+    return process != GetCurrentProcessId() || !condition(window);
   });
   return windows;
+}
+
+std::vector<HWND> components_windows() {
+  return top_windows([](HWND window) { return describe(window).text == L"Form1"; });
 }
 
 /// Asks the script that runs the tests for a picture of the screen, which it takes before it removes the file.
@@ -49,21 +54,22 @@ void take_picture(const std::wstring& folder, const wchar_t* name) {
 /// What a user sees of a message box, before pressing its one button.
 struct SeenBox {
   bool seen = false;
+  std::wstring title;
   std::vector<WindowText> parts;
 };
 
 HWND wait_for_box(const std::atomic<bool>& is_over) {
   for (int i = 0; i < 200 && !is_over; ++i) {
-    for (const HWND window : top_windows(L"window_client")) {
-      if (describe(window).class_name == L"#32770" && IsWindowVisible(window) != FALSE) return window;
-    }
+    const std::vector<HWND> boxes = top_windows(
+        [](HWND window) { return describe(window).class_name == L"#32770" && IsWindowVisible(window) != FALSE; });
+    if (!boxes.empty()) return boxes[0];
     Sleep(50);
   }
   return nullptr;
 }
 
 SeenBox look_at_box(HWND box) {
-  SeenBox result{true, {}};
+  SeenBox result{true, describe(box).text, {}};
   std::vector<HWND> children;
   EnumChildWindows(box, &collect, reinterpret_cast<LPARAM>(&children));
   for (const HWND child : children) {
@@ -106,20 +112,21 @@ SeenBox terminate_and_watch(_ORVUtils* u, short debug_mode, const Desktop& deskt
 }
 
 void components_window_is_hidden(_ORVUtils* u) {
-  const std::vector<HWND> windows = top_windows(L"Form1");
+  const std::vector<HWND> windows = components_windows();
   if (!check_equal(std::size_t{1}, windows.size(), "windows with the caption Form1")) return;
   check(IsWindowVisible(windows[0]) == FALSE, "it is not visible");
   check_equal(GetCurrentThreadId(), GetWindowThreadProcessId(windows[0], nullptr), "the thread of the window");
   const Pointer<_ORVUtils> second = create_object();
-  check_equal(std::size_t{1}, top_windows(L"Form1").size(), "windows with a second object");
+  check_equal(std::size_t{1}, components_windows().size(), "windows with a second object");
   u->put_DebugMode(0);
   u->Terminate();
   check(IsWindow(windows[0]) == FALSE, "it is gone after Terminate");
-  check_equal(std::size_t{0}, top_windows(L"Form1").size(), "windows after Terminate");
+  check_equal(std::size_t{0}, components_windows().size(), "windows after Terminate");
 }
 
 void box_has_text_and_button(const SeenBox& box) {
-  if (!check(box.seen, "a box with the program's name as its title")) return;
+  if (!check(box.seen, "a box with DebugMode 1")) return;
+  check_equal(L"window_client", box.title, "its title, which is the program's name");
   int texts = 0;
   int buttons = 0;
   for (const WindowText& part : box.parts) {

@@ -1,1 +1,0 @@
-// The compiled header refers to the prologue of its interface definition; windows.h has declared all of it.
