@@ -32,7 +32,7 @@ class Key {
 
   void set(const wchar_t* name, const std::wstring& value) const {
     check(RegSetValueExW(handle_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(value.c_str()),
-                         static_cast<DWORD>((value.size() + 1) * sizeof(wchar_t))));
+                         static_cast<DWORD>(value.size() + 1) * sizeof(wchar_t)));
   }
 
   static void check(LSTATUS status) {

@@ -134,10 +134,10 @@ clean() { printf "$1" >in.csv; "$talutil" clean in.csv --plan plan --output out.
 inserts() { clean "$1" >log && iconv -f CP1252 out.sql | tr -d '\r'; }
 opening='INSERT INTO "t ""x""" (ID, Name, Tags, Code) VALUES '
 
-verdict 'quotes, line breaks, NUL, code page 1252' "$opening('1', 'M´ü', 'a´,b,', '007');" \
-  "$(inserts 'ID,Name,Tags,Code\r\n1,"M'"'"'""\xfc\0""","a'"'"',b",7\0x\r\n')"
-verdict 'line feeds alone, no last one, empty list' "$opening('0', '', '', 'abcd');$nl$opening('2', 'x', ',', '000');" \
-  "$(inserts 'ID,Name,Tags,Code\n,,,abcd\n2,x,",",')"
+verdict 'quotes, line breaks, NUL, code page 1252' "$opening('1', 'M´ü', 'a´,b,', '07\"');" \
+  "$(inserts 'ID,Name,Tags,Code\r\n1,"M'"'"'""\xfc\0""","a'"'"',b","7""\0x"\r\n')"
+verdict 'line feeds alone, the last one missing, empty list' "$opening('0', '', '', 'abcd');$nl$opening('2', 'x', ',', '000');" \
+  "$(inserts 'ID,Name,Tags,Code\n,,,abcd\n2,x,",",\r')"
 verdict 'apostrophes are doubled' "$opening('0', '', '', 'a''b');" "$(inserts "ID,Name,Tags,Code\n,,,a'b\n")"
 verdict 'the summary' 'Name      1  "#" -> ""' "$(clean 'ID,Name,Tags,Code\n0,#,,000\n' | sed -n 's/^  \(Name.*\)/\1/p')"
 verdict 'the counters' 'CounterVerifyText 3, CounterVerifyInt 1' \
