@@ -48,7 +48,7 @@ double to_double(const Decimal& decimal) {
   const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), value);
   const bool is_too_small = decimal.point <= 0;
   if (error == std::errc::result_out_of_range && is_too_small) return 0;
-  if (error != std::errc{} || std::isinf(value)) raise(ErrorNumber::overflow);
+  if (error != std::errc{}) raise(ErrorNumber::overflow);
   return decimal.is_negative ? -value : value;
 }
 

@@ -93,8 +93,7 @@ Date Win32Clock::now() {
 std::unique_ptr<HiddenWindow> Win32FormWindows::make_hidden(TextView caption) {
   // A class of the system's own: its window procedure stays where it is when the library is unloaded.
   const auto make = [caption = Text(caption)](HWND parent) {
-    return CreateWindowExW(0, L"Static", wide(caption), WS_OVERLAPPEDWINDOW, CW_USEDEFAULT, 0, CW_USEDEFAULT, 0, parent,
-                           nullptr, nullptr, nullptr);
+    return CreateWindowExW(0, L"Static", wide(caption), WS_POPUP, 0, 0, 0, 0, parent, nullptr, nullptr, nullptr);
   };
   HWND window = make(nullptr);
   // Where there is no desktop to put windows on, one that only takes messages does for everything but dialogs.
