@@ -8,7 +8,10 @@
 Option Explicit
 
 Dim utils, report
+On Error Resume Next
 Set utils = CreateObject("TALUtil.ORVUtils")
+If Err.Number <> 0 Then Fail "TALUtil.ORVUtils cannot be created (error " & Err.Number & "); register TALUtil.dll first"
+On Error GoTo 0
 Main WScript.Arguments
 utils.Terminate
 WScript.Echo "done"
