@@ -33,7 +33,7 @@ Date to_date_checked(double days) {
 DateParts parts_of(Date date) {
   const double days = to_date_checked(date.days).days;
   auto day = static_cast<std::int32_t>(days);
-  auto second = static_cast<std::int32_t>(std::abs(days - day) * seconds_in_day + 0.5);
+  auto second = static_cast<std::int32_t>(std::lround(std::abs(days - day) * seconds_in_day));
   if (second == seconds_in_day) {
     ++day;
     second = 0;
