@@ -1,7 +1,7 @@
 // The entry points of TALUtil.dll and the state of the loaded module.
 #include <array>
+#include <memory>
 #include <mutex>
-#include <optional>
 
 #include "com/boundary.hpp"
 #include "com/classes.hpp"

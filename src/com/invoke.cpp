@@ -235,29 +235,23 @@ HRESULT invoke(const LateInterface& table, void* target, const Locale& locale, c
   const std::int32_t slot = slot_for(table, invocation.member, invocation.flags);
   if (slot < 0) return DISP_E_MEMBERNOTFOUND;
   const Member& member = table.members[static_cast<std::size_t>(slot)];
-  if (member.is_pending) {
-    try {
-      raise(ErrorNumber::action_not_supported);
-    } catch (...) {
-      return report_current_exception(invocation.exception);
-    }
-  }
-  Placement placement;
-  HRESULT result = place_arguments(member, *given, invocation.bad_argument, placement);
-  if (SUCCEEDED(result)) result = check_required(member, invocation, placement);
-  if (FAILED(result)) return result;
   try {
+    if (member.is_pending) raise(ErrorNumber::action_not_supported);
+    Placement placement;
+    HRESULT result = place_arguments(member, *given, invocation.bad_argument, placement);
+    if (SUCCEEDED(result)) result = check_required(member, invocation, placement);
+    if (FAILED(result)) return result;
+
     Call call(member, invocation, placement, locale);
-    Variant answer;
+    OwnedVariant answer;
     try {
-      answer = table.call(target, slot, call.arguments(), locale);
+      answer = native_from(table.call(target, slot, call.arguments(), locale), ArrayStyle::of_variants);
     } catch (...) {
       call.write_back();
       throw;
     }
-    OwnedVariant native = native_from(answer, ArrayStyle::of_variants);
     call.write_back();
-    if (invocation.result != nullptr) *invocation.result = native.release();
+    if (invocation.result != nullptr) *invocation.result = answer.release();
     return S_OK;
   } catch (...) {
     return report_current_exception(invocation.exception);

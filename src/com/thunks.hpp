@@ -167,12 +167,11 @@ struct MethodThunk<C, M, R (Owner::*)(A...)> {
     if ((is_null<A>(given) || ...)) return E_POINTER;
     return guarded([&] {
       std::tuple<WireCell<A>...> cells{WireCell<A>(given)...};
-      const R answer = run(cells, [&] {
-        return std::apply([&](WireCell<A>&... cell) { return (self->object.*M)(cell.value()...); }, cells);
+      auto answer = run(cells, [&] {
+        return std::apply([&](WireCell<A>&... cell) { return Wire<R>::to((self->object.*M)(cell.value()...)); }, cells);
       });
-      auto native = Wire<R>::to(answer);
       write_back(cells);
-      Wire<R>::store(*result, std::move(native));
+      Wire<R>::store(*result, std::move(answer));
     });
   }
 };

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "automation/run_time_error.hpp"
+#include "tests/fakes/error_of.hpp"
 
 namespace talutil {
 namespace {
@@ -58,12 +59,7 @@ class LateCallTest : public ::testing::Test {
   }
 
   std::int32_t error(TextView name, Access access, std::vector<Argument> arguments = {}) {
-    try {
-      call(name, access, std::move(arguments));
-    } catch (const RunTimeError& error) {
-      return error.number();
-    }
-    return 0;
+    return talutil::testing::error_of([&] { call(name, access, std::move(arguments)); });
   }
 
   Sample sample_;

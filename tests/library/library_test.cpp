@@ -7,12 +7,14 @@
 #include "infoforms/frm_components.hpp"
 #include "library/interface_table.hpp"
 #include "library/library.hpp"
+#include "tests/fakes/error_of.hpp"
 #include "tests/fakes/fake_platform.hpp"
 
 namespace talutil {
 namespace {
 
-using FakePlatform = talutil::testing::FakePlatform;
+using talutil::testing::error_of;
+using talutil::testing::FakePlatform;
 
 /// Another maker's system information control: it knows its identifiers and nothing else.
 class ForeignSystemInformation final : public Object {
@@ -30,16 +32,6 @@ class LibraryTest : public ::testing::Test {
   Variant late(TextView name, Access access, std::vector<Argument> arguments = {}) {
     const LateInterface& members = late_interface<ORVUtils>();
     return members.call(&utils, members.slot_of(members.identifier_of(name), access), arguments, library.locale());
-  }
-
-  template <class Function>
-  static std::int32_t error_of(Function&& function) {
-    try {
-      function();
-    } catch (const RunTimeError& error) {
-      return error.number();
-    }
-    return 0;
   }
 
   FakePlatform platform;
