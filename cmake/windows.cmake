@@ -3,7 +3,7 @@ add_compile_definitions(UNICODE _UNICODE WINVER=0x0601 _WIN32_WINNT=0x0601)
 
 file(GLOB win32_sources CONFIGURE_DEPENDS src/platform/win32/*.cpp)
 add_library(talutil_platform STATIC ${win32_sources})
-target_link_libraries(talutil_platform PUBLIC talutil_core)
+target_link_libraries(talutil_platform PUBLIC talutil_core PRIVATE bcrypt)
 
 # The type library: the table is printed as IDL by a program of the building machine, compiled, and mended.
 # It refers to the platform's stdole2.tlb, which the compiler looks for in the folder below.

@@ -13,6 +13,7 @@ std::string_view standard_description(std::int32_t number) noexcept {
     case ErrorNumber::array_fixed_or_locked: return "This array is fixed or temporarily locked";  // 10
     case ErrorNumber::division_by_zero: return "Division by zero";  // 11
     case ErrorNumber::type_mismatch: return "Type mismatch";  // 13
+    case ErrorNumber::user_interrupt: return "User interrupt occurred";  // 18
     case ErrorNumber::internal_error: return "Internal error";  // 51
     case ErrorNumber::bad_file_name_or_number: return "Bad file name or number";  // 52
     case ErrorNumber::file_not_found: return "File not found";  // 53

@@ -17,6 +17,7 @@ enum class ErrorNumber : std::int32_t {
   array_fixed_or_locked = 10,
   division_by_zero = 11,
   type_mismatch = 13,
+  user_interrupt = 18,
   internal_error = 51,
   bad_file_name_or_number = 52,
   file_not_found = 53,

@@ -10,6 +10,7 @@
 #include "com/registered_controls.hpp"
 #include "com/registration.hpp"
 #include "infoforms/frm_components.hpp"
+#include "platform/win32/win32_cryptography.hpp"
 #include "platform/win32/win32_platform.hpp"
 
 namespace talutil::com {
@@ -24,7 +25,11 @@ struct LoadedLibrary {
   win32::Win32Clock clock;
   win32::Win32FormWindows form_windows;
   RegisteredControls control_makers;
-  Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers}};
+  win32::Win32MessagePump message_pump;
+  win32::Win32RandomSource random_source;
+  win32::Win32Cryptography cryptography;
+  Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers, message_pump,
+                           random_source, cryptography}};
 };
 
 struct Module {

@@ -7,6 +7,7 @@
 #include "automation/locale.hpp"
 #include "automation/object.hpp"
 #include "automation/text.hpp"
+#include "platform/cryptography.hpp"
 
 /// The seam between the core and the platform: one small interface a concern, so that a fake fits on a page.
 namespace talutil {
@@ -66,6 +67,18 @@ class FormWindows {
   [[nodiscard]] virtual std::unique_ptr<HiddenWindow> make_hidden(TextView caption) = 0;
 };
 
+/// The messages that wait for the host's windows.
+class MessagePump {
+ public:
+  virtual ~MessagePump() = default;
+
+  /// Handles every message that waits. False when the thread is asked to quit, which its own loop still hears of.
+  virtual bool handle_waiting() = 0;
+
+  /// Sleeps until there is a message, then handles all. False as above.
+  virtual bool wait_and_handle() = 0;
+};
+
 class ControlMakers {
  public:
   virtual ~ControlMakers() = default;
@@ -83,6 +96,9 @@ struct Platform {
   Clock& clock;
   FormWindows& form_windows;
   ControlMakers& control_makers;
+  MessagePump& message_pump;
+  RandomSource& random_source;
+  Cryptography& cryptography;
 };
 
 }  // namespace talutil

@@ -4,6 +4,7 @@
 #include <deque>
 #include <map>
 #include <memory>
+#include <random>
 #include <vector>
 
 #include "automation/run_time_error.hpp"
@@ -14,7 +15,14 @@ namespace talutil::testing {
 
 /// A platform without a machine: it records what the library asks for and answers as the test says. Fields
 /// can be set at any time; the clock moves only when told. It must outlive the library that uses it.
-struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, ControlMakers {
+struct FakePlatform final : MessageBoxes,
+                            Screen,
+                            Computer,
+                            Clock,
+                            FormWindows,
+                            ControlMakers,
+                            MessagePump,
+                            RandomSource {
   struct Message {
     Text text;
     MessageButtons buttons = MessageButtons::ok;
@@ -27,6 +35,8 @@ struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, 
   std::vector<Text> window_captions;
   std::vector<Text> controls_asked_for;
   std::int32_t open_windows = 0;
+  std::int32_t messages_handled = 0;  ///< How often waiting messages were let in.
+  std::int32_t waits = 0;
 
   // What is answered. A box without a scripted answer is one that the user closed.
   std::deque<MessageAnswer> answers;
@@ -38,11 +48,15 @@ struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, 
   std::intptr_t window_handle = 0x1234;
   std::map<Text, ObjectRef> controls;  ///< Another maker's controls by class name; a null one fails with 429.
 
+  std::int32_t quits_after_waits = 1;  ///< The wait that ends with the thread being asked to quit.
+  std::mt19937 random{7};
+  std::unique_ptr<Cryptography> cryptography = make_cryptography();  ///< The real one: it needs no machine.
+
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;
   FakePlatform& operator=(const FakePlatform&) = delete;
 
-  [[nodiscard]] Platform platform() { return {*this, *this, *this, *this, *this, *this}; }
+  [[nodiscard]] Platform platform() { return {*this, *this, *this, *this, *this, *this, *this, *this, *cryptography}; }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
     messages.push_back({Text(text), buttons, Text(title)});
@@ -61,6 +75,16 @@ struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, 
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override {
     window_captions.emplace_back(caption);
     return std::make_unique<Window>(*this);
+  }
+
+  bool handle_waiting() override {
+    ++messages_handled;
+    return true;
+  }
+  bool wait_and_handle() override { return ++waits < quits_after_waits; }
+
+  void fill(std::span<std::uint8_t> bytes) override {
+    for (std::uint8_t& byte : bytes) byte = static_cast<std::uint8_t>(random());
   }
 
   ObjectRef create(TextView class_name) override {

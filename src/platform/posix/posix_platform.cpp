@@ -104,4 +104,9 @@ Date PosixClock::now() {
 
 std::unique_ptr<HiddenWindow> PosixFormWindows::make_hidden(TextView /*caption*/) { return std::make_unique<Window>(); }
 
+bool PosixMessagePump::wait_and_handle() {
+  pause();
+  return false;
+}
+
 }  // namespace talutil::posix

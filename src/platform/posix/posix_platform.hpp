@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/platform.hpp"
+#include "platform/posix/posix_cryptography.hpp"
 
 namespace talutil::posix {
 
@@ -46,6 +47,13 @@ class PosixControlMakers final : public ControlMakers {
   ObjectRef create(TextView /*class_name*/) override { return nullptr; }
 };
 
+/// There are no messages; a signal that the program handles counts as being asked to quit.
+class PosixMessagePump final : public MessagePump {
+ public:
+  bool handle_waiting() override { return true; }
+  bool wait_and_handle() override;
+};
+
 /// One of each, for a library to use. Must outlive it.
 struct PosixPlatform {
   PosixMessageBoxes message_boxes;
@@ -54,8 +62,14 @@ struct PosixPlatform {
   PosixClock clock;
   PosixFormWindows form_windows;
   PosixControlMakers control_makers;
+  PosixMessagePump message_pump;
+  PosixRandomSource random_source;
+  PosixCryptography cryptography;
 
-  [[nodiscard]] Platform platform() { return {message_boxes, screen, computer, clock, form_windows, control_makers}; }
+  [[nodiscard]] Platform platform() {
+    return {message_boxes,  screen,       computer,      clock,       form_windows,
+            control_makers, message_pump, random_source, cryptography};
+  }
 };
 
 }  // namespace talutil::posix

@@ -102,4 +102,23 @@ std::unique_ptr<HiddenWindow> Win32FormWindows::make_hidden(TextView caption) {
   return std::make_unique<Window>(window);
 }
 
+bool Win32MessagePump::handle_waiting() {
+  MSG message;
+  while (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE) != 0) {
+    if (message.message == WM_QUIT) {
+      // It was for the loop of the host.
+      PostQuitMessage(static_cast<int>(message.wParam));
+      return false;
+    }
+    TranslateMessage(&message);
+    DispatchMessageW(&message);
+  }
+  return true;
+}
+
+bool Win32MessagePump::wait_and_handle() {
+  MsgWaitForMultipleObjectsEx(0, nullptr, INFINITE, QS_ALLINPUT, MWMO_INPUTAVAILABLE);
+  return handle_waiting();
+}
+
 }  // namespace talutil::win32

@@ -32,4 +32,10 @@ class Win32FormWindows final : public FormWindows {
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
 };
 
+class Win32MessagePump final : public MessagePump {
+ public:
+  bool handle_waiting() override;
+  bool wait_and_handle() override;
+};
+
 }  // namespace talutil::win32
