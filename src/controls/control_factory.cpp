@@ -3,6 +3,8 @@
 #include "automation/run_time_error.hpp"
 #include "controls/common_dialog.hpp"
 #include "controls/control.hpp"
+#include "controls/crypto.hpp"
+#include "controls/name_case_converter.hpp"
 #include "controls/system_information.hpp"
 
 namespace talutil {
@@ -19,10 +21,11 @@ ObjectRef make(const Platform& platform) {
 ControlFactory::ControlFactory(const Platform& platform)
     : platform_(platform),
       makers_{
-          {u"PolarCryptoLibCtl.Crypto", &make<ReservedControl>},
+          {u"PolarCryptoLibCtl.Crypto", &make<Crypto>},
           {u"MSComDlg.CommonDialog", &make<CommonDialog>},
           {u"VSFlex8Ctl.VSFlexGrid", &make<ReservedControl>},
           {u"SystemInfoControl.MSysInfo", &make<SystemInformation>},
+          {Text(NameCaseConverter::class_name), &make<NameCaseConverter>},
           {u"DUZACTXLibCtl.duzactxctrl", &make<ReservedControl>},
           {u"DZACTXLibCtl.dzactxctrl", &make<ReservedControl>},
       } {}

@@ -124,7 +124,7 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
       P::template pending<&U::GetYear>("GetYear", "The year of a date; 2000 for a missing one.", "vDate"),
       P::template pending<&U::GetMonth>("GetMonth", "The month of a date; 1 for a missing one.", "vDate"),
       P::template pending<&U::GetDay>("GetDay", "The day of a date; 1 for a missing one.", "vDate"),
-      P::template pending<&U::VerifyEmail>(
+      P::template method<&U::VerifyEmail>(
           "VerifyEmail", "Whether an e-mail address is empty or has an at sign and a full stop.", "sTemp"),
       P::template pending<&U::GetMousePos>("GetMousePos", "Whether a point lies strictly within a rectangle.",
                                            "lngSrcX", "lngSrcY", "lngDestX1", "lngDestY1", "lngDestX2", "lngDestY2"),
@@ -146,10 +146,9 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
       P::template method<&U::VerifyIntData>(
           "VerifyIntData", "The leading number of a value as text; Null gives an empty text, or 0 with iFlag 1.",
           "iFlag", "vData"),
-      P::template pending<&U::IsValueNumber>("IsValueNumber", "Whether a text has digits and full stops only.",
-                                             "sText"),
-      P::template pending<&U::IsValueDate>("IsValueDate", "Whether a text has the shape day/month/year.", "sText"),
-      P::template pending<&U::IsValueTime>("IsValueTime", "Whether a text has the shape hours:minutes.", "sText"),
+      P::template method<&U::IsValueNumber>("IsValueNumber", "Whether a text has digits and full stops only.", "sText"),
+      P::template method<&U::IsValueDate>("IsValueDate", "Whether a text has the shape day/month/year.", "sText"),
+      P::template method<&U::IsValueTime>("IsValueTime", "Whether a text has the shape hours:minutes.", "sText"),
       P::template method<&U::CRLFStringReplace>(
           "CRLFStringReplace", "Replaces each carriage return and each line feed by sReplace.", "sSrc", "sReplace"),
       P::template method<&U::StringRestoreCRLF>("StringRestoreCRLF",
@@ -178,13 +177,13 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
                                                  "Asks the user to type YES before a record is deleted."),
       P::template pending<&U::CheckModifyDatabase>(
           "CheckModifyDatabase", "Asks the user to type YES before the database is changed.", "sCaption"),
-      P::template pending<&U::ConvertCase>("ConvertCase", "A name in the case style of iCharactercase.", "iFlag",
-                                           "vStr"),
-      P::template pending<&U::ConvertCaseSuburbs>("ConvertCaseSuburbs",
-                                                  "A suburb in the case style of iCharacterCaseSuburbs.", "vStr"),
+      P::template method<&U::ConvertCase>("ConvertCase", "A name in the case style of iCharactercase.", "iFlag",
+                                          "vStr"),
+      P::template method<&U::ConvertCaseSuburbs>("ConvertCaseSuburbs",
+                                                 "A suburb in the case style of iCharacterCaseSuburbs.", "vStr"),
       P::template pending<&U::ShowShortCutKeys>("ShowShortCutKeys", "Shows the host's shortcut keys."),
       P::template pending<&U::ShowCmdLineHelp>("ShowCmdLineHelp", "Shows the host's command-line switches."),
-      P::template pending<&U::GenerateFilePassword>(
+      P::template method<&U::GenerateFilePassword>(
           "GenerateFilePassword",
           "A random password. iMix: 0 digits, 1 letters and symbols, 2 everything or, with iHex 1, hexadecimal.",
           "iMaxLength", "iMix", "iHex"),
@@ -245,8 +244,8 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
       P::template pending<&U::ExportGridData>("ExportGridData", "Writes the visible cells of a grid to a text file.",
                                               "m_Grid1", "iDontSaveHeader", "bSelection", "sFilename"),
       P::template pending<&U::GetDateFromString>("GetDateFromString", "Reads a date typed as DDMMYYYY.", "sText"),
-      P::template pending<&U::VerifyPasswordText>("VerifyPasswordText",
-                                                  "Whether a text has digits and capital letters only.", "sPassword"),
+      P::template method<&U::VerifyPasswordText>("VerifyPasswordText",
+                                                 "Whether a text has digits and capital letters only.", "sPassword"),
       P::template pending<&U::DateTimeToDuration>("DateTimeToDuration", "A stored duration as hours:minutes.", "vDate"),
       P::template pending<&U::DurationToDateTime>("DurationToDateTime", "Hours:minutes as a stored duration.",
                                                   "vDuration"),
@@ -269,9 +268,9 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
                                               "lColumn", "vGrid", "iSwitch"),
       P::template pending<&U::CountGridSelectedRows>(
           "CountGridSelectedRows", "Counts the ticked rows of a check-box column.", "lColumn", "vGrid"),
-      P::template pending<&U::CryptoEncryptString>("CryptoEncryptString", "Encrypts a text.", "sSourceString"),
-      P::template pending<&U::CryptoDecryptString>("CryptoDecryptString",
-                                                   "Decrypts a text that CryptoEncryptString made.", "sSourceString"),
+      P::template method<&U::CryptoEncryptString>("CryptoEncryptString", "Encrypts a text.", "sSourceString"),
+      P::template method<&U::CryptoDecryptString>("CryptoDecryptString",
+                                                  "Decrypts a text that CryptoEncryptString made.", "sSourceString"),
       P::template pending<&U::REGISTRY_QueryValue>("REGISTRY_QueryValue",
                                                    "The status of reading a registry value of the current user.",
                                                    "sKeyName", "sValueName"),
@@ -286,7 +285,7 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
       P::template method<&U::StringPosition>(
           "StringPosition", "Where the text part of an address line starts after its numbers (iOption 1).", "sSource",
           "iOption"),
-      P::template pending<&U::NumbersInString>("NumbersInString", "Whether a text has a digit.", "sSource"),
+      P::template method<&U::NumbersInString>("NumbersInString", "Whether a text has a digit.", "sSource"),
       P::template pending<&U::MyInputBox>("MyInputBox", "Asks for a text in a box that stays on top.", "sCaption",
                                           "sPrompt", optional("bPassword", 0), optional("bShowUserInput", -1),
                                           optional("bNoFrame", 0), optional("bNonCloseable", 0),

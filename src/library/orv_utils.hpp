@@ -71,7 +71,10 @@ class ORVUtils {
   virtual std::int16_t GetYear(const Variant& vDate);
   virtual std::int16_t GetMonth(const Variant& vDate);
   virtual std::int16_t GetDay(const Variant& vDate);
+
+  /// True for an empty address, and for one with an "@" and a "." anywhere, in any order.
   virtual Boolean VerifyEmail(const Text& sTemp);
+
   virtual Boolean GetMousePos(const Variant& lngSrcX, const Variant& lngSrcY, const Variant& lngDestX1,
                               const Variant& lngDestY1, const Variant& lngDestX2, const Variant& lngDestY2);
   virtual std::int32_t GetMaxPages(const std::int32_t& iRowsPerPage, const std::int32_t& iRowCount);
@@ -101,8 +104,15 @@ class ORVUtils {
   /// for a number beyond the range of a double.
   virtual Text VerifyIntData(const std::int16_t& iFlag, const Variant& vData);
 
+  /// True for a text of digits and full stops only: "1.2.3" and "." pass; a sign, a blank or a comma fails, and so does
+  /// an empty text.
   virtual Boolean IsValueNumber(const Text& sText);
+
+  /// True for the shape day/month/year in digits, with "/" or "-" between; ranges are not looked at: 99/99/9999 passes.
+  /// Two digits of the day with one of the month fail (12/3/2024), as hosts have always seen.
   virtual Boolean IsValueDate(const Text& sText);
+
+  /// True for hours of one or two digits, ":" and minutes; seconds fail, ranges are not looked at.
   virtual Boolean IsValueTime(const Text& sText);
 
   /// Replaces each carriage return and then each line feed by sReplace: a line break becomes two copies.
@@ -127,11 +137,27 @@ class ORVUtils {
   virtual void DrawShellExecuteError(const std::int32_t& lRetVal);
   virtual Boolean CheckDeleteRecord();
   virtual Boolean CheckModifyDatabase(const Text& sCaption);
+
+  /// A name in the case style of iCharactercase: 1 name case, 2 lower, 3 upper, anything else as it is; with iFlag 1
+  /// always name case, unless the style is 0 or less. What is converted is the value as VerifyTextData cleans it (which
+  /// counts in CounterVerifyText); values that name machinery, are empty or Null, or are not to be converted come back
+  /// unchanged. Raises 13 for what has no text, and what the name-case converter raises.
   virtual Variant ConvertCase(const std::int16_t& iFlag, const Variant& vStr);
+
+  /// The same for suburbs by iCharacterCaseSuburbs: 1 name case, 3 upper, anything else (2 too) as it is. Values that
+  /// name machinery are converted as all others.
   virtual Variant ConvertCaseSuburbs(const Variant& vStr);
+
   virtual void ShowShortCutKeys();
   virtual void ShowCmdLineHelp();
+
+  /// A random password of iMaxLength characters; empty for 0 or less. iMix 0 draws decimal digits, 1 letters and
+  /// symbols, 2 with iHex 0 letters, symbols and digits, 2 with iHex 1 hexadecimal digits; any other iMix gives an
+  /// empty text. No two neighbours are the same draw, and of each mix the first and the last character come up half as
+  /// often as the others. Waiting messages are handled before each draw. With iMix 2 and any other iHex the second
+  /// character never comes: the call lets messages through until the thread is asked to quit, and then raises 18.
   virtual Text GenerateFilePassword(const std::int16_t& iMaxLength, const std::int16_t& iMix, const std::int16_t& iHex);
+
   virtual Boolean FileExists(Text sFilename);
   virtual Text ExtractFilename(Text& vSpecIn, const Boolean& bIncludeExt);
   virtual void CopyFileToBackupFile(const Text& sSrcFileName, const Text& sDestFileName);
@@ -174,7 +200,10 @@ class ORVUtils {
   virtual void ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontSaveHeader, const Boolean& bSelection,
                               const Text& sFilename);
   virtual Variant GetDateFromString(const Text& sText);
+
+  /// True when every character is a digit or a capital A to Z; so for an empty text.
   virtual Boolean VerifyPasswordText(const Text& sPassword);
+
   virtual Variant DateTimeToDuration(Variant& vDate);
   virtual Variant DurationToDateTime(const Variant& vDuration);
   virtual float ConvertDurationToNumber(const Variant& vT);
@@ -188,8 +217,15 @@ class ORVUtils {
   virtual void AppendEventLog(const Text& sEventName, const Text& sEventForm);
   virtual void SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid, const std::int16_t& iSwitch);
   virtual std::int32_t CountGridSelectedRows(const std::int32_t& lColumn, const Variant& vGrid);
+
+  /// The text as printable cipher text, different each time; empty for an empty text. Every library reads it back; see
+  /// docs/cipher-text.md.
   virtual Text CryptoEncryptString(const Text& sSourceString);
+
+  /// The text that CryptoEncryptString was given. Raises 5, with a description of its own, for anything that is not a
+  /// whole cipher text; an empty text gives an empty text.
   virtual Text CryptoDecryptString(const Text& sSourceString);
+
   virtual std::int32_t REGISTRY_QueryValue(const Text& sKeyName, const Text& sValueName);
   virtual Text REGISTRY_ReturnValue(const Text& sKeyName, const Text& sValueName);
   virtual void REGISTRY_SetKeyValue(const Text& sKeyName, const Text& sValueName, const Variant& vValueSetting,
@@ -203,7 +239,9 @@ class ORVUtils {
   /// numbers ("12 SMITH ST" gives 3); 0 otherwise. Raises 6 for a position beyond 32767.
   virtual std::int16_t StringPosition(const Text& sSource, const std::int16_t& iOption);
 
+  /// True when there is at least one digit.
   virtual Boolean NumbersInString(const Text& sSource);
+
   virtual Text MyInputBox(const Text& sCaption, const Text& sPrompt, const Boolean& bPassword,
                           const Boolean& bShowUserInput, const Boolean& bNoFrame, const Boolean& bNonCloseable,
                           const std::int32_t& lBackColor);

@@ -24,16 +24,12 @@ Variant ORVUtils::WeekYearToDate(std::int16_t&, const std::int16_t&, const std::
 std::int16_t ORVUtils::GetYear(const Variant&) { not_built(); }
 std::int16_t ORVUtils::GetMonth(const Variant&) { not_built(); }
 std::int16_t ORVUtils::GetDay(const Variant&) { not_built(); }
-Boolean ORVUtils::VerifyEmail(const Text&) { not_built(); }
 Boolean ORVUtils::GetMousePos(const Variant&, const Variant&, const Variant&, const Variant&, const Variant&,
                               const Variant&) {
   not_built();
 }
 std::int32_t ORVUtils::GetMaxPages(const std::int32_t&, const std::int32_t&) { not_built(); }
 std::int16_t ORVUtils::GetDaysThisMonth(const std::int16_t&, const std::int16_t&) { not_built(); }
-Boolean ORVUtils::IsValueNumber(const Text&) { not_built(); }
-Boolean ORVUtils::IsValueDate(const Text&) { not_built(); }
-Boolean ORVUtils::IsValueTime(const Text&) { not_built(); }
 Variant ORVUtils::GetTimeDifference(Variant&, Variant&, Variant&, Variant&) { not_built(); }
 Variant ORVUtils::IncYear(const Variant&, const std::int16_t&) { not_built(); }
 std::int32_t ORVUtils::GetDaysInPeriod(const Variant&, const Variant&) { not_built(); }
@@ -46,11 +42,8 @@ Variant ORVUtils::GetNextDate(const Variant&, const Variant&, const Variant&) { 
 void ORVUtils::DrawShellExecuteError(const std::int32_t&) { not_built(); }
 Boolean ORVUtils::CheckDeleteRecord() { not_built(); }
 Boolean ORVUtils::CheckModifyDatabase(const Text&) { not_built(); }
-Variant ORVUtils::ConvertCase(const std::int16_t&, const Variant&) { not_built(); }
-Variant ORVUtils::ConvertCaseSuburbs(const Variant&) { not_built(); }
 void ORVUtils::ShowShortCutKeys() { not_built(); }
 void ORVUtils::ShowCmdLineHelp() { not_built(); }
-Text ORVUtils::GenerateFilePassword(const std::int16_t&, const std::int16_t&, const std::int16_t&) { not_built(); }
 Boolean ORVUtils::FileExists(Text) { not_built(); }
 Text ORVUtils::ExtractFilename(Text&, const Boolean&) { not_built(); }
 void ORVUtils::CopyFileToBackupFile(const Text&, const Text&) { not_built(); }
@@ -93,7 +86,6 @@ void ORVUtils::LoadGridWidths(const Variant&, const Text&, const std::int16_t&) 
 void ORVUtils::SaveGridWidths(const Variant&, const Text&, const std::int16_t&) { not_built(); }
 void ORVUtils::ExportGridData(const Variant&, const std::int16_t&, const Boolean&, const Text&) { not_built(); }
 Variant ORVUtils::GetDateFromString(const Text&) { not_built(); }
-Boolean ORVUtils::VerifyPasswordText(const Text&) { not_built(); }
 Variant ORVUtils::DateTimeToDuration(Variant&) { not_built(); }
 Variant ORVUtils::DurationToDateTime(const Variant&) { not_built(); }
 float ORVUtils::ConvertDurationToNumber(const Variant&) { not_built(); }
@@ -107,13 +99,10 @@ Boolean ORVUtils::PingSite(const Text&) { not_built(); }
 void ORVUtils::AppendEventLog(const Text&, const Text&) { not_built(); }
 void ORVUtils::SelectGridRows(const std::int32_t&, const Variant&, const std::int16_t&) { not_built(); }
 std::int32_t ORVUtils::CountGridSelectedRows(const std::int32_t&, const Variant&) { not_built(); }
-Text ORVUtils::CryptoEncryptString(const Text&) { not_built(); }
-Text ORVUtils::CryptoDecryptString(const Text&) { not_built(); }
 std::int32_t ORVUtils::REGISTRY_QueryValue(const Text&, const Text&) { not_built(); }
 Text ORVUtils::REGISTRY_ReturnValue(const Text&, const Text&) { not_built(); }
 void ORVUtils::REGISTRY_SetKeyValue(const Text&, const Text&, const Variant&, const std::int32_t&) { not_built(); }
 void ORVUtils::REGISTRY_CreateNewKey(const Text&, const std::int32_t&) { not_built(); }
-Boolean ORVUtils::NumbersInString(const Text&) { not_built(); }
 Text ORVUtils::MyInputBox(const Text&, const Text&, const Boolean&, const Boolean&, const Boolean&, const Boolean&,
                           const std::int32_t&) {
   not_built();

@@ -1,0 +1,97 @@
+#pragma once
+
+#include "controls/control.hpp"
+
+namespace talutil {
+
+/// Bytes on their way into the encryption control or out of it.
+class CryptoData final : public TableObject<CryptoData> {
+ public:
+  /// The codes of the forms that data are given and read in.
+  static constexpr std::int32_t encoded = 1;  ///< Base64
+  static constexpr std::int32_t plain = 3;    ///< The code units of a text
+
+  explicit CryptoData(Bytes bytes) noexcept : bytes_(std::move(bytes)) {}
+
+  /// The data in one of the forms. Raises 5 for another code and for bytes that have no such form.
+  [[nodiscard]] Text Read(const std::int32_t& Format) const;
+
+  [[nodiscard]] const Bytes& bytes() const noexcept { return bytes_; }
+
+ private:
+  Bytes bytes_;
+};
+
+/// The key of a pass phrase, with the options that say how it is used. There is one way that is safe, so each
+/// option has one value; they stand for those that the messages of this key are marked with.
+class CryptoKey final : public TableObject<CryptoKey> {
+ public:
+  static constexpr std::int32_t counter_mode = 1;  ///< Galois/counter mode
+  static constexpr std::int32_t no_padding = 2;    ///< The mode needs none
+  static constexpr std::int32_t aes = 9;           ///< AES with the key's 256 bits
+
+  CryptoKey(const Platform& platform, const Cryptography::Key& key) : platform_(platform), key_(key) {}
+
+  std::int32_t Mode = 0;
+  std::int32_t Padding = 0;
+
+  /// Encrypts data under a fresh nonce and gives new data. Raises 5 for options or an algorithm that are not those
+  /// above and for a Final of False (a message is given whole), 13 for data of another kind.
+  [[nodiscard]] Variant Encrypt(const std::int32_t& Algorithm, const Variant& Data, const Boolean& Final) const;
+
+  /// Undoes Encrypt. Data that were not encrypted by this key, or were changed, raise 5 with one description whatever
+  /// is wrong with them.
+  [[nodiscard]] Variant Decrypt(const std::int32_t& Algorithm, const Variant& Data, const Boolean& Final) const;
+
+ private:
+  [[nodiscard]] const Bytes& checked_input(std::int32_t algorithm, const Variant& data, Boolean final) const;
+
+  const Platform& platform_;
+  Cryptography::Key key_;
+};
+
+/// The encryption control: strings to printable cipher text and back. See cipher_text.hpp for the bytes.
+class Crypto final : public TableObject<Crypto> {
+ public:
+  static constexpr std::int32_t key_bits = 256;
+  static constexpr std::int32_t from_pass_phrase = 1;
+
+  explicit Crypto(const Platform& platform) : platform_(platform) {}
+
+  /// A key object. Raises 5 for any KeyBits but 256 and any Derivation but 1, a pass phrase.
+  [[nodiscard]] Variant CreateKey(const Text& PassPhrase, const std::int32_t& KeyBits,
+                                  const std::int32_t& Derivation) const;
+
+  /// A data object from a text in one of the forms. Raises 5 for another code, and as Decrypt does for a text
+  /// that is not Base64.
+  [[nodiscard]] Variant CreateData(const Text& Source, const std::int32_t& Format) const;
+
+ private:
+  const Platform& platform_;
+};
+
+template <class P>
+constexpr auto members_of(std::type_identity<CryptoData>) {
+  return P::rows(
+      P::template method<&CryptoData::Read>("Read", "The data as text: 1 Base64, 3 the plain text.", "Format"));
+}
+
+template <class P>
+constexpr auto members_of(std::type_identity<CryptoKey>) {
+  return P::rows(P::template property<&CryptoKey::Mode>("Mode", "The mode of operation: 1 Galois/counter mode."),
+                 P::template property<&CryptoKey::Padding>("Padding", "The padding: 2 none."),
+                 P::template method<&CryptoKey::Encrypt>("Encrypt", "Encrypts data; Algorithm 9 is AES.", "Algorithm",
+                                                         "Data", "Final"),
+                 P::template method<&CryptoKey::Decrypt>("Decrypt", "Decrypts data; Algorithm 9 is AES.", "Algorithm",
+                                                         "Data", "Final"));
+}
+
+template <class P>
+constexpr auto members_of(std::type_identity<Crypto>) {
+  return P::rows(P::template method<&Crypto::CreateKey>("CreateKey", "A key object from a pass phrase.", "PassPhrase",
+                                                        "KeyBits", "Derivation"),
+                 P::template method<&Crypto::CreateData>(
+                     "CreateData", "A data object from a text: 1 Base64, 3 a plain text.", "Source", "Format"));
+}
+
+}  // namespace talutil

@@ -1,0 +1,24 @@
+#pragma once
+
+#include "controls/control.hpp"
+#include "text/name_case.hpp"
+
+namespace talutil {
+
+/// The string component that brings names into name case; members make one for each call that needs it.
+class NameCaseConverter final : public TableObject<NameCaseConverter> {
+ public:
+  static constexpr TextView class_name = u"TALUtil.NameCaseConverter";
+
+  explicit NameCaseConverter(const Platform& /*platform*/) {}
+
+  /// The text in name case, by the rules of name_case.hpp.
+  [[nodiscard]] Text NameCase(const Text& Name) const { return name_case(Name); }
+};
+
+template <class P>
+constexpr auto members_of(std::type_identity<NameCaseConverter>) {
+  return P::rows(P::template method<&NameCaseConverter::NameCase>("NameCase", "The text in name case.", "Name"));
+}
+
+}  // namespace talutil

@@ -1,0 +1,51 @@
+#include "controls/control_factory.hpp"
+#include "controls/name_case_converter.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+
+namespace talutil {
+
+namespace {
+
+/// The case styles of iCharactercase and iCharacterCaseSuburbs; all other values leave a text as it is.
+constexpr std::int16_t style_none = 0;
+constexpr std::int16_t style_name = 1;
+constexpr std::int16_t style_lower = 2;
+constexpr std::int16_t style_upper = 3;
+
+/// By a converter of its own, which is gone when the caller goes on.
+Text in_name_case(const ORVUtils& utils, const Text& text) {
+  const Control converter(utils.library().controls().create(NameCaseConverter::class_name));
+  return converter.call(u"NameCase", {text}).to_text(utils.locale());
+}
+
+bool names_machinery(const Variant& value, const Locale& locale) {
+  const Variant plain = value.value();
+  return !plain.is_null() && upper_case(plain.to_text(locale)).find(u"MACHINERY") != Text::npos;
+}
+
+}  // namespace
+
+Variant ORVUtils::ConvertCase(const std::int16_t& iFlag, const Variant& vStr) {
+  if (names_machinery(vStr, locale())) return vStr;
+  const std::int16_t style = settings().iCharactercase;
+  if (style <= style_none) return vStr;
+  const Text s = VerifyTextData(0, 0, vStr);
+  if (s.empty()) return vStr;
+  if (iFlag == 1 || style == style_name) return in_name_case(*this, s);
+  if (style == style_lower) return lower_case(s);
+  if (style == style_upper) return upper_case(s);
+  return vStr;
+}
+
+Variant ORVUtils::ConvertCaseSuburbs(const Variant& vStr) {
+  const std::int16_t style = settings().iCharacterCaseSuburbs;
+  if (style <= style_none) return vStr;
+  const Text s = VerifyTextData(0, 0, vStr);
+  if (s.empty()) return vStr;
+  if (style == style_name) return in_name_case(*this, s);
+  if (style == style_upper) return upper_case(s);
+  return vStr;
+}
+
+}  // namespace talutil

@@ -1,0 +1,44 @@
+#include "infoforms/frm_components.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+
+namespace talutil {
+
+namespace {
+
+/// The same in every library, so that a cipher text of one installation is read by all others.
+constexpr TextView pass_phrase = u"w4Tq%Lp2#Zr9!Kb7&Nt8*Hy3@Jm5^Xc1";
+
+// What the encryption control on the components window is told; another maker's in its place knows these codes.
+constexpr std::int32_t key_bits = 256;
+constexpr std::int32_t key_derivation = 1;
+constexpr std::int32_t key_mode = 1;
+constexpr std::int32_t key_padding = 2;
+constexpr std::int32_t algorithm = 9;
+constexpr std::int32_t encoded_text = 1;
+constexpr std::int32_t plain_text = 3;
+
+/// Puts a text through an operation of the control's key. All objects made on the way are gone afterwards.
+Text transform(const ORVUtils& utils, TextView operation, const Text& source, std::int32_t from, std::int32_t to) {
+  const Control crypto(utils.library().components().control(u"Crypto1"));
+  const Control key(crypto.call(u"CreateKey", {pass_phrase, key_bits, key_derivation}));
+  key.put(u"Mode", key_mode);
+  key.put(u"Padding", key_padding);
+  const Control input(crypto.call(u"CreateData", {source, from}));
+  const Control output(key.call(operation, {algorithm, input.object(), Boolean(true)}));
+  return output.call(u"Read", {to}).to_text(utils.locale());
+}
+
+}  // namespace
+
+Text ORVUtils::CryptoEncryptString(const Text& sSourceString) {
+  if (sSourceString.empty()) return {};
+  return transform(*this, u"Encrypt", sSourceString, plain_text, encoded_text);
+}
+
+Text ORVUtils::CryptoDecryptString(const Text& sSourceString) {
+  if (sSourceString.empty()) return {};
+  return transform(*this, u"Decrypt", sSourceString, encoded_text, plain_text);
+}
+
+}  // namespace talutil

@@ -1,0 +1,80 @@
+#include "automation/checked.hpp"
+#include "automation/run_time_error.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "text/random_singles.hpp"
+
+namespace talutil {
+
+namespace {
+
+/// The characters that draws stand for: letters, symbols, digits, and the rest of the hexadecimal digits.
+constexpr TextView character_table =
+    u"ABCDEFGHIJKLMNOPQRSTUVWXYZ"
+    u"abcdefghijklmnopqrstuvwxyz"
+    u"`~!@#$%^&*()_-+=[]{}:;'<,>.?/|\\"
+    u"0123456789"
+    u"ABCDEF";
+constexpr TextView decimal_digits = u"0123456789";
+static_assert(character_table.size() == 99 && character_table[52] == u'`' && character_table[82] == u'\\' &&
+              character_table[92] == u'9' && character_table[98] == u'F');
+
+/// A draw is a random number below 1, scaled and rounded with halves to even: both ends come up half as often as
+/// the numbers between them.
+struct Mix {
+  TextView characters;
+  float scale = 0;
+  float offset = 0;
+  std::int32_t previous = 36;  ///< What the first draw may not be.
+};
+
+/// Mix 2 with an iHex of neither 0 nor 1 draws nothing: its number stays 0.
+Mix mix_of(std::int16_t mix, std::int16_t hex) {
+  if (mix == 0) return {decimal_digits, 9, 0, 11};
+  if (mix == 1) return {character_table, 82};
+  if (mix == 2 && hex == 0) return {character_table, 92};
+  if (mix == 2 && hex == 1) return {character_table, 15, 83};
+  if (mix == 2) return {character_table};
+  return {};
+}
+
+/// Draws until the number differs from the one before, so that no two neighbours are the same draw.
+std::int32_t draw(const Mix& mix, std::int32_t previous, RandomSingles& random, MessagePump& messages) {
+  messages.handle_waiting();
+  if (mix.scale == 0) {
+    // There is nothing to draw, so a repeated number stays one for good: the member does not return. It sleeps
+    // between the host's messages, and gives up when the host is told to.
+    while (previous == 0) {
+      if (!messages.wait_and_handle()) raise(ErrorNumber::user_interrupt);
+    }
+    return 0;
+  }
+  const auto drawn = [&] { return round_to<std::int32_t>(random.next() * mix.scale + mix.offset); };
+  std::int32_t number = drawn();
+  while (number == previous) {
+    messages.handle_waiting();
+    number = drawn();
+  }
+  return number;
+}
+
+}  // namespace
+
+Text ORVUtils::GenerateFilePassword(const std::int16_t& iMaxLength, const std::int16_t& iMix,
+                                    const std::int16_t& iHex) {
+  const Platform& platform = library().platform();
+  const Mix mix = mix_of(iMix, iHex);
+  RandomSingles random(platform.random_source);
+  // A host can change its variable while its messages are handled; the length is the one it called with.
+  const std::int16_t length = mix.characters.empty() ? std::int16_t{0} : iMaxLength;
+
+  Text result;
+  std::int32_t previous = mix.previous;
+  for (std::int16_t position = 0; position < length; ++position) {
+    previous = draw(mix, previous, random, platform.message_pump);
+    result += mix.characters[static_cast<std::size_t>(previous)];
+  }
+  return result;
+}
+
+}  // namespace talutil

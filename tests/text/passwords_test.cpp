@@ -1,0 +1,112 @@
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <map>
+
+#include "tests/text/recording_utils.hpp"
+
+namespace talutil::testing {
+namespace {
+
+using Passwords = TextMembersTest;
+
+// How often each character follows each other one, against the odds: both ends of a mix have half the weight of the
+// rest, and the one before is left out. A row of k characters has k - 2 degrees of freedom.
+TEST_F(Passwords, AMillionDrawsOfEachMixAreAsLikelyAsTold) {
+  const struct {
+    const char* name;
+    std::int16_t mix, hex;
+    TextView characters;
+  } rows[] = {
+      {"digits", 0, 9, u"0123456789"},
+      {"letters and symbols", 1, 9,
+       u"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz`~!@#$%^&*()_-+=[]{}:;'<,>.?/|\\"},
+      {"everything", 2, 0,
+       u"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz`~!@#$%^&*()_-+=[]{}:;'<,>.?/|\\0123456789"},
+      {"hexadecimal", 2, 1, u"0123456789ABCDEF"},
+  };
+  for (const auto& row : rows) {
+    std::map<std::pair<char16_t, char16_t>, double> pairs;
+    std::map<char16_t, double> firsts;
+    for (int call = 0; call < 31; ++call) {
+      const Text password = utils.GenerateFilePassword(32767, row.mix, row.hex);
+      ASSERT_EQ(password.size(), 32767U) << row.name;
+      for (std::size_t i = 1; i < password.size(); ++i) {
+        ++pairs[{password[i - 1], password[i]}];
+        ++firsts[password[i - 1]];
+      }
+    }
+    const auto count = static_cast<double>(row.characters.size());
+    const auto odds = [&](char16_t c) {
+      return (c == row.characters.front() || c == row.characters.back() ? 0.5 : 1) / (count - 1);
+    };
+    double chi_square = 0;
+    double met = 0;
+    for (const char16_t a : row.characters) {
+      for (const char16_t b : row.characters) {
+        const double expected = a == b ? 0 : firsts[a] * odds(b) / (1 - odds(a));
+        const double seen = pairs[{a, b}];
+        met += seen;
+        if (a == b)
+          ASSERT_EQ(seen, 0) << row.name;
+        else
+          chi_square += (seen - expected) * (seen - expected) / expected;
+      }
+    }
+    EXPECT_EQ(met, 31 * 32766) << row.name << ": characters of another mix";
+    const double freedom = count * (count - 2);
+    EXPECT_LT(std::abs(chi_square - freedom), 4 * std::sqrt(2 * freedom)) << row.name;
+  }
+}
+
+/// Gives one number again and again, then others.
+struct ScriptedSource final : RandomSource {
+  void fill(std::span<std::uint8_t> bytes) override {
+    ++seeded;
+    for (std::size_t i = 0; i + 3 <= bytes.size(); i += 3) {
+      const std::uint32_t x = i < 3 * numbers.size() ? numbers[i / 3] : 0;
+      bytes[i] = static_cast<std::uint8_t>(x);
+      bytes[i + 1] = static_cast<std::uint8_t>(x >> 8);
+      bytes[i + 2] = static_cast<std::uint8_t>(x >> 16);
+    }
+  }
+  std::vector<std::uint32_t> numbers;  ///< In 2^-24
+  int seeded = 0;
+};
+
+TEST(PasswordDraws, HalvesRoundToEvenAndRepeatedDrawsAreDropped) {
+  constexpr std::uint32_t one = 1U << 24;
+  ScriptedSource source;
+  FakePlatform fake;
+  const Platform parts = fake.platform();
+  Library library(Platform{parts.message_boxes, parts.screen, parts.computer, parts.clock, parts.form_windows,
+                           parts.control_makers, parts.message_pump, source, parts.cryptography});
+  ORVUtils utils(library);
+
+  // The largest number below 1 is an end; x * 92 of 0.5, 1.5 and 2.5 go to 0, 2 and 2.
+  source.numbers = {one - 1, one - 1, 0, one / 184 + 1, 3 * (one / 184), 5 * (one / 184), one / 2};
+  EXPECT_EQ(utils.GenerateFilePassword(5, 2, 0), u"9ABCu");
+  // The first draw of the table's mixes may not be its number 36.
+  source.numbers = {one / 82 * 36, one / 82 * 37};
+  EXPECT_EQ(utils.GenerateFilePassword(1, 1, 0), u"l");
+  source.numbers = {one / 2, one / 4};  // x * 9 = 4.5 and 2.25
+  EXPECT_EQ(utils.GenerateFilePassword(2, 0, 0), u"42");
+  EXPECT_EQ(source.seeded, 3) << "once a call";
+  EXPECT_EQ(fake.messages_handled, 7 + 2 + 2) << "before each draw";
+}
+
+TEST_F(Passwords, NothingToDraw) {
+  const struct {
+    std::int16_t length, mix, hex;
+    Text expected;
+  } rows[] = {{0, 1, 0, u""}, {-32768, 2, 0, u""}, {5, 7, 0, u""}, {5, -1, 1, u""}, {1, 2, 5, u"A"}, {0, 2, 5, u""}};
+  for (const auto& row : rows) EXPECT_EQ(utils.GenerateFilePassword(row.length, row.mix, row.hex), row.expected);
+  EXPECT_EQ(platform.waits, 0);
+  // It sleeps between messages until the thread is asked to quit.
+  platform.quits_after_waits = 3;
+  EXPECT_EQ(error_of([&] { (void)utils.GenerateFilePassword(2, 2, 5); }), 18);
+  EXPECT_EQ(platform.waits, 3);
+}
+
+}  // namespace
+}  // namespace talutil::testing
