@@ -4,6 +4,7 @@
 #include <iomanip>
 #include <iostream>
 
+#include "cli/calling.hpp"
 #include "cli/cleaner.hpp"
 #include "cli/commands.hpp"
 #include "cli/csv.hpp"
@@ -142,6 +143,7 @@ void clean(const CleanOptions& options) {
   }
 
   Session session;
+  put_settings(session, options.settings);
   const std::string plan_text = read_bytes(options.plan);
   auto plan = within(options.plan, [&] { return read_plan(plan_text, Session::members().members, session.locale()); });
   const std::string bytes = read_bytes(options.csv);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 #include <vector>
 
@@ -28,9 +29,23 @@ void call(const CallOptions& options);
 struct CleanOptions {
   std::string csv;
   std::string plan;
-  std::string output;  ///< Empty for the CSV file's name with .sql.
-  std::string table;   ///< Empty for the CSV file's name without folder and extension.
+  std::string output;                 ///< Empty for the CSV file's name with .sql.
+  std::vector<std::string> settings;  ///< NAME=VALUE, put in this order before the first row.
+  std::string table;                  ///< Empty for the CSV file's name without folder and extension.
 };
 void clean(const CleanOptions& options);
+
+struct SecretOptions {
+  bool exact = false;  ///< The text is taken or printed to the byte, without a line break more or less.
+};
+void encrypt(const SecretOptions& options);
+void decrypt(const SecretOptions& options);
+
+struct PasswordOptions {
+  std::int16_t length = 16;
+  std::string mix = "all";
+  int count = 1;
+};
+void password(const PasswordOptions& options);
 
 }  // namespace talutil::cli

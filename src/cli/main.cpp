@@ -19,6 +19,8 @@ struct Request {
   std::string help_member;
   CallOptions call;
   CleanOptions clean;
+  SecretOptions secret;
+  PasswordOptions password;
   std::function<void()> run;
 };
 
@@ -42,15 +44,17 @@ void add_help(CLI::App& app, Request& request) {
   });
 }
 
+void add_settings(CLI::App& command, std::vector<std::string>& settings, const std::string& help) {
+  command.add_option("--set", settings, help)->allow_extra_args(false)->type_name("NAME=VALUE");
+}
+
 void add_call(CLI::App& app, Request& request) {
   auto* const command = app.add_subcommand("call", "Call a method, read a setting or put one: MEMBER [ARGUMENT]...");
   // What is no option of ours is an argument, in its order: "-1" and "-x" need no "--" before them.
   command->allow_extras();
   command->set_help_flag("--help", "Print this help message and exit");
   command->add_option("MEMBER", request.call.member, "The member's name, in any case")->required();
-  command->add_option("--set", request.call.settings, "Put a setting before the call; may be repeated")
-      ->allow_extra_args(false)
-      ->type_name("NAME=VALUE");
+  add_settings(*command, request.call.settings, "Put a setting before the call; may be repeated");
   command->add_flag("--json", request.call.json, "Print {\"result\": ..., \"arguments\": {...}}");
   command->footer("Arguments are texts as typed, and become what the parameter wants. For what a text cannot say:\n" +
                   written_forms_help() +
@@ -69,6 +73,7 @@ void add_clean(CLI::App& app, Request& request) {
   command->add_option("--plan", request.clean.plan, "Which members clean which column (see below)")->required();
   command->add_option("--output", request.clean.output, "The SQL file; else the CSV file's name with .sql");
   command->add_option("--table", request.clean.table, "The table; else the CSV file's name");
+  add_settings(*command, request.clean.settings, "Put a setting first, for example iCharactercase=1");
   command->footer(
       "A plan has one line a column: its name, a member and the member's arguments before the value.\n"
       "\"|\" hands the result to another member, \"list\" cleans each element of a comma list, \"*\" stands\n"
@@ -78,6 +83,27 @@ void add_clean(CLI::App& app, Request& request) {
       "  Tags    list VerifyTextData 20 1\n"
       "  Code    AddZeros * 6 -1");
   command->callback([&] { request.run = [&] { clean(request.clean); }; });
+}
+
+void add_secrets(CLI::App& app, Request& request) {
+  auto* const encrypting = app.add_subcommand("encrypt", "Encrypt the text of standard input, as hosts do");
+  encrypting->add_flag("--exact", request.secret.exact, "Take a line break at the end as part of the text");
+  encrypting->footer("  printf %s \"$secret\" | talutil encrypt");
+  encrypting->callback([&] { request.run = [&] { encrypt(request.secret); }; });
+  auto* const decrypting = app.add_subcommand("decrypt", "Print the text of the cipher text on standard input");
+  decrypting->add_flag("--exact", request.secret.exact, "Print no line break after the text");
+  decrypting->callback([&] { request.run = [&] { decrypt(request.secret); }; });
+
+  auto* const making = app.add_subcommand("password", "Print a random password");
+  making->add_option("--length", request.password.length, "Its length")
+      ->check(CLI::Range(1, 32767))
+      ->capture_default_str();
+  making->add_option("--mix", request.password.mix, "Its characters: digits, letters (and symbols), all or hex")
+      ->capture_default_str();
+  making->add_option("--count", request.password.count, "How many, one a line")
+      ->check(CLI::Range(1, 1'000'000))
+      ->capture_default_str();
+  making->callback([&] { request.run = [&] { password(request.password); }; });
 }
 
 void add_printers(CLI::App& app, Request& request) {
@@ -118,6 +144,7 @@ int run(std::vector<std::string> words) {
   add_help(app, request);
   add_call(app, request);
   add_clean(app, request);
+  add_secrets(app, request);
   add_printers(app, request);
   if (!words.empty() && !words.front().starts_with('-')) check_subcommand(app, words.front());
   if (!words.empty() && words.front() == "call") request.call.arguments = take_verbatim(words);

@@ -13,6 +13,7 @@ class Session {
   Session() { library_.start(); }
 
   [[nodiscard]] static const LateInterface& members() { return late_interface<ORVUtils>(); }
+  [[nodiscard]] ORVUtils& utils() noexcept { return utils_; }
   [[nodiscard]] Locale locale() const { return library_.locale(); }
   [[nodiscard]] const SharedSettings& settings() noexcept { return library_.settings(); }
 

@@ -107,7 +107,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, clean, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, idl, reference' lst
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
 # ---- list, help
@@ -171,6 +171,16 @@ bad_plan 'plan: count' \
   'VerifyTextData takes 3 arguments and got 2, the column'"'"'s value included; see "talutil help VerifyTextData"' 'Name VerifyTextData 1'
 bad_plan 'plan: column twice' 'column "ID" stands twice' 'ID StripNulls'
 bad_plan 'plan: no result' 'Terminate gives no value back; use a member that does' 'Name Terminate'
+
+# ---- secrets
+verdict 'encrypted and decrypted, the line break of echo apart' $'sécret' "$(echo 'sécret' | "$talutil" encrypt | "$talutil" decrypt)"
+verdict 'to the byte' ' 20 61 0a 0a' "$(printf ' a\n\n' | "$talutil" encrypt --exact | "$talutil" decrypt --exact | od -An -tx1)"
+verdict 'a cipher text of another maker' '1: talutil: standard input: error 5: This is not a cipher text of this library, or it was changed' \
+  "$(m=$(echo QUJD | "$talutil" decrypt 2>&1); echo "$?: $m")"
+[[ $("$talutil" password --length 12 --mix hex --count 2) =~ ^[0-9A-F]{12}$'\n'[0-9A-F]{12}$ ]]
+verdict 'passwords' 0 $?
+expect 'unknown mix' 2 'talutil: --mix x: there is no such mix; there are digits, letters, all and hex' password --mix x
+expect_part 'password without length' 2 '--length: Value 0 not in range 1 to 32767' password --length 0
 
 cmp -s "$top/examples/data/customers.csv" <("${CXX:-g++}" -std=c++20 -o make "$top/tools/make_customers.cpp" && ./make)
 verdict 'customers.csv is what make_customers writes' 0 $?

@@ -1,0 +1,59 @@
+#include <iostream>
+
+#include "cli/commands.hpp"
+#include "cli/failure.hpp"
+#include "cli/files.hpp"
+#include "cli/session.hpp"
+
+namespace talutil::cli {
+
+namespace {
+
+/// Standard input without the line break that echo and here-documents put at its end.
+std::string read_input(bool is_exact) {
+  std::string bytes = read_bytes("-");
+  if (!is_exact && bytes.ends_with('\n')) bytes.pop_back();
+  if (!is_exact && bytes.ends_with('\r')) bytes.pop_back();
+  return bytes;
+}
+
+void print(const Text& text, bool is_exact) { std::cout << to_utf8(text) << (is_exact ? "" : "\n"); }
+
+}  // namespace
+
+void encrypt(const SecretOptions& options) {
+  Session session;
+  const Text text = utf8_text(read_input(options.exact), "standard input");
+  // A cipher text is ASCII on one line, and always ends as a line.
+  print(session.utils().CryptoEncryptString(text), false);
+}
+
+void decrypt(const SecretOptions& options) {
+  Session session;
+  const Text cipher = utf8_text(read_input(false), "standard input");
+  try {
+    print(session.utils().CryptoDecryptString(cipher), options.exact);
+  } catch (const RunTimeError& error) {
+    throw run_time_failure("standard input: " + error_words(error));
+  }
+}
+
+void password(const PasswordOptions& options) {
+  struct Mix {
+    const char* name;
+    std::int16_t mix;
+    std::int16_t hex;
+  };
+  constexpr Mix mixes[] = {{"digits", 0, 0}, {"letters", 1, 0}, {"all", 2, 0}, {"hex", 2, 1}};
+  for (const Mix& known : mixes) {
+    if (options.mix != known.name) continue;
+    Session session;
+    for (int i = 0; i < options.count; ++i) {
+      print(session.utils().GenerateFilePassword(options.length, known.mix, known.hex), false);
+    }
+    return;
+  }
+  throw usage_failure("--mix " + options.mix + ": there is no such mix; there are digits, letters, all and hex");
+}
+
+}  // namespace talutil::cli
