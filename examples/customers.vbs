@@ -24,6 +24,8 @@ Sub Main(arguments)
   started = Timer
   utils.CounterVerifyText = 0
   utils.CounterVerifyInt = 0
+  utils.iCharactercase = 1
+  utils.iCharacterCaseSuburbs = 1
   size = CleanFile(files, arguments(0), arguments(1), arguments(2))
   Say "CounterVerifyText " & utils.CounterVerifyText & ", CounterVerifyInt " & utils.CounterVerifyInt
   Say size & " bytes of inserts to " & arguments(2) & " in " & Int((Timer - started) * 1000) / 1000 & " s"
@@ -177,6 +179,10 @@ Function CleanStep(words, value)
       CleanStep = utils.VerifyIntData(words(1), value)
     Case "VerifyMemField"
       CleanStep = utils.VerifyMemField(value)
+    Case "ConvertCase"
+      CleanStep = utils.ConvertCase(words(1), value)
+    Case "ConvertCaseSuburbs"
+      CleanStep = utils.ConvertCaseSuburbs(value)
     Case "list"
       CleanStep = CleanList(words(1), value)
     Case "chain"

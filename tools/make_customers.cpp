@@ -40,8 +40,9 @@ class Chance {
 // Octal escapes are characters of code page 1252.
 const Words given_names{"Anne", "Ben",     "Carla",  "Dora", "Emil", "Fay",
                         "Gus",  "Ren\351", "Zo\353", "Ines", "Jo",   "Karl"};
-const Words family_names{"O'Brien",     "D'Arcy",       "M\374ller", "Bj\366rk", "Garc\355a", "Smithers", "L\351ger",
-                         "N\372\361ez", "Van der Poel", "Ashgrove",  "O'Hara",   "Wei\337",   "Pickering"};
+const Words family_names{"O'Brien",   "D'Arcy",      "M\374ller",    "Bj\366rk",  "Garc\355a", "Smithers",
+                         "L\351ger",  "N\372\361ez", "Van der Poel", "Ashgrove",  "O'Hara",    "Wei\337",
+                         "Pickering", "McKenna",     "Machin",       "de la Cruz"};
 const Words trades{"Plumbing", "Gardens", "Electrical", "Roofing", "Caf\351", "Cleaning", "Pest Control"};
 const Words streets{"Main Road", "Harbour St", "King's Parade", "Mill Lane", "Station Street", "Lake Drive"};
 const Words suburbs{"Northbank", "St Alban's", "Eastmere", "Port Hollow", "Green  Valley", "Upper Tarn"};
@@ -53,6 +54,21 @@ const Words tags{"regular",  "trade",     "owes money", "VIP",       "do not cal
                  "warranty", "O'Brien's", "new<er>",    "pool & spa"};
 
 const std::string line_break = "\r\n";
+
+/// As clerks type: now and then all capitals, now and then none.
+std::string in_typed_case(Chance& chance, std::string text) {
+  const int habit = chance.below(5);
+  if (habit > 1) return text;
+  const int distance = 'a' - 'A';
+  for (char& c : text) {
+    const auto code = static_cast<unsigned char>(c);
+    const bool is_small = (code >= 'a' && code <= 'z') || (code >= 0xE0 && code != 0xF7);
+    const bool is_capital = (code >= 'A' && code <= 'Z') || (code >= 0xC0 && code < 0xDF && code != 0xD7);
+    if (habit == 0 && is_small) c = static_cast<char>(code - distance);
+    if (habit == 1 && is_capital) c = static_cast<char>(code + distance);
+  }
+  return text;
+}
 
 /// Joins lines picked at random.
 std::string lines(Chance& chance, const Words& words, int count) {
@@ -124,9 +140,12 @@ std::string field(Chance& chance, const std::string& text) {
 }
 
 std::string row(Chance& chance, int id) {
-  const std::string suburb = chance.pick(suburbs);
-  Words fields{std::to_string(id), name(chance),     address(chance, suburb), suburb,          phone(chance),
-               amount(chance),     quantity(chance), notes(chance),           tag_list(chance)};
+  const std::string suburb = in_typed_case(chance, chance.pick(suburbs));
+  Words fields{std::to_string(id),      in_typed_case(chance, name(chance)),
+               address(chance, suburb), suburb,
+               phone(chance),           amount(chance),
+               quantity(chance),        notes(chance),
+               tag_list(chance)};
   // What an old record reader left behind the end of a name.
   if (chance.one_in(25)) fields[1] += "\0\0old"s;
   if (chance.one_in(40)) fields[3] += "\0"s;
