@@ -246,6 +246,30 @@ void counters_count_and_overflow(U* u) {
   check_equal(0, count, "CounterVerifyInt");
 }
 
+int timer_ticks = 0;
+int quitting_tick = 0;
+
+void CALLBACK count_tick(HWND, UINT, UINT_PTR, DWORD) {
+  if (++timer_ticks == quitting_tick) PostQuitMessage(7);
+}
+
+void passwords_let_messages_in(U* u) {
+  const UINT_PTR timer = SetTimer(nullptr, 0, USER_TIMER_MINIMUM, &count_tick);
+  for (int calls = 0; timer_ticks < 2 && calls < 10000; ++calls)
+    u->GenerateFilePassword(Short{100}, Short{2}, Short{0}, Text());
+  check(timer_ticks >= 2, "timer messages are handled between the draws");
+
+  // The mix that draws nothing: the call sleeps until the thread is asked to quit, which its own loop hears of too.
+  quitting_tick = timer_ticks + 3;
+  Text password;
+  check_equal(run_time_error(18), u->GenerateFilePassword(Short{2}, Short{2}, Short{5}, password), "asked to quit");
+  check_equal(L"TALUtil.ORVUtils: User interrupt occurred", error_text(), "asked to quit");
+  KillTimer(nullptr, timer);
+  MSG message{};
+  while (GetMessageW(&message, nullptr, 0, 0) > 0) DispatchMessageW(&message);
+  check_equal(7, static_cast<int>(message.wParam), "the exit code is kept for the host");
+}
+
 void interfaces_are_one_object(U* u) {
   const std::array<const IID*, 5> known{&IID_IDispatch, &IID__ORVUtils, &IID_ISupportErrorInfo, &IID_IProvideClassInfo,
                                         &IID_IUnknown};
@@ -402,6 +426,7 @@ int wmain(int, wchar_t** arguments) {
     lists_are_written_back(u);
     errors_have_number_and_text(u);
     counters_count_and_overflow(u);
+    passwords_let_messages_in(u);
     interfaces_are_one_object(u);
     walk_vtable(u, talutil::described<talutil::ORVUtils>);
     Pointer<_cControlPosition> position;

@@ -127,6 +127,45 @@ Sub Toolkit
   Check "StringReplaceWord", "a-c-", u.StringReplaceWord("aBBcBB", "BB", "-")
 End Sub
 
+Sub ChecksAndCase
+  Check "IsValueNumber", True, u.IsValueNumber("1.2.3")
+  Check "IsValueDate", False, u.IsValueDate("12/3/2024")
+  Check "IsValueDate with dashes", True, u.IsValueDate("15-11-2024")
+  Check "IsValueTime", False, u.IsValueTime("09:30:00")
+  Check "VerifyEmail", True, u.VerifyEmail("x@y.z")
+  Check "VerifyPasswordText", False, u.VerifyPasswordText("abc")
+  Check "NumbersInString", True, u.NumbersInString("Unit 4")
+  u.iCharactercase = 1
+  u.iCharacterCaseSuburbs = 2
+  Check "name case", "Siobh" & Chr(225) & "n O" & Chr(180) & "Neil-McCoy", _
+    u.ConvertCase(0, " SIOBH" & Chr(193) & "N o'NEIL-MCCOY ")
+  Check "a style that suburbs do not have", "st ives", u.ConvertCaseSuburbs("st ives")
+  Check "Null stays", True, IsNull(u.ConvertCase(0, Null))
+  u.iCharactercase = 3
+  Check "upper case", "AANDB", u.ConvertCase(0, "a&b")
+  Check "machinery", "Heavy machinery", u.ConvertCase(1, "Heavy machinery")
+  u.iCharactercase = 0
+End Sub
+
+Sub Secrets
+  Dim i, password
+  password = u.GenerateFilePassword(40, 2, 1)
+  Check "length of a password", 40, CInt(Len(password))
+  For i = 2 To 40
+    If Mid(password, i, 1) = Mid(password, i - 1, 1) Then Check "neighbours differ", "", password
+    If InStr("0123456789ABCDEF", Mid(password, i, 1)) = 0 Then Check "hexadecimal digits", "", password
+  Next
+  Check "an unknown mix", "", u.GenerateFilePassword(5, 7, 0)
+  Check "a negative length", "", u.GenerateFilePassword(-5, 0, 0)
+  Check "there and back", "a" & vbCrLf & Chr(0) & Chr(233), u.CryptoDecryptString(u.CryptoEncryptString("a" & vbCrLf & Chr(0) & Chr(233)))
+  Check "nothing to encrypt", "", u.CryptoEncryptString("")
+  On Error Resume Next
+  v = u.CryptoDecryptString("QUJD")
+  CheckError "a foreign cipher text", 5, "This is not a cipher text of this library, or it was changed"
+  v = u.GenerateFilePassword(32768, 0, 0)
+  CheckError "a length of 17 bits", 6, "Overflow"
+End Sub
+
 Sub ToolkitErrors
   On Error Resume Next
   v = u.StringReplace("a", "", "b")
@@ -182,6 +221,8 @@ Sanitising
 SanitisingErrors
 Toolkit
 ToolkitErrors
+ChecksAndCase
+Secrets
 WriteBack
 u.Terminate
 WScript.Echo passed & " passed, " & failed & " failed"

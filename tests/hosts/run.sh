@@ -73,6 +73,14 @@ pictures_pid=$!
 client window
 kill $pictures_pid || true
 run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'
+
+# A cipher text made on one side opens on the other.
+talutil=$talutil_build/asan/talutil
+secret="O´Neil, 5 €"
+rm -f "$talutil_build/cipher.txt"
+run cipher wine cscript.exe //nologo 'Z:\checkout\tests\hosts\cipher.vbs' "$("$talutil" encrypt <<<"$secret")" 'Z:\build\cipher.txt'
+expect_success "the command opens what the script host has encrypted" \
+  test "$(tr -d '\r' <"$talutil_build/cipher.txt" | "$talutil" decrypt)" = "$secret"
 expect_success "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"
 
 printf '%d passed, %d failed\n' "$passed" "$failed"
