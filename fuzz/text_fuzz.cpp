@@ -3,11 +3,10 @@
 
 #include <algorithm>
 #include <cstdint>
-#include <cstdio>
-#include <cstdlib>
 #include <vector>
 
 #include "automation/run_time_error.hpp"
+#include "fuzz/input.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "tests/fakes/fake_platform.hpp"
@@ -15,34 +14,7 @@
 namespace talutil {
 namespace {
 
-void require(bool holds, const char* what) {
-  if (holds) return;
-  std::fprintf(stderr, "broken: %s\n", what);
-  std::abort();
-}
-
-/// Reads choices and texts off the fuzzer's bytes. Half of the letters come from a few, so that words repeat
-/// and the special characters are met; the others are any code unit.
-class Input {
- public:
-  Input(const std::uint8_t* data, std::size_t size) : at_(data), end_(data + size) {}
-
-  std::uint8_t byte() { return at_ == end_ ? std::uint8_t{0} : *at_++; }
-
-  Text text(std::size_t longest) {
-    constexpr TextView common = u"aab ,&\"'\t#><?\r\n$*|\0\u2032\u0416\u00B4";
-    Text text;
-    for (std::size_t length = byte() % (longest + 1); length > 0 && at_ != end_; --length) {
-      const std::uint8_t choice = byte();
-      text += choice < 128 ? common[choice % common.size()] : static_cast<char16_t>(byte() << 8 | byte());
-    }
-    return text;
-  }
-
- private:
-  const std::uint8_t* at_;
-  const std::uint8_t* end_;
-};
+using fuzz::require;
 
 Text naive_replace_word(const Text& text, const Text& from, const Text& to) {
   Text result;
@@ -106,7 +78,7 @@ void check_list(ORVUtils& utils, const Text& text) {
   require(text.starts_with(joined) && text.find(u',', joined.size()) == Text::npos, "joined again, it is the text");
 }
 
-void check(Input input) {
+void check(fuzz::Input input) {
   testing::FakePlatform platform;
   Library library(platform.platform());
   ORVUtils utils(library);
@@ -142,6 +114,7 @@ void check(Input input) {
 }  // namespace talutil
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  talutil::check({data, size});
+  using namespace std::string_view_literals;
+  talutil::check({data, size, u"aab ,&\"'\t#><?\r\n$*|\0\u2032\u0416\u00B4"sv});
   return 0;
 }

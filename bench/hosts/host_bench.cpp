@@ -76,9 +76,8 @@ void compare_lives(const std::wstring& folder) {
 }
 
 template <class Call>
-double nanoseconds_of(Call&& call) {
+double nanoseconds_of(Call&& call, int calls = 20'000) {
   constexpr int repetitions = 15;
-  constexpr int calls = 20'000;
   std::vector<double> times;
   for (int i = 0; i < repetitions; ++i) {
     const double start = now_in_microseconds();
@@ -86,6 +85,19 @@ double nanoseconds_of(Call&& call) {
     times.push_back((now_in_microseconds() - start) * 1000 / calls);
   }
   return median(times);
+}
+
+void time_ciphers(_ORVUtils* u) {
+  Text plain(std::wstring(512, L'x').c_str());
+  Text cipher;
+  const double start = now_in_microseconds();
+  require(u->CryptoEncryptString(plain, cipher), "CryptoEncryptString");
+  std::printf("the first CryptoEncryptString, which derives the key: %.0f us\n", now_in_microseconds() - start);
+  const auto time = [&](const char* name, auto&& call) {
+    std::printf("%s of 1 KB, bound early: %.1f us (goal: below 50)\n", name, nanoseconds_of(call, 500) / 1000);
+  };
+  time("CryptoEncryptString", [&] { u->CryptoEncryptString(plain, Text()); });
+  time("CryptoDecryptString", [&] { u->CryptoDecryptString(cipher, Text()); });
 }
 
 void time_early_calls() {
@@ -100,6 +112,7 @@ void time_early_calls() {
                 u->StripNulls(text, &result);
                 SysFreeString(result);
               }));
+  time_ciphers(u);
   u->Terminate();
 }
 

@@ -53,6 +53,7 @@ inline constexpr Spelling spellings[] = {
     {u"Maciel"},
     {u"Mackay"},
     {u"Macken"},
+    {u"Mackenzie"},
     {u"Mackerel"},
     {u"Mackereth"},
     {u"Mackey"},

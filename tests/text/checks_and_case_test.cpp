@@ -99,9 +99,9 @@ TEST_F(ChecksAndCase, StylesOfNamesAndSuburbs) {
   const Variant o_neil(u" o'neil ");
   const struct {
     const char* name;
-    std::int16_t flag, style;
+    std::int32_t flag, style;
     Variant value, expected, suburb;
-    std::int16_t cleaned;
+    std::int32_t cleaned;
   } rows[] = {
       {"0 leaves", 1, 0, o_neil, o_neil, o_neil, 0},
       {"name case", 0, 1, o_neil, u"O\u00B4Neil", u"O\u00B4Neil", 2},
@@ -118,8 +118,8 @@ TEST_F(ChecksAndCase, StylesOfNamesAndSuburbs) {
   };
   for (const auto& row : rows) {
     library.settings().CounterVerifyText = 0;
-    library.settings().iCharactercase = library.settings().iCharacterCaseSuburbs = row.style;
-    EXPECT_EQ(utils.ConvertCase(row.flag, row.value), row.expected) << row.name;
+    library.settings().iCharactercase = library.settings().iCharacterCaseSuburbs = static_cast<std::int16_t>(row.style);
+    EXPECT_EQ(utils.ConvertCase(static_cast<std::int16_t>(row.flag), row.value), row.expected) << row.name;
     EXPECT_EQ(utils.ConvertCaseSuburbs(row.value), row.suburb) << row.name;
     EXPECT_EQ(library.settings().CounterVerifyText, row.cleaned) << row.name;
   }

@@ -1,0 +1,51 @@
+// What must hold for any cipher text: cipher_fuzz -max_len=512 -runs=1000000
+#include <optional>
+
+#include "automation/run_time_error.hpp"
+#include "fuzz/input.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "tests/fakes/fake_platform.hpp"
+
+namespace talutil {
+namespace {
+
+using fuzz::require;
+
+/// Nothing where it is refused, which must be with the one error there is.
+std::optional<Text> decrypted(ORVUtils& utils, const Text& cipher) {
+  try {
+    return utils.CryptoDecryptString(cipher);
+  } catch (const RunTimeError& error) {
+    require(error.number() == 5 && error.description().starts_with(u"This is not a cipher text"), "the one error");
+    return std::nullopt;
+  }
+}
+
+void check(fuzz::Input input) {
+  // One for all runs, as in a host: the key is derived once.
+  static testing::FakePlatform platform;
+  static Library library(platform.platform());
+  static ORVUtils utils(library);
+
+  const std::size_t place = input.byte() | input.byte() << 8;
+  const Text change = input.text(4);
+  const Text text = input.text(255);
+  require(text.empty() || !decrypted(utils, text), "a foreign text does not open");
+  if (text.empty()) return;
+
+  const Text cipher = utils.CryptoEncryptString(text);
+  require(decrypted(utils, cipher) == text, "what was encrypted comes back");
+  Text changed = cipher;
+  changed.replace(place % cipher.size(), change.size(), change);
+  require(changed == cipher || !decrypted(utils, changed), "a changed text does not open");
+  require(!decrypted(utils, cipher.substr(0, 1 + place % (cipher.size() - 1))), "a cut text does not open");
+}
+
+}  // namespace
+}  // namespace talutil
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+  talutil::check({data, size, u"AQABaz019+/= \r\n"});
+  return 0;
+}

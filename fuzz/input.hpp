@@ -1,0 +1,40 @@
+#pragma once
+
+#include <cstdint>
+#include <cstdio>
+#include <cstdlib>
+
+#include "automation/text.hpp"
+
+namespace talutil::fuzz {
+
+inline void require(bool holds, const char* what) {
+  if (holds) return;
+  std::fprintf(stderr, "broken: %s\n", what);
+  std::abort();
+}
+
+/// Reads choices and texts off the fuzzer's bytes. Half of the letters come from a few common ones, so that words
+/// repeat and the special characters are met; the others are any code unit.
+class Input {
+ public:
+  Input(const std::uint8_t* data, std::size_t size, TextView common) : at_(data), end_(data + size), common_(common) {}
+
+  std::uint8_t byte() { return at_ == end_ ? std::uint8_t{0} : *at_++; }
+
+  Text text(std::size_t longest) {
+    Text text;
+    for (std::size_t length = byte() % (longest + 1); length > 0 && at_ != end_; --length) {
+      const std::uint8_t choice = byte();
+      text += choice < 128 ? common_[choice % common_.size()] : static_cast<char16_t>(byte() << 8 | byte());
+    }
+    return text;
+  }
+
+ private:
+  const std::uint8_t* at_;
+  const std::uint8_t* end_;
+  TextView common_;
+};
+
+}  // namespace talutil::fuzz
