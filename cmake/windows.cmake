@@ -3,7 +3,15 @@ add_compile_definitions(UNICODE _UNICODE WINVER=0x0601 _WIN32_WINNT=0x0601)
 
 file(GLOB win32_sources CONFIGURE_DEPENDS src/platform/win32/*.cpp)
 add_library(talutil_platform STATIC ${win32_sources})
-target_link_libraries(talutil_platform PUBLIC talutil_core PRIVATE bcrypt)
+# The system's cryptography is loaded at its first use: most hosts never need it, and it is slow to load.
+find_program(dlltool i686-w64-mingw32-dlltool REQUIRED NO_CMAKE_FIND_ROOT_PATH)
+set(delayed_bcrypt ${CMAKE_BINARY_DIR}/libbcrypt_delayed.a)
+add_custom_command(OUTPUT ${delayed_bcrypt}
+  COMMAND ${dlltool} --kill-at --input-def ${CMAKE_SOURCE_DIR}/cmake/bcrypt.def --output-delaylib ${delayed_bcrypt}
+  DEPENDS cmake/bcrypt.def)
+add_custom_target(delayed_imports DEPENDS ${delayed_bcrypt})
+add_dependencies(talutil_platform delayed_imports)
+target_link_libraries(talutil_platform PUBLIC talutil_core PRIVATE ${delayed_bcrypt} delayimp)
 
 # The type library: the table is printed as IDL by a program of the building machine, compiled, and mended.
 # It refers to the platform's stdole2.tlb, which the compiler looks for in the folder below.

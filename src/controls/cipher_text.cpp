@@ -68,11 +68,10 @@ std::optional<Bytes> open(ByteView sealed, const Key& key, Cryptography& cryptog
 }
 
 Bytes to_bytes(TextView text) {
-  Bytes bytes;
-  bytes.reserve(2 * text.size());
-  for (const char16_t unit : text) {
-    bytes.push_back(static_cast<std::uint8_t>(unit));
-    bytes.push_back(static_cast<std::uint8_t>(unit >> 8));
+  Bytes bytes(2 * text.size());
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    bytes[2 * i] = static_cast<std::uint8_t>(text[i]);
+    bytes[2 * i + 1] = static_cast<std::uint8_t>(text[i] >> 8);
   }
   return bytes;
 }
@@ -85,13 +84,12 @@ std::optional<Text> to_text(ByteView bytes) {
 }
 
 Text encode(ByteView bytes) {
-  Text text;
-  text.reserve((bytes.size() + 2) / 3 * 4);
-  for (; !bytes.empty(); bytes = bytes.subspan(std::min<std::size_t>(3, bytes.size()))) {
-    const std::size_t count = std::min<std::size_t>(3, bytes.size());
+  Text text((bytes.size() + 2) / 3 * 4, padding);
+  for (std::size_t from = 0, to = 0; from < bytes.size(); from += 3, to += 4) {
+    const std::size_t count = std::min<std::size_t>(3, bytes.size() - from);
     std::uint32_t bits = 0;
-    for (std::size_t i = 0; i < 3; ++i) bits = bits << 8 | (i < count ? bytes[i] : 0U);
-    for (std::size_t i = 0; i < 4; ++i) text += i <= count ? alphabet[bits >> (18 - 6 * i) & 63] : padding;
+    for (std::size_t i = 0; i < 3; ++i) bits = bits << 8 | (i < count ? bytes[from + i] : 0U);
+    for (std::size_t i = 0; i <= count; ++i) text[to + i] = alphabet[bits >> (18 - 6 * i) & 63];
   }
   return text;
 }
@@ -102,8 +100,8 @@ std::optional<Bytes> decode(TextView text) {
   const std::size_t padded = text.size() - digits;
   if (padded > 2 || text.substr(digits) != TextView(u"==").substr(2 - padded)) return std::nullopt;
 
-  Bytes bytes;
-  bytes.reserve(digits * 3 / 4);
+  Bytes bytes(digits * 3 / 4);
+  auto next = bytes.begin();
   std::uint32_t bits = 0;
   std::uint32_t bit_count = 0;
   for (const char16_t unit : text.substr(0, digits)) {
@@ -113,7 +111,7 @@ std::optional<Bytes> decode(TextView text) {
     bit_count += 6;
     if (bit_count < 8) continue;
     bit_count -= 8;
-    bytes.push_back(static_cast<std::uint8_t>(bits >> bit_count));
+    *next++ = static_cast<std::uint8_t>(bits >> bit_count);
     bits &= (1U << bit_count) - 1;
   }
   // What the padding leaves of the last digit is zero in every text of ours.
