@@ -104,4 +104,22 @@ Text from_utf8(std::string_view bytes) {
   return out;
 }
 
+std::string to_utf16_bytes(TextView text) {
+  std::string bytes(2 * text.size(), '\0');
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    bytes[2 * i] = static_cast<char>(text[i]);
+    bytes[2 * i + 1] = static_cast<char>(text[i] >> 8);
+  }
+  return bytes;
+}
+
+Text from_utf16_bytes(std::string_view bytes) {
+  Text text(bytes.size() / 2, u'\0');
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    text[i] = static_cast<char16_t>(static_cast<unsigned char>(bytes[2 * i]) |
+                                    static_cast<unsigned char>(bytes[2 * i + 1]) << 8);
+  }
+  return text;
+}
+
 }  // namespace talutil

@@ -45,4 +45,8 @@ using TextView = std::u16string_view;
 [[nodiscard]] std::string to_utf8(TextView text);
 [[nodiscard]] Text from_utf8(std::string_view bytes);
 
+/// The code units of a text as bytes, low byte first, and back; an odd byte at the end does not count.
+[[nodiscard]] std::string to_utf16_bytes(TextView text);
+[[nodiscard]] Text from_utf16_bytes(std::string_view bytes);
+
 }  // namespace talutil

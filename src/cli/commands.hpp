@@ -48,4 +48,22 @@ struct PasswordOptions {
 };
 void password(const PasswordOptions& options);
 
+/// Where settings are: a profile file, or a group of the user's store.
+struct ConfigOptions {
+  std::string file;
+  std::string group = "user";
+  std::string database;
+  std::string user;
+  std::string section;
+  std::string item;
+  std::string value;
+  std::string profile;  ///< What export writes and import reads.
+  bool force = false;
+};
+void config_get(const ConfigOptions& options);
+void config_set(const ConfigOptions& options);
+void config_list(const ConfigOptions& options);
+void config_export(const ConfigOptions& options);
+void config_import(const ConfigOptions& options);
+
 }  // namespace talutil::cli

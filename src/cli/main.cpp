@@ -21,6 +21,7 @@ struct Request {
   CleanOptions clean;
   SecretOptions secret;
   PasswordOptions password;
+  ConfigOptions config;
   std::function<void()> run;
 };
 
@@ -106,6 +107,40 @@ void add_secrets(CLI::App& app, Request& request) {
   making->callback([&] { request.run = [&] { password(request.password); }; });
 }
 
+void add_config(CLI::App& app, Request& request) {
+  auto* const config =
+      app.add_subcommand("config", "Read and write settings: those of a profile file or the user's store");
+  config->require_subcommand(1);
+  ConfigOptions& options = request.config;
+  const auto add = [&](const char* name, const char* help, void (*work)(const ConfigOptions&)) {
+    auto* const command = config->add_subcommand(name, help);
+    command->add_option("--database", options.database, "The database of the settings (sDatabaseName)");
+    command->add_option("--user", options.user, "The user of the settings (sUserName)");
+    command->callback([&request, &options, work] { request.run = [&options, work] { work(options); }; });
+    return command;
+  };
+  const auto add_place = [&](CLI::App* command) {
+    command->add_option("--file", options.file, "A profile file in the place of the store");
+    command->add_option("--group", options.group, "The group of the store: user, database, previous or code")
+        ->capture_default_str();
+    return command;
+  };
+  auto* const get = add_place(add("get", "Print a setting", &config_get));
+  auto* const set = add_place(add("set", "Write a setting, the user's also into the database's group", &config_set));
+  for (CLI::App* const command : {get, set}) {
+    command->add_option("SECTION", options.section)->required();
+    command->add_option("ITEM", options.item)->required();
+  }
+  set->add_option("VALUE", options.value)->required();
+  add_place(add("list", "Print all settings, or those of a section", &config_list))
+      ->add_option("SECTION", options.section);
+  auto* const exporting = add("export", "Write a user's settings to a profile file", &config_export);
+  auto* const importing = add("import", "Read a user's settings from a file that export has written", &config_import);
+  exporting->add_flag("--force", options.force, "Replace the file where there is one");
+  importing->add_flag("--force", options.force, "Replace settings that differ");
+  for (CLI::App* const command : {exporting, importing}) command->add_option("FILE", options.profile)->required();
+}
+
 void add_printers(CLI::App& app, Request& request) {
   app.add_subcommand("idl", "Print the interface definition of the type library")->callback([&] {
     request.run = [] { std::cout << talutil::interface_definition(); };
@@ -145,6 +180,7 @@ int run(std::vector<std::string> words) {
   add_call(app, request);
   add_clean(app, request);
   add_secrets(app, request);
+  add_config(app, request);
   add_printers(app, request);
   if (!words.empty() && !words.front().starts_with('-')) check_subcommand(app, words.front());
   if (!words.empty() && words.front() == "call") request.call.arguments = take_verbatim(words);

@@ -14,8 +14,9 @@ class Session {
 
   [[nodiscard]] static const LateInterface& members() { return late_interface<ORVUtils>(); }
   [[nodiscard]] ORVUtils& utils() noexcept { return utils_; }
+  [[nodiscard]] posix::PosixPlatform& platform() noexcept { return platform_; }
   [[nodiscard]] Locale locale() const { return library_.locale(); }
-  [[nodiscard]] const SharedSettings& settings() noexcept { return library_.settings(); }
+  [[nodiscard]] SharedSettings& settings() noexcept { return library_.settings(); }
 
   /// Raises RunTimeError as the member does.
   Variant call(const Member& member, std::span<Argument> arguments) {

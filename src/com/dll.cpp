@@ -12,6 +12,7 @@
 #include "infoforms/frm_components.hpp"
 #include "platform/win32/win32_cryptography.hpp"
 #include "platform/win32/win32_platform.hpp"
+#include "platform/win32/win32_settings.hpp"
 
 namespace talutil::com {
 
@@ -28,8 +29,10 @@ struct LoadedLibrary {
   win32::Win32MessagePump message_pump;
   win32::Win32RandomSource random_source;
   win32::Win32Cryptography cryptography;
+  win32::Win32Profiles profiles;
+  win32::Win32SettingsStore settings_store;
   Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers, message_pump,
-                           random_source, cryptography}};
+                           random_source, cryptography, profiles, settings_store}};
 };
 
 struct Module {

@@ -68,19 +68,13 @@ std::optional<Bytes> open(ByteView sealed, const Key& key, Cryptography& cryptog
 }
 
 Bytes to_bytes(TextView text) {
-  Bytes bytes(2 * text.size());
-  for (std::size_t i = 0; i < text.size(); ++i) {
-    bytes[2 * i] = static_cast<std::uint8_t>(text[i]);
-    bytes[2 * i + 1] = static_cast<std::uint8_t>(text[i] >> 8);
-  }
-  return bytes;
+  const std::string bytes = to_utf16_bytes(text);
+  return {bytes.begin(), bytes.end()};
 }
 
 std::optional<Text> to_text(ByteView bytes) {
   if (bytes.size() % 2 != 0) return std::nullopt;
-  Text text(bytes.size() / 2, u'\0');
-  for (std::size_t i = 0; i < text.size(); ++i) text[i] = static_cast<char16_t>(bytes[2 * i] | bytes[2 * i + 1] << 8);
-  return text;
+  return from_utf16_bytes({reinterpret_cast<const char*>(bytes.data()), bytes.size()});
 }
 
 Text encode(ByteView bytes) {

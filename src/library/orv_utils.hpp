@@ -170,8 +170,23 @@ class ORVUtils {
   virtual Text ExtractPathName(Text& vSpecIn);
   virtual void SaveTextBox(const Text& sText, const Text& sFilename);
   virtual Text LoadTextBox(const Text& sFilename);
+
+  /// Reads a setting. With bLoadFromFile from the profile file sFilename: the value without one leading backslash, or
+  /// for an empty sItem the first name of the section; a value that then begins with two backslashes is empty. Where
+  /// there is none, sDefaultData, which is also saved into the user's store (not the file); "NoDefaultData" saves
+  /// nothing and gives an empty text.
+  ///
+  /// Without it from the user's store, sFilename selecting the group: sNatNameD and anything unknown the user's,
+  /// sORVDataName the database's (all but previous settings without a user), "PreviousDatabaseSettings" and "CodeCount"
+  /// their own. Where there is none, sDefaultData, which is saved; CodeCount gives an empty text. Raises what the store
+  /// raises.
   virtual Text GetCfgFileData(const Text& sSection, const Text& sItem, const Text& sDefaultData, const Text& sFilename,
                               const Boolean& bLoadFromFile);
+
+  /// Writes a setting. With bSaveToFile into the profile file sFilename, which fails without a word; an empty sOutput
+  /// and one that begins with a backslash are written as a single backslash, which is written back. Without it into the
+  /// user's store: the user's and the database's group, or only the one of "PreviousDatabaseSettings" or "CodeCount".
+  /// Raises what the store raises.
   virtual void SaveCfgFileData(const Text& sSection, const Text& sItem, Text& sOutput, const Text& sFilename,
                                const Boolean& bSaveToFile);
   virtual void CallZIPFiles(const Text& sZipName, const Text& sItems, const std::int16_t& iMultiVolume,

@@ -56,8 +56,6 @@ void ORVUtils::VerifyFilePath(const Text&) { not_built(); }
 Text ORVUtils::ExtractPathName(Text&) { not_built(); }
 void ORVUtils::SaveTextBox(const Text&, const Text&) { not_built(); }
 Text ORVUtils::LoadTextBox(const Text&) { not_built(); }
-Text ORVUtils::GetCfgFileData(const Text&, const Text&, const Text&, const Text&, const Boolean&) { not_built(); }
-void ORVUtils::SaveCfgFileData(const Text&, const Text&, Text&, const Text&, const Boolean&) { not_built(); }
 void ORVUtils::CallZIPFiles(const Text&, const Text&, const std::int16_t&, const Text&, const Boolean&) { not_built(); }
 void ORVUtils::CallUnZIPFiles(const Text&, const Text&, const Text&, const Boolean&) { not_built(); }
 Text ORVUtils::BrowseForFolder(const Text&) { not_built(); }

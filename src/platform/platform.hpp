@@ -8,6 +8,7 @@
 #include "automation/object.hpp"
 #include "automation/text.hpp"
 #include "platform/cryptography.hpp"
+#include "platform/settings.hpp"
 
 /// The seam between the core and the platform: one small interface a concern, so that a fake fits on a page.
 namespace talutil {
@@ -99,6 +100,8 @@ struct Platform {
   MessagePump& message_pump;
   RandomSource& random_source;
   Cryptography& cryptography;
+  Profiles& profiles;
+  SettingsStore& settings_store;
 };
 
 }  // namespace talutil

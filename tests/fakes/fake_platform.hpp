@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <deque>
+#include <functional>
 #include <map>
 #include <memory>
 #include <random>
@@ -10,6 +11,7 @@
 #include "automation/run_time_error.hpp"
 #include "library/library.hpp"
 #include "platform/platform.hpp"
+#include "tests/fakes/fake_settings.hpp"
 
 namespace talutil::testing {
 
@@ -50,13 +52,22 @@ struct FakePlatform final : MessageBoxes,
 
   std::int32_t quits_after_waits = 1;  ///< The wait that ends with the thread being asked to quit.
   std::mt19937 random{7};
+  std::function<void(std::span<std::uint8_t>)> random_bytes;  ///< In the place of the generator, where it is set.
   std::unique_ptr<Cryptography> cryptography = make_cryptography();  ///< The real one: it needs no machine.
+
+  std::map<Text, ProfileDocument> profile_files;
+  std::map<Text, Text> stored;  ///< By "application|section|key".
+
+  FakeProfiles profiles;
+  FakeSettingsStore settings_store;
 
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;
   FakePlatform& operator=(const FakePlatform&) = delete;
 
-  [[nodiscard]] Platform platform() { return {*this, *this, *this, *this, *this, *this, *this, *this, *cryptography}; }
+  [[nodiscard]] Platform platform() {
+    return {*this, *this, *this, *this, *this, *this, *this, *this, *cryptography, profiles, settings_store};
+  }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
     messages.push_back({Text(text), buttons, Text(title)});
@@ -84,6 +95,7 @@ struct FakePlatform final : MessageBoxes,
   bool wait_and_handle() override { return ++waits < quits_after_waits; }
 
   void fill(std::span<std::uint8_t> bytes) override {
+    if (random_bytes) return random_bytes(bytes);
     for (std::uint8_t& byte : bytes) byte = static_cast<std::uint8_t>(random());
   }
 

@@ -59,40 +59,27 @@ TEST_F(Passwords, AMillionDrawsOfEachMixAreAsLikelyAsTold) {
   }
 }
 
-/// Gives one number again and again, then others.
-struct ScriptedSource final : RandomSource {
-  void fill(std::span<std::uint8_t> bytes) override {
-    ++seeded;
-    for (std::size_t i = 0; i + 3 <= bytes.size(); i += 3) {
-      const std::uint32_t x = i < 3 * numbers.size() ? numbers[i / 3] : 0;
-      bytes[i] = static_cast<std::uint8_t>(x);
-      bytes[i + 1] = static_cast<std::uint8_t>(x >> 8);
-      bytes[i + 2] = static_cast<std::uint8_t>(x >> 16);
-    }
-  }
-  std::vector<std::uint32_t> numbers;  ///< In 2^-24
-  int seeded = 0;
-};
-
-TEST(PasswordDraws, HalvesRoundToEvenAndRepeatedDrawsAreDropped) {
+TEST_F(Passwords, HalvesRoundToEvenAndRepeatedDrawsAreDropped) {
   constexpr std::uint32_t one = 1U << 24;
-  ScriptedSource source;
-  FakePlatform fake;
-  const Platform parts = fake.platform();
-  Library library(Platform{parts.message_boxes, parts.screen, parts.computer, parts.clock, parts.form_windows,
-                           parts.control_makers, parts.message_pump, source, parts.cryptography});
-  ORVUtils utils(library);
-
+  std::vector<std::uint32_t> numbers;  // in 2^-24, then zeros
+  int seeded = 0;
+  platform.random_bytes = [&](std::span<std::uint8_t> bytes) {
+    ++seeded;
+    std::ranges::fill(bytes, std::uint8_t{0});
+    for (std::size_t i = 0; i < 3 * numbers.size(); ++i) {
+      bytes[i] = static_cast<std::uint8_t>(numbers[i / 3] >> (8 * (i % 3)));
+    }
+  };
   // The largest number below 1 is an end; x * 92 of 0.5, 1.5 and 2.5 go to 0, 2 and 2.
-  source.numbers = {one - 1, one - 1, 0, one / 184 + 1, 3 * (one / 184), 5 * (one / 184), one / 2};
+  numbers = {one - 1, one - 1, 0, one / 184 + 1, 3 * (one / 184), 5 * (one / 184), one / 2};
   EXPECT_EQ(utils.GenerateFilePassword(5, 2, 0), u"9ABCu");
   // The first draw of the table's mixes may not be its number 36.
-  source.numbers = {one / 82 * 36, one / 82 * 37};
+  numbers = {one / 82 * 36, one / 82 * 37};
   EXPECT_EQ(utils.GenerateFilePassword(1, 1, 0), u"l");
-  source.numbers = {one / 2, one / 4};  // x * 9 = 4.5 and 2.25
+  numbers = {one / 2, one / 4};  // x * 9 = 4.5 and 2.25
   EXPECT_EQ(utils.GenerateFilePassword(2, 0, 0), u"42");
-  EXPECT_EQ(source.seeded, 3) << "once a call";
-  EXPECT_EQ(fake.messages_handled, 7 + 2 + 2) << "before each draw";
+  EXPECT_EQ(seeded, 3) << "once a call";
+  EXPECT_EQ(platform.messages_handled, 7 + 2 + 2) << "before each draw";
 }
 
 TEST_F(Passwords, NothingToDraw) {

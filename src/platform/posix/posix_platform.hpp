@@ -2,6 +2,7 @@
 
 #include "platform/platform.hpp"
 #include "platform/posix/posix_cryptography.hpp"
+#include "platform/posix/posix_settings.hpp"
 
 namespace talutil::posix {
 
@@ -65,10 +66,13 @@ struct PosixPlatform {
   PosixMessagePump message_pump;
   PosixRandomSource random_source;
   PosixCryptography cryptography;
+  PosixProfiles profiles;
+  Hive hive{Hive::default_path()};
+  PosixSettingsStore settings_store{hive};
 
   [[nodiscard]] Platform platform() {
-    return {message_boxes,  screen,       computer,      clock,       form_windows,
-            control_makers, message_pump, random_source, cryptography};
+    return {message_boxes, screen,        computer,     clock,    form_windows,  control_makers,
+            message_pump,  random_source, cryptography, profiles, settings_store};
   }
 };
 

@@ -1,0 +1,173 @@
+#include <filesystem>
+#include <iostream>
+#include <optional>
+
+#include "cli/commands.hpp"
+#include "cli/escapes.hpp"
+#include "cli/failure.hpp"
+#include "cli/files.hpp"
+#include "cli/session.hpp"
+#include "platform/profile_document.hpp"
+#include "services/settings_groups.hpp"
+
+namespace talutil::cli {
+
+namespace {
+
+using Setting = posix::PosixSettingsStore::Setting;
+
+/// A session with the database and the user that the options name.
+class ConfigSession {
+ public:
+  explicit ConfigSession(const ConfigOptions& options) : options_(options) {
+    session_.settings().sDatabaseName = text(options.database, "--database");
+    session_.settings().sUserName = text(options.user, "--user");
+  }
+
+  [[nodiscard]] static Text text(const std::string& typed, const std::string& what) { return utf8_text(typed, what); }
+
+  /// The application name of the group that is asked for.
+  [[nodiscard]] Text group() {
+    const SharedSettings& settings = session_.settings();
+    if (options_.group == "previous") return Text(settings_groups::previous_database);
+    if (options_.group == "code") return Text(settings_groups::code_count);
+    if (options_.group != "user" && options_.group != "database") {
+      throw usage_failure("--group " + options_.group +
+                          ": there is no such group; there are user, database, previous and code");
+    }
+    if (options_.database.empty())
+      throw usage_failure("name the database: --database NAME, or a profile file: --file FILE");
+    if (options_.group == "database") return settings_groups::database(settings);
+    return user_group();
+  }
+
+  [[nodiscard]] Text user_group() {
+    if (options_.database.empty()) throw usage_failure("name the database: --database NAME");
+    if (options_.user.empty()) throw usage_failure("name the user: --user NAME");
+    return settings_groups::user(session_.settings());
+  }
+
+  [[nodiscard]] ORVUtils& utils() noexcept { return session_.utils(); }
+  [[nodiscard]] posix::PosixSettingsStore& store() noexcept { return session_.platform().settings_store; }
+  [[nodiscard]] const SharedSettings& settings() noexcept { return session_.settings(); }
+
+ private:
+  const ConfigOptions& options_;
+  Session session_;
+};
+
+std::string place_of(const ConfigOptions& options) {
+  return options.item + " in [" + options.section + "]" + (options.file.empty() ? "" : " of " + options.file);
+}
+
+void print_settings(const std::vector<Setting>& settings, const Text& only_section) {
+  std::optional<Text> section;
+  for (const Setting& each : settings) {
+    if (!only_section.empty() && !equals_without_case(each.section, only_section)) continue;
+    if (section != each.section) std::cout << '[' << to_utf8(escapes::write(each.section)) << "]\n";
+    section = each.section;
+    std::cout << to_utf8(escapes::write(each.key)) << '=' << to_utf8(escapes::write(each.value)) << '\n';
+  }
+}
+
+std::vector<Setting> settings_in(const std::string& profile) {
+  std::vector<Setting> settings;
+  for (ProfileDocument::Entry& entry : ProfileDocument(read_bytes(profile)).entries()) {
+    settings.push_back({std::move(entry.section), std::move(entry.item), std::move(entry.value)});
+  }
+  return settings;
+}
+
+}  // namespace
+
+void config_get(const ConfigOptions& options) {
+  ConfigSession session(options);
+  const Text section = ConfigSession::text(options.section, "SECTION");
+  const Text item = ConfigSession::text(options.item, "ITEM");
+  std::optional<Text> value;
+  if (options.file.empty()) {
+    value = session.store().value(session.group(), section, item);
+  } else {
+    const Text file = ConfigSession::text(options.file, "--file");
+    value = session.utils().GetCfgFileData(section, item, u"NoDefaultData", file, Boolean(true));
+    if (value->empty()) value.reset();  // an empty value of a file is a missing one
+  }
+  if (!value) throw run_time_failure("there is no " + place_of(options));
+  std::cout << to_utf8(*value) << '\n';
+}
+
+void config_set(const ConfigOptions& options) {
+  ConfigSession session(options);
+  const Text section = ConfigSession::text(options.section, "SECTION");
+  const Text item = ConfigSession::text(options.item, "ITEM");
+  const Text value = ConfigSession::text(options.value, "VALUE");
+  if (options.file.empty()) {
+    session.store().put(session.group(), section, item, value);
+    if (options.group == "user")
+      session.store().put(settings_groups::database(session.settings()), section, item, value);
+    return;
+  }
+  const Text file = ConfigSession::text(options.file, "--file");
+  Text written = value;
+  session.utils().SaveCfgFileData(section, item, written, file, Boolean(true));
+  if (written != value) {
+    std::cerr << "talutil: " << place_of(options)
+              << ": an empty value, and one that begins with a backslash, is read as a "
+              << "missing one\n";
+  }
+  // The platform tells nobody of a file that cannot be written.
+  if (session.utils().library().platform().profiles.value(file, section, item).empty()) {
+    throw run_time_failure("cannot write " + place_of(options));
+  }
+}
+
+void config_list(const ConfigOptions& options) {
+  ConfigSession session(options);
+  const Text section = ConfigSession::text(options.section, "SECTION");
+  print_settings(options.file.empty() ? session.store().settings_of(session.group()) : settings_in(options.file),
+                 section);
+}
+
+void config_export(const ConfigOptions& options) {
+  ConfigSession session(options);
+  const std::vector<Setting> settings = session.store().settings_of(session.user_group());
+  if (!options.force && std::filesystem::exists(options.profile)) {
+    throw run_time_failure(options.profile + " is there already; --force replaces it");
+  }
+  std::string bytes = "\xEF\xBB\xBF; Settings of a user; talutil config import reads them\r\n";
+  std::optional<Text> section;
+  for (const Setting& each : settings) {
+    if (section != each.section && !(each.section.empty() && !section)) {
+      bytes += '[' + to_utf8(escapes::write(each.section)) + "]\r\n";
+    }
+    section = each.section;
+    bytes += to_utf8(escapes::write(each.key)) + '=' + to_utf8(escapes::write(each.value)) + "\r\n";
+  }
+  write_bytes(options.profile, bytes);
+  std::cout << settings.size() << " settings written to " << options.profile << '\n';
+}
+
+void config_import(const ConfigOptions& options) {
+  ConfigSession session(options);
+  const Text group = session.user_group();
+  // All of the file is understood before anything is written.
+  std::vector<Setting> settings = within(options.profile, [&] { return settings_in(options.profile); });
+  within(options.profile, [&] {
+    for (Setting& each : settings) {
+      each = {escapes::read(each.section), escapes::read(each.key), escapes::read(each.value)};
+    }
+  });
+  std::size_t added = 0;
+  std::size_t same = 0;
+  std::size_t differing = 0;
+  for (const Setting& each : settings) {
+    const auto old = session.store().value(group, each.section, each.key);
+    ++(!old ? added : *old == each.value ? same : differing);
+    if (!old || (options.force && *old != each.value)) session.store().put(group, each.section, each.key, each.value);
+  }
+  std::cout << added << " settings added, " << same << " the same, " << differing
+            << (options.force ? " replaced" : " kept as they were") << '\n';
+  if (differing > 0 && !options.force) std::cerr << "talutil: --force replaces settings that differ\n";
+}
+
+}  // namespace talutil::cli

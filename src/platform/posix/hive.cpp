@@ -1,0 +1,151 @@
+#include "platform/posix/hive.hpp"
+
+#include <sqlite3.h>
+#include <stdlib.h>
+
+#include <filesystem>
+
+#include "automation/run_time_error.hpp"
+
+namespace talutil::posix {
+
+namespace {
+
+constexpr int longest_wait_in_milliseconds = 10'000;
+
+/// What keys and names are found by.
+std::string folded(TextView name) { return to_utf8(upper_case(name)); }
+
+std::string column_bytes(sqlite3_stmt* statement, int column) {
+  const void* const bytes = sqlite3_column_blob(statement, column);
+  return {static_cast<const char*>(bytes),
+          bytes == nullptr ? 0 : static_cast<std::size_t>(sqlite3_column_bytes(statement, column))};
+}
+
+Hive::Value column_value(sqlite3_stmt* statement, int column) {
+  return {static_cast<std::uint32_t>(sqlite3_column_int64(statement, column)), column_bytes(statement, column + 1)};
+}
+
+}  // namespace
+
+void Hive::Close::operator()(sqlite3* database) const noexcept { sqlite3_close(database); }
+
+void Hive::Finalize::operator()(sqlite3_stmt* statement) const noexcept { sqlite3_finalize(statement); }
+
+Hive::Hive(std::string path) : path_(std::move(path)) {}
+
+Hive::~Hive() = default;
+
+std::string Hive::default_path() {
+  const auto variable = [](const char* name) {
+    const char* const value = getenv(name);
+    return std::string(value == nullptr ? "" : value);
+  };
+  if (const std::string path = variable("TALUTIL_HIVE"); !path.empty()) return path;
+  const std::string data = variable("XDG_DATA_HOME");
+  return (data.empty() ? variable("HOME") + "/.local/share" : data) + "/talutil/hive.db";
+}
+
+void Hive::fail() const {
+  const char* const reason = database_ ? sqlite3_errmsg(database_.get()) : "there is no memory";
+  throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::device_io_error),
+                     u"Cannot use the settings in " + from_utf8(path_) + u": " + from_utf8(reason));
+}
+
+void Hive::require(int status, int expected) const {
+  if (status != expected) fail();
+}
+
+Hive::Statement Hive::prepare(const char* sql) const {
+  sqlite3_stmt* statement = nullptr;
+  require(sqlite3_prepare_v2(database_.get(), sql, -1, &statement, nullptr), SQLITE_OK);
+  return Statement(statement);
+}
+
+void Hive::bind(const Statement& statement, int place, std::string_view text) const {
+  require(sqlite3_bind_blob64(statement.get(), place, text.data(), text.size(), SQLITE_TRANSIENT), SQLITE_OK);
+}
+
+void Hive::open() {
+  if (database_) return;
+  std::error_code ignored;  // SQLite tells below that it cannot open the file.
+  std::filesystem::create_directories(std::filesystem::path(path_).parent_path(), ignored);
+  sqlite3* handle = nullptr;
+  const int status = sqlite3_open(path_.c_str(), &handle);
+  database_.reset(handle);
+  try {
+    require(status, SQLITE_OK);
+    sqlite3_busy_timeout(handle, longest_wait_in_milliseconds);
+    // With the log a reader never waits for a writer; what was written survives the process, if not a power cut.
+    constexpr const char* preparation = R"(
+        PRAGMA journal_mode = WAL;
+        PRAGMA synchronous = NORMAL;
+        CREATE TABLE IF NOT EXISTS hive_values (
+          folded_key BLOB, folded_name BLOB, key BLOB, name BLOB, type INTEGER, data BLOB,
+          PRIMARY KEY (folded_key, folded_name)) WITHOUT ROWID;)";
+    require(sqlite3_exec(handle, preparation, nullptr, nullptr, nullptr), SQLITE_OK);
+  } catch (...) {
+    database_.reset();
+    throw;
+  }
+}
+
+sqlite3_stmt* Hive::start(Statement& statement, const char* sql) {
+  open();
+  if (!statement) statement = prepare(sql);
+  sqlite3_reset(statement.get());
+  return statement.get();
+}
+
+std::optional<Hive::Value> Hive::value(TextView key, TextView name) {
+  sqlite3_stmt* const row =
+      start(select_, "SELECT type, data FROM hive_values WHERE folded_key = ?1 AND folded_name = ?2");
+  bind(select_, 1, folded(key));
+  bind(select_, 2, folded(name));
+  const int status = sqlite3_step(row);
+  std::optional<Value> result;
+  if (status == SQLITE_ROW)
+    result = column_value(row, 0);
+  else
+    require(status, SQLITE_DONE);
+  sqlite3_reset(row);
+  return result;
+}
+
+void Hive::put(TextView key, TextView name, const Value& value) {
+  sqlite3_stmt* const row = start(insert_,
+                                  "INSERT INTO hive_values VALUES (?1, ?2, ?3, ?4, ?5, ?6) "
+                                  "ON CONFLICT DO UPDATE SET type = ?5, data = ?6");
+  bind(insert_, 1, folded(key));
+  bind(insert_, 2, folded(name));
+  bind(insert_, 3, to_utf8(key));
+  bind(insert_, 4, to_utf8(name));
+  require(sqlite3_bind_int64(row, 5, value.type), SQLITE_OK);
+  bind(insert_, 6, value.data);
+  const int status = sqlite3_step(row);
+  // The reason goes with the reset, so it is told first.
+  require(status, SQLITE_DONE);
+  sqlite3_reset(row);
+}
+
+std::vector<Hive::NamedValue> Hive::values_below(TextView key) {
+  open();
+  // "]" is what follows "\".
+  const Statement statement = prepare(
+      "SELECT key, name, type, data FROM hive_values "
+      "WHERE folded_key = ?1 OR (folded_key >= ?2 AND folded_key < ?3) ORDER BY folded_key, folded_name");
+  const std::string whole = folded(key);
+  bind(statement, 1, whole);
+  bind(statement, 2, whole + '\\');
+  bind(statement, 3, whole + ']');
+  std::vector<NamedValue> values;
+  int status = SQLITE_DONE;
+  while ((status = sqlite3_step(statement.get())) == SQLITE_ROW) {
+    sqlite3_stmt* const row = statement.get();
+    values.push_back({from_utf8(column_bytes(row, 0)), from_utf8(column_bytes(row, 1)), column_value(row, 2)});
+  }
+  require(status, SQLITE_DONE);
+  return values;
+}
+
+}  // namespace talutil::posix

@@ -1,0 +1,94 @@
+#include "platform/win32/win32_settings.hpp"
+
+#include <array>
+#include <memory>
+#include <type_traits>
+
+#include "automation/numbers.hpp"
+#include "automation/run_time_error.hpp"
+#include "platform/win32/windows.hpp"
+
+namespace talutil::win32 {
+
+namespace {
+
+constexpr TextView settings_key = u"Software\\TALUtil\\Settings\\";
+
+/// What the profile functions put into a buffer of theirs; a null item lists the names.
+Text read_profile(const Text& file, const Text& section, const char* item) {
+  std::array<char, Profiles::longest_value + 1> buffer{};
+  const DWORD count = GetPrivateProfileStringA(to_ansi(section).c_str(), item, "", buffer.data(),
+                                               static_cast<DWORD>(buffer.size()), to_ansi(file).c_str());
+  return from_ansi({buffer.data(), count});
+}
+
+struct CloseKey {
+  void operator()(HKEY key) const noexcept { RegCloseKey(key); }
+};
+using Key = std::unique_ptr<std::remove_pointer_t<HKEY>, CloseKey>;
+
+Text path_of(const Text& application, const Text& section) {
+  const Text path = Text(settings_key) + application.c_str();
+  return section.empty() ? path : path + u'\\' + section.c_str();
+}
+
+void require(LSTATUS status, const Text& path) {
+  if (status == ERROR_SUCCESS) return;
+  throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::device_io_error),
+                     u"Cannot use the settings in HKEY_CURRENT_USER\\" + path + u": system error " +
+                         number_to_text(static_cast<std::int32_t>(status)));
+}
+
+/// Anything but success and a missing key or value is the host's to know.
+bool is_there(LSTATUS status, const Text& path) {
+  if (status == ERROR_FILE_NOT_FOUND || status == ERROR_PATH_NOT_FOUND) return false;
+  require(status, path);
+  return true;
+}
+
+}  // namespace
+
+Text Win32Profiles::value(const Text& file, const Text& section, const Text& item) {
+  return read_profile(file, section, to_ansi(item).c_str());
+}
+
+Text Win32Profiles::item_names(const Text& file, const Text& section) { return read_profile(file, section, nullptr); }
+
+void Win32Profiles::put(const Text& file, const Text& section, const Text& item, const Text& value) {
+  WritePrivateProfileStringA(to_ansi(section).c_str(), to_ansi(item).c_str(), to_ansi(value).c_str(),
+                             to_ansi(file).c_str());
+}
+
+std::optional<Text> Win32SettingsStore::value(const Text& application, const Text& section, const Text& key) {
+  const Text path = path_of(application, section);
+  HKEY handle = nullptr;
+  if (!is_there(RegOpenKeyExW(HKEY_CURRENT_USER, wide(path), 0, KEY_QUERY_VALUE, &handle), path)) return std::nullopt;
+  const Key opened(handle);
+  Text text;
+  DWORD type = 0;
+  DWORD bytes = 0;
+  LSTATUS status = RegQueryValueExW(handle, wide(key), nullptr, &type, nullptr, &bytes);
+  // Another process can make it longer between the two questions.
+  while (status == ERROR_SUCCESS || status == ERROR_MORE_DATA) {
+    text.resize((bytes + 1) / sizeof(char16_t));
+    bytes = static_cast<DWORD>(text.size() * sizeof(char16_t));
+    status = RegQueryValueExW(handle, wide(key), nullptr, &type, reinterpret_cast<BYTE*>(text.data()), &bytes);
+    if (status == ERROR_SUCCESS) break;
+  }
+  if (!is_there(status, path) || type != REG_SZ) return std::nullopt;
+  text.resize(bytes / sizeof(char16_t));
+  if (text.ends_with(u'\0')) text.pop_back();
+  return text;
+}
+
+void Win32SettingsStore::put(const Text& application, const Text& section, const Text& key, const Text& value) {
+  const Text path = path_of(application, section);
+  HKEY handle = nullptr;
+  require(RegCreateKeyExW(HKEY_CURRENT_USER, wide(path), 0, nullptr, 0, KEY_SET_VALUE, nullptr, &handle, nullptr),
+          path);
+  const Key opened(handle);
+  const auto bytes = static_cast<DWORD>((value.size() + 1) * sizeof(char16_t));
+  require(RegSetValueExW(handle, wide(key), 0, REG_SZ, reinterpret_cast<const BYTE*>(value.c_str()), bytes), path);
+}
+
+}  // namespace talutil::win32

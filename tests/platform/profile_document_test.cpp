@@ -1,0 +1,74 @@
+#include "platform/profile_document.hpp"
+
+#include <gtest/gtest.h>
+
+namespace talutil {
+namespace {
+
+using Names = std::vector<Text>;
+
+TEST(ProfileDocument, Reads) {
+  const struct {
+    const char* name;
+    std::string_view text;
+    Text section, item;
+    std::optional<Text> expected;
+  } rows[] = {
+      {"blanks and case do not count", "[ Ab ]\r\n x y\t=\t1 \r\n", u"aB", u" X Y ", u"1"},
+      {"the first section and item of a name", "[a]\nx=1\nx=2\n[a]\ny=3", u"a", u"x", u"1"},
+      {"a second section of the name", "[a]\nx=1\n[a]\ny=3", u"a", u"y", std::nullopt},
+      {"before all sections", "x=1\n[]\nx=2\n", u"", u"x", u"1"},
+      {"CR alone ends a line", "[a]\rx=1\ry=2", u"a", u"y", u"2"},
+      {"up to the last bracket", "[a]b]c\nx=1", u"a]b", u"x", u"1"},
+      {"a header without its end", "[a]\n[b\nx=1", u"a", u"x", u"1"},
+      {"no equals sign", "[a]\nx\n", u"a", u"x", std::nullopt},
+      {"a comment", "[a]\n ;x=1\nx=2", u"a", u";x", std::nullopt},
+      {"a second equals sign", "[a]\nx=y=z", u"a", u"x", u"y=z"},
+      {"double quotes", "[a]\nx= \" y \" \n", u"a", u"x", u" y "},
+      {"single quotes, one pair", "[a]\nx=''y''\n", u"a", u"x", u"'y'"},
+      {"quotes that differ", "[a]\nx='y\"\n", u"a", u"x", u"'y\""},
+      {"one quote", "[a]\nx=\"\n", u"a", u"x", u"\""},
+      {"the end-of-file mark is a blank",
+       "[a]\nx=\x1A"
+       "1\x1A\n",
+       u"a", u"x", u"1"},
+      {"a NUL ends a value", {"[a]\nx=1\0y\nz=2", 14}, u"a", u"x", u"1"},
+      {"code page 1252", "[a]\n\xE9=\x80", u"a", u"\u00C9", u"\u20AC"},
+      {"UTF-8 with its mark", "\xEF\xBB\xBF[a]\nx=\xC5\x82", u"a", u"x", u"\u0142"},
+      {"UTF-16 with its mark", {"\xFF\xFE[\0a\0]\0\n\0x\0=\0B\x01", 16}, u"a", u"x", u"\u0142"},
+  };
+  for (const auto& row : rows)
+    EXPECT_EQ(ProfileDocument(row.text).value(row.section, row.item), row.expected) << row.name;
+  const ProfileDocument names("t=0\n[b]\nx=1\n;c=2\ny\nz=\n=5\n[]\n[b]\n");
+  EXPECT_EQ(names.item_names(u"B"), (Names{u"x", u"z", u""}));
+  using Entry = ProfileDocument::Entry;
+  EXPECT_EQ(names.entries(),
+            (std::vector<Entry>{{u"", u"t", u"0"}, {u"b", u"x", u"1"}, {u"b", u"z", u""}, {u"b", u"", u"5"}}));
+}
+
+TEST(ProfileDocument, ChangesOneLine) {
+  const struct {
+    const char* name;
+    std::string_view before;
+    Text section, item, value;
+    std::string_view after;
+  } rows[] = {
+      {"in place, spelling and blanks kept", "; head\r\n[A]\r\n\r\nx = 1 ; c\r\ny=2", u"a", u"X", u"9",
+       "; head\r\n[A]\r\n\r\nx = 9\r\ny=2"},
+      {"an item without a value", "[a]\nx\ny=1", u"a", u"x", u"2", "[a]\nx=2\ny=1"},
+      {"after the last line of the section", "[a]\nx=1\n\n\n[b]\n", u"a", u"y", u" v ", "[a]\nx=1\r\ny=v \n\n\n[b]\n"},
+      {"into an empty section", "[a]", u"a", u"y", u"", "[a]\r\ny="},
+      {"a new section", "[a]\nx=1", u" b ", u" y ", u"2", "[a]\nx=1\r\n[b]\r\ny=2\r\n"},
+      {"a new file", "", u"a", u"x", u"1", "[a]\r\nx=1\r\n"},
+      {"before all sections", "[a]\n", u"", u"x", u"1", "x=1\r\n[a]\n"},
+      {"UTF-8 stays", "\xEF\xBB\xBF[a]\nx=1", u"a", u"x", u"\u0142", "\xEF\xBB\xBF[a]\nx=\xC5\x82"},
+  };
+  for (const auto& row : rows) {
+    ProfileDocument document(row.before);
+    document.put(row.section, row.item, row.value);
+    EXPECT_EQ(document.bytes(), row.after) << row.name;
+  }
+}
+
+}  // namespace
+}  // namespace talutil
