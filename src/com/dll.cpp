@@ -11,6 +11,7 @@
 #include "com/registration.hpp"
 #include "infoforms/frm_components.hpp"
 #include "platform/win32/win32_platform.hpp"
+#include "platform/win32/win32_time_conversions.hpp"
 
 namespace talutil::com {
 
@@ -24,7 +25,8 @@ struct LoadedLibrary {
   win32::Win32Clock clock;
   win32::Win32FormWindows form_windows;
   RegisteredControls control_makers;
-  Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers}};
+  win32::Win32TimeConversions time_conversions;
+  Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers, time_conversions}};
 };
 
 struct Module {

@@ -7,6 +7,7 @@
 #include "automation/locale.hpp"
 #include "automation/object.hpp"
 #include "automation/text.hpp"
+#include "platform/time_conversions.hpp"
 
 /// The seam between the core and the platform: one small interface a concern, so that a fake fits on a page.
 namespace talutil {
@@ -83,6 +84,7 @@ struct Platform {
   Clock& clock;
   FormWindows& form_windows;
   ControlMakers& control_makers;
+  TimeConversions& time_conversions;
 };
 
 }  // namespace talutil

@@ -14,7 +14,7 @@ namespace talutil::testing {
 
 /// A platform without a machine: it records what the library asks for and answers as the test says. Fields
 /// can be set at any time; the clock moves only when told. It must outlive the library that uses it.
-struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, ControlMakers {
+struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, ControlMakers, CalendarTimeConversions {
   struct Message {
     Text text;
     MessageButtons buttons = MessageButtons::ok;
@@ -35,6 +35,7 @@ struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, 
   Text computer_name = u"FAKEPC";
   Locale separators;
   Date current_time{40000.5};  ///< 6 July 2009, 12:00
+  std::int64_t utc_offset_minutes = 600;
   std::intptr_t window_handle = 0x1234;
   std::map<Text, ObjectRef> controls;  ///< Another maker's controls by class name; a null one fails with 429.
 
@@ -42,7 +43,7 @@ struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, 
   FakePlatform(const FakePlatform&) = delete;
   FakePlatform& operator=(const FakePlatform&) = delete;
 
-  [[nodiscard]] Platform platform() { return {*this, *this, *this, *this, *this, *this}; }
+  [[nodiscard]] Platform platform() { return {*this, *this, *this, *this, *this, *this, *this}; }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
     messages.push_back({Text(text), buttons, Text(title)});
@@ -57,6 +58,7 @@ struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, 
   Text name() override { return computer_name; }
   Locale locale() override { return separators; }
   Date now() override { return current_time; }
+  std::int64_t utc_offset_seconds() override { return utc_offset_minutes * 60; }
 
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override {
     window_captions.emplace_back(caption);

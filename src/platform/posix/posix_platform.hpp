@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/platform.hpp"
+#include "platform/posix/posix_time_conversions.hpp"
 
 namespace talutil::posix {
 
@@ -54,8 +55,11 @@ struct PosixPlatform {
   PosixClock clock;
   PosixFormWindows form_windows;
   PosixControlMakers control_makers;
+  PosixTimeConversions time_conversions;
 
-  [[nodiscard]] Platform platform() { return {message_boxes, screen, computer, clock, form_windows, control_makers}; }
+  [[nodiscard]] Platform platform() {
+    return {message_boxes, screen, computer, clock, form_windows, control_makers, time_conversions};
+  }
 };
 
 }  // namespace talutil::posix
