@@ -199,6 +199,46 @@ TEST_F(DateMembers, NegativeMinutesAreReportedInABox) {
 
 TEST_F(DateMembers, ADateWithoutAYearIsOfTheCurrentOne) { EXPECT_EQ(call(u"IncDay", u"5/3|0"), "05/03/2009"); }
 
+/// A host's object with some of the fields of a record.
+class FieldsObject final : public Object {
+ public:
+  std::map<Text, std::int16_t> fields;
+  std::vector<Text> puts;
+
+  std::int32_t member_id(TextView name) override {
+    const auto found = fields.find(Text(name));
+    if (found == fields.end()) raise(ErrorNumber::member_not_supported);
+    return static_cast<std::int32_t>(std::distance(fields.begin(), found)) + 1;
+  }
+  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
+    auto& [name, value] = *std::next(fields.begin(), member - 1);
+    if (access == Access::get) return value;
+    value = arguments[0].to_int16();
+    puts.push_back(name);
+    return {};
+  }
+};
+
+TEST_F(DateMembers, ObjectsStandForRecords) {
+  const auto object = std::make_shared<FieldsObject>();
+  object->fields = {{u"wYear", 2009}, {u"wMonth", 3},  {u"wDay", 31},   {u"wDayOfWeek", 77},
+                    {u"wHour", 9},    {u"wMinute", 0}, {u"wSecond", 0}, {u"wMilliseconds", 88}};
+  const LateInterface& members = late_interface<ORVUtils>();
+  const auto use = [&](TextView member, std::vector<Argument> arguments) {
+    members.call(&utils, members.slot_of(members.identifier_of(member), Access::call), arguments, Locale{});
+    return arguments;
+  };
+  const Variant holder = ObjectRef(object);
+  EXPECT_EQ(use(u"SystemTimeToDate", {holder, Variant()})[1].value.to_text(), u"31/03/2009 09:00");
+  const auto after = use(u"DateToSystemTime", {Variant(u"5/3/2009 13:00"), holder});
+  EXPECT_EQ(object->puts, (std::vector<Text>{u"wDay", u"wHour"}));
+  EXPECT_EQ(object->fields[u"wHour"], 13);
+  EXPECT_EQ(after[1].value, holder);
+  object->fields.erase(u"wSecond");
+  EXPECT_EQ(error_of([&] { use(u"DateToSystemTime", {Variant(u"6/4/2010"), holder}); }), 438);
+  EXPECT_EQ(error_of([&] { use(u"DateToSystemTime", {Variant(u"6/4/2010"), Variant()}); }), 13);
+}
+
 TEST_F(DateMembers, SystemTimes) {
   SystemTime time{.wDayOfWeek = 77, .wMilliseconds = 88};
   utils.DateToSystemTime({39877.5732638889}, time);
