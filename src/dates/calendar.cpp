@@ -13,6 +13,13 @@ constexpr TextView missing_date_text = u"01/01/1980";
 constexpr TextView missing_time_text = u"01:30";
 constexpr Date missing_date{29221};  ///< 1 January 1980.
 
+/// The parts of a date; nothing for a missing one.
+std::optional<DateParts> parts_if_given(const Variant& argument, const Locale& locale) {
+  const Variant value = argument.value();
+  if (is_missing_date(value, locale)) return {};
+  return parts_of(value.to_date(locale));
+}
+
 /// The value of an argument that is never refused: what has none counts as Null.
 Variant value_or_null(const Variant& argument) {
   try {
@@ -50,18 +57,18 @@ Text shown_date(std::int16_t mode, Date date, Clock& clock) {
 }  // namespace
 
 std::int16_t ORVUtils::GetYear(const Variant& vDate) {
-  if (is_missing_date(vDate, locale())) return 2000;
-  return static_cast<std::int16_t>(parts_of(vDate.to_date(locale())).year);
+  const auto parts = parts_if_given(vDate, locale());
+  return static_cast<std::int16_t>(parts ? parts->year : 2000);
 }
 
 std::int16_t ORVUtils::GetMonth(const Variant& vDate) {
-  if (is_missing_date(vDate, locale())) return 1;
-  return static_cast<std::int16_t>(parts_of(vDate.to_date(locale())).month);
+  const auto parts = parts_if_given(vDate, locale());
+  return static_cast<std::int16_t>(parts ? parts->month : 1);
 }
 
 std::int16_t ORVUtils::GetDay(const Variant& vDate) {
-  if (is_missing_date(vDate, locale())) return 1;
-  return static_cast<std::int16_t>(parts_of(vDate.to_date(locale())).day);
+  const auto parts = parts_if_given(vDate, locale());
+  return static_cast<std::int16_t>(parts ? parts->day : 1);
 }
 
 std::int16_t ORVUtils::GetDaysThisMonth(const std::int16_t& iMonth, const std::int16_t& iYear) {
@@ -95,8 +102,9 @@ Variant ORVUtils::VerifyNullTime(const std::int16_t& /*iFlag*/, const Variant& v
 
 Variant ORVUtils::VerifyNullDate(const std::int16_t& iFlag, Variant& vDate) {
   settings().CounterVerifyDate = checked_add(settings().CounterVerifyDate, 1);
-  if (is_text(value_or_null(vDate), u"00:00:00")) vDate = missing_date_text;
-  const auto date = date_if_any(value_or_null(vDate), locale());
+  Variant value = value_or_null(vDate);
+  if (is_text(value, u"00:00:00")) vDate = value = missing_date_text;
+  const auto date = date_if_any(value, locale());
   Text shown;
   if (date) shown = shown_date(iFlag, *date, library().platform().clock);
   if (iFlag == 1 && shown.empty()) shown = missing_date_text;

@@ -22,25 +22,23 @@ Text full_text(const Variant& value, const Locale& locale) {
   return value.to_text(locale);
 }
 
-/// Rewrites an argument that holds a bare time of day, as durations were stored once.
-void rewrite_legacy(Variant& argument, const Text& test_text, const Text& full_text) {
+/// The minutes of a stored duration. One of day 0 by its test text is a bare time of day, as durations were stored
+/// once: the argument is rewritten first.
+std::int32_t minutes_of(Variant& argument, Variant value, TextView test_text, const Locale& locale) {
   constexpr TextView day_zero = u"30/12/1899";
-  if (!test_text.starts_with(day_zero)) return;
   constexpr std::size_t time_length = 5;
-  const std::size_t tail = full_text.size() - std::min(full_text.size(), time_length);
-  argument = u"1/1/1800 " + full_text.substr(tail);
+  if (test_text.starts_with(day_zero)) {
+    const Text text = full_text(value, locale);
+    argument = value = u"1/1/1800 " + text.substr(text.size() - std::min(text.size(), time_length));
+  }
+  return date_difference(DateInterval::minute, epoch, value.to_date(locale));
 }
 
-std::int32_t minutes_since_epoch(const Variant& duration, const Locale& locale) {
-  return date_difference(DateInterval::minute, epoch, duration.to_date(locale));
-}
-
-/// Legacy durations are known here by their formatted text, texts without a day included.
-std::int32_t minutes_of(Variant& duration, const Locale& locale) {
-  const Variant value = duration.value();
+/// Where the value is formatted to be tested, texts without a day are of day 0 too.
+std::int32_t minutes_by_formatted_text(Variant& argument, const Locale& locale) {
+  const Variant value = argument.value();
   const Text test_text = format_date(formatted_date(value, locale), date_and_time_pattern);
-  rewrite_legacy(duration, test_text, full_text(value, locale));
-  return minutes_since_epoch(duration, locale);
+  return minutes_of(argument, value, test_text, locale);
 }
 
 /// The number before the first colon; 0 where there is none.
@@ -66,9 +64,8 @@ float decimal_hours(ORVUtils& utils, const Text& time) {
 }  // namespace
 
 Variant ORVUtils::DateTimeToDuration(Variant& vDate) {
-  const Text text = full_text(vDate.value(), locale());
-  rewrite_legacy(vDate, text, text);
-  const std::int32_t minutes = minutes_since_epoch(vDate, locale());
+  const Variant value = vDate.value();
+  const std::int32_t minutes = minutes_of(vDate, value, full_text(value, locale()), locale());
   return hours_and_minutes_text(minutes / 60, minutes % 60);
 }
 
@@ -107,7 +104,7 @@ Variant ORVUtils::DurToTime(Text& sDuration) {
 }
 
 Text ORVUtils::ConvertDatabaseDurationToNumber(Variant& vDuration) {
-  const std::int32_t minutes = minutes_of(vDuration, locale());
+  const std::int32_t minutes = minutes_by_formatted_text(vDuration, locale());
   float hours = decimal_hours(*this, hours_and_minutes_text(minutes / 60, minutes % 60));
   // More than a day has never been a job: it counts as an hour.
   if (hours > 24) hours = 1;
@@ -124,7 +121,9 @@ Variant ORVUtils::ConvertNumberToDatabaseDuration(const std::int16_t& iMinutes) 
   }
 }
 
-std::int32_t ORVUtils::ConvertDatabaseDurationToMinutes(Variant& vDuration) { return minutes_of(vDuration, locale()); }
+std::int32_t ORVUtils::ConvertDatabaseDurationToMinutes(Variant& vDuration) {
+  return minutes_by_formatted_text(vDuration, locale());
+}
 
 std::int32_t ORVUtils::ConvertTimeToMinutes(const Variant& vTime) {
   const DateParts time = parts_of(formatted_date(vTime, locale()));

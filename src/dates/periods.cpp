@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <cstdlib>
 
 #include "automation/checked.hpp"
@@ -8,17 +9,17 @@ namespace talutil {
 
 namespace {
 
-/// The interval between the days of two dates, whichever is the earlier, and what equal ones have instead.
-/// Empty texts count as -1.
-///
-/// The numbers are those of a walk from day to day up to the day after the later date, which 31 December 9999
-/// lacks: error 6.
+/// The boundaries of an interval between the days of two dates, whichever is the earlier; `when_equal` for the same
+/// day and -1 for an empty date. Raises 6 for 31 December 9999 and another day: the numbers are those of a walk up to
+/// the day after the later one.
 std::int32_t distance(DateInterval interval, const Variant& start, const Variant& end, std::int32_t when_equal,
                       const Locale& locale) {
-  const bool start_is_missing = start.equals_text(u"", locale);
-  if (end.equals_text(u"", locale) || start_is_missing) return -1;
-  const Date first = day_of(formatted_date(start, locale));
-  const Date last = day_of(formatted_date(end, locale));
+  const Variant start_value = start.value();
+  const Variant end_value = end.value();
+  const bool start_is_missing = start_value.equals_text(u"", locale);
+  if (end_value.equals_text(u"", locale) || start_is_missing) return -1;
+  const Date first = day_of(formatted_date(start_value, locale));
+  const Date last = day_of(formatted_date(end_value, locale));
   if (first == last) return when_equal;
   (void)to_date_checked(std::max(first.days, last.days) + 1);
   return std::abs(date_difference(interval, first, last));

@@ -128,9 +128,10 @@ Variant ORVUtils::IncYear(const Variant& vSrcDate, const std::int16_t& iNum) {
 
 Variant ORVUtils::GetNextDate(const Variant& vStartDate, const Variant& vStep, const Variant& vIncrement) {
   const std::int16_t count = vIncrement.to_int16(locale());
+  const Variant wanted = vStep.value();
   Variant date;
   for (const auto& [word, step] : step_words) {
-    if (vStep.equals_text(word, locale())) date = (this->*step)(vStartDate, count);
+    if (wanted.equals_text(word, locale())) date = (this->*step)(vStartDate, count);
   }
   // Empty, for a word that is none of these, formats as day 0.
   if (const auto* const text = date.get_if<Text>()) return reformatted(*text, date_pattern, locale());

@@ -43,8 +43,9 @@ void WeekTables::fill_ends(std::int16_t year, bool is_leap_calendar) {
 }
 
 std::int16_t ORVUtils::GetWeekNumber(const Variant& vDate) {
-  if (is_missing_date(vDate, locale())) return 1;
-  const std::int32_t days = day_of_year(formatted_date(vDate, locale()));
+  const Variant value = vDate.value();
+  if (is_missing_date(value, locale())) return 1;
+  const std::int32_t days = day_of_year(formatted_date(value, locale()));
   // The days after week 52 belong to it.
   return static_cast<std::int16_t>(std::min((days + days_in_week - 1) / days_in_week, WeekTables::last_week));
 }

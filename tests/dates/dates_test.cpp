@@ -1,5 +1,6 @@
 #include "tests/dates/late_members.hpp"
 #include "tests/fakes/error_of.hpp"
+#include "tests/text/recording_utils.hpp"
 
 namespace talutil::testing {
 namespace {
@@ -195,6 +196,15 @@ TEST_F(DateMembers, NegativeMinutesAreReportedInABox) {
   ASSERT_EQ(platform.messages.size(), 2U);
   EXPECT_EQ(platform.messages[0], (FakePlatform::Message{u"ORVUtils ConvertNumberToDatabaseDuration Type mismatch",
                                                          MessageButtons::ok, u""}));
+}
+
+TEST_F(DateMembers, DurationsUseTheObjectsTextMembers) {
+  RecordingUtils object(library);
+  object.ConvertDurationToNumber(u"-2:30");
+  Text hours = u".5";
+  object.DurToTime(hours);
+  EXPECT_EQ(object.calls,
+            (std::vector<Text>{u"StringReplace|-2:30|-|0", u"MyPos|:|02:30|1", u"MyPos|.|.5|1", u"MyPos|:|00:30|1"}));
 }
 
 TEST_F(DateMembers, ADateWithoutAYearIsOfTheCurrentOne) { EXPECT_EQ(call(u"IncDay", u"5/3|0"), "05/03/2009"); }
