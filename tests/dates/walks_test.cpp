@@ -115,7 +115,7 @@ TEST_F(Walks, DaysAndMonthsLater) {
   }
 }
 
-/// A calendar in which no month has 29 days.
+/// A calendar in which every month has twenty days.
 class ShortMonths final : public ORVUtils {
  public:
   using ORVUtils::ORVUtils;
