@@ -1,26 +1,13 @@
 // Times what a client waits for: loading the library, making an object and letting go of both, against one of the
 // platform's own objects; and a call bound early.
-#include <algorithm>
 #include <cstdio>
 
 #include "client.hpp"
+#include "timing.hpp"
 
 using namespace talutil::hosts;
 
 namespace {
-
-double now_in_microseconds() {
-  LARGE_INTEGER count;
-  LARGE_INTEGER frequency;
-  QueryPerformanceCounter(&count);
-  QueryPerformanceFrequency(&frequency);
-  return static_cast<double>(count.QuadPart) * 1e6 / static_cast<double>(frequency.QuadPart);
-}
-
-double median(std::vector<double> values) {
-  std::ranges::sort(values);
-  return values[values.size() / 2];
-}
 
 template <class Function>
 Function function_of(HMODULE module, const char* name) {
@@ -73,18 +60,6 @@ void compare_lives(const std::wstring& folder) {
   std::printf(
       "load, create, release, unload: TALUtil %.0f us, FileSystemObject %.0f us, ratio %.2f (goal: at most 1.00)\n",
       median(ours), median(theirs), median(ratios));
-}
-
-template <class Call>
-double nanoseconds_of(Call&& call, int calls = 20'000) {
-  constexpr int repetitions = 15;
-  std::vector<double> times;
-  for (int i = 0; i < repetitions; ++i) {
-    const double start = now_in_microseconds();
-    for (int j = 0; j < calls; ++j) call();
-    times.push_back((now_in_microseconds() - start) * 1000 / calls);
-  }
-  return median(times);
 }
 
 void time_ciphers(_ORVUtils* u) {

@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# The figures of the Windows side: run.sh [NAME OF THE FOLDER BELOW build]. Needs the windows preset and its target
-# host_bench to be built.
+# The figures of the Windows side: run.sh [NAME OF THE FOLDER BELOW build]. Needs the windows preset and its targets
+# host_bench and dates_host_bench to be built.
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 . "$talutil_top/tests/hosts/screen.sh"
@@ -11,4 +11,5 @@ start_screen
 wine regsvr32.exe /s "Z:\\build\\$folder\\TALUtil.dll" 2>/dev/null
 wine cscript.exe //nologo 'Z:\checkout\bench\hosts\call.vbs' 2>/dev/null
 wine "Z:\\build\\$folder\\bench\\hosts\\host_bench.exe" "Z:\\build\\$folder" 2>/dev/null
+wine "Z:\\build\\$folder\\bench\\hosts\\dates_host_bench.exe" 2>/dev/null
 wine regsvr32.exe /s /u "Z:\\build\\$folder\\TALUtil.dll" 2>/dev/null

@@ -194,11 +194,6 @@ Day reading_with_month(const Elements& elements, std::int32_t current_year) {
   return is_year_first ? Day{b, month, a} : Day{a, month, b};
 }
 
-constexpr std::int32_t full_year(std::int32_t year) noexcept {
-  if (year >= first_full_year) return year;
-  return year < 30 ? 2000 + year : 1900 + year;
-}
-
 bool is_day(const Day& day) {
   return date_from_parts({.year = full_year(day.year), .month = day.month, .day = day.day}).has_value();
 }
@@ -223,10 +218,53 @@ bool read_date(Reader& reader, std::int32_t current_year, DateParts& parts) {
   return is_day(chosen);
 }
 
-void append_number(Text& text, std::int32_t number, std::int32_t digits) {
-  for (std::int32_t place = digits == 4 ? 1000 : 10; place > 0; place /= 10) {
-    text += static_cast<char16_t>(u'0' + number / place % 10);
+/// The last digits of a number, at least as many as asked for; with 1, all there are of a number below 100.
+void append_number(Text& text, std::int32_t number, std::size_t digits) {
+  std::int32_t place = digits >= 3 ? 1000 : 10;
+  if (digits == 1 && number < 10) place = 1;
+  for (; place > 0; place /= 10) text += static_cast<char16_t>(u'0' + number / place % 10);
+}
+
+/// The part that a letter of a pattern stands for; nothing for other characters.
+std::optional<std::int32_t> part_for(char16_t letter, const DateParts& parts, bool is_after_hour) {
+  switch (letter) {
+    case u'd':
+      return parts.day;
+    case u'm':
+      return is_after_hour ? parts.minute : parts.month;
+    case u'y':
+      return parts.year;
+    case u'h':
+      return parts.hour;
+    case u'n':
+      return parts.minute;
+    case u's':
+      return parts.second;
+    default:
+      return {};
   }
+}
+
+constexpr char16_t lower(char16_t unit) noexcept {
+  return unit >= u'A' && unit <= u'Z' ? static_cast<char16_t>(unit + 0x20) : unit;
+}
+
+Text format_parts(const DateParts& parts, TextView pattern) {
+  Text text;
+  bool is_after_hour = false;
+  while (!pattern.empty()) {
+    const char16_t letter = lower(pattern.front());
+    const auto run_end = std::ranges::find_if(pattern, [letter](char16_t unit) { return lower(unit) != letter; });
+    const auto count = static_cast<std::size_t>(run_end - pattern.begin());
+    if (const auto part = part_for(letter, parts, is_after_hour)) {
+      append_number(text, *part, count);
+      is_after_hour = letter == u'h';
+    } else {
+      text += pattern.substr(0, count);
+    }
+    pattern.remove_prefix(count);
+  }
+  return text;
 }
 
 }  // namespace
@@ -251,24 +289,12 @@ Text date_to_text(Date date) {
   const DateParts day_zero;
   const bool is_day_zero = parts.year == day_zero.year && parts.month == day_zero.month && parts.day == day_zero.day;
   const bool is_midnight = parts.hour == 0 && parts.minute == 0 && parts.second == 0;
-  Text text;
-  if (!is_day_zero) {
-    append_number(text, parts.day, 2);
-    text += u'/';
-    append_number(text, parts.month, 2);
-    text += u'/';
-    append_number(text, parts.year, 4);
-    if (is_midnight) return text;
-    text += u' ';
-  }
-  append_number(text, parts.hour, 2);
-  text += u':';
-  append_number(text, parts.minute, 2);
-  if (parts.second != 0) {
-    text += u':';
-    append_number(text, parts.second, 2);
-  }
+  if (is_midnight && !is_day_zero) return format_parts(parts, u"DD/MM/YYYY");
+  Text text = format_parts(parts, is_day_zero ? u"HH:MM" : u"DD/MM/YYYY HH:MM");
+  if (parts.second != 0) text += format_parts(parts, u":SS");
   return text;
 }
+
+Text format_date(Date date, TextView pattern) { return format_parts(parts_of(date), pattern); }
 
 }  // namespace talutil

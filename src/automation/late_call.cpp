@@ -55,6 +55,38 @@ ObjectRef convert(const Variant& value, const Locale& /*locale*/) {
   raise(ErrorNumber::type_mismatch);
 }
 
+namespace {
+
+constexpr struct {
+  TextView name;
+  std::int16_t SystemTime::*field;
+} record_fields[] = {
+    {u"wYear", &SystemTime::wYear},           {u"wMonth", &SystemTime::wMonth},
+    {u"wDayOfWeek", &SystemTime::wDayOfWeek}, {u"wDay", &SystemTime::wDay},
+    {u"wHour", &SystemTime::wHour},           {u"wMinute", &SystemTime::wMinute},
+    {u"wSecond", &SystemTime::wSecond},       {u"wMilliseconds", &SystemTime::wMilliseconds},
+};
+
+}  // namespace
+
+template <>
+SystemTime convert(const Variant& value, const Locale& /*locale*/) {
+  if (const auto* const record = value.get_if<SystemTime>()) return *record;
+  if (!value.is(Variant::Kind::object)) raise(ErrorNumber::type_mismatch);
+  const Control object(value);
+  SystemTime time;
+  for (const auto& [name, field] : record_fields) time.*field = object.get<std::int16_t>(name);
+  return time;
+}
+
+void detail::put_changed_fields(const Variant& holder, const SystemTime& before, const SystemTime& after) {
+  if (!holder.is(Variant::Kind::object)) return;
+  const Control object(holder);
+  for (const auto& [name, field] : record_fields) {
+    if (after.*field != before.*field) object.put(name, after.*field);
+  }
+}
+
 Variant Parameter::default_value() const {
   switch (type) {
     case ValueType::boolean:

@@ -50,7 +50,15 @@ TextArray convert(const Variant& value, const Locale& locale);
 template <>
 ObjectRef convert(const Variant& value, const Locale& locale);
 
+/// A record, or an object with the fields of one, read in their order. Raises 13 for anything else, 91 for an empty
+/// reference and 438 for an object that lacks a field.
+template <>
+SystemTime convert(const Variant& value, const Locale& locale);
+
 namespace detail {
+
+/// Puts the fields that differ to an object that stands for a record; nothing for a record itself.
+void put_changed_fields(const Variant& holder, const SystemTime& before, const SystemTime& after);
 
 /// One parameter during a call: the argument's own value where its type fits, else a converted copy.
 template <class A>
@@ -58,6 +66,7 @@ class Cell {
  public:
   using T = std::remove_cvref_t<A>;
   static constexpr bool is_written_back = passing<A>() == Passing::written_back;
+  static constexpr bool is_record = is_written_back && std::is_same_v<T, SystemTime>;
 
   void bind(Argument& argument, const Locale& locale) {
     argument_ = &argument;
@@ -72,10 +81,16 @@ class Cell {
     if constexpr (is_written_back) before_ = *used_;
   }
 
+  /// An object that stands for a record gets what the member wrote while errors can still be told.
+  void give_back() {
+    if constexpr (is_record) put_changed_fields(argument_->value, before_, *used_);
+  }
+
   /// What the member wrote is kept however it ended.
   ~Cell() {
     if constexpr (is_written_back) {
       if (used_ == nullptr || *used_ == before_) return;
+      if (is_record && used_ == &converted_) return;
       argument_->is_changed = true;
       if constexpr (!std::is_same_v<T, Variant>) {
         if (used_ == &converted_) argument_->value = Variant(std::move(converted_));
@@ -103,6 +118,24 @@ Class& part_of(Target& target) {
     return target.settings();
 }
 
+/// Calls a member; records in objects get what it wrote, also if it fails.
+template <class Use, class... A>
+Variant use_cells(const Use& use, Cell<A>&... cell) {
+  if constexpr ((Cell<A>::is_record || ...)) {
+    Variant result;
+    try {
+      result = use();
+    } catch (...) {
+      (cell.give_back(), ...);
+      throw;
+    }
+    (cell.give_back(), ...);
+    return result;
+  } else {
+    return use();
+  }
+}
+
 template <class Target, auto M>
 Variant late_method(void* target, std::span<Argument> arguments, const Locale& locale) {
   using Traits = MemberTraits<M>;
@@ -113,12 +146,16 @@ Variant late_method(void* target, std::span<Argument> arguments, const Locale& l
         [&](Cell<A>&... cell) -> Variant {
           std::size_t next = 0;
           (cell.bind(arguments[next++], locale), ...);
-          if constexpr (std::is_void_v<typename Traits::Result>) {
-            (object.*M)(cell.value()...);
-            return {};
-          } else {
-            return (object.*M)(cell.value()...);
-          }
+          return use_cells(
+              [&]() -> Variant {
+                if constexpr (std::is_void_v<typename Traits::Result>) {
+                  (object.*M)(cell.value()...);
+                  return {};
+                } else {
+                  return (object.*M)(cell.value()...);
+                }
+              },
+              cell...);
         },
         cells);
   });

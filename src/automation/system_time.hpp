@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 
 namespace talutil {
 
@@ -16,5 +17,16 @@ struct SystemTime {
   std::int16_t wMilliseconds = 0;
   friend constexpr bool operator==(const SystemTime&, const SystemTime&) noexcept = default;
 };
+
+/// A point in time: intervals of 100 nanoseconds since 1 January 1601.
+using FileTime = std::int64_t;
+
+constexpr FileTime file_time_second = 10'000'000;
+
+/// Empty for parts that name no time and for years outside 1601 to 30827. `wDayOfWeek` does not count.
+[[nodiscard]] std::optional<FileTime> system_to_file_time(const SystemTime& time) noexcept;
+
+/// Empty for a negative time.
+[[nodiscard]] std::optional<SystemTime> file_to_system_time(FileTime time) noexcept;
 
 }  // namespace talutil

@@ -11,6 +11,7 @@
 #include "automation/locale.hpp"
 #include "automation/numbers.hpp"
 #include "automation/object.hpp"
+#include "automation/system_time.hpp"
 #include "automation/text.hpp"
 
 namespace talutil {
@@ -64,6 +65,7 @@ class Variant {
     date,
     text,
     error,
+    system_time,
     text_array,
     foreign_array,
     object
@@ -83,6 +85,7 @@ class Variant {
   Variant(TextView value) : storage_(Text(value)) {}
   Variant(const char16_t* value) : storage_(Text(value)) {}
   Variant(ErrorValue value) noexcept : storage_(value) {}
+  Variant(SystemTime value) noexcept : storage_(value) {}
   Variant(TextArray value) noexcept : storage_(std::move(value)) {}
   Variant(ForeignArray value) noexcept : storage_(value) {}
   Variant(ObjectRef value) noexcept : storage_(std::move(value)) {}
@@ -137,7 +140,7 @@ class Variant {
  private:
   // In the order of Kind.
   std::variant<std::monostate, Null, Boolean, std::uint8_t, std::int16_t, std::int32_t, float, double, Currency, Date,
-               Text, ErrorValue, TextArray, ForeignArray, ObjectRef>
+               Text, ErrorValue, SystemTime, TextArray, ForeignArray, ObjectRef>
       storage_;
 };
 

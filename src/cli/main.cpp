@@ -59,7 +59,8 @@ void add_call(CLI::App& app, Request& request) {
   command->add_flag("--json", request.call.json, "Print {\"result\": ..., \"arguments\": {...}}");
   command->footer("Arguments are texts as typed, and become what the parameter wants. For what a text cannot say:\n" +
                   written_forms_help() +
-                  "\n\"--\" ends the options: what follows is an argument even if it is --json.");
+                  "\n\"--\" ends the options: what follows is an argument even if it is --json.\n"
+                  "Dates are typed and printed day first: talutil call IncMonth 31/03/2009 -1");
   command->callback([&, command] {
     const auto arguments = command->remaining();
     request.call.arguments.insert(request.call.arguments.begin(), arguments.begin(), arguments.end());

@@ -13,6 +13,7 @@
 #include "platform/win32/win32_cryptography.hpp"
 #include "platform/win32/win32_platform.hpp"
 #include "platform/win32/win32_settings.hpp"
+#include "platform/win32/win32_time_conversions.hpp"
 
 namespace talutil::com {
 
@@ -31,8 +32,9 @@ struct LoadedLibrary {
   win32::Win32Cryptography cryptography;
   win32::Win32Profiles profiles;
   win32::Win32SettingsStore settings_store;
+  win32::Win32TimeConversions time_conversions;
   Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers, message_pump,
-                           random_source, cryptography, profiles, settings_store}};
+                           random_source, cryptography, profiles, settings_store, time_conversions}};
 };
 
 struct Module {

@@ -58,6 +58,11 @@ Variant argument_value(const Parameter& parameter, const VARIANT& given, const L
 class WriteBack {
  public:
   WriteBack(const VARIANT& target, const Variant& value, const Locale& locale) {
+    if (const auto* const time = value.get_if<SystemTime>()) {
+      record_ = system_time_of(resolved(target));
+      time_ = *time;
+      if (record_ != nullptr) return;
+    }
     if (V_VT(&target) == (VT_BYREF | VT_VARIANT)) {
       variable_ = const_cast<VARIANT*>(&resolved(target));
       if ((V_VT(variable_) & VT_BYREF) == 0) {
@@ -72,7 +77,9 @@ class WriteBack {
   }
 
   void store() noexcept {
-    if ((V_VT(variable_) & VT_BYREF) == 0) {
+    if (record_ != nullptr) {
+      *record_ = time_;
+    } else if ((V_VT(variable_) & VT_BYREF) == 0) {
       std::swap(*variable_, native_.get());
     } else if ((V_VT(variable_) & VT_ARRAY) != 0) {
       std::swap(*V_ARRAYREF(variable_), V_ARRAY(&native_.get()));
@@ -139,6 +146,8 @@ class WriteBack {
 
   VARIANT* variable_ = nullptr;
   OwnedVariant native_;
+  SystemTime* record_ = nullptr;  ///< The caller's, where it is a record that was written.
+  SystemTime time_;
 };
 
 /// One call: its arguments, and the way back of what the member wrote.
@@ -164,7 +173,8 @@ class Call {
     for (std::size_t i = 0; i < placement_.count; ++i) {
       if (!arguments_[i].is_changed || placement_.argument[i] < 0) continue;
       const VARIANT& target = invocation_.parameters->rgvarg[placement_.argument[i]];
-      if ((V_VT(&target) & VT_BYREF) != 0) changes[i].emplace(target, arguments_[i].value, locale_);
+      const bool is_written = (V_VT(&target) & VT_BYREF) != 0 || system_time_of(target) != nullptr;
+      if (is_written) changes[i].emplace(target, arguments_[i].value, locale_);
     }
     for (auto& change : changes) {
       if (change) change->store();

@@ -4,6 +4,8 @@
 
 #include "automation/run_time_error.hpp"
 #include "com/dispatch_object.hpp"
+#include "com/module.hpp"
+#include "library/identity.hpp"
 
 namespace talutil::com {
 
@@ -136,6 +138,8 @@ void put(VARIANT& out, const ObjectRef& value) {
   V_DISPATCH(&out) = dispatch_from(value);
   V_VT(&out) = VT_DISPATCH;
 }
+// Records go back into the caller's own; a variable that holds none cannot take one.
+void put(VARIANT&, const SystemTime&) { raise(ErrorNumber::type_mismatch); }
 void put(VARIANT&, ForeignArray) { raise(ErrorNumber::type_mismatch); }
 
 }  // namespace
@@ -194,6 +198,14 @@ void require_resizable(const SAFEARRAY* array) {
   if (is_fixed || array->cLocks != 0) raise(ErrorNumber::array_fixed_or_locked);
 }
 
+SystemTime* system_time_of(const VARIANT& value) noexcept {
+  if ((V_VT(&value) & VT_TYPEMASK) != VT_RECORD || (V_VT(&value) & VT_ARRAY) != 0) return nullptr;
+  constexpr GUID ours = guid_of(identity::system_time_record);
+  GUID id{};
+  if (V_RECORDINFO(&value) == nullptr || FAILED(V_RECORDINFO(&value)->GetGuid(&id)) || id != ours) return nullptr;
+  return static_cast<SystemTime*>(V_RECORD(&value));
+}
+
 const VARIANT& resolved(const VARIANT& value) {
   const VARIANT* at = &value;
   // A reference may lead to a variant that is a reference again, but honest callers stop after one or two.
@@ -216,6 +228,11 @@ Variant variant_from(const VARIANT& value) {
   }
   if (type == VT_EMPTY) return {};
   if (type == VT_NULL) return Null{};
+  if (type == VT_RECORD) {
+    SystemTime* const record = system_time_of(source);
+    if (record == nullptr) raise(ErrorNumber::type_mismatch);
+    return *record;
+  }
   if (by_reference) return simple_value(type, V_BYREF(&source));
   // A decimal takes the whole of the VARIANT, every other type its data field.
   return simple_value(type, type == VT_DECIMAL ? static_cast<const void*>(&source) : &V_I8(&source));

@@ -90,6 +90,10 @@ void require_resizable(const SAFEARRAY* array);
 
 [[nodiscard]] OwnedVariant native_from(const Variant& value, ArrayStyle style);
 
+/// The library's record of that type in a VARIANT, by value or by reference: the caller's own, which is read and
+/// written where it lies. A null pointer for anything else.
+[[nodiscard]] SystemTime* system_time_of(const VARIANT& value) noexcept;
+
 /// The end of a chain of references to variants.
 [[nodiscard]] const VARIANT& resolved(const VARIANT& value);
 

@@ -3,6 +3,7 @@
 #include <memory>
 
 #include "automation/locale.hpp"
+#include "dates/week_tables.hpp"
 #include "library/shared_settings.hpp"
 #include "platform/platform.hpp"
 
@@ -24,6 +25,7 @@ class Library {
   void start();
 
   [[nodiscard]] SharedSettings& settings() noexcept { return settings_; }
+  [[nodiscard]] WeekTables& week_tables() noexcept { return week_tables_; }
   [[nodiscard]] const Platform& platform() const noexcept { return platform_; }
   [[nodiscard]] FrmComponents& components() noexcept { return *components_; }
   [[nodiscard]] ControlFactory& controls() noexcept { return *controls_; }
@@ -34,6 +36,7 @@ class Library {
  private:
   Platform platform_;
   SharedSettings settings_;
+  WeekTables week_tables_;
   Locale locale_;
   std::unique_ptr<ControlFactory> controls_;
   std::unique_ptr<FrmComponents> components_;

@@ -54,8 +54,17 @@ class ORVUtils {
   /// Raises 5 for an empty sChr, unless sSrc is empty.
   virtual Text StringReplace(const Text& sSrc, const Text& sChr, const Text& sReplace);
 
+  /// The date with another day of the month, as text "DD/MM/YYYY". A day that the month lacks leaves the text as it
+  /// is put together: "31/2/2009". Raises 13 for what is no date, 94 for Null.
   virtual Variant SetDayOfMonth(const Variant& vDate, const std::int16_t& iDayNumber);
+
+  /// The financial year (1 July to 30 June) of a date, two digits a year: 15/08/2009 gives "0910". The century does
+  /// not wrap: 01/07/1999 gives "99100" and 01/03/2000 "-100". Raises 13 for what is no date.
   virtual Text GetFinancialYearStr(const Variant& vDate);
+
+  /// True when vFromDate is on or before the date that WeekYearToDate gives for the week with iDay 0, or vToDate on
+  /// or after it; so False only for a range that runs backwards around it. An iWeek outside 1 to 52 is written back
+  /// as the nearest of these. Raises 13 for what is no date, 94 for Null.
   virtual Boolean GetWeekInDateRange(const Variant& vFromDate, const Variant& vToDate, std::int16_t& iWeek,
                                      const std::int16_t& iYear);
 
@@ -64,10 +73,30 @@ class ORVUtils {
   /// end with a comma. Raises 5 when the iEn-th comma does not come after the iSt-th.
   virtual Text GetData(const Text& sSrcStr, const std::int32_t& iSt, const std::int32_t& iEn);
 
+  /// A time of day as text "HH:MM"; "01:30" for what is no date or time, in every mode of iFlag. Adds 1 to
+  /// CounterVerifyTime first; raises 6 when that is at its maximum, and nothing else.
   virtual Variant VerifyNullTime(const std::int16_t& iFlag, const Variant& vTime);
+
+  /// A date as the screens show it, a text; the date 01/01/1980, not a text, for what is no date, for that day's
+  /// midnight and for all before. During that day the text is empty but in modes 1 to 3.
+  /// @param iFlag 1 shows 01/01/1980 during that day, 2 shows "DD/MM/YYYY HH:MM", 3 shows the current date and time
+  /// during that day, 4 shows "DDMMYYYY", any other "DD/MM/YYYY"
+  /// @param vDate the text "00:00:00" is written back as "01/01/1980"
+  /// Adds 1 to CounterVerifyDate first; raises 6 when that is at its maximum, and nothing else.
   virtual Variant VerifyNullDate(const std::int16_t& iFlag, Variant& vDate);
+
+  /// The week of a date: days 1 to 7 of the year are week 1, and all after week 51 is week 52. Null and empty give
+  /// 1. Raises 13 for what is no date.
   virtual std::int16_t GetWeekNumber(const Variant& vDate);
+
+  /// A date of a week, the weeks laid out by the calendar of the current year (common or leap), whatever iYear is.
+  /// @param iWeek 1 to 52; the nearest of these is written back for others
+  /// @param iDay 1 gives the first day and 2 the last (of week 52, 31 December), as dates; 0 gives the first day of the
+  /// week after, as text "DD/MM/YYYY", by the calendar of iYear; any other gives Empty
+  /// Raises 13 for a year that is none.
   virtual Variant WeekYearToDate(std::int16_t& iWeek, const std::int16_t& iYear, const std::int16_t& iDay);
+
+  /// The parts of a date; 2000, 1 and 1 for Null and for an empty text. Raise 13 for what is no date.
   virtual std::int16_t GetYear(const Variant& vDate);
   virtual std::int16_t GetMonth(const Variant& vDate);
   virtual std::int16_t GetDay(const Variant& vDate);
@@ -92,6 +121,7 @@ class ORVUtils {
   /// How often the one-character sSubStr stands in sSrcStr; 0 for a sSubStr of any other length.
   virtual std::int32_t SubStrCount(const Text& sSubStr, const Text& sSrcStr);
 
+  /// The days of a month, 28 to 31; 28 when month or year is 0. Raises 9 for a month outside 1 to 12.
   virtual std::int16_t GetDaysThisMonth(const std::int16_t& iMonth, const std::int16_t& iYear);
 
   /// Splits sTemp at each one-character sDelimiter into sFList, with indexes from 0, and gives the number of
@@ -125,15 +155,47 @@ class ORVUtils {
   /// Pads with "0" up to iExpLength characters: before the text with iJustify -1, after it with 1, else not.
   virtual Text AddZeros(const Text& sText, const std::int16_t& iExpLength, const std::int16_t& iJustify);
 
+  /// The hours and minutes from one date and time to another, as text "1:30", both negative for a time before:
+  /// "-1:-30". Days count only where the text of the end date comes after that of the start date: 31/01/2024 to
+  /// 01/02/2024 counts none. The dates are written back as "DD/MM/YYYY" and the times as "HH:MM", in the order of the
+  /// arguments as far as they can be read. Raises 13 for what is no date or time, 6 beyond 32 bits of minutes.
   virtual Variant GetTimeDifference(Variant& vStDate, Variant& vEnDate, Variant& vStTime, Variant& vEnTime);
+
+  /// The date so many years later, as text "DD/MM/YYYY"; 29 February becomes the 28th in common years. A year below
+  /// 100 comes out as the one it is short for, and one beyond 9999 as text that no longer is a date. Raises 13 for
+  /// what is no date, 6 for a year beyond 16 bits.
   virtual Variant IncYear(const Variant& vSrcDate, const std::int16_t& iNum);
+
+  /// The days between two dates, times of day left out, whichever is the earlier; -1 when either is empty. Raises 13
+  /// for what is no date, Null included, and 6 when one of two different dates is 31/12/9999.
   virtual std::int32_t GetDaysInPeriod(const Variant& vStartDate, const Variant& vEndDate);
+
+  /// The month boundaries between two dates, whichever is the earlier; -1 for equal dates and when either is empty.
+  /// Raises what GetDaysInPeriod raises.
   virtual std::int32_t GetMonthsInPeriod(const Variant& vStartDate, const Variant& vEndDate);
+
+  /// The date so many days later, as text "DD/MM/YYYY"; years as in IncYear. Raises 13 for what is no date, 6 for
+  /// -32768 days.
   virtual Variant IncDay(const Variant& vSrcDate, const std::int16_t& iNum);
+
+  /// The day of a date with the time of day sTime, as text "DD/MM/YYYY HH:MM"; a time that the date had is replaced.
+  /// Raises 13 for what is no date or time.
   virtual Variant AddTimeToDate(const Variant& vSrcDate, const Text& sTime);
+
+  /// IncDay by seven times iNum, which raises 6 beyond -4681 to 4681.
   virtual Variant IncWeek(const Variant& vSrcDate, const std::int16_t& iNum);
+
+  /// The date so many months later, as text "DD/MM/YYYY", on the same day of the month or its last: 31 March less a
+  /// month is 28 February. Raises 13 for what is no date, 6 for -32768 months.
   virtual Variant IncMonth(const Variant& vSrcDate, const std::int16_t& iNum);
+
+  /// The date one step of a repeat later, as text "DD/MM/YYYY".
+  /// @param vStep "Years" or "Yearly", "Months" or "Monthly", "Weeks" or "Weekly", "Days" or "Daily", case included;
+  /// any other word gives "30/12/1899"
+  /// @param vIncrement the number of years, months and so on, as a 16-bit integer
+  /// Raises what the Inc member of the word raises, and 6, 13 or 94 for an increment that is no such number.
   virtual Variant GetNextDate(const Variant& vStartDate, const Variant& vStep, const Variant& vIncrement);
+
   virtual void DrawShellExecuteError(const std::int32_t& lRetVal);
   virtual Boolean CheckDeleteRecord();
   virtual Boolean CheckModifyDatabase(const Text& sCaption);
@@ -214,18 +276,43 @@ class ORVUtils {
   virtual void SaveGridWidths(const Variant& Grid1, const Text& sCFGStr, const std::int16_t& iStartColumn);
   virtual void ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontSaveHeader, const Boolean& bSelection,
                               const Text& sFilename);
+
+  /// A date typed as eight digits DDMMYYYY, years 1900 to 2100, as text "DD/MM/YYYY"; an empty text for all else.
   virtual Variant GetDateFromString(const Text& sText);
 
   /// True when every character is a digit or a capital A to Z; so for an empty text.
   virtual Boolean VerifyPasswordText(const Text& sPassword);
 
+  /// A stored duration (a date that much later than 1/1/1800 00:00) as text "hours:minutes", shortest numbers: "1:30",
+  /// "26:0". A bare time of day, as durations were stored once, is written back as "1/1/1800 HH:MM"; a text is one
+  /// when it begins with "30/12/1899". Raises 13 for what is no date, 94 for Null, 6 beyond 32 bits of minutes.
   virtual Variant DateTimeToDuration(Variant& vDate);
+
+  /// A duration given as a time of day ("1:30") as it is stored: 01/01/1800 01:30. Raises 13 for what is no time of
+  /// day, so for 24 hours and more.
   virtual Variant DurationToDateTime(const Variant& vDuration);
+
+  /// A time of day as decimal hours; minutes other than 15, 30 and 45 count as none, and 0 hours become 1.5. "-" is
+  /// read as "0". What is no time gives 0.
   virtual float ConvertDurationToNumber(const Variant& vT);
+
+  /// Decimal hours as text ("1.5", ".25") as a stored duration. The fractions 5, 25 and 75 are quarters of an hour,
+  /// any other is minutes: "1.50" is 1 hour 50. The text is written back without blanks at its ends. Raises 13 for
+  /// what gives no time of day.
   virtual Variant DurToTime(Text& sDuration);
+
+  /// A stored duration as decimal hours in text ("0.25"); minutes other than 15, 30 and 45 count as none, 0 becomes
+  /// "1.5" and more than 24 hours "1". A bare time of day is written back as "1/1/1800 HH:MM". Raises 13 for what is
+  /// no date, 6 beyond 32 bits of minutes.
   virtual Text ConvertDatabaseDurationToNumber(Variant& vDuration);
+
+  /// Minutes, 0 to 1439, as a stored duration. Others are reported in a message box and give the text
+  /// "1/1/1800 00:00".
   virtual Variant ConvertNumberToDatabaseDuration(const std::int16_t& iMinutes);
+
+  /// A stored duration in minutes. Writes back and raises what ConvertDatabaseDurationToNumber does.
   virtual std::int32_t ConvertDatabaseDurationToMinutes(Variant& vDuration);
+
   virtual void ShowSysInfo();
   virtual void DeleteFiles(const Text& sFileSpec);
   virtual Boolean PingSite(const Text& sAddress);
@@ -260,6 +347,8 @@ class ORVUtils {
   virtual Text MyInputBox(const Text& sCaption, const Text& sPrompt, const Boolean& bPassword,
                           const Boolean& bShowUserInput, const Boolean& bNoFrame, const Boolean& bNonCloseable,
                           const std::int32_t& lBackColor);
+
+  /// The minutes of a time of day since midnight. Raises 13 for what is no date or time.
   virtual std::int32_t ConvertTimeToMinutes(const Variant& vTime);
 
   /// True when sSourceString is one of the fields of sDestString that a one-character sDelimiter closes; the
@@ -270,8 +359,17 @@ class ORVUtils {
   virtual Boolean PathExists(Text sDirectory);
   virtual void SetupFileFolders();
   virtual Text GetNewGuid();
+
+  /// Writes year to second of a date into a record; wDayOfWeek and wMilliseconds stay. Raises 6 for a date out of
+  /// range.
   virtual void DateToSystemTime(Date the_date, SystemTime& system_time);
+
+  /// Writes the date of a record to the_date. Parts may lie beyond their range: month 13 is the next January, day 0
+  /// the last day of the month before. Years 0 to 99 are 1930 to 2029. Raises 5 where that gives no date.
   virtual void SystemTimeToDate(const SystemTime& system_time, Date& the_date);
+
+  /// A local time as UTC and back, to the second, by the zone's offset of today whatever the date: summers and
+  /// winters are not told apart. Times before 1601 are beyond the conversion.
   virtual Date LocalTimeToUTC(Date the_date);
   virtual Date UTCToLocalTime(Date the_date);
 

@@ -12,33 +12,11 @@ namespace {
 
 }  // namespace
 
-Variant ORVUtils::SetDayOfMonth(const Variant&, const std::int16_t&) { not_built(); }
-Text ORVUtils::GetFinancialYearStr(const Variant&) { not_built(); }
-Boolean ORVUtils::GetWeekInDateRange(const Variant&, const Variant&, std::int16_t&, const std::int16_t&) {
-  not_built();
-}
-Variant ORVUtils::VerifyNullTime(const std::int16_t&, const Variant&) { not_built(); }
-Variant ORVUtils::VerifyNullDate(const std::int16_t&, Variant&) { not_built(); }
-std::int16_t ORVUtils::GetWeekNumber(const Variant&) { not_built(); }
-Variant ORVUtils::WeekYearToDate(std::int16_t&, const std::int16_t&, const std::int16_t&) { not_built(); }
-std::int16_t ORVUtils::GetYear(const Variant&) { not_built(); }
-std::int16_t ORVUtils::GetMonth(const Variant&) { not_built(); }
-std::int16_t ORVUtils::GetDay(const Variant&) { not_built(); }
 Boolean ORVUtils::GetMousePos(const Variant&, const Variant&, const Variant&, const Variant&, const Variant&,
                               const Variant&) {
   not_built();
 }
 std::int32_t ORVUtils::GetMaxPages(const std::int32_t&, const std::int32_t&) { not_built(); }
-std::int16_t ORVUtils::GetDaysThisMonth(const std::int16_t&, const std::int16_t&) { not_built(); }
-Variant ORVUtils::GetTimeDifference(Variant&, Variant&, Variant&, Variant&) { not_built(); }
-Variant ORVUtils::IncYear(const Variant&, const std::int16_t&) { not_built(); }
-std::int32_t ORVUtils::GetDaysInPeriod(const Variant&, const Variant&) { not_built(); }
-std::int32_t ORVUtils::GetMonthsInPeriod(const Variant&, const Variant&) { not_built(); }
-Variant ORVUtils::IncDay(const Variant&, const std::int16_t&) { not_built(); }
-Variant ORVUtils::AddTimeToDate(const Variant&, const Text&) { not_built(); }
-Variant ORVUtils::IncWeek(const Variant&, const std::int16_t&) { not_built(); }
-Variant ORVUtils::IncMonth(const Variant&, const std::int16_t&) { not_built(); }
-Variant ORVUtils::GetNextDate(const Variant&, const Variant&, const Variant&) { not_built(); }
 void ORVUtils::DrawShellExecuteError(const std::int32_t&) { not_built(); }
 Boolean ORVUtils::CheckDeleteRecord() { not_built(); }
 Boolean ORVUtils::CheckModifyDatabase(const Text&) { not_built(); }
@@ -83,14 +61,6 @@ std::int32_t ORVUtils::SearchComboEx(const Variant&, const Text&, const std::int
 void ORVUtils::LoadGridWidths(const Variant&, const Text&, const std::int16_t&) { not_built(); }
 void ORVUtils::SaveGridWidths(const Variant&, const Text&, const std::int16_t&) { not_built(); }
 void ORVUtils::ExportGridData(const Variant&, const std::int16_t&, const Boolean&, const Text&) { not_built(); }
-Variant ORVUtils::GetDateFromString(const Text&) { not_built(); }
-Variant ORVUtils::DateTimeToDuration(Variant&) { not_built(); }
-Variant ORVUtils::DurationToDateTime(const Variant&) { not_built(); }
-float ORVUtils::ConvertDurationToNumber(const Variant&) { not_built(); }
-Variant ORVUtils::DurToTime(Text&) { not_built(); }
-Text ORVUtils::ConvertDatabaseDurationToNumber(Variant&) { not_built(); }
-Variant ORVUtils::ConvertNumberToDatabaseDuration(const std::int16_t&) { not_built(); }
-std::int32_t ORVUtils::ConvertDatabaseDurationToMinutes(Variant&) { not_built(); }
 void ORVUtils::ShowSysInfo() { not_built(); }
 void ORVUtils::DeleteFiles(const Text&) { not_built(); }
 Boolean ORVUtils::PingSite(const Text&) { not_built(); }
@@ -105,15 +75,10 @@ Text ORVUtils::MyInputBox(const Text&, const Text&, const Boolean&, const Boolea
                           const std::int32_t&) {
   not_built();
 }
-std::int32_t ORVUtils::ConvertTimeToMinutes(const Variant&) { not_built(); }
 void ORVUtils::PrintScreen(const Variant&) { not_built(); }
 Boolean ORVUtils::PathExists(Text) { not_built(); }
 void ORVUtils::SetupFileFolders() { not_built(); }
 Text ORVUtils::GetNewGuid() { not_built(); }
-void ORVUtils::DateToSystemTime(Date, SystemTime&) { not_built(); }
-void ORVUtils::SystemTimeToDate(const SystemTime&, Date&) { not_built(); }
-Date ORVUtils::LocalTimeToUTC(Date) { not_built(); }
-Date ORVUtils::UTCToLocalTime(Date) { not_built(); }
 Variant ORVUtils::GetIpAddrTable() { not_built(); }
 
 }  // namespace talutil

@@ -9,6 +9,7 @@
 #include "automation/text.hpp"
 #include "platform/cryptography.hpp"
 #include "platform/settings.hpp"
+#include "platform/time_conversions.hpp"
 
 /// The seam between the core and the platform: one small interface a concern, so that a fake fits on a page.
 namespace talutil {
@@ -102,6 +103,7 @@ struct Platform {
   Cryptography& cryptography;
   Profiles& profiles;
   SettingsStore& settings_store;
+  TimeConversions& time_conversions;
 };
 
 }  // namespace talutil

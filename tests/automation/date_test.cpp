@@ -81,6 +81,43 @@ TEST(Date, TextToDate) {
   EXPECT_TRUE(text_to_date(u"29/2", 2012));
 }
 
+TEST(Date, Intervals) {
+  using enum DateInterval;
+  const struct {
+    const char* name;
+    DateInterval interval;
+    std::int32_t count;
+    TextView from;
+    const char* added;
+    TextView to;
+    std::int32_t boundaries;
+  } rows[] = {
+      {"seconds across day 0", second, -1, u"30/12/1899", "29/12/1899 23:59:59", u"29/12/1899 23:59:58", -2},
+      {"minutes", minute, 90, u"1/1/1800", "01/01/1800 01:30", u"1/1/1800 1:30:59", 90},
+      {"hours before day 0", hour, -26, u"2/1/1800 1:30", "31/12/1799 23:30", u"1/1/1800 23:59", -2},
+      {"days keep the time", day, 1, u"29/12/1899 18:00", "18:00", u"31/12/1899 0:00", 2},
+      {"a month's last day", month, 1, u"31/1/2008 13:45", "29/02/2008 13:45", u"1/3/2007", -10},
+      {"years", year, -1, u"29/2/2008", "28/02/2007", u"1/1/1899", -109},
+  };
+  for (const auto& row : rows) {
+    const Date from = Variant(row.from).to_date();
+    EXPECT_EQ(outcome([&] { return date_add(row.interval, row.count, from); }), row.added) << row.name;
+    EXPECT_EQ(date_difference(row.interval, from, Variant(row.to).to_date()), row.boundaries) << row.name;
+  }
+  EXPECT_EQ(outcome([] { return date_add(day, 1, Date{2958465}); }), "error 5");
+  EXPECT_EQ(outcome([] { return date_add(month, -1, Date{-657434}); }), "error 5");
+  EXPECT_EQ(outcome([] { return date_add(year, 2147483647, Date{}); }), "error 5");
+  EXPECT_EQ(outcome([] { return date_difference(second, Date{0}, Date{40000}); }), "error 6");
+  EXPECT_TRUE(std::is_lt(compare_dates({-1.25}, {-1.75})));
+  EXPECT_EQ(day_of_year({36525}), 366 - 1);
+}
+
+TEST(Date, Patterns) {
+  const Date date = Variant(u"5/3/0109 1:02:09").to_date();
+  EXPECT_EQ(format_date(date, u"d-m-yy yyyy D/M"), u"5-3-09 0109 5/3");
+  EXPECT_EQ(format_date(date, u"hh:mm:ss mm, h.n.s (HhMm) nn"), u"01:02:09 03, 1.2.9 (0102) 02");
+}
+
 TEST(Date, ToText) {
   EXPECT_EQ(date_to_text({-0.25}), u"06:00");
   EXPECT_EQ(date_to_text({39876.999999}), u"05/03/2009");  // A second after rounding.

@@ -65,6 +65,20 @@ expect 'Null' 0 0 call VerifyIntData 1 @null
 expect 'Empty is not Null' 0 0 call VerifyIntData 0 @empty
 expect 'number' 0 1.5 call VerifyIntData 0 @num:1.5
 expect 'date, day first' 0 31/03/2009 call VerifyTextData 0 0 @date:31/3/2009
+expect 'dates as typed, day first' 0 28/02/2009 call IncMonth 31/03/2009 -1
+expect 'month first where only that is a date' 0 31/12/2009 call IncDay 12/31/2009 0
+expect_part 'the example in the help' 0 'talutil call IncMonth 31/03/2009 -1' call --help
+expect 'a date result and what is written back' 0 "31/12/2009${nl}iWeek = 52" call WeekYearToDate 60 2009 2
+expect 'JSON of dates' 0 \
+  '{"result": "4:0", "arguments": {"vStDate": "10/03/2024", "vEnDate": "11/03/2024", "vStTime": "22:00", "vEnTime": "02:00"}}' \
+  call GetTimeDifference 10/3/2024 11/3/2024 22:00 2:00 --json
+expect 'no date' 1 'talutil: GetYear: error 13: Type mismatch' call GetYear 31/2/2009
+expect 'no date where one is due' 1 \
+  'talutil: LocalTimeToUTC: the_date: "31/2/2009" is not a date; write DD/MM/YYYY, DD/MM/YYYY HH:MM or HH:MM' \
+  call LocalTimeToUTC 31/2/2009
+TZ=Australia/Brisbane expect 'local time by the zone' 0 '05/03/2009 03:45:30' call LocalTimeToUTC '5/3/2009 13:45:30'
+TZ=Pacific/Chatham expect 'there and back' 0 '05/07/2009 13:45' call UTCToLocalTime "$(
+  TZ=Pacific/Chatham "$talutil" call LocalTimeToUTC '5/7/2009 13:45')"
 expect 'list' 0 1 call IndexInList @list:Apple,Banana ban
 expect 'two at signs' 0 @null call StripNulls @@null
 printf 'a\0bü' >"$work/bytes"
@@ -77,6 +91,14 @@ expect_part 'form with a bad value' 2 'VerifyIntData: vData: "@int:x" is not a 3
 expect 'file that is not there' 1 \
   'talutil: StripNulls: s: cannot read "nowhere": No such file or directory' call StripNulls @file:nowhere
 expect_part 'bytes that are not UTF-8' 2 'is not in UTF-8' call StripNulls $'\xff'
+
+# ---- what docs/dates.md says of texts (its rows of texts are the only ones that begin with a backquote)
+while IFS='`' read -r _ text answer; do
+  answer=${answer#" | "}
+  actual=$("$talutil" call --set "BookingScreenDate=$text" BookingScreenDate 2>&1)
+  [[ $actual == *'is not a date'* ]] && actual='no date'
+  verdict "docs/dates.md: $text" "${answer%" |"}" "$actual"
+done < <(grep '^| `' "$top/docs/dates.md")
 
 # ---- call: settings
 expect 'a setting is read' 0 0 call CounterVerifyText
@@ -107,7 +129,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, idl, reference' lst
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
 # ---- list, help

@@ -24,7 +24,8 @@ struct FakePlatform final : MessageBoxes,
                             FormWindows,
                             ControlMakers,
                             MessagePump,
-                            RandomSource {
+                            RandomSource,
+                            CalendarTimeConversions {
   struct Message {
     Text text;
     MessageButtons buttons = MessageButtons::ok;
@@ -47,6 +48,7 @@ struct FakePlatform final : MessageBoxes,
   Text computer_name = u"FAKEPC";
   Locale separators;
   Date current_time{40000.5};  ///< 6 July 2009, 12:00
+  std::int64_t utc_offset_minutes = 600;
   std::intptr_t window_handle = 0x1234;
   std::map<Text, ObjectRef> controls;  ///< Another maker's controls by class name; a null one fails with 429.
 
@@ -61,12 +63,17 @@ struct FakePlatform final : MessageBoxes,
   FakeProfiles profiles;
   FakeSettingsStore settings_store;
 
+  // Real parts, for tests on a platform that is fake but for one of them.
+  TimeConversions* real_time_conversions = nullptr;
+
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;
   FakePlatform& operator=(const FakePlatform&) = delete;
 
   [[nodiscard]] Platform platform() {
-    return {*this, *this, *this, *this, *this, *this, *this, *this, *cryptography, profiles, settings_store};
+    TimeConversions& conversions = real_time_conversions == nullptr ? *this : *real_time_conversions;
+    return {*this, *this, *this,         *this,    *this,          *this,
+            *this, *this, *cryptography, profiles, settings_store, conversions};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
@@ -82,6 +89,7 @@ struct FakePlatform final : MessageBoxes,
   Text name() override { return computer_name; }
   Locale locale() override { return separators; }
   Date now() override { return current_time; }
+  std::int64_t utc_offset_seconds() override { return utc_offset_minutes * 60; }
 
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override {
     window_captions.emplace_back(caption);

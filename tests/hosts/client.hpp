@@ -190,7 +190,7 @@ constexpr HRESULT run_time_error(int number) {
   return static_cast<HRESULT>(0x800A0000U + static_cast<unsigned>(number));
 }
 
-/// What the clients' own automation objects have in common: they know no names.
+/// What the clients' own automation objects have in common: most know no names.
 class NamelessObject : public IDispatch {
  public:
   HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) final {
@@ -201,7 +201,9 @@ class NamelessObject : public IDispatch {
   }
   HRESULT STDMETHODCALLTYPE GetTypeInfoCount(UINT* count) final { return *count = 0, S_OK; }
   HRESULT STDMETHODCALLTYPE GetTypeInfo(UINT, LCID, ITypeInfo**) final { return DISP_E_BADINDEX; }
-  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) final { return DISP_E_UNKNOWNNAME; }
+  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) override {
+    return DISP_E_UNKNOWNNAME;
+  }
 };
 
 /// An automation object of the client's: its default member answers a value, or there is none, or it fails; every

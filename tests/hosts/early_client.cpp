@@ -147,6 +147,35 @@ void blank_is_written_back(U* u) {
   check_equal(L" ", character.view(), "the character written back");
 }
 
+void dates(U* u) {
+  TALUtil_SYSTEMTIME time{0, 0, 77, 0, 0, 0, 0, 88};
+  DATE date = 0;
+  Short week{60};
+  Value result;
+  check_equal(S_OK, u->DateToSystemTime(39877.5732638889, &time), "DateToSystemTime");
+  const short expected[] = {2009, 3, 77, 5, 13, 45, 30, 88};
+  check(std::memcmp(expected, &time, sizeof time) == 0, "the record that was written");
+  time.wMonth = 13;
+  check_equal(S_OK, u->SystemTimeToDate(&time, &date), "SystemTimeToDate");
+  check(std::abs(date - 40183.5732638889) < 1e-9, "its date, " + std::to_string(date));
+  time.wYear = -1;
+  check_equal(run_time_error(5), u->SystemTimeToDate(&time, &date), "a negative year");
+  check_equal(S_OK, u->LocalTimeToUTC(39877.5, &date), "LocalTimeToUTC");
+  check_equal(S_OK, u->UTCToLocalTime(date, &date), "UTCToLocalTime");
+  check(std::abs(date - 39877.5) < 1e-9, "there and back, " + std::to_string(date));
+  check_equal(S_OK, u->WeekYearToDate(week, Short{2009}, Short{1}, result), "WeekYearToDate");
+  check_equal(52, week.value, "the week written back");
+  check_equal(VT_DATE, result.type(), "its result");
+  Value argument(L"00:00:00");
+  result = {};
+  check_equal(S_OK, u->VerifyNullDate(Short{0}, argument, result), "VerifyNullDate");
+  check_equal(L"01/01/1980", argument.text(), "the date written back");
+  check_equal(VT_DATE, result.type(), "its result");
+  float hours = 0;
+  check_equal(S_OK, u->ConvertDurationToNumber(Value(L"01:45"), &hours), "ConvertDurationToNumber");
+  check_equal(1.75F, hours, "its hours");
+}
+
 /// The argument for a text that may be left out; the compiler's header has it by value.
 struct Delimiter {
   BSTR* place;
@@ -424,6 +453,7 @@ int wmain(int, wchar_t** arguments) {
     number_members(u);
     blank_is_written_back(u);
     lists_are_written_back(u);
+    dates(u);
     errors_have_number_and_text(u);
     counters_count_and_overflow(u);
     passwords_let_messages_in(u);

@@ -4,6 +4,8 @@
 #include <limits>
 #include <span>
 
+#include "com/module.hpp"
+#include "library/identity.hpp"
 #include "slots.hpp"
 
 using namespace talutil::hosts;
@@ -15,6 +17,10 @@ constexpr HRESULT documented_results[] = {DISP_E_BADPARAMCOUNT, DISP_E_PARAMNOTO
                                           DISP_E_UNKNOWNNAME,   DISP_E_PARAMNOTFOUND,    E_POINTER};
 // 51, an error of no kind the library knows, is not among them.
 constexpr int documented_numbers[] = {5, 6, 7, 9, 10, 13, 18, 91, 94, 424, 438, 445, 449};
+
+HostObject with_value(HostObject::Kind::with_value);
+HostObject without_value(HostObject::Kind::without_value);
+HostObject failing(HostObject::Kind::failing);
 
 struct Outcome {
   HRESULT status = S_OK;
@@ -163,6 +169,116 @@ void write_back_of_arrays(IDispatch* u) {
   fixed.get()->fFeatures &= static_cast<USHORT>(~FADF_FIXEDSIZE);
 }
 
+void write_back_of_numbers(IDispatch* u) {
+  const auto clamp = [u](const Value& week) {
+    return use(u, L"WeekYearToDate", week, Value(short{2009}), Value(short{1}));
+  };
+  short narrow_week = 60;
+  check_equal(VT_DATE, clamp(Value::reference(VT_I2, &narrow_week)).result.type(), "a date of a week");
+  check_equal(52, narrow_week, "a 16-bit number by reference");
+  LONG week = -7;
+  clamp(Value::reference(VT_I4, &week));
+  check_equal(1, week, "a 32-bit number by reference");
+  Text text(L"99");
+  clamp(Value::reference(VT_BSTR, text));
+  check_equal(L"52", text.view(), "a text by reference");
+  Value variable(60L);
+  clamp(in(variable));
+  check_equal(VT_I2, variable.type(), "a variable gets the member's type");
+  check_equal(S_OK, clamp(Value(short{60})).error(), "a number by value");
+}
+
+/// A variant that the client clears by itself, if at all.
+struct Plain {
+  VARIANT value{};
+  [[nodiscard]] VARIANT& get() noexcept { return value; }
+};
+
+Pointer<IRecordInfo> record_information(IDispatch* object, const GUID& id) {
+  Pointer<ITypeInfo> members;
+  Pointer<ITypeLib> library;
+  Pointer<ITypeInfo> record;
+  Pointer<IRecordInfo> result;
+  UINT index = 0;
+  require(object->GetTypeInfo(0, LOCALE_USER_DEFAULT, members.receive()), "GetTypeInfo");
+  require(members->GetContainingTypeLib(library.receive(), &index), "GetContainingTypeLib");
+  require(library->GetTypeInfoOfGuid(id, record.receive()), "GetTypeInfoOfGuid");
+  require(GetRecordInfoFromTypeInfo(record.get(), result.receive()), "GetRecordInfoFromTypeInfo");
+  return result;
+}
+
+Plain record_variant(VARTYPE type, void* data, IRecordInfo* information) {
+  Plain result;
+  V_VT(&result.value) = type;
+  V_RECORD(&result.value) = data;
+  V_RECORDINFO(&result.value) = information;
+  return result;
+}
+
+void records(IDispatch* u) {
+  const auto ours = record_information(u, talutil::com::guid_of(talutil::identity::system_time_record));
+  const auto other = record_information(u, talutil::com::guid_of(talutil::identity::file_time_record));
+  for (const VARTYPE type : std::initializer_list<VARTYPE>{VT_RECORD, VT_RECORD | VT_BYREF}) {
+    TALUtil_SYSTEMTIME time{1, 2, 77, 3, 4, 5, 6, 88};
+    Plain record = record_variant(type, &time, ours.get());
+    check_equal(S_OK, use(u, L"DateToSystemTime", Value(L"5/3/2009 13:45:30"), record).error(), "DateToSystemTime");
+    const short expected[] = {2009, 3, 77, 5, 13, 45, 30, 88};
+    check(std::memcmp(expected, &time, sizeof time) == 0, "the record that was written");
+    Value date;
+    Plain variable;
+    V_VT(&variable.value) = VT_BYREF | VT_VARIANT;
+    V_VARIANTREF(&variable.value) = &record.value;
+    check_equal(S_OK, use(u, L"SystemTimeToDate", variable, in(date)).error(), "SystemTimeToDate of a variable");
+    check_equal(VT_DATE, date.type(), "its date");
+    check_equal(S_OK, use(u, L"DateToSystemTime", Value(L"1/1/2010"), variable).error(), "a variable with a record");
+    check_equal(2010, time.wYear, "its year");
+    record = record_variant(type, &time, other.get());
+    check_equal(run_time_error(13), use(u, L"SystemTimeToDate", record, in(date)).error(), "another record");
+    record = record_variant(type, &time, nullptr);
+    check_equal(run_time_error(13), use(u, L"SystemTimeToDate", record, in(date)).error(), "a record of no kind");
+  }
+}
+
+/// An object with the fields of a record, as a script makes one.
+class RecordObject final : public NamelessObject {
+ public:
+  std::array<short, 8> fields{2009, 3, 77, 5, 13, 45, 30, 88};
+  int puts = 0;
+
+  ULONG STDMETHODCALLTYPE AddRef() override { return 1; }
+  ULONG STDMETHODCALLTYPE Release() override { return 1; }
+  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR* names, UINT, LCID, DISPID* id) override {
+    constexpr std::wstring_view known[] = {L"wYear", L"wMonth",  L"wDayOfWeek", L"wDay",
+                                           L"wHour", L"wMinute", L"wSecond",    L"wMilliseconds"};
+    const auto* const found = std::ranges::find(known, names[0]);
+    *id = static_cast<DISPID>(found - known) + 1;
+    return found == std::end(known) ? DISP_E_UNKNOWNNAME : S_OK;
+  }
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS* given, VARIANT* result, EXCEPINFO*,
+                                   UINT*) override {
+    short& field = fields.at(static_cast<std::size_t>(id - 1));
+    if ((flags & DISPATCH_PROPERTYPUT) != 0) {
+      field = V_I2(&given->rgvarg[0]);
+      ++puts;
+    } else {
+      *result = Value(field).get();
+    }
+    return S_OK;
+  }
+};
+
+void objects_as_records(IDispatch* u) {
+  RecordObject object;
+  Value date;
+  check_equal(S_OK, use(u, L"SystemTimeToDate", Value(&object), in(date)).error(), "SystemTimeToDate of an object");
+  check(std::abs(V_DATE(&date.get()) - 39877.5732638889) < 1e-9, "its date");
+  check_equal(S_OK, use(u, L"DateToSystemTime", Value(L"5/4/2010 13:45:30"), Value(&object)).error(), "an object");
+  check(object.fields == std::array<short, 8>{2010, 4, 77, 5, 13, 45, 30, 88}, "its fields");
+  check_equal(2, object.puts, "only what changed is put");
+  check_equal(run_time_error(438), use(u, L"SystemTimeToDate", Value(&with_value), in(date)).error(), "no fields");
+  check_equal(run_time_error(13), use(u, L"SystemTimeToDate", Value(L"x"), in(date)).error(), "no object");
+}
+
 void optional_and_named_arguments(IDispatch* u) {
   const auto count = [](Outcome outcome) { return outcome.error() == S_OK ? V_I4(&outcome.result.get()) : -1; };
   Value list;
@@ -239,10 +355,6 @@ struct Hostile {
   std::string name;
   std::function<void(Places&)> make;
 };
-
-HostObject with_value(HostObject::Kind::with_value);
-HostObject without_value(HostObject::Kind::without_value);
-HostObject failing(HostObject::Kind::failing);
 
 /// The argument as given, by reference, in a variable, and in a variable by reference.
 void add_all_ways(std::vector<Hostile>& list, const std::string& name, const std::function<Value()>& make) {
@@ -530,6 +642,9 @@ int wmain(int, wchar_t**) {
     properties(u);
     write_back_of_text(u);
     write_back_of_arrays(u);
+    write_back_of_numbers(u);
+    records(u);
+    objects_as_records(u);
     optional_and_named_arguments(u);
     misuse(u);
     huge_text(u);

@@ -208,6 +208,96 @@ Sub WriteBack
   Check "no such entry", -1, CInt(u.IndexInList(names, "cherry"))
 End Sub
 
+Sub Calendar
+  Dim d
+  u.CounterVerifyDate = 0
+  Check "GetYear", 2009, u.GetYear("5/3/2009")
+  Check "GetMonth of a date", 3, u.GetMonth(DateSerial(2009, 3, 5))
+  Check "GetDay of Null", 1, u.GetDay(Null)
+  Check "GetDaysThisMonth", 29, u.GetDaysThisMonth(2, 2008)
+  Check "SetDayOfMonth", "31/2/2009", u.SetDayOfMonth("5/2/2009", 31)
+  Check "GetFinancialYearStr", "0910", u.GetFinancialYearStr("15/08/2009")
+  Check "VerifyNullTime", "14:05", u.VerifyNullTime(0, TimeSerial(14, 5, 59))
+  Check "VerifyNullDate", "05032009", u.VerifyNullDate(4, "5/3/2009")
+  Check "VerifyNullDate of nothing", DateSerial(1980, 1, 1), u.VerifyNullDate(0, Empty)
+  d = "00:00:00"
+  Check "VerifyNullDate of no date", DateSerial(1980, 1, 1), u.VerifyNullDate(0, d)
+  Check "the text comes back", "01/01/1980", d
+  Check "CounterVerifyDate", 3, CInt(u.CounterVerifyDate)
+  Check "GetDateFromString", "29/02/2008", u.GetDateFromString("29022008")
+End Sub
+
+Sub Weeks
+  Dim week
+  Check "GetWeekNumber", 52, u.GetWeekNumber("31/12/2009")
+  week = 60
+  Check "WeekYearToDate, end", DateSerial(2009, 12, 31), u.WeekYearToDate(week, 2009, 2)
+  Check "the week comes back", 52, week
+  Check "WeekYearToDate, next", "08/01/2009", u.WeekYearToDate(1, 2009, 0)
+  Check "WeekYearToDate, other", Empty, u.WeekYearToDate(1, 2009, 7)
+  Check "GetWeekInDateRange", False, u.GetWeekInDateRange("1/3/2009", "7/1/2009", 1, 2009)
+End Sub
+
+Sub Stepping
+  Check "IncDay", "29/02/2008", u.IncDay("1/3/2008", -1)
+  Check "IncWeek", "03/03/2008", u.IncWeek("25/2/2008", 1)
+  Check "IncMonth", "28/02/2009", u.IncMonth(DateSerial(2009, 3, 31), -1)
+  Check "IncYear", "28/02/2009", u.IncYear("29/2/2008", 1)
+  Check "GetNextDate", "30/06/2009", u.GetNextDate("31/3/2009", "Monthly", "3")
+  Check "AddTimeToDate", "05/03/2009 09:05", u.AddTimeToDate("5/3/2009 17:00", "9:05")
+End Sub
+
+Sub Durations
+  Dim d, epoch
+  epoch = DateSerial(1800, 1, 1)
+  Check "DateTimeToDuration", "26:0", u.DateTimeToDuration("2/1/1800 2:00")
+  d = TimeSerial(1, 30, 0)
+  Check "a bare time", "1:30", u.DateTimeToDuration(d)
+  Check "comes back with its day", "1/1/1800 01:30", d
+  Check "DurationToDateTime", epoch - 1.5 / 24, u.DurationToDateTime("1:30")
+  Check "ConvertDurationToNumber", CSng(1.75), u.ConvertDurationToNumber("01:45")
+  d = " 1.75 "
+  Check "DurToTime", epoch - 1.75 / 24, u.DurToTime(d)
+  Check "the blanks go", "1.75", d
+  Check "ConvertDatabaseDurationToNumber", "0.25", u.ConvertDatabaseDurationToNumber("1/1/1800 0:15")
+  Check "ConvertNumberToDatabaseDuration", epoch - 1.5 / 24, u.ConvertNumberToDatabaseDuration(90)
+  Check "ConvertDatabaseDurationToMinutes", 90, CInt(u.ConvertDatabaseDurationToMinutes("1/1/1800 1:30"))
+  Check "ConvertTimeToMinutes", 825, CInt(u.ConvertTimeToMinutes("13:45"))
+End Sub
+
+Sub LocalTime
+  Dim d
+  d = DateSerial(2009, 3, 5) + TimeSerial(13, 45, 0)
+  Check "there and back", d, u.UTCToLocalTime(u.LocalTimeToUTC(d))
+End Sub
+
+Sub Periods
+  Dim startDate, endDate, startTime, endTime
+  Check "GetDaysInPeriod", 4, CInt(u.GetDaysInPeriod("5/3/2024", "1/3/2024"))
+  Check "GetMonthsInPeriod", -1, CInt(u.GetMonthsInPeriod("5/3/2024", "5/3/2024"))
+  startDate = DateSerial(2024, 3, 10)
+  endDate = "11/3/2024"
+  startTime = TimeSerial(22, 0, 0)
+  endTime = "2:00"
+  Check "GetTimeDifference", "4:0", u.GetTimeDifference(startDate, endDate, startTime, endTime)
+  Check "the dates and times come back", "10/03/2024 11/03/2024 22:00 02:00", _
+    startDate & " " & endDate & " " & startTime & " " & endTime
+End Sub
+
+Sub DateErrors
+  On Error Resume Next
+  v = u.GetYear("31/2/2009")
+  CheckError "no date", 13, "Type mismatch"
+  v = u.SetDayOfMonth(Null, 1)
+  CheckError "Null for a date", 94, "Invalid use of Null"
+  v = u.GetDaysThisMonth(13, 2009)
+  CheckError "month 13", 9, "Subscript out of range"
+  v = u.IncWeek("5/3/2009", 4682)
+  CheckError "weeks beyond 16 bits of days", 6, "Overflow"
+  u.SystemTimeToDate Null, v
+  CheckError "no record", 13, "Type mismatch"
+End Sub
+
 Class ValueHolder
   Public Default Property Get Value
     Value = "u"
@@ -224,5 +314,12 @@ ToolkitErrors
 ChecksAndCase
 Secrets
 WriteBack
+Calendar
+Weeks
+Stepping
+Durations
+LocalTime
+Periods
+DateErrors
 u.Terminate
 WScript.Echo passed & " passed, " & failed & " failed"

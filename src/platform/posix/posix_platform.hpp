@@ -3,6 +3,7 @@
 #include "platform/platform.hpp"
 #include "platform/posix/posix_cryptography.hpp"
 #include "platform/posix/posix_settings.hpp"
+#include "platform/posix/posix_time_conversions.hpp"
 
 namespace talutil::posix {
 
@@ -69,10 +70,11 @@ struct PosixPlatform {
   PosixProfiles profiles;
   Hive hive{Hive::default_path()};
   PosixSettingsStore settings_store{hive};
+  PosixTimeConversions time_conversions;
 
   [[nodiscard]] Platform platform() {
-    return {message_boxes, screen,        computer,     clock,    form_windows,  control_makers,
-            message_pump,  random_source, cryptography, profiles, settings_store};
+    return {message_boxes, screen,        computer,     clock,    form_windows,   control_makers,
+            message_pump,  random_source, cryptography, profiles, settings_store, time_conversions};
   }
 };
 

@@ -1,17 +1,30 @@
 #include <gtest/gtest.h>
 
+#include <bit>
+
 #include "automation/date.hpp"
 #include "tests/platform/win32/oracle.hpp"
 
 namespace talutil {
 namespace {
 
+// A hundred thousand in all.
+constexpr int text_count = 40'000;
+constexpr int parts_count = 20'000;
+constexpr int serial_count = 10'000;
+constexpr int pattern_count = 30'000;
+
+/// Any second there is, from the first day asked for on.
+double any_days(Generator& generator, std::int32_t first_day = -657434) {
+  const double second = generator.whole(0, 86399);
+  const std::int32_t day = generator.whole(first_day, 2958465);
+  return day < 0 ? day - second / 86400 : day + second / 86400;
+}
+
 TEST(PlatformDates, Parts) {
   Generator generator;
-  for (int i = 0; i < generated_count; ++i) {
-    const double second = generator.whole(0, 86399);
-    const std::int32_t day = generator.whole(-657434, 2958465);
-    const double days = day < 0 ? day - second / 86400 : day + second / 86400;
+  for (int i = 0; i < parts_count; ++i) {
+    const double days = any_days(generator);
     UDATE expected{};
     ASSERT_EQ(VarUdateFromDate(days, 0, &expected), S_OK) << days;
     const SYSTEMTIME& time = expected.st;
@@ -21,6 +34,43 @@ TEST(PlatformDates, Parts) {
     ASSERT_EQ(VarDateFromUdate(&expected, 0, &back), S_OK) << days;
     EXPECT_EQ(date_from_parts(parts), Date{back}) << days;
   }
+}
+
+TEST(PlatformDates, SerialParts) {
+  Generator generator;
+  for (int i = 0; i < serial_count; ++i) {
+    const auto part = [&](std::int32_t first, std::int32_t last) {
+      return static_cast<std::int16_t>(generator.whole(first, last));
+    };
+    // The platform knows a time of day only within the day, and some make 10 January of 40 November.
+    const SystemTime time{part(101, 9998), part(-12, 24), 0, part(-60, 30), part(0, 23), part(0, 59), part(0, 59)};
+    UDATE parts{std::bit_cast<SYSTEMTIME>(time), 0};
+    double expected = 0;
+    ASSERT_EQ(VarDateFromUdate(&parts, 0, &expected), S_OK) << i;
+    const std::int32_t second = (time.wHour * 60 + time.wMinute) * 60 + time.wSecond;
+    EXPECT_EQ(outcome([&] { return date_from_serial(time.wYear, time.wMonth, time.wDay, second); }),
+              outcome([&] { return Date{expected}; }))
+        << time.wYear << '/' << time.wMonth << '/' << time.wDay;
+  }
+}
+
+TEST(PlatformDates, Patterns) {
+  constexpr TextView patterns[] = {u"DD/MM/YYYY",     u"DD/MM/YYYY HH:MM", u"DD/MM/YY",     u"DDMMYYYY",     u"HH:MM",
+                                   u"DDMMYYYYHHMMSS", u"DD_MM_YYYY",       u"d.m.yy h:n:s", u"nn m hh mm mm"};
+  constexpr std::int32_t year_1000 = -328716;
+  Generator generator;
+  for (int i = 0; i < pattern_count; ++i) {
+    const double days = any_days(generator, year_1000);
+    Text pattern(generator.one_of(patterns));
+    VARIANT value{};
+    V_VT(&value) = VT_DATE;
+    V_DATE(&value) = days;
+    EXPECT_EQ(outcome([&] { return format_date({days}, pattern); }),
+              platform_outcome<BSTR>([&](BSTR* text) { return VarFormat(&value, raw(pattern), 1, 1, 0, text); }))
+        << to_utf8(pattern) << ' ' << days;
+  }
+  // Years before 1000 have four digits with us, and the day can be read off them again.
+  EXPECT_EQ(format_date({-657434}, u"DD/MM/YYYY"), u"01/01/0100");
 }
 
 std::string platform_date(Text text) {
@@ -37,7 +87,7 @@ std::int32_t year_of_clock() {
 Text date_like_text(Generator& generator) {
   constexpr TextView days[] = {u"1", u"05", u"12", u"13", u"28"};
   constexpr TextView all_days[] = {u"1", u"05", u"12", u"13", u"28", u"29", u"30", u"31"};
-  constexpr TextView months[] = {u"2", u"03", u"12", u"13", u"14", u"Mar", u"FEBRUARY", u"sept", u"Foo"};
+  constexpr TextView months[] = {u"2", u"03", u"12", u"13", u"14", u"Mar", u"FEBRUARY", u"oct", u"Foo"};
   constexpr TextView years[] = {u"00", u"29", u"50", u"99", u"100", u"1999", u"2012", u"9999", u"10000"};
   constexpr TextView first_years[] = {u"50", u"99", u"100", u"1999", u"2012", u"9999", u"10000"};
   constexpr TextView marks[] = {u"/", u"-", u" ", u" / "};
@@ -73,13 +123,13 @@ Text date_like_text(Generator& generator) {
 TEST(PlatformDates, TextToDate) {
   Generator generator;
   int accepted = 0;
-  for (int i = 0; i < generated_count; ++i) {
+  for (int i = 0; i < text_count; ++i) {
     const Text text = date_like_text(generator);
     const std::string ours = outcome([&] { return text_to_date(text, year_of_clock()); });
     if (ours != "none") ++accepted;
     EXPECT_EQ(ours, platform_date(text)) << to_utf8(text);
   }
-  EXPECT_GT(accepted, generated_count / 5);
+  EXPECT_GT(accepted, text_count / 5);
 }
 
 TEST(PlatformDates, DeliberateDifferences) {
@@ -97,6 +147,7 @@ TEST(PlatformDates, DeliberateDifferences) {
       {"", u"30/2", "none", "01/02/2030"},
       {"nor does a small number stand for the year first", u"31/9/12", "none", "12/09/2031"},
       {"", u"0/5/09", "none", "09/05/2000"},
+      {"", u"31-sept-29", "none", "29/09/2031"},
       {"nor behind a month", u"Mar 32", "none", "01/03/2032"},
       {"one month is enough", u"Mar 5 Mar", "none", "05/03/2003"},
       {"the month's name is never last of three", u"2009 5 Mar", "none", "05/03/2009"},

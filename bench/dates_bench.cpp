@@ -1,0 +1,78 @@
+#include <benchmark/benchmark.h>
+
+#include <chrono>
+
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "tests/fakes/fake_platform.hpp"
+
+namespace talutil {
+namespace {
+
+struct Toolkit {
+  testing::FakePlatform platform;
+  Library library{platform.platform()};
+  ORVUtils utils{library};
+};
+
+void text_to_date(benchmark::State& state, TextView text) {
+  for (auto _ : state) benchmark::DoNotOptimize(talutil::text_to_date(text, 2009));
+}
+BENCHMARK_CAPTURE(text_to_date, day, u"05/03/2009");
+BENCHMARK_CAPTURE(text_to_date, day_and_time, u"05/03/2009 13:45");
+BENCHMARK_CAPTURE(text_to_date, month_name, u"5 March 2009 1:45 PM");
+BENCHMARK_CAPTURE(text_to_date, no_date, u"31/02/2009");
+
+void format_date(benchmark::State& state, TextView pattern) {
+  for (auto _ : state) benchmark::DoNotOptimize(talutil::format_date({39877.5729166667}, pattern));
+}
+BENCHMARK_CAPTURE(format_date, day, u"DD/MM/YYYY");
+BENCHMARK_CAPTURE(format_date, day_and_time, u"DD/MM/YYYY HH:MM");
+
+template <class Call>
+void member(benchmark::State& state, Call call) {
+  Toolkit toolkit;
+  for (auto _ : state) benchmark::DoNotOptimize(call(toolkit.utils));
+}
+BENCHMARK_CAPTURE(member, IncDay_1, [](ORVUtils& utils) { return utils.IncDay(u"05/03/2009", 1); });
+BENCHMARK_CAPTURE(member, IncDay_32767, [](ORVUtils& utils) { return utils.IncDay(u"05/03/2009", 32767); });
+BENCHMARK_CAPTURE(member, IncMonth_32767, [](ORVUtils& utils) { return utils.IncMonth(u"05/03/2009", 32767); });
+BENCHMARK_CAPTURE(member, GetWeekNumber, [](ORVUtils& utils) { return utils.GetWeekNumber(u"05/03/2009"); });
+BENCHMARK_CAPTURE(member, WeekYearToDate, [](ORVUtils& utils) {
+  std::int16_t week = 10;
+  return utils.WeekYearToDate(week, 2009, 1);
+});
+
+/// Two hundred years against one day, call for call in turn; "ratio" is the first divided by the second.
+template <class Call>
+void long_and_short_period(benchmark::State& state, Call call) {
+  using Clock = std::chrono::steady_clock;
+  constexpr int batch = 1000;
+  Toolkit toolkit;
+  const Variant start = u"05/03/1809";
+  const auto time = [&](const Variant& end) {
+    const auto begin = Clock::now();
+    for (int i = 0; i < batch; ++i) benchmark::DoNotOptimize(call(toolkit.utils, start, end));
+    return std::chrono::duration<double>(Clock::now() - begin).count();
+  };
+  double long_period = 0;
+  double short_period = 0;
+  for (auto _ : state) {
+    long_period += time(u"05/03/2009");
+    short_period += time(u"06/03/1809");
+  }
+  state.counters["ratio"] = long_period / short_period;
+}
+BENCHMARK_CAPTURE(long_and_short_period, GetDaysInPeriod,
+                  [](ORVUtils& utils, const Variant& start, const Variant& end) {
+                    return utils.GetDaysInPeriod(start, end);
+                  })
+    ->Unit(benchmark::kMicrosecond);
+BENCHMARK_CAPTURE(long_and_short_period, GetMonthsInPeriod,
+                  [](ORVUtils& utils, const Variant& start, const Variant& end) {
+                    return utils.GetMonthsInPeriod(start, end);
+                  })
+    ->Unit(benchmark::kMicrosecond);
+
+}  // namespace
+}  // namespace talutil

@@ -1,0 +1,133 @@
+#include <algorithm>
+
+#include "automation/run_time_error.hpp"
+#include "dates/date_arguments.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+
+namespace talutil {
+
+namespace {
+
+// Durations are stored as dates that much later than this one.
+constexpr TextView epoch_text = u"1/1/1800 00:00";
+constexpr Date epoch{-36522};
+
+constexpr float default_hours = 1.5F;
+
+/// The text of a stored duration in full: of a date, day and time even where one of them is 0, with hours and
+/// minutes at the end.
+Text full_text(const Variant& value, const Locale& locale) {
+  if (const auto* const date = value.get_if<Date>()) return format_date(*date, date_and_time_pattern);
+  return value.to_text(locale);
+}
+
+/// The minutes of a stored duration. One of day 0 by its test text is a bare time of day, as durations were stored
+/// once: the argument is rewritten first.
+std::int32_t minutes_of(Variant& argument, Variant value, TextView test_text, const Locale& locale) {
+  constexpr TextView day_zero = u"30/12/1899";
+  constexpr std::size_t time_length = 5;
+  if (test_text.starts_with(day_zero)) {
+    const Text text = full_text(value, locale);
+    argument = value = u"1/1/1800 " + text.substr(text.size() - std::min(text.size(), time_length));
+  }
+  return date_difference(DateInterval::minute, epoch, value.to_date(locale));
+}
+
+/// Where the value is formatted to be tested, texts without a day are of day 0 too.
+std::int32_t minutes_by_formatted_text(Variant& argument, const Locale& locale) {
+  const Variant value = argument.value();
+  const Text test_text = format_date(formatted_date(value, locale), date_and_time_pattern);
+  return minutes_of(argument, value, test_text, locale);
+}
+
+/// The number before the first colon; 0 where there is none.
+std::int32_t hours_of(ORVUtils& utils, const Text& time) {
+  const std::int32_t colon = utils.MyPos(u":", time, 1);
+  if (colon < 1) return 0;
+  return static_cast<std::int32_t>(leading_number(TextView(time).substr(0, static_cast<std::size_t>(colon - 1))));
+}
+
+/// The number that the last two characters are; with the colon among them it is 0.
+std::int32_t last_minutes(TextView time) {
+  return static_cast<std::int32_t>(leading_number(time.substr(time.size() - std::min<std::size_t>(time.size(), 2))));
+}
+
+/// "hours:minutes" as decimal hours: only quarters of an hour count. None at all is an hour and a half.
+float decimal_hours(ORVUtils& utils, const Text& time) {
+  auto hours = static_cast<float>(hours_of(utils, time));
+  const std::int32_t minutes = last_minutes(time);
+  if (minutes == 15 || minutes == 30 || minutes == 45) hours += static_cast<float>(minutes) / 60;
+  return hours == 0 ? default_hours : hours;
+}
+
+}  // namespace
+
+Variant ORVUtils::DateTimeToDuration(Variant& vDate) {
+  const Variant value = vDate.value();
+  const std::int32_t minutes = minutes_of(vDate, value, full_text(value, locale()), locale());
+  return hours_and_minutes_text(minutes / 60, minutes % 60);
+}
+
+Variant ORVUtils::DurationToDateTime(const Variant& vDuration) {
+  const Text time = format_date(formatted_date(vDuration, locale()), time_pattern);
+  const std::int32_t hours = hours_of(*this, time);
+  return date_add(DateInterval::minute, hours * 60 + last_minutes(time), epoch);
+}
+
+float ORVUtils::ConvertDurationToNumber(const Variant& vT) {
+  try {
+    const Text text = StringReplace(vT.to_text(locale()), u"-", u"0");
+    return decimal_hours(*this, format_date(formatted_date(text, locale()), time_pattern));
+  } catch (const RunTimeError&) {
+    // What is no time has no hours: 0, without the default.
+    return 0;
+  }
+}
+
+Variant ORVUtils::DurToTime(Text& sDuration) {
+  sDuration = Text(trim_blanks(sDuration));
+  const std::int32_t point = MyPos(u".", sDuration, 1);
+  if (point < 1) return DurationToDateTime(sDuration + u":0");
+  Text hours = sDuration.substr(0, static_cast<std::size_t>(point - 1));
+  Text minutes = sDuration.substr(static_cast<std::size_t>(point));
+  if (trim_blanks(hours).empty()) hours = u"0";
+  // Quarters of an hour, each written one way. Any other fraction has always been taken for minutes.
+  constexpr TextView quarters[][2] = {{u"5", u"30"}, {u"25", u"15"}, {u"75", u"45"}};
+  for (const auto& [fraction, in_minutes] : quarters) {
+    if (minutes == fraction) {
+      minutes = in_minutes;
+      break;
+    }
+  }
+  return DurationToDateTime(hours + u":" + minutes);
+}
+
+Text ORVUtils::ConvertDatabaseDurationToNumber(Variant& vDuration) {
+  const std::int32_t minutes = minutes_by_formatted_text(vDuration, locale());
+  float hours = decimal_hours(*this, hours_and_minutes_text(minutes / 60, minutes % 60));
+  // More than a day has never been a job: it counts as an hour.
+  if (hours > 24) hours = 1;
+  return number_to_text(hours, locale());
+}
+
+Variant ORVUtils::ConvertNumberToDatabaseDuration(const std::int16_t& iMinutes) {
+  try {
+    return DurationToDateTime(hours_and_minutes_text(iMinutes / 60, iMinutes % 60));
+  } catch (const RunTimeError& error) {
+    library().platform().message_boxes.show(u"ORVUtils ConvertNumberToDatabaseDuration " + error.description(),
+                                            MessageButtons::ok, {});
+    return epoch_text;
+  }
+}
+
+std::int32_t ORVUtils::ConvertDatabaseDurationToMinutes(Variant& vDuration) {
+  return minutes_by_formatted_text(vDuration, locale());
+}
+
+std::int32_t ORVUtils::ConvertTimeToMinutes(const Variant& vTime) {
+  const DateParts time = parts_of(formatted_date(vTime, locale()));
+  return time.hour * 60 + time.minute;
+}
+
+}  // namespace talutil

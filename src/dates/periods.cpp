@@ -1,0 +1,61 @@
+#include <algorithm>
+#include <cstdlib>
+
+#include "automation/checked.hpp"
+#include "dates/date_arguments.hpp"
+#include "library/orv_utils.hpp"
+
+namespace talutil {
+
+namespace {
+
+/// The boundaries of an interval between the days of two dates, whichever is the earlier; `when_equal` for the same
+/// day and -1 for an empty date. Raises 6 for 31 December 9999 and another day: the numbers are those of a walk up to
+/// the day after the later one.
+std::int32_t distance(DateInterval interval, const Variant& start, const Variant& end, std::int32_t when_equal,
+                      const Locale& locale) {
+  const Variant start_value = start.value();
+  const Variant end_value = end.value();
+  const bool start_is_missing = start_value.equals_text(u"", locale);
+  if (end_value.equals_text(u"", locale) || start_is_missing) return -1;
+  const Date first = day_of(formatted_date(start_value, locale));
+  const Date last = day_of(formatted_date(end_value, locale));
+  if (first == last) return when_equal;
+  (void)to_date_checked(std::max(first.days, last.days) + 1);
+  return std::abs(date_difference(interval, first, last));
+}
+
+/// The minutes of a time "HH:MM".
+std::int32_t minutes_of(const DateParts& time) noexcept { return time.hour * 60 + time.minute; }
+
+}  // namespace
+
+std::int32_t ORVUtils::GetDaysInPeriod(const Variant& vStartDate, const Variant& vEndDate) {
+  return distance(DateInterval::day, vStartDate, vEndDate, 0, locale());
+}
+
+std::int32_t ORVUtils::GetMonthsInPeriod(const Variant& vStartDate, const Variant& vEndDate) {
+  // Equal dates are not walked, so not even their own month is counted.
+  return distance(DateInterval::month, vStartDate, vEndDate, -1, locale());
+}
+
+Variant ORVUtils::GetTimeDifference(Variant& vStDate, Variant& vEnDate, Variant& vStTime, Variant& vEnTime) {
+  const auto rewrite = [this](Variant& argument, TextView pattern) {
+    const Date date = formatted_date(argument, locale());
+    argument = format_date(date, pattern);
+    return date;
+  };
+  const Date start = rewrite(vStDate, date_pattern);
+  const Date end = rewrite(vEnDate, date_pattern);
+  std::int32_t hours = 0;
+  // Compared as texts, day first: 01/02/2024 does not come after 31/01/2024.
+  if (*vEnDate.get_if<Text>() > *vStDate.get_if<Text>()) {
+    hours = date_difference(DateInterval::hour, day_of(start), day_of(end));
+  }
+  const std::int32_t start_minutes = minutes_of(parts_of(rewrite(vStTime, time_pattern)));
+  const std::int32_t end_minutes = minutes_of(parts_of(rewrite(vEnTime, time_pattern)));
+  const std::int32_t total = checked_add(end_minutes - start_minutes, checked_multiply(60, hours));
+  return hours_and_minutes_text(total / 60, total % 60);
+}
+
+}  // namespace talutil

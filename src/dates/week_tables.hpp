@@ -1,0 +1,33 @@
+#pragma once
+
+#include <array>
+#include <cstddef>
+#include <cstdint>
+
+#include "automation/text.hpp"
+
+namespace talutil {
+
+/// The first and last days of the weeks of one year, as texts "DD/MM/YYYY". Weeks count from 1 January in steps
+/// of seven days; the last one ends with the year. Both tables hold the year that WeekYearToDate was last asked
+/// for.
+class WeekTables {
+ public:
+  static constexpr std::int32_t last_week = 52;
+
+  /// Fills a table for a year, by the calendar of a common or a leap year, whichever the year really is.
+  void fill_starts(std::int16_t year, bool is_leap_calendar);
+  void fill_ends(std::int16_t year, bool is_leap_calendar);
+
+  /// Of weeks 1 to 52; of week 53, which no year fills, an empty text.
+  [[nodiscard]] const Text& start(std::int16_t week) const { return starts_.at(static_cast<std::size_t>(week - 1)); }
+  [[nodiscard]] const Text& end(std::int16_t week) const { return ends_.at(static_cast<std::size_t>(week - 1)); }
+
+ private:
+  using Table = std::array<Text, last_week + 1>;
+
+  Table starts_;
+  Table ends_;
+};
+
+}  // namespace talutil

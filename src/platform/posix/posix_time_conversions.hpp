@@ -1,0 +1,13 @@
+#pragma once
+
+#include "platform/time_conversions.hpp"
+
+namespace talutil::posix {
+
+/// Asks the environment (TZ) anew for each conversion.
+class PosixTimeConversions final : public CalendarTimeConversions {
+ protected:
+  std::int64_t utc_offset_seconds() override;
+};
+
+}  // namespace talutil::posix
