@@ -192,9 +192,27 @@ std::string to_ansi(TextView text) {
   return bytes;
 }
 
+void append_ansi(Text& text, std::string_view bytes) {
+  // By pieces that stay in the cache. Most have no byte whose character is elsewhere: those are widened at once.
+  std::array<char16_t, 4096> units;  // NOLINT(cppcoreguidelines-pro-type-member-init): filled before it is read.
+  while (!bytes.empty()) {
+    const std::string_view piece = bytes.substr(0, units.size());
+    std::uint32_t in_upper_block = 0;
+    for (std::size_t i = 0; i < piece.size(); ++i) {
+      const auto byte = static_cast<std::uint8_t>(piece[i]);
+      units[i] = byte;
+      in_upper_block |= static_cast<std::uint32_t>((byte & 0xE0U) == 0x80U);
+    }
+    if (in_upper_block != 0)
+      std::ranges::transform(piece, units.begin(), [](char byte) { return unit_of(static_cast<std::uint8_t>(byte)); });
+    text.append(units.data(), piece.size());
+    bytes.remove_prefix(piece.size());
+  }
+}
+
 Text from_ansi(std::string_view bytes) {
-  Text text(bytes.size(), u'\0');
-  std::ranges::transform(bytes, text.begin(), [](char byte) { return unit_of(static_cast<std::uint8_t>(byte)); });
+  Text text;
+  append_ansi(text, bytes);
   return text;
 }
 

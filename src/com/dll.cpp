@@ -10,6 +10,9 @@
 #include "com/registered_controls.hpp"
 #include "com/registration.hpp"
 #include "infoforms/frm_components.hpp"
+#include "platform/win32/win32_files.hpp"
+#include "platform/win32/win32_folder_picker.hpp"
+#include "platform/win32/win32_guids.hpp"
 #include "platform/win32/win32_platform.hpp"
 
 namespace talutil::com {
@@ -24,7 +27,11 @@ struct LoadedLibrary {
   win32::Win32Clock clock;
   win32::Win32FormWindows form_windows;
   RegisteredControls control_makers;
-  Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers}};
+  win32::Win32Files files;
+  win32::Win32FolderPicker folder_picker;
+  win32::Win32Guids guids;
+  Library library{
+      Platform{message_boxes, screen, computer, clock, form_windows, control_makers, files, folder_picker, guids}};
 };
 
 struct Module {

@@ -51,23 +51,10 @@ Variant ORVUtils::ConvertCaseSuburbs(const Variant&) { not_built(); }
 void ORVUtils::ShowShortCutKeys() { not_built(); }
 void ORVUtils::ShowCmdLineHelp() { not_built(); }
 Text ORVUtils::GenerateFilePassword(const std::int16_t&, const std::int16_t&, const std::int16_t&) { not_built(); }
-Boolean ORVUtils::FileExists(Text) { not_built(); }
-Text ORVUtils::ExtractFilename(Text&, const Boolean&) { not_built(); }
-void ORVUtils::CopyFileToBackupFile(const Text&, const Text&) { not_built(); }
-void ORVUtils::SaveBigFile(const TextArray&, const Text&) { not_built(); }
-std::int32_t ORVUtils::GetFileCount(const Text&, const Text&) { not_built(); }
-Text ORVUtils::GetFileList(const Text&, const Text&, const Text&) { not_built(); }
-std::int32_t ORVUtils::OpenBigFile(const Text&, TextArray&, const std::int16_t&) { not_built(); }
-std::int32_t ORVUtils::OpenFile(const Text&, TextArray&, const std::int32_t&) { not_built(); }
-void ORVUtils::VerifyFilePath(const Text&) { not_built(); }
-Text ORVUtils::ExtractPathName(Text&) { not_built(); }
-void ORVUtils::SaveTextBox(const Text&, const Text&) { not_built(); }
-Text ORVUtils::LoadTextBox(const Text&) { not_built(); }
 Text ORVUtils::GetCfgFileData(const Text&, const Text&, const Text&, const Text&, const Boolean&) { not_built(); }
 void ORVUtils::SaveCfgFileData(const Text&, const Text&, Text&, const Text&, const Boolean&) { not_built(); }
 void ORVUtils::CallZIPFiles(const Text&, const Text&, const std::int16_t&, const Text&, const Boolean&) { not_built(); }
 void ORVUtils::CallUnZIPFiles(const Text&, const Text&, const Text&, const Boolean&) { not_built(); }
-Text ORVUtils::BrowseForFolder(const Text&) { not_built(); }
 void ORVUtils::MyDrawText(const std::int16_t&, const std::int16_t&, const std::int16_t&, const std::int16_t&,
                           const Variant&, const std::int32_t&, const std::int16_t&, const Boolean&, const Boolean&) {
   not_built();
@@ -102,9 +89,7 @@ Text ORVUtils::ConvertDatabaseDurationToNumber(Variant&) { not_built(); }
 Variant ORVUtils::ConvertNumberToDatabaseDuration(const std::int16_t&) { not_built(); }
 std::int32_t ORVUtils::ConvertDatabaseDurationToMinutes(Variant&) { not_built(); }
 void ORVUtils::ShowSysInfo() { not_built(); }
-void ORVUtils::DeleteFiles(const Text&) { not_built(); }
 Boolean ORVUtils::PingSite(const Text&) { not_built(); }
-void ORVUtils::AppendEventLog(const Text&, const Text&) { not_built(); }
 void ORVUtils::SelectGridRows(const std::int32_t&, const Variant&, const std::int16_t&) { not_built(); }
 std::int32_t ORVUtils::CountGridSelectedRows(const std::int32_t&, const Variant&) { not_built(); }
 Text ORVUtils::CryptoEncryptString(const Text&) { not_built(); }
@@ -120,9 +105,6 @@ Text ORVUtils::MyInputBox(const Text&, const Text&, const Boolean&, const Boolea
 }
 std::int32_t ORVUtils::ConvertTimeToMinutes(const Variant&) { not_built(); }
 void ORVUtils::PrintScreen(const Variant&) { not_built(); }
-Boolean ORVUtils::PathExists(Text) { not_built(); }
-void ORVUtils::SetupFileFolders() { not_built(); }
-Text ORVUtils::GetNewGuid() { not_built(); }
 void ORVUtils::DateToSystemTime(Date, SystemTime&) { not_built(); }
 void ORVUtils::SystemTimeToDate(const SystemTime&, Date&) { not_built(); }
 Date ORVUtils::LocalTimeToUTC(Date) { not_built(); }

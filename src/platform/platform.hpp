@@ -7,6 +7,9 @@
 #include "automation/locale.hpp"
 #include "automation/object.hpp"
 #include "automation/text.hpp"
+#include "platform/files.hpp"
+#include "platform/folder_picker.hpp"
+#include "platform/guids.hpp"
 
 /// The seam between the core and the platform: one small interface a concern, so that a fake fits on a page.
 namespace talutil {
@@ -83,6 +86,9 @@ struct Platform {
   Clock& clock;
   FormWindows& form_windows;
   ControlMakers& control_makers;
+  Files& files;
+  FolderPicker& folder_picker;
+  Guids& guids;
 };
 
 }  // namespace talutil

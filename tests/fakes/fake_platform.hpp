@@ -9,6 +9,7 @@
 #include "automation/run_time_error.hpp"
 #include "library/library.hpp"
 #include "platform/platform.hpp"
+#include "tests/fakes/fake_files.hpp"
 
 namespace talutil::testing {
 
@@ -38,11 +39,15 @@ struct FakePlatform final : MessageBoxes, Screen, Computer, Clock, FormWindows, 
   std::intptr_t window_handle = 0x1234;
   std::map<Text, ObjectRef> controls;  ///< Another maker's controls by class name; a null one fails with 429.
 
+  FakeFiles files;
+  FakeFolderPicker folder_picker;
+  FakeGuids guids;
+
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;
   FakePlatform& operator=(const FakePlatform&) = delete;
 
-  [[nodiscard]] Platform platform() { return {*this, *this, *this, *this, *this, *this}; }
+  [[nodiscard]] Platform platform() { return {*this, *this, *this, *this, *this, *this, files, folder_picker, guids}; }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
     messages.push_back({Text(text), buttons, Text(title)});

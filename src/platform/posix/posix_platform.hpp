@@ -1,6 +1,9 @@
 #pragma once
 
 #include "platform/platform.hpp"
+#include "platform/posix/posix_files.hpp"
+#include "platform/posix/posix_folder_picker.hpp"
+#include "platform/posix/posix_guids.hpp"
 
 namespace talutil::posix {
 
@@ -54,8 +57,13 @@ struct PosixPlatform {
   PosixClock clock;
   PosixFormWindows form_windows;
   PosixControlMakers control_makers;
+  PosixFiles files;
+  PosixFolderPicker folder_picker;
+  PosixGuids guids;
 
-  [[nodiscard]] Platform platform() { return {message_boxes, screen, computer, clock, form_windows, control_makers}; }
+  [[nodiscard]] Platform platform() {
+    return {message_boxes, screen, computer, clock, form_windows, control_makers, files, folder_picker, guids};
+  }
 };
 
 }  // namespace talutil::posix
