@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 #include <vector>
 
@@ -32,5 +33,12 @@ struct CleanOptions {
   std::string table;   ///< Empty for the CSV file's name without folder and extension.
 };
 void clean(const CleanOptions& options);
+
+struct LogTailOptions {
+  std::string path;  ///< The event log, or the folder it is in.
+  std::int64_t lines = 10;
+  bool follow = false;
+};
+void log_tail(const LogTailOptions& options);
 
 }  // namespace talutil::cli

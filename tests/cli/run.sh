@@ -107,7 +107,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, clean, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, clean, log, idl, reference' lst
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
 # ---- list, help
@@ -171,6 +171,29 @@ bad_plan 'plan: count' \
   'VerifyTextData takes 3 arguments and got 2, the column'"'"'s value included; see "talutil help VerifyTextData"' 'Name VerifyTextData 1'
 bad_plan 'plan: column twice' 'column "ID" stands twice' 'ID StripNulls'
 bad_plan 'plan: no result' 'Terminate gives no value back; use a member that does' 'Name Terminate'
+
+# ---- files: drives below a folder, and the event log
+export TALUTIL_DRIVES=$work/drives
+mkdir -p "$work/drives/t"
+expect 'a folder is made' 0 '' call VerifyFilePath 'T:\Data\One\'
+expect 'a text is saved' 0 '' call SaveTextBox 'O´Brien' 'T:\data\one\a.txt'
+verdict 'in code page 1252, with its line end' '4f b4 42 72 69 65 6e 0d 0a' \
+  "$(od -An -tx1 drives/t/Data/One/a.txt | xargs)"
+expect 'the current folder' 0 "Z:${PWD//\//\\}\\${nl}vSpecIn = a.txt" call ExtractPathName a.txt
+expect 'lines written back' 0 "1${nl}sFList = [\"O´Brien\"]" call OpenFile 'T:\data\one\a.txt' @empty 0
+expect 'no terminal, no folder' 0 '' call BrowseForFolder Choose
+expect 'missing drive' 1 'talutil: SaveTextBox: error 76: Path not found' call SaveTextBox x 'Q:\a.txt'
+expect 'standard folders on a machine without drives' 0 '' call SetupFileFolders
+verdict 'and what they are' 'BinTemp Data Drawings Help Pictures Reports Templates' "$(ls drives/c/TAL/ORV3 | xargs)"
+for event in First Second "Third Jürgen"; do
+  "$talutil" call --set EventLog=1 --set sUserName=anne --set 'sORVPath=C:\TAL\ORV3' AppendEventLog "$event" frm
+done
+stamps() { sed -E 's/:[0-9]{14}:/:STAMP:/'; }
+verdict 'log tail, the folder given' "anne:STAMP:Second:frm${nl}anne:STAMP:Third Jürgen:frm" \
+  "$("$talutil" log tail -n 2 'C:\TAL\ORV3' | stamps)"
+verdict 'log tail of fewer lines than asked for' 3 "$("$talutil" log tail drives/c/TAL/ORV3/EventLog.txt | wc -l)"
+expect_part 'log tail of no log' 1 'cannot read the event log "Q:\x": error 76: Path not found' log tail 'Q:\x'
+expect 'log tail of no lines' 2 'talutil: --lines 0: write 1 or more' log tail -n 0 drives
 
 cmp -s "$top/examples/data/customers.csv" <("${CXX:-g++}" -std=c++20 -o make "$top/tools/make_customers.cpp" && ./make)
 verdict 'customers.csv is what make_customers writes' 0 $?
