@@ -128,6 +128,14 @@ void require_file_name(TextView path) {
   }
 }
 
+void require_pattern(TextView pattern) {
+  const TextView folder = pattern.substr(0, pattern.size() - last_part(pattern).size());
+  if (pattern.find_first_of(TextView(u"\"<>|\0", 5)) != TextView::npos ||
+      folder.find_first_of(u"*?") != TextView::npos) {
+    raise(ErrorNumber::bad_file_name_or_number);
+  }
+}
+
 bool name_matches(TextView name, TextView pattern) {
   const std::vector<Step> steps = steps_of(pattern);
   const std::size_t last_dot = name.find_last_of(u'.');

@@ -17,6 +17,9 @@ constexpr TextView separators = u"\\/";
 /// or one of `*?"<>|` in it, of a device (CON, NUL, COM1, with any extension), or in the device name space (\\.\).
 void require_file_name(TextView path);
 
+/// Checks what is to be searched for. Raises 52 for a NUL or one of `"<>|`, and for a wildcard before the last part.
+void require_pattern(TextView pattern);
+
 /// Whether a name matches a pattern as the platform's file system matches them, without regard to case: "*.*" matches
 /// every name, "*." those without a dot, and a "?" before a dot or at the end matches nothing too. Short names of
 /// another form do not count: "*.htm" does not match "a.html".

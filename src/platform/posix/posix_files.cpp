@@ -158,9 +158,8 @@ class PosixOutputFile final : public OutputFile {
 }  // namespace
 
 void PosixFiles::search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) {
-  if (pattern.find_first_of(TextView(u"\"<>|\0", 5)) != Text::npos) raise(ErrorNumber::bad_file_name_or_number);
+  require_pattern(pattern);
   auto [folder, name] = split(pattern);
-  if (folder.find_first_of(u"*?") != Text::npos) raise(ErrorNumber::bad_file_name_or_number);
   if (name.empty()) name = u"*.*";
   std::string native_folder;
   try {

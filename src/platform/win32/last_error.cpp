@@ -32,7 +32,7 @@ constexpr Meaning meanings[] = {
     {ERROR_DISK_FULL, ErrorNumber::disk_full},
     {ERROR_INVALID_NAME, ErrorNumber::bad_file_name_or_number},
     {ERROR_BAD_PATHNAME, ErrorNumber::bad_file_name_or_number},
-    {ERROR_DIRECTORY, ErrorNumber::bad_file_name_or_number},
+    {ERROR_DIRECTORY, ErrorNumber::path_not_found},
     {ERROR_FILENAME_EXCED_RANGE, ErrorNumber::bad_file_name_or_number},
     {ERROR_BUFFER_OVERFLOW, ErrorNumber::bad_file_name_or_number},
 };

@@ -14,10 +14,29 @@ namespace {
 // As sequential files are opened: others may read and write meanwhile.
 constexpr DWORD shared = FILE_SHARE_READ | FILE_SHARE_WRITE;
 
-FileHandle open_file(const Text& path, DWORD access, DWORD sharing, DWORD disposition) {
+/// A missing drive is told as a missing file by some systems.
+[[noreturn]] void raise_for_path(DWORD code, const Text& path) {
+  const bool drive_is_missing =
+      path.find(u':') == 1 && GetDriveTypeW(wide(path.substr(0, 2) + u"\\")) <= DRIVE_NO_ROOT_DIR;
+  raise_for(drive_is_missing ? ERROR_PATH_NOT_FOUND : code);
+}
+
+/// Raises what is wrong with the name, and 75 for a read-only file that is to be written: some systems let an
+/// administrator do so.
+void require_usable(const Text& path, bool is_to_be_written) {
   require_file_name(path);
+  if (path.size() >= MAX_PATH) raise(ErrorNumber::bad_file_name_or_number);
+  if (!is_to_be_written) return;
+  const DWORD attributes = GetFileAttributesW(wide(path));
+  if (attributes == INVALID_FILE_ATTRIBUTES) return;
+  constexpr DWORD refused = FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_DIRECTORY;
+  if ((attributes & refused) != 0) raise(ErrorNumber::path_file_access);
+}
+
+FileHandle open_file(const Text& path, DWORD access, DWORD sharing, DWORD disposition) {
+  require_usable(path, access != GENERIC_READ);
   FileHandle file(CreateFileW(wide(path), access, sharing, nullptr, disposition, FILE_ATTRIBUTE_NORMAL, nullptr));
-  if (!file.is_open()) raise_last_error();
+  if (!file.is_open()) raise_for_path(GetLastError(), path);
   if (GetFileType(file.get()) != FILE_TYPE_DISK) raise(ErrorNumber::bad_file_name_or_number);
   return file;
 }
@@ -61,11 +80,11 @@ class Win32InputFile final : public InputFile {
 class Win32OutputFile final : public OutputFile {
  public:
   explicit Win32OutputFile(const Text& path) : path_(path) {
-    require_file_name(path);
+    require_usable(path, true);
     // Whatever is wrong with the target shows now and not when everything is written.
     FileHandle target(CreateFileW(wide(path_), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
     const DWORD reason = GetLastError();
-    if (!target.is_open() && reason != ERROR_FILE_NOT_FOUND) raise_for(reason);
+    if (!target.is_open() && reason != ERROR_FILE_NOT_FOUND) raise_for_path(reason, path_);
     replaces_ = target.is_open();
     target.close();
     make_file();
@@ -102,7 +121,7 @@ class Win32OutputFile final : public OutputFile {
       return;
     }
     const DWORD reason = GetLastError();
-    if (!replaces_ || reason != ERROR_ACCESS_DENIED) raise_for(reason);
+    if (!replaces_ || reason != ERROR_ACCESS_DENIED) raise_for_path(reason, path_);
     file_ = open_file(path_, GENERIC_WRITE, shared, TRUNCATE_EXISTING);
   }
 
@@ -146,7 +165,7 @@ std::string to_platform_ansi(TextView text) {
 
 void Win32Files::search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) {
   constexpr DWORD passed_over = FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM | FILE_ATTRIBUTE_DIRECTORY;
-  if (pattern.find(u'\0') != Text::npos) raise(ErrorNumber::bad_file_name_or_number);
+  require_pattern(pattern);
   WIN32_FIND_DATAW entry;
   const Text whole = is_open_ended(pattern) ? pattern + u"*.*" : pattern;
   const FindHandle search(FindFirstFileW(wide(whole), &entry));

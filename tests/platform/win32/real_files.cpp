@@ -1,5 +1,7 @@
 #include "tests/platform/real_files.hpp"
 
+#include <gtest/gtest.h>
+
 #include <array>
 
 #include "platform/win32/handle.hpp"
@@ -7,7 +9,12 @@
 
 namespace talutil::testing {
 
-std::unique_ptr<Files> real_files() { return std::make_unique<win32::Win32Files>(); }
+std::unique_ptr<Files> real_files() {
+  // Deleting is done by an automation object.
+  static const HRESULT apartment = CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
+  EXPECT_TRUE(SUCCEEDED(apartment));
+  return std::make_unique<win32::Win32Files>();
+}
 
 Text scratch_folder() {
   static int count = 0;
