@@ -2,7 +2,7 @@
 '   cscript //nologo lines.vbs FILE
 Option Explicit
 
-Dim u, files, stream, list, line, count, ours, theirs, started
+Dim u, files, stream, list, line, count, i, ours, theirs, started
 Set u = CreateObject("TALUtil.ORVUtils")
 Set files = CreateObject("Scripting.FileSystemObject")
 
@@ -14,9 +14,9 @@ list = Empty
 ' A tenth of the file is enough: reading it all takes minutes.
 started = Timer
 Set stream = files.OpenTextFile(WScript.Arguments(0), 1)
-Do While stream.Line <= count \ 10
+For i = 1 To count \ 10
   line = stream.ReadLine
-Loop
+Next
 stream.Close
 theirs = (Timer - started) * 10
 u.Terminate

@@ -6,7 +6,7 @@ namespace talutil {
 
 namespace {
 
-constexpr std::size_t buffer_size = 1U << 16U;
+constexpr std::size_t buffer_size = 1U << 18U;
 constexpr char end_of_file_mark = 26;
 
 }  // namespace

@@ -1,5 +1,6 @@
 // DeleteFile of the scripting run time's file-system object, called the way scripts call it.
 #include "automation/run_time_error.hpp"
+#include "platform/file_names.hpp"
 #include "platform/win32/win32_files.hpp"
 #include "platform/win32/windows.hpp"
 
@@ -37,6 +38,15 @@ ObjectPointer create_file_system_object() {
 
 void Win32Files::delete_files(const Text& pattern) {
   const ObjectPointer object = create_file_system_object();
+  // Some versions of that object take wildcards in a folder's name for any folder, and call no match a success.
+  require_pattern(pattern);
+  bool matches = false;
+  search(pattern, file_attribute::hidden | file_attribute::system, [&](TextView /*name*/) {
+    matches = true;
+    return false;
+  });
+  if (!matches || is_open_ended(pattern)) raise(ErrorNumber::file_not_found);
+
   wchar_t name[] = L"DeleteFile";
   LPOLESTR names = name;
   DISPID member = 0;

@@ -21,7 +21,7 @@ Text scratch_folder() {
   std::array<wchar_t, MAX_PATH + 1> temporary{};
   const DWORD length = GetTempPathW(static_cast<DWORD>(temporary.size()), temporary.data());
   const Text folder = Text(win32::view(temporary.data(), length)) + u"talutil" +
-                      from_utf8(std::to_string(GetCurrentProcessId()) + "-" + std::to_string(++count)) + u"\\";
+                      from_utf8(std::to_string(GetTickCount()) + "-" + std::to_string(++count)) + u"\\";
   real_files()->make_path(folder);
   return folder;
 }
