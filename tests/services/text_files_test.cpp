@@ -58,27 +58,29 @@ TEST_F(TextFiles, OpenFileAndOpenBigFile) {
   const struct {
     const char* name;
     std::string bytes;
-    std::int16_t erase_blanks;
-    TextArray before;
+    std::int32_t erase_blanks;
     std::int32_t count;
+    TextArray before;
     TextArray after;
     std::int32_t error = 0;
   } rows[] = {
-      {"blank line kept", blank_between, 0, {}, 3, array_of({u"a", u" ", u"b"})},
-      {"blank line skipped", blank_between, 1, {}, 2, array_of({u"a", u"b"})},
-      {"only 1 skips", blank_between, 2, {}, 3, array_of({u"a", u" ", u"b"})},
-      {"stored as read; a skipped last line leaves its element", blank_last, 1, {}, 2, array_of({u"a", u">x<", u""})},
-      {"a longer array is cut", blank_between, 1, old, 2, array_of({u"a", u"b"})},
-      {"a skipped line leaves what its element held", " ", 1, old, 0, array_of({u"o"})},
-      {"empty file", "", 1, old, 0, old},
-      {"array from 1", "a", 0, array_of({u"x"}, 1), 0, array_of({u"x"}, 1), 9},
-      {"array from 1, empty file", "", 0, array_of({u"x"}, 1), 0, array_of({u"x"}, 1)},
+      {"blank line kept", blank_between, 0, 3, {}, array_of({u"a", u" ", u"b"})},
+      {"blank line skipped", blank_between, 1, 2, {}, array_of({u"a", u"b"})},
+      {"only 1 skips", blank_between, 2, 3, {}, array_of({u"a", u" ", u"b"})},
+      {"stored as read; a skipped last line leaves its element", blank_last, 1, 2, {}, array_of({u"a", u">x<", u""})},
+      {"a longer array is cut", blank_between, 1, 2, old, array_of({u"a", u"b"})},
+      {"a skipped line leaves what its element held", " ", 1, 0, old, array_of({u"o"})},
+      {"empty file", "", 1, 0, old, old},
+      {"array from 1", "a", 0, 0, array_of({u"x"}, 1), array_of({u"x"}, 1), 9},
+      {"array from 1, empty file", "", 0, 0, array_of({u"x"}, 1), array_of({u"x"}, 1)},
   };
   for (const auto& row : rows) {
     platform.files.put(path, row.bytes);
     TextArray list = row.before;
     std::int32_t count = 0;
-    EXPECT_EQ(error_of([&] { count = utils.OpenBigFile(path, list, row.erase_blanks); }), row.error) << row.name;
+    EXPECT_EQ(error_of([&] { count = utils.OpenBigFile(path, list, static_cast<std::int16_t>(row.erase_blanks)); }),
+              row.error)
+        << row.name;
     EXPECT_EQ(count, row.count) << row.name;
     EXPECT_EQ(list, row.after) << row.name;
   }

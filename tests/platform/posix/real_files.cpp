@@ -38,7 +38,7 @@ std::unique_ptr<Files> real_files() {
 
 Text scratch_folder() {
   static int count = 0;
-  const Text folder = u"T:\\scratch" + from_utf8(std::to_string(++count)) + u"\\";
+  Text folder = u"T:\\scratch" + from_utf8(std::to_string(++count)) + u"\\";
   real_files()->make_path(folder);
   return folder;
 }

@@ -20,8 +20,8 @@ Text scratch_folder() {
   static int count = 0;
   std::array<wchar_t, MAX_PATH + 1> temporary{};
   const DWORD length = GetTempPathW(static_cast<DWORD>(temporary.size()), temporary.data());
-  const Text folder = Text(win32::view(temporary.data(), length)) + u"talutil" +
-                      from_utf8(std::to_string(GetTickCount()) + "-" + std::to_string(++count)) + u"\\";
+  Text folder = Text(win32::view(temporary.data(), length)) + u"talutil" +
+                from_utf8(std::to_string(GetTickCount()) + "-" + std::to_string(++count)) + u"\\";
   real_files()->make_path(folder);
   return folder;
 }
