@@ -3,8 +3,9 @@
 '   cscript //nologo customers.vbs CSV PLAN OUTPUT [REPORT]
 '
 ' The plan is the one of "talutil clean", whose file this script makes to the byte. What is printed also goes
-' to the report file, as a console does not show every character of code page 1252. The last line printed is
-' "done": without it an error has ended the script.
+' to the report file, as a console does not show every character of code page 1252. Beside the output stand a copy
+' of it (.bak) and EventLog.txt, which says what was done. The last line printed is "done": without it an error
+' has ended the script.
 Option Explicit
 
 Dim utils, report
@@ -29,6 +30,16 @@ Sub Main(arguments)
   size = CleanFile(files, arguments(0), arguments(1), arguments(2))
   Say "CounterVerifyText " & utils.CounterVerifyText & ", CounterVerifyInt " & utils.CounterVerifyInt
   Say size & " bytes of inserts to " & arguments(2) & " in " & Int((Timer - started) * 1000) / 1000 & " s"
+  KeepRecord arguments(0), arguments(2)
+End Sub
+
+' Copies the result line by line and notes in the event log beside it what was done.
+Sub KeepRecord(ByVal csvPath, ByVal sqlPath)
+  utils.CopyFileToBackupFile sqlPath, sqlPath & ".bak"
+  utils.EventLog = 1
+  utils.sUserName = "demo"
+  utils.sORVPath = utils.ExtractPathName(sqlPath)
+  utils.AppendEventLog utils.ExtractFilename(csvPath) & " cleaned", "customers.vbs"
 End Sub
 
 Function CleanFile(files, csvPath, planPath, sqlPath)

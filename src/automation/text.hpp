@@ -33,6 +33,7 @@ using TextView = std::u16string_view;
 /// The bytes of a text in code page 1252, and back. Every code unit becomes one byte.
 [[nodiscard]] std::string to_ansi(TextView text);
 [[nodiscard]] Text from_ansi(std::string_view bytes);
+void append_ansi(Text& text, std::string_view bytes);
 
 /// Upper and lower case, code unit by code unit, by the platform's own table (no locale, no one-to-many
 /// mappings: the sharp s stays). Source: see letter_case.cpp.

@@ -66,4 +66,11 @@ void config_list(const ConfigOptions& options);
 void config_export(const ConfigOptions& options);
 void config_import(const ConfigOptions& options);
 
+struct LogTailOptions {
+  std::string path;  ///< The event log, or the folder it is in.
+  std::int64_t lines = 10;
+  bool follow = false;
+};
+void log_tail(const LogTailOptions& options);
+
 }  // namespace talutil::cli

@@ -22,6 +22,7 @@ struct Request {
   SecretOptions secret;
   PasswordOptions password;
   ConfigOptions config;
+  LogTailOptions log_tail;
   std::function<void()> run;
 };
 
@@ -142,6 +143,16 @@ void add_config(CLI::App& app, Request& request) {
   for (CLI::App* const command : {exporting, importing}) command->add_option("FILE", options.profile)->required();
 }
 
+void add_log(CLI::App& app, Request& request) {
+  auto* const command = app.add_subcommand("log", "Look at an event log");
+  command->require_subcommand(1);
+  auto* const tail = command->add_subcommand("tail", "Print the last events, oldest first");
+  tail->add_option("PATH", request.log_tail.path, "EventLog.txt, or the folder it is in (C:\\TAL\\ORV3)")->required();
+  tail->add_option("-n,--lines", request.log_tail.lines, "How many lines; 10 if not given");
+  tail->add_flag("-f,--follow", request.log_tail.follow, "Go on with the events that are added");
+  tail->callback([&] { request.run = [&] { log_tail(request.log_tail); }; });
+}
+
 void add_printers(CLI::App& app, Request& request) {
   app.add_subcommand("idl", "Print the interface definition of the type library")->callback([&] {
     request.run = [] { std::cout << talutil::interface_definition(); };
@@ -182,6 +193,7 @@ int run(std::vector<std::string> words) {
   add_clean(app, request);
   add_secrets(app, request);
   add_config(app, request);
+  add_log(app, request);
   add_printers(app, request);
   if (!words.empty() && !words.front().starts_with('-')) check_subcommand(app, words.front());
   if (!words.empty() && words.front() == "call") request.call.arguments = take_verbatim(words);

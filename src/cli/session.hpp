@@ -1,6 +1,7 @@
 #pragma once
 
 #include "automation/late_call.hpp"
+#include "cli/reading_progress.hpp"
 #include "library/interface_table.hpp"
 #include "library/library.hpp"
 #include "platform/posix/posix_platform.hpp"
@@ -10,7 +11,10 @@ namespace talutil::cli {
 /// A started library with one toolkit object, called late-bound as scripts call it.
 class Session {
  public:
-  Session() { library_.start(); }
+  Session() {
+    platform_.files.set_progress(reading_progress());
+    library_.start();
+  }
 
   [[nodiscard]] static const LateInterface& members() { return late_interface<ORVUtils>(); }
   [[nodiscard]] ORVUtils& utils() noexcept { return utils_; }

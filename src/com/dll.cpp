@@ -11,6 +11,9 @@
 #include "com/registration.hpp"
 #include "infoforms/frm_components.hpp"
 #include "platform/win32/win32_cryptography.hpp"
+#include "platform/win32/win32_files.hpp"
+#include "platform/win32/win32_folder_picker.hpp"
+#include "platform/win32/win32_guids.hpp"
 #include "platform/win32/win32_platform.hpp"
 #include "platform/win32/win32_settings.hpp"
 #include "platform/win32/win32_time_conversions.hpp"
@@ -33,8 +36,12 @@ struct LoadedLibrary {
   win32::Win32Profiles profiles;
   win32::Win32SettingsStore settings_store;
   win32::Win32TimeConversions time_conversions;
+  win32::Win32Files files;
+  win32::Win32FolderPicker folder_picker;
+  win32::Win32Guids guids;
   Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers, message_pump,
-                           random_source, cryptography, profiles, settings_store, time_conversions}};
+                           random_source, cryptography, profiles, settings_store, time_conversions, files,
+                           folder_picker, guids}};
 };
 
 struct Module {

@@ -220,17 +220,52 @@ class ORVUtils {
   /// character never comes: the call lets messages through until the thread is asked to quit, and then raises 18.
   virtual Text GenerateFilePassword(const std::int16_t& iMaxLength, const std::int16_t& iMix, const std::int16_t& iHex);
 
+  /// Whether a normal file matches; wildcards count, and quotes around the path do not. Hidden files, system files and
+  /// folders are not found. Never fails.
   virtual Boolean FileExists(Text sFilename);
+
+  /// The part of a path after the last "\", or after a drive's colon; without bIncludeExt, up to its first dot. Quotes
+  /// around the path are removed, also in vSpecIn. Never fails.
   virtual Text ExtractFilename(Text& vSpecIn, const Boolean& bIncludeExt);
+
+  /// Copies the lines of a text file, at most 30000, into another that is replaced; every line ends in CR LF. Raises 9
+  /// for a source that is missing or has no lines, and what reading and writing files raise.
   virtual void CopyFileToBackupFile(const Text& sSrcFileName, const Text& sDestFileName);
+
+  /// Writes the elements from index 0 to the last as lines. Raises 9 for a lower bound above 0 and for an unallocated
+  /// array, 76 for a missing folder, 75 for a read-only file, 70 for a locked one, 61 when the disk is full; the old
+  /// file then stays.
   virtual void SaveBigFile(const TextArray& sFList, const Text& sFilename);
+
+  /// The number of normal files that match sPath followed by sFiles ("*.*" when that is empty). A missing folder has
+  /// none. Raises 52 for a pattern that cannot be searched for.
   virtual std::int32_t GetFileCount(const Text& sPath, const Text& sFiles);
+
+  /// The same files by name, each followed by sDelimiter, in the order of the system. A delimiter of one character is
+  /// removed from the end, a longer one stays. Raises 5 when the list and sDelimiter are both empty.
   virtual Text GetFileList(const Text& sDelimiter, const Text& sPath, const Text& sFiles);
+
+  /// Reads the lines of a file into sFList from index 0 and gives their number; 0 for a missing or empty file, sFList
+  /// being left alone. With iEraseBlanks exactly 1, lines that VerifyTextData empties are skipped, and the array can be
+  /// one longer than the result says. Raises 9 for an array that does not start at 0.
   virtual std::int32_t OpenBigFile(const Text& sFilename, TextArray& sFList, const std::int16_t& iEraseBlanks);
+
+  /// The same without skipping, and no more than iRowLimit lines; a limit of 0 or less is none.
   virtual std::int32_t OpenFile(const Text& sFilename, TextArray& sFList, const std::int32_t& iRowLimit);
+
+  /// Makes every folder of a path up to its last "\". A failure is not reported, but a run-time error is shown in a
+  /// message box.
   virtual void VerifyFilePath(const Text& sPath);
+
+  /// The part of a path up to its last "\"; else the current folder of its drive or of the process, with a "\" at its
+  /// end. Quotes around the path are removed, also in vSpecIn. Never fails.
   virtual Text ExtractPathName(Text& vSpecIn);
+
+  /// Writes a text and a line break to a file that is replaced. Raises as SaveBigFile does for files.
   virtual void SaveTextBox(const Text& sText, const Text& sFilename);
+
+  /// The text of a file up to a character 26, line ends as they are; empty for a missing file. Raises 70 for a locked
+  /// one.
   virtual Text LoadTextBox(const Text& sFilename);
 
   /// Reads a setting. With bLoadFromFile from the profile file sFilename: the value without one leading backslash, or
@@ -255,7 +290,10 @@ class ORVUtils {
                             const Text& sEncryptionPassword, const Boolean& bUseFilePath);
   virtual void CallUnZIPFiles(const Text& sUnZipName, const Text& sDestPath, const Text& sItems,
                               const Boolean& bOverWrite);
+
+  /// The folder that the user chooses; empty when the dialog is closed.
   virtual Text BrowseForFolder(const Text& szTitle);
+
   virtual void MyDrawText(const std::int16_t& iDestX1, const std::int16_t& iDestY1, const std::int16_t& iDestX2,
                           const std::int16_t& iDestY2, const Variant& sText, const std::int32_t& lColor,
                           const std::int16_t& iJustify, const Boolean& bBold, const Boolean& bWordWrap);
@@ -314,9 +352,17 @@ class ORVUtils {
   virtual std::int32_t ConvertDatabaseDurationToMinutes(Variant& vDuration);
 
   virtual void ShowSysInfo();
+
+  /// Deletes the files that match; wildcards may stand in the last part. Read-only files stay. Never fails and never
+  /// tells.
   virtual void DeleteFiles(const Text& sFileSpec);
+
   virtual Boolean PingSite(const Text& sAddress);
+
+  /// Adds "user:DDMMYYYYHHMMSS:event:form" to EventLog.txt in the sORVPath folder, unless EventLog is 0. Raises 76 for
+  /// a missing folder, 75 for a read-only file, 61 when the disk is full.
   virtual void AppendEventLog(const Text& sEventName, const Text& sEventForm);
+
   virtual void SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid, const std::int16_t& iSwitch);
   virtual std::int32_t CountGridSelectedRows(const std::int32_t& lColumn, const Variant& vGrid);
 
@@ -356,8 +402,15 @@ class ORVUtils {
   virtual Boolean MyInstrDelim(const Text& sSourceString, const Text& sDestString, const Text& sDelimiter);
 
   virtual void PrintScreen(const Variant& vForm);
+
+  /// Whether a folder exists; quotes around the path do not count. Never fails.
   virtual Boolean PathExists(Text sDirectory);
+
+  /// Makes the application's folders. A configured one that cannot be made is replaced, in its setting too, by the one
+  /// below C:\TAL\ORV3. A run-time error ends it; it is shown when bIsProgrammer is exactly True.
   virtual void SetupFileFolders();
+
+  /// A new GUID: 38 characters, upper-case hexadecimal digits in braces.
   virtual Text GetNewGuid();
 
   /// Writes year to second of a date into a record; wDayOfWeek and wMilliseconds stay. Raises 6 for a date out of

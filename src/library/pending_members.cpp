@@ -22,21 +22,8 @@ Boolean ORVUtils::CheckDeleteRecord() { not_built(); }
 Boolean ORVUtils::CheckModifyDatabase(const Text&) { not_built(); }
 void ORVUtils::ShowShortCutKeys() { not_built(); }
 void ORVUtils::ShowCmdLineHelp() { not_built(); }
-Boolean ORVUtils::FileExists(Text) { not_built(); }
-Text ORVUtils::ExtractFilename(Text&, const Boolean&) { not_built(); }
-void ORVUtils::CopyFileToBackupFile(const Text&, const Text&) { not_built(); }
-void ORVUtils::SaveBigFile(const TextArray&, const Text&) { not_built(); }
-std::int32_t ORVUtils::GetFileCount(const Text&, const Text&) { not_built(); }
-Text ORVUtils::GetFileList(const Text&, const Text&, const Text&) { not_built(); }
-std::int32_t ORVUtils::OpenBigFile(const Text&, TextArray&, const std::int16_t&) { not_built(); }
-std::int32_t ORVUtils::OpenFile(const Text&, TextArray&, const std::int32_t&) { not_built(); }
-void ORVUtils::VerifyFilePath(const Text&) { not_built(); }
-Text ORVUtils::ExtractPathName(Text&) { not_built(); }
-void ORVUtils::SaveTextBox(const Text&, const Text&) { not_built(); }
-Text ORVUtils::LoadTextBox(const Text&) { not_built(); }
 void ORVUtils::CallZIPFiles(const Text&, const Text&, const std::int16_t&, const Text&, const Boolean&) { not_built(); }
 void ORVUtils::CallUnZIPFiles(const Text&, const Text&, const Text&, const Boolean&) { not_built(); }
-Text ORVUtils::BrowseForFolder(const Text&) { not_built(); }
 void ORVUtils::MyDrawText(const std::int16_t&, const std::int16_t&, const std::int16_t&, const std::int16_t&,
                           const Variant&, const std::int32_t&, const std::int16_t&, const Boolean&, const Boolean&) {
   not_built();
@@ -62,9 +49,7 @@ void ORVUtils::LoadGridWidths(const Variant&, const Text&, const std::int16_t&) 
 void ORVUtils::SaveGridWidths(const Variant&, const Text&, const std::int16_t&) { not_built(); }
 void ORVUtils::ExportGridData(const Variant&, const std::int16_t&, const Boolean&, const Text&) { not_built(); }
 void ORVUtils::ShowSysInfo() { not_built(); }
-void ORVUtils::DeleteFiles(const Text&) { not_built(); }
 Boolean ORVUtils::PingSite(const Text&) { not_built(); }
-void ORVUtils::AppendEventLog(const Text&, const Text&) { not_built(); }
 void ORVUtils::SelectGridRows(const std::int32_t&, const Variant&, const std::int16_t&) { not_built(); }
 std::int32_t ORVUtils::CountGridSelectedRows(const std::int32_t&, const Variant&) { not_built(); }
 std::int32_t ORVUtils::REGISTRY_QueryValue(const Text&, const Text&) { not_built(); }
@@ -76,9 +61,6 @@ Text ORVUtils::MyInputBox(const Text&, const Text&, const Boolean&, const Boolea
   not_built();
 }
 void ORVUtils::PrintScreen(const Variant&) { not_built(); }
-Boolean ORVUtils::PathExists(Text) { not_built(); }
-void ORVUtils::SetupFileFolders() { not_built(); }
-Text ORVUtils::GetNewGuid() { not_built(); }
 Variant ORVUtils::GetIpAddrTable() { not_built(); }
 
 }  // namespace talutil

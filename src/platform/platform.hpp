@@ -8,6 +8,9 @@
 #include "automation/object.hpp"
 #include "automation/text.hpp"
 #include "platform/cryptography.hpp"
+#include "platform/files.hpp"
+#include "platform/folder_picker.hpp"
+#include "platform/guids.hpp"
 #include "platform/settings.hpp"
 #include "platform/time_conversions.hpp"
 
@@ -104,6 +107,9 @@ struct Platform {
   Profiles& profiles;
   SettingsStore& settings_store;
   TimeConversions& time_conversions;
+  Files& files;
+  FolderPicker& folder_picker;
+  Guids& guids;
 };
 
 }  // namespace talutil

@@ -129,7 +129,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, log, idl, reference' lst
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
 # ---- list, help
@@ -203,6 +203,60 @@ verdict 'a cipher text of another maker' '1: talutil: standard input: error 5: T
 verdict 'passwords' 0 $?
 expect 'unknown mix' 2 'talutil: --mix x: there is no such mix; there are digits, letters, all and hex' password --mix x
 expect_part 'password without length' 2 '--length: Value 0 not in range 1 to 32767' password --length 0
+
+# ---- settings
+export TALUTIL_HIVE=$work/hive.db
+main() { "$talutil" config "$1" --database Main --user "${user:-anne}" "${@:2}" 2>&1; }
+main set S 'k=]' $'a\\b\r\n x '
+main set T name ' "q" '
+verdict 'a setting to the byte' $'a\\b\r\n x ' "$(main get s 'K=]')"
+verdict 'the database has it too' ' "q" ' "$("$talutil" config get --database Main --group database T name)"
+verdict 'list of a section' $'[T]\nname=\\u0020"q"\\u0020' "$(main list t)"
+verdict 'no such setting' '1: talutil: there is no x in [T]' "$(m=$(main get T x); echo "$?: $m")"
+verdict 'export' '2 settings written to anne.ini' "$(main export anne.ini)"
+verdict 'export twice' '1: talutil: anne.ini is there already; --force replaces it' "$(m=$(main export anne.ini); echo "$?: $m")"
+user=bob main set T name other
+verdict 'import keeps what differs' "1 settings added, 0 the same, 1 kept as they were${nl}talutil: --force replaces settings that differ" \
+  "$(user=bob main import anne.ini)"
+verdict 'import by force' '0 settings added, 1 the same, 1 replaced' "$(user=bob main import anne.ini --force)"
+verdict 'all of it has moved' "$(main list)" "$(user=bob main list)"
+printf '[S]\nk=\\x\n' >bad.ini
+verdict 'a file that export did not write' '1: talutil: bad.ini: "\x" has a backslash that begins neither \\ nor \uXXXX' \
+  "$(m=$(main import bad.ini); echo "$?: $m")"
+expect 'no database' 2 'talutil: name the database: --database NAME, or a profile file: --file FILE' config get S k
+expect 'unknown group' 2 'talutil: --group x: there is no such group; there are user, database, previous and code' \
+  config get --group x S k
+expect 'a profile file' 0 '' config set --file a.ini S k ' v '
+verdict 'its value' 'v' "$("$talutil" config get --file a.ini s K)"
+expect_part 'what a profile cannot keep' 0 'is read as a missing one' config set --file a.ini S k '\\server'
+expect 'a profile nobody can write' 1 'talutil: cannot write k in [S] of none/a.ini' config set --file none/a.ini S k v
+expect 'through the member' 0 d call GetCfgFileData S k d a.ini True
+echo 'not a database, but a file long enough to be taken for something else' >bad.db
+TALUTIL_HIVE=bad.db expect 'a damaged store is named' 1 \
+  'talutil: error 57: Cannot use the settings in bad.db: file is not a database' config list --database Main --user anne
+
+# ---- files: drives below a folder, and the event log
+export TALUTIL_DRIVES=$work/drives
+mkdir -p "$work/drives/t"
+expect 'a folder is made' 0 '' call VerifyFilePath 'T:\Data\One\'
+expect 'a text is saved' 0 '' call SaveTextBox 'O´Brien' 'T:\data\one\a.txt'
+verdict 'in code page 1252, with its line end' '4f b4 42 72 69 65 6e 0d 0a' \
+  "$(od -An -tx1 drives/t/Data/One/a.txt | xargs)"
+expect 'the current folder' 0 "Z:${PWD//\//\\}\\${nl}vSpecIn = a.txt" call ExtractPathName a.txt
+expect 'lines written back' 0 "1${nl}sFList = [\"O´Brien\"]" call OpenFile 'T:\data\one\a.txt' @empty 0
+expect 'no terminal, no folder' 0 '' call BrowseForFolder Choose
+expect 'missing drive' 1 'talutil: SaveTextBox: error 76: Path not found' call SaveTextBox x 'Q:\a.txt'
+expect 'standard folders on a machine without drives' 0 '' call SetupFileFolders
+verdict 'and what they are' 'BinTemp Data Drawings Help Pictures Reports Templates' "$(ls drives/c/TAL/ORV3 | xargs)"
+for event in First Second "Third Jürgen"; do
+  "$talutil" call --set EventLog=1 --set sUserName=anne --set 'sORVPath=C:\TAL\ORV3' AppendEventLog "$event" frm
+done
+stamps() { sed -E 's/:[0-9]{14}:/:STAMP:/'; }
+verdict 'log tail, the folder given' "anne:STAMP:Second:frm${nl}anne:STAMP:Third Jürgen:frm" \
+  "$("$talutil" log tail -n 2 'C:\TAL\ORV3' | stamps)"
+verdict 'log tail of fewer lines than asked for' 3 "$("$talutil" log tail drives/c/TAL/ORV3/EventLog.txt | wc -l)"
+expect_part 'log tail of no log' 1 'cannot read the event log "Q:\x": error 76: Path not found' log tail 'Q:\x'
+expect 'log tail of no lines' 2 'talutil: --lines 0: write 1 or more' log tail -n 0 drives
 
 cmp -s "$top/examples/data/customers.csv" <("${CXX:-g++}" -std=c++20 -o make "$top/tools/make_customers.cpp" && ./make)
 verdict 'customers.csv is what make_customers writes' 0 $?

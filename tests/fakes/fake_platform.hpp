@@ -11,6 +11,7 @@
 #include "automation/run_time_error.hpp"
 #include "library/library.hpp"
 #include "platform/platform.hpp"
+#include "tests/fakes/fake_files.hpp"
 #include "tests/fakes/fake_settings.hpp"
 
 namespace talutil::testing {
@@ -57,14 +58,16 @@ struct FakePlatform final : MessageBoxes,
   std::function<void(std::span<std::uint8_t>)> random_bytes;  ///< In the place of the generator, where it is set.
   std::unique_ptr<Cryptography> cryptography = make_cryptography();  ///< The real one: it needs no machine.
 
-  std::map<Text, ProfileDocument> profile_files;
-  std::map<Text, Text> stored;  ///< By "application|section|key".
-
   FakeProfiles profiles;
   FakeSettingsStore settings_store;
 
+  FakeFiles files;
+  FakeFolderPicker folder_picker;
+  FakeGuids guids;
+
   // Real parts, for tests on a platform that is fake but for one of them.
   TimeConversions* real_time_conversions = nullptr;
+  Files* real_files = nullptr;
 
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;
@@ -72,8 +75,9 @@ struct FakePlatform final : MessageBoxes,
 
   [[nodiscard]] Platform platform() {
     TimeConversions& conversions = real_time_conversions == nullptr ? *this : *real_time_conversions;
-    return {*this, *this, *this,         *this,    *this,          *this,
-            *this, *this, *cryptography, profiles, settings_store, conversions};
+    Files& used_files = real_files == nullptr ? files : *real_files;
+    return {*this,         *this,    *this,          *this,       *this,      *this,         *this, *this,
+            *cryptography, profiles, settings_store, conversions, used_files, folder_picker, guids};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {

@@ -182,8 +182,62 @@ Sub ToolkitErrors
   Err.Clear
   v = u.StripNulls("a", "b")
   CheckError "two arguments", 450, "Wrong number of arguments or invalid property assignment"
-  v = u.GetNewGuid()
+  u.ShowSysInfo
   CheckError "a member to come", 445, "Object doesn't support this action"
+End Sub
+
+Sub Files
+  Dim files, folder, list, path, text
+  Set files = CreateObject("Scripting.FileSystemObject")
+  folder = files.GetSpecialFolder(2) & "\talutil-members\"
+  path = folder & "One\"
+  u.VerifyFilePath path & "not a folder"
+  Check "folders are made", True, u.PathExists(path)
+  Check "a folder is no file", False, u.FileExists(folder & "One")
+  u.SaveTextBox "O" & Chr(180) & "Brien", path & "a.txt"
+  Check "a file, in quotes", True, u.FileExists("""" & path & "A.TXT""")
+  Check "text and line end", "O" & Chr(180) & "Brien" & vbCrLf, u.LoadTextBox(path & "a.txt")
+  list = Array("first", "", "last")
+  u.SaveBigFile list, path & "b.txt"
+  Check "lines", 3, CInt(u.OpenFile(path & "b.txt", list, 0))
+  Check "lines up to a limit", 2, CInt(u.OpenFile(path & "b.txt", list, 2))
+  Check "their array", 1, CInt(UBound(list))
+  Check "lines without blank ones", 2, CInt(u.OpenBigFile(path & "b.txt", list, 1))
+  Check "a line", "last", list(1)
+  u.CopyFileToBackupFile path & "b.txt", path & "b.bak"
+  Check "a copy", u.LoadTextBox(path & "b.txt"), u.LoadTextBox(path & "b.bak")
+  Check "GetFileCount", 3, CInt(u.GetFileCount(path, ""))
+  Check "GetFileList", "b.bak", u.GetFileList(",", path, "*.bak")
+  text = """C:\dir\file.tar.gz"""
+  Check "ExtractFilename", "file.tar.gz", u.ExtractFilename(text)
+  Check "quotes are gone", "C:\dir\file.tar.gz", text
+  Check "without extensions", "file", u.ExtractFilename(text, False)
+  Check "ExtractPathName", "C:\dir\", u.ExtractPathName(text)
+  u.DeleteFiles path & "*.txt"
+  u.DeleteFiles path & "*.txt"
+  Check "what is left", "b.bak", u.GetFileList(",", path, "")
+  u.sORVPath = folder
+  u.sUserName = "anne"
+  u.EventLog = 1
+  u.AppendEventLog "Booking saved", "frmBooking"
+  text = u.LoadTextBox(folder & "EventLog.txt")
+  Check "an event", "anne:Booking saved:frmBooking" & vbCrLf, Left(text, 5) & Mid(text, 21)
+  Check "a GUID", 38, CInt(Len(u.GetNewGuid))
+  u.sReportsDir = "Q:\Reports\"
+  u.SetupFileFolders
+  Check "a fall-back", "C:\TAL\ORV3\Reports\", u.sReportsDir
+  Check "a standard folder", True, u.PathExists("C:\TAL\ORV3\Reports\SummaryJobSheets\Processed")
+  files.DeleteFolder Left(folder, Len(folder) - 1)
+End Sub
+
+Sub FileErrors
+  On Error Resume Next
+  u.SaveTextBox "x", "Q:\a.txt"
+  CheckError "a missing drive", 76, "Path not found"
+  u.SaveTextBox "x", "C:\"
+  CheckError "a folder for a file", 75, "Path/File access error"
+  u.SaveTextBox "x", "C:\nul.txt"
+  CheckError "a device", 52, "Bad file name or number"
 End Sub
 
 Sub WriteBack
@@ -313,6 +367,8 @@ Toolkit
 ToolkitErrors
 ChecksAndCase
 Secrets
+Files
+FileErrors
 WriteBack
 Calendar
 Weeks

@@ -1,4 +1,5 @@
 // A client that looks at the library's windows: the components window, and the box that Terminate shows.
+#include <algorithm>
 #include <atomic>
 #include <thread>
 
@@ -91,24 +92,56 @@ class Desktop {
   HDESK desktop_;
 };
 
-/// Ends the library's use while another thread watches for a box and closes it.
-SeenBox terminate_and_watch(_ORVUtils* u, short debug_mode, const Desktop& desktop, const std::wstring& pictures) {
+/// Does something that waits for a user, while another thread looks at the box and answers it.
+template <class Answer, class Action>
+SeenBox act_and_watch(const Desktop& desktop, Answer&& answer, Action&& action) {
   SeenBox seen;
   std::atomic<bool> is_over = false;
-  u->put_DebugMode(debug_mode);
   std::thread watcher([&] {
     desktop.enter();
     const HWND box = wait_for_box(is_over);
     if (box == nullptr) return;
     seen = look_at_box(box);
-    Sleep(300);  // Until it is painted.
-    take_picture(pictures, L"message_box");
-    PostMessageW(box, WM_COMMAND, IDOK, 0);
+    answer(box);
   });
-  check_equal(S_OK, u->Terminate(), "Terminate");
+  action();
   is_over = true;
   watcher.join();
   return seen;
+}
+
+SeenBox terminate_and_watch(_ORVUtils* u, short debug_mode, const Desktop& desktop, const std::wstring& pictures) {
+  u->put_DebugMode(debug_mode);
+  const auto close = [&](HWND box) {
+    Sleep(300);  // Until it is painted.
+    take_picture(pictures, L"message_box");
+    PostMessageW(box, WM_COMMAND, IDOK, 0);
+  };
+  return act_and_watch(desktop, close, [&] { check_equal(S_OK, u->Terminate(), "Terminate"); });
+}
+
+/// Asks for a folder with a title; the user chooses the folder of Windows, or closes the dialog.
+void folder_is_picked(_ORVUtils* u, const Desktop& desktop, bool chooses) {
+  constexpr UINT set_selection = WM_USER + 102;
+  const std::string what = chooses ? "choosing a folder" : "closing the dialog";
+  std::array<char, MAX_PATH> folder{};
+  GetWindowsDirectoryA(folder.data(), static_cast<UINT>(folder.size()));
+  HWND owner = nullptr;
+  const auto answer = [&](HWND dialog) {
+    owner = GetWindow(dialog, GW_OWNER);
+    if (chooses) SendMessageW(dialog, set_selection, TRUE, reinterpret_cast<LPARAM>(folder.data()));
+    Sleep(300);  // Until the tree has unfolded.
+    PostMessageW(dialog, WM_COMMAND, chooses ? IDOK : IDCANCEL, 0);
+  };
+  Text chosen;
+  const SeenBox box = act_and_watch(
+      desktop, answer, [&] { check_equal(S_OK, u->BrowseForFolder(Text(L"Where are the reports?"), chosen), what); });
+  if (!check(box.seen, what + ": a dialog")) return;
+  check(std::ranges::any_of(box.parts, [](const WindowText& part) { return part.text == L"Where are the reports?"; }),
+        what + ": its title");
+  check(owner == components_windows().at(0), what + ": it is owned by the components window");
+  const auto expected = chooses ? std::wstring(folder.begin(), std::ranges::find(folder, '\0')) : std::wstring();
+  check_equal(expected, std::wstring(chosen.view()), what + ": the answer");
 }
 
 void components_window_is_hidden(_ORVUtils* u) {
@@ -148,6 +181,8 @@ int wmain(int, wchar_t** arguments) {
   const Desktop desktop;
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
+    folder_is_picked(object.get(), desktop, true);
+    folder_is_picked(object.get(), desktop, false);
     components_window_is_hidden(object.get());
     const std::wstring pictures = std::wstring(arguments[1]) + L"\\..\\screenshots";
     box_has_text_and_button(terminate_and_watch(object.get(), 1, desktop, pictures));

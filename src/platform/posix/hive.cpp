@@ -1,11 +1,11 @@
 #include "platform/posix/hive.hpp"
 
 #include <sqlite3.h>
-#include <stdlib.h>
 
 #include <filesystem>
 
 #include "automation/run_time_error.hpp"
+#include "platform/posix/data_folder.hpp"
 
 namespace talutil::posix {
 
@@ -37,13 +37,8 @@ Hive::Hive(std::string path) : path_(std::move(path)) {}
 Hive::~Hive() = default;
 
 std::string Hive::default_path() {
-  const auto variable = [](const char* name) {
-    const char* const value = getenv(name);
-    return std::string(value == nullptr ? "" : value);
-  };
-  if (const std::string path = variable("TALUTIL_HIVE"); !path.empty()) return path;
-  const std::string data = variable("XDG_DATA_HOME");
-  return (data.empty() ? variable("HOME") + "/.local/share" : data) + "/talutil/hive.db";
+  const std::string path = environment("TALUTIL_HIVE");
+  return path.empty() ? data_folder() + "/hive.db" : path;
 }
 
 void Hive::fail() const {

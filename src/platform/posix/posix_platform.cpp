@@ -12,22 +12,11 @@
 #include <string>
 #include <type_traits>
 
+#include "platform/posix/terminal.hpp"
+
 namespace talutil::posix {
 
 namespace {
-
-/// A line typed at the terminal; empty optional where there is no terminal or its input has ended.
-std::optional<std::string> ask_terminal(std::string_view prompt) {
-  if (isatty(STDIN_FILENO) == 0) return std::nullopt;
-  std::cerr << prompt << std::flush;
-  std::string line;
-  // An end of input closes this box, not the next one.
-  if (!std::getline(std::cin, line)) {
-    std::cin.clear();
-    return std::nullopt;
-  }
-  return line;
-}
 
 MessageAnswer ask_ok() { return ask_terminal("[Enter] ") ? MessageAnswer::ok : MessageAnswer::cancel; }
 

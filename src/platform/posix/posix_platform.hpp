@@ -2,6 +2,9 @@
 
 #include "platform/platform.hpp"
 #include "platform/posix/posix_cryptography.hpp"
+#include "platform/posix/posix_files.hpp"
+#include "platform/posix/posix_folder_picker.hpp"
+#include "platform/posix/posix_guids.hpp"
 #include "platform/posix/posix_settings.hpp"
 #include "platform/posix/posix_time_conversions.hpp"
 
@@ -67,14 +70,18 @@ struct PosixPlatform {
   PosixMessagePump message_pump;
   PosixRandomSource random_source;
   PosixCryptography cryptography;
-  PosixProfiles profiles;
+  PosixFiles files;
+  PosixFolderPicker folder_picker;
+  PosixGuids guids;
+  PosixProfiles profiles{files};
   Hive hive{Hive::default_path()};
   PosixSettingsStore settings_store{hive};
   PosixTimeConversions time_conversions;
 
   [[nodiscard]] Platform platform() {
-    return {message_boxes, screen,        computer,     clock,    form_windows,   control_makers,
-            message_pump,  random_source, cryptography, profiles, settings_store, time_conversions};
+    return {message_boxes,  screen,           computer,      clock,         form_windows,
+            control_makers, message_pump,     random_source, cryptography,  profiles,
+            settings_store, time_conversions, files,         folder_picker, guids};
   }
 };
 

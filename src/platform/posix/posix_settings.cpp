@@ -1,15 +1,12 @@
 #include "platform/posix/posix_settings.hpp"
 
 #include <fcntl.h>
-#include <stdlib.h>
 #include <sys/file.h>
-#include <sys/stat.h>
-#include <unistd.h>
 
-#include <algorithm>
-#include <fstream>
-#include <iterator>
+#include <filesystem>
 
+#include "automation/run_time_error.hpp"
+#include "platform/posix/descriptor.hpp"
 #include "platform/profile_document.hpp"
 
 namespace talutil::posix {
@@ -19,50 +16,22 @@ namespace {
 constexpr TextView settings_key = u"HKEY_CURRENT_USER\\Software\\TALUtil\\Settings\\";
 constexpr std::uint32_t text_type = 1;
 
-class Descriptor {
- public:
-  explicit Descriptor(int number) noexcept : number_(number) {}
-  Descriptor(const Descriptor&) = delete;
-  Descriptor& operator=(const Descriptor&) = delete;
-  ~Descriptor() {
-    if (number_ >= 0) close(number_);
+/// The whole of a file; nothing where there is none that can be read.
+std::optional<std::string> read_file(PosixFiles& files, const Text& path) {
+  try {
+    const auto file = files.open_input(path);
+    std::string bytes(static_cast<std::size_t>(file->size()), '\0');
+    std::size_t filled = 0;
+    while (filled < bytes.size()) {
+      const std::size_t count = file->read(std::span(bytes).subspan(filled));
+      if (count == 0) break;
+      filled += count;
+    }
+    bytes.resize(filled);
+    return bytes;
+  } catch (const RunTimeError&) {
+    return std::nullopt;
   }
-  [[nodiscard]] int number() const noexcept { return number_; }
-
- private:
-  int number_;
-};
-
-std::string native_path(const Text& file) { return to_utf8(file); }
-
-std::optional<std::string> read_file(const std::string& path) {
-  std::ifstream in(path, std::ios::binary);
-  if (!in) return std::nullopt;
-  return std::string(std::istreambuf_iterator<char>(in), {});
-}
-
-bool write_all(int descriptor, std::string_view bytes) {
-  while (!bytes.empty()) {
-    const ssize_t count = write(descriptor, bytes.data(), bytes.size());
-    if (count < 0) return false;
-    bytes.remove_prefix(static_cast<std::size_t>(count));
-  }
-  return true;
-}
-
-/// Puts a whole file in the place of another, which keeps its access rights. Nothing changes where it cannot be done.
-void replace_file(const std::string& path, std::string_view bytes) {
-  struct stat old {};
-  const bool is_there = stat(path.c_str(), &old) == 0;
-  if (is_there && access(path.c_str(), W_OK) != 0) return;
-  std::string draft = path + ".XXXXXX";
-  const Descriptor file(mkostemp(draft.data(), O_CLOEXEC));
-  if (file.number() < 0) return;
-  constexpr mode_t usual_rights = 0644;
-  const bool is_written = write_all(file.number(), bytes) &&
-                          fchmod(file.number(), is_there ? old.st_mode & 0777U : usual_rights) == 0 &&
-                          fsync(file.number()) == 0 && rename(draft.c_str(), path.c_str()) == 0;
-  if (!is_written) unlink(draft.c_str());
 }
 
 /// What the platform's buffer would hold: bytes of the code page, and no more than fit.
@@ -80,28 +49,36 @@ Text name_of(const Text& key) { return key.substr(0, key.find(u'\0')); }
 }  // namespace
 
 Text PosixProfiles::value(const Text& file, const Text& section, const Text& item) {
-  const auto bytes = read_file(native_path(file));
+  const auto bytes = read_file(files_, file);
   return bytes ? as_read(ProfileDocument(*bytes).value(section, item).value_or(Text())) : Text();
 }
 
 Text PosixProfiles::item_names(const Text& file, const Text& section) {
   Text names;
-  if (const auto bytes = read_file(native_path(file))) {
+  if (const auto bytes = read_file(files_, file)) {
     for (const Text& name : ProfileDocument(*bytes).item_names(section)) names.append(name).append(1, u'\0');
   }
   return as_read(names);
 }
 
 void PosixProfiles::put(const Text& file, const Text& section, const Text& item, const Text& value) {
-  const std::string path = native_path(file);
-  const std::size_t slash = path.rfind('/');
-  const std::string folder = slash == std::string::npos ? "." : path.substr(0, slash + 1);
-  const Descriptor lock(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-  if (lock.number() < 0 || flock(lock.number(), LOCK_EX) != 0) return;
-  const std::string before = read_file(path).value_or("");
-  ProfileDocument document(before);
-  document.put(section, item, value);
-  if (std::string after = document.bytes(); after != before) replace_file(path, after);
+  try {
+    // The file itself is replaced, so its folder is what everyone can lock.
+    const std::string folder = std::filesystem::path(files_.native(file)).parent_path();
+    const Descriptor folder_lock(open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    if (folder_lock.get() < 0 || flock(folder_lock.get(), LOCK_EX) != 0) return;
+    const std::string before = read_file(files_, file).value_or("");
+    ProfileDocument document(before);
+    document.put(section, item, value);
+    const std::string after = document.bytes();
+    if (after == before) return;
+    const auto output = files_.open_output(file);
+    output->write(after);
+    output->close();
+  } catch (const RunTimeError&) {
+    // As on the other platform, nobody is told.
+    return;
+  }
 }
 
 std::optional<Text> PosixSettingsStore::value(const Text& application, const Text& section, const Text& key) {

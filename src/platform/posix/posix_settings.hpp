@@ -3,6 +3,7 @@
 #include <vector>
 
 #include "platform/posix/hive.hpp"
+#include "platform/posix/posix_files.hpp"
 #include "platform/settings.hpp"
 
 namespace talutil::posix {
@@ -11,9 +12,14 @@ namespace talutil::posix {
 /// those of several processes do not undo one another.
 class PosixProfiles final : public Profiles {
  public:
+  explicit PosixProfiles(PosixFiles& files) : files_(files) {}
+
   Text value(const Text& file, const Text& section, const Text& item) override;
   Text item_names(const Text& file, const Text& section) override;
   void put(const Text& file, const Text& section, const Text& item, const Text& value) override;
+
+ private:
+  PosixFiles& files_;
 };
 
 /// The settings in the hive, where the platform with a registry has them too.

@@ -70,7 +70,8 @@ TEST_F(SettingsFiles, ADamagedStoreIsNamed) {
 }
 
 TEST_F(SettingsFiles, ProfilesAreReplacedWhole) {
-  PosixProfiles profiles;
+  PosixFiles files;
+  PosixProfiles profiles(files);
   const Text file = from_utf8(path("a.ini"));
   EXPECT_EQ(profiles.value(file, u"S", u"k"), u"");
   profiles.put(file, u"S", u"k", u"\u20AC\u0100\u0416");

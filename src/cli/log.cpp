@@ -1,0 +1,98 @@
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <chrono>
+#include <iostream>
+#include <thread>
+
+#include "cli/commands.hpp"
+#include "cli/failure.hpp"
+#include "platform/posix/descriptor.hpp"
+#include "platform/posix/posix_files.hpp"
+
+namespace talutil::cli {
+
+namespace {
+
+/// The part of a file from one place to another.
+std::string read_part(const posix::Descriptor& file, std::int64_t begin, std::int64_t end) {
+  std::string bytes(static_cast<std::size_t>(end - begin), '\0');
+  std::size_t done = 0;
+  while (done < bytes.size()) {
+    const ssize_t count =
+        pread(file.get(), bytes.data() + done, bytes.size() - done, begin + static_cast<std::int64_t>(done));
+    if (count <= 0) break;  // Somebody has shortened the file.
+    done += static_cast<std::size_t>(count);
+  }
+  bytes.resize(done);
+  return bytes;
+}
+
+/// Where the last lines of a file begin, looked for from its end, so that long logs cost no more than short ones.
+std::int64_t begin_of_last_lines(const posix::Descriptor& file, std::int64_t size, std::int64_t lines) {
+  constexpr std::int64_t piece_size = 65536;
+  std::int64_t breaks = 0;
+  for (std::int64_t end = size; end > 0; end -= std::min(end, piece_size)) {
+    const std::int64_t begin = end - std::min(end, piece_size);
+    const std::string piece = read_part(file, begin, end);
+    for (std::size_t i = piece.size(); i-- > 0;) {
+      const std::int64_t at = begin + static_cast<std::int64_t>(i);
+      // The line break at the very end closes the last line.
+      if (piece[i] == '\n' && at + 1 < size && ++breaks == lines) return at + 1;
+    }
+  }
+  return 0;
+}
+
+void print_lines(std::string bytes) {
+  std::erase(bytes, '\r');
+  if (!bytes.empty() && bytes.back() != '\n') bytes += '\n';
+  std::cout << to_utf8(from_ansi(bytes)) << std::flush;
+}
+
+std::int64_t size_of(const posix::Descriptor& file) { return lseek(file.get(), 0, SEEK_END); }
+
+/// Prints what is appended, whole lines at a time, until the program is interrupted.
+[[noreturn]] void follow(const posix::Descriptor& file, std::int64_t printed) {
+  using namespace std::chrono_literals;
+  for (;; std::this_thread::sleep_for(200ms)) {
+    const std::int64_t size = size_of(file);
+    if (size < printed) printed = 0;  // The log was begun anew.
+    const std::string added = read_part(file, printed, size);
+    const std::size_t whole = added.rfind('\n') + 1;
+    if (whole == 0) continue;
+    print_lines(added.substr(0, whole));
+    printed += static_cast<std::int64_t>(whole);
+  }
+}
+
+Text log_path(const std::string& given) {
+  Text path = from_utf8(given);
+  const auto is_folder = [&] {
+    try {
+      return (posix::PosixFiles().attributes(path) & file_attribute::folder) != 0;
+    } catch (const RunTimeError&) {
+      return false;
+    }
+  };
+  return is_folder() ? path + u"/EventLog.txt" : path;
+}
+
+}  // namespace
+
+void log_tail(const LogTailOptions& options) {
+  if (options.lines < 1) throw usage_failure("--lines " + std::to_string(options.lines) + ": write 1 or more");
+  const Text path = log_path(options.path);
+  posix::Descriptor file;
+  try {
+    file = posix::open_file(posix::PosixFiles().native(path), O_RDONLY);
+  } catch (const RunTimeError& error) {
+    throw run_time_failure("cannot read the event log \"" + to_utf8(path) + "\": " + error_words(error));
+  }
+  const std::int64_t size = size_of(file);
+  print_lines(read_part(file, begin_of_last_lines(file, size, options.lines), size));
+  if (options.follow) follow(file, size);
+}
+
+}  // namespace talutil::cli

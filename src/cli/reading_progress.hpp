@@ -1,0 +1,10 @@
+#pragma once
+
+#include "platform/posix/posix_files.hpp"
+
+namespace talutil::cli {
+
+/// Tells on standard error how far a file above 50 MB is read, where that is a terminal; else tells nothing.
+[[nodiscard]] posix::PosixFiles::Progress reading_progress();
+
+}  // namespace talutil::cli

@@ -1,0 +1,19 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+
+#include "automation/text.hpp"
+
+namespace talutil {
+
+class FolderPicker {
+ public:
+  virtual ~FolderPicker() = default;
+
+  /// Lets the user choose a folder; nothing when the dialog was closed, or where there is nobody to ask. The title
+  /// is ANSI text, the owner the handle of a window of the library's.
+  [[nodiscard]] virtual std::optional<Text> choose(TextView title, std::intptr_t owner) = 0;
+};
+
+}  // namespace talutil

@@ -1,0 +1,40 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <utility>
+
+#include "automation/run_time_error.hpp"
+
+namespace talutil::posix {
+
+/// An open file of the system, closed at its end.
+class Descriptor {
+ public:
+  explicit Descriptor(int number = -1) noexcept : number_(number) {}
+  Descriptor(Descriptor&& other) noexcept : number_(std::exchange(other.number_, -1)) {}
+  Descriptor& operator=(Descriptor&& other) noexcept {
+    std::swap(number_, other.number_);
+    return *this;
+  }
+  ~Descriptor();
+
+  [[nodiscard]] int get() const noexcept { return number_; }
+
+ private:
+  int number_;
+};
+
+/// Opens a regular file. Raises as Files says; a folder is 75, a device or a pipe 52.
+[[nodiscard]] Descriptor open_file(const std::string& path, int flags);
+
+/// Waits a moment for a lock (LOCK_SH, LOCK_EX) that another holds; raises 70 when it stays.
+void lock(const Descriptor& file, int operation);
+
+/// Writes all of it. Raises 61 or 57.
+void write_all(const Descriptor& file, std::string_view bytes);
+
+/// The run-time error for an error code of the system about a path.
+[[noreturn]] void raise_for(int code, const std::string& path);
+
+}  // namespace talutil::posix

@@ -1,0 +1,253 @@
+#include "platform/posix/posix_files.hpp"
+
+#include <dirent.h>
+#include <errno.h>
+#include <fcntl.h>
+#include <limits.h>
+#include <stdlib.h>
+#include <sys/file.h>
+#include <sys/stat.h>
+#include <sys/xattr.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <array>
+#include <filesystem>
+
+#include "platform/file_names.hpp"
+#include "platform/posix/descriptor.hpp"
+
+namespace talutil::posix {
+
+namespace {
+
+constexpr mode_t all_write_bits = S_IWUSR | S_IWGRP | S_IWOTH;
+
+/// The attribute that other programs that bring Windows files here store too.
+std::uint32_t stored_attributes(const std::string& path) {
+  std::array<char, 32> text{};
+  if (lgetxattr(path.c_str(), "user.DOSATTRIB", text.data(), text.size() - 1) <= 0) return 0;
+  return static_cast<std::uint32_t>(strtoul(text.data(), nullptr, 0)) &
+         (file_attribute::hidden | file_attribute::system);
+}
+
+std::uint32_t attributes_of(const std::string& path, const struct stat& status) {
+  const std::string_view name = std::string_view(path).substr(path.find_last_of('/') + 1);
+  std::uint32_t result = stored_attributes(path);
+  if (name.starts_with('.') && name != "." && name != "..") result |= file_attribute::hidden;
+  if (S_ISDIR(status.st_mode)) return result | file_attribute::folder;
+  return (status.st_mode & all_write_bits) == 0 ? result | file_attribute::read_only : result;
+}
+
+/// Whether a search with the mask gives an entry. Neither files nor folders (devices, dead links) are given.
+bool is_searched_for(const std::string& path, std::uint32_t mask) {
+  constexpr std::uint32_t passed_over = file_attribute::hidden | file_attribute::system | file_attribute::folder;
+  struct stat status {};
+  if (stat(path.c_str(), &status) != 0 || !(S_ISREG(status.st_mode) || S_ISDIR(status.st_mode))) return false;
+  return (attributes_of(path, status) & passed_over & ~mask) == 0;
+}
+
+/// A path cut into the folder, as it was written, and the name or pattern in it.
+struct FolderAndName {
+  Text folder;
+  Text name;
+};
+
+FolderAndName split(const Text& path) {
+  const TextView name = last_part(path);
+  return {path.substr(0, path.size() - name.size()), Text(name)};
+}
+
+std::string folder_or_current(const DrivePaths& paths, const Text& folder) {
+  return folder.empty() ? "." : paths.native(folder);
+}
+
+class PosixInputFile final : public InputFile {
+ public:
+  PosixInputFile(Descriptor file, const PosixFiles::Progress& progress) : file_(std::move(file)), progress_(progress) {
+    struct stat status {};
+    if (fstat(file_.get(), &status) == 0) size_ = static_cast<std::uint64_t>(status.st_size);
+    lock(file_, LOCK_SH);
+    posix_fadvise(file_.get(), 0, 0, POSIX_FADV_SEQUENTIAL);
+  }
+
+  [[nodiscard]] std::uint64_t size() const noexcept override { return size_; }
+
+  std::size_t read(std::span<char> buffer) override {
+    ssize_t count = 0;
+    do {
+      count = ::read(file_.get(), buffer.data(), buffer.size());
+    } while (count < 0 && errno == EINTR);
+    if (count < 0) raise_for(errno, {});
+    done_ += static_cast<std::uint64_t>(count);
+    if (progress_) progress_(count == 0 ? size_ : done_, size_);
+    return static_cast<std::size_t>(count);
+  }
+
+ private:
+  Descriptor file_;
+  const PosixFiles::Progress& progress_;
+  std::uint64_t size_ = 0;
+  std::uint64_t done_ = 0;
+};
+
+/// Writes beside the file and takes its place at the end. Where the folder takes no new file, the old one is
+/// overwritten as it lies.
+class PosixOutputFile final : public OutputFile {
+ public:
+  explicit PosixOutputFile(std::string path) : path_(std::move(path)) {
+    // Whatever is wrong with the target shows now and not when everything is written.
+    if (access(path_.c_str(), F_OK) == 0) {
+      target_ = open_file(path_, O_WRONLY);
+      lock(target_, LOCK_EX);
+      // The file that a link leads to is replaced, not the link.
+      path_ = std::filesystem::canonical(path_).string();
+    } else if (errno != ENOENT) {
+      raise_for(errno, path_);
+    }
+    make_file();
+  }
+
+  ~PosixOutputFile() override {
+    if (!temporary_.empty()) unlink(temporary_.c_str());
+  }
+
+  void write(std::string_view bytes) override { write_all(file_, bytes); }
+
+  void close() override {
+    if (fdatasync(file_.get()) != 0) raise_for(errno, path_);
+    if (temporary_.empty()) return;
+    if (rename(temporary_.c_str(), path_.c_str()) != 0) raise_for(errno, path_);
+    temporary_.clear();
+  }
+
+ private:
+  void make_file() {
+    const std::size_t end = path_.find_last_of('/');
+    std::string name = (end == std::string::npos ? std::string() : path_.substr(0, end + 1)) + ".talutil-XXXXXX";
+    file_ = Descriptor(mkostemp(name.data(), O_CLOEXEC));
+    if (file_.get() >= 0) {
+      temporary_ = name;
+      set_rights();
+      return;
+    }
+    if (target_.get() < 0 || (errno != EACCES && errno != EROFS)) raise_for(errno, path_);
+    file_ = std::move(target_);
+    if (ftruncate(file_.get(), 0) != 0) raise_for(errno, path_);
+  }
+
+  /// Those of the file that is replaced, or of any new one.
+  void set_rights() const {
+    struct stat status {};
+    if (target_.get() >= 0 && fstat(target_.get(), &status) == 0) {
+      fchmod(file_.get(), status.st_mode & 07777);
+      if (fchown(file_.get(), status.st_uid, status.st_gid) != 0) return;  // Only an administrator gives files away.
+    } else {
+      const mode_t mask = umask(0);
+      umask(mask);
+      fchmod(file_.get(), 0666 & ~mask);
+    }
+  }
+
+  std::string path_;
+  std::string temporary_;
+  Descriptor target_;
+  Descriptor file_;
+};
+
+}  // namespace
+
+void PosixFiles::search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) {
+  require_pattern(pattern);
+  auto [folder, name] = split(pattern);
+  if (name.empty()) name = u"*.*";
+  std::string native_folder;
+  try {
+    native_folder = folder_or_current(paths_, folder);
+    if (name.find_first_of(u"*?") == Text::npos) {
+      const std::string path = paths_.native(pattern);
+      if (is_searched_for(path, mask)) found(from_utf8(path.substr(path.find_last_of('/') + 1)));
+      return;
+    }
+  } catch (const RunTimeError& error) {
+    if (error.number() != static_cast<std::int32_t>(ErrorNumber::path_not_found)) throw;
+    return;
+  }
+  const std::unique_ptr<DIR, int (*)(DIR*)> listing(opendir(native_folder.c_str()), &closedir);
+  while (listing) {
+    const dirent* const entry = readdir(listing.get());
+    if (entry == nullptr) return;
+    const Text entry_name = from_utf8(entry->d_name);
+    if (!name_matches(entry_name, name) || !is_searched_for(native_folder + "/" + entry->d_name, mask)) continue;
+    if (!found(entry_name)) return;
+  }
+}
+
+std::uint32_t PosixFiles::attributes(const Text& path) {
+  const std::string native_path = paths_.native(path);
+  struct stat status {};
+  if (stat(native_path.c_str(), &status) != 0) raise_for(errno, native_path);
+  return attributes_of(native_path, status);
+}
+
+bool PosixFiles::make_path(const Text& path) {
+  const std::size_t end = path.find_last_of(separators);
+  if (end == Text::npos) return true;
+  const Text folder = path.substr(0, end);
+  paths_.provide_drive_of(folder);
+  try {
+    std::error_code error;
+    const std::string native_folder = paths_.native(folder.empty() ? u"\\" : folder);
+    std::filesystem::create_directories(native_folder, error);
+    return std::filesystem::is_directory(native_folder, error);
+  } catch (const RunTimeError&) {
+    return false;  // A missing drive.
+  }
+}
+
+Text PosixFiles::current_folder(TextView drive) { return paths_.current_folder(drive); }
+
+void PosixFiles::delete_files(const Text& pattern) {
+  const auto [folder, name] = split(pattern);
+  if (name.empty()) raise(ErrorNumber::file_not_found);
+  const std::string native_folder = folder_or_current(paths_, folder);
+  if (!std::filesystem::is_directory(native_folder)) raise(ErrorNumber::path_not_found);
+  std::vector<std::string> matches;
+  search(pattern, file_attribute::hidden | file_attribute::system,
+         [&](TextView match) { return matches.push_back(native_folder + "/" + to_utf8(match)), true; });
+  if (matches.empty()) raise(ErrorNumber::file_not_found);
+  for (const std::string& path : matches) {
+    struct stat status {};
+    if (stat(path.c_str(), &status) == 0 && (status.st_mode & all_write_bits) == 0) {
+      raise(ErrorNumber::permission_denied);
+    }
+    if (unlink(path.c_str()) != 0) raise_for(errno, path);
+  }
+}
+
+std::unique_ptr<InputFile> PosixFiles::open_input(const Text& path) {
+  require_file_name(path);
+  return std::make_unique<PosixInputFile>(open_file(paths_.native(path), O_RDONLY), progress_);
+}
+
+std::unique_ptr<OutputFile> PosixFiles::open_output(const Text& path) {
+  require_file_name(path);
+  return std::make_unique<PosixOutputFile>(paths_.native(path));
+}
+
+void PosixFiles::append(const Text& path, std::string_view bytes) {
+  require_file_name(path);
+  const Descriptor file = open_file(paths_.native(path), O_WRONLY | O_APPEND | O_CREAT);
+  lock(file, LOCK_EX);
+  struct stat before {};
+  if (fstat(file.get(), &before) != 0) raise_for(errno, {});
+  try {
+    write_all(file, bytes);
+  } catch (const RunTimeError&) {
+    // A part of the line is worse than none: the next one would be glued to it.
+    if (ftruncate(file.get(), before.st_size) != 0) raise(ErrorNumber::device_io_error);
+    throw;
+  }
+}
+
+}  // namespace talutil::posix

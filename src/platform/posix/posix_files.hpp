@@ -1,0 +1,32 @@
+#pragma once
+
+#include "platform/files.hpp"
+#include "platform/posix/drive_paths.hpp"
+
+namespace talutil::posix {
+
+/// Files and folders as DrivePaths places them. Hidden are names with a leading dot and files whose stored attribute
+/// says so (the extended attribute user.DOSATTRIB, "0x2"); read-only are files that nobody may write.
+class PosixFiles final : public Files {
+ public:
+  /// Called while a file is read: how far, and how much there is, in bytes.
+  using Progress = std::function<void(std::uint64_t done, std::uint64_t total)>;
+  void set_progress(Progress progress) { progress_ = std::move(progress); }
+
+  [[nodiscard]] std::string native(const Text& path) const { return paths_.native(path); }
+
+  void search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) override;
+  std::uint32_t attributes(const Text& path) override;
+  bool make_path(const Text& path) override;
+  Text current_folder(TextView drive) override;
+  void delete_files(const Text& pattern) override;
+  std::unique_ptr<InputFile> open_input(const Text& path) override;
+  std::unique_ptr<OutputFile> open_output(const Text& path) override;
+  void append(const Text& path, std::string_view bytes) override;
+
+ private:
+  DrivePaths paths_;
+  Progress progress_;
+};
+
+}  // namespace talutil::posix

@@ -1,0 +1,221 @@
+#include "platform/win32/win32_files.hpp"
+
+#include <array>
+
+#include "automation/run_time_error.hpp"
+#include "platform/file_names.hpp"
+#include "platform/win32/handle.hpp"
+#include "platform/win32/last_error.hpp"
+
+namespace talutil::win32 {
+
+namespace {
+
+// As sequential files are opened: others may read and write meanwhile.
+constexpr DWORD shared = FILE_SHARE_READ | FILE_SHARE_WRITE;
+
+/// A missing drive is told as a missing file by some systems.
+[[noreturn]] void raise_for_path(DWORD code, const Text& path) {
+  const bool drive_is_missing =
+      path.find(u':') == 1 && GetDriveTypeW(wide(path.substr(0, 2) + u"\\")) <= DRIVE_NO_ROOT_DIR;
+  raise_for(drive_is_missing ? ERROR_PATH_NOT_FOUND : code);
+}
+
+/// Raises what is wrong with the name, and 75 for a read-only file that is to be written: some systems let an
+/// administrator do so.
+void require_usable(const Text& path, bool is_to_be_written) {
+  require_file_name(path);
+  if (path.size() >= MAX_PATH) raise(ErrorNumber::bad_file_name_or_number);
+  if (!is_to_be_written) return;
+  const DWORD attributes = GetFileAttributesW(wide(path));
+  if (attributes == INVALID_FILE_ATTRIBUTES) return;
+  constexpr DWORD refused = FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_DIRECTORY;
+  if ((attributes & refused) != 0) raise(ErrorNumber::path_file_access);
+}
+
+FileHandle open_file(const Text& path, DWORD access, DWORD sharing, DWORD disposition) {
+  require_usable(path, access != GENERIC_READ);
+  FileHandle file(CreateFileW(wide(path), access, sharing, nullptr, disposition, FILE_ATTRIBUTE_NORMAL, nullptr));
+  if (!file.is_open()) raise_for_path(GetLastError(), path);
+  if (GetFileType(file.get()) != FILE_TYPE_DISK) raise(ErrorNumber::bad_file_name_or_number);
+  return file;
+}
+
+void write_all(const FileHandle& file, std::string_view bytes) {
+  constexpr std::size_t longest = 1U << 24U;
+  while (!bytes.empty()) {
+    const std::string_view part = bytes.substr(0, longest);
+    DWORD written = 0;
+    if (WriteFile(file.get(), part.data(), static_cast<DWORD>(part.size()), &written, nullptr) == 0) raise_last_error();
+    if (written == 0) raise(ErrorNumber::disk_full);
+    bytes.remove_prefix(written);
+  }
+}
+
+class Win32InputFile final : public InputFile {
+ public:
+  explicit Win32InputFile(const Text& path) : file_(open_file(path, GENERIC_READ, shared, OPEN_EXISTING)) {
+    LARGE_INTEGER size{};
+    if (GetFileSizeEx(file_.get(), &size) == 0) raise_last_error();
+    size_ = static_cast<std::uint64_t>(size.QuadPart);
+  }
+
+  [[nodiscard]] std::uint64_t size() const noexcept override { return size_; }
+
+  std::size_t read(std::span<char> buffer) override {
+    DWORD count = 0;
+    if (ReadFile(file_.get(), buffer.data(), static_cast<DWORD>(buffer.size()), &count, nullptr) == 0) {
+      raise_last_error();
+    }
+    return count;
+  }
+
+ private:
+  FileHandle file_;
+  std::uint64_t size_ = 0;
+};
+
+/// Writes beside the file and takes its place at the end. Where the folder takes no new file, the old one is
+/// overwritten as it lies.
+class Win32OutputFile final : public OutputFile {
+ public:
+  explicit Win32OutputFile(const Text& path) : path_(path) {
+    require_usable(path, true);
+    // Whatever is wrong with the target shows now and not when everything is written.
+    FileHandle target(CreateFileW(wide(path_), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
+    const DWORD reason = GetLastError();
+    if (!target.is_open() && reason != ERROR_FILE_NOT_FOUND) raise_for_path(reason, path_);
+    replaces_ = target.is_open();
+    target.close();
+    make_file();
+  }
+  Win32OutputFile(const Win32OutputFile&) = delete;
+  Win32OutputFile& operator=(const Win32OutputFile&) = delete;
+
+  ~Win32OutputFile() override {
+    if (temporary_.empty()) return;
+    file_.close();
+    DeleteFileW(wide(temporary_));
+  }
+
+  void write(std::string_view bytes) override { write_all(file_, bytes); }
+
+  void close() override {
+    if (FlushFileBuffers(file_.get()) == 0) raise_last_error();
+    file_.close();
+    if (temporary_.empty()) return;
+    // Keeps the attributes and rights of the file that is replaced.
+    const BOOL is_done = replaces_ ? ReplaceFileW(wide(path_), wide(temporary_), nullptr, 0, nullptr, nullptr)
+                                   : MoveFileExW(wide(temporary_), wide(path_), MOVEFILE_REPLACE_EXISTING);
+    if (is_done == 0) raise_replacing(GetLastError());
+    temporary_.clear();
+  }
+
+ private:
+  void make_file() {
+    const Text folder = path_.substr(0, path_.size() - last_part(path_).size());
+    std::array<wchar_t, MAX_PATH + 1> name{};
+    if (GetTempFileNameW(wide(folder.empty() ? Text(u".") : folder), L"tal", 0, name.data()) != 0) {
+      temporary_ = view(name.data(), wcslen(name.data()));
+      file_ = open_file(temporary_, GENERIC_WRITE, 0, TRUNCATE_EXISTING);
+      return;
+    }
+    const DWORD reason = GetLastError();
+    if (!replaces_ || reason != ERROR_ACCESS_DENIED) raise_for_path(reason, path_);
+    file_ = open_file(path_, GENERIC_WRITE, shared, TRUNCATE_EXISTING);
+  }
+
+  /// The target could be written to a moment ago: what keeps it from being replaced is another who has it open.
+  [[noreturn]] static void raise_replacing(DWORD code) {
+    raise_for(code == ERROR_ACCESS_DENIED ? ERROR_SHARING_VIOLATION : code);
+  }
+
+  Text path_;
+  Text temporary_;
+  bool replaces_ = false;
+  FileHandle file_;
+};
+
+/// Ends a search of the system.
+struct FindHandle {
+  HANDLE handle;
+  explicit FindHandle(HANDLE found) : handle(found) {}
+  FindHandle(const FindHandle&) = delete;
+  FindHandle& operator=(const FindHandle&) = delete;
+  ~FindHandle() {
+    if (handle != INVALID_HANDLE_VALUE) FindClose(handle);
+  }
+};
+
+bool is_nothing_found(DWORD code) {
+  return code == ERROR_FILE_NOT_FOUND || code == ERROR_PATH_NOT_FOUND || code == ERROR_NO_MORE_FILES;
+}
+
+}  // namespace
+
+std::string to_platform_ansi(TextView text) {
+  if (text.empty()) return {};
+  const auto* const units = reinterpret_cast<const wchar_t*>(text.data());
+  const int length = static_cast<int>(text.size());
+  const int size = WideCharToMultiByte(CP_ACP, 0, units, length, nullptr, 0, nullptr, nullptr);
+  std::string bytes(static_cast<std::size_t>(size), '\0');
+  WideCharToMultiByte(CP_ACP, 0, units, length, bytes.data(), size, nullptr, nullptr);
+  return bytes;
+}
+
+void Win32Files::search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) {
+  constexpr DWORD passed_over = FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM | FILE_ATTRIBUTE_DIRECTORY;
+  require_pattern(pattern);
+  WIN32_FIND_DATAW entry;
+  const Text whole = is_open_ended(pattern) ? pattern + u"*.*" : pattern;
+  const FindHandle search(FindFirstFileW(wide(whole), &entry));
+  if (search.handle == INVALID_HANDLE_VALUE) {
+    const DWORD reason = GetLastError();
+    if (is_nothing_found(reason)) return;
+    raise_for(reason);
+  }
+  do {
+    if ((entry.dwFileAttributes & passed_over & ~mask) != 0) continue;
+    if (!found(view(entry.cFileName, wcslen(entry.cFileName)))) return;
+  } while (FindNextFileW(search.handle, &entry) != 0);
+}
+
+std::uint32_t Win32Files::attributes(const Text& path) {
+  const DWORD result = GetFileAttributesW(wide(path));
+  if (result == INVALID_FILE_ATTRIBUTES) raise_last_error();
+  return result;
+}
+
+bool Win32Files::make_path(const Text& path) {
+  using Function = BOOL(WINAPI*)(PCSTR);
+  static_assert(sizeof(BOOL) == sizeof(int));
+  const auto make = late_function<Function>(L"imagehlp.dll", "MakeSureDirectoryPathExists");
+  if (make == nullptr) raise(ErrorNumber::file_not_found);
+  return make(to_platform_ansi(path).c_str()) != 0;
+}
+
+Text Win32Files::current_folder(TextView drive) {
+  std::array<wchar_t, MAX_PATH + 1> folder{};
+  const Text relative = drive.empty() ? Text(u".") : Text(drive) + u":.";
+  if (!drive.empty() && GetDriveTypeW(wide(Text(drive) + u":\\")) == DRIVE_NO_ROOT_DIR) return {};
+  const DWORD length = GetFullPathNameW(wide(relative), static_cast<DWORD>(folder.size()), folder.data(), nullptr);
+  return length < folder.size() ? Text(view(folder.data(), length)) : Text();
+}
+
+std::unique_ptr<InputFile> Win32Files::open_input(const Text& path) { return std::make_unique<Win32InputFile>(path); }
+
+std::unique_ptr<OutputFile> Win32Files::open_output(const Text& path) {
+  return std::make_unique<Win32OutputFile>(path);
+}
+
+void Win32Files::append(const Text& path, std::string_view bytes) {
+  const FileHandle file = open_file(path, FILE_APPEND_DATA | GENERIC_READ, shared, OPEN_ALWAYS);
+  // A byte beyond every file: those who append wait for one another, and nobody else notices.
+  OVERLAPPED far_byte{};
+  far_byte.Offset = 0xFFFFFFFE;
+  far_byte.OffsetHigh = 0x7FFFFFFF;
+  if (LockFileEx(file.get(), LOCKFILE_EXCLUSIVE_LOCK, 0, 1, 0, &far_byte) == 0) raise_last_error();
+  write_all(file, bytes);
+}
+
+}  // namespace talutil::win32

@@ -1,0 +1,45 @@
+#include "tests/platform/real_files.hpp"
+
+#include <gtest/gtest.h>
+
+#include <array>
+
+#include "platform/win32/handle.hpp"
+#include "platform/win32/win32_files.hpp"
+
+namespace talutil::testing {
+
+std::unique_ptr<Files> real_files() {
+  // Deleting is done by an automation object.
+  static const HRESULT apartment = CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
+  EXPECT_TRUE(SUCCEEDED(apartment));
+  return std::make_unique<win32::Win32Files>();
+}
+
+Text scratch_folder() {
+  static int count = 0;
+  std::array<wchar_t, MAX_PATH + 1> temporary{};
+  const DWORD length = GetTempPathW(static_cast<DWORD>(temporary.size()), temporary.data());
+  Text folder = Text(win32::view(temporary.data(), length)) + u"talutil" +
+                from_utf8(std::to_string(GetTickCount()) + "-" + std::to_string(++count)) + u"\\";
+  real_files()->make_path(folder);
+  return folder;
+}
+
+Text make_hidden_file(const Text& folder) {
+  const Text path = folder + u"hidden.txt";
+  real_files()->append(path, "");
+  SetFileAttributesW(win32::wide(path), FILE_ATTRIBUTE_HIDDEN);
+  return path;
+}
+
+void set_read_only(const Text& path, bool read_only) {
+  SetFileAttributesW(win32::wide(path), read_only ? FILE_ATTRIBUTE_READONLY : FILE_ATTRIBUTE_NORMAL);
+}
+
+std::shared_ptr<void> lock_file(const Text& path) {
+  return std::make_shared<win32::FileHandle>(
+      CreateFileW(win32::wide(path), GENERIC_READ, 0, nullptr, OPEN_EXISTING, 0, nullptr));
+}
+
+}  // namespace talutil::testing
