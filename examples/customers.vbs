@@ -25,19 +25,25 @@ Sub Main(arguments)
   started = Timer
   utils.CounterVerifyText = 0
   utils.CounterVerifyInt = 0
-  utils.iCharactercase = 1
-  utils.iCharacterCaseSuburbs = 1
+  utils.sDatabaseName = "Demo"
+  utils.sUserName = "demo"
+  utils.iCharactercase = Choice("NameCase")
+  utils.iCharacterCaseSuburbs = Choice("SuburbCase")
   size = CleanFile(files, arguments(0), arguments(1), arguments(2))
   Say "CounterVerifyText " & utils.CounterVerifyText & ", CounterVerifyInt " & utils.CounterVerifyInt
   Say size & " bytes of inserts to " & arguments(2) & " in " & Int((Timer - started) * 1000) / 1000 & " s"
   KeepRecord arguments(0), arguments(2)
 End Sub
 
+' A case style that the user has chosen; name case, which is then kept in the user's settings, until one has.
+Function Choice(name)
+  Choice = utils.GetCfgFileData("Cleaning", name, "1", utils.sNatNameD)
+End Function
+
 ' Copies the result line by line and notes in the event log beside it what was done.
 Sub KeepRecord(ByVal csvPath, ByVal sqlPath)
   utils.CopyFileToBackupFile sqlPath, sqlPath & ".bak"
   utils.EventLog = 1
-  utils.sUserName = "demo"
   utils.sORVPath = utils.ExtractPathName(sqlPath)
   utils.AppendEventLog utils.ExtractFilename(csvPath) & " cleaned", "customers.vbs"
 End Sub

@@ -186,6 +186,33 @@ Sub ToolkitErrors
   CheckError "a member to come", 445, "Object doesn't support this action"
 End Sub
 
+Sub Configuration
+  Dim files, ini, output
+  Set files = CreateObject("Scripting.FileSystemObject")
+  ini = files.GetSpecialFolder(2) & "\talutil-members.ini"
+  If files.FileExists(ini) Then files.DeleteFile ini
+  u.sDatabaseName = "Members"
+  u.sUserName = "anne"
+  Check "a missing file, no default", "", u.GetCfgFileData("S", "k", "NoDefaultData", ini, True)
+  output = "caf" & Chr(233)
+  u.SaveCfgFileData "S", "k", output, ini, True
+  Check "from a file", "caf" & Chr(233), u.GetCfgFileData("s", "K", "d", ini, True)
+  output = "\\server\share"
+  u.SaveCfgFileData "S", "unc", output, ini, True
+  Check "written back", "\", output
+  Check "never comes back", "d", u.GetCfgFileData("S", "unc", "d", ini, True)
+  Check "the first name", "k", u.GetCfgFileData("S", "", "d", ini, True)
+  Check "the default went to the store", "d", u.GetCfgFileData("S", "unc", "other", "any")
+  output = String(3000, "x") & vbCrLf & Chr(0) & "y"
+  u.SaveCfgFileData "A\B", "k=", output, "any"
+  Check "a long value of the store", output, u.GetCfgFileData("a\b", "K=", "d", "any")
+  u.sUserName = ""
+  Check "without a user, the database's", output, u.GetCfgFileData("A\B", "k=", "d", "any")
+  u.sUserName = "anne"
+  Check "the code counter has no default", "", u.GetCfgFileData("S", "none", "5", "CodeCount")
+  files.DeleteFile ini
+End Sub
+
 Sub Files
   Dim files, folder, list, path, text
   Set files = CreateObject("Scripting.FileSystemObject")
@@ -367,6 +394,7 @@ Toolkit
 ToolkitErrors
 ChecksAndCase
 Secrets
+Configuration
 Files
 FileErrors
 WriteBack
