@@ -28,7 +28,7 @@ Text read_profile(ORVUtils& utils, const Text& file, const Text& section, const 
 
 Text read_file(ORVUtils& utils, const Text& section, const Text& item, const Text& default_data, const Text& file) {
   if (utils.FileExists(file)) {
-    const Text value = read_profile(utils, file, section, item);
+    Text value = read_profile(utils, file, section, item);
     if (!value.empty()) return value;
   }
   if (default_data == no_default) return {};
@@ -52,7 +52,7 @@ Text read_store(const ORVUtils& utils, const Text& section, const Text& item, co
                 const Text& selector) {
   SettingsStore& store = utils.library().platform().settings_store;
   const Text group = group_of(utils.settings(), selector);
-  const Text value = store.value(group, section, item).value_or(Text());
+  Text value = store.value(group, section, item).value_or(Text());
   if (!value.empty() || group == settings_groups::code_count) return value;
   store.put(group, section, item, default_data);
   return default_data;

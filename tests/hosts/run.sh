@@ -67,7 +67,7 @@ client type_library
 client early
 client late
 client control
-rm -f "$pictures/message_box.png"
+rm -f "$pictures"/*.png
 take_pictures &
 pictures_pid=$!
 client window

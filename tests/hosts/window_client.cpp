@@ -121,7 +121,7 @@ SeenBox terminate_and_watch(_ORVUtils* u, short debug_mode, const Desktop& deskt
 }
 
 /// Asks for a folder with a title; the user chooses the folder of Windows, or closes the dialog.
-void folder_is_picked(_ORVUtils* u, const Desktop& desktop, bool chooses) {
+void folder_is_picked(_ORVUtils* u, const Desktop& desktop, const std::wstring& pictures, bool chooses) {
   constexpr UINT set_selection = WM_USER + 102;
   const std::string what = chooses ? "choosing a folder" : "closing the dialog";
   std::array<char, MAX_PATH> folder{};
@@ -131,6 +131,7 @@ void folder_is_picked(_ORVUtils* u, const Desktop& desktop, bool chooses) {
     owner = GetWindow(dialog, GW_OWNER);
     if (chooses) SendMessageW(dialog, set_selection, TRUE, reinterpret_cast<LPARAM>(folder.data()));
     Sleep(300);  // Until the tree has unfolded.
+    if (chooses) take_picture(pictures, L"folder_picker");
     PostMessageW(dialog, WM_COMMAND, chooses ? IDOK : IDCANCEL, 0);
   };
   Text chosen;
@@ -181,10 +182,10 @@ int wmain(int, wchar_t** arguments) {
   const Desktop desktop;
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
-    folder_is_picked(object.get(), desktop, true);
-    folder_is_picked(object.get(), desktop, false);
-    components_window_is_hidden(object.get());
     const std::wstring pictures = std::wstring(arguments[1]) + L"\\..\\screenshots";
+    folder_is_picked(object.get(), desktop, pictures, true);
+    folder_is_picked(object.get(), desktop, pictures, false);
+    components_window_is_hidden(object.get());
     box_has_text_and_button(terminate_and_watch(object.get(), 1, desktop, pictures));
     check(!terminate_and_watch(object.get(), -1, desktop, pictures).seen, "no box with DebugMode -1");
   });

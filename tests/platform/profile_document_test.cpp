@@ -32,7 +32,7 @@ TEST(ProfileDocument, Reads) {
        "[a]\nx=\x1A"
        "1\x1A\n",
        u"a", u"x", u"1"},
-      {"a NUL ends a value", {"[a]\nx=1\0y\nz=2", 14}, u"a", u"x", u"1"},
+      {"a NUL ends a value", {"[a]\nx=1\0y\nz=2", 13}, u"a", u"x", u"1"},
       {"code page 1252", "[a]\n\xE9=\x80", u"a", u"\u00C9", u"\u20AC"},
       {"UTF-8 with its mark", "\xEF\xBB\xBF[a]\nx=\xC5\x82", u"a", u"x", u"\u0142"},
       {"UTF-16 with its mark", {"\xFF\xFE[\0a\0]\0\n\0x\0=\0B\x01", 16}, u"a", u"x", u"\u0142"},

@@ -10,8 +10,8 @@
 #include <system_error>
 
 #include "automation/run_time_error.hpp"
-#include "platform/posix/data_folder.hpp"
 #include "platform/file_names.hpp"
+#include "platform/posix/data_folder.hpp"
 
 namespace talutil::posix {
 
@@ -105,8 +105,10 @@ std::string DrivePaths::native(TextView path) const {
     std::string as_it_is = to_utf8(path);
     if (exists(as_it_is)) return as_it_is;
   }
-  auto [result, rest] = path.starts_with(u'/') ? Place{"", path} : place_of(path);
-  const std::size_t floor = has_drive(path) ? folder_of(lower_case(path[0])).size() : 0;
+  const bool is_native = path.starts_with(u'/');
+  auto [result, rest] = is_native ? Place{"", path} : place_of(path);
+  const char16_t letter = has_drive(path) ? lower_case(path[0]) : current_drive();
+  const std::size_t floor = is_native ? 0 : folder_of(letter).size();
   while (!rest.empty()) {
     const std::size_t end = std::min(rest.find_first_of(separators), rest.size());
     const TextView part = rest.substr(0, end);

@@ -215,7 +215,18 @@ void Win32Files::append(const Text& path, std::string_view bytes) {
   far_byte.Offset = 0xFFFFFFFE;
   far_byte.OffsetHigh = 0x7FFFFFFF;
   if (LockFileEx(file.get(), LOCKFILE_EXCLUSIVE_LOCK, 0, 1, 0, &far_byte) == 0) raise_last_error();
-  write_all(file, bytes);
+  LARGE_INTEGER before{};
+  if (GetFileSizeEx(file.get(), &before) == 0) raise_last_error();
+  try {
+    write_all(file, bytes);
+  } catch (const RunTimeError&) {
+    // A part of the line is worse than none: the next one would be glued to it.
+    const FileHandle whole = open_file(path, GENERIC_WRITE, shared, OPEN_EXISTING);
+    if (SetFilePointerEx(whole.get(), before, nullptr, FILE_BEGIN) == 0 || SetEndOfFile(whole.get()) == 0) {
+      raise(ErrorNumber::device_io_error);
+    }
+    throw;
+  }
 }
 
 }  // namespace talutil::win32
