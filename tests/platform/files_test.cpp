@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <array>
+#include <future>
 
 #include "platform/file_names.hpp"
 #include "tests/fakes/error_of.hpp"
@@ -118,9 +119,16 @@ TEST_F(RealFiles, ReadOnlyAndLockedFilesStay) {
   set_read_only(folder + u"a.txt", false);
   {
     const auto lock = lock_file(folder + u"a.txt");
-    EXPECT_EQ(error_of([&] { (void)read(u"a.txt"); }), 70);
-    EXPECT_EQ(error_of([&] { write(u"a.txt", "new"); }), 70);
-    EXPECT_EQ(error_of([&] { files->append(folder + u"a.txt", "x"); }), 70);
+    // At once, as each may wait a while for the lock.
+    const auto error_in_thread = [](auto call) {
+      return std::async(std::launch::async, [call] { return error_of(call); });
+    };
+    auto reading = error_in_thread([&] { (void)read(u"a.txt"); });
+    auto writing = error_in_thread([&] { write(u"a.txt", "new"); });
+    auto appending = error_in_thread([&] { files->append(folder + u"a.txt", "x"); });
+    EXPECT_EQ(reading.get(), 70);
+    EXPECT_EQ(writing.get(), 70);
+    EXPECT_EQ(appending.get(), 70);
   }
   EXPECT_EQ(read(u"a.txt"), "old");
 }
