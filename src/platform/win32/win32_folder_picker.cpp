@@ -30,7 +30,7 @@ std::optional<Text> Win32FolderPicker::choose(TextView title, std::intptr_t owne
 
   const std::string caption = to_platform_ansi(title);
   BROWSEINFOA dialog{};
-  dialog.hwndOwner = reinterpret_cast<HWND>(owner);
+  dialog.hwndOwner = reinterpret_cast<HWND>(owner);  // NOLINT(performance-no-int-to-ptr): the seam keeps handles so.
   dialog.lpszTitle = caption.c_str();
   PIDLIST_ABSOLUTE const items = browse(&dialog);
   if (items == nullptr) return std::nullopt;

@@ -27,10 +27,15 @@ struct CloseKey {
 };
 using Key = std::unique_ptr<std::remove_pointer_t<HKEY>, CloseKey>;
 
+/// Names end at a NUL, as the system's do.
+Text up_to_nul(const Text& name) { return name.substr(0, name.find(u'\0')); }
+
 Text path_of(const Text& application, const Text& section) {
-  const Text path = Text(settings_key) + application.c_str();
-  return section.empty() ? path : path + u'\\' + section.c_str();
+  const Text path = Text(settings_key) + up_to_nul(application);
+  return section.empty() ? path : path + u'\\' + up_to_nul(section);
 }
+
+DWORD bytes_of(std::size_t units) { return static_cast<DWORD>(units) * DWORD{sizeof(char16_t)}; }
 
 void require(LSTATUS status, const Text& path) {
   if (status == ERROR_SUCCESS) return;
@@ -71,7 +76,7 @@ std::optional<Text> Win32SettingsStore::value(const Text& application, const Tex
   // Another process can make it longer between the two questions.
   while (status == ERROR_SUCCESS || status == ERROR_MORE_DATA) {
     text.resize((bytes + 1) / sizeof(char16_t));
-    bytes = static_cast<DWORD>(text.size() * sizeof(char16_t));
+    bytes = bytes_of(text.size());
     status = RegQueryValueExW(handle, wide(key), nullptr, &type, reinterpret_cast<BYTE*>(text.data()), &bytes);
     if (status == ERROR_SUCCESS) break;
   }
@@ -87,7 +92,7 @@ void Win32SettingsStore::put(const Text& application, const Text& section, const
   require(RegCreateKeyExW(HKEY_CURRENT_USER, wide(path), 0, nullptr, 0, KEY_SET_VALUE, nullptr, &handle, nullptr),
           path);
   const Key opened(handle);
-  const auto bytes = static_cast<DWORD>((value.size() + 1) * sizeof(char16_t));
+  const DWORD bytes = bytes_of(value.size() + 1);
   require(RegSetValueExW(handle, wide(key), 0, REG_SZ, reinterpret_cast<const BYTE*>(value.c_str()), bytes), path);
 }
 
