@@ -2,18 +2,10 @@
 
 #include <chrono>
 
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/fake_platform.hpp"
+#include "bench/toolkit.hpp"
 
 namespace talutil {
 namespace {
-
-struct Toolkit {
-  testing::FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
-};
 
 void text_to_date(benchmark::State& state, TextView text) {
   for (auto _ : state) benchmark::DoNotOptimize(talutil::text_to_date(text, 2009));

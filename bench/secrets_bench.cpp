@@ -1,18 +1,10 @@
 #include <benchmark/benchmark.h>
 
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/fake_platform.hpp"
+#include "bench/toolkit.hpp"
 #include "text/name_case.hpp"
 
 namespace talutil {
 namespace {
-
-struct Toolkit {
-  testing::FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
-};
 
 // The first text of a process waits for its key.
 void first_encryption(benchmark::State& state) {

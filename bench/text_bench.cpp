@@ -5,21 +5,13 @@
 #include <random>
 #include <vector>
 
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/fake_platform.hpp"
+#include "bench/toolkit.hpp"
 
 namespace talutil {
 namespace {
 
 constexpr std::int64_t kilobyte = 1024;
 constexpr std::int64_t megabyte = 1024 * kilobyte;
-
-struct Toolkit {
-  testing::FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
-};
 
 /// Words of the given letters with blanks, line breaks and commas between them, and one special character in
 /// fifty: text as users type and paste it. No blanks stand at the ends, since those would be trimmed.

@@ -70,6 +70,8 @@ char32_t next_code(std::string_view bytes, std::size_t& at) noexcept {
 
 }  // namespace
 
+TextView up_to_nul(TextView text) noexcept { return text.substr(0, text.find(u'\0')); }
+
 TextView trim_blanks(TextView text) noexcept {
   const std::size_t first = text.find_first_not_of(u' ');
   if (first == TextView::npos) return {};

@@ -13,6 +13,9 @@ using TextView = std::u16string_view;
 /// Removes blanks (code 32) at both ends. Tabs, line breaks and no-break blanks stay, as in the hosts' Trim.
 [[nodiscard]] TextView trim_blanks(TextView text) noexcept;
 
+/// The text before its first NUL: what a platform's C string would hold.
+[[nodiscard]] TextView up_to_nul(TextView text) noexcept;
+
 /// Blanks, tabs, line breaks and their relatives beyond ASCII: what conversions from text skip at the ends.
 [[nodiscard]] bool is_white_space(char16_t unit) noexcept;
 

@@ -48,7 +48,8 @@ class ConfigSession {
   }
 
   [[nodiscard]] ORVUtils& utils() noexcept { return session_.utils(); }
-  [[nodiscard]] posix::PosixSettingsStore& store() noexcept { return session_.platform().settings_store; }
+  [[nodiscard]] posix::PosixPlatform& platform() noexcept { return session_.platform(); }
+  [[nodiscard]] posix::PosixSettingsStore& store() noexcept { return platform().settings_store; }
   [[nodiscard]] const SharedSettings& settings() noexcept { return session_.settings(); }
 
  private:
@@ -115,8 +116,11 @@ void config_set(const ConfigOptions& options) {
               << ": an empty value, and one that begins with a backslash, is read as a "
               << "missing one\n";
   }
-  // The platform tells nobody of a file that cannot be written.
-  if (session.utils().library().platform().profiles.value(file, section, item).empty()) {
+  // The platform tells nobody of a file that cannot be written: what is read now tells.
+  ProfileDocument expected("");
+  expected.put(section, item, from_ansi(to_ansi(written)));
+  const Text read = session.platform().profiles.value(file, section, item);
+  if (expected.value(section, item).value_or(Text()).substr(0, Profiles::longest_value) != read) {
     throw run_time_failure("cannot write " + place_of(options));
   }
 }
@@ -124,8 +128,9 @@ void config_set(const ConfigOptions& options) {
 void config_list(const ConfigOptions& options) {
   ConfigSession session(options);
   const Text section = ConfigSession::text(options.section, "SECTION");
-  print_settings(options.file.empty() ? session.store().settings_of(session.group()) : settings_in(options.file),
-                 section);
+  if (options.file.empty()) return print_settings(session.store().settings_of(session.group()), section);
+  const Text file = ConfigSession::text(options.file, "--file");
+  print_settings(settings_in(session.platform().files.native(file)), section);
 }
 
 void config_export(const ConfigOptions& options) {

@@ -27,9 +27,6 @@ TextView trim(TextView text) noexcept {
   return text;
 }
 
-/// What a C string of it would hold.
-TextView up_to_nul(TextView text) noexcept { return text.substr(0, text.find(u'\0')); }
-
 bool is_name(TextView a, TextView b) noexcept { return equals_without_case(trim(a), trim(b)); }
 
 /// The name between the brackets; empty where the line is no header.

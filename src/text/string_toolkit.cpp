@@ -56,7 +56,7 @@ Text replace_word(TextView text, TextView word, TextView replacement) {
 
 }  // namespace
 
-Text ORVUtils::StripNulls(const Text& s) { return s.substr(0, s.find(u'\0')); }
+Text ORVUtils::StripNulls(const Text& s) { return Text(up_to_nul(s)); }
 
 Text ORVUtils::RemoveNumberFromString(const Text& sTemp) {
   // A character without an ANSI substitute counts as a question mark and goes too.

@@ -230,7 +230,10 @@ expect 'a profile file' 0 '' config set --file a.ini S k ' v '
 verdict 'its value' 'v' "$("$talutil" config get --file a.ini s K)"
 expect_part 'what a profile cannot keep' 0 'is read as a missing one' config set --file a.ini S k '\\server'
 expect 'a profile nobody can write' 1 'talutil: cannot write k in [S] of none/a.ini' config set --file none/a.ini S k v
-expect 'through the member' 0 d call GetCfgFileData S k d a.ini True
+"$talutil" config set --file a.ini S k v && chmod 444 a.ini
+expect 'a read-only profile' 1 'talutil: cannot write k in [S] of a.ini' config set --file a.ini S k w
+verdict 'list of a profile by a Windows path' $'[S]\nk=v' "$("$talutil" config list --file "Z:${work//\//\\}\\A.INI")"
+expect 'through the member' 0 d call GetCfgFileData S none d a.ini True
 echo 'not a database, but a file long enough to be taken for something else' >bad.db
 TALUTIL_HIVE=bad.db expect 'a damaged store is named' 1 \
   'talutil: error 57: Cannot use the settings in bad.db: file is not a database' config list --database Main --user anne

@@ -39,12 +39,9 @@ Text as_read(TextView text) { return from_ansi(to_ansi(text.substr(0, Profiles::
 
 /// A key of the hive; the application and the section end at a NUL, as the platform's names do.
 Text key_of(const Text& application, const Text& section) {
-  const auto name = [](const Text& text) { return text.substr(0, text.find(u'\0')); };
-  Text key = Text(settings_key) + name(application);
-  return section.empty() ? key : key + u'\\' + name(section);
+  const Text key = Text(settings_key).append(up_to_nul(application));
+  return section.empty() ? key : (key + u'\\').append(up_to_nul(section));
 }
-
-Text name_of(const Text& key) { return key.substr(0, key.find(u'\0')); }
 
 }  // namespace
 
@@ -82,13 +79,13 @@ void PosixProfiles::put(const Text& file, const Text& section, const Text& item,
 }
 
 std::optional<Text> PosixSettingsStore::value(const Text& application, const Text& section, const Text& key) {
-  const auto found = hive_.value(key_of(application, section), name_of(key));
+  const auto found = hive_.value(key_of(application, section), up_to_nul(key));
   if (!found || found->type != text_type) return std::nullopt;
   return from_utf16_bytes(found->data);
 }
 
 void PosixSettingsStore::put(const Text& application, const Text& section, const Text& key, const Text& value) {
-  hive_.put(key_of(application, section), name_of(key), {text_type, to_utf16_bytes(value)});
+  hive_.put(key_of(application, section), up_to_nul(key), {text_type, to_utf16_bytes(value)});
 }
 
 std::vector<PosixSettingsStore::Setting> PosixSettingsStore::settings_of(const Text& application) {

@@ -28,11 +28,9 @@ struct CloseKey {
 using Key = std::unique_ptr<std::remove_pointer_t<HKEY>, CloseKey>;
 
 /// Names end at a NUL, as the system's do.
-Text up_to_nul(const Text& name) { return name.substr(0, name.find(u'\0')); }
-
 Text path_of(const Text& application, const Text& section) {
-  const Text path = Text(settings_key) + up_to_nul(application);
-  return section.empty() ? path : path + u'\\' + up_to_nul(section);
+  const Text path = Text(settings_key).append(up_to_nul(application));
+  return section.empty() ? path : (path + u'\\').append(up_to_nul(section));
 }
 
 DWORD bytes_of(std::size_t units) { return static_cast<DWORD>(units) * DWORD{sizeof(char16_t)}; }
