@@ -6,8 +6,8 @@ talutil_top=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)
 talutil_build=${TALUTIL_BUILD:-$talutil_top/build}
 talutil_cache=${XDG_CACHE_HOME:-$HOME/.cache}/talutil
 
-native_packages="build-essential cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata"
-windows_packages="binutils debootstrap debian-archive-keyring g++-mingw-w64-i686-posix mingw-w64-tools xvfb xauth"
+native_packages="build-essential zlib1g-dev cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata"
+windows_packages="binutils libz-mingw-w64-dev debootstrap debian-archive-keyring g++-mingw-w64-i686-posix mingw-w64-tools xvfb xauth"
 
 fail() {
   printf '%s: %s\n' "$(basename "$0")" "$*" >&2

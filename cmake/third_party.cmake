@@ -1,0 +1,31 @@
+# The libraries that tools/third_party.sh builds: archives::zip, archives::deflate and documents::pdf.
+set(flavour native)
+if(WIN32)
+  set(flavour windows)
+elseif(TALUTIL_FUZZ)
+  set(flavour fuzz)
+endif()
+execute_process(COMMAND ${CMAKE_SOURCE_DIR}/tools/third_party.sh ${flavour} OUTPUT_VARIABLE third_party
+                OUTPUT_STRIP_TRAILING_WHITESPACE RESULT_VARIABLE status)
+if(NOT status EQUAL 0)
+  message(FATAL_ERROR "tools/third_party.sh ${flavour} failed; its reason stands above")
+endif()
+set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS tools/third_party.sh)
+find_package(ZLIB REQUIRED)
+
+function(talutil_import name archive)
+  add_library(${name} STATIC IMPORTED)
+  set_target_properties(${name} PROPERTIES IMPORTED_LOCATION ${third_party}/lib/${archive}
+                        INTERFACE_INCLUDE_DIRECTORIES ${third_party}/include)
+endfunction()
+talutil_import(archives::zip libzip.a)
+talutil_import(archives::deflate libdeflate.a)
+talutil_import(documents::pdf libhpdf.a)
+target_link_libraries(archives::zip INTERFACE ZLIB::ZLIB)
+target_link_libraries(documents::pdf INTERFACE ZLIB::ZLIB)
+if(WIN32)
+  # As the library was built: 64-bit times.
+  target_compile_definitions(archives::zip INTERFACE __MINGW_USE_VC2005_COMPAT)
+else()
+  target_link_libraries(archives::zip INTERFACE OpenSSL::Crypto)
+endif()
