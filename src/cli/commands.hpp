@@ -66,6 +66,31 @@ void config_list(const ConfigOptions& options);
 void config_export(const ConfigOptions& options);
 void config_import(const ConfigOptions& options);
 
+struct ZipOptions {
+  std::string archive;
+  std::vector<std::string> items;
+  std::string password_file;  ///< "-" is standard input; empty for none.
+  bool encrypt = false;       ///< Asks for the password at the terminal.
+  bool aes = false;
+  bool no_folders = false;
+  std::int32_t level = 6;
+  std::uint64_t volume_size = 0;  ///< 0 for one archive.
+  std::string comment;
+  bool test = false;
+};
+void zip(const ZipOptions& options);
+
+struct UnzipOptions {
+  std::string archive;
+  std::vector<std::string> items;
+  std::string destination = ".";
+  std::string password_file;
+  bool overwrite = false;
+  bool no_folders = false;
+  bool list = false;
+};
+void unzip(const UnzipOptions& options);
+
 struct LogTailOptions {
   std::string path;  ///< The event log, or the folder it is in.
   std::int64_t lines = 10;

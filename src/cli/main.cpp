@@ -22,6 +22,8 @@ struct Request {
   SecretOptions secret;
   PasswordOptions password;
   ConfigOptions config;
+  ZipOptions zip;
+  UnzipOptions unzip;
   LogTailOptions log_tail;
   std::function<void()> run;
 };
@@ -143,6 +145,38 @@ void add_config(CLI::App& app, Request& request) {
   for (CLI::App* const command : {exporting, importing}) command->add_option("FILE", options.profile)->required();
 }
 
+void add_archives(CLI::App& app, Request& request) {
+  ZipOptions& packing = request.zip;
+  auto* const zip = app.add_subcommand("zip", "Pack files into an archive, or add to it; or test one");
+  zip->add_option("ARCHIVE", packing.archive)->required();
+  zip->add_option("ITEM", packing.items, "Files, folders with all that is in them, or patterns (\"C:\\DATA\\*.*\")");
+  zip->add_flag("--test", packing.test, "Read the archive, or the entries named, and check every byte; write nothing");
+  zip->add_flag("--encrypt", packing.encrypt, "Ask for a password and encrypt with it");
+  zip->add_option("--password-file", packing.password_file, "The password is the first line of this file; - is input");
+  zip->add_flag("--aes", packing.aes, "Encrypt with AES-256, which not every program reads");
+  zip->add_flag("--no-folders", packing.no_folders, "Name entries without their folders");
+  zip->add_option("--level", packing.level, "0 stores, 1 is fast, 9 small")
+      ->check(CLI::Range(0, 9))
+      ->capture_default_str();
+  zip->add_option("--volumes", packing.volume_size, "Make a split set of volumes of so many bytes (100000000, 650MB)")
+      ->transform(CLI::AsSizeValue(true));
+  zip->add_option("--comment", packing.comment, "The comment of the archive");
+  zip->footer("  talutil password | tee key | talutil zip backup.zip DATA --password-file -");
+  zip->callback([&] { request.run = [&] { talutil::cli::zip(packing); }; });
+
+  UnzipOptions& unpacking = request.unzip;
+  auto* const unzip = app.add_subcommand("unzip", "Unpack an archive, or the last volume of a split set");
+  unzip->add_option("ARCHIVE", unpacking.archive)->required();
+  unzip->add_option("ITEM", unpacking.items, "Entries, folders or patterns; all if none is given");
+  unzip->add_option("--to", unpacking.destination, "The folder to unpack below, made if missing")
+      ->capture_default_str();
+  unzip->add_option("--password-file", unpacking.password_file, "The password is its first line; - is standard input");
+  unzip->add_flag("--overwrite", unpacking.overwrite, "Replace files that are there; else they are kept");
+  unzip->add_flag("--no-folders", unpacking.no_folders, "Write all files into one folder");
+  unzip->add_flag("--list", unpacking.list, "List the entries instead: size, packed size, time (UTC), name");
+  unzip->callback([&] { request.run = [&] { talutil::cli::unzip(unpacking); }; });
+}
+
 void add_log(CLI::App& app, Request& request) {
   auto* const command = app.add_subcommand("log", "Look at an event log");
   command->require_subcommand(1);
@@ -193,6 +227,7 @@ int run(std::vector<std::string> words) {
   add_clean(app, request);
   add_secrets(app, request);
   add_config(app, request);
+  add_archives(app, request);
   add_log(app, request);
   add_printers(app, request);
   if (!words.empty() && !words.front().starts_with('-')) check_subcommand(app, words.front());

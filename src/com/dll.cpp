@@ -13,7 +13,9 @@
 #include "platform/win32/win32_cryptography.hpp"
 #include "platform/win32/win32_files.hpp"
 #include "platform/win32/win32_folder_picker.hpp"
+#include "platform/win32/win32_folders.hpp"
 #include "platform/win32/win32_guids.hpp"
+#include "platform/win32/win32_password_boxes.hpp"
 #include "platform/win32/win32_platform.hpp"
 #include "platform/win32/win32_settings.hpp"
 #include "platform/win32/win32_time_conversions.hpp"
@@ -39,9 +41,11 @@ struct LoadedLibrary {
   win32::Win32Files files;
   win32::Win32FolderPicker folder_picker;
   win32::Win32Guids guids;
+  win32::Win32Folders folders;
+  win32::Win32PasswordBoxes password_boxes;
   Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers, message_pump,
                            random_source, cryptography, profiles, settings_store, time_conversions, files,
-                           folder_picker, guids}};
+                           folder_picker, guids, folders, password_boxes}};
 };
 
 struct Module {

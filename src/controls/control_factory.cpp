@@ -6,6 +6,7 @@
 #include "controls/crypto.hpp"
 #include "controls/name_case_converter.hpp"
 #include "controls/system_information.hpp"
+#include "controls/zip_controls.hpp"
 
 namespace talutil {
 
@@ -26,8 +27,8 @@ ControlFactory::ControlFactory(const Platform& platform)
           {u"VSFlex8Ctl.VSFlexGrid", &make<ReservedControl>},
           {u"SystemInfoControl.MSysInfo", &make<SystemInformation>},
           {Text(NameCaseConverter::class_name), &make<NameCaseConverter>},
-          {u"DUZACTXLibCtl.duzactxctrl", &make<ReservedControl>},
-          {u"DZACTXLibCtl.dzactxctrl", &make<ReservedControl>},
+          {u"DUZACTXLibCtl.duzactxctrl", &make<UnzipControl>},
+          {u"DZACTXLibCtl.dzactxctrl", &make<ZipControl>},
       } {}
 
 void ControlFactory::register_maker(TextView class_name, Maker maker) { makers_[Text(class_name)] = maker; }

@@ -6,6 +6,7 @@
 #include "dates/week_tables.hpp"
 #include "library/shared_settings.hpp"
 #include "platform/platform.hpp"
+#include "services/mod_zip_files.hpp"
 
 namespace talutil {
 
@@ -26,6 +27,7 @@ class Library {
 
   [[nodiscard]] SharedSettings& settings() noexcept { return settings_; }
   [[nodiscard]] WeekTables& week_tables() noexcept { return week_tables_; }
+  [[nodiscard]] ModZipFiles& zip_files() noexcept { return zip_files_; }
   [[nodiscard]] const Platform& platform() const noexcept { return platform_; }
   [[nodiscard]] FrmComponents& components() noexcept { return *components_; }
   [[nodiscard]] ControlFactory& controls() noexcept { return *controls_; }
@@ -37,6 +39,7 @@ class Library {
   Platform platform_;
   SharedSettings settings_;
   WeekTables week_tables_;
+  ModZipFiles zip_files_;
   Locale locale_;
   std::unique_ptr<ControlFactory> controls_;
   std::unique_ptr<FrmComponents> components_;

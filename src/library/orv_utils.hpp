@@ -286,8 +286,15 @@ class ORVUtils {
   /// Raises what the store raises.
   virtual void SaveCfgFileData(const Text& sSection, const Text& sItem, Text& sOutput, const Text& sFilename,
                                const Boolean& bSaveToFile);
+
+  /// Packs the items of a list (see item_list.hpp) into an archive, encrypted where a password is given; 1 for
+  /// iMultiVolume makes a split set. What goes wrong is told in a message box and not to the caller. bUseFilePath is
+  /// not used.
   virtual void CallZIPFiles(const Text& sZipName, const Text& sItems, const std::int16_t& iMultiVolume,
                             const Text& sEncryptionPassword, const Boolean& bUseFilePath);
+
+  /// Unpacks the entries of a list, or all, below a folder. What goes wrong is told in a message box. Encrypted entries
+  /// are tried with the password of the last CallZIPFiles, then the user is asked.
   virtual void CallUnZIPFiles(const Text& sUnZipName, const Text& sDestPath, const Text& sItems,
                               const Boolean& bOverWrite);
 

@@ -22,8 +22,6 @@ Boolean ORVUtils::CheckDeleteRecord() { not_built(); }
 Boolean ORVUtils::CheckModifyDatabase(const Text&) { not_built(); }
 void ORVUtils::ShowShortCutKeys() { not_built(); }
 void ORVUtils::ShowCmdLineHelp() { not_built(); }
-void ORVUtils::CallZIPFiles(const Text&, const Text&, const std::int16_t&, const Text&, const Boolean&) { not_built(); }
-void ORVUtils::CallUnZIPFiles(const Text&, const Text&, const Text&, const Boolean&) { not_built(); }
 void ORVUtils::MyDrawText(const std::int16_t&, const std::int16_t&, const std::int16_t&, const std::int16_t&,
                           const Variant&, const std::int32_t&, const std::int16_t&, const Boolean&, const Boolean&) {
   not_built();

@@ -10,19 +10,6 @@ namespace talutil {
 
 namespace {
 
-/// Names that are devices in every folder, whatever follows a dot, blank or colon.
-bool is_device_name(TextView part) {
-  constexpr std::array<TextView, 4> plain = {u"CON", u"PRN", u"AUX", u"NUL"};
-  constexpr std::array<TextView, 2> numbered = {u"COM", u"LPT"};
-  TextView stem = part.substr(0, part.find_first_of(u".:"));
-  stem = stem.substr(0, stem.find_last_not_of(u' ') + 1);
-  const auto is_stem = [&](TextView name) { return equals_without_case(stem, name); };
-  if (std::ranges::any_of(plain, is_stem)) return true;
-  if (stem.size() != 4 || stem.back() < u'1' || stem.back() > u'9') return false;
-  stem.remove_suffix(1);
-  return std::ranges::any_of(numbered, is_stem);
-}
-
 /// How the file system reads a pattern: the wildcards beside dots have meanings of their own.
 enum class Kind : std::uint8_t {
   unit,
@@ -109,6 +96,18 @@ class Matcher {
 };
 
 }  // namespace
+
+bool is_device_name(TextView part) {
+  constexpr std::array<TextView, 4> plain = {u"CON", u"PRN", u"AUX", u"NUL"};
+  constexpr std::array<TextView, 2> numbered = {u"COM", u"LPT"};
+  TextView stem = part.substr(0, part.find_first_of(u".:"));
+  stem = stem.substr(0, stem.find_last_not_of(u' ') + 1);
+  const auto is_stem = [&](TextView name) { return equals_without_case(stem, name); };
+  if (std::ranges::any_of(plain, is_stem)) return true;
+  if (stem.size() != 4 || stem.back() < u'1' || stem.back() > u'9') return false;
+  stem.remove_suffix(1);
+  return std::ranges::any_of(numbered, is_stem);
+}
 
 TextView last_part(TextView path) noexcept {
   const std::size_t end = path.find_last_of(u"\\/:");

@@ -13,6 +13,9 @@ constexpr TextView separators = u"\\/";
 /// True for a path that names a folder's contents rather than the folder: it ends in a separator or a colon.
 [[nodiscard]] bool is_open_ended(TextView path) noexcept;
 
+/// Names that are devices in every folder, whatever follows a dot, blank or colon: CON, NUL, COM1 and their like.
+[[nodiscard]] bool is_device_name(TextView part);
+
 /// Checks the path of a file to be opened. Raises 75 for an empty one and 52 for one that names no file: with a NUL
 /// or one of `*?"<>|` in it, of a device (CON, NUL, COM1, with any extension), or in the device name space (\\.\).
 void require_file_name(TextView path);

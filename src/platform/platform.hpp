@@ -10,7 +10,9 @@
 #include "platform/cryptography.hpp"
 #include "platform/files.hpp"
 #include "platform/folder_picker.hpp"
+#include "platform/folders.hpp"
 #include "platform/guids.hpp"
+#include "platform/password_boxes.hpp"
 #include "platform/settings.hpp"
 #include "platform/time_conversions.hpp"
 
@@ -110,6 +112,8 @@ struct Platform {
   Files& files;
   FolderPicker& folder_picker;
   Guids& guids;
+  Folders& folders;
+  PasswordBoxes& password_boxes;
 };
 
 }  // namespace talutil

@@ -26,6 +26,8 @@ struct FakePlatform final : MessageBoxes,
                             ControlMakers,
                             MessagePump,
                             RandomSource,
+                            Folders,
+                            PasswordBoxes,
                             CalendarTimeConversions {
   struct Message {
     Text text;
@@ -58,6 +60,9 @@ struct FakePlatform final : MessageBoxes,
   std::function<void(std::span<std::uint8_t>)> random_bytes;  ///< In the place of the generator, where it is set.
   std::unique_ptr<Cryptography> cryptography = make_cryptography();  ///< The real one: it needs no machine.
 
+  std::deque<Text> passwords;  ///< What is typed into password boxes; without one they are cancelled.
+  std::vector<Text> password_prompts;
+
   FakeProfiles profiles;
   FakeSettingsStore settings_store;
 
@@ -68,6 +73,7 @@ struct FakePlatform final : MessageBoxes,
   // Real parts, for tests on a platform that is fake but for one of them.
   TimeConversions* real_time_conversions = nullptr;
   Files* real_files = nullptr;
+  Folders* real_folders = nullptr;
 
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;
@@ -76,8 +82,10 @@ struct FakePlatform final : MessageBoxes,
   [[nodiscard]] Platform platform() {
     TimeConversions& conversions = real_time_conversions == nullptr ? *this : *real_time_conversions;
     Files& used_files = real_files == nullptr ? files : *real_files;
-    return {*this,         *this,    *this,          *this,       *this,      *this,         *this, *this,
-            *cryptography, profiles, settings_store, conversions, used_files, folder_picker, guids};
+    Folders* used_folders = real_folders == nullptr ? this : real_folders;
+    return {*this,      *this,         *this,         *this,         *this,          *this,
+            *this,      *this,         *cryptography, profiles,      settings_store, conversions,
+            used_files, folder_picker, guids,         *used_folders, *this};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
@@ -105,6 +113,16 @@ struct FakePlatform final : MessageBoxes,
     return true;
   }
   bool wait_and_handle() override { return ++waits < quits_after_waits; }
+
+  std::unique_ptr<Folder> open(const Text& /*path*/) override { raise(ErrorNumber::path_not_found); }
+
+  std::optional<Text> ask(TextView prompt, TextView /*title*/) override {
+    password_prompts.emplace_back(prompt);
+    if (passwords.empty()) return std::nullopt;
+    Text answer = passwords.front();
+    passwords.pop_front();
+    return answer;
+  }
 
   void fill(std::span<std::uint8_t> bytes) override {
     if (random_bytes) return random_bytes(bytes);

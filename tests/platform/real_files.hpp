@@ -3,11 +3,13 @@
 #include <memory>
 
 #include "platform/files.hpp"
+#include "platform/folders.hpp"
 
 /// The platform's own files, for the tests that hold for both platforms.
 namespace talutil::testing {
 
 [[nodiscard]] std::unique_ptr<Files> real_files();
+[[nodiscard]] std::unique_ptr<Folders> real_folders();
 
 /// An empty folder of this run's own, with a separator at its end, on a drive.
 [[nodiscard]] Text scratch_folder();

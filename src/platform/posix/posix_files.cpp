@@ -33,10 +33,7 @@ std::uint32_t stored_attributes(const std::string& path) {
 
 std::uint32_t attributes_of(const std::string& path, const struct stat& status) {
   const std::string_view name = std::string_view(path).substr(path.find_last_of('/') + 1);
-  std::uint32_t result = stored_attributes(path);
-  if (name.starts_with('.') && name != "." && name != "..") result |= file_attribute::hidden;
-  if (S_ISDIR(status.st_mode)) return result | file_attribute::folder;
-  return (status.st_mode & all_write_bits) == 0 ? result | file_attribute::read_only : result;
+  return stored_attributes(path) | attributes_by_status(name, status);
 }
 
 /// Whether a search with the mask gives an entry. Neither files nor folders (devices, dead links) are given.
@@ -156,6 +153,13 @@ class PosixOutputFile final : public OutputFile {
 };
 
 }  // namespace
+
+std::uint32_t attributes_by_status(std::string_view name, const struct stat& status) {
+  std::uint32_t result = 0;
+  if (name.starts_with('.') && name != "." && name != "..") result |= file_attribute::hidden;
+  if (S_ISDIR(status.st_mode)) return result | file_attribute::folder;
+  return (status.st_mode & all_write_bits) == 0 ? result | file_attribute::read_only : result;
+}
 
 void PosixFiles::search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) {
   require_pattern(pattern);

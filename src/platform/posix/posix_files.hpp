@@ -1,9 +1,14 @@
 #pragma once
 
+#include <sys/stat.h>
+
 #include "platform/files.hpp"
 #include "platform/posix/drive_paths.hpp"
 
 namespace talutil::posix {
+
+/// The attributes that the name and the status of a file tell: hidden, folder, read-only.
+[[nodiscard]] std::uint32_t attributes_by_status(std::string_view name, const struct stat& status);
 
 /// Files and folders as DrivePaths places them. Hidden are names with a leading dot and files whose stored attribute
 /// says so (the extended attribute user.DOSATTRIB, "0x2"); read-only are files that nobody may write.

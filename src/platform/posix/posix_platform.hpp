@@ -4,7 +4,9 @@
 #include "platform/posix/posix_cryptography.hpp"
 #include "platform/posix/posix_files.hpp"
 #include "platform/posix/posix_folder_picker.hpp"
+#include "platform/posix/posix_folders.hpp"
 #include "platform/posix/posix_guids.hpp"
+#include "platform/posix/posix_password_boxes.hpp"
 #include "platform/posix/posix_settings.hpp"
 #include "platform/posix/posix_time_conversions.hpp"
 
@@ -73,15 +75,17 @@ struct PosixPlatform {
   PosixFiles files;
   PosixFolderPicker folder_picker;
   PosixGuids guids;
+  PosixFolders folders;
+  PosixPasswordBoxes password_boxes;
   PosixProfiles profiles{files};
   Hive hive{Hive::default_path()};
   PosixSettingsStore settings_store{hive};
   PosixTimeConversions time_conversions;
 
   [[nodiscard]] Platform platform() {
-    return {message_boxes,  screen,           computer,      clock,         form_windows,
-            control_makers, message_pump,     random_source, cryptography,  profiles,
-            settings_store, time_conversions, files,         folder_picker, guids};
+    return {message_boxes, screen,        computer,     clock,    form_windows,   control_makers,
+            message_pump,  random_source, cryptography, profiles, settings_store, time_conversions,
+            files,         folder_picker, guids,        folders,  password_boxes};
   }
 };
 

@@ -27,6 +27,17 @@ class FileHandle {
   HANDLE handle_;
 };
 
+/// Ends a search of the system.
+struct FindHandle {
+  HANDLE handle;
+  explicit FindHandle(HANDLE found) : handle(found) {}
+  FindHandle(const FindHandle&) = delete;
+  FindHandle& operator=(const FindHandle&) = delete;
+  ~FindHandle() {
+    if (handle != INVALID_HANDLE_VALUE) FindClose(handle);
+  }
+};
+
 /// A function of a system library that few callers need: loaded at its first use, so that others do not wait for it.
 /// Null when the library or the function is missing.
 template <class Function>

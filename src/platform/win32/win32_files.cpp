@@ -136,17 +136,6 @@ class Win32OutputFile final : public OutputFile {
   FileHandle file_;
 };
 
-/// Ends a search of the system.
-struct FindHandle {
-  HANDLE handle;
-  explicit FindHandle(HANDLE found) : handle(found) {}
-  FindHandle(const FindHandle&) = delete;
-  FindHandle& operator=(const FindHandle&) = delete;
-  ~FindHandle() {
-    if (handle != INVALID_HANDLE_VALUE) FindClose(handle);
-  }
-};
-
 bool is_nothing_found(DWORD code) {
   return code == ERROR_FILE_NOT_FOUND || code == ERROR_PATH_NOT_FOUND || code == ERROR_NO_MORE_FILES;
 }

@@ -9,6 +9,7 @@
 
 #include "platform/posix/descriptor.hpp"
 #include "platform/posix/posix_files.hpp"
+#include "platform/posix/posix_folders.hpp"
 
 namespace talutil::testing {
 
@@ -34,6 +35,11 @@ struct TemporaryDrives {
 std::unique_ptr<Files> real_files() {
   static const TemporaryDrives drives;
   return std::make_unique<posix::PosixFiles>();
+}
+
+std::unique_ptr<Folders> real_folders() {
+  static_cast<void>(real_files());  // Makes the drives.
+  return std::make_unique<posix::PosixFolders>();
 }
 
 Text scratch_folder() {

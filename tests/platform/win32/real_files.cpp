@@ -6,6 +6,7 @@
 
 #include "platform/win32/handle.hpp"
 #include "platform/win32/win32_files.hpp"
+#include "platform/win32/win32_folders.hpp"
 
 namespace talutil::testing {
 
@@ -15,6 +16,8 @@ std::unique_ptr<Files> real_files() {
   EXPECT_TRUE(SUCCEEDED(apartment));
   return std::make_unique<win32::Win32Files>();
 }
+
+std::unique_ptr<Folders> real_folders() { return std::make_unique<win32::Win32Folders>(); }
 
 Text scratch_folder() {
   static int count = 0;

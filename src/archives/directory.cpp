@@ -1,0 +1,233 @@
+#include "archives/directory.hpp"
+
+#include <algorithm>
+#include <limits>
+
+#include "archives/archive_error.hpp"
+#include "archives/little_endian.hpp"
+
+namespace talutil::archives {
+
+namespace {
+
+constexpr std::size_t end_record_size = 22;
+constexpr std::size_t zip64_end_size = 56;
+constexpr std::size_t zip64_locator_size = 20;
+constexpr std::uint64_t longest_comment = 0xFFFF;
+constexpr std::uint32_t full32 = 0xFFFFFFFF;
+constexpr std::uint16_t full16 = 0xFFFF;
+constexpr std::uint16_t descriptor_flag = 8;
+
+/// What the end record and its zip64 form say.
+struct End {
+  std::uint64_t position = 0;
+  std::uint32_t volume = 0;
+  std::uint32_t directory_volume = 0;
+  std::uint64_t entries = 0;
+  std::uint64_t size = 0;
+  std::uint64_t offset = 0;
+  std::string comment;
+  bool has_locator = false;
+  std::uint32_t zip64_volume = 0;
+  std::uint64_t zip64_offset = 0;
+};
+
+/// An archive whose end is missing, or no archive at all.
+[[noreturn]] void fail_without_end(StoredFile& file) {
+  std::string head = read_exactly(file, 0, std::min<std::uint64_t>(file.size(), 4));
+  head.resize(4);
+  const auto signature = number_at<std::uint32_t>(head, 0);
+  const bool begins_well = signature == local_signature || signature == descriptor_signature;
+  throw Error(begins_well ? Code::unexpected_end : Code::bad_structure, "there is no end record");
+}
+
+End end_in(std::string_view tail, std::size_t place, std::uint64_t tail_offset) {
+  End end;
+  end.position = tail_offset + place;
+  end.volume = number_at<std::uint16_t>(tail, place + 4);
+  end.directory_volume = number_at<std::uint16_t>(tail, place + 6);
+  end.entries = number_at<std::uint16_t>(tail, place + 10);
+  end.size = number_at<std::uint32_t>(tail, place + 12);
+  end.offset = number_at<std::uint32_t>(tail, place + 16);
+  end.comment = tail.substr(place + end_record_size);
+  if (place < zip64_locator_size) return end;
+  const std::size_t locator = place - zip64_locator_size;
+  if (number_at<std::uint32_t>(tail, locator) != zip64_locator_signature) return end;
+  end.has_locator = true;
+  end.zip64_volume = number_at<std::uint32_t>(tail, locator + 4);
+  end.zip64_offset = number_at<std::uint64_t>(tail, locator + 8);
+  return end;
+}
+
+End read_end(StoredFile& file) {
+  constexpr std::uint64_t longest_tail = end_record_size + longest_comment + zip64_locator_size;
+  const std::uint64_t size = std::min(file.size(), longest_tail);
+  const std::string tail = read_exactly(file, file.size() - size, size);
+  for (std::size_t place = size >= end_record_size ? size - end_record_size + 1 : 0; place-- > 0;) {
+    if (number_at<std::uint32_t>(tail, place) == end_signature &&
+        place + end_record_size + number_at<std::uint16_t>(tail, place + 20) == size) {
+      return end_in(tail, place, file.size() - size);
+    }
+  }
+  fail_without_end(file);
+}
+
+std::uint64_t start_of(std::span<const std::uint64_t> volume_starts, std::uint32_t volume) {
+  // Archives that are whole may say anything about their one volume.
+  if (volume_starts.size() == 1) return 0;
+  if (volume >= volume_starts.size()) throw Error(Code::bad_media, "an entry lies on a volume that is missing");
+  return volume_starts[volume];
+}
+
+/// A sum of places that damage cannot wrap around.
+std::uint64_t placed(std::uint64_t start, std::uint64_t offset) {
+  if (offset > std::numeric_limits<std::uint64_t>::max() - start)
+    throw Error(Code::bad_structure, "a place is too far");
+  return start + offset;
+}
+
+void read_zip64_end(StoredFile& archive, std::span<const std::uint64_t> volume_starts, End& end) {
+  const std::uint64_t place = placed(start_of(volume_starts, end.zip64_volume), end.zip64_offset);
+  const std::string record = read_exactly(archive, place, zip64_end_size);
+  if (number_at<std::uint32_t>(record, 0) != zip64_end_signature) {
+    throw Error(Code::bad_structure, "the zip64 end record is damaged");
+  }
+  end.volume = number_at<std::uint32_t>(record, 16);
+  end.directory_volume = number_at<std::uint32_t>(record, 20);
+  end.entries = number_at<std::uint64_t>(record, 32);
+  end.size = number_at<std::uint64_t>(record, 40);
+  end.offset = number_at<std::uint64_t>(record, 48);
+}
+
+/// Reads on through the directory, some entries ahead.
+class HeaderReader {
+ public:
+  HeaderReader(StoredFile& archive, std::uint64_t place) : archive_(archive), place_(place) {}
+
+  [[nodiscard]] std::string_view peek(std::size_t count) {
+    if (buffer_.size() - used_ < count) {
+      place_ += used_;
+      used_ = 0;
+      buffer_.resize(std::max<std::size_t>(count, ahead));
+      buffer_.resize(archive_.read_at(place_, buffer_));
+      if (buffer_.size() < count) throw Error(Code::unexpected_end, "the directory is cut off");
+    }
+    return std::string_view(buffer_).substr(used_, count);
+  }
+
+  std::string take(std::size_t count) {
+    std::string bytes(peek(count));
+    used_ += count;
+    return bytes;
+  }
+
+ private:
+  static constexpr std::size_t ahead = 1U << 16U;
+
+  StoredFile& archive_;
+  std::uint64_t place_;
+  std::string buffer_;
+  std::size_t used_ = 0;
+};
+
+/// The zip64 extra field of a header, without its own head; empty where there is none.
+std::string_view zip64_field(std::string_view header, std::size_t name_length, std::size_t extra_length) {
+  std::string_view extra = header.substr(central_header_size + name_length, extra_length);
+  while (extra.size() >= 4) {
+    const std::size_t length = number_at<std::uint16_t>(extra, 2);
+    if (4 + length > extra.size()) break;
+    if (number_at<std::uint16_t>(extra, 0) == zip64_extra) return extra.substr(4, length);
+    extra.remove_prefix(4 + length);
+  }
+  return {};
+}
+
+/// Takes the next number of a zip64 field in the place of one that was full.
+template <class Number, class Stored>
+void take_wide(std::string_view& field, Number& value, Stored full) {
+  if (value != full) return;
+  if (field.size() < sizeof(Number)) throw Error(Code::bad_structure, "a zip64 field is too short");
+  value = number_at<Number>(field, 0);
+  field.remove_prefix(sizeof(Number));
+}
+
+DirectoryEntry read_entry(HeaderReader& reader, std::span<const std::uint64_t> volume_starts) {
+  const std::string_view fixed = reader.peek(central_header_size);
+  if (number_at<std::uint32_t>(fixed, 0) != central_signature) {
+    throw Error(Code::bad_structure, "the directory is damaged or encrypted");
+  }
+  const std::size_t length = central_header_size + number_at<std::uint16_t>(fixed, 28) +
+                             number_at<std::uint16_t>(fixed, 30) + number_at<std::uint16_t>(fixed, 32);
+  DirectoryEntry entry;
+  entry.header = reader.take(length);
+  entry.has_descriptor = (number_at<std::uint16_t>(entry.header, 8) & descriptor_flag) != 0;
+  entry.packed_size = number_at<std::uint32_t>(entry.header, 20);
+  entry.size = number_at<std::uint32_t>(entry.header, 24);
+  entry.offset = number_at<std::uint32_t>(entry.header, 42);
+  std::uint32_t volume = number_at<std::uint16_t>(entry.header, 34);
+  std::string_view field = zip64_field(entry.header, entry.name_length(), entry.extra_length());
+  take_wide(field, entry.size, full32);
+  take_wide(field, entry.packed_size, full32);
+  take_wide(field, entry.offset, full32);
+  if (volume_starts.size() > 1) take_wide(field, volume, full16);
+  entry.offset = placed(start_of(volume_starts, volume), entry.offset);
+  return entry;
+}
+
+}  // namespace
+
+std::size_t DirectoryEntry::name_length() const { return number_at<std::uint16_t>(header, 28); }
+std::size_t DirectoryEntry::extra_length() const { return number_at<std::uint16_t>(header, 30); }
+
+std::string read_exactly(StoredFile& file, std::uint64_t offset, std::uint64_t count) {
+  if (offset > file.size() || count > file.size() - offset) {
+    throw Error(Code::unexpected_end, "the archive ends too early");
+  }
+  std::string bytes(static_cast<std::size_t>(count), '\0');
+  if (file.read_at(offset, bytes) != bytes.size()) throw Error(Code::unexpected_end, "the archive ends too early");
+  return bytes;
+}
+
+std::uint32_t volumes_before(StoredFile& last_volume) {
+  const End end = read_end(last_volume);
+  return end.volume == full16 && end.has_locator ? end.zip64_volume : end.volume;
+}
+
+Directory read_directory(StoredFile& archive, std::span<const std::uint64_t> volume_starts) {
+  End end = read_end(archive);
+  Directory directory;
+  directory.is_zip64 = end.has_locator;
+  if (end.has_locator) read_zip64_end(archive, volume_starts, end);
+  if (volume_starts.size() > 1 && end.volume + 1 != volume_starts.size()) {
+    throw Error(Code::bad_media, "the set has another number of volumes");
+  }
+  directory.comment = std::move(end.comment);
+  directory.start = placed(start_of(volume_starts, end.directory_volume), end.offset);
+  if (placed(directory.start, end.size) > end.position) throw Error(Code::bad_structure, "the directory has no place");
+  if (end.entries > end.size / central_header_size) throw Error(Code::bad_structure, "the directory is too small");
+  HeaderReader reader(archive, directory.start);
+  directory.entries.reserve(static_cast<std::size_t>(end.entries));
+  for (std::uint64_t i = 0; i < end.entries; ++i) directory.entries.push_back(read_entry(reader, volume_starts));
+  return directory;
+}
+
+void require_separate_entries(const Directory& directory) {
+  struct Place {
+    std::uint64_t offset;
+    std::uint64_t size;
+  };
+  std::vector<Place> places;
+  places.reserve(directory.entries.size() + 1);
+  for (const DirectoryEntry& entry : directory.entries) {
+    places.push_back({entry.offset, placed(local_header_size + entry.name_length(), entry.packed_size)});
+  }
+  std::ranges::sort(places, {}, &Place::offset);
+  places.push_back({directory.start, 0});
+  for (std::size_t i = 0; i + 1 < places.size(); ++i) {
+    if (placed(places[i].offset, places[i].size) <= places[i + 1].offset) continue;
+    const bool is_last = i + 2 == places.size();
+    throw Error(is_last ? Code::unexpected_end : Code::bad_structure, "entries lie over one another");
+  }
+}
+
+}  // namespace talutil::archives

@@ -1,0 +1,44 @@
+#include "archives/entry_names.hpp"
+
+#include <algorithm>
+
+#include "archives/item_list.hpp"
+#include "platform/file_names.hpp"
+
+namespace talutil::archives {
+
+namespace {
+
+constexpr std::size_t longest_part = 255;
+constexpr std::size_t longest_path = 32'000;
+
+/// A part with nothing in it that Windows understands otherwise.
+Text made_safe(Text part) {
+  for (char16_t& unit : part) {
+    if (unit < u' ' || TextView(u"<>:\"|?*").find(unit) != TextView::npos) unit = u'_';
+  }
+  const std::size_t kept = part.find_last_not_of(u" .") + 1;
+  std::fill(part.begin() + static_cast<std::ptrdiff_t>(kept), part.end(), u'_');
+  return is_device_name(part) ? u"_" + part : part;
+}
+
+TextView without_drive(TextView name) {
+  const bool has_drive =
+      name.size() >= 2 && name[1] == u':' && lower_case(name[0]) >= u'a' && lower_case(name[0]) <= u'z';
+  return has_drive ? name.substr(2) : name;
+}
+
+}  // namespace
+
+std::optional<std::vector<Text>> safe_parts(TextView name) {
+  if (name.find(u'\0') != TextView::npos || name.size() > longest_path) return std::nullopt;
+  std::vector<Text> parts = parts_of(without_drive(name));
+  if (parts.empty()) return std::nullopt;
+  for (Text& part : parts) {
+    if (part == u".." || part.size() >= longest_part) return std::nullopt;
+    part = made_safe(std::move(part));
+  }
+  return parts;
+}
+
+}  // namespace talutil::archives

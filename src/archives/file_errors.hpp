@@ -1,0 +1,24 @@
+#pragma once
+
+#include <utility>
+
+#include "archives/archive_error.hpp"
+#include "automation/run_time_error.hpp"
+
+namespace talutil::archives {
+
+/// Does something with files; what the platform refuses becomes the given code, a full disk cannot_write and a lack of
+/// memory out_of_memory.
+template <class Work>
+decltype(auto) with_code(Code code, Work&& work) {
+  try {
+    return std::forward<Work>(work)();
+  } catch (const RunTimeError& error) {
+    const auto number = static_cast<ErrorNumber>(error.number());
+    if (number == ErrorNumber::disk_full) code = Code::cannot_write;
+    if (number == ErrorNumber::out_of_memory) code = Code::out_of_memory;
+    throw Error(code, error.what());
+  }
+}
+
+}  // namespace talutil::archives

@@ -1,0 +1,61 @@
+#pragma once
+
+#include <libdeflate.h>
+
+#include <deque>
+
+#include "archives/collection.hpp"
+#include "archives/container.hpp"
+
+namespace talutil::archives {
+
+/// The files of a collection as sources of the container library, which reads them one at a time. Files up to a size
+/// are compressed in one piece and handed over so; longer ones are handed over as they are, and the library compresses
+/// them as they come. Must outlive the container.
+class PackedFiles {
+ public:
+  PackedFiles(Collection& collection, std::int32_t level, Fault& fault, Progress& progress);
+
+  /// A source for an item; null when the library has no memory.
+  [[nodiscard]] zip_source_t* source_of(const Item& item, zip_t* archive);
+
+  /// In memory at once are a file of this size and its packed form.
+  static constexpr std::uint64_t longest_in_memory = 16U << 20U;
+
+ private:
+  struct Source {
+    PackedFiles* files;
+    const Item* item;
+    std::uint32_t checksum = 0;
+    std::uint64_t size = 0;
+    bool is_packed = false;
+    bool was_read = false;
+    zip_error_t error;
+  };
+  struct FreeCompressor {
+    void operator()(libdeflate_compressor* compressor) const noexcept { libdeflate_free_compressor(compressor); }
+  };
+
+  static zip_int64_t serve(void* self, void* data, zip_uint64_t length, zip_source_cmd_t command);
+  zip_int64_t serve(Source& source, void* data, zip_uint64_t length, zip_source_cmd_t command);
+  void open(Source& source);
+  void close() noexcept;
+  [[nodiscard]] zip_int64_t read(Source& source, std::span<char> buffer);
+  void tell(const Source& source, zip_stat_t& status) const;
+  [[nodiscard]] bool fits(const Item& item) const noexcept;
+
+  Collection& collection_;
+  Fault& fault_;
+  Progress& progress_;
+  std::unique_ptr<libdeflate_compressor, FreeCompressor> compressor_;
+  std::deque<Source> sources_;
+
+  // Of the file that is read now.
+  std::unique_ptr<StoredFile> file_;
+  std::string bytes_;
+  std::string packed_;
+  std::uint64_t place_ = 0;
+  Text entry_;
+};
+
+}  // namespace talutil::archives

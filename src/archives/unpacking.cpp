@@ -1,0 +1,350 @@
+#include "archives/unpacking.hpp"
+
+#include <libdeflate.h>
+
+#include <algorithm>
+#include <array>
+#include <limits>
+
+#include "archives/container.hpp"
+#include "archives/destination.hpp"
+#include "archives/directory.hpp"
+#include "archives/entry_names.hpp"
+#include "archives/file_errors.hpp"
+#include "archives/item_list.hpp"
+#include "archives/little_endian.hpp"
+#include "archives/packed_files.hpp"
+#include "archives/split_set.hpp"
+#include "platform/file_names.hpp"
+
+namespace talutil::archives {
+
+namespace {
+
+constexpr std::uint32_t posix_kind = 0170000;
+constexpr std::uint32_t posix_link = 0120000;
+constexpr std::uint32_t posix_writable = 0222;
+constexpr std::size_t piece_size = 1U << 16U;
+constexpr std::uint64_t always_allowed = 1U << 30U;
+constexpr int most_questions = 3;
+
+std::unique_ptr<StoredFile> open_path(const Text& path, Folders& folders) {
+  return with_code(Code::missing, [&] {
+    require_file_name(path);
+    const TextView name = last_part(path);
+    if (name.empty()) throw Error(Code::missing, "the path names no file");
+    return open_archive(*folders.open(path.substr(0, path.size() - name.size())), Text(name));
+  });
+}
+
+using Sink = std::function<void(std::string_view bytes)>;
+
+struct CloseEntry {
+  void operator()(zip_file_t* file) const noexcept { zip_fclose(file); }
+};
+struct FreeDecompressor {
+  void operator()(libdeflate_decompressor* decompressor) const noexcept { libdeflate_free_decompressor(decompressor); }
+};
+
+/// The password was wrong, or the bytes of an entry that it opens are damaged: the traditional encryption does not
+/// tell.
+struct WrongPassword {};
+
+}  // namespace
+
+class Archive::Reader {
+ public:
+  explicit Reader(std::unique_ptr<StoredFile> file) : file_(std::move(file)), container_(checked(*file_), fault_) {}
+
+  [[nodiscard]] zip_t* get() const noexcept { return container_.get(); }
+  [[nodiscard]] std::uint64_t size() const noexcept { return file_->size(); }
+  [[nodiscard]] std::uint64_t count() const noexcept { return name_has_nul_.size(); }
+
+  [[nodiscard]] Entry entry(std::uint64_t index) const {
+    const zip_stat_t status = status_of(index);
+    Entry entry;
+    const char* const name = zip_get_name(get(), index, 0);
+    if (name != nullptr) entry.name = from_utf8(name);
+    // The container library ends a name there.
+    if (name_has_nul_[static_cast<std::size_t>(index)]) entry.name += u'\0';
+    entry.packed_size = status.comp_size;
+    entry.is_encrypted = status.encryption_method != ZIP_EM_NONE;
+    entry.facts.size = status.size;
+    entry.facts.modified = modified(index, status);
+    set_kind(index, entry);
+    return entry;
+  }
+
+  /// Hands the bytes of an entry to a sink, and throws if they are not those that were packed.
+  void unpack(std::uint64_t index, const std::string& password, const Sink& sink) {
+    const zip_stat_t status = status_of(index);
+    const bool in_memory = status.size <= PackedFiles::longest_in_memory &&
+                           status.comp_size <= PackedFiles::longest_in_memory && status.comp_method == ZIP_CM_DEFLATE &&
+                           status.size > 0;
+    const Opened file = open(index, in_memory ? ZIP_FL_COMPRESSED : 0, password);
+    if (in_memory)
+      unpack_whole(*file, status, sink);
+    else
+      unpack_by_pieces(*file, status, sink);
+  }
+
+ private:
+  using Opened = std::unique_ptr<zip_file_t, CloseEntry>;
+
+  StoredFile& checked(StoredFile& file) {
+    constexpr std::array<std::uint64_t, 1> whole{0};
+    const Directory directory = read_directory(file, whole);
+    require_separate_entries(directory);
+    for (const DirectoryEntry& entry : directory.entries) {
+      const auto name = std::string_view(entry.header).substr(central_header_size, entry.name_length());
+      name_has_nul_.push_back(name.find('\0') != std::string_view::npos);
+    }
+    return file;
+  }
+
+  [[nodiscard]] zip_stat_t status_of(std::uint64_t index) const {
+    zip_stat_t status;
+    if (zip_stat_index(get(), index, 0, &status) != 0) container_.fail();
+    return status;
+  }
+
+  [[nodiscard]] std::int64_t modified(std::uint64_t index, const zip_stat_t& status) const {
+    constexpr zip_uint16_t extended_time = 0x5455;
+    zip_uint16_t length = 0;
+    const zip_uint8_t* const field =
+        zip_file_extra_field_get_by_id(get(), index, extended_time, 0, &length, ZIP_FL_CENTRAL);
+    constexpr zip_uint16_t least = 5;
+    if (field == nullptr || length < least || (field[0] & 1U) == 0) return status.mtime;
+    const std::string_view bytes(reinterpret_cast<const char*>(field), length);
+    return static_cast<std::int32_t>(number_at<std::uint32_t>(bytes, 1));
+  }
+
+  void set_kind(std::uint64_t index, Entry& entry) const {
+    zip_uint8_t system = ZIP_OPSYS_DOS;
+    zip_uint32_t attributes = 0;
+    if (zip_file_get_external_attributes(get(), index, 0, &system, &attributes) != 0) attributes = 0;
+    FileFacts& facts = entry.facts;
+    constexpr std::uint32_t dos_attributes = 0x27;
+    facts.attributes = attributes & dos_attributes;
+    if (system == ZIP_OPSYS_UNIX || system == ZIP_OPSYS_OS_X) {
+      facts.mode = attributes >> 16U;
+      if (facts.mode != 0 && (facts.mode & posix_writable) == 0) facts.attributes |= file_attribute::read_only;
+    }
+    const bool is_folder = !entry.name.empty() && separators.find(entry.name.back()) != TextView::npos;
+    if (is_folder) {
+      facts.kind = FileKind::folder;
+      facts.attributes &= ~file_attribute::read_only;
+    } else if ((facts.mode & posix_kind) == posix_link) {
+      facts.kind = FileKind::link;
+    }
+  }
+
+  [[nodiscard]] Opened open(std::uint64_t index, zip_flags_t flags, const std::string& password) {
+    Opened file(zip_fopen_index_encrypted(get(), index, flags, password.empty() ? nullptr : password.c_str()));
+    if (file) return file;
+    const int code = zip_error_code_zip(zip_get_error(get()));
+    if (code == ZIP_ER_WRONGPASSWD || code == ZIP_ER_NOPASSWD) throw WrongPassword();
+    container_.fail();
+  }
+
+  [[nodiscard]] std::size_t read(zip_file_t& file, std::span<char> buffer) {
+    const zip_int64_t count = zip_fread(&file, buffer.data(), buffer.size());
+    if (count < 0) fault_.fail(zip_file_get_error(&file));
+    return static_cast<std::size_t>(count);
+  }
+
+  void unpack_whole(zip_file_t& file, const zip_stat_t& status, const Sink& sink) {
+    packed_.resize(static_cast<std::size_t>(status.comp_size) + 1);
+    std::size_t length = 0;
+    while (const std::size_t count = read(file, std::span(packed_).subspan(length))) length += count;
+    bytes_.resize(static_cast<std::size_t>(status.size));
+    if (!decompressor_) decompressor_.reset(libdeflate_alloc_decompressor());
+    if (!decompressor_) throw std::bad_alloc();
+    std::size_t made = 0;
+    const libdeflate_result result =
+        libdeflate_deflate_decompress(decompressor_.get(), packed_.data(), length, bytes_.data(), bytes_.size(), &made);
+    if (result != LIBDEFLATE_SUCCESS || made != bytes_.size()) throw Error(Code::bad_structure, "an entry is damaged");
+    if ((status.valid & ZIP_STAT_CRC) != 0 && libdeflate_crc32(0, bytes_.data(), bytes_.size()) != status.crc) {
+      throw Error(Code::bad_structure, "a checksum is wrong");
+    }
+    sink(bytes_);
+  }
+
+  void unpack_by_pieces(zip_file_t& file, const zip_stat_t& status, const Sink& sink) {
+    bytes_.resize(piece_size);
+    std::uint64_t total = 0;
+    while (const std::size_t count = read(file, bytes_)) {
+      total += count;
+      if (total > status.size) throw Error(Code::bad_structure, "an entry is longer than it says");
+      sink(std::string_view(bytes_).substr(0, count));
+    }
+    if (total != status.size) throw Error(Code::unexpected_end, "an entry is shorter than it says");
+  }
+
+  std::unique_ptr<StoredFile> file_;
+  std::vector<bool> name_has_nul_;
+  Fault fault_;
+  Container container_;
+  std::unique_ptr<libdeflate_decompressor, FreeDecompressor> decompressor_;
+  std::string packed_;
+  std::string bytes_;
+};
+
+namespace {
+
+/// The password of the entries, asked for as long as it is wrong.
+class Password {
+ public:
+  Password(const Text& given, const PasswordQuestion& ask) : bytes_(to_utf8(given)), ask_(ask) {}
+
+  /// Does something with the password of an entry until it is the right one.
+  template <class Attempt>
+  void with(const Archive::Entry& entry, Attempt&& attempt) {
+    if (!entry.is_encrypted) return attempt(std::string());
+    if (bytes_.empty()) ask(entry.name, false);
+    for (;;) {
+      try {
+        attempt(bytes_);
+        is_proved_ = true;
+        return;
+      } catch (const WrongPassword&) {
+      } catch (const Error& error) {
+        const bool is_garbage = error.code() == Code::bad_structure || error.code() == Code::unexpected_end;
+        if (is_proved_ || !is_garbage) throw;
+      }
+      ask(entry.name, true);
+    }
+  }
+
+ private:
+  void ask(const Text& entry, bool was_wrong) {
+    if (!ask_ || questions_ == most_questions) throw Error(Code::bad_parameters, "the password is missing or wrong");
+    ++questions_;
+    const std::optional<Text> answer = ask_(entry, was_wrong);
+    if (!answer) throw Error(Code::cancelled, "no password was given");
+    bytes_ = to_utf8(*answer);
+  }
+
+  std::string bytes_;
+  const PasswordQuestion& ask_;
+  int questions_ = 0;
+  bool is_proved_ = false;
+};
+
+/// Entries that were not unpacked, to be told at the end.
+class PassedOver {
+ public:
+  void add(const Text& entry) {
+    constexpr std::size_t most_told = 3;
+    if (count_++ < most_told) names_ += (names_.empty() ? "" : ", ") + to_utf8(entry);
+  }
+
+  void throw_if_any() const {
+    if (count_ == 0) return;
+    throw Error(Code::incomplete, std::to_string(count_) + " entries were passed over, such as " + names_);
+  }
+
+ private:
+  std::uint64_t count_ = 0;
+  std::string names_;
+};
+
+void require_modest_size(std::uint64_t total, std::uint64_t archive_size, const UnpackingOptions& options) {
+  const bool is_too_large = options.largest_total != 0 && total > options.largest_total;
+  const bool is_bomb = total > always_allowed && total / options.largest_ratio > archive_size;
+  if (is_too_large || is_bomb) throw Error(Code::incomplete, "the archive would unpack to more than is allowed");
+}
+
+/// Goes through the entries that are asked for, once their sizes are known to be modest.
+template <class Visit>
+void for_each_entry(const Archive& archive, std::uint64_t archive_size, const UnpackingOptions& options,
+                    Progress& progress, Visit&& visit) {
+  const EntryFilter filter(options.items);
+  std::vector<std::uint64_t> chosen;
+  std::uint64_t total = 0;
+  for (std::uint64_t i = 0; i < archive.count(); ++i) {
+    const Archive::Entry entry = archive.entry(i);
+    if (!filter.matches(parts_of(entry.name))) continue;
+    chosen.push_back(i);
+    total = entry.facts.size > std::numeric_limits<std::uint64_t>::max() - total
+                ? std::numeric_limits<std::uint64_t>::max()
+                : total + entry.facts.size;
+  }
+  if (chosen.empty()) throw Error(Code::nothing_to_do, "no entry matches");
+  require_modest_size(total, archive_size, options);
+  progress.start(total);
+  for (const std::uint64_t index : chosen) visit(index, archive.entry(index));
+}
+
+}  // namespace
+
+Archive::Archive(const Text& path, Folders& folders) : Archive(open_path(path, folders)) {}
+Archive::Archive(std::unique_ptr<StoredFile> file) : reader_(std::make_unique<Reader>(std::move(file))) {}
+Archive::~Archive() = default;
+
+std::uint64_t Archive::count() const { return reader_->count(); }
+
+Archive::Entry Archive::entry(std::uint64_t index) const { return reader_->entry(index); }
+
+Text Archive::comment() const {
+  int length = 0;
+  const char* const comment = zip_get_archive_comment(reader_->get(), &length, 0);
+  return comment == nullptr ? Text() : from_utf8(std::string_view(comment, static_cast<std::size_t>(length)));
+}
+
+void Archive::extract(const Text& destination, const UnpackingOptions& options, Folders& folders, Files& files,
+                      const PasswordQuestion& ask, Progress& progress) {
+  if (destination.empty()) throw Error(Code::bad_parameters, "there is no folder to unpack below");
+  Destination target(folders, files, destination);
+  Password password(options.password, ask);
+  PassedOver passed_over;
+  for_each_entry(*this, reader_->size(), options, progress, [&](std::uint64_t index, const Entry& entry) {
+    auto parts = safe_parts(entry.name);
+    if (!parts || entry.facts.kind == FileKind::link) return passed_over.add(entry.name);
+    if (entry.facts.kind == FileKind::folder) {
+      if (options.keep_folders && !target.make_folder(*parts, entry.facts)) passed_over.add(entry.name);
+      return;
+    }
+    if (!options.keep_folders) parts->erase(parts->begin(), parts->end() - 1);
+    std::unique_ptr<NewFile> file;
+    const auto answer = target.create(*parts, options.overwrite, file);
+    if (answer == Destination::Answer::refused) passed_over.add(entry.name);
+    if (answer != Destination::Answer::made) return;
+    try {
+      password.with(entry, [&](const std::string& bytes) {
+        std::uint64_t place = 0;
+        reader_->unpack(index, bytes, [&](std::string_view piece) {
+          with_code(Code::cannot_write, [&] { file->write_at(place, piece); });
+          place += piece.size();
+          progress.advance(piece.size(), entry.name);
+        });
+      });
+    } catch (const Error& error) {
+      // A method that we do not read is no reason to leave the others.
+      if (error.code() != Code::incomplete) throw;
+      return passed_over.add(entry.name);
+    }
+    with_code(Code::cannot_create, [&] {
+      file->finish(&entry.facts);
+      file->take_name();
+    });
+  });
+  target.finish_folders();
+  passed_over.throw_if_any();
+}
+
+void Archive::test(const UnpackingOptions& options, const PasswordQuestion& ask, Progress& progress) {
+  Password password(options.password, ask);
+  for_each_entry(*this, reader_->size(), options, progress, [&](std::uint64_t index, const Entry& entry) {
+    try {
+      password.with(entry, [&](const std::string& bytes) {
+        reader_->unpack(index, bytes, [&](std::string_view piece) { progress.advance(piece.size(), entry.name); });
+      });
+    } catch (const Error& error) {
+      const bool is_damage = error.code() == Code::bad_structure || error.code() == Code::unexpected_end;
+      throw Error(is_damage ? Code::bad_test : error.code(), to_utf8(entry.name) + ": " + error.what());
+    }
+  });
+}
+
+}  // namespace talutil::archives

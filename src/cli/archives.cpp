@@ -1,0 +1,168 @@
+#include <unistd.h>
+
+#include <iomanip>
+#include <iostream>
+
+#include "archives/packing.hpp"
+#include "archives/unpacking.hpp"
+#include "automation/date.hpp"
+#include "cli/commands.hpp"
+#include "cli/failure.hpp"
+#include "cli/files.hpp"
+#include "platform/posix/posix_platform.hpp"
+
+namespace talutil::cli {
+
+namespace {
+
+using archives::Progress;
+
+/// A bar on the terminal, gone when the work is done.
+class ProgressBar {
+ public:
+  explicit ProgressBar(const char* word) : word_(word), is_shown_(isatty(STDERR_FILENO) != 0) {}
+  ProgressBar(const ProgressBar&) = delete;
+  ProgressBar& operator=(const ProgressBar&) = delete;
+  ~ProgressBar() {
+    if (percent_ != none) std::cerr << "\r\033[K" << std::flush;
+  }
+
+  [[nodiscard]] Progress progress() {
+    return Progress([this](std::uint64_t done, std::uint64_t total, TextView name) { return show(done, total, name); });
+  }
+
+ private:
+  static constexpr std::uint64_t none = 101;
+
+  bool show(std::uint64_t done, std::uint64_t total, TextView name) {
+    constexpr std::uint64_t whole = 100;
+    constexpr std::uint64_t step = 4;
+    const std::uint64_t percent = total == 0 ? whole : std::min(whole, done * whole / total);
+    if (!is_shown_ || percent == percent_) return true;
+    percent_ = percent;
+    const std::string bar = std::string(percent / step, '#') + std::string((whole - percent) / step, '.');
+    std::cerr << '\r' << word_ << " [" << bar << "] " << percent << " %  " << to_utf8(name.substr(0, 40)) << "\033[K"
+              << std::flush;
+    return true;
+  }
+
+  const char* word_;
+  bool is_shown_;
+  std::uint64_t percent_ = none;
+};
+
+Text text_of(const std::string& word) { return utf8_text(word, word); }
+
+/// The words of the command line as a list of items: each in quotes, so that blanks in it mean nothing.
+Text item_list(const std::vector<std::string>& words) {
+  Text list;
+  for (const std::string& word : words) {
+    if (word.find('"') != std::string::npos) throw usage_failure(word + ": an item cannot have a quote in it");
+    list += u'"' + text_of(word) + u"\" ";
+  }
+  return list;
+}
+
+Text read_password(const std::string& file) {
+  if (file.empty()) return {};
+  std::string bytes = read_bytes(file);
+  bytes.resize(std::min(bytes.find_first_of("\r\n"), bytes.size()));
+  if (bytes.empty()) throw usage_failure("--password-file " + file + ": its first line is empty");
+  return utf8_text(bytes, file);
+}
+
+/// A new password, typed twice.
+Text ask_new_password(PasswordBoxes& boxes) {
+  const auto first = boxes.ask(u"New password:", {});
+  const auto second = first ? boxes.ask(u"Once more:", {}) : std::nullopt;
+  if (!second || first->empty())
+    throw run_time_failure("no password was given; there must be a terminal to type it at");
+  if (*first != *second) throw run_time_failure("the two passwords differ");
+  return *first;
+}
+
+archives::PasswordQuestion question(PasswordBoxes& boxes) {
+  return [&boxes](const Text& entry, bool was_wrong) {
+    return boxes.ask((was_wrong ? u"That is not the password of " : u"Password of ") + entry + u":", {});
+  };
+}
+
+/// Does the work of a subcommand; a failure is told with the archive's name and the code that hosts know.
+template <class Work>
+void on_archive(const std::string& archive, Work work) {
+  try {
+    work();
+  } catch (const archives::Error& error) {
+    throw run_time_failure(archive + ": " + error.what() + " (code " + std::to_string(static_cast<int>(error.code())) +
+                           ")");
+  }
+}
+
+void print_entries(const archives::Archive& archive) {
+  constexpr std::int64_t seconds_a_day = 86400;
+  constexpr double epoch = 25569;  // 1 January 1970 as an automation date
+  for (std::uint64_t i = 0; i < archive.count(); ++i) {
+    const archives::Archive::Entry entry = archive.entry(i);
+    const Date time{epoch + static_cast<double>(entry.facts.modified) / seconds_a_day};
+    std::cout << std::setw(12) << entry.facts.size << std::setw(12) << entry.packed_size << "  "
+              << to_utf8(format_date(time, u"YYYY-MM-DD HH:MM:SS")) << (entry.is_encrypted ? " *" : "  ")
+              << to_utf8(entry.name) << '\n';
+  }
+  if (const Text comment = archive.comment(); !comment.empty()) std::cout << to_utf8(comment) << '\n';
+}
+
+void test_archive(const ZipOptions& options, posix::PosixPlatform& platform) {
+  archives::UnpackingOptions unpacking;
+  unpacking.items = item_list(options.items);
+  unpacking.password = read_password(options.password_file);
+  archives::Archive archive(text_of(options.archive), platform.folders);
+  {
+    ProgressBar bar("testing");
+    Progress progress = bar.progress();
+    archive.test(unpacking, question(platform.password_boxes), progress);
+  }
+  std::cout << options.archive << ": " << archive.count() << " entries, all well\n";
+}
+
+}  // namespace
+
+void zip(const ZipOptions& options) {
+  posix::PosixPlatform platform;
+  on_archive(options.archive, [&] {
+    if (options.test) return test_archive(options, platform);
+    if (options.items.empty()) throw usage_failure("zip: name what is to be packed: talutil zip ARCHIVE ITEM...");
+    archives::PackingOptions packing;
+    packing.keep_folders = !options.no_folders;
+    packing.aes = options.aes;
+    packing.level = options.level;
+    packing.comment = text_of(options.comment);
+    packing.password = read_password(options.password_file);
+    if (options.encrypt) packing.password = ask_new_password(platform.password_boxes);
+    if (options.aes && packing.password.empty()) {
+      throw usage_failure("--aes wants a password: give --encrypt or --password-file");
+    }
+    if (options.volume_size != 0) packing.volume_size = options.volume_size;
+    ProgressBar bar("packing");
+    Progress progress = bar.progress();
+    archives::pack(text_of(options.archive), item_list(options.items), packing, platform.folders, progress);
+  });
+}
+
+void unzip(const UnzipOptions& options) {
+  posix::PosixPlatform platform;
+  on_archive(options.archive, [&] {
+    archives::Archive archive(text_of(options.archive), platform.folders);
+    if (options.list) return print_entries(archive);
+    archives::UnpackingOptions unpacking;
+    unpacking.items = item_list(options.items);
+    unpacking.password = read_password(options.password_file);
+    unpacking.overwrite = options.overwrite;
+    unpacking.keep_folders = !options.no_folders;
+    ProgressBar bar("unpacking");
+    Progress progress = bar.progress();
+    archive.extract(text_of(options.destination), unpacking, platform.folders, platform.files,
+                    question(platform.password_boxes), progress);
+  });
+}
+
+}  // namespace talutil::cli

@@ -1,0 +1,12 @@
+#pragma once
+
+#include "platform/folders.hpp"
+
+namespace talutil::win32 {
+
+class Win32Folders final : public Folders {
+ public:
+  [[nodiscard]] std::unique_ptr<Folder> open(const Text& path) override;
+};
+
+}  // namespace talutil::win32
