@@ -11,6 +11,10 @@ if(NOT status EQUAL 0)
   message(FATAL_ERROR "tools/third_party.sh ${flavour} failed; its reason stands above")
 endif()
 set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS tools/third_party.sh)
+# The DLL brings no other with it.
+if(WIN32)
+  set(ZLIB_USE_STATIC_LIBS ON)
+endif()
 find_package(ZLIB REQUIRED)
 
 function(talutil_import name archive)

@@ -6,7 +6,9 @@
 
 namespace talutil::archives {
 
-Code code_of(int library_code) noexcept {
+namespace {
+
+Code code_of(int library_code, Code other) noexcept {
   switch (library_code) {
     case ZIP_ER_MEMORY:
       return Code::out_of_memory;
@@ -33,13 +35,15 @@ Code code_of(int library_code) noexcept {
     case ZIP_ER_WRITE:
       return Code::cannot_write;
     default:
-      return Code::internal;
+      return other;
   }
 }
 
+}  // namespace
+
 void Fault::fail(zip_error_t* error) const {
   if (reason_) std::rethrow_exception(reason_);
-  throw Error(code_of(zip_error_code_zip(error)), zip_error_strerror(error));
+  throw Error(code_of(zip_error_code_zip(error), other_), zip_error_strerror(error));
 }
 
 void Fault::fail(int library_code) const {

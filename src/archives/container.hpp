@@ -15,6 +15,9 @@ namespace talutil::archives {
 /// What a callback of the container library has thrown. Exceptions do not pass through C.
 class Fault {
  public:
+  /// `other` stands for what the library has no clear word for: damage while reading, a fault of ours while writing.
+  explicit Fault(Code other) noexcept : other_(other) {}
+
   /// Does something inside a callback; what it throws is kept and answered by the library's word for failure.
   template <class Work>
   [[nodiscard]] zip_int64_t keep(zip_error_t& error, Work&& work) noexcept {
@@ -32,11 +35,9 @@ class Fault {
   [[noreturn]] void fail(int library_code) const;
 
  private:
+  Code other_;
   std::exception_ptr reason_;
 };
-
-/// A failure of the container library as ours.
-[[nodiscard]] Code code_of(int library_code) noexcept;
 
 /// An archive open in the container library. The files, the fault and what else it is given must outlive it.
 class Container {

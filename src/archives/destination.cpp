@@ -50,7 +50,7 @@ Destination::Place* Destination::place_of(std::span<const Text> parts) {
   if (above == nullptr) return nullptr;
   const Text& name = parts.back();
   const auto [known, is_new] = above->entries.try_emplace(upper_case(name), Known{name, FileKind::folder});
-  if (is_new) open(*above).folder(name, true);
+  if (is_new) static_cast<void>(open(*above).folder(name, true));
   if (known->second.kind != FileKind::folder) return nullptr;
   std::vector<Text> spelled = above->parts;
   spelled.push_back(known->second.name);

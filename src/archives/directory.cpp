@@ -61,7 +61,7 @@ End end_in(std::string_view tail, std::size_t place, std::uint64_t tail_offset) 
 
 End read_end(StoredFile& file) {
   constexpr std::uint64_t longest_tail = end_record_size + longest_comment + zip64_locator_size;
-  const std::uint64_t size = std::min(file.size(), longest_tail);
+  const auto size = static_cast<std::size_t>(std::min(file.size(), longest_tail));
   const std::string tail = read_exactly(file, file.size() - size, size);
   for (std::size_t place = size >= end_record_size ? size - end_record_size + 1 : 0; place-- > 0;) {
     if (number_at<std::uint32_t>(tail, place) == end_signature &&

@@ -173,7 +173,7 @@ void pack(const Text& archive, TextView items, const PackingOptions& options, Fo
   require_archive(output->replaced());
   progress.start(bytes_of(collection.items()));
   {
-    Fault fault;
+    Fault fault(Code::internal);
     PackedFiles files(collection, options.level, fault, progress);
     Container container(*output, fault, progress);
     Packer(container, files, options).add_all(collection.items());

@@ -78,6 +78,11 @@ class Archive::Reader {
   /// Hands the bytes of an entry to a sink, and throws if they are not those that were packed.
   void unpack(std::uint64_t index, const std::string& password, const Sink& sink) {
     const zip_stat_t status = status_of(index);
+    // Asked first: the container library loses memory over an encryption that it does not know.
+    if (zip_encryption_method_supported(status.encryption_method, 0) == 0 ||
+        zip_compression_method_supported(status.comp_method, 0) == 0) {
+      throw Error(Code::incomplete, "its method of compression or encryption is not supported");
+    }
     const bool in_memory = status.size <= PackedFiles::longest_in_memory &&
                            status.comp_size <= PackedFiles::longest_in_memory && status.comp_method == ZIP_CM_DEFLATE &&
                            status.size > 0;
@@ -183,7 +188,7 @@ class Archive::Reader {
 
   std::unique_ptr<StoredFile> file_;
   std::vector<bool> name_has_nul_;
-  Fault fault_;
+  Fault fault_{Code::bad_structure};
   Container container_;
   std::unique_ptr<libdeflate_decompressor, FreeDecompressor> decompressor_;
   std::string packed_;

@@ -18,7 +18,7 @@ namespace talutil::testing {
 
 /// A platform without a machine: it records what the library asks for and answers as the test says. Fields
 /// can be set at any time; the clock moves only when told. It must outlive the library that uses it.
-struct FakePlatform final : MessageBoxes,
+struct FakePlatform : MessageBoxes,
                             Screen,
                             Computer,
                             Clock,

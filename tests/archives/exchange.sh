@@ -1,0 +1,123 @@
+#!/usr/bin/env bash
+# Exchanges archives with other programs, both ways: tests/archives/exchange.sh PATH_TO_TALUTIL
+# Needs zip, unzip, 7z and python3. The last line is "N passed, N failed".
+set -uo pipefail
+[ -x "${1:-}" ] || { echo "usage: tests/archives/exchange.sh PATH_TO_TALUTIL" >&2; exit 2; }
+talutil=$(realpath "$1")
+work=$(mktemp -d)
+trap 'rm -rf "$work"' EXIT
+cd "$work" || exit 2
+export LC_ALL=C.UTF-8
+
+passed=0
+failed=0
+log=$work/log
+
+# check NAME COMMAND...
+check() {
+  local name=$1
+  shift
+  if "$@" >"$log" 2>&1; then
+    passed=$((passed + 1))
+  else
+    failed=$((failed + 1))
+    printf 'FAILED: %s\n' "$name"
+    tail -5 "$log"
+  fi
+}
+
+mkdir -p data/sub/deep data/empty
+seq 1 20000 >data/numbers.txt
+head -c 200000 /dev/urandom >data/sub/noise.bin
+printf 'wide' >"data/sub/deep/Żółw é.txt"
+: >data/nothing
+chmod 640 data/numbers.txt
+touch -d '2009-03-31 12:00:01' data/numbers.txt
+printf 'secret\n' >password
+
+same() { diff -r data "$1/data" && [ "$(stat -c '%a %Y' data/numbers.txt)" = "$(stat -c '%a %Y' "$1/data/numbers.txt")" ]; }
+
+read_by_python() {
+  python3 - "$1" "${2:-}" <<'P'
+import sys, zipfile
+archive = zipfile.ZipFile(sys.argv[1])
+if sys.argv[2]:
+    archive.setpassword(sys.argv[2].encode())
+sys.exit(archive.testzip() is not None or archive.read("data/sub/deep/Żółw é.txt") != b"wide")
+P
+}
+
+write_by_python() {
+  python3 - "$1" <<'P'
+import os, sys, zipfile
+with zipfile.ZipFile(sys.argv[1], "w", zipfile.ZIP_DEFLATED) as archive:
+    for folder, _, names in os.walk("data"):
+        archive.write(folder)
+        for name in names:
+            path = os.path.join(folder, name)
+            info = zipfile.ZipInfo.from_file(path)
+            info.compress_type = zipfile.ZIP_DEFLATED
+            with archive.open(info, "w", force_zip64=True) as out, open(path, "rb") as file:
+                out.write(file.read())
+P
+}
+
+unpack_by_unzip() { unzip -q "$@" -d unzipped && same unzipped && rm -r unzipped; }
+
+pack() { "$talutil" zip "$@"; }
+check "pack" pack plain.zip data
+check "unzip reads ours" unpack_by_unzip plain.zip
+check "7z reads ours" 7z t plain.zip
+check "Python reads ours" read_by_python plain.zip
+check "pack with a password" pack old.zip data --password-file password
+check "unzip reads our encryption" unpack_by_unzip -P secret old.zip
+check "7z reads our encryption" 7z t -psecret old.zip
+check "Python reads our encryption" read_by_python old.zip secret
+check "pack with AES" pack aes.zip data --aes --password-file password
+check "7z reads our AES" 7z t -psecret aes.zip
+for size in 65536 65537 100000 150001; do
+  rm -f set.z*
+  check "pack volumes of $size" pack set.zip data --volumes $size
+  check "7z reads our volumes of $size" 7z t set.zip
+done
+rm -f set.z*
+pack set.zip data --volumes 70000 --aes --password-file password >/dev/null
+check "7z reads our encrypted volumes" 7z t -psecret set.zip
+
+# Packs by another program and reads that: read_theirs NAME ARCHIVE COMMAND...
+read_theirs() {
+  local name=$1 archive=$2
+  shift 2
+  check "$name: made" "$@"
+  check "$name: tested" "$talutil" zip --test "$archive" --password-file password
+  check "$name: unpacked" "$talutil" unzip "$archive" --to out --password-file password
+  check "$name: the same" diff -r data out/data
+  rm -rf out
+}
+read_theirs "zip" zip.zip zip -qr zip.zip data
+"$talutil" unzip zip.zip --to kept
+check "times and rights of zip's" same kept
+read_theirs "zip -P" zip-p.zip zip -qr -P secret zip-p.zip data
+read_theirs "zip, zip64" zip-64.zip zip -qr -fz zip-64.zip data
+read_theirs "zip -s" zip-s.zip zip -qr -s 70k zip-s.zip data
+read_theirs "7z" 7z.zip 7z a -tzip 7z.zip data
+read_theirs "7z, AES" 7z-aes.zip 7z a -tzip -mem=AES256 -psecret 7z-aes.zip data
+read_theirs "7z, pieces" 7z-v.zip.001 7z a -tzip -v100k 7z-v.zip data
+read_theirs "Python, zip64" python.zip write_by_python python.zip
+
+# What is added to another's archive leaves the rest of it as it was.
+printf 'changed' >data/sub/deep/new.txt
+check "add to 7z's" pack 7z-aes.zip data/sub/deep --password-file password
+check "7z reads what was added to" 7z t -psecret 7z-aes.zip
+
+# A full disk, as a limit on the size of files: the old archive stays, and nothing else.
+cp plain.zip before.zip
+head -c 3000000 /dev/urandom >data/large.bin
+refused() { ! (trap '' XFSZ && ulimit -f 1000 && pack plain.zip data 2>refusal); }
+check "a full disk is told" refused
+check "and with its code" grep -q 'plain.zip: Disk full (code 14)' refusal
+check "and leaves the archive" cmp plain.zip before.zip
+check "and nothing else" sh -c '! ls -a | grep -q talutil-'
+
+printf '%d passed, %d failed\n' $passed $failed
+[ $failed = 0 ]

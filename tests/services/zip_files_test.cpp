@@ -1,0 +1,208 @@
+#include <gtest/gtest.h>
+
+#include "automation/variant.hpp"
+#include "controls/zip_controls.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "tests/archives/tree.hpp"
+#include "tests/fakes/fake_platform.hpp"
+
+namespace talutil {
+namespace {
+
+using archives::testing::read_tree;
+using archives::testing::Tree;
+using archives::testing::write_file;
+using testing::FakePlatform;
+
+/// Another maker's control in the place of ours: writes down what it is told, and answers the results it was given.
+struct RecordingArchiveControl final : Object {
+  std::vector<std::string> uses;
+  std::vector<std::int16_t> results;
+
+  std::int32_t member_id(TextView /*name*/) override { raise(ErrorNumber::member_not_supported); }
+
+  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
+    if (access == Access::put) {
+      const Variant& value = arguments.front();
+      const std::string mark = value.is(Variant::Kind::text) ? "\"" : value.is(Variant::Kind::int16) ? "%" : "";
+      uses.push_back(std::to_string(member) + "=" + (mark == "%" ? "" : mark) + to_utf8(value.to_text()) + mark);
+      return {};
+    }
+    uses.push_back("get " + std::to_string(member));
+    const std::int16_t result = results.empty() ? std::int16_t{0} : results.front();
+    if (!results.empty()) results.erase(results.begin());
+    return result;
+  }
+
+  [[nodiscard]] std::string told() const {
+    std::string all;
+    for (const std::string& use : uses) all += (all.empty() ? "" : " ") + use;
+    return all;
+  }
+};
+
+/// Fake but for its files.
+struct PlatformWithFiles : FakePlatform {
+  std::unique_ptr<Files> own_files = testing::real_files();
+  std::unique_ptr<Folders> own_folders = testing::real_folders();
+  PlatformWithFiles() {
+    real_files = own_files.get();
+    real_folders = own_folders.get();
+  }
+};
+
+class ZipFilesTest : public ::testing::Test {
+ protected:
+  std::shared_ptr<RecordingArchiveControl> replace(const Text& class_name) {
+    auto control = std::make_shared<RecordingArchiveControl>();
+    platform.controls[class_name] = control;
+    return control;
+  }
+
+  void zip(const Text& archive, const Text& items, std::int16_t multi_volume = 0, const Text& password = {}) {
+    ORVUtils(library).CallZIPFiles(archive, items, multi_volume, password, Boolean(false));
+  }
+  void unzip(const Text& archive, const Text& target, const Text& items = {}, bool overwrite = false) {
+    ORVUtils(library).CallUnZIPFiles(archive, target, items, Boolean(overwrite));
+  }
+
+  PlatformWithFiles platform;
+  Library library{platform.platform()};
+  Text folder = testing::scratch_folder();
+};
+
+TEST_F(ZipFilesTest, TellsTheControlsInTheirOrder) {
+  const auto zip_control = replace(u"DZACTXLibCtl.dzactxctrl");
+  const auto unzip_control = replace(u"DUZACTXLibCtl.duzactxctrl");
+  zip(u"a.zip", u"*.*", 1, u"key");
+  EXPECT_EQ(zip_control->told(),
+            "40=0 34=False 3=False 18=False 15=False 33=False 30=False 6=False 26=False 12=False 13=False 16=False "
+            "24=False 29=False 14=False 36=False 28=False 17=False 23=False 10=False 9=False 7=False 4=True 19=False "
+            "21=False 20=\"\" 22=\"\" 27=\"\" 25=\"\" 2=\"\" 31=\"\" 11=\"\" 1=\"\" 42=\"\" 37=0 8=0 5=6 38=100000000 "
+            "32=0 44=0 35=\"key\" 34=True 37=1 1=\"a.zip\" 2=\"*.*\" 40=4 get 39 get 39");
+  zip_control->uses.clear();
+  zip(u"a.zip", u"*.*", 2);
+  EXPECT_EQ(zip_control->told().find(" 37=1"), std::string::npos) << "only 1 asks for volumes";
+
+  unzip(u"a.zip", u"C:\\out", u"*.txt", true);
+  const std::string reset =
+      "34=0 5=False 19=False 20=False 18=False 8=False 22=False 10=False 11=False 12=False 9=False 6=True 7=True "
+      "15=True 13=True 14=True 21=\"\" 4=\"\" 2=\"\" 17=\"\" 31=\"\" 32=\"\" 1=\"\" 24=0 16=0 23=0 33=0 30=0 27=0 25=0 "
+      "26=0 43=0 28=0% 3=200 29=0 35=\"\" 37=0 42=0 1=\"a.zip\" 34=1 get 24 ";
+  EXPECT_EQ(unzip_control->told(), reset + "1=\"a.zip\" 4=\"C:\\out\" 2=\"*.txt\" 10=True 34=8 get 24 get 24");
+  unzip_control->uses.clear();
+  unzip_control->results = {13, 13, 13};
+  unzip(u"a.zip", u"C:\\out");
+  EXPECT_EQ(unzip_control->told(), reset + "get 24 get 24") << "what cannot be read is not extracted";
+  ASSERT_EQ(platform.messages.size(), 1U);
+  EXPECT_TRUE(platform.messages[0].text.starts_with(u"ORV Zipping Error: ZE_NAME  Missing"));
+}
+
+TEST_F(ZipFilesTest, ExplainsEveryCode) {
+  // In a file of its own, as users and their support know them; nothing for 22 and above.
+  const std::vector<std::string> expected = {
+#include "tests/services/expected_zip_messages.inc"
+      ""};
+  ASSERT_EQ(expected.size(), 23U);
+  for (std::int16_t code = -1; code <= 22; ++code) {
+    platform.messages.clear();
+    ModZipFiles::show_result(code, platform);
+    ASSERT_EQ(platform.messages.size(), code > 0 ? 1U : 0U);
+    if (code <= 0) continue;
+    EXPECT_EQ(to_utf8(platform.messages[0].text),
+              "ORV Zipping Error: " + expected[static_cast<std::size_t>(code)] +
+                  "  If this error occurred during a backup operation, your data is safe.  The data is copied to a "
+                  "temporary folder before a zip operation is attempted.");
+    EXPECT_EQ(platform.messages[0].title, u"");
+  }
+}
+
+TEST_F(ZipFilesTest, BacksUpAndRestores) {
+  write_file(folder, u"data\\a.txt", "first");
+  zip(folder + u"a.zip", folder + u"data", 0, u"key");
+  unzip(folder + u"a.zip", folder + u"out");
+  EXPECT_EQ(read_tree(folder + u"out"), (Tree{{u"data\\", ""}, {u"data\\a.txt", "first"}}));
+  EXPECT_TRUE(platform.messages.empty());
+
+  // The password is that of the last zip action; else the user is asked.
+  zip(folder + u"b.zip", folder + u"data");
+  platform.passwords = {u"wrong", u"key"};
+  unzip(folder + u"a.zip", folder + u"again");
+  EXPECT_EQ(platform.password_prompts,
+            (std::vector<Text>{u"Password of data/a.txt:", u"That is not the password of data/a.txt:"}));
+  EXPECT_EQ(read_tree(folder + u"again"), read_tree(folder + u"out"));
+  unzip(folder + u"a.zip", folder + u"third");
+  ASSERT_EQ(platform.messages.size(), 1U);
+  EXPECT_TRUE(platform.messages[0].text.starts_with(u"ORV Zipping Error: ZE_ABORT"));
+}
+
+/// A host's handler, called as `handler(done, total, name)`.
+struct Handler final : Object {
+  std::function<Variant()> work;
+  int calls = 0;
+  std::int32_t member_id(TextView /*name*/) override { return default_member; }
+  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
+    EXPECT_EQ(member, default_member);
+    EXPECT_EQ(access, Access::call);
+    EXPECT_EQ(arguments.size(), 3U);
+    ++calls;
+    return work();
+  }
+};
+
+TEST_F(ZipFilesTest, ControlsTellOfTheirProgress) {
+  write_file(folder, u"a.txt", "first");
+  auto own = std::make_shared<ZipControl>(library.platform());
+  const Control control{ObjectRef(own)};
+  const auto handler = std::make_shared<Handler>();
+  control.put(u"ZIPFile", folder + u"a.zip");
+  control.put(u"ItemList", folder + u"a.txt");
+  control.put(u"OnProgress", ObjectRef(handler));
+  const struct {
+    const char* name;
+    std::function<Variant()> work;
+    std::int16_t result;
+  } rows[] = {
+      {"nothing answered", [] { return Variant(); }, 0},
+      {"cancelled", [] { return Variant(Boolean(true)); }, 9},
+      {"an error of the handler", []() -> Variant { raise(ErrorNumber::overflow); }, 9},
+      {"an action within it",
+       [&] {
+         control.put(u"Action", 4);
+         EXPECT_EQ(own->ErrorCode, 1);
+         return Variant();
+       },
+       0},
+  };
+  for (const auto& row : rows) {
+    handler->work = row.work;
+    handler->calls = 0;
+    control.put(u"Action", 4);
+    EXPECT_EQ(control.get<std::int16_t>(u"ErrorCode"), row.result) << row.name;
+    EXPECT_GT(handler->calls, 0) << row.name;
+  }
+  EXPECT_GT(platform.messages_handled, 0);
+  control.put(u"Action", 5);
+  EXPECT_EQ(control.get<std::int16_t>(ZipControl::result), 16);
+  control.put(20, u"kept");
+  EXPECT_EQ(control.get<Text>(20), u"kept") << "a setting without a meaning";
+}
+
+TEST_F(ZipFilesTest, TheUnzipControlLooksAndTests) {
+  write_file(folder, u"a.txt", "first");
+  zip(folder + u"a.zip", folder + u"*.*");
+  auto own = std::make_shared<UnzipControl>(library.platform());
+  const Control control{ObjectRef(own)};
+  control.put(UnzipControl::archive_name, folder + u"a.zip");
+  for (const std::int32_t action : {UnzipControl::look, UnzipControl::test}) {
+    control.put(UnzipControl::action, action);
+    EXPECT_EQ(own->ErrorCode, 0) << to_utf8(own->ErrorText);
+  }
+  EXPECT_EQ(own->EntryCount, 1);
+  control.put(UnzipControl::action, UnzipControl::extract);
+  EXPECT_EQ(own->ErrorCode, 16) << "no destination";
+}
+
+}  // namespace
+}  // namespace talutil
