@@ -17,6 +17,7 @@
 #include "platform/win32/win32_guids.hpp"
 #include "platform/win32/win32_password_boxes.hpp"
 #include "platform/win32/win32_platform.hpp"
+#include "platform/win32/win32_registry.hpp"
 #include "platform/win32/win32_settings.hpp"
 #include "platform/win32/win32_time_conversions.hpp"
 
@@ -43,9 +44,11 @@ struct LoadedLibrary {
   win32::Win32Guids guids;
   win32::Win32Folders folders;
   win32::Win32PasswordBoxes password_boxes;
+  win32::Win32Registry registry;
+  win32::Win32Network network;
   Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers, message_pump,
                            random_source, cryptography, profiles, settings_store, time_conversions, files,
-                           folder_picker, guids, folders, password_boxes}};
+                           folder_picker, guids, folders, password_boxes, registry, network}};
 };
 
 struct Module {

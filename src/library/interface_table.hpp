@@ -260,7 +260,7 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
       P::template pending<&U::ShowSysInfo>("ShowSysInfo", "Shows the system information window."),
       P::template method<&U::DeleteFiles>("DeleteFiles", "Deletes files; the last part of the path may have wildcards.",
                                           "sFileSpec"),
-      P::template pending<&U::PingSite>("PingSite", "Always True: the test is switched off.", "sAddress"),
+      P::template method<&U::PingSite>("PingSite", "Always True: the test is switched off.", "sAddress"),
       P::template method<&U::AppendEventLog>("AppendEventLog", "Adds a line to the event log when it is on.",
                                              "sEventName", "sEventForm"),
       P::template pending<&U::SelectGridRows>("SelectGridRows",
@@ -271,16 +271,16 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
       P::template method<&U::CryptoEncryptString>("CryptoEncryptString", "Encrypts a text.", "sSourceString"),
       P::template method<&U::CryptoDecryptString>("CryptoDecryptString",
                                                   "Decrypts a text that CryptoEncryptString made.", "sSourceString"),
-      P::template pending<&U::REGISTRY_QueryValue>("REGISTRY_QueryValue",
-                                                   "The status of reading a registry value of the current user.",
-                                                   "sKeyName", "sValueName"),
-      P::template pending<&U::REGISTRY_ReturnValue>(
+      P::template method<&U::REGISTRY_QueryValue>("REGISTRY_QueryValue",
+                                                  "The status of reading a registry value of the current user.",
+                                                  "sKeyName", "sValueName"),
+      P::template method<&U::REGISTRY_ReturnValue>(
           "REGISTRY_ReturnValue", "A registry value of the current user as text.", "sKeyName", "sValueName"),
-      P::template pending<&U::REGISTRY_SetKeyValue>(
+      P::template method<&U::REGISTRY_SetKeyValue>(
           "REGISTRY_SetKeyValue", "Writes a registry value of the current user: lValueType 1 text, 4 number.",
           "sKeyName", "sValueName", "vValueSetting", "lValueType"),
-      P::template pending<&U::REGISTRY_CreateNewKey>("REGISTRY_CreateNewKey", "Creates a registry key below a root.",
-                                                     "sNewKeyName", "lPredefinedKey"),
+      P::template method<&U::REGISTRY_CreateNewKey>("REGISTRY_CreateNewKey", "Creates a registry key below a root.",
+                                                    "sNewKeyName", "lPredefinedKey"),
       P::template method<&U::ReverseString>("ReverseString", "The characters in reverse order.", "sSource"),
       P::template method<&U::StringPosition>(
           "StringPosition", "Where the text part of an address line starts after its numbers (iOption 1).", "sSource",
@@ -314,7 +314,7 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
       P::template property<&S::bPGMSMT>("bPGMSMT", "A switch kept for the host."),
       P::template property<&S::sServerName>("sServerName", "The server's name, kept for the host."),
       P::template property<&S::ORV3CFGName>("ORV3CFGName", "A configuration name kept for the host."),
-      P::template pending<&U::GetIpAddrTable>("GetIpAddrTable", "The machine's IPv4 addresses."),
+      P::template method<&U::GetIpAddrTable>("GetIpAddrTable", "The machine's IPv4 addresses."),
       P::template method<&U::VerifyMemField>("VerifyMemField", "Cleans a memo of several lines.", "sMemData"));
 }
 

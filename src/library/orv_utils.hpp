@@ -364,6 +364,7 @@ class ORVUtils {
   /// tells.
   virtual void DeleteFiles(const Text& sFileSpec);
 
+  /// True, whatever the address: the test is switched off.
   virtual Boolean PingSite(const Text& sAddress);
 
   /// Adds "user:DDMMYYYYHHMMSS:event:form" to EventLog.txt in the sORVPath folder, unless EventLog is 0. Raises 76 for
@@ -381,10 +382,19 @@ class ORVUtils {
   /// whole cipher text; an empty text gives an empty text.
   virtual Text CryptoDecryptString(const Text& sSourceString);
 
+  /// The status of reading a value below the current user's hive: 0, 2 for a missing value, 6 for a key that cannot be
+  /// opened, -1 for a type other than 1 (text) and 4 (number).
   virtual std::int32_t REGISTRY_QueryValue(const Text& sKeyName, const Text& sValueName);
+
+  /// A value as text; empty where it cannot be read. No failure is told.
   virtual Text REGISTRY_ReturnValue(const Text& sKeyName, const Text& sValueName);
+
+  /// Writes a value of a key that exists, as type 1 or 4; other types write nothing. Raises what the conversion of the
+  /// value raises (94 for Null, 13, 6), but tells no failure of the registry.
   virtual void REGISTRY_SetKeyValue(const Text& sKeyName, const Text& sValueName, const Variant& vValueSetting,
                                     const std::int32_t& lValueType);
+
+  /// Creates a key below a predefined root (0x80000001 is the current user), or opens and closes it if it exists.
   virtual void REGISTRY_CreateNewKey(const Text& sNewKeyName, const std::int32_t& lPredefinedKey);
 
   /// The characters in reverse order. Raises 6 beyond 32767 characters.
@@ -437,6 +447,8 @@ class ORVUtils {
   /// empty sChangeFrom changes nothing.
   virtual Text StringReplaceWord(const Text& sSource, const Text& sChangeFrom, const Text& sChangeTo);
 
+  /// An array, from 0, of the machine's IPv4 addresses in ascending order; without elements where there are none, or
+  /// more than 21.
   virtual Variant GetIpAddrTable();
 
   /// Cleans a memo: every line feed becomes a blank, then runs of 2, 3 and 4 blanks, line breaks and carriage

@@ -47,18 +47,12 @@ void ORVUtils::LoadGridWidths(const Variant&, const Text&, const std::int16_t&) 
 void ORVUtils::SaveGridWidths(const Variant&, const Text&, const std::int16_t&) { not_built(); }
 void ORVUtils::ExportGridData(const Variant&, const std::int16_t&, const Boolean&, const Text&) { not_built(); }
 void ORVUtils::ShowSysInfo() { not_built(); }
-Boolean ORVUtils::PingSite(const Text&) { not_built(); }
 void ORVUtils::SelectGridRows(const std::int32_t&, const Variant&, const std::int16_t&) { not_built(); }
 std::int32_t ORVUtils::CountGridSelectedRows(const std::int32_t&, const Variant&) { not_built(); }
-std::int32_t ORVUtils::REGISTRY_QueryValue(const Text&, const Text&) { not_built(); }
-Text ORVUtils::REGISTRY_ReturnValue(const Text&, const Text&) { not_built(); }
-void ORVUtils::REGISTRY_SetKeyValue(const Text&, const Text&, const Variant&, const std::int32_t&) { not_built(); }
-void ORVUtils::REGISTRY_CreateNewKey(const Text&, const std::int32_t&) { not_built(); }
 Text ORVUtils::MyInputBox(const Text&, const Text&, const Boolean&, const Boolean&, const Boolean&, const Boolean&,
                           const std::int32_t&) {
   not_built();
 }
 void ORVUtils::PrintScreen(const Variant&) { not_built(); }
-Variant ORVUtils::GetIpAddrTable() { not_built(); }
 
 }  // namespace talutil

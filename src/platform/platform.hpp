@@ -12,7 +12,9 @@
 #include "platform/folder_picker.hpp"
 #include "platform/folders.hpp"
 #include "platform/guids.hpp"
+#include "platform/network.hpp"
 #include "platform/password_boxes.hpp"
+#include "platform/registry.hpp"
 #include "platform/settings.hpp"
 #include "platform/time_conversions.hpp"
 
@@ -114,6 +116,8 @@ struct Platform {
   Guids& guids;
   Folders& folders;
   PasswordBoxes& password_boxes;
+  Registry& registry;
+  Network& network;
 };
 
 }  // namespace talutil

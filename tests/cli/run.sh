@@ -116,8 +116,8 @@ expect 'message box without a terminal' 0 'talutil: Closing ORVUtils Components 
 # ---- call: errors
 expect 'run-time error' 1 'talutil: GetData: error 5: Invalid procedure call or argument' call GetData A,B,C, 2 1
 expect 'not built yet' 1 \
-  "talutil: GetIpAddrTable: error 445: Object doesn't support this action (not built yet; \"talutil list --missing\" shows all such members)" \
-  call GetIpAddrTable
+  "talutil: ShowSysInfo: error 445: Object doesn't support this action (not built yet; \"talutil list --missing\" shows all such members)" \
+  call ShowSysInfo
 expect 'not a whole number' 1 \
   'talutil: GetData: iSt: "x" is not a whole number; write -2147483648 to 2147483647' call GetData A, x 2
 expect 'not a date' 1 \
@@ -129,7 +129,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, log, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, log, idl, reference' lst
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
 # ---- list, help

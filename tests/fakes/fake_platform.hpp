@@ -12,6 +12,7 @@
 #include "library/library.hpp"
 #include "platform/platform.hpp"
 #include "tests/fakes/fake_files.hpp"
+#include "tests/fakes/fake_registry.hpp"
 #include "tests/fakes/fake_settings.hpp"
 
 namespace talutil::testing {
@@ -19,16 +20,16 @@ namespace talutil::testing {
 /// A platform without a machine: it records what the library asks for and answers as the test says. Fields
 /// can be set at any time; the clock moves only when told. It must outlive the library that uses it.
 struct FakePlatform : MessageBoxes,
-                            Screen,
-                            Computer,
-                            Clock,
-                            FormWindows,
-                            ControlMakers,
-                            MessagePump,
-                            RandomSource,
-                            Folders,
-                            PasswordBoxes,
-                            CalendarTimeConversions {
+                      Screen,
+                      Computer,
+                      Clock,
+                      FormWindows,
+                      ControlMakers,
+                      MessagePump,
+                      RandomSource,
+                      Folders,
+                      PasswordBoxes,
+                      CalendarTimeConversions {
   struct Message {
     Text text;
     MessageButtons buttons = MessageButtons::ok;
@@ -63,6 +64,8 @@ struct FakePlatform : MessageBoxes,
   std::deque<Text> passwords;  ///< What is typed into password boxes; without one they are cancelled.
   std::vector<Text> password_prompts;
 
+  FakeRegistry registry;
+  FakeNetwork network;
   FakeProfiles profiles;
   FakeSettingsStore settings_store;
 
@@ -83,9 +86,9 @@ struct FakePlatform : MessageBoxes,
     TimeConversions& conversions = real_time_conversions == nullptr ? *this : *real_time_conversions;
     Files& used_files = real_files == nullptr ? files : *real_files;
     Folders* used_folders = real_folders == nullptr ? this : real_folders;
-    return {*this,      *this,         *this,         *this,         *this,          *this,
-            *this,      *this,         *cryptography, profiles,      settings_store, conversions,
-            used_files, folder_picker, guids,         *used_folders, *this};
+    return {*this, *this,         *this,    *this,          *this,       *this,      *this,
+            *this, *cryptography, profiles, settings_store, conversions, used_files, folder_picker,
+            guids, *used_folders, *this,    registry,       network};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {

@@ -77,7 +77,8 @@ void Hive::open() {
         PRAGMA synchronous = NORMAL;
         CREATE TABLE IF NOT EXISTS hive_values (
           folded_key BLOB, folded_name BLOB, key BLOB, name BLOB, type INTEGER, data BLOB,
-          PRIMARY KEY (folded_key, folded_name)) WITHOUT ROWID;)";
+          PRIMARY KEY (folded_key, folded_name)) WITHOUT ROWID;
+        CREATE TABLE IF NOT EXISTS hive_keys (folded_key BLOB PRIMARY KEY, key BLOB) WITHOUT ROWID;)";
     require(sqlite3_exec(handle, preparation, nullptr, nullptr, nullptr), SQLITE_OK);
   } catch (...) {
     database_.reset();
@@ -141,6 +142,28 @@ std::vector<Hive::NamedValue> Hive::values_below(TextView key) {
   }
   require(status, SQLITE_DONE);
   return values;
+}
+
+bool Hive::has_key(TextView key) {
+  open();
+  const Statement statement = prepare(
+      "SELECT 1 FROM hive_keys WHERE folded_key = ?1 OR (folded_key >= ?2 AND folded_key < ?3) UNION ALL "
+      "SELECT 1 FROM hive_values WHERE folded_key = ?1 OR (folded_key >= ?2 AND folded_key < ?3) LIMIT 1");
+  const std::string whole = folded(key);
+  bind(statement, 1, whole);
+  bind(statement, 2, whole + '\\');
+  bind(statement, 3, whole + ']');
+  const int status = sqlite3_step(statement.get());
+  if (status != SQLITE_ROW) require(status, SQLITE_DONE);
+  return status == SQLITE_ROW;
+}
+
+void Hive::add_key(TextView key) {
+  open();
+  const Statement statement = prepare("INSERT INTO hive_keys VALUES (?1, ?2) ON CONFLICT DO NOTHING");
+  bind(statement, 1, folded(key));
+  bind(statement, 2, to_utf8(key));
+  require(sqlite3_step(statement.get()), SQLITE_DONE);
 }
 
 }  // namespace talutil::posix

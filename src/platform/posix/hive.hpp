@@ -42,6 +42,12 @@ class Hive {
   /// All values of a key and of the keys below it, by key and name.
   [[nodiscard]] std::vector<NamedValue> values_below(TextView key);
 
+  /// Whether a key was added, or it or one below it has a value.
+  [[nodiscard]] bool has_key(TextView key);
+
+  /// Makes a key that exists without values; one that exists stays as it is.
+  void add_key(TextView key);
+
   [[nodiscard]] const std::string& path() const noexcept { return path_; }
 
   /// The user's own: TALUTIL_HIVE, or talutil/hive.db in the user's data folder.

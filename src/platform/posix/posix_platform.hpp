@@ -7,6 +7,7 @@
 #include "platform/posix/posix_folders.hpp"
 #include "platform/posix/posix_guids.hpp"
 #include "platform/posix/posix_password_boxes.hpp"
+#include "platform/posix/posix_registry.hpp"
 #include "platform/posix/posix_settings.hpp"
 #include "platform/posix/posix_time_conversions.hpp"
 
@@ -80,12 +81,15 @@ struct PosixPlatform {
   PosixProfiles profiles{files};
   Hive hive{Hive::default_path()};
   PosixSettingsStore settings_store{hive};
+  PosixRegistry registry{hive};
+  PosixNetwork network;
   PosixTimeConversions time_conversions;
 
   [[nodiscard]] Platform platform() {
-    return {message_boxes, screen,        computer,     clock,    form_windows,   control_makers,
-            message_pump,  random_source, cryptography, profiles, settings_store, time_conversions,
-            files,         folder_picker, guids,        folders,  password_boxes};
+    return {message_boxes,  screen,           computer,      clock,         form_windows,
+            control_makers, message_pump,     random_source, cryptography,  profiles,
+            settings_store, time_conversions, files,         folder_picker, guids,
+            folders,        password_boxes,   registry,      network};
   }
 };
 
