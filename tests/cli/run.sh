@@ -201,6 +201,19 @@ verdict 'a cipher text of another maker' '1: talutil: standard input: error 5: T
   "$(m=$(echo QUJD | "$talutil" decrypt 2>&1); echo "$?: $m")"
 [[ $("$talutil" password --length 12 --mix hex --count 2) =~ ^[0-9A-F]{12}$'\n'[0-9A-F]{12}$ ]]
 verdict 'passwords' 0 $?
+mkdir archived && echo one >archived/one.txt && echo key >key.txt
+expect 'zip' 0 '' zip a.zip archived --password-file key.txt --comment 'a comment'
+expect 'zip --test' 0 'a.zip: 2 entries, all well' zip --test a.zip --password-file key.txt
+expect 'zip --test without the password' 1 'talutil: a.zip: archived/one.txt: no password was given (code 9)' zip --test a.zip
+expect_part 'unzip --list' 0 ' *archived/one.txt' unzip --list a.zip
+expect 'unzip' 0 '' unzip a.zip --to unpacked --password-file key.txt
+expect 'zip nothing' 1 'talutil: a.zip: no item matches (code 12)' zip a.zip 'none*'
+expect_part 'zip without items' 2 'name what is to be packed' zip a.zip
+expect_part 'AES without a password' 2 'give --encrypt or --password-file' zip a.zip archived --aes
+expect 'unzip a missing archive' 1 'talutil: none.zip: there is no such file (code 13)' unzip none.zip
+diff -r archived unpacked/archived
+verdict 'unpacked' 0 $?
+
 expect 'unknown mix' 2 'talutil: --mix x: there is no such mix; there are digits, letters, all and hex' password --mix x
 expect_part 'password without length' 2 '--length: Value 0 not in range 1 to 32767' password --length 0
 

@@ -498,7 +498,9 @@ class Walk {
  public:
   explicit Walk(IDispatch* object) : object_(object), slots_(slots_of(object)), values_(hostile_values()) {
     // Members that wait for a user would wait for ever.
-    std::erase_if(slots_, [](const Slot& slot) { return slot.name == L"BrowseForFolder"; });
+    std::erase_if(slots_, [](const Slot& slot) {
+      return slot.name == L"BrowseForFolder" || slot.name == L"CallZIPFiles" || slot.name == L"CallUnZIPFiles";
+    });
     for (Slot& slot : slots_) {
       std::erase_if(slot.parameters, [](const SlotParameter& p) { return (p.flags & PARAMFLAG_FRETVAL) != 0; });
     }

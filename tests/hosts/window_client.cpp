@@ -1,6 +1,7 @@
 // A client that looks at the library's windows: the components window, and the box that Terminate shows.
 #include <algorithm>
 #include <atomic>
+#include <fstream>
 #include <thread>
 
 #include "client.hpp"
@@ -145,6 +146,59 @@ void folder_is_picked(_ORVUtils* u, const Desktop& desktop, const std::wstring& 
   check_equal(expected, std::wstring(chosen.view()), what + ": the answer");
 }
 
+bool shows(const SeenBox& box, const std::wstring& text) {
+  return std::ranges::any_of(box.parts, [&](const WindowText& part) { return part.text.starts_with(text); });
+}
+
+/// Packs a file with a password, forgets the password, and unpacks: the user is asked for it.
+void password_is_asked_for(_ORVUtils* u, const Desktop& desktop, const std::wstring& pictures) {
+  std::array<wchar_t, MAX_PATH> temporary{};
+  const std::wstring folder(temporary.data(), GetTempPathW(MAX_PATH, temporary.data()));
+  const std::wstring archive = folder + L"window_client.zip";
+  const std::wstring file = folder + L"window_client.txt";
+  std::ofstream(std::string(file.begin(), file.end())) << "content";
+  DeleteFileW(archive.c_str());
+  Number<VARIANT_BOOL> no;
+  u->CallZIPFiles(Text(archive.c_str()), Text(file.c_str()), Short{}, Text(L"key"), no);
+  u->CallZIPFiles(Text((folder + L"other.zip").c_str()), Text(file.c_str()), Short{}, Text(), no);
+  const std::wstring target = folder + L"window_client_out";
+  DeleteFileW((target + L"\\window_client.txt").c_str());
+  const auto unzip = [&] { u->CallUnZIPFiles(Text(archive.c_str()), Text(target.c_str()), Text(), no); };
+  bool is_masked = false;
+  const auto type = [&](HWND dialog) {
+    const HWND entry = GetDlgItem(dialog, 100);
+    is_masked = (GetWindowLongW(entry, GWL_STYLE) & ES_PASSWORD) != 0;
+    SetWindowTextW(entry, L"key");
+    Sleep(300);  // Until it is painted.
+    take_picture(pictures, L"password_box");
+    PostMessageW(dialog, WM_COMMAND, IDOK, 0);
+  };
+  const SeenBox box = act_and_watch(desktop, type, unzip);
+  check_equal(L"Encrypted archive", box.title, "the title of the password box");
+  check(shows(box, L"Password of window_client.txt:"), "its prompt");
+  check(is_masked, "what is typed is masked");
+  check(GetFileAttributesW((target + L"\\window_client.txt").c_str()) != INVALID_FILE_ATTRIBUTES, "it was unpacked");
+
+  // A cancelled box, and an archive that is missing, are explained.
+  DeleteFileW((target + L"\\window_client.txt").c_str());
+  SeenBox message;
+  std::atomic<bool> is_over = false;
+  const auto cancel = [&](HWND dialog) {
+    PostMessageW(dialog, WM_COMMAND, IDCANCEL, 0);
+    while (IsWindow(dialog) != FALSE) Sleep(20);
+    const HWND next = wait_for_box(is_over);
+    if (next == nullptr) return;
+    message = look_at_box(next);
+    PostMessageW(next, WM_COMMAND, IDOK, 0);
+  };
+  act_and_watch(desktop, cancel, unzip);
+  check(shows(message, L"ORV Zipping Error: ZE_ABORT    Application canceled operation"), "a cancelled box is told");
+  DeleteFileW(archive.c_str());
+  const auto close = [](HWND dialog) { PostMessageW(dialog, WM_COMMAND, IDOK, 0); };
+  check(shows(act_and_watch(desktop, close, unzip), L"ORV Zipping Error: ZE_NAME  Missing or empty ZIP file"),
+        "a missing archive is told");
+}
+
 void components_window_is_hidden(_ORVUtils* u) {
   const std::vector<HWND> windows = components_windows();
   if (!check_equal(std::size_t{1}, windows.size(), "windows with the caption Form1")) return;
@@ -185,6 +239,7 @@ int wmain(int, wchar_t** arguments) {
     const std::wstring pictures = std::wstring(arguments[1]) + L"\\..\\screenshots";
     folder_is_picked(object.get(), desktop, pictures, true);
     folder_is_picked(object.get(), desktop, pictures, false);
+    password_is_asked_for(object.get(), desktop, pictures);
     components_window_is_hidden(object.get());
     box_has_text_and_button(terminate_and_watch(object.get(), 1, desktop, pictures));
     check(!terminate_and_watch(object.get(), -1, desktop, pictures).seen, "no box with DebugMode -1");

@@ -1,8 +1,96 @@
 #include "platform/win32/win32_password_boxes.hpp"
 
+#include <algorithm>
+#include <cstring>
+#include <vector>
+
+#include "automation/run_time_error.hpp"
+#include "platform/win32/windows.hpp"
+
 namespace talutil::win32 {
 
-// The box itself is not built yet: every question is cancelled.
-std::optional<Text> Win32PasswordBoxes::ask(TextView /*prompt*/, TextView /*title*/) { return std::nullopt; }
+namespace {
+
+constexpr WORD entry_id = 100;
+constexpr WORD button_class = 0x80;
+constexpr WORD edit_class = 0x81;
+constexpr WORD static_class = 0x82;
+
+/// A dialog in the form that the platform wants it in memory: 16-bit words, each item on a multiple of two.
+class DialogTemplate {
+ public:
+  DialogTemplate(short width, short height, WORD items, TextView title) {
+    constexpr DWORD style =
+        DS_MODALFRAME | DS_SETFONT | DS_CENTER | DS_SETFOREGROUND | WS_POPUP | WS_CAPTION | WS_SYSMENU;
+    add(DLGTEMPLATE{style, 0, items, 0, 0, width, height});
+    words_.insert(words_.end(), {0, 0});  // No menu, the class of dialogs.
+    add_text(title);
+    constexpr WORD points = 8;
+    words_.push_back(points);
+    add_text(u"MS Shell Dlg");
+  }
+
+  void add_item(DWORD style, const RECT& place, WORD id, WORD window_class, TextView text) {
+    if (words_.size() % 2 != 0) words_.push_back(0);
+    add(DLGITEMTEMPLATE{style | WS_CHILD | WS_VISIBLE, 0, static_cast<short>(place.left), static_cast<short>(place.top),
+                        static_cast<short>(place.right), static_cast<short>(place.bottom), id});
+    words_.insert(words_.end(), {0xFFFF, window_class});
+    add_text(text);
+    words_.push_back(0);
+  }
+
+  [[nodiscard]] const DLGTEMPLATE* get() const noexcept { return reinterpret_cast<const DLGTEMPLATE*>(words_.data()); }
+
+ private:
+  template <class Block>
+  void add(const Block& block) {
+    static_assert(sizeof block % sizeof(WORD) == 0);
+    const std::size_t start = words_.size();
+    words_.resize(start + sizeof block / sizeof(WORD));
+    std::memcpy(&words_[start], &block, sizeof block);
+  }
+
+  void add_text(TextView text) {
+    std::ranges::transform(up_to_nul(text), std::back_inserter(words_), [](char16_t unit) { return WORD{unit}; });
+    words_.push_back(0);
+  }
+
+  std::vector<WORD> words_;
+};
+
+/// What was typed stands in the text that the dialog was started with.
+INT_PTR CALLBACK handle(HWND dialog, UINT message, WPARAM what, LPARAM value) noexcept {
+  if (message == WM_INITDIALOG) {
+    SetWindowLongPtrW(dialog, DWLP_USER, value);
+    return TRUE;
+  }
+  if (message != WM_COMMAND || (LOWORD(what) != IDOK && LOWORD(what) != IDCANCEL)) return FALSE;
+  if (LOWORD(what) == IDOK) {
+    auto& answer = *reinterpret_cast<Text*>(GetWindowLongPtrW(dialog, DWLP_USER));
+    constexpr int longest = 1024;
+    answer.resize(longest);
+    const UINT length =
+        GetDlgItemTextW(dialog, entry_id, reinterpret_cast<wchar_t*>(answer.data()), static_cast<int>(answer.size()));
+    answer.resize(length);
+  }
+  EndDialog(dialog, LOWORD(what));
+  return TRUE;
+}
+
+}  // namespace
+
+std::optional<Text> Win32PasswordBoxes::ask(TextView prompt, TextView title) {
+  // In dialog units: a quarter of a character's width, an eighth of its height.
+  constexpr WORD items = 4;
+  DialogTemplate box(220, 70, items, title);
+  box.add_item(SS_LEFT | SS_NOPREFIX, {7, 7, 206, 18}, 0xFFFF, static_class, prompt);
+  box.add_item(WS_TABSTOP | WS_BORDER | ES_PASSWORD | ES_AUTOHSCROLL, {7, 28, 206, 13}, entry_id, edit_class, {});
+  box.add_item(WS_TABSTOP | BS_DEFPUSHBUTTON, {109, 49, 50, 14}, IDOK, button_class, u"OK");
+  box.add_item(WS_TABSTOP, {163, 49, 50, 14}, IDCANCEL, button_class, u"Cancel");
+  Text answer;
+  const INT_PTR end = DialogBoxIndirectParamW(GetModuleHandleW(nullptr), box.get(), GetActiveWindow(), &handle,
+                                              reinterpret_cast<LPARAM>(&answer));
+  return end == IDOK ? std::optional(std::move(answer)) : std::nullopt;
+}
 
 }  // namespace talutil::win32
