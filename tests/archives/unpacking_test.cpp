@@ -4,6 +4,7 @@
 #include "archives/directory.hpp"
 #include "archives/little_endian.hpp"
 #include "archives/split_set.hpp"
+#include "tests/archives/memory_file.hpp"
 #include "tests/archives/tree.hpp"
 
 namespace talutil::archives {
@@ -11,19 +12,6 @@ namespace {
 
 using namespace testing;
 using talutil::testing::scratch_folder;
-
-class MemoryFile final : public StoredFile {
- public:
-  explicit MemoryFile(std::string bytes) : bytes_(std::move(bytes)) {}
-  [[nodiscard]] std::uint64_t size() const noexcept override { return bytes_.size(); }
-  std::size_t read_at(std::uint64_t offset, std::span<char> buffer) override {
-    if (offset >= bytes_.size()) return 0;
-    return bytes_.copy(buffer.data(), buffer.size(), static_cast<std::size_t>(offset));
-  }
-
- private:
-  std::string bytes_;
-};
 
 /// An entry as nobody's program would write it.
 struct Made {
