@@ -102,6 +102,6 @@ if [ ! -d "$prefix" ]; then
     "build_$package" >"$work/$package.log" 2>&1 || { tail -30 "$work/$package.log" >&2; fail "could not build $package"; }
   done
   # Another run may have finished first; both made the same thing.
-  mv -T "$made" "$prefix" 2>/dev/null || true
+  mv -T "$made" "$prefix" 2>/dev/null || [ -d "$prefix" ] || fail "could not put the libraries into $prefix"
 fi
 echo "$prefix"

@@ -1,6 +1,7 @@
 #include "archives/collection.hpp"
 
 #include <algorithm>
+#include <unordered_map>
 
 #include "archives/file_errors.hpp"
 #include "platform/file_names.hpp"
@@ -76,6 +77,29 @@ void Collection::walk(bool keep_folders) {
       });
     });
   }
+}
+
+void Collection::drop_repeated() {
+  std::vector<Item> kept;
+  kept.reserve(items_.size());
+  std::unordered_map<std::string, std::size_t> seen;
+  for (Item& item : items_) {
+    const auto [found, is_new] = seen.emplace(item.entry, kept.size());
+    if (is_new) {
+      kept.push_back(std::move(item));
+      continue;
+    }
+    const Item& first = kept[found->second];
+    const bool is_same = with_code(Code::cannot_read, [&] {
+      if (first.name != item.name) return false;
+      if (first.folder == item.folder) return true;
+      // One after the other: only the last folder stays open.
+      const Text first_path = folder_of(first).path();
+      return first_path == folder_of(item).path();
+    });
+    if (!is_same) throw Error(Code::bad_parameters, item.entry + ": two files would have this name in the archive");
+  }
+  items_ = std::move(kept);
 }
 
 std::unique_ptr<Folder> Collection::open(std::size_t place) {

@@ -32,7 +32,11 @@ class Collection {
   /// `keep_folders` false the names of all have their last part only, and folders are no entries.
   void add(const Text& item, bool recurse, bool keep_folders);
 
-  [[nodiscard]] std::vector<Item>& items() noexcept { return items_; }
+  [[nodiscard]] const std::vector<Item>& items() const noexcept { return items_; }
+
+  /// Keeps one of each file that several items of the list led to. Fails with bad_parameters for two files that would
+  /// have one name in the archive: leaving one out would lose it.
+  void drop_repeated();
 
   /// The folder of an item. The last one stays open for the next call.
   [[nodiscard]] Folder& folder_of(const Item& item);

@@ -8,6 +8,20 @@ namespace talutil::archives {
 
 namespace {
 
+/// Does something about an entry; a name that this platform's files cannot have gives the answer for refused ones, so
+/// that the entries after it are not lost with it.
+template <class Answer, class Work>
+Answer unless_refused(Answer refused, Work&& work) {
+  return with_code(Code::cannot_create, [&] {
+    try {
+      return work();
+    } catch (const RunTimeError& error) {
+      if (error.number() != static_cast<std::int32_t>(ErrorNumber::bad_file_name_or_number)) throw;
+      return refused;
+    }
+  });
+}
+
 /// A path by which places are found; no part has a separator in it.
 Text key_of(std::span<const Text> parts) {
   Text key;
@@ -49,8 +63,8 @@ Destination::Place* Destination::place_of(std::span<const Text> parts) {
   Place* const above = place_of(parts.first(parts.size() - 1));
   if (above == nullptr) return nullptr;
   const Text& name = parts.back();
-  const auto [known, is_new] = above->entries.try_emplace(upper_case(name), Known{name, FileKind::folder});
-  if (is_new) static_cast<void>(open(*above).folder(name, true));
+  if (!above->entries.contains(upper_case(name))) static_cast<void>(open(*above).folder(name, true));
+  const auto known = above->entries.try_emplace(upper_case(name), Known{name, FileKind::folder}).first;
   if (known->second.kind != FileKind::folder) return nullptr;
   std::vector<Text> spelled = above->parts;
   spelled.push_back(known->second.name);
@@ -59,7 +73,7 @@ Destination::Place* Destination::place_of(std::span<const Text> parts) {
 
 Destination::Answer Destination::create(const std::vector<Text>& parts, bool overwrite,
                                         std::unique_ptr<NewFile>& file) {
-  return with_code(Code::cannot_create, [&] {
+  return unless_refused(Answer::refused, [&] {
     Place* const place = place_of(std::span(parts).first(parts.size() - 1));
     if (place == nullptr) return Answer::refused;
     const auto [found, is_new] = place->entries.try_emplace(upper_case(parts.back()), Known{parts.back()});
@@ -75,7 +89,7 @@ Destination::Answer Destination::create(const std::vector<Text>& parts, bool ove
 }
 
 bool Destination::make_folder(const std::vector<Text>& parts, const FileFacts& facts) {
-  return with_code(Code::cannot_create, [&] {
+  return unless_refused(false, [&] {
     const Place* const place = place_of(parts);
     if (place != nullptr) finished_later_.emplace_back(place->parts, facts);
     return place != nullptr;

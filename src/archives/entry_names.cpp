@@ -35,8 +35,9 @@ std::optional<std::vector<Text>> safe_parts(TextView name) {
   std::vector<Text> parts = parts_of(without_drive(name));
   if (parts.empty()) return std::nullopt;
   for (Text& part : parts) {
-    if (part == u".." || part.size() >= longest_part) return std::nullopt;
+    if (part == u".." || part.size() > longest_part) return std::nullopt;
     part = made_safe(std::move(part));
+    if (part.size() > longest_part) return std::nullopt;
   }
   return parts;
 }

@@ -93,7 +93,10 @@ zip_int64_t PackedFiles::read(Source& source, std::span<char> buffer) {
     if (count == 0) progress_.advance(source.size, entry_);
     return static_cast<zip_int64_t>(count);
   }
-  const std::size_t count = file_->read_at(place_, buffer);
+  // As above: no further than it went, so that its size in the archive's headers holds.
+  const std::uint64_t rest = source.item->facts.size - place_;
+  const std::size_t count =
+      file_->read_at(place_, buffer.first(static_cast<std::size_t>(std::min<std::uint64_t>(rest, buffer.size()))));
   place_ += count;
   progress_.advance(count, entry_);
   return static_cast<zip_int64_t>(count);

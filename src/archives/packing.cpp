@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <limits>
 #include <unordered_map>
-#include <unordered_set>
 
 #include "archives/file_errors.hpp"
 #include "archives/item_list.hpp"
@@ -63,19 +62,12 @@ class Packer {
     if (password_.find('\0') != std::string::npos) throw Error(Code::bad_parameters, "a password has no NUL");
   }
 
-  void add_all(std::vector<Item>& items) {
-    drop_repeated(items);
+  void add_all(const std::vector<Item>& items) {
     delete_replaced(items);
     for (const Item& item : items) add(item);
   }
 
  private:
-  /// A file that several items of the list lead to is packed once.
-  static void drop_repeated(std::vector<Item>& items) {
-    std::unordered_set<std::string_view> seen;
-    std::erase_if(items, [&](const Item& item) { return !seen.insert(item.entry).second; });
-  }
-
   void delete_replaced(const std::vector<Item>& items) {
     zip_t* const archive = container_.get();
     const zip_int64_t count = zip_get_num_entries(archive, 0);
@@ -161,13 +153,12 @@ void pack(const Text& archive, TextView items, const PackingOptions& options, Fo
   if (options.level < 0 || options.level > 9) throw Error(Code::bad_parameters, "a level is 0 to 9");
   const std::string comment = to_utf8(options.comment);
   if (comment.size() > longest_comment) throw Error(Code::bad_comment, "a comment has at most 65,535 bytes");
-  if (options.volume_size && (*options.volume_size < smallest_volume || *options.volume_size > largest_volume)) {
-    throw Error(Code::bad_volume_size, "a volume has 65,536 to 2,147,483,647 bytes");
-  }
+  if (options.volume_size) require_volume_size(*options.volume_size);
   Target target = open_target(archive, folders);
   Collection collection(folders, {target.folder->path(), target.name});
   for (const Text& item : read_item_list(items)) collection.add(item, options.recurse, options.keep_folders);
   if (collection.items().empty()) throw Error(Code::nothing_to_do, "no item matches");
+  collection.drop_repeated();
 
   std::unique_ptr<NewFile> output = create(target);
   require_archive(output->replaced());

@@ -341,6 +341,11 @@ class Splitter {
 
 }  // namespace
 
+void require_volume_size(std::uint64_t bytes) {
+  if (bytes >= smallest_volume && bytes <= largest_volume) return;
+  throw Error(Code::bad_volume_size, "a volume has 65,536 to 2,147,483,647 bytes");
+}
+
 Text volume_name(TextView archive, std::uint32_t number) {
   return Text(stem_of(archive)) + u".z" + number_text(number, 2);
 }
@@ -363,9 +368,6 @@ std::unique_ptr<StoredFile> open_archive(Folder& folder, const Text& name) {
 
 void split_archive(std::unique_ptr<NewFile> archive, Folder& folder, TextView name, std::uint64_t volume_size,
                    Progress& progress) {
-  if (volume_size < smallest_volume || volume_size > largest_volume) {
-    throw Error(Code::bad_volume_size, "a volume has 65,536 to 2,147,483,647 bytes");
-  }
   if (archive->size() <= volume_size) {
     with_code(Code::cannot_create, [&] {
       archive->finish(nullptr);

@@ -12,6 +12,9 @@ namespace talutil::archives {
 constexpr std::uint64_t smallest_volume = 65'536;
 constexpr std::uint64_t largest_volume = 2'147'483'647;
 
+/// Fails with bad_volume_size for one that is too small or too large.
+void require_volume_size(std::uint64_t bytes);
+
 /// The name of a volume before the last, counted from 1.
 [[nodiscard]] Text volume_name(TextView archive, std::uint32_t number);
 
@@ -20,8 +23,8 @@ constexpr std::uint64_t largest_volume = 2'147'483'647;
 [[nodiscard]] std::unique_ptr<StoredFile> open_archive(Folder& folder, const Text& name);
 
 /// Cuts an archive into a set, unless it fits into one volume: then it takes its name as it is. The volumes take their
-/// names when all are complete. Headers are never cut. Fails with bad_volume_size, and with cannot_write or
-/// cannot_create for the volumes.
+/// names when all are complete. Headers are never cut. Fails with bad_volume_size for a header that fits into no
+/// volume, and with cannot_write or cannot_create for the volumes.
 void split_archive(std::unique_ptr<NewFile> archive, Folder& folder, TextView name, std::uint64_t volume_size,
                    Progress& progress);
 

@@ -68,7 +68,7 @@ TEST(EntryNames, StayBelowTheFolder) {
       {u"x\t\u0001y", u"x__y"},
       {u"trailing. .", u"trailing___"},
       {u"...", u"___"},
-      {Text(255, u'x'), u"-"},
+      {Text(256, u'x'), u"-"},
       {Text(65535, u'y'), u"-"},
   };
   for (const auto& row : rows) {

@@ -98,6 +98,10 @@ TEST_F(PackingTest, UnderstandsItems) {
       {"folders by pattern", folder + u"data\\s*", {}, {u"sub\\", u"sub\\noise.bin"}},
       {"no folders", folder + u"data\\*", {.recurse = false}, {u"empty.txt", u"letter.txt", u"\u0416 wide \u00E9.txt"}},
       {"no names of folders", folder + u"data\\s*", {.keep_folders = false}, {u"noise.bin"}},
+      {"a file named thrice",
+       folder + u"data\\sub\\n* " + folder + u"data\\l* " + folder + u"data\\letter.txt " + folder + u"data\\sub\\*",
+       {},
+       {u"letter.txt", u"noise.bin"}},
       {"one of two is missing", folder + u"missing " + folder + u"data\\sub", {}, {u"sub\\", u"sub\\noise.bin"}},
       {"the archive is not its own", folder + u"*.zip " + folder + u"data\\l*", {}, {u"letter.txt"}},
   };
@@ -143,6 +147,7 @@ TEST_F(PackingTest, EndsWithTheCodeOfItsFault) {
   ASSERT_EQ(pack_files(folder + u"set.zip", items, {.level = 0, .volume_size = smallest_volume}), Code::ok);
   write_file(folder, u"broken.zip", "PK\3\4 and no end");
   write_file(folder, u"none.zip", "no archive at all");
+  write_file(folder, u"twice\\none.zip", "another of that name");
   write_file(folder, u"locked.zip", "");
   write_file(folder, u"read-only.zip", "");
   talutil::testing::set_read_only(folder + u"read-only.zip", true);
@@ -168,6 +173,7 @@ TEST_F(PackingTest, EndsWithTheCodeOfItsFault) {
       {"archive is none", folder + u"none.zip", items, {}, Code::bad_structure},
       {"adding to a set", folder + u"set.zip", items, {}, Code::split_set_in_use},
       {"volumes too small", archive, items, {.volume_size = 1000}, Code::bad_volume_size},
+      {"two files of one name", archive, folder + u"*.zip " + folder + u"twice\\*", {}, Code::bad_parameters},
       {"level", archive, items, {.level = 10}, Code::bad_parameters},
       {"password with NUL", archive, items, {.password = Text(u"a\0b", 3)}, Code::bad_parameters},
       {"comment", archive, items, {.comment = Text(65536, u'c')}, Code::bad_comment},
@@ -185,6 +191,27 @@ TEST_F(PackingTest, LargeFilesAreStreamed) {
     EXPECT_EQ(unpacked({.password = u"p"}), (Tree{{u"large.txt", large}}));
   }
   EXPECT_LT(archive_bytes().size(), large.size() / 2);
+}
+
+TEST_F(PackingTest, FilesThatChangeArePackedAsTheyWereRead) {
+  for (const std::int32_t level : {0, 6}) {
+    write_file(folder, u"grows.txt", "found");
+    write_file(folder, u"shrinks.txt", "found too");
+    int calls = 0;
+    Progress changing([&](std::uint64_t done, std::uint64_t total, TextView) {
+      EXPECT_LE(done, total);
+      if (calls++ == 0) {
+        write_file(folder, u"grows.txt", "found and longer now");
+        write_file(folder, u"shrinks.txt", "f");
+      }
+      return true;
+    });
+    const Text items = folder + u"data\\letter.txt " + folder + u"grows.txt " + folder + u"shrinks.txt";
+    ASSERT_EQ(pack_files(archive, items, {.level = level}, changing), Code::ok);
+    const Tree expected = {
+        {u"letter.txt", sample.at(u"data\\letter.txt")}, {u"grows.txt", "found"}, {u"shrinks.txt", "f"}};
+    EXPECT_EQ(unpacked(), expected) << level;
+  }
 }
 
 TEST_F(PackingTest, AVolumeThatIsMissingIsNamed) {

@@ -61,6 +61,14 @@ void Hive::bind(const Statement& statement, int place, std::string_view text) co
   require(sqlite3_bind_blob64(statement.get(), place, text.data(), text.size(), SQLITE_TRANSIENT), SQLITE_OK);
 }
 
+void Hive::bind_tree(const Statement& statement, TextView key) const {
+  const std::string whole = folded(key);
+  bind(statement, 1, whole);
+  // "]" is what follows "\".
+  bind(statement, 2, whole + '\\');
+  bind(statement, 3, whole + ']');
+}
+
 void Hive::open() {
   if (database_) return;
   std::error_code ignored;  // SQLite tells below that it cannot open the file.
@@ -126,14 +134,10 @@ void Hive::put(TextView key, TextView name, const Value& value) {
 
 std::vector<Hive::NamedValue> Hive::values_below(TextView key) {
   open();
-  // "]" is what follows "\".
   const Statement statement = prepare(
       "SELECT key, name, type, data FROM hive_values "
       "WHERE folded_key = ?1 OR (folded_key >= ?2 AND folded_key < ?3) ORDER BY folded_key, folded_name");
-  const std::string whole = folded(key);
-  bind(statement, 1, whole);
-  bind(statement, 2, whole + '\\');
-  bind(statement, 3, whole + ']');
+  bind_tree(statement, key);
   std::vector<NamedValue> values;
   int status = SQLITE_DONE;
   while ((status = sqlite3_step(statement.get())) == SQLITE_ROW) {
@@ -149,10 +153,7 @@ bool Hive::has_key(TextView key) {
   const Statement statement = prepare(
       "SELECT 1 FROM hive_keys WHERE folded_key = ?1 OR (folded_key >= ?2 AND folded_key < ?3) UNION ALL "
       "SELECT 1 FROM hive_values WHERE folded_key = ?1 OR (folded_key >= ?2 AND folded_key < ?3) LIMIT 1");
-  const std::string whole = folded(key);
-  bind(statement, 1, whole);
-  bind(statement, 2, whole + '\\');
-  bind(statement, 3, whole + ']');
+  bind_tree(statement, key);
   const int status = sqlite3_step(statement.get());
   if (status != SQLITE_ROW) require(status, SQLITE_DONE);
   return status == SQLITE_ROW;

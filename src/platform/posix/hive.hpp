@@ -67,6 +67,8 @@ class Hive {
   void require(int status, int expected) const;
   [[nodiscard]] Statement prepare(const char* sql) const;
   void bind(const Statement& statement, int place, std::string_view text) const;
+  /// A key as ?1, and the bounds of the keys below it as ?2 and ?3.
+  void bind_tree(const Statement& statement, TextView key) const;
   [[nodiscard]] sqlite3_stmt* start(Statement& statement, const char* sql);
 
   std::string path_;
