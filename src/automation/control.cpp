@@ -1,3 +1,6 @@
+#include <algorithm>
+#include <array>
+
 #include "automation/run_time_error.hpp"
 #include "automation/variant.hpp"
 
@@ -11,12 +14,6 @@ ObjectRef object_in(const Variant& holder) {
   return *object;
 }
 
-void put_member(Object& object, std::int32_t member, std::initializer_list<Variant> indexes, const Variant& value) {
-  std::vector<Variant> arguments(indexes);
-  arguments.push_back(value);
-  object.invoke(member, Access::put, arguments);
-}
-
 }  // namespace
 
 Control::Control(const Variant& holder) : Control(object_in(holder)) {}
@@ -25,40 +22,36 @@ Control::Control(ObjectRef object) : object_(std::move(object)) {
   if (!object_) raise(ErrorNumber::object_variable_not_set);
 }
 
-template <>
-Variant Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const {
-  return object_->invoke(member, Access::get, std::span(indexes.begin(), indexes.size()));
+std::int32_t Control::identifier_of(TextView member) const {
+  // A member uses few names, so that a search costs less than a hash.
+  const auto known = std::ranges::find_if(known_, [&](const Known& entry) { return entry.name == member; });
+  if (known != known_.end()) return known->identifier;
+  const std::int32_t identifier = object_->member_id(member);
+  known_.push_back({Text(member), identifier});
+  return identifier;
 }
 
-template <>
-Text Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const {
-  return get<Variant>(member, indexes).to_text();
+bool Control::answers(TextView member) const {
+  try {
+    static_cast<void>(identifier_of(member));
+    return true;
+  } catch (const RunTimeError&) {
+    return false;
+  }
 }
 
-template <>
-std::int16_t Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const {
-  return get<Variant>(member, indexes).to_int16();
+void Control::put(TextView member, std::initializer_list<Variant> indexes, Variant value) const {
+  constexpr std::size_t most_indexes = 4;
+  if (indexes.size() > most_indexes) raise(ErrorNumber::wrong_argument_count);
+  std::array<Variant, most_indexes + 1> arguments;
+  *std::ranges::copy(indexes, arguments.begin()).out = std::move(value);
+  object_->invoke(identifier_of(member), Access::put, std::span(arguments).first(indexes.size() + 1));
 }
 
-template <>
-std::int32_t Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const {
-  return get<Variant>(member, indexes).to_int32();
-}
-
-template <>
-double Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const {
-  return get<Variant>(member, indexes).to_double();
-}
-
-void Control::put(TextView member, std::initializer_list<Variant> indexes, const Variant& value) const {
-  put_member(*object_, object_->member_id(member), indexes, value);
-}
-
-void Control::put(std::int32_t member, const Variant& value) const { put_member(*object_, member, {}, value); }
+void Control::put(std::int32_t member, Variant value) const { object_->invoke(member, Access::put, {&value, 1}); }
 
 Variant Control::call(TextView member, std::initializer_list<Variant> arguments) const {
-  const std::int32_t identifier = object_->member_id(member);
-  return object_->invoke(identifier, Access::call, std::span(arguments.begin(), arguments.size()));
+  return object_->invoke(identifier_of(member), Access::call, {arguments.begin(), arguments.size()});
 }
 
 }  // namespace talutil

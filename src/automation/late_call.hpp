@@ -206,6 +206,11 @@ struct LateCalls {
     return {&detail::late_put<Target, M>, &detail::late_get<Target, M>};
   }
 
+  template <auto G, auto S, class... Names>
+  static constexpr std::array<LateCall, 2> accessors(MemberName, const char*, Names...) {
+    return {&detail::late_method<Target, G>, &detail::late_method<Target, S>};
+  }
+
   template <auto M, class... Names>
   static constexpr std::array<LateCall, 1> method(MemberName, const char*, Names...) {
     return {&detail::late_method<Target, M>};

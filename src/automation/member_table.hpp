@@ -162,6 +162,9 @@ struct MemberPointer<R (C::*)(A...)> {
 template <class C, class R, class... A>
 struct MemberPointer<R (C::*)(A...) const> : MemberPointer<R (C::*)(A...)> {};
 
+template <class C, class R, class... A>
+struct MemberPointer<R (C::*)(A...) const noexcept> : MemberPointer<R (C::*)(A...)> {};
+
 template <class C, class T>
 requires(!std::is_function_v<T>) struct MemberPointer<T C::*> {
   using Class = C;
@@ -211,6 +214,16 @@ struct Describe {
   template <auto M>
   static constexpr std::array<Member, 2> property_put_first(MemberName name, const char* help) {
     return {put_only<M>(name, help)[0], get_only<M>(name, help)[0]};
+  }
+
+  /// A property with functions behind it, with or without indexes: G gives the value, S takes the value after the
+  /// indexes. Controls have them; interfaces do not.
+  template <auto G, auto S, class... Names>
+  static constexpr std::array<Member, 2> accessors(MemberName name, const char* help, Names... names) {
+    std::array<Member, 2> slots{method<G>(name, help, names...)[0], method<S>(name, help, names..., "value")[0]};
+    slots[0].access = Access::get;
+    slots[1].access = Access::put;
+    return slots;
   }
 
   template <auto M, class... Names>

@@ -36,6 +36,7 @@ std::string_view standard_description(std::int32_t number) noexcept {
     case ErrorNumber::named_argument_not_found: return "Named argument not found";  // 448
     case ErrorNumber::argument_not_optional: return "Argument not optional";  // 449
     case ErrorNumber::wrong_argument_count: return "Wrong number of arguments or invalid property assignment";  // 450
+    case ErrorNumber::missing_entry_point: return "Can't find DLL entry point";  // 453
   }
   // clang-format on
   return "Application-defined or object-defined error";
@@ -45,8 +46,11 @@ RunTimeError::RunTimeError(ErrorNumber number)
     : RunTimeError(static_cast<std::int32_t>(number),
                    from_utf8(standard_description(static_cast<std::int32_t>(number)))) {}
 
-RunTimeError::RunTimeError(std::int32_t number, Text description)
-    : number_(number), description_(std::move(description)), narrow_(to_utf8(description_)) {}
+RunTimeError::RunTimeError(std::int32_t number, Text description, Text source)
+    : number_(number),
+      description_(std::move(description)),
+      source_(std::move(source)),
+      narrow_(to_utf8(description_)) {}
 
 void raise(ErrorNumber number) { throw RunTimeError(number); }
 

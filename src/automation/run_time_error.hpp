@@ -40,24 +40,29 @@ enum class ErrorNumber : std::int32_t {
   named_argument_not_found = 448,
   argument_not_optional = 449,
   wrong_argument_count = 450,
+  missing_entry_point = 453,
 };
 
 /// The standard text of a number; the text of an unknown number is "Application-defined or object-defined error".
 [[nodiscard]] std::string_view standard_description(std::int32_t number) noexcept;
 
-/// The one exception of the library: what a host sees as Err.Number and Err.Description.
+/// The one exception of the library: what a host sees as Err.Number, Err.Description and Err.Source.
 class RunTimeError : public std::exception {
  public:
   explicit RunTimeError(ErrorNumber number);
-  RunTimeError(std::int32_t number, Text description);
+
+  /// An empty source stands for the library's own; another is that of a control which raised the error.
+  RunTimeError(std::int32_t number, Text description, Text source = {});
 
   [[nodiscard]] std::int32_t number() const noexcept { return number_; }
   [[nodiscard]] const Text& description() const noexcept { return description_; }
+  [[nodiscard]] const Text& source() const noexcept { return source_; }
   [[nodiscard]] const char* what() const noexcept override { return narrow_.c_str(); }
 
  private:
   std::int32_t number_;
   Text description_;
+  Text source_;
   std::string narrow_;
 };
 

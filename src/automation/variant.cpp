@@ -161,10 +161,32 @@ bool Variant::is_null() const {
   return visit_value(*this, Overloaded{[](Null) { return true; }, [](const auto&) { return false; }});
 }
 
+bool Variant::equals_number(double number, const Locale& locale) const {
+  const Variant held = value();
+  return !held.is(Kind::null) && held.to_double(locale) == number;
+}
+
 bool Variant::equals_text(TextView text, const Locale& locale) const {
   return visit_value(*this,
                      Overloaded{[](Null) { return false; }, [&](const Text& value) { return TextView(value) == text; },
                                 [&](const auto& value) { return ToText{locale}(value) == text; }});
+}
+
+std::partial_ordering compare(const Variant& a, const Variant& b) {
+  const Variant left = a.value();
+  const Variant right = b.value();
+  if (left.is(Variant::Kind::null) || right.is(Variant::Kind::null)) return std::partial_ordering::unordered;
+  const bool is_text[] = {left.is(Variant::Kind::text), right.is(Variant::Kind::text)};
+  const auto empty_or_text = [](const Variant& value) {
+    return value.is(Variant::Kind::text) || value.is(Variant::Kind::empty);
+  };
+  if ((is_text[0] || is_text[1]) && empty_or_text(left) && empty_or_text(right))
+    return left.to_text() <=> right.to_text();
+  // Asked for also beside a text, which it comes before: what is no number is refused.
+  const double numbers[] = {is_text[0] ? 1 : left.to_double(), is_text[1] ? 1 : right.to_double()};
+  if (is_text[0]) return std::partial_ordering::greater;
+  if (is_text[1]) return std::partial_ordering::less;
+  return numbers[0] <=> numbers[1];
 }
 
 }  // namespace talutil

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <compare>
 #include <cstdint>
 #include <memory>
 #include <optional>
@@ -134,6 +135,10 @@ class Variant {
   /// text first, Empty equals the empty text, Null equals nothing. Raises 13 for an error value or an array.
   [[nodiscard]] bool equals_text(TextView text, const Locale& locale = {}) const;
 
+  /// Compares with a number, as hosts compare a variant with one: a text counts as the number that it reads as
+  /// (raises 13 for one that reads as none), Empty as 0; Null equals nothing.
+  [[nodiscard]] bool equals_number(double number, const Locale& locale = {}) const;
+
   /// Same kind and same value; objects by identity.
   friend bool operator==(const Variant&, const Variant&) = default;
 
@@ -147,44 +152,67 @@ class Variant {
 /// The error value that stands for an argument left out.
 inline constexpr ErrorValue missing_argument{static_cast<std::int32_t>(0x80020004U)};
 
+/// Compares two variants by automation's rules: numbers (dates and Booleans are numbers) by value, texts code by
+/// code, a number before any text; Empty is 0 beside a number and an empty text beside a text. Unordered when one is
+/// Null. Raises 13 for an error value or an array.
+[[nodiscard]] std::partial_ordering compare(const Variant& a, const Variant& b);
+
 /// A late-bound object as members use it: `grid.get<std::int32_t>(u"Rows")`, `grid.put(u"ColWidth", {c}, width)`.
-/// One read a statement: the host's control sees the order.
+/// One read a statement: the host's control sees the order. Each name is looked up once for as long as the Control
+/// lives, which is that of a member's call; the reference to the object is kept as long.
 class Control {
  public:
   /// Raises 424 for a variant that holds no object, 91 for an empty reference.
   explicit Control(const Variant& holder);
   explicit Control(ObjectRef object);
 
+  /// A member that the object lacks raises 438, here and below.
   template <class T = Variant>
-  [[nodiscard]] T get(TextView member, std::initializer_list<Variant> indexes = {}) const;
+  [[nodiscard]] T get(TextView member, std::initializer_list<Variant> indexes = {}) const {
+    return get<T>(identifier_of(member), indexes);
+  }
   template <class T = Variant>
   [[nodiscard]] T get(std::int32_t member, std::initializer_list<Variant> indexes = {}) const;
 
-  void put(TextView member, const Variant& value) const { put(member, {}, value); }
-  void put(TextView member, std::initializer_list<Variant> indexes, const Variant& value) const;
-  void put(std::int32_t member, const Variant& value) const;
+  void put(TextView member, Variant value) const { put(member, {}, std::move(value)); }
+  void put(TextView member, std::initializer_list<Variant> indexes, Variant value) const;
+  void put(std::int32_t member, Variant value) const;
   Variant call(TextView member, std::initializer_list<Variant> arguments = {}) const;
+
+  /// Whether the object has a member; it is looked up, not used.
+  [[nodiscard]] bool answers(TextView member) const;
 
   [[nodiscard]] const ObjectRef& object() const noexcept { return object_; }
 
  private:
+  struct Known {
+    Text name;
+    std::int32_t identifier;
+  };
+
+  [[nodiscard]] std::int32_t identifier_of(TextView member) const;
+
   ObjectRef object_;
+  mutable std::vector<Known> known_;
 };
 
-template <>
-Variant Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
-template <>
-Text Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
-template <>
-std::int16_t Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
-template <>
-std::int32_t Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
-template <>
-double Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const;
-
 template <class T>
-T Control::get(TextView member, std::initializer_list<Variant> indexes) const {
-  return get<T>(object_->member_id(member), indexes);
+T Control::get(std::int32_t member, std::initializer_list<Variant> indexes) const {
+  Variant value = object_->invoke(member, Access::get, {indexes.begin(), indexes.size()});
+  if constexpr (std::is_same_v<T, Variant>)
+    return value;
+  else if constexpr (std::is_same_v<T, Text>)
+    return value.to_text();
+  else if constexpr (std::is_same_v<T, Boolean>)
+    return value.to_boolean();
+  else if constexpr (std::is_same_v<T, std::int16_t>)
+    return value.to_int16();
+  else if constexpr (std::is_same_v<T, std::int32_t>)
+    return value.to_int32();
+  else if constexpr (std::is_same_v<T, float>)
+    return value.to_single();
+  else
+    return value.to_double();
 }
 
 }  // namespace talutil

@@ -72,18 +72,18 @@ Text read_password(const std::string& file) {
 }
 
 /// A new password, typed twice.
-Text ask_new_password(PasswordBoxes& boxes) {
-  const auto first = boxes.ask(u"New password:", {});
-  const auto second = first ? boxes.ask(u"Once more:", {}) : std::nullopt;
+Text ask_new_password(InputBoxes& boxes) {
+  const auto first = boxes.ask(u"New password:", {}, Entry::masked);
+  const auto second = first ? boxes.ask(u"Once more:", {}, Entry::masked) : std::nullopt;
   if (!second || first->empty())
     throw run_time_failure("no password was given; there must be a terminal to type it at");
   if (*first != *second) throw run_time_failure("the two passwords differ");
   return *first;
 }
 
-archives::PasswordQuestion question(PasswordBoxes& boxes) {
+archives::PasswordQuestion question(InputBoxes& boxes) {
   return [&boxes](const Text& entry, bool was_wrong) {
-    return boxes.ask((was_wrong ? u"That is not the password of " : u"Password of ") + entry + u":", {});
+    return boxes.ask((was_wrong ? u"That is not the password of " : u"Password of ") + entry + u":", {}, Entry::masked);
   };
 }
 
@@ -119,7 +119,7 @@ void test_archive(const ZipOptions& options, posix::PosixPlatform& platform) {
   {
     ProgressBar bar("testing");
     Progress progress = bar.progress();
-    archive.test(unpacking, question(platform.password_boxes), progress);
+    archive.test(unpacking, question(platform.input_boxes), progress);
   }
   std::cout << options.archive << ": " << archive.count() << " entries, all well\n";
 }
@@ -137,7 +137,7 @@ void zip(const ZipOptions& options) {
     packing.level = options.level;
     packing.comment = text_of(options.comment);
     packing.password = read_password(options.password_file);
-    if (options.encrypt) packing.password = ask_new_password(platform.password_boxes);
+    if (options.encrypt) packing.password = ask_new_password(platform.input_boxes);
     if (options.aes && packing.password.empty()) {
       throw usage_failure("--aes wants a password: give --encrypt or --password-file");
     }
@@ -161,7 +161,7 @@ void unzip(const UnzipOptions& options) {
     ProgressBar bar("unpacking");
     Progress progress = bar.progress();
     archive.extract(text_of(options.destination), unpacking, platform.folders, platform.files,
-                    question(platform.password_boxes), progress);
+                    question(platform.input_boxes), progress);
   });
 }
 

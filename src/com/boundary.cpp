@@ -38,6 +38,11 @@ BSTR description_of(const RunTimeError& error) noexcept {
   return SysAllocStringLen(win32::wide(error.description()), static_cast<UINT>(error.description().size()));
 }
 
+/// An error of the host's control keeps the source that it came with.
+const wchar_t* source_of(const RunTimeError& error) noexcept {
+  return error.source().empty() ? source_name : win32::wide(error.source());
+}
+
 }  // namespace
 
 HRESULT result_of(std::int32_t number) noexcept {
@@ -45,16 +50,16 @@ HRESULT result_of(std::int32_t number) noexcept {
   return static_cast<HRESULT>(bits <= 0xFFFF ? run_time_facility + bits : bits);
 }
 
-RunTimeError error_of(HRESULT result, TextView description) {
+RunTimeError error_of(HRESULT result, TextView description, TextView source) {
   const auto bits = static_cast<std::uint32_t>(result);
   std::int32_t number = result;
   if ((bits & 0xFFFF0000) == run_time_facility) number = static_cast<std::int32_t>(bits & 0xFFFF);
   for (const auto& known : platform_results) {
     if (known.result == result) number = static_cast<std::int32_t>(known.number);
   }
-  if (!description.empty()) return {number, Text(description)};
+  if (!description.empty()) return {number, Text(description), Text(source)};
   const std::string_view standard = standard_description(number);
-  return {number, Text(standard.begin(), standard.end())};
+  return {number, Text(standard.begin(), standard.end()), Text(source)};
 }
 
 RunTimeError current_error() noexcept {
@@ -76,7 +81,7 @@ HRESULT report_current_exception() noexcept {
   Pointer<ICreateErrorInfo> creator;
   Pointer<IErrorInfo> information;
   if (SUCCEEDED(CreateErrorInfo(creator.receive()))) {
-    creator->SetSource(const_cast<wchar_t*>(source_name));
+    creator->SetSource(const_cast<wchar_t*>(source_of(error)));
     creator->SetDescription(const_cast<wchar_t*>(win32::wide(error.description())));
     if (SUCCEEDED(creator->QueryInterface(IID_IErrorInfo, information.receive_untyped()))) {
       SetErrorInfo(0, information.get());
@@ -90,7 +95,7 @@ HRESULT report_current_exception(EXCEPINFO* information) noexcept {
   if (information != nullptr) {
     *information = {};
     information->scode = result_of(error.number());
-    information->bstrSource = SysAllocString(source_name);
+    information->bstrSource = SysAllocString(source_of(error));
     information->bstrDescription = description_of(error);
   }
   return DISP_E_EXCEPTION;

@@ -11,7 +11,7 @@ namespace talutil::com {
 [[nodiscard]] HRESULT result_of(std::int32_t number) noexcept;
 
 /// A run-time error from the failed result of another object, with what it told of it.
-[[nodiscard]] RunTimeError error_of(HRESULT result, TextView description);
+[[nodiscard]] RunTimeError error_of(HRESULT result, TextView description, TextView source = {});
 
 /// The exception being handled as a run-time error: a failed allocation is 7, one of no kind we know 51.
 [[nodiscard]] RunTimeError current_error() noexcept;

@@ -1,5 +1,6 @@
 #include "com/dispatch_object.hpp"
 
+#include <array>
 #include <atomic>
 #include <vector>
 
@@ -31,11 +32,41 @@ class ExceptionInformation {
   [[nodiscard]] RunTimeError error() {
     if (information_.pfnDeferredFillIn != nullptr) information_.pfnDeferredFillIn(&information_);
     const HRESULT result = information_.scode != 0 ? information_.scode : result_of(information_.wCode);
-    return error_of(result, win32::view(information_.bstrDescription, SysStringLen(information_.bstrDescription)));
+    return error_of(result, view_of(information_.bstrDescription), view_of(information_.bstrSource));
   }
 
  private:
+  static TextView view_of(BSTR text) noexcept { return win32::view(text, SysStringLen(text)); }
+
   EXCEPINFO information_{};
+};
+
+/// Arguments in the order that automation wants: the last one first. The few that members pass need no memory.
+class NativeArguments {
+ public:
+  explicit NativeArguments(std::span<const Variant> arguments) : NativeArguments(arguments.size()) {
+    for (auto argument = arguments.rbegin(); argument != arguments.rend(); ++argument) {
+      data()[size_++] = native_from(*argument, ArrayStyle::of_variants).release();
+    }
+  }
+  NativeArguments(const NativeArguments&) = delete;
+  NativeArguments& operator=(const NativeArguments&) = delete;
+  ~NativeArguments() {
+    for (UINT i = 0; i < size_; ++i) VariantClear(data() + i);
+  }
+
+  [[nodiscard]] VARIANT* data() noexcept { return many_.empty() ? few_.data() : many_.data(); }
+  [[nodiscard]] UINT size() const noexcept { return size_; }
+
+ private:
+  // Complete before the first argument is made, so that those made are freed when a later one cannot be.
+  explicit NativeArguments(std::size_t count) : many_(count > std::tuple_size_v<Few> ? count : 0) {}
+
+  using Few = std::array<VARIANT, 4>;
+
+  Few few_;
+  std::vector<VARIANT> many_;
+  UINT size_ = 0;
 };
 
 /// The host's object.
@@ -53,18 +84,10 @@ class DispatchObject final : public Object {
   }
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
-    // Automation wants the arguments last first.
-    std::vector<OwnedVariant> owned;
-    owned.reserve(arguments.size());
-    for (auto argument = arguments.rbegin(); argument != arguments.rend(); ++argument) {
-      owned.push_back(native_from(*argument, ArrayStyle::of_variants));
-    }
-    std::vector<VARIANT> natives;
-    natives.reserve(owned.size());
-    for (const OwnedVariant& argument : owned) natives.push_back(argument.get());
+    NativeArguments natives(arguments);
 
     DISPID value = DISPID_PROPERTYPUT;
-    DISPPARAMS parameters{natives.data(), nullptr, static_cast<UINT>(natives.size()), 0};
+    DISPPARAMS parameters{natives.data(), nullptr, natives.size(), 0};
     if (access == Access::put) {
       parameters.rgdispidNamedArgs = &value;
       parameters.cNamedArgs = 1;

@@ -11,11 +11,13 @@
 #include "com/registration.hpp"
 #include "infoforms/frm_components.hpp"
 #include "platform/win32/win32_cryptography.hpp"
+#include "platform/win32/win32_drawing.hpp"
+#include "platform/win32/win32_file_dialogs.hpp"
 #include "platform/win32/win32_files.hpp"
 #include "platform/win32/win32_folder_picker.hpp"
 #include "platform/win32/win32_folders.hpp"
 #include "platform/win32/win32_guids.hpp"
-#include "platform/win32/win32_password_boxes.hpp"
+#include "platform/win32/win32_input_boxes.hpp"
 #include "platform/win32/win32_platform.hpp"
 #include "platform/win32/win32_registry.hpp"
 #include "platform/win32/win32_settings.hpp"
@@ -43,12 +45,16 @@ struct LoadedLibrary {
   win32::Win32FolderPicker folder_picker;
   win32::Win32Guids guids;
   win32::Win32Folders folders;
-  win32::Win32PasswordBoxes password_boxes;
+  win32::Win32InputBoxes input_boxes;
   win32::Win32Registry registry;
   win32::Win32Network network;
-  Library library{Platform{message_boxes, screen, computer, clock, form_windows, control_makers, message_pump,
-                           random_source, cryptography, profiles, settings_store, time_conversions, files,
-                           folder_picker, guids, folders, password_boxes, registry, network}};
+  win32::Win32FileDialogs file_dialogs;
+  win32::Win32Drawing drawing;
+  win32::Win32WindowPrinting window_printing;
+  Library library{Platform{message_boxes, screen,        computer,     clock,          form_windows,   control_makers,
+                           message_pump,  random_source, cryptography, profiles,       settings_store, time_conversions,
+                           files,         folder_picker, guids,        folders,        input_boxes,    registry,
+                           network,       file_dialogs,  drawing,      window_printing}};
 };
 
 struct Module {

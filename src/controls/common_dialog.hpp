@@ -1,23 +1,57 @@
 #pragma once
 
 #include "controls/control.hpp"
+#include "platform/file_dialogs.hpp"
 
 namespace talutil {
 
-/// The file dialog control, as far as forms set it up when they load. Showing it is not built yet.
+/// The file dialog control, over the platform's dialogs.
 class CommonDialog final : public TableObject<CommonDialog> {
  public:
-  explicit CommonDialog(const Platform& /*platform*/) {}
+  /// The number and the text of a cancelled dialog, for hosts that ask for it with CancelError.
+  static constexpr std::int32_t cancelled = 32755;
+  static constexpr TextView cancelled_description = u"Cancel was selected.";
+
+  explicit CommonDialog(const Platform& platform) : dialogs_(platform.file_dialogs) {}
 
   Text DialogTitle;
   Text Filter;
+  std::int32_t FilterIndex = 0;
+  Text InitDir;
+  Text FileName;
+  Text DefaultExt;
+  Boolean CancelError;
+  std::int32_t Flags = 0;
+
+  /// FileName without its folder.
+  [[nodiscard]] Text FileTitle() const;
+
+  /// Show the dialog and put the file chosen into FileName, the filter into FilterIndex. A dialog that is cancelled
+  /// changes nothing, and raises 32755 with CancelError. Raise 52 for a FileName that no file can have.
+  void ShowOpen() { show(FileDialog::Purpose::open); }
+  void ShowSave() { show(FileDialog::Purpose::save); }
+
+ private:
+  void show(FileDialog::Purpose purpose);
+
+  FileDialogs& dialogs_;
 };
 
 template <class P>
 constexpr auto members_of(std::type_identity<CommonDialog>) {
-  return P::rows(P::template property<&CommonDialog::DialogTitle>("DialogTitle", "The title of the dialog."),
-                 P::template property<&CommonDialog::Filter>(
-                     "Filter", "Names and patterns of the files to choose from, each followed by a bar."));
+  using C = CommonDialog;
+  return P::rows(
+      P::template property<&C::DialogTitle>("DialogTitle", "The title of the dialog."),
+      P::template property<&C::Filter>("Filter", "Names and patterns of the files in turn, with bars between."),
+      P::template property<&C::FilterIndex>("FilterIndex", "The chosen filter, counted from 1."),
+      P::template property<&C::InitDir>("InitDir", "The folder that the dialog starts in."),
+      P::template property<&C::FileName>("FileName", "The file: proposed before, chosen after."),
+      P::template property<&C::DefaultExt>("DefaultExt", "The extension of a name that has none."),
+      P::template property<&C::CancelError>("CancelError", "Cancelling raises 32755."),
+      P::template property<&C::Flags>("Flags", "2 asks before replacing, 2048 and 4096 want what exists."),
+      P::template get_only<&C::FileTitle>("FileTitle", "The file's name without its folder."),
+      P::template method<&C::ShowOpen>("ShowOpen", "Lets the user choose a file to open."),
+      P::template method<&C::ShowSave>("ShowSave", "Lets the user choose a file to save to."));
 }
 
 }  // namespace talutil

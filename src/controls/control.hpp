@@ -1,7 +1,7 @@
 #pragma once
 
+#include <array>
 #include <memory>
-#include <vector>
 
 #include "automation/late_call.hpp"
 #include "automation/run_time_error.hpp"
@@ -19,19 +19,11 @@ class TableObject : public Object {
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
     const LateInterface& table = late_interface<Derived>();
-    std::vector<Argument> given(arguments.begin(), arguments.end());
-    return table.call(static_cast<Derived*>(this), table.slot_of(member, access), given, Locale{});
-  }
-};
-
-/// A control whose members are not built yet: it has its place on a form and nothing else.
-class ReservedControl final : public Object {
- public:
-  explicit ReservedControl(const Platform& /*platform*/) {}
-
-  std::int32_t member_id(TextView /*name*/) override { raise(ErrorNumber::member_not_supported); }
-  Variant invoke(std::int32_t /*member*/, Access /*access*/, std::span<const Variant> /*arguments*/) override {
-    raise(ErrorNumber::member_not_supported);
+    std::array<Argument, most_parameters> given;
+    if (arguments.size() > given.size()) raise(ErrorNumber::wrong_argument_count);
+    for (std::size_t i = 0; i < arguments.size(); ++i) given[i].value = arguments[i];
+    return table.call(static_cast<Derived*>(this), table.slot_of(member, access),
+                      std::span(given).first(arguments.size()), Locale{});
   }
 };
 

@@ -4,6 +4,7 @@
 #include "controls/common_dialog.hpp"
 #include "controls/control.hpp"
 #include "controls/crypto.hpp"
+#include "controls/grid.hpp"
 #include "controls/name_case_converter.hpp"
 #include "controls/system_information.hpp"
 #include "controls/zip_controls.hpp"
@@ -24,7 +25,7 @@ ControlFactory::ControlFactory(const Platform& platform)
       makers_{
           {u"PolarCryptoLibCtl.Crypto", &make<Crypto>},
           {u"MSComDlg.CommonDialog", &make<CommonDialog>},
-          {u"VSFlex8Ctl.VSFlexGrid", &make<ReservedControl>},
+          {u"VSFlex8Ctl.VSFlexGrid", &make<Grid>},
           {u"SystemInfoControl.MSysInfo", &make<SystemInformation>},
           {Text(NameCaseConverter::class_name), &make<NameCaseConverter>},
           {u"DUZACTXLibCtl.duzactxctrl", &make<UnzipControl>},

@@ -69,7 +69,7 @@ bool ArchiveControl::watch(std::uint64_t done, std::uint64_t total, TextView nam
 archives::PasswordQuestion ArchiveControl::question() const {
   return [this](const Text& entry, bool was_wrong) {
     const Text prompt = (was_wrong ? u"That is not the password of " : u"Password of ") + entry + u":";
-    return platform_.password_boxes.ask(prompt, u"Encrypted archive");
+    return platform_.input_boxes.ask(prompt, u"Encrypted archive", Entry::masked);
   };
 }
 

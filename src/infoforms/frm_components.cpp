@@ -36,6 +36,7 @@ void FrmComponents::load() {
   const Control dialog(control(u"dlgSave2"));
   dialog.put(u"DialogTitle", u"Save Data to File");
   dialog.put(u"Filter", u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");
+  dialog.put(u"Flags", file_dialog_flag::overwrite_prompt | file_dialog_flag::hide_read_only);
   settings_.ComputerName = Control(control(u"MSysInfo1")).get<Text>(computer_name_property);
 }
 

@@ -104,8 +104,13 @@ class ORVUtils {
   /// True for an empty address, and for one with an "@" and a "." anywhere, in any order.
   virtual Boolean VerifyEmail(const Text& sTemp);
 
+  /// True when a point lies strictly within a rectangle: one on an edge does not. False when an argument is Null; texts
+  /// compare as texts, and a number is less than any text. Raises 13 for what cannot be compared.
   virtual Boolean GetMousePos(const Variant& lngSrcX, const Variant& lngSrcY, const Variant& lngDestX1,
                               const Variant& lngDestY1, const Variant& lngDestX2, const Variant& lngDestY2);
+
+  /// The pages that rows need, counted in single precision: above 2^24 pages the count is no longer exact. Raises 11
+  /// for iRowsPerPage 0.
   virtual std::int32_t GetMaxPages(const std::int32_t& iRowsPerPage, const std::int32_t& iRowCount);
 
   /// The index of the first element that begins with sText, without regard to case; -1 when there is none. An
@@ -196,8 +201,16 @@ class ORVUtils {
   /// Raises what the Inc member of the word raises, and 6, 13 or 94 for an increment that is no such number.
   virtual Variant GetNextDate(const Variant& vStartDate, const Variant& vStep, const Variant& vIncrement);
 
+  /// Shows what a value returned by the start of a program means: 0, 2, 3, 5, 6, 8, 10 to 16 and 19 to 21 have a
+  /// message, every other value shows nothing. Source of the texts: the platform's documentation of the function, as
+  /// hosts' users know them.
   virtual void DrawShellExecuteError(const std::int32_t& lRetVal);
+
+  /// Asks the user to type YES in upper case; True when they do. Anything else, a cancelled box too, shows a warning,
+  /// from which they go back to the box or give up (False). Where there is nobody to ask the answer is False.
   virtual Boolean CheckDeleteRecord();
+
+  /// The same about a change of the database, the caption standing in the title of the box.
   virtual Boolean CheckModifyDatabase(const Text& sCaption);
 
   /// A name in the case style of iCharactercase: 1 name case, 2 lower, 3 upper, anything else as it is; with iFlag 1
@@ -301,11 +314,24 @@ class ORVUtils {
   /// The folder that the user chooses; empty when the dialog is closed.
   virtual Text BrowseForFolder(const Text& szTitle);
 
+  /// Draws a text on DrawTextPictureBox, whose scale is twips; nothing for an empty text. One that is wider than the
+  /// rectangle is drawn from its top left corner and cut off at its edges, in several lines with bWordWrap, unless
+  /// iJustify is -2. Any other stands in the middle between top and bottom.
+  /// @param iDestX1, iDestY1, iDestX2, iDestY2 the rectangle, in pixels
+  /// @param lColor 0x00BBGGRR, or a system colour with the highest bit set
+  /// @param iJustify -2 and -1 left, 0 (and any other) centred, 1 right; see docs/drawing.md
+  /// FontBold and ForeColor of the box are put back, also after an error. Raises 91 without a box, what the box raises,
+  /// and 13 and 94 for what has no text.
   virtual void MyDrawText(const std::int16_t& iDestX1, const std::int16_t& iDestY1, const std::int16_t& iDestX2,
                           const std::int16_t& iDestY2, const Variant& sText, const std::int32_t& lColor,
                           const std::int16_t& iJustify, const Boolean& bBold, const Boolean& bWordWrap);
+  /// Gives a form the WindowState that was saved in a section (0 where none was) and, when the form then is in its
+  /// normal state, its Width and Height, in twips. Raises what the form and the store raise.
   virtual void LoadWindowState(const Variant& frm, const Text& sCFGStr);
+
+  /// Saves a form's WindowState and, in the normal state alone, its Width and Height.
   virtual void SaveWindowState(const Variant& frm, const Text& sCFGStr);
+
   virtual void GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16_t& iPrintDirection,
                                 const Text& sReportName, const Text& sCsvName, const Variant& ctlGrid,
                                 const Variant& vStDate, const Variant& vEnDate, const Text& fWindowCaption);
@@ -313,12 +339,34 @@ class ORVUtils {
                                    const Text& sReportName, const Text& sCsvName, const Variant& ctlTextBox);
   virtual void ListBoxPrintPreview(const std::int16_t& iZoomLevel, const std::int16_t& iPrintDirection,
                                    const Text& sReportName, const Text& sCsvName, const Variant& ctlListBox);
+
+  /// The index of the first entry whose ItemData equals a key; -1 for none, and for a key of 0 or less. The Text of the
+  /// control is emptied in any case, its selection stays. Raises what the control raises.
   virtual std::int32_t GetComboListIndex(const Variant& cboCombo, const std::int32_t& vBranchUniqueID);
+
+  /// Has a list-combo control search for the text typed into it. 0 when there is none, -1 when it is not found, else
+  /// the ListIndex of the control afterwards: that of the entry found with msgFlag 2, else the one it had before.
+  /// @param msgFlag 1 tells of a failed search in a message box, 2 selects the entry found
+  /// Adds 1 to CounterVerifyText. Raises what the control raises, 6 for a ListIndex beyond 16 bits.
   virtual std::int32_t SearchCombo(const Variant& cboCombo, const std::int16_t& msgFlag);
+
+  /// The same for a given text and method of the control, empty or not. Without msgFlag 2 a search that succeeds
+  /// selects the first entry.
   virtual std::int32_t SearchComboEx(const Variant& cboCombo, const Text& sFind, const std::int32_t& SearchMethod,
                                      const std::int16_t& msgFlag);
+
+  /// Gives the columns of a grid, from one on, the widths that were saved in a section; 1000 twips where none was, 0
+  /// for a text that is no number. Raises what the grid and the store raise.
   virtual void LoadGridWidths(const Variant& Grid1, const Text& sCFGStr, const std::int16_t& iStartColumn);
+
+  /// Saves the widths of a grid's columns from one on.
   virtual void SaveGridWidths(const Variant& Grid1, const Text& sCFGStr, const std::int16_t& iStartColumn);
+
+  /// Writes the cells of a grid that are shown to a file of comma text that the user chooses, below sReportsDir.
+  /// @param iDontSaveHeader the first row with bSelection; 0 also keeps the fixed cells
+  /// @param bSelection True writes every row; anything else those between Row and RowSel
+  /// @param sFilename names the folder and, with ".txt", the file that the dialog proposes
+  /// Whatever goes wrong, and a cancelled dialog, ends it without a word; the file is then as it was.
   virtual void ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontSaveHeader, const Boolean& bSelection,
                               const Text& sFilename);
 
@@ -371,7 +419,12 @@ class ORVUtils {
   /// a missing folder, 75 for a read-only file, 61 when the disk is full.
   virtual void AppendEventLog(const Text& sEventName, const Text& sEventForm);
 
+  /// Ticks (iSwitch 1) or clears (0) all rows of a column of check boxes, one whose ColDataType is 11; hidden rows too.
+  /// An error is told in a message box and ends it.
   virtual void SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid, const std::int16_t& iSwitch);
+
+  /// The ticked rows of a column of check boxes, hidden ones too; 0 for another column. An error is told in a message
+  /// box; the result is then what was counted before.
   virtual std::int32_t CountGridSelectedRows(const std::int32_t& lColumn, const Variant& vGrid);
 
   /// The text as printable cipher text, different each time; empty for an empty text. Every library reads it back; see
@@ -418,6 +471,8 @@ class ORVUtils {
   /// text after the last delimiter is never compared. Raises 6 beyond 32767 characters.
   virtual Boolean MyInstrDelim(const Text& sSourceString, const Text& sDestString, const Text& sDelimiter);
 
+  /// Prints a form as it looks, through printhelper.dll. Raises what the form raises, 53 when the library is missing
+  /// and 453 when it lacks a function.
   virtual void PrintScreen(const Variant& vForm);
 
   /// Whether a folder exists; quotes around the path do not count. Never fails.

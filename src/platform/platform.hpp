@@ -8,12 +8,14 @@
 #include "automation/object.hpp"
 #include "automation/text.hpp"
 #include "platform/cryptography.hpp"
+#include "platform/drawing.hpp"
+#include "platform/file_dialogs.hpp"
 #include "platform/files.hpp"
 #include "platform/folder_picker.hpp"
 #include "platform/folders.hpp"
 #include "platform/guids.hpp"
+#include "platform/input_boxes.hpp"
 #include "platform/network.hpp"
-#include "platform/password_boxes.hpp"
 #include "platform/registry.hpp"
 #include "platform/settings.hpp"
 #include "platform/time_conversions.hpp"
@@ -40,6 +42,9 @@ class Screen {
   /// Twips (1/1440 inch) per pixel, across and down; 15 at 96 dots an inch.
   [[nodiscard]] virtual float twips_per_pixel_x() = 0;
   [[nodiscard]] virtual float twips_per_pixel_y() = 0;
+
+  /// Gives the mouse pointer its usual shape back.
+  virtual void reset_pointer() = 0;
 };
 
 class Computer {
@@ -115,9 +120,12 @@ struct Platform {
   FolderPicker& folder_picker;
   Guids& guids;
   Folders& folders;
-  PasswordBoxes& password_boxes;
+  InputBoxes& input_boxes;
   Registry& registry;
   Network& network;
+  FileDialogs& file_dialogs;
+  Drawing& drawing;
+  WindowPrinting& window_printing;
 };
 
 }  // namespace talutil

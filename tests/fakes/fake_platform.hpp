@@ -6,6 +6,7 @@
 #include <map>
 #include <memory>
 #include <random>
+#include <sstream>
 #include <vector>
 
 #include "automation/run_time_error.hpp"
@@ -28,7 +29,10 @@ struct FakePlatform : MessageBoxes,
                       MessagePump,
                       RandomSource,
                       Folders,
-                      PasswordBoxes,
+                      InputBoxes,
+                      FileDialogs,
+                      Drawing,
+                      WindowPrinting,
                       CalendarTimeConversions {
   struct Message {
     Text text;
@@ -61,8 +65,14 @@ struct FakePlatform : MessageBoxes,
   std::function<void(std::span<std::uint8_t>)> random_bytes;  ///< In the place of the generator, where it is set.
   std::unique_ptr<Cryptography> cryptography = make_cryptography();  ///< The real one: it needs no machine.
 
-  std::deque<Text> passwords;  ///< What is typed into password boxes; without one they are cancelled.
+  std::deque<Text> passwords;  ///< What is typed into masked boxes; without one they are cancelled.
   std::vector<Text> password_prompts;
+  std::deque<Text> inputs;  ///< What is typed into input boxes.
+  std::vector<Message> input_boxes;
+  std::deque<Text> chosen_files;  ///< What file dialogs answer; without one they are cancelled.
+  std::vector<FileDialog> file_dialogs;
+  std::vector<std::string> drawn;  ///< What was drawn and printed, in words.
+  std::int32_t pointer_resets = 0;
 
   FakeRegistry registry;
   FakeNetwork network;
@@ -77,6 +87,8 @@ struct FakePlatform : MessageBoxes,
   TimeConversions* real_time_conversions = nullptr;
   Files* real_files = nullptr;
   Folders* real_folders = nullptr;
+  Registry* real_registry = nullptr;
+  Network* real_network = nullptr;
 
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;
@@ -86,9 +98,11 @@ struct FakePlatform : MessageBoxes,
     TimeConversions& conversions = real_time_conversions == nullptr ? *this : *real_time_conversions;
     Files& used_files = real_files == nullptr ? files : *real_files;
     Folders* used_folders = real_folders == nullptr ? this : real_folders;
-    return {*this, *this,         *this,    *this,          *this,       *this,      *this,
-            *this, *cryptography, profiles, settings_store, conversions, used_files, folder_picker,
-            guids, *used_folders, *this,    registry,       network};
+    Registry& used_registry = real_registry == nullptr ? registry : *real_registry;
+    Network& used_network = real_network == nullptr ? network : *real_network;
+    return {*this,         *this,         *this,          *this,       *this,      *this,         *this, *this,
+            *cryptography, profiles,      settings_store, conversions, used_files, folder_picker, guids, *used_folders,
+            *this,         used_registry, used_network,   *this,       *this,      *this};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
@@ -119,13 +133,32 @@ struct FakePlatform : MessageBoxes,
 
   std::unique_ptr<Folder> open(const Text& /*path*/) override { raise(ErrorNumber::path_not_found); }
 
-  std::optional<Text> ask(TextView prompt, TextView /*title*/) override {
-    password_prompts.emplace_back(prompt);
-    if (passwords.empty()) return std::nullopt;
-    Text answer = passwords.front();
-    passwords.pop_front();
-    return answer;
+  std::optional<Text> ask(TextView prompt, TextView title, Entry entry) override {
+    if (entry == Entry::masked) {
+      password_prompts.emplace_back(prompt);
+      return next_of(passwords);
+    }
+    input_boxes.push_back({Text(prompt), MessageButtons::ok, Text(title)});
+    return next_of(inputs);
   }
+
+  std::optional<ChosenFile> choose(const FileDialog& dialog) override {
+    file_dialogs.push_back(dialog);
+    std::optional<Text> path = next_of(chosen_files);
+    return path ? std::optional(ChosenFile{std::move(*path), dialog.filter_index}) : std::nullopt;
+  }
+
+  void draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text, std::int32_t colour,
+                 bool breaks_words) override {
+    std::ostringstream line;
+    line << "draw on " << device_context << " (" << place.left << ',' << place.top << ")-(" << place.right << ','
+         << place.bottom << ") \"" << to_utf8(text) << "\" colour " << colour << (breaks_words ? " broken" : "");
+    drawn.push_back(line.str());
+  }
+
+  void configure_printer(std::int32_t window) override { drawn.push_back("configure " + std::to_string(window)); }
+  void send_to_printer(std::int32_t window) override { drawn.push_back("send " + std::to_string(window)); }
+  void reset_pointer() override { ++pointer_resets; }
 
   void fill(std::span<std::uint8_t> bytes) override {
     if (random_bytes) return random_bytes(bytes);
@@ -141,6 +174,13 @@ struct FakePlatform : MessageBoxes,
   }
 
  private:
+  static std::optional<Text> next_of(std::deque<Text>& answers) {
+    if (answers.empty()) return std::nullopt;
+    Text answer = std::move(answers.front());
+    answers.pop_front();
+    return answer;
+  }
+
   class Window final : public HiddenWindow {
    public:
     explicit Window(FakePlatform& owner) : owner_(owner) { ++owner_.open_windows; }

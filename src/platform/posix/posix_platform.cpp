@@ -12,6 +12,7 @@
 #include <string>
 #include <type_traits>
 
+#include "automation/run_time_error.hpp"
 #include "platform/posix/terminal.hpp"
 
 namespace talutil::posix {
@@ -97,5 +98,16 @@ bool PosixMessagePump::wait_and_handle() {
   pause();
   return false;
 }
+
+void PosixDrawing::draw_text(std::intptr_t /*device_context*/, const PixelRectangle& /*place*/, TextView /*text*/,
+                             std::int32_t /*colour*/, bool /*breaks_words*/) {
+  raise(ErrorNumber::action_not_supported);
+}
+
+void PosixWindowPrinting::configure_printer(std::int32_t /*window*/) {
+  throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::file_not_found), Text(missing_print_helper));
+}
+
+void PosixWindowPrinting::send_to_printer(std::int32_t window) { configure_printer(window); }
 
 }  // namespace talutil::posix

@@ -2,11 +2,12 @@
 
 #include "platform/platform.hpp"
 #include "platform/posix/posix_cryptography.hpp"
+#include "platform/posix/posix_file_dialogs.hpp"
 #include "platform/posix/posix_files.hpp"
 #include "platform/posix/posix_folder_picker.hpp"
 #include "platform/posix/posix_folders.hpp"
 #include "platform/posix/posix_guids.hpp"
-#include "platform/posix/posix_password_boxes.hpp"
+#include "platform/posix/posix_input_boxes.hpp"
 #include "platform/posix/posix_registry.hpp"
 #include "platform/posix/posix_settings.hpp"
 #include "platform/posix/posix_time_conversions.hpp"
@@ -24,6 +25,7 @@ class PosixScreen final : public Screen {
  public:
   float twips_per_pixel_x() override { return standard_twips_per_pixel; }
   float twips_per_pixel_y() override { return standard_twips_per_pixel; }
+  void reset_pointer() override {}
 
  private:
   static constexpr float standard_twips_per_pixel = 15;
@@ -62,6 +64,20 @@ class PosixMessagePump final : public MessagePump {
   bool wait_and_handle() override;
 };
 
+/// Nothing can be drawn on where there are no windows.
+class PosixDrawing final : public Drawing {
+ public:
+  void draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text, std::int32_t colour,
+                 bool breaks_words) override;
+};
+
+/// The library that prints windows exists on Windows only.
+class PosixWindowPrinting final : public WindowPrinting {
+ public:
+  void configure_printer(std::int32_t window) override;
+  void send_to_printer(std::int32_t window) override;
+};
+
 /// One of each, for a library to use. Must outlive it.
 struct PosixPlatform {
   PosixMessageBoxes message_boxes;
@@ -77,19 +93,22 @@ struct PosixPlatform {
   PosixFolderPicker folder_picker;
   PosixGuids guids;
   PosixFolders folders;
-  PosixPasswordBoxes password_boxes;
+  PosixInputBoxes input_boxes;
   PosixProfiles profiles{files};
   Hive hive{Hive::default_path()};
   PosixSettingsStore settings_store{hive};
   PosixRegistry registry{hive};
   PosixNetwork network;
+  PosixFileDialogs file_dialogs;
+  PosixDrawing drawing;
+  PosixWindowPrinting window_printing;
   PosixTimeConversions time_conversions;
 
   [[nodiscard]] Platform platform() {
-    return {message_boxes,  screen,           computer,      clock,         form_windows,
-            control_makers, message_pump,     random_source, cryptography,  profiles,
-            settings_store, time_conversions, files,         folder_picker, guids,
-            folders,        password_boxes,   registry,      network};
+    return {message_boxes, screen,        computer,     clock,          form_windows,   control_makers,
+            message_pump,  random_source, cryptography, profiles,       settings_store, time_conversions,
+            files,         folder_picker, guids,        folders,        input_boxes,    registry,
+            network,       file_dialogs,  drawing,      window_printing};
   }
 };
 

@@ -69,6 +69,8 @@ float Win32Screen::twips_per_pixel_x() { return twips_per_pixel(LOGPIXELSX); }
 
 float Win32Screen::twips_per_pixel_y() { return twips_per_pixel(LOGPIXELSY); }
 
+void Win32Screen::reset_pointer() { SetCursor(LoadCursorW(nullptr, IDC_ARROW)); }
+
 Text Win32Computer::name() {
   std::array<wchar_t, MAX_COMPUTERNAME_LENGTH + 1> name{};
   auto length = static_cast<DWORD>(name.size());

@@ -13,6 +13,7 @@ class Win32Screen final : public Screen {
  public:
   float twips_per_pixel_x() override;
   float twips_per_pixel_y() override;
+  void reset_pointer() override;
 };
 
 class Win32Computer final : public Computer {

@@ -18,26 +18,9 @@ struct RealRegistry : ::testing::Test {
   Win32Registry registry;
   Win32Network network;
   Library library{[this] {
-    const Platform parts = fake.platform();
-    return Platform{parts.message_boxes,
-                    parts.screen,
-                    parts.computer,
-                    parts.clock,
-                    parts.form_windows,
-                    parts.control_makers,
-                    parts.message_pump,
-                    parts.random_source,
-                    parts.cryptography,
-                    parts.profiles,
-                    parts.settings_store,
-                    parts.time_conversions,
-                    parts.files,
-                    parts.folder_picker,
-                    parts.guids,
-                    parts.folders,
-                    parts.password_boxes,
-                    registry,
-                    network};
+    fake.real_registry = &registry;
+    fake.real_network = &network;
+    return fake.platform();
   }()};
   ORVUtils utils{library};
 };

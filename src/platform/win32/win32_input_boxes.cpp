@@ -1,4 +1,4 @@
-#include "platform/win32/win32_password_boxes.hpp"
+#include "platform/win32/win32_input_boxes.hpp"
 
 #include <algorithm>
 #include <cstring>
@@ -58,6 +58,14 @@ class DialogTemplate {
   std::vector<WORD> words_;
 };
 
+/// About how many lines a prompt takes in its label.
+LONG lines_of(TextView prompt) {
+  constexpr LONG characters_a_line = 40;
+  constexpr LONG most_lines = 30;  // Higher than that, the box would leave small screens.
+  const auto breaks = static_cast<LONG>(std::ranges::count(prompt, u'\n'));
+  return std::min(most_lines, breaks + 1 + static_cast<LONG>(prompt.size()) / characters_a_line);
+}
+
 /// What was typed stands in the text that the dialog was started with.
 INT_PTR CALLBACK handle(HWND dialog, UINT message, WPARAM what, LPARAM value) noexcept {
   if (message == WM_INITDIALOG) {
@@ -79,14 +87,26 @@ INT_PTR CALLBACK handle(HWND dialog, UINT message, WPARAM what, LPARAM value) no
 
 }  // namespace
 
-std::optional<Text> Win32PasswordBoxes::ask(TextView prompt, TextView title) {
-  // In dialog units: a quarter of a character's width, an eighth of its height.
+std::optional<Text> Win32InputBoxes::ask(TextView prompt, TextView title, Entry entry) {
+  // In dialog units: a quarter of a character's width, an eighth of its height. The prompt stands beside the buttons
+  // and has the room of four lines, more where it is longer.
+  constexpr LONG margin = 7;
+  constexpr LONG prompt_width = 186;
+  constexpr LONG button_width = 50;
+  constexpr LONG line_height = 8;
+  const LONG prompt_height = std::max<LONG>(4, lines_of(prompt)) * line_height;
+  const LONG buttons_left = margin + prompt_width + margin;
+  const LONG entry_top = margin + prompt_height + margin;
+  const LONG width = buttons_left + button_width + margin;
+
   constexpr WORD items = 4;
-  DialogTemplate box(220, 70, items, title);
-  box.add_item(SS_LEFT | SS_NOPREFIX, {7, 7, 206, 18}, 0xFFFF, static_class, prompt);
-  box.add_item(WS_TABSTOP | WS_BORDER | ES_PASSWORD | ES_AUTOHSCROLL, {7, 28, 206, 13}, entry_id, edit_class, {});
-  box.add_item(WS_TABSTOP | BS_DEFPUSHBUTTON, {109, 49, 50, 14}, IDOK, button_class, u"OK");
-  box.add_item(WS_TABSTOP, {163, 49, 50, 14}, IDCANCEL, button_class, u"Cancel");
+  DialogTemplate box(static_cast<short>(width), static_cast<short>(entry_top + 13 + margin), items, title);
+  box.add_item(SS_LEFT | SS_NOPREFIX, {margin, margin, prompt_width, prompt_height}, 0xFFFF, static_class, prompt);
+  const DWORD masked = entry == Entry::masked ? ES_PASSWORD : 0;
+  box.add_item(WS_TABSTOP | WS_BORDER | ES_AUTOHSCROLL | masked, {margin, entry_top, width - 2 * margin, 13}, entry_id,
+               edit_class, {});
+  box.add_item(WS_TABSTOP | BS_DEFPUSHBUTTON, {buttons_left, margin, button_width, 14}, IDOK, button_class, u"OK");
+  box.add_item(WS_TABSTOP, {buttons_left, margin + 17, button_width, 14}, IDCANCEL, button_class, u"Cancel");
   Text answer;
   const INT_PTR end = DialogBoxIndirectParamW(GetModuleHandleW(nullptr), box.get(), GetActiveWindow(), &handle,
                                               reinterpret_cast<LPARAM>(&answer));

@@ -1,4 +1,4 @@
-#include "platform/posix/posix_password_boxes.hpp"
+#include "platform/posix/posix_input_boxes.hpp"
 
 #include <termios.h>
 #include <unistd.h>
@@ -36,8 +36,9 @@ class Silence {
 
 }  // namespace
 
-std::optional<Text> PosixPasswordBoxes::ask(TextView prompt, TextView title) {
-  const Silence silence;
+std::optional<Text> PosixInputBoxes::ask(TextView prompt, TextView title, Entry entry) {
+  std::optional<Silence> silence;
+  if (entry == Entry::masked) silence.emplace();
   const auto line = ask_terminal((title.empty() ? "" : to_utf8(title) + ": ") + to_utf8(prompt) + " ");
   return line ? std::optional(from_utf8(*line)) : std::nullopt;
 }

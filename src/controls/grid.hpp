@@ -1,0 +1,160 @@
+#pragma once
+
+#include <memory>
+#include <vector>
+
+#include "controls/control.hpp"
+
+namespace talutil {
+
+/// The text of a cell in little room: one pointer, and nothing more while it is empty.
+class CellText {
+ public:
+  void set(TextView text);
+  [[nodiscard]] TextView view() const noexcept;
+
+ private:
+  std::unique_ptr<char16_t[]> units_;  ///< The length in two units, low one first, then the text.
+};
+
+/// The grid control: a table of texts with what a grid that is shown knows about its rows and columns. Rows and columns
+/// are counted from 0; an index outside the table raises 9 everywhere.
+class Grid final : public TableObject<Grid> {
+ public:
+  static constexpr std::int16_t text_setting = 0;
+  static constexpr std::int16_t check_box_setting = 5;
+  static constexpr std::int16_t boolean_type = 11;
+
+  // The check-box state of a cell.
+  static constexpr std::int16_t no_check_box = 0;
+  static constexpr std::int16_t ticked = 1;
+  static constexpr std::int16_t not_ticked = 2;
+
+  enum class Format : std::int16_t { comma_text = 3, tab_text = 4, fixed_text = 5 };
+
+  static constexpr std::int32_t most_rows = 5'000'000;
+  static constexpr std::int32_t most_columns = 32767;
+  static constexpr std::int32_t default_width = 1000;  ///< In twips.
+
+  explicit Grid(const Platform& platform) : files_(platform.files) {}
+
+  /// The size of the table. Cells that it loses are gone; new ones are empty. Fewer rows or columns than are fixed take
+  /// the fixed ones with them. Raise 5 for a negative number and 7 beyond the limits above.
+  [[nodiscard]] std::int32_t Rows() const noexcept { return static_cast<std::int32_t>(rows_.size()); }
+  void put_Rows(std::int32_t rows);
+  [[nodiscard]] std::int32_t Cols() const noexcept { return static_cast<std::int32_t>(columns_.size()); }
+  void put_Cols(std::int32_t columns);
+
+  /// How many of the first rows and columns are headings. Raise 5 for more than there are.
+  [[nodiscard]] std::int32_t FixedRows() const noexcept { return fixed_rows_; }
+  void put_FixedRows(std::int32_t rows);
+  [[nodiscard]] std::int32_t FixedCols() const noexcept { return fixed_columns_; }
+  void put_FixedCols(std::int32_t columns);
+
+  /// The text of a cell. A value is kept as its text.
+  [[nodiscard]] Text TextMatrix(std::int32_t row, std::int32_t column) const;
+  void put_TextMatrix(std::int32_t row, std::int32_t column, const Text& value);
+
+  /// A setting of a cell: 0 its text, 5 the state of its check box, which cells of a column of type 11 have: 1 ticked
+  /// (a text "True", or a number that is not 0), 2 not ticked, 0 none. Raises 5 for another setting or state.
+  [[nodiscard]] Variant Cell(std::int16_t setting, std::int32_t row, std::int32_t column) const;
+  void put_Cell(std::int16_t setting, std::int32_t row, std::int32_t column, const Variant& value);
+
+  /// The width of a column, in twips; a negative one stands for the usual width.
+  [[nodiscard]] std::int32_t ColWidth(std::int32_t column) const { return at(column).width; }
+  void put_ColWidth(std::int32_t column, std::int32_t width) { at(column).width = width < 0 ? default_width : width; }
+  [[nodiscard]] Boolean ColHidden(std::int32_t column) const { return at(column).is_hidden; }
+  void put_ColHidden(std::int32_t column, Boolean hidden) { at(column).is_hidden = Boolean(bool(hidden)); }
+  [[nodiscard]] Boolean RowHidden(std::int32_t row) const { return Boolean(rows_[index_in(rows_, row)].is_hidden); }
+  void put_RowHidden(std::int32_t row, Boolean hidden) { rows_[index_in(rows_, row)].is_hidden = bool(hidden); }
+
+  /// The type of a column's values, as automation numbers them: 11 is Boolean. 0 until it is put.
+  [[nodiscard]] std::int16_t ColDataType(std::int32_t column) const { return at(column).data_type; }
+  void put_ColDataType(std::int32_t column, std::int16_t type) { at(column).data_type = type; }
+
+  /// Where the selection begins and ends. Putting its beginning puts its end there too. -1 stands for no row.
+  [[nodiscard]] std::int32_t Row() const noexcept { return row_; }
+  void put_Row(std::int32_t row);
+  [[nodiscard]] std::int32_t RowSel() const noexcept { return row_end_; }
+  void put_RowSel(std::int32_t row);
+
+  /// Empties every cell.
+  void Clear();
+
+  /// Adds a row, before another one or (-1) at the end, with the cells of a text that has tabs between them. Cells
+  /// beyond the last column are dropped.
+  void AddItem(const Text& item, std::int32_t index);
+
+  /// Takes a row out.
+  void RemoveItem(std::int32_t index);
+
+  /// Writes the table to a file: comma text 3 and tab text 4, cells with a separator, quote or line break in quotes;
+  /// fixed text 5, columns two blanks apart with line breaks as blanks. Code page 1252, or UTF-8 with a byte-order mark
+  /// where that lacks a character. Raises 5 for another format, and what the file raises, after which it is as it was.
+  void SaveGrid(const Text& file, std::int16_t format, Boolean fixed_cells) const;
+
+  /// Reads such a file into the table, which takes its size; without `fixed_cells` the fixed rows and columns stay and
+  /// the file's cells follow them. Widths, types and hidden columns stay. Raises as SaveGrid, and changes nothing then.
+  void LoadGrid(const Text& file, std::int16_t format, Boolean fixed_cells);
+
+ private:
+  struct Column {
+    std::int32_t width = default_width;
+    std::int16_t data_type = 0;
+    Boolean is_hidden;
+  };
+
+  struct TableRow {
+    std::vector<CellText> cells;  ///< Up to the last one that was ever filled.
+    bool is_hidden = false;
+  };
+
+  /// An index that was checked.
+  template <class Item>
+  [[nodiscard]] static std::size_t index_in(const std::vector<Item>& list, std::int32_t index) {
+    if (index < 0 || static_cast<std::size_t>(index) >= list.size()) raise(ErrorNumber::subscript_out_of_range);
+    return static_cast<std::size_t>(index);
+  }
+  [[nodiscard]] Column& at(std::int32_t column) { return columns_[index_in(columns_, column)]; }
+  [[nodiscard]] const Column& at(std::int32_t column) const { return columns_[index_in(columns_, column)]; }
+  [[nodiscard]] TextView cell(std::size_t row, std::size_t column) const noexcept;
+  void fill(TableRow& row, std::size_t column, TextView text) const;
+  void keep_selection_inside() noexcept;
+
+  Files& files_;
+  std::vector<TableRow> rows_;
+  std::vector<Column> columns_;
+  std::int32_t fixed_rows_ = 0;
+  std::int32_t fixed_columns_ = 0;
+  std::int32_t row_ = -1;
+  std::int32_t row_end_ = -1;
+};
+
+template <class P>
+constexpr auto members_of(std::type_identity<Grid>) {
+  using G = Grid;
+  return P::rows(
+      P::template accessors<&G::Rows, &G::put_Rows>("Rows", "The number of rows."),
+      P::template accessors<&G::Cols, &G::put_Cols>("Cols", "The number of columns."),
+      P::template accessors<&G::FixedRows, &G::put_FixedRows>("FixedRows", "The rows that are headings."),
+      P::template accessors<&G::FixedCols, &G::put_FixedCols>("FixedCols", "The columns that are headings."),
+      P::template accessors<&G::TextMatrix, &G::put_TextMatrix>("TextMatrix", "The text of a cell.", "Row", "Col"),
+      P::template accessors<&G::Cell, &G::put_Cell>("Cell", "A setting of a cell: 0 text, 5 check box.", "Setting",
+                                                    "Row", "Col"),
+      P::template accessors<&G::ColWidth, &G::put_ColWidth>("ColWidth", "The width of a column, in twips.", "Col"),
+      P::template accessors<&G::ColHidden, &G::put_ColHidden>("ColHidden", "Whether a column is hidden.", "Col"),
+      P::template accessors<&G::RowHidden, &G::put_RowHidden>("RowHidden", "Whether a row is hidden.", "Row"),
+      P::template accessors<&G::ColDataType, &G::put_ColDataType>("ColDataType", "The type of a column; 11 Boolean.",
+                                                                  "Col"),
+      P::template accessors<&G::Row, &G::put_Row>("Row", "The row where the selection begins."),
+      P::template accessors<&G::RowSel, &G::put_RowSel>("RowSel", "The row where the selection ends."),
+      P::template method<&G::Clear>("Clear", "Empties every cell."),
+      P::template method<&G::AddItem>("AddItem", "Adds a row.", "Item", optional("Index", -1)),
+      P::template method<&G::RemoveItem>("RemoveItem", "Takes a row out.", "Index"),
+      P::template method<&G::SaveGrid>("SaveGrid", "Writes a file: 3 comma text, 4 tab text, 5 fixed text.", "FileName",
+                                       "Format", optional("FixedCells", -1)),
+      P::template method<&G::LoadGrid>("LoadGrid", "Reads such a file.", "FileName", "Format",
+                                       optional("FixedCells", -1)));
+}
+
+}  // namespace talutil

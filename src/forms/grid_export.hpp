@@ -1,0 +1,31 @@
+#pragma once
+
+#include "automation/variant.hpp"
+
+namespace talutil {
+
+/// Copies what a grid shows into a table and saves that as comma text. Hidden rows and columns are left out. Grids are
+/// driven in the order told; the source is only read.
+class GridExport {
+ public:
+  /// Empties the table and gives it a column for each that the grid shows.
+  GridExport(const Control& grid, const Control& table);
+
+  /// From a row, counted from 0, to the last one.
+  void copy_all_rows(std::int32_t first);
+
+  /// The rows between Row and RowSel, whichever is the smaller.
+  void copy_selected_rows();
+
+  /// Raises what the file raises; the file is then as it was.
+  void save(const Text& file, bool with_fixed_cells) const;
+
+ private:
+  void copy_rows(std::int32_t first, std::int32_t last);
+
+  const Control& grid_;
+  const Control& table_;
+  std::int32_t copied_ = 0;
+};
+
+}  // namespace talutil

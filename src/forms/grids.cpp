@@ -1,0 +1,103 @@
+#include <algorithm>
+
+#include "automation/run_time_error.hpp"
+#include "forms/grid_export.hpp"
+#include "infoforms/frm_components.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+
+namespace talutil {
+
+namespace {
+
+// The grid's own codes.
+constexpr double boolean_column = 11;
+constexpr std::int16_t check_box_setting = 5;
+constexpr double ticked = 1;
+
+Text width_item(std::int32_t column) { return number_to_text(column) + u"ColWidth"; }
+
+/// Does the work of a member that tells its errors in a message box.
+template <class Work>
+void telling_errors(const Platform& platform, TextView member, Work work) {
+  try {
+    work();
+  } catch (const RunTimeError& error) {
+    platform.screen.reset_pointer();
+    platform.message_boxes.show(u"ORVUtils " + Text(member) + u' ' + error.description(), MessageButtons::ok, {});
+  }
+}
+
+}  // namespace
+
+void ORVUtils::LoadGridWidths(const Variant& Grid1, const Text& sCFGStr, const std::int16_t& iStartColumn) {
+  const Control grid(Grid1);
+  const auto columns = grid.get<std::int32_t>(u"Cols");
+  for (std::int32_t c = iStartColumn; c < columns; ++c) {
+    const Text width = GetCfgFileData(sCFGStr, width_item(c), u"1000", settings().sNatNameC, Boolean(false));
+    grid.put(u"ColWidth", {c}, leading_number(width));
+  }
+}
+
+void ORVUtils::SaveGridWidths(const Variant& Grid1, const Text& sCFGStr, const std::int16_t& iStartColumn) {
+  const Control grid(Grid1);
+  const auto columns = grid.get<std::int32_t>(u"Cols");
+  for (std::int32_t c = iStartColumn; c < columns; ++c) {
+    Text width = grid.get<Text>(u"ColWidth", {c});
+    SaveCfgFileData(sCFGStr, width_item(c), width, settings().sNatNameC, Boolean(false));
+  }
+}
+
+void ORVUtils::SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid, const std::int16_t& iSwitch) {
+  telling_errors(library_.platform(), u"SelectGridRows", [&] {
+    const Control grid(vGrid);
+    const auto rows = grid.get<std::int32_t>(u"Rows");
+    const auto first = grid.get<std::int32_t>(u"FixedRows");
+    if (rows <= first || !grid.get(u"ColDataType", {lColumn}).equals_number(boolean_column)) return;
+    if (iSwitch != 0 && iSwitch != 1) return;
+    for (std::int32_t r = first; r < rows; ++r) grid.put(u"TextMatrix", {r, lColumn}, Boolean(iSwitch == 1));
+  });
+}
+
+std::int32_t ORVUtils::CountGridSelectedRows(const std::int32_t& lColumn, const Variant& vGrid) {
+  std::int32_t count = 0;
+  telling_errors(library_.platform(), u"CountGridSelectedRows", [&] {
+    const Control grid(vGrid);
+    if (!grid.get(u"ColDataType", {lColumn}).equals_number(boolean_column)) return;
+    const auto rows = grid.get<std::int32_t>(u"Rows");
+    const auto first = grid.get<std::int32_t>(u"FixedRows");
+    for (std::int32_t r = first; r < rows; ++r) {
+      if (grid.get(u"Cell", {check_box_setting, r, lColumn}).equals_number(ticked)) ++count;
+    }
+  });
+  return count;
+}
+
+void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontSaveHeader, const Boolean& bSelection,
+                              const Text& sFilename) {
+  try {
+    const Control dialog(library_.components().control(u"dlgSave2"));
+    // The reports folder closes with a backslash of its own.
+    dialog.put(u"InitDir", settings().sReportsDir + sFilename + u'\\');
+    VerifyFilePath(dialog.get<Text>(u"InitDir"));
+    dialog.put(u"CancelError", Boolean(true));
+    dialog.put(u"FileName", sFilename + u".txt");
+    dialog.call(u"ShowSave");
+    const Text file = dialog.get<Text>(u"FileName");
+    if (file.empty()) return;
+
+    const Control grid(m_Grid1);
+    const Control scratch(library_.components().control(u"Grid1"));
+    GridExport grid_export(grid, scratch);
+    // The sense is as hosts know it: True is every row, from the one that iDontSaveHeader tells.
+    if (bSelection.is_exactly_true())
+      grid_export.copy_all_rows(iDontSaveHeader);
+    else
+      grid_export.copy_selected_rows();
+    grid_export.save(file, iDontSaveHeader == 0);
+  } catch (const RunTimeError&) {
+    // A cancelled dialog is one, and no export says why it did not come about.
+  }
+}
+
+}  // namespace talutil

@@ -1,0 +1,13 @@
+#pragma once
+
+#include "platform/input_boxes.hpp"
+
+namespace talutil::posix {
+
+/// Asks at the terminal, which shows nothing of what is typed into a masked entry.
+class PosixInputBoxes final : public InputBoxes {
+ public:
+  [[nodiscard]] std::optional<Text> ask(TextView prompt, TextView title, Entry entry) override;
+};
+
+}  // namespace talutil::posix

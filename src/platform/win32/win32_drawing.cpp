@@ -1,0 +1,71 @@
+#include "platform/win32/win32_drawing.hpp"
+
+#include <array>
+
+#include "automation/run_time_error.hpp"
+#include "platform/win32/win32_files.hpp"
+#include "platform/win32/windows.hpp"
+
+namespace talutil::win32 {
+
+namespace {
+
+COLORREF colour_of(std::int32_t colour) noexcept {
+  constexpr std::uint32_t system_colour = 0x80000000;
+  const auto bits = static_cast<std::uint32_t>(colour);
+  return (bits & system_colour) != 0 ? GetSysColor(static_cast<int>(bits & 0xFF)) : bits & 0xFFFFFF;
+}
+
+/// The print helper in the folder of a module: the program's for null. Null where there is none.
+HMODULE helper_beside(HMODULE module) {
+  std::array<wchar_t, MAX_PATH> path{};
+  const DWORD length = GetModuleFileNameW(module, path.data(), static_cast<DWORD>(path.size()));
+  const TextView program = view(path.data(), length);
+  const Text helper = Text(program.substr(0, program.find_last_of(u'\\') + 1)) + u"printhelper.dll";
+  // By its full path: a library of that name in another folder of the search order is not ours to run.
+  return LoadLibraryExW(wide(helper), nullptr, LOAD_WITH_ALTERED_SEARCH_PATH);
+}
+
+HMODULE own_module() noexcept {
+  HMODULE module = nullptr;
+  GetModuleHandleExW(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_UNCHANGED_REFCOUNT,
+                     reinterpret_cast<const wchar_t*>(&own_module), &module);
+  return module;
+}
+
+void call_helper(const char* function, std::int32_t window) {
+  HMODULE helper = helper_beside(nullptr);
+  if (helper == nullptr) helper = helper_beside(own_module());
+  if (helper == nullptr) {
+    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::file_not_found), Text(missing_print_helper));
+  }
+  using Print = std::int32_t(WINAPI*)(std::int32_t);
+  const auto print = reinterpret_cast<Print>(reinterpret_cast<void*>(GetProcAddress(helper, function)));
+  if (print == nullptr) {
+    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::missing_entry_point),
+                       u"Can't find DLL entry point " + from_utf8(function) + u" in printhelper.dll");
+  }
+  // What it answers says nothing. It stays loaded, with what it keeps between the two calls.
+  print(window);
+}
+
+}  // namespace
+
+void Win32Drawing::draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text,
+                             std::int32_t colour, bool breaks_words) {
+  const HDC context = reinterpret_cast<HDC>(device_context);  // NOLINT(performance-no-int-to-ptr): the seam's handles.
+  const COLORREF before = SetTextColor(context, colour_of(colour));
+  if (before == CLR_INVALID) raise(ErrorNumber::invalid_procedure_call);
+  const int background_before = SetBkMode(context, TRANSPARENT);
+  RECT rectangle{place.left, place.top, place.right, place.bottom};
+  const std::string ansi = to_platform_ansi(text);
+  DrawTextA(context, ansi.data(), static_cast<int>(ansi.size()), &rectangle, breaks_words ? DT_WORDBREAK : 0);
+  SetBkMode(context, background_before);
+  SetTextColor(context, before);
+}
+
+void Win32WindowPrinting::configure_printer(std::int32_t window) { call_helper("ConfigurePrinter", window); }
+
+void Win32WindowPrinting::send_to_printer(std::int32_t window) { call_helper("SendToPrinter", window); }
+
+}  // namespace talutil::win32

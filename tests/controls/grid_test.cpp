@@ -1,0 +1,243 @@
+#include "controls/grid.hpp"
+
+#include <gmock/gmock.h>
+
+#include "controls/delimited_text.hpp"
+#include "infoforms/frm_components.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "tests/fakes/error_of.hpp"
+#include "tests/fakes/fake_platform.hpp"
+#include "tests/fakes/recording_control.hpp"
+
+namespace talutil {
+
+namespace {
+
+using testing::error_of;
+using testing::RecordingControl;
+
+struct Grids : ::testing::Test {
+  testing::FakePlatform platform;
+  Library library{platform.platform()};
+  ORVUtils utils{library};
+  std::shared_ptr<Grid> grid = std::make_shared<Grid>(library.platform());
+  Control control{ObjectRef(grid)};
+
+  /// A table of texts "r,c".
+  void fill(std::int32_t rows, std::int32_t columns) {
+    grid->put_Rows(rows);
+    grid->put_Cols(columns);
+    for (std::int32_t r = 0; r < rows; ++r) {
+      for (std::int32_t c = 0; c < columns; ++c) {
+        grid->put_TextMatrix(r, c, number_to_text(r) + u'/' + number_to_text(c));
+      }
+    }
+  }
+
+  [[nodiscard]] std::vector<std::vector<Text>> cells() const {
+    std::vector<std::vector<Text>> result;
+    for (std::int32_t r = 0; r < grid->Rows(); ++r) {
+      std::vector<Text>& row = result.emplace_back();
+      for (std::int32_t c = 0; c < grid->Cols(); ++c) row.push_back(grid->TextMatrix(r, c));
+    }
+    return result;
+  }
+
+  [[nodiscard]] std::string file(const Text& path) const { return platform.files.bytes(path); }
+};
+
+TEST_F(Grids, AreDrivenLateBound) {
+  control.put(u"rows", 3.4);
+  control.put(u"Cols", u"2");
+  control.put(u"TextMatrix", {std::int16_t{1}, u"1"}, Boolean(true));
+  EXPECT_EQ(control.get<Text>(u"TEXTMATRIX", {1, 1}), u"True");
+  EXPECT_EQ(control.get(u"Cell", {5, 1, 1}), Variant(Grid::no_check_box));
+  control.put(u"ColDataType", {1}, 11);
+  EXPECT_EQ(control.get(u"Cell", {5, 1, 1}), Variant(Grid::ticked));
+  EXPECT_EQ(control.get(u"Cell", {5, 2, 1}), Variant(Grid::not_ticked));
+  control.put(u"Cell", {5, 2, 1}, 1);
+  EXPECT_EQ(utils.CountGridSelectedRows(1, ObjectRef(grid)), 2);
+  utils.SelectGridRows(1, ObjectRef(grid), 0);
+  EXPECT_EQ(utils.CountGridSelectedRows(1, ObjectRef(grid)), 0);
+  utils.LoadGridWidths(ObjectRef(grid), u"Grid", 0);
+  EXPECT_EQ(control.get(u"ColWidth", {1}), Variant(1000));
+  control.put(u"Row", 2);
+  control.put(u"Rows", 1);
+  EXPECT_EQ(control.get(u"RowSel"), Variant(0)) << "the selection stays inside";
+  control.call(u"AddItem", {u"a\tb\tc", 0});
+  control.call(u"AddItem", {u"d"});
+  EXPECT_EQ(cells(), (std::vector<std::vector<Text>>{{u"a", u"b"}, {u"", u"False"}, {u"d", u""}}));
+  control.call(u"RemoveItem", {1});
+  control.put(u"Cols", 1);
+  control.put(u"Cols", 2);
+  EXPECT_EQ(cells(), (std::vector<std::vector<Text>>{{u"a", u""}, {u"d", u""}})) << "lost cells stay lost";
+  control.call(u"Clear");
+  EXPECT_EQ(cells(), (std::vector<std::vector<Text>>{{u"", u""}, {u"", u""}}));
+
+  const std::pair<std::function<void()>, int> bad[] = {{[&] {
+                                                          return control.get(u"TextMatrix", {2, 0});
+                                                        },
+                                                        9},
+                                                       {[&] {
+                                                          return control.get(u"TextMatrix", {0, -1});
+                                                        },
+                                                        9},
+                                                       {[&] { control.put(u"ColWidth", {2}, 1); }, 9},
+                                                       {[&] { control.put(u"Row", 2); }, 9},
+                                                       {[&] { control.put(u"Rows", -1); }, 5},
+                                                       {[&] { control.put(u"Rows", 2147483647); }, 7},
+                                                       {[&] { control.put(u"Cols", 32768); }, 7},
+                                                       {[&] { control.put(u"FixedRows", 3); }, 5},
+                                                       {[&] {
+                                                          return control.get(u"Cell", {1, 0, 0});
+                                                        },
+                                                        5},
+                                                       {[&] {
+                                                          control.put(u"Cell", {5, 0, 0}, 3);
+                                                        },
+                                                        5},
+                                                       {[&] {
+                                                          control.put(u"TextMatrix", {0, 0}, Null{});
+                                                        },
+                                                        94},
+                                                       {[&] {
+                                                          control.call(u"AddItem", {u"", 3});
+                                                        },
+                                                        9},
+                                                       {[&] { control.call(u"RemoveItem", {2}); }, 9},
+                                                       {[&] { return control.get(u"Nothing"); }, 438},
+                                                       {[&] {
+                                                          control.call(u"SaveGrid", {u"C:\\x.txt", 6});
+                                                        },
+                                                        5}};
+  for (const auto& [use, error] : bad) EXPECT_EQ(error_of(use), error) << &use - &bad[0].first;
+}
+
+TEST_F(Grids, AreWrittenAndReadBack) {
+  const std::vector<Text> row{u"a,b", u"say \"x\"", u"two\r\nlines", u" plain", u"", u"tab\there"};
+  grid->put_Cols(6);
+  grid->put_Rows(2);
+  for (std::int32_t c = 0; c < 6; ++c) grid->put_TextMatrix(1, c, row[static_cast<std::size_t>(c)]);
+  grid->put_TextMatrix(0, 0, u"5 \u20AC");
+  const auto written = cells();
+  grid->SaveGrid(u"C:\\comma.txt", 3, Boolean(true));
+  EXPECT_EQ(file(u"C:\\comma.txt"), "5 \x80,,,,,\r\n\"a,b\",\"say \"\"x\"\"\",\"two\r\nlines\", plain,,tab\there\r\n");
+  grid->SaveGrid(u"C:\\tab.txt", 4, Boolean(true));
+  for (const auto& [path, format] : {std::pair{u"C:\\comma.txt", 3}, std::pair{u"C:\\tab.txt", 4}}) {
+    grid->put_Cols(0);
+    grid->LoadGrid(path, static_cast<std::int16_t>(format), Boolean(true));
+    EXPECT_EQ(cells(), written) << format;
+  }
+
+  grid->put_FixedRows(1);
+  grid->put_FixedCols(1);
+  grid->SaveGrid(u"C:\\inner.txt", 3, Boolean(false));
+  EXPECT_EQ(file(u"C:\\inner.txt"), "\"say \"\"x\"\"\",\"two\r\nlines\", plain,,tab\there\r\n");
+  grid->put_TextMatrix(1, 1, u"changed");
+  grid->LoadGrid(u"C:\\inner.txt", 3, Boolean(false));
+  EXPECT_EQ(grid->TextMatrix(0, 0), u"5 \u20AC") << "the fixed cells stay";
+  EXPECT_EQ(grid->TextMatrix(1, 1), u"say \"x\"");
+
+  // A character without a place in the code page makes the file UTF-8.
+  grid->put_TextMatrix(1, 1, u"\u0416");
+  grid->SaveGrid(u"C:\\wide.txt", 3, Boolean(true));
+  EXPECT_THAT(file(u"C:\\wide.txt"), ::testing::StartsWith("\xEF\xBB\xBF"
+                                                           "5 \xE2\x82\xAC,"));
+  grid->LoadGrid(u"C:\\wide.txt", 3, Boolean(true));
+  EXPECT_EQ(grid->TextMatrix(1, 1), u"\u0416");
+
+  grid->put_Cols(0);
+  grid->put_Cols(2);
+  grid->put_TextMatrix(0, 0, u"long name");
+  grid->put_TextMatrix(0, 1, u"x");
+  grid->put_TextMatrix(1, 1, u"y\nz");
+  grid->SaveGrid(u"C:\\fixed.txt", 5, Boolean(true));
+  EXPECT_EQ(file(u"C:\\fixed.txt"), "long name  x\r\n           y z\r\n");
+  grid->LoadGrid(u"C:\\fixed.txt", 5, Boolean(true));
+  EXPECT_EQ(cells(), (std::vector<std::vector<Text>>{{u"long name", u"x"}, {u"", u"y z"}}));
+
+  EXPECT_EQ(read_delimited(u"\"a\"b,c\n\n\"open,\r\n", u','),
+            (std::vector<std::vector<Text>>{{u"ab", u"c"}, {u""}, {u"open,\r\n"}}));
+  EXPECT_EQ(error_of([&] { grid->LoadGrid(u"C:\\missing.txt", 3, Boolean(true)); }), 53);
+  EXPECT_EQ(grid->Rows(), 2) << "nothing is lost";
+}
+
+TEST_F(Grids, VisibleCellsAreExported) {
+  fill(6, 4);
+  grid->put_ColHidden(1, Boolean(true));
+  grid->put_RowHidden(3, Boolean(true));
+  grid->put_Row(4);
+  grid->put_RowSel(2);
+  library.settings().sReportsDir = u"C:\\Reports\\";
+  const auto export_to = [&](const Text& answer, std::int16_t header, Boolean all) {
+    platform.chosen_files = {answer};
+    utils.ExportGridData(ObjectRef(grid), header, all, u"Sales");
+    return file(answer);
+  };
+  const std::string last = "4/0,4/2,4/3\r\n";
+  EXPECT_EQ(export_to(u"C:\\a.txt", 0, Boolean(false)), "2/0,2/2,2/3\r\n" + last);
+  EXPECT_EQ(export_to(u"C:\\b.csv", 4, Boolean(true)), last + "5/0,5/2,5/3\r\n");
+  EXPECT_EQ(export_to(u"C:\\c.csv", 5, Boolean::from_bits(1)), "2/0,2/2,2/3\r\n" + last) << "only exactly True";
+  EXPECT_EQ(export_to(u"C:\\d.csv", 9, Boolean(true)), "") << "an empty file";
+  const FileDialog& dialog = platform.file_dialogs.back();
+  EXPECT_EQ(dialog.title, u"Save Data to File");
+  EXPECT_EQ(dialog.filter, u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");
+  EXPECT_EQ(dialog.folder, u"C:\\Reports\\Sales\\");
+  EXPECT_EQ(dialog.file_name, u"Sales.txt");
+  EXPECT_TRUE(dialog.purpose == FileDialog::Purpose::save);
+
+  // Silent, and the old file whole: cancelled, a full disk, an error of the grid.
+  platform.files.put(u"C:\\old.txt", "old");
+  platform.chosen_files.clear();
+  utils.ExportGridData(ObjectRef(grid), 0, Boolean(true), u"Sales");
+  platform.files.failures = {{u"write", ErrorNumber::disk_full}};
+  EXPECT_EQ(export_to(u"C:\\old.txt", 0, Boolean(true)), "old");
+  platform.files.failures.clear();
+  grid->put_Row(-1);
+  EXPECT_EQ(export_to(u"C:\\old.txt", 0, Boolean(false)), "old") << "row -1 is no row";
+  platform.chosen_files = {u"C:\\old2.txt"};
+  utils.ExportGridData(Variant(), 0, Boolean(true), u"Sales");
+  EXPECT_TRUE(platform.messages.empty());
+}
+
+TEST_F(Grids, ExportsReadTheGridInOrder) {
+  const auto source = std::make_shared<RecordingControl>();
+  source->values = {{"Cols", 2},
+                    {"ColHidden(0&)", Boolean(true)},
+                    {"ColHidden(1&)", Boolean(false)},
+                    {"Rows", 3},
+                    {"RowHidden(1&)", Boolean(true)},
+                    {"RowHidden(2&)", Boolean(false)},
+                    {"TextMatrix(2&, 1&)", 7},
+                    {"Row", 2},
+                    {"RowSel", 1}};
+  platform.chosen_files = {u"C:\\a.txt"};
+  utils.ExportGridData(ObjectRef(source), 1, Boolean(true), u"Sales");
+  EXPECT_EQ(source->uses, (std::vector<std::string>{"Cols", "ColHidden(0&)", "ColHidden(1&)", "Rows", "RowHidden(1&)",
+                                                    "RowHidden(2&)", "Cols", "ColHidden(0&)", "ColHidden(1&)",
+                                                    "TextMatrix(2&, 1&)"}));
+  EXPECT_EQ(file(u"C:\\a.txt"), "7\r\n");
+  EXPECT_EQ(source->look_ups.size(), 5) << "one a member";
+  source->uses.clear();
+  platform.chosen_files = {u"C:\\a.txt"};
+  utils.ExportGridData(ObjectRef(source), 1, Boolean(false), u"Sales");
+  EXPECT_THAT(source->uses, ::testing::Contains("RowSel"));
+}
+
+TEST_F(Grids, DialogsTellOfACancelOnlyWhenAsked) {
+  const Control dialog(library.components().control(u"Open1"));
+  dialog.put(u"FileName", u"a.txt");
+  dialog.call(u"ShowOpen");
+  EXPECT_EQ(dialog.get<Text>(u"FileName"), u"a.txt");
+  dialog.put(u"CancelError", Boolean(true));
+  EXPECT_EQ(error_of([&] { dialog.call(u"ShowSave"); }), 32755);
+  platform.chosen_files = {u"C:\\data\\b.txt"};
+  dialog.call(u"ShowOpen");
+  EXPECT_EQ(dialog.get<Text>(u"FileName"), u"C:\\data\\b.txt");
+  EXPECT_EQ(dialog.get<Text>(u"FileTitle"), u"b.txt");
+}
+
+}  // namespace
+
+}  // namespace talutil

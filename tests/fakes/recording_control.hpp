@@ -1,0 +1,81 @@
+#pragma once
+
+#include <algorithm>
+#include <functional>
+#include <map>
+#include <string>
+#include <vector>
+
+#include "automation/run_time_error.hpp"
+#include "automation/variant.hpp"
+
+namespace talutil::testing {
+
+/// A value with its type, as transcripts show it: "abc", 1% (16 bits), 1& (32), 1! (single), 1# (double), True.
+inline std::string shown(const Variant& value) {
+  if (value.is(Variant::Kind::null)) return "Null";
+  if (value.is(Variant::Kind::empty)) return "Empty";
+  if (value.is(Variant::Kind::object)) return "an object";
+  const std::string text = to_utf8(value.to_text());
+  switch (value.kind()) {
+    case Variant::Kind::text:
+      return '"' + text + '"';
+    case Variant::Kind::int16:
+      return text + '%';
+    case Variant::Kind::int32:
+      return text + '&';
+    case Variant::Kind::single:
+      return text + '!';
+    case Variant::Kind::double_:
+      return text + '#';
+    default:
+      return text;
+  }
+}
+
+/// A control of a host: it answers with the values it is given and notes how it is used. A member is there when it has
+/// a value, "Name" or "Name(1&)" with indexes; a put makes one.
+class RecordingControl : public Object {
+ public:
+  std::map<std::string, Variant> values;
+  std::vector<std::string> methods;  ///< Calls that are answered with nothing.
+  std::vector<std::string> uses;
+  std::vector<std::string> look_ups;
+  std::function<void(const std::string& use)> before;  ///< Called before each use, and may throw.
+
+  std::int32_t member_id(TextView name) override {
+    const std::string member = to_utf8(name);
+    look_ups.push_back(member);
+    const auto found = std::ranges::find(names_, member);
+    if (found != names_.end()) return static_cast<std::int32_t>(found - names_.begin());
+    const auto is_named = [&](const auto& entry) { return entry.first.substr(0, entry.first.find('(')) == member; };
+    const bool is_known = std::ranges::any_of(values, is_named) || std::ranges::find(methods, member) != methods.end();
+    if (!is_known) raise(ErrorNumber::member_not_supported);
+    names_.push_back(member);
+    return static_cast<std::int32_t>(names_.size() - 1);
+  }
+
+  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
+    const std::size_t indexes = arguments.size() - (access == Access::put ? 1 : 0);
+    std::string name = names_.at(static_cast<std::size_t>(member));
+    for (std::size_t i = 0; i < indexes; ++i) name += (i == 0 ? "(" : ", ") + shown(arguments[i]);
+    if (indexes > 0) name += ')';
+    std::string use = name;
+    if (access == Access::put) use = "put " + name + " = " + shown(arguments.back());
+    if (access == Access::call) use = "call " + name;
+    uses.push_back(use);
+    if (before) before(use);
+    if (access == Access::put) {
+      values[name] = arguments.back();
+      return {};
+    }
+    if (const auto found = values.find(name); found != values.end()) return found->second;
+    if (access == Access::call) return {};
+    raise(ErrorNumber::subscript_out_of_range);
+  }
+
+ private:
+  std::vector<std::string> names_;
+};
+
+}  // namespace talutil::testing

@@ -1,0 +1,389 @@
+#include <gmock/gmock.h>
+
+#include "forms/c_control_position.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "tests/fakes/error_of.hpp"
+#include "tests/fakes/fake_platform.hpp"
+#include "tests/fakes/recording_control.hpp"
+
+namespace talutil {
+
+namespace {
+
+using ::testing::ElementsAre;
+using testing::error_of;
+using ::testing::IsEmpty;
+using testing::RecordingControl;
+using Uses = std::vector<std::string>;
+
+struct Forms : ::testing::Test {
+  testing::FakePlatform platform;
+  Library library{platform.platform()};
+  ORVUtils utils{library};
+  std::shared_ptr<RecordingControl> control = std::make_shared<RecordingControl>();
+  Variant holder{ObjectRef(control)};
+
+  Forms() { library.settings().sNatNameC = u"CFG"; }
+
+  /// The uses since the last time.
+  Uses uses() { return std::exchange(control->uses, {}); }
+
+  [[nodiscard]] Text message() const { return platform.messages.empty() ? Text() : platform.messages.back().text; }
+};
+
+TEST_F(Forms, ComboEntriesAreFoundByTheirKey) {
+  control->values = {{"Text", u"typed"},       {"ListCount", std::int32_t{5}}, {"ItemData(0&)", std::int32_t{7}},
+                     {"ItemData(1&)", Null{}}, {"ItemData(2&)", u" 42 "},      {"ItemData(3&)", 42.0},
+                     {"ItemData(4&)", u"x"}};
+  EXPECT_EQ(utils.GetComboListIndex(holder, 42), 2) << "the first match wins";
+  EXPECT_EQ(uses(), (Uses{"put Text = \"\"", "ListCount", "ItemData(0&)", "ItemData(1&)", "ItemData(2&)"}));
+  EXPECT_THAT(control->look_ups, ElementsAre("Text", "ListCount", "ItemData")) << "one a member";
+  for (const std::int32_t key : {0, -1}) {
+    EXPECT_EQ(utils.GetComboListIndex(holder, key), -1);
+    EXPECT_EQ(uses(), (Uses{"put Text = \"\""}));
+  }
+  EXPECT_EQ(error_of([&] { utils.GetComboListIndex(holder, 8); }), 13) << "a key that is no number";
+  control->values["ListCount"] = std::int16_t{0};
+  EXPECT_EQ(utils.GetComboListIndex(holder, 42), -1);
+
+  for (const auto& [value, error] : std::initializer_list<std::pair<Variant, int>>{
+           {Variant(), 424}, {Null{}, 424}, {Variant(u"combo"), 424}, {ObjectRef(), 91}}) {
+    EXPECT_EQ(error_of([&] { utils.GetComboListIndex(value, 1); }), error);
+  }
+  control->values.erase("ListCount");
+  EXPECT_EQ(error_of([&] { utils.GetComboListIndex(holder, 1); }), 9) << "the control's own error";
+  EXPECT_EQ(control.use_count(), 2) << "no reference is kept";
+}
+
+TEST_F(Forms, CombosSearchForTypedText) {
+  const auto search_of = [&](std::int16_t flag, const Variant& text, const Variant& found) {
+    control->methods = {"Refresh"};
+    control->values = {{"ListIndex", std::int32_t{2}}, {"Text", text},         {"SearchText", {}}, {"ColumnSearch", {}},
+                       {"SearchMethod", {}},           {"SearchIndex", found}, {"Action", {}}};
+    platform.messages.clear();
+    return utils.SearchCombo(holder, flag);
+  };
+  EXPECT_EQ(search_of(0, u"O'Neil, X", std::int32_t{5}), 2) << "the selection is the result";
+  EXPECT_EQ(uses(),
+            (Uses{"call Refresh", "ListIndex", "Text", "put SearchText = \"O'Neil, X\"", "put ColumnSearch = 0%",
+                  "put SearchMethod = 2&", "put Action = 0&", "SearchIndex", "put ListIndex = 2%", "ListIndex"}));
+  EXPECT_EQ(search_of(2, u"abc", std::int32_t{5}), 5);
+  EXPECT_EQ(search_of(1, u"abc", std::int32_t{5}), 2);
+  EXPECT_THAT(platform.messages, IsEmpty());
+  uses();
+  for (const auto& empty : {Variant(u""), Variant(u" ,\" "), Variant(Null{}), Variant()}) {
+    EXPECT_EQ(search_of(1, empty, std::int32_t{-1}), 0) << "an empty box is not searched for";
+    EXPECT_EQ(uses(), (Uses{"call Refresh", "ListIndex", "Text"}));
+    EXPECT_THAT(platform.messages, IsEmpty());
+  }
+  EXPECT_EQ(search_of(0, u"abc", std::int16_t{-1}), -1);
+  EXPECT_THAT(platform.messages, IsEmpty());
+  EXPECT_EQ(search_of(1, u"abc", -1.0), -1);
+  EXPECT_EQ(platform.messages,
+            (std::vector<testing::FakePlatform::Message>{
+                {u"The Dropdown List text  ['abc'] is not a valid selection", MessageButtons::ok, {}}}));
+
+  // With the text and the method of the caller's.
+  uses();
+  control->values["SearchIndex"] = std::int32_t{5};
+  EXPECT_EQ(utils.SearchComboEx(holder, u"", 9, 0), 0) << "the first entry is selected";
+  EXPECT_EQ(uses(), (Uses{"put SearchText = \"\"", "put ColumnSearch = 0%", "put SearchMethod = 9&", "put Action = 0&",
+                          "SearchIndex", "put ListIndex = 0%", "ListIndex"}));
+  EXPECT_EQ(utils.SearchComboEx(holder, u"x", 1, 2), 5);
+  control->values["SearchIndex"] = std::int32_t{-1};
+  EXPECT_EQ(utils.SearchComboEx(holder, u"x", 1, 1), -1);
+  EXPECT_EQ(message(), u"The Dropdown List text  ['abc'] is not a valid selection") << "the control's text";
+  control->values["ListIndex"] = std::int32_t{40000};
+  control->methods = {"Refresh"};
+  EXPECT_EQ(error_of([&] { utils.SearchCombo(holder, 0); }), 6);
+}
+
+TEST_F(Forms, GridWidthsAreRemembered) {
+  control->values = {{"Cols", std::int32_t{3}}, {"ColWidth(1&)", std::int32_t{0}}, {"ColWidth(2&)", 0.0}};
+  utils.LoadGridWidths(holder, u"Grid", 1);
+  EXPECT_EQ(uses(), (Uses{"Cols", "put ColWidth(1&) = 1000#", "put ColWidth(2&) = 1000#"}));
+  control->values["ColWidth(1&)"] = 240.5;
+  control->values["ColWidth(2&)"] = u"none";
+  utils.SaveGridWidths(holder, u"Grid", 1);
+  EXPECT_EQ(uses(), (Uses{"Cols", "ColWidth(1&)", "ColWidth(2&)"}));
+  utils.LoadGridWidths(holder, u"Grid", 1);
+  EXPECT_EQ(uses(), (Uses{"Cols", "put ColWidth(1&) = 240.5#", "put ColWidth(2&) = 0#"})) << "no number hides";
+  utils.LoadGridWidths(holder, u"Grid", 3);
+  utils.SaveGridWidths(holder, u"Grid", 32767);
+  EXPECT_EQ(uses(), (Uses{"Cols", "Cols"}));
+  utils.LoadGridWidths(holder, u"Other", 0);
+  EXPECT_EQ(utils.GetCfgFileData(u"Other", u"0ColWidth", u"", u"CFG", Boolean(false)), u"1000");
+}
+
+TEST_F(Forms, TicksAreSetAndCounted) {
+  control->values = {{"Rows", std::int32_t{4}},
+                     {"FixedRows", std::int32_t{1}},
+                     {"ColDataType(3&)", std::int16_t{11}},
+                     {"ColDataType(0&)", std::int16_t{8}},
+                     {"TextMatrix", {}},
+                     {"Cell(5%, 1&, 3&)", std::int16_t{1}},
+                     {"Cell(5%, 2&, 3&)", std::int16_t{2}},
+                     {"Cell(5%, 3&, 3&)", u"1"}};
+  utils.SelectGridRows(3, holder, 1);
+  EXPECT_EQ(uses(), (Uses{"Rows", "FixedRows", "ColDataType(3&)", "put TextMatrix(1&, 3&) = True",
+                          "put TextMatrix(2&, 3&) = True", "put TextMatrix(3&, 3&) = True"}));
+  EXPECT_EQ(control->look_ups.size(), 4) << "one a member";
+  utils.SelectGridRows(3, holder, 0);
+  EXPECT_EQ(uses().back(), "put TextMatrix(3&, 3&) = False");
+  utils.SelectGridRows(3, holder, 2);
+  utils.SelectGridRows(0, holder, 1);
+  EXPECT_EQ(uses(), (Uses{"Rows", "FixedRows", "ColDataType(3&)", "Rows", "FixedRows", "ColDataType(0&)"}));
+  EXPECT_EQ(utils.CountGridSelectedRows(3, holder), 2);
+  EXPECT_EQ(uses(),
+            (Uses{"ColDataType(3&)", "Rows", "FixedRows", "Cell(5%, 1&, 3&)", "Cell(5%, 2&, 3&)", "Cell(5%, 3&, 3&)"}));
+  EXPECT_EQ(utils.CountGridSelectedRows(0, holder), 0);
+  control->values["FixedRows"] = std::int32_t{4};
+  utils.SelectGridRows(3, holder, 1);
+  EXPECT_EQ(utils.CountGridSelectedRows(3, holder), 0) << "no data rows";
+
+  // Errors are told, and what was counted before is the result.
+  control->values["FixedRows"] = std::int32_t{1};
+  control->before = [](const std::string& use) {
+    if (use == "Cell(5%, 2&, 3&)" || use == "put TextMatrix(2&, 3&) = True") throw RunTimeError(1234, u"It broke.");
+  };
+  EXPECT_EQ(utils.CountGridSelectedRows(3, holder), 1);
+  EXPECT_EQ(message(), u"ORVUtils CountGridSelectedRows It broke.");
+  utils.SelectGridRows(3, holder, 1);
+  EXPECT_EQ(message(), u"ORVUtils SelectGridRows It broke.");
+  utils.SelectGridRows(3, Null{}, 1);
+  EXPECT_EQ(message(), u"ORVUtils SelectGridRows Object required");
+  EXPECT_EQ(platform.pointer_resets, 3);
+  EXPECT_EQ(control.use_count(), 2);
+}
+
+TEST_F(Forms, WindowStatesAreRemembered) {
+  control->values = {{"WindowState", std::int16_t{2}}, {"Width", 6000.0F}, {"Height", 4500.0F}};
+  utils.LoadWindowState(holder, u"Main");
+  EXPECT_EQ(uses(), (Uses{"put WindowState = 0#", "WindowState", "Width", "put Width = 6000#", "Height",
+                          "put Height = 4500#"}));
+  utils.SaveWindowState(holder, u"Main");
+  EXPECT_EQ(uses(), (Uses{"WindowState", "WindowState", "Width", "Height"}));
+  // A maximised window keeps its size to itself, and the last normal size survives it.
+  control->values = {{"WindowState", std::int16_t{2}}, {"Width", 1.0F}, {"Height", 1.0F}};
+  utils.SaveWindowState(holder, u"Main");
+  utils.LoadWindowState(holder, u"Main");
+  EXPECT_EQ(uses(), (Uses{"WindowState", "WindowState", "put WindowState = 2#", "WindowState"}));
+  Text normal = u"0";
+  utils.SaveCfgFileData(u"Main", u"WindowState", normal, u"CFG", Boolean(false));
+  utils.LoadWindowState(holder, u"Main");
+  EXPECT_EQ(uses(), (Uses{"put WindowState = 0#", "WindowState", "Width", "put Width = 6000#", "Height",
+                          "put Height = 4500#"}));
+}
+
+TEST_F(Forms, ConfirmationsWantYesInUpperCase) {
+  using Message = testing::FakePlatform::Message;
+  const Message question{u"Type YES in uppercase characters to confirm deletion of this record", MessageButtons::ok,
+                         u"Confirm Delete"};
+  const Message warning{u"You must type YES in uppercase characters.  Do you wish to delete this record?",
+                        MessageButtons::yes_no, u"Warning"};
+  platform.inputs = {u"yes", u" YES", u"YES"};
+  platform.answers = {MessageAnswer::yes, MessageAnswer::yes};
+  EXPECT_TRUE(utils.CheckDeleteRecord().is_exactly_true());
+  EXPECT_THAT(platform.input_boxes, ElementsAre(question, question, question));
+  EXPECT_THAT(platform.messages, ElementsAre(warning, warning));
+  platform.answers = {MessageAnswer::no};
+  EXPECT_FALSE(utils.CheckDeleteRecord()) << "a cancelled box warns too";
+  EXPECT_EQ(platform.messages.size(), 3);
+
+  EXPECT_FALSE(utils.CheckModifyDatabase(u"Rename"));
+  EXPECT_EQ(platform.input_boxes.back(),
+            (Message{u"Type YES in uppercase characters to confirm", MessageButtons::ok, u"Rename"}));
+  EXPECT_EQ(platform.messages.back(), (Message{u"You must type YES in uppercase characters.  Do you wish to try again?",
+                                               MessageButtons::yes_no, u"Warning"}));
+}
+
+TEST_F(Forms, LaunchFailuresAreExplained) {
+  for (std::int32_t code = -2; code < 40; ++code) utils.DrawShellExecuteError(code);
+  EXPECT_EQ(platform.messages.size(), 16);
+  EXPECT_EQ(platform.messages[1].text, u"File was not found.");
+  EXPECT_EQ(message(), u"Application requires Microsoft Windows 32-bit extensions.");
+}
+
+TEST_F(Forms, PointsOnAnEdgeAreOutside) {
+  const auto inside = [&](const Variant& x, const Variant& y) {
+    return utils.GetMousePos(x, y, 10, std::int16_t{10}, 20.0, u"30").is_exactly_true();
+  };
+  EXPECT_TRUE(inside(15, 15)) << "numbers come before texts";
+  EXPECT_FALSE(inside(10, 15));
+  EXPECT_FALSE(inside(20, 15));
+  EXPECT_FALSE(inside(15, 10));
+  EXPECT_FALSE(inside(15, Null{}));
+  EXPECT_FALSE(inside(Variant(), 15)) << "Empty is 0";
+  EXPECT_TRUE(utils.GetMousePos(u"5", u"5", u"10", u"10", u"9", u"9")) << "texts compare as texts";
+  EXPECT_TRUE(inside(10.5F, 29.5));
+  EXPECT_EQ(error_of([&] { inside(0, ErrorValue{5}); }), 13) << "wherever it stands";
+}
+
+TEST_F(Forms, PagesAreCountedInSinglePrecision) {
+  const struct {
+    std::int32_t rows_per_page;
+    std::int32_t rows;
+    std::int32_t pages;
+  } table[] = {{10, 0, 0},
+               {10, 1, 1},
+               {4, 10, 3},
+               {4, 12, 3},
+               {4, 14, 4},
+               {10, -15, -2},
+               {-10, 15, -2},
+               {1, 16777217, 16777216},
+               {2, 33554435, 16777216},
+               {1, 2147483520, 2147483520}};
+  for (const auto& row : table) {
+    EXPECT_EQ(utils.GetMaxPages(row.rows_per_page, row.rows), row.pages) << row.rows_per_page << ' ' << row.rows;
+  }
+  EXPECT_EQ(error_of([&] { utils.GetMaxPages(0, 0); }), 11);
+  EXPECT_EQ(error_of([&] { utils.GetMaxPages(1, 2147483647); }), 6);
+  EXPECT_EQ(error_of([&] { utils.GetMaxPages(-1, -2147483647 - 1); }), 6);
+}
+
+TEST_F(Forms, FormsArePrinted) {
+  control->values = {{"hwnd", std::int32_t{77}}};
+  control->methods = {"Refresh"};
+  control->before = [&](const std::string& use) { platform.drawn.push_back(use); };
+  utils.PrintScreen(holder);
+  EXPECT_THAT(platform.drawn, ElementsAre("hwnd", "configure 77", "call Refresh", "hwnd", "send 77"));
+  control->values.clear();
+  EXPECT_EQ(error_of([&] { utils.PrintScreen(ObjectRef(std::make_shared<RecordingControl>())); }), 438);
+}
+
+TEST_F(Forms, TextIsDrawnIntoARectangle) {
+  library.start();
+  library.settings().DrawTextPictureBox = control;
+  control->values = {{"FontBold", Boolean(false)},
+                     {"ForeColor", std::int32_t{5}},
+                     {"TextWidth(\"abc\")", 300.0F},
+                     {"TextHeight(\"abc\")", 200.0F},
+                     {"hDC", std::int32_t{99}},
+                     {"CurrentX", 0.0F},
+                     {"CurrentY", 0.0F}};
+  control->methods = {"Print"};
+  const auto draw = [&](std::int16_t right, std::int16_t justify, bool wraps = false) {
+    uses();
+    utils.MyDrawText(10, 20, right, 40, u"abc", 255, justify, Boolean(true), Boolean(wraps));
+    return uses();
+  };
+  // Exactly as wide as the rectangle is not wider: 20 pixels of 15 twips.
+  EXPECT_EQ(draw(30, 0),
+            (Uses{"FontBold", "ForeColor", "put FontBold = True", "put ForeColor = 255&", "TextWidth(\"abc\")",
+                  "TextHeight(\"abc\")", "put CurrentX = 150!", "put CurrentY = 350!", "call Print(\"abc\")",
+                  "put ForeColor = 5&", "put FontBold = False"}));
+  const auto place = [&](std::int16_t justify) { return draw(50, justify)[6]; };
+  EXPECT_EQ(place(-2), "put CurrentX = 150!");
+  EXPECT_EQ(place(-1), "put CurrentX = 150!");
+  EXPECT_EQ(place(0), "put CurrentX = 300!");
+  EXPECT_EQ(place(1), "put CurrentX = 450!");
+  EXPECT_EQ(draw(29, -2)[8], "call Print(\"abc\")") << "runs over the edge";
+  EXPECT_EQ(draw(29, -1)[5], "hDC");
+  draw(29, 1, true);
+  EXPECT_THAT(platform.drawn, ElementsAre("draw on 99 (10,20)-(29,40) \"abc\" colour 255",
+                                          "draw on 99 (10,20)-(29,40) \"abc\" colour 255 broken"));
+  control->values.erase("TextWidth(\"abc\")");
+  EXPECT_EQ(error_of([&] { draw(30, 0); }), 9);
+  EXPECT_EQ(control->uses.back(), "put FontBold = False") << "put back after an error too";
+  uses();
+  utils.MyDrawText(0, 0, 1, 1, u"", 0, 0, Boolean(false), Boolean(false));
+  EXPECT_THAT(uses(), IsEmpty());
+  EXPECT_EQ(error_of([&] { utils.MyDrawText(0, 0, 1, 1, Null{}, 0, 0, Boolean(false), Boolean(false)); }), 94);
+  library.settings().DrawTextPictureBox.reset();
+  EXPECT_EQ(error_of([&] { draw(30, 0); }), 91);
+}
+
+struct MovableControl : Forms {
+  cControlPosition position{library};
+  std::shared_ptr<RecordingControl> form = std::make_shared<RecordingControl>();
+
+  MovableControl() {
+    form->values = {{"ScaleWidth", 1000.0F}, {"ScaleHeight", 800.0F}};
+    control->values = {{"Container", ObjectRef(std::make_shared<RecordingControl>())},
+                       {"left", 100.0F},
+                       {"Top", 100.0F},
+                       {"Width", 300.0F},
+                       {"Height", 200.0F}};
+    control->methods = {"Move"};
+    position.DragStartX = 10;
+    position.DragStartY = 20;
+  }
+
+  Uses drag(float x, float y) {
+    uses();
+    position.DragControl(ObjectRef(form), holder, x, y);
+    return uses();
+  }
+};
+
+TEST_F(MovableControl, StaysWithinItsForm) {
+  control->before = [&](const std::string& use) {
+    if (use == "call Move(160.5!, 81!)") control->values["left"] = 160.5F;
+  };
+  EXPECT_EQ(drag(70.5F, 1),
+            (Uses{"Container", "left", "Top", "Width", "Height", "call Move(160.5!, 81!)", "left", "Top"}));
+  EXPECT_EQ(position.left, 160) << "halves to even";
+  EXPECT_EQ(position.Top, 100) << "what the control says, not what it was told";
+  EXPECT_EQ(drag(-5000, -5000).at(3), "call Move(0!, 0!)");
+  EXPECT_EQ(drag(5000, 5000).at(5), "call Move(700!, 600!)") << "right and bottom edge";
+  EXPECT_EQ(drag(10, 20).size(), 5U) << "no move where nothing has changed";
+  form->values["ScaleWidth"] = 100.0F;
+  EXPECT_EQ(drag(5000, 20).at(5), "call Move(-200!, 100!)") << "not brought back a second time";
+}
+
+TEST_F(MovableControl, DistancesAreScaled) {
+  const auto container = std::make_shared<RecordingControl>();
+  control->values["ScaleMode"] = std::int16_t{3};
+  control->values["ScaleX(50!, 3%, 1%)"] = 750.0F;
+  control->values["ScaleY(0!, 3%, 1%)"] = 0.0F;
+  control->values["Container"] = ObjectRef(container);
+  EXPECT_EQ(drag(60, 20), (Uses{"ScaleMode", "ScaleX(50!, 3%, 1%)", "ScaleY(0!, 3%, 1%)", "Container", "left", "Top",
+                                "Width", "Height", "call Move(700!, 100!)", "left", "Top"}));
+  // A container with a scale starts again from the mouse's own distances.
+  container->values = {{"ScaleMode", std::int16_t{7}}, {"ScaleX(50!, 1%, 7%)", 2.5F}, {"ScaleY(0!, 1%, 7%)", 0.0F}};
+  EXPECT_EQ(drag(60, 20).at(8), "call Move(102.5!, 100!)");
+  EXPECT_EQ(container->uses, (Uses{"ScaleMode", "ScaleX(50!, 1%, 7%)", "ScaleY(0!, 1%, 7%)"}));
+  control->values.erase("Container");
+  EXPECT_NE(error_of([&] { drag(60, 20); }), 0);
+  EXPECT_EQ(error_of([&] { position.DragControl(Null{}, holder, 1, 1); }), 424);
+}
+
+TEST_F(MovableControl, PositionsAreRemembered) {
+  position.ControlName = u"Job";
+  position.ControlID = 12;
+  position.DefaultLeft = 15;
+  position.DefaultTop = 30;
+  position.Width = 7;
+  position.GetControlPosition();
+  EXPECT_EQ(position.left, 15);
+  EXPECT_EQ(position.Top, 30);
+  EXPECT_EQ(position.Width, 7) << "only places have defaults";
+
+  position.left = 0;
+  position.Top = 480;
+  position.Width = 2400;
+  position.Height = -1200;
+  position.SaveControlPosition();
+  EXPECT_EQ(utils.GetCfgFileData(u"Job", u"12ControlSize", u"", u"CFG", Boolean(false)), u"0,480,2400,-1200,");
+  cControlPosition other(library);
+  other.ControlName = u"Job";
+  other.ControlID = 12;
+  other.DefaultLeft = 99;
+  other.GetControlPosition();
+  EXPECT_EQ(std::vector({other.left, other.Top, other.Width, other.Height}), std::vector({99, 480, 2400, -1200}))
+      << "0 gives way to the default";
+  Text stored = u"1.5,x,9999999999,";
+  utils.SaveCfgFileData(u"Job", u"12ControlSize", stored, u"CFG", Boolean(false));
+  EXPECT_EQ(error_of([&] { other.GetControlPosition(); }), 6);
+  EXPECT_EQ(other.left, 2);
+  other.ControlName.clear();
+  other.ControlID = 1;
+  other.SaveControlPosition();
+  EXPECT_EQ(utils.GetCfgFileData(u"", u"1ControlSize", u"none", u"CFG", Boolean(false)), u"none");
+}
+
+}  // namespace
+
+}  // namespace talutil
