@@ -60,3 +60,10 @@ set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CM
 target_include_directories(TALUtil PRIVATE ${generated})
 target_link_libraries(TALUtil PRIVATE talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)
 target_link_options(TALUtil PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup)
+
+# In a folder of its own: the library finds it where a package puts it, beside the program or beside TALUtil.dll.
+add_library(printhelper SHARED src/printhelper/printhelper.cpp src/printhelper/printhelper.def)
+set_target_properties(printhelper PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/printhelper)
+target_link_libraries(printhelper PRIVATE talutil_options gdi32 user32 winspool)
+target_link_options(printhelper PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup)
+install(TARGETS TALUtil printhelper RUNTIME DESTINATION .)

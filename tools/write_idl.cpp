@@ -13,22 +13,23 @@ namespace {
 
 using namespace talutil;
 
-std::string class_entry(std::string_view identifier, std::string_view program_id) {
-  return "    <comClass clsid=\"{" + std::string(identifier) + "}\" progid=\"" + std::string(program_id) +
+std::string class_entry(const identity::Class& entry) {
+  return "    <comClass clsid=\"{" + std::string(entry.identifier) + "}\" progid=\"" + std::string(entry.program_id) +
          "\" tlbid=\"{" + std::string(identity::type_library) + "}\" threadingModel=\"Apartment\"/>\n";
 }
 
 std::string manifest() {
+  std::string classes;
+  for (const identity::Class& entry : identity::classes) classes += class_entry(entry);
   return "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"yes\"?>\n"
          "<assembly xmlns=\"urn:schemas-microsoft-com:asm.v1\" manifestVersion=\"1.0\">\n"
          "  <assemblyIdentity type=\"win32\" name=\"TALUtil\" version=\"" +
          std::string(version_text) +
          ".0\" processorArchitecture=\"x86\"/>\n"
          "  <file name=\"TALUtil.dll\">\n" +
-         class_entry(identity::orv_utils_class, "TALUtil.ORVUtils") +
-         class_entry(identity::control_position_class, "TALUtil.cControlPosition") + "    <typelib tlbid=\"{" +
-         std::string(identity::type_library) + "}\" version=\"" + std::to_string(identity::type_library_major) + "." +
-         std::to_string(identity::type_library_minor) + "\" helpdir=\"\"/>\n  </file>\n</assembly>\n";
+         classes + "    <typelib tlbid=\"{" + std::string(identity::type_library) + "}\" version=\"" +
+         std::to_string(identity::type_library_major) + "." + std::to_string(identity::type_library_minor) +
+         "\" helpdir=\"\"/>\n  </file>\n</assembly>\n";
 }
 
 }  // namespace

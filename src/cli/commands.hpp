@@ -91,6 +91,14 @@ struct UnzipOptions {
 };
 void unzip(const UnzipOptions& options);
 
+struct ExportOptions {
+  std::string table;                ///< A file of comma text; its first line is row 0.
+  std::vector<std::string> hidden;  ///< Columns, counted from 1.
+  std::string rows;                 ///< "3-7" or "3"; empty for all.
+  std::string output;
+};
+void export_table(const ExportOptions& options);
+
 struct LogTailOptions {
   std::string path;  ///< The event log, or the folder it is in.
   std::int64_t lines = 10;

@@ -24,9 +24,25 @@ struct Request {
   ConfigOptions config;
   ZipOptions zip;
   UnzipOptions unzip;
+  ExportOptions export_table;
   LogTailOptions log_tail;
   std::function<void()> run;
 };
+
+void add_export(CLI::App& app, Request& request) {
+  ExportOptions& options = request.export_table;
+  auto* const command = app.add_subcommand("export", "Write the rows and columns of a table that a grid would show");
+  command->add_option("--from", options.table, "The table, comma text; its first line, the header, is row 0")
+      ->required()
+      ->type_name("FILE");
+  command->add_option("--hide", options.hidden, "Columns to leave out, counted from 1: 2,5")
+      ->delimiter(',')
+      ->allow_extra_args(false)
+      ->type_name("COLUMNS");
+  command->add_option("--rows", options.rows, "The rows to write: 3-7; all if not given")->type_name("FIRST-LAST");
+  command->add_option("FILE", options.output, "The file to write, comma text")->required();
+  command->callback([&] { request.run = [&] { export_table(options); }; });
+}
 
 void add_list(CLI::App& app, Request& request) {
   auto* const command = app.add_subcommand("list", "List every member with its access and signature");
@@ -228,6 +244,7 @@ int run(std::vector<std::string> words) {
   add_secrets(app, request);
   add_config(app, request);
   add_archives(app, request);
+  add_export(app, request);
   add_log(app, request);
   add_printers(app, request);
   if (!words.empty() && !words.front().starts_with('-')) check_subcommand(app, words.front());

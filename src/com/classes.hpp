@@ -12,14 +12,12 @@ template <>
 struct ClassTraits<ORVUtils> {
   static constexpr GUID class_id = guid_of(identity::orv_utils_class);
   static constexpr GUID interface_id = guid_of(identity::orv_utils_interface);
-  static constexpr const wchar_t* program_id = L"TALUtil.ORVUtils";
 };
 
 template <>
 struct ClassTraits<cControlPosition> {
   static constexpr GUID class_id = guid_of(identity::control_position_class);
   static constexpr GUID interface_id = guid_of(identity::control_position_interface);
-  static constexpr const wchar_t* program_id = L"TALUtil.cControlPosition";
 };
 
 }  // namespace talutil::com

@@ -5,10 +5,14 @@
 
 #include "com/boundary.hpp"
 #include "com/classes.hpp"
+#include "com/dispatch_object.hpp"
 #include "com/module.hpp"
 #include "com/pointer.hpp"
 #include "com/registered_controls.hpp"
 #include "com/registration.hpp"
+#include "controls/common_dialog.hpp"
+#include "controls/grid.hpp"
+#include "controls/zip_controls.hpp"
 #include "infoforms/frm_components.hpp"
 #include "platform/win32/win32_cryptography.hpp"
 #include "platform/win32/win32_drawing.hpp"
@@ -84,6 +88,17 @@ HRESULT create_object(REFIID id, void** out) noexcept {
   });
 }
 
+/// A control of its own for a host, as those on the components window are: ours, whoever else has registered one.
+template <class C>
+HRESULT create_control(REFIID id, void** out) noexcept {
+  return guarded([&] {
+    Pointer<IDispatch> made;
+    *made.receive() = dispatch_from(std::make_shared<C>(module_library().platform()));
+    const HRESULT result = made->QueryInterface(id, out);
+    if (FAILED(result)) throw error_of(result, {});
+  });
+}
+
 /// One for each class, for as long as the DLL is loaded.
 class ClassObject final : public IClassFactory {
  public:
@@ -121,8 +136,13 @@ class ClassObject final : public IClassFactory {
   Create create_;
 };
 
-ClassObject orv_utils_class(&create_object<ORVUtils>);
-ClassObject control_position_class(&create_object<cControlPosition>);
+// In the order of identity::classes.
+ClassObject class_objects[] = {
+    ClassObject(&create_object<ORVUtils>),    ClassObject(&create_object<cControlPosition>),
+    ClassObject(&create_control<Grid>),       ClassObject(&create_control<CommonDialog>),
+    ClassObject(&create_control<ZipControl>), ClassObject(&create_control<UnzipControl>),
+};
+static_assert(std::size(class_objects) == std::size(identity::classes));
 
 }  // namespace
 
@@ -167,8 +187,9 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, void* /*reserve
 STDAPI DllGetClassObject(REFCLSID class_id, REFIID id, void** out) {
   if (out == nullptr) return E_POINTER;
   *out = nullptr;
-  if (class_id == ClassTraits<ORVUtils>::class_id) return orv_utils_class.QueryInterface(id, out);
-  if (class_id == ClassTraits<cControlPosition>::class_id) return control_position_class.QueryInterface(id, out);
+  for (std::size_t i = 0; i < std::size(class_objects); ++i) {
+    if (class_id == guid_of(identity::classes[i].identifier)) return class_objects[i].QueryInterface(id, out);
+  }
   return CLASS_E_CLASSNOTAVAILABLE;
 }
 

@@ -4,9 +4,9 @@
 #include <string>
 
 #include "com/boundary.hpp"
-#include "com/classes.hpp"
 #include "com/module.hpp"
 #include "com/pointer.hpp"
+#include "library/identity.hpp"
 
 // In the platform's library, but not in the headers of the tool chain.
 extern "C" HRESULT WINAPI RegisterTypeLibForUser(ITypeLib* library, OLECHAR* path, OLECHAR* help_folder);
@@ -63,26 +63,21 @@ HKEY root_of(RegistrationScope scope) noexcept {
 
 std::wstring class_key(const std::wstring& rest) { return L"Software\\Classes\\" + rest; }
 
-struct ClassEntry {
-  GUID class_id;
-  const wchar_t* program_id;
-};
+std::wstring program_id_of(const identity::Class& entry) { return {entry.program_id.begin(), entry.program_id.end()}; }
 
-constexpr ClassEntry entries[] = {
-    {ClassTraits<ORVUtils>::class_id, ClassTraits<ORVUtils>::program_id},
-    {ClassTraits<cControlPosition>::class_id, ClassTraits<cControlPosition>::program_id},
-};
+std::wstring identifier_of(const identity::Class& entry) { return text_of(guid_of(entry.identifier)); }
 
-void register_class(HKEY root, const ClassEntry& entry, const std::wstring& path) {
-  const std::wstring identifier = text_of(entry.class_id);
+void register_class(HKEY root, const identity::Class& entry, const std::wstring& path) {
+  const std::wstring identifier = identifier_of(entry);
+  const std::wstring program_id = program_id_of(entry);
   const std::wstring key = class_key(L"CLSID\\" + identifier);
-  Key::create(root, class_key(entry.program_id)).set(nullptr, entry.program_id);
-  Key::create(root, class_key(entry.program_id + std::wstring(L"\\CLSID"))).set(nullptr, identifier);
-  Key::create(root, key).set(nullptr, entry.program_id);
+  Key::create(root, class_key(program_id)).set(nullptr, program_id);
+  Key::create(root, class_key(program_id + L"\\CLSID")).set(nullptr, identifier);
+  Key::create(root, key).set(nullptr, program_id);
   const Key server = Key::create(root, key + L"\\InprocServer32");
   server.set(nullptr, path);
   server.set(L"ThreadingModel", L"Apartment");
-  Key::create(root, key + L"\\ProgID").set(nullptr, entry.program_id);
+  Key::create(root, key + L"\\ProgID").set(nullptr, program_id);
   Key::create(root, key + L"\\TypeLib").set(nullptr, text_of(guid_of(identity::type_library)));
   Key::create(root, key + L"\\Version")
       .set(nullptr,
@@ -106,7 +101,7 @@ void register_type_library(RegistrationScope scope, const std::wstring& path) {
 HRESULT register_library(RegistrationScope scope) noexcept {
   const HRESULT result = guarded([scope] {
     const std::wstring path = module_path();
-    for (const ClassEntry& entry : entries) register_class(root_of(scope), entry, path);
+    for (const identity::Class& entry : identity::classes) register_class(root_of(scope), entry, path);
     register_type_library(scope, path);
   });
   if (FAILED(result)) static_cast<void>(unregister_library(scope));
@@ -119,9 +114,9 @@ HRESULT unregister_library(RegistrationScope scope) noexcept {
       const LSTATUS status = RegDeleteTreeW(root, key.c_str());
       if (status != ERROR_FILE_NOT_FOUND) Key::check(status);
     };
-    for (const ClassEntry& entry : entries) {
-      remove(class_key(entry.program_id));
-      remove(class_key(L"CLSID\\" + text_of(entry.class_id)));
+    for (const identity::Class& entry : identity::classes) {
+      remove(class_key(program_id_of(entry)));
+      remove(class_key(L"CLSID\\" + identifier_of(entry)));
     }
     const GUID library = guid_of(identity::type_library);
     const auto unregister = scope == RegistrationScope::user ? &UnRegisterTypeLibForUser : &UnRegisterTypeLib;

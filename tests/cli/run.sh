@@ -129,7 +129,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, log, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, export, log, idl, reference' lst
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
 # ---- list, help
@@ -213,6 +213,19 @@ expect_part 'AES without a password' 2 'give --encrypt or --password-file' zip a
 expect 'unzip a missing archive' 1 'talutil: none.zip: there is no such file (code 13)' unzip none.zip
 diff -r archived unpacked/archived
 verdict 'unpacked' 0 $?
+
+# ---- tables
+printf 'Name,Phone,Town\r\nAnne,1,"Cork, IE"\r\nBob,2,Kyle\r\nCy,3,Ayr\r\n' >table.csv
+expect 'export' 0 '' export --from table.csv --hide 2 --rows 1-2 shown.txt
+verdict 'the exported rows' $'Anne,"Cork, IE"\r\nBob,Kyle\r' "$(cat shown.txt)"
+expect 'export everything' 0 '' export --from table.csv all.txt
+cmp table.csv all.txt
+verdict 'the whole table' 0 $?
+expect 'export: no such column' 2 'talutil: --hide: there is no column 4; table.csv has columns 1 to 3' export --from table.csv --hide 1,4 x.txt
+expect 'export: no such row' 2 'talutil: --rows: there is no row 4; table.csv has rows 0 to 3' export --from table.csv --rows 2-4 x.txt
+expect 'export: no number' 2 'talutil: --rows: "a" is not a number' export --from table.csv --rows a x.txt
+expect 'export: no table' 1 'talutil: none.csv: error 53: File not found' export --from none.csv x.txt
+expect 'export into a folder' 1 'talutil: archived: error 75: Path/File access error' export --from table.csv archived
 
 expect 'unknown mix' 2 'talutil: --mix x: there is no such mix; there are digits, letters, all and hex' password --mix x
 expect_part 'password without length' 2 '--length: Value 0 not in range 1 to 32767' password --length 0

@@ -16,7 +16,7 @@ namespace {
 constexpr HRESULT documented_results[] = {DISP_E_BADPARAMCOUNT, DISP_E_PARAMNOTOPTIONAL, DISP_E_MEMBERNOTFOUND,
                                           DISP_E_UNKNOWNNAME,   DISP_E_PARAMNOTFOUND,    E_POINTER};
 // 51, an error of no kind the library knows, is not among them.
-constexpr int documented_numbers[] = {5, 6, 7, 9, 10, 13, 18, 52, 53, 57, 70, 75, 76, 91, 94, 424, 438, 445, 449};
+constexpr int documented_numbers[] = {5, 6, 7, 9, 10, 11, 13, 18, 52, 53, 57, 70, 75, 76, 91, 94, 424, 438, 445, 449};
 
 HostObject with_value(HostObject::Kind::with_value);
 HostObject without_value(HostObject::Kind::without_value);
@@ -498,9 +498,10 @@ class Walk {
  public:
   explicit Walk(IDispatch* object) : object_(object), slots_(slots_of(object)), values_(hostile_values()) {
     // Members that wait for a user would wait for ever.
-    std::erase_if(slots_, [](const Slot& slot) {
-      return slot.name == L"BrowseForFolder" || slot.name == L"CallZIPFiles" || slot.name == L"CallUnZIPFiles";
-    });
+    static constexpr std::wstring_view waiting[] = {
+        L"BrowseForFolder",       L"CallZIPFiles",   L"CallUnZIPFiles", L"CheckDeleteRecord",    L"CheckModifyDatabase",
+        L"CountGridSelectedRows", L"ExportGridData", L"SelectGridRows", L"DrawShellExecuteError"};
+    std::erase_if(slots_, [](const Slot& slot) { return std::ranges::find(waiting, slot.name) != std::end(waiting); });
     for (Slot& slot : slots_) {
       std::erase_if(slot.parameters, [](const SlotParameter& p) { return (p.flags & PARAMFLAG_FRETVAL) != 0; });
     }

@@ -71,6 +71,7 @@ rm -f "$pictures"/*.png
 take_pictures &
 pictures_pid=$!
 client window
+client forms
 kill $pictures_pid || true
 run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'
 

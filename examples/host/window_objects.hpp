@@ -1,0 +1,22 @@
+#pragma once
+
+#include "scriptable.hpp"
+
+/// The objects that the library sees of this host's windows. Sizes and places are twips, 1440 an inch.
+
+/// A form: WindowState, Width, Height, ScaleWidth, ScaleHeight, ScaleMode, ScaleX, ScaleY, hwnd, Refresh.
+Scriptable* form_object(HWND window);
+
+/// A control on a form: left, Top, Width, Height, Container, Move.
+Scriptable* control_object(HWND window, IDispatch* container);
+
+/// A combo box: Text, ListCount, ItemData(i), ListIndex.
+Scriptable* combo_object(HWND window);
+
+/// A picture box over a bitmap: hDC, TextWidth, TextHeight, CurrentX, CurrentY, ForeColor, FontBold, Print. The owner
+/// paints the window from the bitmap with `paint_picture`.
+Scriptable* picture_object(HWND window, int width, int height);
+void paint_picture(HWND window, HDC target);
+
+/// A pixel of the screen in twips.
+float twips_per_pixel();

@@ -1,0 +1,171 @@
+// printhelper.dll: prints a window as it looks, for the library's PrintScreen and for hosts that call it themselves.
+// Both functions take a window and answer 1, or 0 when there is nothing to print on.
+#include <algorithm>
+#include <cstdint>
+#include <cstring>
+#include <utility>
+#include <vector>
+
+#define WIN32_LEAN_AND_MEAN
+#include <windows.h>
+// After windows.h.
+#include <winspool.h>
+
+namespace {
+
+/// The printer's settings for one window, kept from ConfigurePrinter to SendToPrinter.
+struct Setup {
+  HWND window = nullptr;
+  std::vector<wchar_t> printer;
+  std::vector<std::byte> settings;  ///< A DEVMODE with what the driver adds to it.
+
+  [[nodiscard]] DEVMODEW* device_mode() { return reinterpret_cast<DEVMODEW*>(settings.data()); }
+};
+
+// Threads print windows of their own.
+thread_local Setup prepared;
+
+struct Size {
+  int width = 0;
+  int height = 0;
+};
+
+bool size_of(HWND window, Size& size) {
+  RECT place;
+  if (GetWindowRect(window, &place) == FALSE) return false;
+  size = {static_cast<int>(place.right - place.left), static_cast<int>(place.bottom - place.top)};
+  return size.width > 0 && size.height > 0;
+}
+
+/// The default printer, its paper turned to the shape of the window.
+bool prepare(HWND window, Setup& setup) {
+  Size size;
+  DWORD length = 0;
+  if (!size_of(window, size)) return false;
+  GetDefaultPrinterW(nullptr, &length);
+  if (length == 0) return false;
+  setup.printer.resize(length);
+  if (GetDefaultPrinterW(setup.printer.data(), &length) == FALSE) return false;
+
+  HANDLE printer = nullptr;
+  if (OpenPrinterW(setup.printer.data(), &printer, nullptr) == FALSE) return false;
+  const LONG bytes = DocumentPropertiesW(nullptr, printer, setup.printer.data(), nullptr, nullptr, 0);
+  bool is_ready = false;
+  if (bytes > 0) {
+    setup.settings.resize(static_cast<std::size_t>(bytes));
+    DEVMODEW* const mode = setup.device_mode();
+    is_ready = DocumentPropertiesW(nullptr, printer, setup.printer.data(), mode, nullptr, DM_OUT_BUFFER) == IDOK;
+    mode->dmFields |= DM_ORIENTATION;
+    mode->dmOrientation = size.width > size.height ? DMORIENT_LANDSCAPE : DMORIENT_PORTRAIT;
+    // The driver brings the rest of its settings in line.
+    is_ready = is_ready && DocumentPropertiesW(nullptr, printer, setup.printer.data(), mode, mode,
+                                               DM_IN_BUFFER | DM_OUT_BUFFER) == IDOK;
+  }
+  ClosePrinter(printer);
+  setup.window = window;
+  return is_ready;
+}
+
+/// The image of a window, its frame included, as it would look with nothing in front of it.
+class Picture {
+ public:
+  Picture(HWND window, Size size) : size_(size) {
+    const HDC screen = GetDC(nullptr);
+    BITMAPINFO information{};
+    information.bmiHeader = {sizeof(BITMAPINFOHEADER), size.width, size.height, 1, 32, BI_RGB, 0, 0, 0, 0, 0};
+    bitmap_ = CreateDIBSection(screen, &information, DIB_RGB_COLORS, &bits_, nullptr, 0);
+    context_ = CreateCompatibleDC(screen);
+    if (bitmap_ != nullptr && context_ != nullptr) {
+      before_ = SelectObject(context_, bitmap_);
+      const HDC source = GetWindowDC(window);
+      if (PrintWindow(window, context_, 0) == FALSE)
+        BitBlt(context_, 0, 0, size.width, size.height, source, 0, 0, SRCCOPY);
+      ReleaseDC(window, source);
+    }
+    ReleaseDC(nullptr, screen);
+  }
+  Picture(const Picture&) = delete;
+  Picture& operator=(const Picture&) = delete;
+  ~Picture() {
+    if (before_ != nullptr) SelectObject(context_, before_);
+    DeleteDC(context_);
+    DeleteObject(bitmap_);
+  }
+
+  /// As large as the page allows without changing its shape, in the middle.
+  bool draw(HDC page) const {
+    if (before_ == nullptr) return false;
+    const int page_width = GetDeviceCaps(page, HORZRES);
+    const int page_height = GetDeviceCaps(page, VERTRES);
+    const auto dots_x = static_cast<double>(GetDeviceCaps(page, LOGPIXELSX));
+    const auto dots_y = static_cast<double>(GetDeviceCaps(page, LOGPIXELSY));
+    const double scale = std::min(page_width / (size_.width * dots_x), page_height / (size_.height * dots_y));
+    const auto width = static_cast<int>(size_.width * dots_x * scale);
+    const auto height = static_cast<int>(size_.height * dots_y * scale);
+    BITMAPINFO information{};
+    information.bmiHeader = {sizeof(BITMAPINFOHEADER), size_.width, size_.height, 1, 32, BI_RGB, 0, 0, 0, 0, 0};
+    GdiFlush();
+    SetStretchBltMode(page, HALFTONE);
+    return StretchDIBits(page, (page_width - width) / 2, (page_height - height) / 2, width, height, 0, 0, size_.width,
+                         size_.height, bits_, &information, DIB_RGB_COLORS, SRCCOPY) > 0;
+  }
+
+ private:
+  Size size_;
+  HBITMAP bitmap_ = nullptr;
+  void* bits_ = nullptr;
+  HDC context_ = nullptr;
+  HGDIOBJ before_ = nullptr;
+};
+
+bool print(HWND window, Setup& setup) {
+  Size size;
+  if (!size_of(window, size)) return false;
+  // Before the printer is started: what comes in front of the window meanwhile is not part of it.
+  const Picture picture(window, size);
+  const HDC page = CreateDCW(nullptr, setup.printer.data(), nullptr, setup.device_mode());
+  if (page == nullptr) return false;
+  wchar_t title[256] = L"";
+  GetWindowTextW(window, title, static_cast<int>(std::size(title)));
+  DOCINFOW document{sizeof document, title, nullptr, nullptr, 0};
+  bool is_printed = false;
+  if (StartDocW(page, &document) > 0) {
+    is_printed = StartPage(page) > 0 && picture.draw(page) && EndPage(page) > 0;
+    if (is_printed)
+      is_printed = EndDoc(page) > 0;
+    else
+      AbortDoc(page);
+  }
+  DeleteDC(page);
+  return is_printed;
+}
+
+template <class Work>
+std::int32_t without_exceptions(std::int32_t handle, Work work) noexcept {
+  const HWND window = reinterpret_cast<HWND>(static_cast<std::intptr_t>(handle));
+  try {
+    return work(window) ? 1 : 0;
+  } catch (...) {
+    return 0;
+  }
+}
+
+}  // namespace
+
+/// Prepares the default printer for a window: its paper lies as the window does.
+extern "C" std::int32_t WINAPI ConfigurePrinter(std::int32_t window) noexcept {
+  return without_exceptions(window, [](HWND handle) {
+    Setup setup;
+    const bool is_ready = prepare(handle, setup);
+    prepared = is_ready ? std::move(setup) : Setup{};
+    return is_ready;
+  });
+}
+
+/// Prints the image of a window on one page. A window that was not prepared is prepared first.
+extern "C" std::int32_t WINAPI SendToPrinter(std::int32_t window) noexcept {
+  return without_exceptions(window, [](HWND handle) {
+    Setup setup = std::exchange(prepared, {});
+    return (setup.window == handle || prepare(handle, setup)) && print(handle, setup);
+  });
+}

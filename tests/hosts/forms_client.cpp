@@ -1,0 +1,267 @@
+// A client with controls of its own: grids and combos that the library drives late-bound, and the boxes that it shows.
+#include <fstream>
+#include <sstream>
+
+#include "boxes.hpp"
+#include "table_object.hpp"
+
+using namespace talutil::hosts;
+
+namespace {
+
+constexpr LONG tick_column = 0;
+
+void tick(_ORVUtils* u, Value& grid, short on) { u->SelectGridRows(Long{tick_column}, grid, Short{on}); }
+
+void grids_are_driven(_ORVUtils* u) {
+  TableObject table(10000, 1);
+  // A variable of a script within a variable: the object is found behind both.
+  Value inner(&table);
+  Value outer(&inner.get());
+  Value outermost(&outer.get());
+  tick(u, outermost, 1);
+  check_equal(L"True", table.text(9999, 0), "the last row is ticked");
+  LONG count = 0;
+  u->CountGridSelectedRows(Long{tick_column}, outermost, &count);
+  check_equal(10000, count, "the ticked rows");
+  int most = 0;
+  for (const auto& [name, times] : table.look_ups) most = std::max(most, times);
+  check_equal(2, most, "a member is looked up once a call");
+  inner = Value();
+  check_equal(1U, table.references, "references that are left");
+}
+
+void errors_keep_their_source(_ORVUtils* u) {
+  TableObject table(3, 1);
+  table.before = [](DISPID, WORD, EXCEPINFO* exception) {
+    exception->scode = static_cast<HRESULT>(0x80041234U);
+    exception->bstrSource = SysAllocString(L"OtherGrid");
+    exception->bstrDescription = SysAllocString(L"The grid is busy.");
+    return DISP_E_EXCEPTION;
+  };
+  {
+    Value grid(&table);
+    check_equal(static_cast<HRESULT>(0x80041234U), u->SaveGridWidths(grid, Text(L"Grid"), Short{0}), "its number");
+    check_equal(L"OtherGrid: The grid is busy.", error_text(), "its source and its text");
+    check_equal(run_time_error(438), u->LoadWindowState(grid, Text(L"Form")), "a member that is missing");
+    Value nothing(static_cast<IDispatch*>(nullptr));
+    check_equal(run_time_error(91), u->SaveGridWidths(nothing, Text(L"Grid"), Short{0}), "an empty reference");
+    check_equal(run_time_error(424), u->SaveGridWidths(Value::null(), Text(L"Grid"), Short{0}), "Null");
+  }
+  check_equal(1U, table.references, "references after errors");
+}
+
+/// The host lets go of its variable, and calls the library again, in the middle of a call.
+void hosts_may_do_anything_in_between(_ORVUtils* u) {
+  TableObject table(50, 1);
+  Value grid(&table);
+  LONG pages = 0;
+  table.before = [&](DISPID member, WORD, EXCEPINFO*) {
+    if (member == TableObject::TextMatrix) {
+      grid = Value();
+      u->GetMaxPages(Long{4}, Long{14}, &pages);
+    }
+    return S_OK;
+  };
+  tick(u, grid, 1);
+  check_equal(L"True", table.text(49, 0), "the grid is kept for as long as the call");
+  check_equal(4, pages, "a call within a call");
+  check_equal(1U, table.references, "and no longer");
+}
+
+std::wstring words_of(const SeenBox& box) {
+  std::wstring words = box.title;
+  for (const WindowText& part : box.parts) {
+    std::wstring text = part.text;
+    std::erase(text, L'&');
+    if (!text.empty()) words += L'|' + text;
+  }
+  return words;
+}
+
+/// The boxes that a call shows, one after another, each answered with a button. What is typed goes into an input box.
+std::vector<std::wstring> boxes_of(const Desktop& desktop, const std::vector<std::pair<const wchar_t*, int>>& answers,
+                                   const std::function<void()>& call, const std::wstring& pictures = {}) {
+  std::vector<std::wstring> seen;
+  std::atomic<bool> is_over = false;
+  std::thread user([&] {
+    desktop.enter();
+    HWND last = nullptr;
+    for (const auto& [typed, button] : answers) {
+      HWND box = nullptr;
+      for (int i = 0; i < 200 && (box == nullptr || box == last); ++i) {
+        box = wait_for_box(is_over);
+        if (box == last) Sleep(20);
+      }
+      if (box == nullptr) return;
+      last = box;
+      seen.push_back(words_of(look_at_box(box)));
+      // Children have no caption of their own to read in another thread: by message.
+      if (HWND entry = FindWindowExW(box, nullptr, L"Edit", nullptr); entry != nullptr) {
+        SendMessageW(entry, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(typed));
+        if (!pictures.empty()) {
+          Sleep(300);
+          take_picture(pictures, L"input_box");
+        }
+      }
+      PostMessageW(box, WM_COMMAND, static_cast<WPARAM>(button), 0);
+      for (int i = 0; i < 100 && IsWindow(box) != FALSE; ++i) Sleep(20);
+    }
+  });
+  call();
+  is_over = true;
+  user.join();
+  return seen;
+}
+
+void confirmations_ask_twice(_ORVUtils* u, const Desktop& desktop, const std::wstring& pictures) {
+  const std::wstring question =
+      L"Confirm Delete|Type YES in uppercase characters to confirm deletion of this record|OK|Cancel";
+  VARIANT_BOOL answer = 7;
+  auto seen = boxes_of(
+      desktop, {{L"YES", IDOK}}, [&] { u->CheckDeleteRecord(&answer); }, pictures);
+  check_equal(VARIANT_TRUE, answer, "YES confirms");
+  if (check_equal(std::size_t{1}, seen.size(), "boxes")) check_equal(question, seen[0], "the input box");
+
+  seen = boxes_of(desktop, {{L"yes", IDOK}, {L"", IDYES}, {L"", IDCANCEL}, {L"", IDNO}},
+                  [&] { u->CheckModifyDatabase(Text(L"Rename"), &answer); });
+  check_equal(VARIANT_FALSE, answer, "no confirmation");
+  if (!check_equal(std::size_t{4}, seen.size(), "boxes until No")) return;
+  check_equal(L"Rename|Type YES in uppercase characters to confirm|OK|Cancel", seen[0], "the input box");
+  for (const wchar_t* part :
+       {L"Warning", L"You must type YES in uppercase characters.  Do you wish to try again?", L"|Yes", L"|No"}) {
+    check(seen[1].find(part) != std::wstring::npos, "the warning has " + narrow(part) + " and is " + narrow(seen[1]));
+  }
+}
+
+void failures_are_told(_ORVUtils* u, const Desktop& desktop) {
+  const auto text_of = [&](const std::function<void()>& call) {
+    const auto seen = boxes_of(desktop, {{L"", IDOK}}, call);
+    return seen.empty() ? std::wstring() : seen[0];
+  };
+  check_equal(L"forms_client|OK|File was not found.", text_of([&] { u->DrawShellExecuteError(Long{2}); }), "code 2");
+  check_equal(L"", text_of([&] { u->DrawShellExecuteError(Long{33}); }), "code 33");
+  Value nothing;
+  check_equal(L"forms_client|OK|ORVUtils SelectGridRows Object required", text_of([&] { tick(u, nothing, 1); }),
+              "an error while ticking");
+}
+
+/// Exports a table, the user saving to what the dialog proposes.
+std::string exported(_ORVUtils* u, const Desktop& desktop, const std::wstring& folder, Value& grid, int button) {
+  u->put_sReportsDir(*Text(folder + L"\\"));
+  const std::wstring path = folder + L"\\Sales\\Sales.txt";
+  std::wstring title;
+  const auto answer = [&](HWND dialog) {
+    title = describe(dialog).text;
+    Sleep(300);
+    PostMessageW(dialog, WM_COMMAND, static_cast<WPARAM>(button), 0);
+  };
+  act_and_watch(desktop, answer,
+                [&] { u->ExportGridData(grid, Short{0}, Number<VARIANT_BOOL>{VARIANT_TRUE}, Text(L"Sales")); });
+  check_equal(L"Save Data to File", title, "the title of the dialog");
+  std::ifstream file(path.c_str(), std::ios::binary);
+  if (!file) return "(no file)";
+  std::ostringstream bytes;
+  bytes << file.rdbuf();
+  file.close();
+  DeleteFileW(path.c_str());
+  return bytes.str();
+}
+
+void grids_are_exported(_ORVUtils* u, const Desktop& desktop, const std::wstring& folder) {
+  TableObject table(2, 2);
+  table.text(0, 0) = L"a,b";
+  table.text(1, 1) = L"\u20AC";
+  Value grid(&table);
+  check_equal(std::string("\"a,b\",\r\n,\x80\r\n"), exported(u, desktop, folder, grid, IDOK), "the file");
+  check_equal(std::string("(no file)"), exported(u, desktop, folder, grid, IDCANCEL), "after Cancel");
+}
+
+/// A form as PrintScreen wants it.
+class FormObject final : public NamelessObject {
+ public:
+  explicit FormObject(HWND window) : window_(window) {}
+  std::vector<DISPID> uses;
+  ULONG STDMETHODCALLTYPE AddRef() override { return 2; }
+  ULONG STDMETHODCALLTYPE Release() override { return 1; }
+  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR* name, UINT, LCID, DISPID* ids) override {
+    *ids = lstrcmpiW(*name, L"hwnd") == 0 ? 1 : lstrcmpiW(*name, L"Refresh") == 0 ? 2 : DISPID_UNKNOWN;
+    return *ids == DISPID_UNKNOWN ? DISP_E_UNKNOWNNAME : S_OK;
+  }
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
+                                   UINT*) override {
+    uses.push_back(id);
+    if (id == 2) return UpdateWindow(window_), S_OK;
+    V_VT(result) = VT_I4;
+    V_I4(result) = static_cast<LONG>(reinterpret_cast<std::intptr_t>(window_));
+    return S_OK;
+  }
+
+ private:
+  HWND window_;
+};
+
+void forms_are_printed(_ORVUtils* u, const std::wstring& folder) {
+  FormObject form(
+      CreateWindowW(L"Static", L"Form", WS_OVERLAPPEDWINDOW, 0, 0, 300, 200, nullptr, nullptr, nullptr, nullptr));
+  Value holder(&form);
+  const std::wstring beside = folder + L"\\printhelper.dll";
+  DeleteFileW(beside.c_str());
+  check_equal(run_time_error(53), u->PrintScreen(holder), "without the print helper");
+  check_equal(L"TALUtil.ORVUtils: File not found: printhelper.dll", error_text(), "its text");
+  check_equal(std::size_t{1}, form.uses.size(), "what the form was asked for");
+  const std::wstring helper = folder + L"\\printhelper\\printhelper.dll";
+  check(CopyFileW(helper.c_str(), beside.c_str(), FALSE) != FALSE, "the print helper beside TALUtil.dll");
+  form.uses.clear();
+  check_equal(S_OK, u->PrintScreen(holder), "with the print helper");
+  check(form.uses == std::vector<DISPID>{1, 2, 1}, "hwnd, Refresh, hwnd");
+  const HMODULE module = GetModuleHandleW(beside.c_str());
+  check(module != nullptr, "it is loaded from beside TALUtil.dll");
+  // What it answers where there is no printer, and for what is no window.
+  for (const char* name : {"ConfigurePrinter", "SendToPrinter"}) {
+    const auto print = reinterpret_cast<LONG(WINAPI*)(LONG)>(reinterpret_cast<void*>(GetProcAddress(module, name)));
+    if (check(print != nullptr, name)) check_equal(0, print(12345), std::string(name) + " of no window");
+  }
+  if (module != nullptr) FreeLibrary(module);
+  DeleteFileW(beside.c_str());
+}
+
+void tables_are_created() {
+  CLSID class_id;
+  Pointer<IDispatch> table;
+  require(CLSIDFromProgID(L"TALUtil.Grid", &class_id), "the class of TALUtil.Grid");
+  require(CoCreateInstance(class_id, nullptr, CLSCTX_INPROC_SERVER, IID_IDispatch, table.receive_untyped()), "a grid");
+  wchar_t name_text[] = L"Rows";
+  wchar_t* name = name_text;
+  DISPID rows = 0;
+  check_equal(S_OK, table->GetIDsOfNames(IID_NULL, &name, 1, 0, &rows), "Rows");
+  Value number(static_cast<LONG>(-1));
+  DISPID named = DISPID_PROPERTYPUT;
+  DISPPARAMS parameters{number, &named, 1, 1};
+  EXCEPINFO exception{};
+  check_equal(DISP_E_EXCEPTION,
+              table->Invoke(rows, IID_NULL, 0, DISPATCH_PROPERTYPUT, &parameters, nullptr, &exception, nullptr),
+              "a negative number of rows");
+  check_equal(run_time_error(5), exception.scode, "its error");
+  SysFreeString(exception.bstrDescription);
+  SysFreeString(exception.bstrSource);
+}
+
+}  // namespace
+
+int wmain(int, wchar_t** arguments) {
+  const Desktop desktop;
+  return run_checks([&] {
+    const Pointer<_ORVUtils> object = create_object();
+    _ORVUtils* const u = object.get();
+    const std::wstring folder = arguments[1];
+    grids_are_driven(u);
+    errors_keep_their_source(u);
+    hosts_may_do_anything_in_between(u);
+    confirmations_ask_twice(u, desktop, folder + L"\\..\\screenshots");
+    failures_are_told(u, desktop);
+    grids_are_exported(u, desktop, folder);
+    forms_are_printed(u, folder);
+    tables_are_created();
+  });
+}
