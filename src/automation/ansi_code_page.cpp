@@ -176,6 +176,12 @@ std::uint8_t ansi_code(char16_t unit) noexcept {
   return found != substitutes.end() && found->unit == unit ? found->byte : no_substitute;
 }
 
+bool is_ascii(TextView text) noexcept {
+  char16_t all = 0;
+  for (const char16_t unit : text) all |= unit;
+  return all < 0x80;
+}
+
 std::int16_t asc(TextView text) {
   if (text.empty()) raise(ErrorNumber::invalid_procedure_call);
   return ansi_code(text.front());
@@ -188,7 +194,11 @@ Text chr(std::int32_t code) {
 
 std::string to_ansi(TextView text) {
   std::string bytes(text.size(), '\0');
-  std::ranges::transform(text, bytes.begin(), [](char16_t unit) { return static_cast<char>(ansi_code(unit)); });
+  if (is_ascii(text)) {
+    std::ranges::transform(text, bytes.begin(), [](char16_t unit) { return static_cast<char>(unit); });
+  } else {
+    std::ranges::transform(text, bytes.begin(), [](char16_t unit) { return static_cast<char>(ansi_code(unit)); });
+  }
   return bytes;
 }
 

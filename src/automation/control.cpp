@@ -14,7 +14,34 @@ ObjectRef object_in(const Variant& holder) {
   return *object;
 }
 
+/// By way of invoke.
+class PlainRepeatedUse final : public RepeatedUse {
+ public:
+  PlainRepeatedUse(Object& object, std::int32_t member, Access access, std::span<const Variant> arguments)
+      : object_(object), member_(member), access_(access), arguments_(arguments.begin(), arguments.end()) {}
+
+  void set(std::size_t argument, std::int32_t value) override { arguments_.at(argument) = value; }
+  Variant run() override { return object_.invoke(member_, access_, arguments_); }
+  TextView run_text() override {
+    answer_ = run();
+    if (!answer_.is(Variant::Kind::text)) answer_ = answer_.to_text();
+    return *answer_.get_if<Text>();
+  }
+  bool run_truth() override { return bool(run().to_boolean()); }
+
+ private:
+  Object& object_;
+  std::int32_t member_;
+  Access access_;
+  std::vector<Variant> arguments_;
+  Variant answer_;
+};
+
 }  // namespace
+
+std::unique_ptr<RepeatedUse> Object::repeat(std::int32_t member, Access access, std::span<const Variant> arguments) {
+  return std::make_unique<PlainRepeatedUse>(*this, member, access, arguments);
+}
 
 Control::Control(const Variant& holder) : Control(object_in(holder)) {}
 
@@ -46,6 +73,14 @@ void Control::put(TextView member, std::initializer_list<Variant> indexes, Varia
   std::array<Variant, most_indexes + 1> arguments;
   *std::ranges::copy(indexes, arguments.begin()).out = std::move(value);
   object_->invoke(identifier_of(member), Access::put, std::span(arguments).first(indexes.size() + 1));
+}
+
+std::unique_ptr<RepeatedUse> Control::repeated_get(TextView member, std::initializer_list<Variant> indexes) const {
+  return object_->repeat(identifier_of(member), Access::get, {indexes.begin(), indexes.size()});
+}
+
+std::unique_ptr<RepeatedUse> Control::repeated_put(TextView member, std::initializer_list<Variant> arguments) const {
+  return object_->repeat(identifier_of(member), Access::put, {arguments.begin(), arguments.size()});
 }
 
 void Control::put(std::int32_t member, Variant value) const { object_->invoke(member, Access::put, {&value, 1}); }

@@ -27,6 +27,9 @@ using TextView = std::u16string_view;
 /// question mark, where there is none. Source: the platform's own conversion, see ansi_code_page.cpp.
 [[nodiscard]] std::uint8_t ansi_code(char16_t unit) noexcept;
 
+/// Whether every character is below 128.
+[[nodiscard]] bool is_ascii(TextView text) noexcept;
+
 /// The code of the first character, as Asc gives it. Raises 5 for an empty text.
 [[nodiscard]] std::int16_t asc(TextView text);
 

@@ -179,6 +179,13 @@ class Control {
   void put(std::int32_t member, Variant value) const;
   Variant call(TextView member, std::initializer_list<Variant> arguments = {}) const;
 
+  /// A get or a put that is made many times, with the numbers of its first indexes changing. The value of a put comes
+  /// last. The Control must outlive it.
+  [[nodiscard]] std::unique_ptr<RepeatedUse> repeated_get(TextView member,
+                                                          std::initializer_list<Variant> indexes) const;
+  [[nodiscard]] std::unique_ptr<RepeatedUse> repeated_put(TextView member,
+                                                          std::initializer_list<Variant> arguments) const;
+
   /// Whether the object has a member; it is looked up, not used.
   [[nodiscard]] bool answers(TextView member) const;
 

@@ -22,9 +22,9 @@ class ExceptionInformation {
   ExceptionInformation(const ExceptionInformation&) = delete;
   ExceptionInformation& operator=(const ExceptionInformation&) = delete;
   ~ExceptionInformation() {
-    SysFreeString(information_.bstrSource);
-    SysFreeString(information_.bstrDescription);
-    SysFreeString(information_.bstrHelpFile);
+    for (BSTR text : {information_.bstrSource, information_.bstrDescription, information_.bstrHelpFile}) {
+      if (text != nullptr) SysFreeString(text);
+    }
   }
 
   [[nodiscard]] EXCEPINFO* get() noexcept { return &information_; }
@@ -41,6 +41,16 @@ class ExceptionInformation {
   EXCEPINFO information_{};
 };
 
+bool owns_memory(const VARIANT& value) noexcept {
+  const VARTYPE type = V_VT(&value);
+  return type == VT_BSTR || type == VT_DISPATCH || type == VT_UNKNOWN || type > VT_DECIMAL;
+}
+
+/// The platform is not asked about numbers: it takes its time.
+void clear(VARIANT& value) noexcept {
+  if (owns_memory(value)) VariantClear(&value);
+}
+
 /// Arguments in the order that automation wants: the last one first. The few that members pass need no memory.
 class NativeArguments {
  public:
@@ -52,7 +62,7 @@ class NativeArguments {
   NativeArguments(const NativeArguments&) = delete;
   NativeArguments& operator=(const NativeArguments&) = delete;
   ~NativeArguments() {
-    for (UINT i = 0; i < size_; ++i) VariantClear(data() + i);
+    for (UINT i = 0; i < size_; ++i) clear(data()[i]);
   }
 
   [[nodiscard]] VARIANT* data() noexcept { return many_.empty() ? few_.data() : many_.data(); }
@@ -67,6 +77,73 @@ class NativeArguments {
   Few few_;
   std::vector<VARIANT> many_;
   UINT size_ = 0;
+};
+
+/// A use of a member of the host's object, for one time or for many.
+class DispatchUse final : public RepeatedUse {
+ public:
+  DispatchUse(Pointer<IDispatch> dispatch, std::int32_t member, Access access, std::span<const Variant> arguments)
+      : dispatch_(std::move(dispatch)), member_(member), flags_(flags_of(access)), arguments_(arguments) {}
+  DispatchUse(const DispatchUse&) = delete;
+  DispatchUse& operator=(const DispatchUse&) = delete;
+  ~DispatchUse() override { clear(result_); }
+
+  void set(std::size_t argument, std::int32_t value) override {
+    VARIANT& place = arguments_.data()[arguments_.size() - 1 - argument];
+    clear(place);
+    V_VT(&place) = VT_I4;
+    V_I4(&place) = value;
+  }
+
+  Variant run() override {
+    invoke();
+    return V_VT(&result_) == VT_EMPTY ? Variant() : variant_from(result_);
+  }
+
+  TextView run_text() override {
+    invoke();
+    if (V_VT(&result_) == VT_BSTR) return win32::view(V_BSTR(&result_), SysStringLen(V_BSTR(&result_)));
+    return converted_ = variant_from(result_).to_text();
+  }
+
+  bool run_truth() override {
+    invoke();
+    if (V_VT(&result_) == VT_BOOL) return V_BOOL(&result_) != VARIANT_FALSE;
+    return bool(variant_from(result_).to_boolean());
+  }
+
+ private:
+  static WORD flags_of(Access access) noexcept {
+    switch (access) {
+      case Access::put:
+        return DISPATCH_PROPERTYPUT;
+      case Access::get:
+        return DISPATCH_PROPERTYGET;
+      case Access::call:
+        break;
+    }
+    return DISPATCH_METHOD;
+  }
+
+  void invoke() {
+    clear(result_);
+    V_VT(&result_) = VT_EMPTY;
+    DISPID value = DISPID_PROPERTYPUT;
+    const bool is_put = flags_ == DISPATCH_PROPERTYPUT;
+    DISPPARAMS parameters{arguments_.data(), is_put ? &value : nullptr, arguments_.size(), is_put ? 1U : 0U};
+    ExceptionInformation exception;
+    const HRESULT status = dispatch_->Invoke(member_, IID_NULL, LOCALE_USER_DEFAULT, flags_, &parameters,
+                                             is_put ? nullptr : &result_, exception.get(), nullptr);
+    if (status == DISP_E_EXCEPTION) throw exception.error();
+    if (FAILED(status)) throw error_of(status, {});
+  }
+
+  Pointer<IDispatch> dispatch_;
+  std::int32_t member_;
+  WORD flags_;
+  NativeArguments arguments_;
+  VARIANT result_{};
+  Text converted_;
 };
 
 /// The host's object.
@@ -84,38 +161,16 @@ class DispatchObject final : public Object {
   }
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
-    NativeArguments natives(arguments);
+    return DispatchUse(dispatch_, member, access, arguments).run();
+  }
 
-    DISPID value = DISPID_PROPERTYPUT;
-    DISPPARAMS parameters{natives.data(), nullptr, natives.size(), 0};
-    if (access == Access::put) {
-      parameters.rgdispidNamedArgs = &value;
-      parameters.cNamedArgs = 1;
-    }
-    OwnedVariant result;
-    ExceptionInformation exception;
-    const HRESULT status = dispatch_->Invoke(member, IID_NULL, LOCALE_USER_DEFAULT, flags_of(access), &parameters,
-                                             access == Access::put ? nullptr : &result.get(), exception.get(), nullptr);
-    if (status == DISP_E_EXCEPTION) throw exception.error();
-    if (FAILED(status)) throw error_of(status, {});
-    return variant_from(result.get());
+  std::unique_ptr<RepeatedUse> repeat(std::int32_t member, Access access, std::span<const Variant> arguments) override {
+    return std::make_unique<DispatchUse>(dispatch_, member, access, arguments);
   }
 
   [[nodiscard]] const Pointer<IDispatch>& dispatch() const noexcept { return dispatch_; }
 
  private:
-  static WORD flags_of(Access access) noexcept {
-    switch (access) {
-      case Access::put:
-        return DISPATCH_PROPERTYPUT;
-      case Access::get:
-        return DISPATCH_PROPERTYGET;
-      case Access::call:
-        break;
-    }
-    return DISPATCH_METHOD;
-  }
-
   Pointer<IDispatch> dispatch_;
 };
 

@@ -49,10 +49,9 @@ Text delimited_cell(TextView text, std::size_t& at, char16_t separator) {
 }  // namespace
 
 bool TableFile::fits_code_page(TextView text) noexcept {
-  return std::ranges::all_of(text, [](char16_t unit) {
-    // The code page gives what has no place in it the nearest character, or a question mark.
-    return unit < 0x80 || chr(ansi_code(unit)).front() == unit;
-  });
+  // The code page gives what has no place in it the nearest character, or a question mark.
+  return is_ascii(text) ||
+         std::ranges::all_of(text, [](char16_t unit) { return chr(ansi_code(unit)).front() == unit; });
 }
 
 TableFile::TableFile(Files& files, const Text& path, bool is_wide)
@@ -90,9 +89,9 @@ Text read_table_file(Files& files, const Text& path) {
 }
 
 void append_delimited(Text& line, TextView cell, char16_t separator) {
-  const bool is_plain = std::ranges::none_of(
-      cell, [separator](char16_t unit) { return unit == separator || unit == u'"' || is_line_break(unit); });
-  if (is_plain) {
+  bool is_special = false;
+  for (const char16_t unit : cell) is_special |= unit == separator || unit == u'"' || is_line_break(unit);
+  if (!is_special) {
     line += cell;
     return;
   }

@@ -1,6 +1,7 @@
 #include "controls/grid.hpp"
 
 #include <algorithm>
+#include <limits>
 
 #include "automation/checked.hpp"
 #include "controls/delimited_text.hpp"
@@ -8,8 +9,6 @@
 namespace talutil {
 
 namespace {
-
-constexpr Text::size_type length_units = 2;
 
 std::size_t checked_size(std::int32_t size, std::int32_t most) {
   if (size < 0) raise(ErrorNumber::invalid_procedure_call);
@@ -41,33 +40,47 @@ bool is_true(TextView text) {
 
 }  // namespace
 
-void CellText::set(TextView text) {
-  if (text.empty()) return units_.reset();
-  auto units = std::make_unique_for_overwrite<char16_t[]>(length_units + text.size());
-  units[0] = static_cast<char16_t>(text.size() & 0xFFFF);
-  units[1] = static_cast<char16_t>(text.size() >> 16);
-  std::ranges::copy(text, units.get() + length_units);
-  units_ = std::move(units);
+TextView RowText::cell(std::size_t column) const noexcept {
+  if (column >= cells_.size()) return {};
+  return TextView(units_).substr(cells_[column].start, cells_[column].length);
 }
 
-TextView CellText::view() const noexcept {
-  if (!units_) return {};
-  return {units_.get() + length_units, units_[0] | static_cast<std::size_t>(units_[1]) << 16};
-}
-
-TextView Grid::cell(std::size_t row, std::size_t column) const noexcept {
-  const std::vector<CellText>& cells = rows_[row].cells;
-  return column < cells.size() ? cells[column].view() : TextView();
-}
-
-void Grid::fill(TableRow& row, std::size_t column, TextView text) const {
-  if (column >= row.cells.size()) {
+void RowText::set(std::size_t column, TextView text, std::size_t columns) {
+  if (column >= cells_.size()) {
     if (text.empty()) return;
-    // The whole row at once: it is mostly filled from its beginning to its end.
-    row.cells.reserve(columns_.size());
-    row.cells.resize(column + 1);
+    cells_.reserve(columns);
+    cells_.resize(column + 1);
   }
-  row.cells[column].set(text);
+  Place& place = cells_[column];
+  if (text.size() <= place.length) {
+    std::ranges::copy(text, units_.begin() + place.start);
+    unused_ += place.length - static_cast<std::uint32_t>(text.size());
+    place.length = static_cast<std::uint32_t>(text.size());
+  } else {
+    if (text.size() > std::numeric_limits<std::uint32_t>::max() - units_.size()) raise(ErrorNumber::out_of_memory);
+    const auto start = static_cast<std::uint32_t>(units_.size());
+    units_ += text;
+    unused_ += place.length;
+    place = {start, static_cast<std::uint32_t>(text.size())};
+  }
+  if (unused_ > units_.size() / 2) tidy();
+}
+
+void RowText::keep(std::size_t columns) {
+  if (columns >= cells_.size()) return;
+  cells_.resize(columns);
+  tidy();
+}
+
+void RowText::tidy() {
+  Text units;
+  for (Place& place : cells_) {
+    const TextView text = TextView(units_).substr(place.start, place.length);
+    place.start = static_cast<std::uint32_t>(units.size());
+    units += text;
+  }
+  units_ = std::move(units);
+  unused_ = 0;
 }
 
 void Grid::keep_selection_inside() noexcept {
@@ -84,7 +97,7 @@ void Grid::put_Rows(std::int32_t rows) {
 void Grid::put_Cols(std::int32_t columns) {
   const std::size_t size = checked_size(columns, most_columns);
   if (size < columns_.size()) {
-    for (TableRow& row : rows_) row.cells.resize(std::min(row.cells.size(), size));
+    for (TableRow& row : rows_) row.text.keep(size);
   }
   columns_.resize(size);
   fixed_columns_ = std::min(fixed_columns_, columns);
@@ -95,11 +108,11 @@ void Grid::put_FixedRows(std::int32_t rows) { fixed_rows_ = checked_fixed(rows, 
 void Grid::put_FixedCols(std::int32_t columns) { fixed_columns_ = checked_fixed(columns, Cols()); }
 
 Text Grid::TextMatrix(std::int32_t row, std::int32_t column) const {
-  return Text(cell(index_in(rows_, row), index_in(columns_, column)));
+  return Text(rows_[index_in(rows_, row)].text.cell(index_in(columns_, column)));
 }
 
-void Grid::put_TextMatrix(std::int32_t row, std::int32_t column, const Text& value) {
-  fill(rows_[index_in(rows_, row)], index_in(columns_, column), value);
+void Grid::put_cell(std::int32_t row, std::int32_t column, TextView text) {
+  rows_[index_in(rows_, row)].text.set(index_in(columns_, column), text, columns_.size());
 }
 
 Variant Grid::Cell(std::int16_t setting, std::int32_t row, std::int32_t column) const {
@@ -128,7 +141,7 @@ void Grid::put_RowSel(std::int32_t row) {
 }
 
 void Grid::Clear() {
-  for (TableRow& row : rows_) row.cells.clear();
+  for (TableRow& row : rows_) row.text = {};
 }
 
 void Grid::AddItem(const Text& item, std::int32_t index) {
@@ -139,7 +152,7 @@ void Grid::AddItem(const Text& item, std::int32_t index) {
   std::size_t start = 0;
   for (std::size_t column = 0; column < columns_.size() && start <= cells.size(); ++column) {
     const std::size_t end = std::min(cells.find(u'\t', start), cells.size());
-    fill(row, column, cells.substr(start, end - start));
+    row.text.set(column, cells.substr(start, end - start), columns_.size());
     start = end + 1;
   }
   rows_.insert(index == -1 ? rows_.end() : rows_.begin() + index, std::move(row));
@@ -158,8 +171,8 @@ void Grid::SaveGrid(const Text& file, std::int16_t format_code, Boolean fixed_ce
   std::vector<std::size_t> widths(columns_.size());
   bool is_wide = false;
   for (std::size_t r = first_row; r < rows_.size(); ++r) {
-    for (std::size_t c = first_column; c < rows_[r].cells.size(); ++c) {
-      const TextView text = cell(r, c);
+    for (std::size_t c = first_column; c < columns_.size(); ++c) {
+      const TextView text = rows_[r].text.cell(c);
       is_wide = is_wide || !TableFile::fits_code_page(text);
       widths[c] = std::max(widths[c], text.size());
     }
@@ -170,7 +183,7 @@ void Grid::SaveGrid(const Text& file, std::int16_t format_code, Boolean fixed_ce
   for (std::size_t r = first_row; r < rows_.size(); ++r) {
     line.clear();
     for (std::size_t c = first_column; c < columns_.size(); ++c) {
-      const TextView text = cell(r, c);
+      const TextView text = rows_[r].text.cell(c);
       if (format == Format::fixed_text) {
         line += text;
         std::replace_if(
@@ -203,7 +216,9 @@ void Grid::LoadGrid(const Text& file, std::int16_t format_code, Boolean fixed_ce
   put_Rows(static_cast<std::int32_t>(first_row));
   put_Rows(static_cast<std::int32_t>(first_row + rows.size()));
   for (std::size_t r = 0; r < rows.size(); ++r) {
-    for (std::size_t c = 0; c < rows[r].size(); ++c) fill(rows_[first_row + r], first_column + c, rows[r][c]);
+    for (std::size_t c = 0; c < rows[r].size(); ++c) {
+      rows_[first_row + r].text.set(first_column + c, rows[r][c], columns);
+    }
   }
 }
 

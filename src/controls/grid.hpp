@@ -7,14 +7,30 @@
 
 namespace talutil {
 
-/// The text of a cell in little room: one pointer, and nothing more while it is empty.
-class CellText {
+/// The texts of a row in little room: one after another, each cell knowing where its own lies. Cells beyond the last
+/// one that was ever filled take none.
+class RowText {
  public:
-  void set(TextView text);
-  [[nodiscard]] TextView view() const noexcept;
+  [[nodiscard]] TextView cell(std::size_t column) const noexcept;
+
+  /// @param columns how many cells the row will have, most likely
+  void set(std::size_t column, TextView text, std::size_t columns);
+
+  /// Cuts the row off behind some cells.
+  void keep(std::size_t columns);
 
  private:
-  std::unique_ptr<char16_t[]> units_;  ///< The length in two units, low one first, then the text.
+  struct Place {
+    std::uint32_t start = 0;
+    std::uint32_t length = 0;
+  };
+
+  /// Leaves out what cells have been replaced by others.
+  void tidy();
+
+  Text units_;
+  std::vector<Place> cells_;
+  std::uint32_t unused_ = 0;  ///< Units that belong to no cell any more.
 };
 
 /// The grid control: a table of texts with what a grid that is shown knows about its rows and columns. Rows and columns
@@ -53,7 +69,8 @@ class Grid final : public TableObject<Grid> {
 
   /// The text of a cell. A value is kept as its text.
   [[nodiscard]] Text TextMatrix(std::int32_t row, std::int32_t column) const;
-  void put_TextMatrix(std::int32_t row, std::int32_t column, const Text& value);
+  void put_TextMatrix(std::int32_t row, std::int32_t column, const Text& value) { put_cell(row, column, value); }
+  void put_cell(std::int32_t row, std::int32_t column, TextView text);
 
   /// A setting of a cell: 0 its text, 5 the state of its check box, which cells of a column of type 11 have: 1 ticked
   /// (a text "True", or a number that is not 0), 2 not ticked, 0 none. Raises 5 for another setting or state.
@@ -105,7 +122,7 @@ class Grid final : public TableObject<Grid> {
   };
 
   struct TableRow {
-    std::vector<CellText> cells;  ///< Up to the last one that was ever filled.
+    RowText text;
     bool is_hidden = false;
   };
 
@@ -117,8 +134,6 @@ class Grid final : public TableObject<Grid> {
   }
   [[nodiscard]] Column& at(std::int32_t column) { return columns_[index_in(columns_, column)]; }
   [[nodiscard]] const Column& at(std::int32_t column) const { return columns_[index_in(columns_, column)]; }
-  [[nodiscard]] TextView cell(std::size_t row, std::size_t column) const noexcept;
-  void fill(TableRow& row, std::size_t column, TextView text) const;
   void keep_selection_inside() noexcept;
 
   Files& files_;

@@ -3,10 +3,12 @@
 #include <algorithm>
 
 #include "automation/checked.hpp"
+#include "controls/grid.hpp"
 
 namespace talutil {
 
-GridExport::GridExport(const Control& grid, const Control& table) : grid_(grid), table_(table) {
+GridExport::GridExport(const Control& grid, const Control& table)
+    : grid_(grid), table_(table), own_table_(dynamic_cast<Grid*>(table.object().get())) {
   table_.put(u"Rows", std::int32_t{0});
   table_.put(u"Cols", std::int32_t{0});
   const auto columns = grid_.get<std::int32_t>(u"Cols");
@@ -27,15 +29,35 @@ void GridExport::copy_selected_rows() {
 }
 
 void GridExport::copy_rows(std::int32_t first, std::int32_t last) {
+  // Looked up by the first row that is copied, and not before: a grid may lack what an export never reads.
+  std::unique_ptr<RepeatedUse> row_hidden;
+  std::unique_ptr<RepeatedUse> column_hidden;
+  std::unique_ptr<RepeatedUse> text;
+  const auto use = [&](std::unique_ptr<RepeatedUse>& member, TextView name,
+                       std::initializer_list<Variant> indexes) -> RepeatedUse& {
+    if (!member) member = grid_.repeated_get(name, indexes);
+    return *member;
+  };
   for (std::int64_t at = first; at <= last; ++at) {
     const auto r = static_cast<std::int32_t>(at);
-    if (grid_.get<Boolean>(u"RowHidden", {r})) continue;
+    RepeatedUse& hidden_row = use(row_hidden, u"RowHidden", {r});
+    hidden_row.set(0, r);
+    if (hidden_row.run_truth()) continue;
     table_.put(u"Rows", copied_ + 1);
     const auto columns = grid_.get<std::int32_t>(u"Cols");
     std::int32_t k = 0;
     for (std::int32_t c = 0; c < columns; ++c) {
-      if (grid_.get<Boolean>(u"ColHidden", {c})) continue;
-      table_.put(u"TextMatrix", {copied_, k}, grid_.get(u"TextMatrix", {r, c}));
+      RepeatedUse& hidden_column = use(column_hidden, u"ColHidden", {c});
+      hidden_column.set(0, c);
+      if (hidden_column.run_truth()) continue;
+      RepeatedUse& cell = use(text, u"TextMatrix", {r, c});
+      cell.set(0, r);
+      cell.set(1, c);
+      const TextView shown = cell.run_text();
+      if (own_table_ != nullptr)
+        own_table_->put_cell(copied_, k, shown);
+      else
+        table_.put(u"TextMatrix", {copied_, k}, shown);
       ++k;
     }
     ++copied_;

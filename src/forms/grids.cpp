@@ -55,7 +55,11 @@ void ORVUtils::SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid,
     const auto first = grid.get<std::int32_t>(u"FixedRows");
     if (rows <= first || !grid.get(u"ColDataType", {lColumn}).equals_number(boolean_column)) return;
     if (iSwitch != 0 && iSwitch != 1) return;
-    for (std::int32_t r = first; r < rows; ++r) grid.put(u"TextMatrix", {r, lColumn}, Boolean(iSwitch == 1));
+    const auto tick = grid.repeated_put(u"TextMatrix", {first, lColumn, Boolean(iSwitch == 1)});
+    for (std::int32_t r = first; r < rows; ++r) {
+      tick->set(0, r);
+      tick->run();
+    }
   });
 }
 
@@ -66,8 +70,11 @@ std::int32_t ORVUtils::CountGridSelectedRows(const std::int32_t& lColumn, const 
     if (!grid.get(u"ColDataType", {lColumn}).equals_number(boolean_column)) return;
     const auto rows = grid.get<std::int32_t>(u"Rows");
     const auto first = grid.get<std::int32_t>(u"FixedRows");
+    if (rows <= first) return;
+    const auto state = grid.repeated_get(u"Cell", {check_box_setting, first, lColumn});
     for (std::int32_t r = first; r < rows; ++r) {
-      if (grid.get(u"Cell", {check_box_setting, r, lColumn}).equals_number(ticked)) ++count;
+      state->set(1, r);
+      if (state->run().equals_number(ticked)) ++count;
     }
   });
   return count;

@@ -379,6 +379,47 @@ Sub DateErrors
   CheckError "no record", 13, "Type mismatch"
 End Sub
 
+Sub Tables
+  Dim grid, zip, position
+  Set grid = CreateObject("TALUtil.Grid")
+  grid.Cols = 2
+  grid.AddItem "Job" & vbTab & "Done"
+  grid.FixedRows = 1
+  grid.AddItem "1001"
+  grid.AddItem "1002" & vbTab & "True"
+  grid.ColDataType(1) = 11
+  grid.TextMatrix(1, 0) = "a,b"
+  Check "a cell", "a,b", grid.TextMatrix(1, 0)
+  Check "one tick", CLng(1), u.CountGridSelectedRows(1, grid)
+  u.SelectGridRows 1, grid, 1
+  Check "all ticks", CLng(2), u.CountGridSelectedRows(1, grid)
+  u.LoadGridWidths grid, "No such grid", 1
+  Check "a width that was never saved", CLng(1000), grid.ColWidth(1)
+  grid.ColWidth(1) = 480.5
+  u.SaveGridWidths grid, "Members", 1
+  grid.ColWidth(1) = 0
+  u.LoadGridWidths grid, "Members", 1
+  Check "a width that was", CLng(480), grid.ColWidth(1)
+  Set zip = CreateObject("TALUtil.ZipControl")
+  Check "the level of the zip control", CLng(6), zip.CompressionLevel
+  Check "pages", CLng(4), u.GetMaxPages(4, 14)
+  Check "inside", True, u.GetMousePos(5, 5, 1, 1, 9, 9)
+  Set position = CreateObject("TALUtil.cControlPosition")
+  position.ControlName = "Members"
+  position.left = 120
+  position.Top = 480
+  position.SaveControlPosition
+  position.left = 0
+  position.GetControlPosition
+  Check "a place", CLng(120), position.left
+  On Error Resume Next
+  grid.TextMatrix(9, 0) = "x"
+  Check "no such row", CLng(9), CLng(Err.Number)
+  Err.Clear
+  u.LoadWindowState grid, "Members"
+  CheckError "no form", 438, "Object doesn't support this property or method"
+End Sub
+
 Class ValueHolder
   Public Default Property Get Value
     Value = "u"
@@ -395,6 +436,7 @@ ToolkitErrors
 ChecksAndCase
 Secrets
 Configuration
+Tables
 Files
 FileErrors
 WriteBack
