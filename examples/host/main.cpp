@@ -127,8 +127,9 @@ class Host {
 
   HWND child(const wchar_t* window_class, const wchar_t* text, DWORD style, int x, int y, int width, int height,
              int id = 0, DWORD extended = 0) const {
-    const HWND made = CreateWindowExW(extended, window_class, text, WS_CHILD | WS_VISIBLE | style, x, y, width, height,
-                                      window_, reinterpret_cast<HMENU>(static_cast<INT_PTR>(id)), nullptr, nullptr);
+    const HWND made =
+        CreateWindowExW(extended, window_class, text, WS_CHILD | WS_VISIBLE | WS_CLIPSIBLINGS | style, x, y, width,
+                        height, window_, reinterpret_cast<HMENU>(static_cast<INT_PTR>(id)), nullptr, nullptr);
     SendMessageW(made, WM_SETFONT, reinterpret_cast<WPARAM>(GetStockObject(DEFAULT_GUI_FONT)), TRUE);
     return made;
   }

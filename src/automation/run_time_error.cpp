@@ -37,6 +37,7 @@ std::string_view standard_description(std::int32_t number) noexcept {
     case ErrorNumber::argument_not_optional: return "Argument not optional";  // 449
     case ErrorNumber::wrong_argument_count: return "Wrong number of arguments or invalid property assignment";  // 450
     case ErrorNumber::missing_entry_point: return "Can't find DLL entry point";  // 453
+    case ErrorNumber::printer_error: return "Printer error";  // 482
   }
   // clang-format on
   return "Application-defined or object-defined error";

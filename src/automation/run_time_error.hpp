@@ -41,6 +41,7 @@ enum class ErrorNumber : std::int32_t {
   argument_not_optional = 449,
   wrong_argument_count = 450,
   missing_entry_point = 453,
+  printer_error = 482,
 };
 
 /// The standard text of a number; the text of an unknown number is "Application-defined or object-defined error".

@@ -99,6 +99,15 @@ struct ExportOptions {
 };
 void export_table(const ExportOptions& options);
 
+struct ReportOptions {
+  std::string file;  ///< A table (.csv), or a text.
+  std::string title;
+  std::string paper = "A4";
+  bool landscape = false;
+  std::string pdf;  ///< Empty for the file's name with .pdf.
+};
+void report(const ReportOptions& options);
+
 struct LogTailOptions {
   std::string path;  ///< The event log, or the folder it is in.
   std::int64_t lines = 10;

@@ -25,6 +25,7 @@ struct Request {
   ZipOptions zip;
   UnzipOptions unzip;
   ExportOptions export_table;
+  ReportOptions report;
   LogTailOptions log_tail;
   std::function<void()> run;
 };
@@ -42,6 +43,18 @@ void add_export(CLI::App& app, Request& request) {
   command->add_option("--rows", options.rows, "The rows to write: 3-7; all if not given")->type_name("FIRST-LAST");
   command->add_option("FILE", options.output, "The file to write, comma text")->required();
   command->callback([&] { request.run = [&] { export_table(options); }; });
+}
+
+void add_report(CLI::App& app, Request& request) {
+  ReportOptions& options = request.report;
+  auto* const command = app.add_subcommand("report", "Lay a table or a text out on pages and write them as PDF");
+  command->add_option("FILE", options.file, "A table of comma text (.csv, its first line the headings) or a text")
+      ->required();
+  command->add_option("--title", options.title, "The header of every page; the file's name if not given");
+  command->add_option("--paper", options.paper, "A4 or A3")->check(CLI::IsMember({"A4", "A3"}));
+  command->add_flag("--landscape", options.landscape, "Lay the paper across");
+  command->add_option("--pdf", options.pdf, "The file to write; FILE with .pdf if not given");
+  command->callback([&] { request.run = [&] { report(options); }; });
 }
 
 void add_list(CLI::App& app, Request& request) {
@@ -245,6 +258,7 @@ int run(std::vector<std::string> words) {
   add_config(app, request);
   add_archives(app, request);
   add_export(app, request);
+  add_report(app, request);
   add_log(app, request);
   add_printers(app, request);
   if (!words.empty() && !words.front().starts_with('-')) check_subcommand(app, words.front());

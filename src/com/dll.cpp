@@ -23,6 +23,7 @@
 #include "platform/win32/win32_guids.hpp"
 #include "platform/win32/win32_input_boxes.hpp"
 #include "platform/win32/win32_platform.hpp"
+#include "platform/win32/win32_printers.hpp"
 #include "platform/win32/win32_registry.hpp"
 #include "platform/win32/win32_settings.hpp"
 #include "platform/win32/win32_time_conversions.hpp"
@@ -55,10 +56,13 @@ struct LoadedLibrary {
   win32::Win32FileDialogs file_dialogs;
   win32::Win32Drawing drawing;
   win32::Win32WindowPrinting window_printing;
-  Library library{Platform{message_boxes, screen,        computer,     clock,          form_windows,   control_makers,
-                           message_pump,  random_source, cryptography, profiles,       settings_store, time_conversions,
-                           files,         folder_picker, guids,        folders,        input_boxes,    registry,
-                           network,       file_dialogs,  drawing,      window_printing}};
+  win32::Win32FontFiles font_files;
+  win32::Win32Printers printers;
+  Library library{Platform{message_boxes,  screen,           computer,      clock,         form_windows,
+                           control_makers, message_pump,     random_source, cryptography,  profiles,
+                           settings_store, time_conversions, files,         folder_picker, guids,
+                           folders,        input_boxes,      registry,      network,       file_dialogs,
+                           drawing,        window_printing,  font_files,    printers}};
 };
 
 struct Module {

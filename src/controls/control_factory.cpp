@@ -8,6 +8,7 @@
 #include "controls/name_case_converter.hpp"
 #include "controls/system_information.hpp"
 #include "controls/zip_controls.hpp"
+#include "preview/print_control.hpp"
 
 namespace talutil {
 
@@ -30,6 +31,8 @@ ControlFactory::ControlFactory(const Platform& platform)
           {Text(NameCaseConverter::class_name), &make<NameCaseConverter>},
           {u"DUZACTXLibCtl.duzactxctrl", &make<UnzipControl>},
           {u"DZACTXLibCtl.dzactxctrl", &make<ZipControl>},
+          {u"VSPrinter8LibCtl.VSPrinter", &make<PrintControl>},
+          {u"VSPDF8LibCtl.VSPDF8", &make<PdfExport>},
       } {}
 
 void ControlFactory::register_maker(TextView class_name, Maker maker) { makers_[Text(class_name)] = maker; }

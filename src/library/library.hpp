@@ -12,6 +12,7 @@ namespace talutil {
 
 class ControlFactory;
 class FrmComponents;
+class FrmPrintPreview;
 
 /// One loaded library: the shared settings, the platform and the components window. The DLL has exactly one.
 class Library {
@@ -32,6 +33,9 @@ class Library {
   [[nodiscard]] FrmComponents& components() noexcept { return *components_; }
   [[nodiscard]] ControlFactory& controls() noexcept { return *controls_; }
 
+  /// The preview window, made when it is first asked for.
+  [[nodiscard]] FrmPrintPreview& preview();
+
   /// The user's separators as they were at start-up, with the current year of the clock.
   [[nodiscard]] Locale locale() const;
 
@@ -43,6 +47,7 @@ class Library {
   Locale locale_;
   std::unique_ptr<ControlFactory> controls_;
   std::unique_ptr<FrmComponents> components_;
+  std::unique_ptr<FrmPrintPreview> preview_;
 };
 
 }  // namespace talutil

@@ -3,6 +3,7 @@
 #include "infoforms/frm_components.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
+#include "preview/frm_print_preview.hpp"
 
 namespace talutil {
 
@@ -18,6 +19,11 @@ void Library::start() {
   components_->load();
   settings_.ScreenTwipsPerPixelX = round_to<std::int32_t>(platform_.screen.twips_per_pixel_x());
   settings_.ScreenTwipsPerPixelY = round_to<std::int32_t>(platform_.screen.twips_per_pixel_y());
+}
+
+FrmPrintPreview& Library::preview() {
+  if (!preview_) preview_ = std::make_unique<FrmPrintPreview>(*this);
+  return *preview_;
 }
 
 Locale Library::locale() const {

@@ -14,16 +14,6 @@ namespace {
 
 void ORVUtils::ShowShortCutKeys() { not_built(); }
 void ORVUtils::ShowCmdLineHelp() { not_built(); }
-void ORVUtils::GridPrintPreview(const std::int16_t&, const std::int16_t&, const Text&, const Text&, const Variant&,
-                                const Variant&, const Variant&, const Text&) {
-  not_built();
-}
-void ORVUtils::TextBoxPrintPreview(const std::int16_t&, const std::int16_t&, const Text&, const Text&, const Variant&) {
-  not_built();
-}
-void ORVUtils::ListBoxPrintPreview(const std::int16_t&, const std::int16_t&, const Text&, const Text&, const Variant&) {
-  not_built();
-}
 void ORVUtils::ShowSysInfo() { not_built(); }
 Text ORVUtils::MyInputBox(const Text&, const Text&, const Boolean&, const Boolean&, const Boolean&, const Boolean&,
                           const std::int32_t&) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <vector>
 
 #include "automation/text.hpp"
 
@@ -15,6 +16,13 @@ struct PixelRectangle {
   friend bool operator==(const PixelRectangle&, const PixelRectangle&) = default;
 };
 
+/// The image of a window.
+struct WindowImage {
+  std::int32_t width = 0;  ///< In pixels, as the height.
+  std::int32_t height = 0;
+  std::vector<std::uint8_t> pixels;  ///< Red, green, blue, row by row from the top.
+};
+
 /// Drawing on what the platform draws on.
 class Drawing {
  public:
@@ -25,6 +33,9 @@ class Drawing {
   /// words. Raises 5 for a device context that is none, 445 where there are none.
   virtual void draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text, std::int32_t colour,
                          bool breaks_words) = 0;
+
+  /// A window as it looks. Raises 5 for what is no window, 445 where there are none.
+  [[nodiscard]] virtual WindowImage image_of(std::intptr_t window) = 0;
 };
 
 /// The printing of windows, which a library of its own does: printhelper.dll, beside the program or beside this

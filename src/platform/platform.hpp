@@ -13,9 +13,11 @@
 #include "platform/files.hpp"
 #include "platform/folder_picker.hpp"
 #include "platform/folders.hpp"
+#include "platform/font_files.hpp"
 #include "platform/guids.hpp"
 #include "platform/input_boxes.hpp"
 #include "platform/network.hpp"
+#include "platform/printers.hpp"
 #include "platform/registry.hpp"
 #include "platform/settings.hpp"
 #include "platform/time_conversions.hpp"
@@ -75,10 +77,18 @@ class HiddenWindow {
   [[nodiscard]] virtual std::intptr_t handle() const noexcept = 0;
 };
 
+class PreviewEvents;
+class PreviewView;
+class PrintControl;
+
 class FormWindows {
  public:
   virtual ~FormWindows() = default;
   [[nodiscard]] virtual std::unique_ptr<HiddenWindow> make_hidden(TextView caption) = 0;
+
+  /// The preview window, which shows the pages of a print control; null for another maker's, which shows them itself.
+  /// Both outlive the view.
+  [[nodiscard]] virtual std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) = 0;
 };
 
 /// The messages that wait for the host's windows.
@@ -126,6 +136,8 @@ struct Platform {
   FileDialogs& file_dialogs;
   Drawing& drawing;
   WindowPrinting& window_printing;
+  FontFiles& font_files;
+  Printers& printers;
 };
 
 }  // namespace talutil

@@ -129,7 +129,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, export, log, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, idl, reference' lst
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
 # ---- list, help
@@ -221,6 +221,11 @@ verdict 'the exported rows' $'Anne,"Cork, IE"\r\nBob,Kyle\r' "$(cat shown.txt)"
 expect 'export everything' 0 '' export --from table.csv all.txt
 cmp table.csv all.txt
 verdict 'the whole table' 0 $?
+expect 'report' 0 '' report table.csv --title 'Sales €' --landscape --pdf sales.pdf
+verdict 'the words of the report' "Anne 1 Cork, IE" "$(pdftotext -layout sales.pdf - | grep Anne | tr -s ' ' | sed 's/^ //')"
+expect 'report: a text' 0 '' report shown.txt
+expect_part 'report: a missing file' 1 'none.txt' report none.txt
+expect 'report over its own file' 2 'talutil: sales.pdf: give --pdf another name' report sales.pdf
 expect 'export: no such column' 2 'talutil: --hide: there is no column 4; table.csv has columns 1 to 3' export --from table.csv --hide 1,4 x.txt
 expect 'export: no such row' 2 'talutil: --rows: there is no row 4; table.csv has rows 0 to 3' export --from table.csv --rows 2-4 x.txt
 expect 'export: no number' 2 'talutil: --rows: "a" is not a number' export --from table.csv --rows a x.txt

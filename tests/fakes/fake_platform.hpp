@@ -12,7 +12,9 @@
 #include "automation/run_time_error.hpp"
 #include "library/library.hpp"
 #include "platform/platform.hpp"
+#include "preview/page_model.hpp"
 #include "tests/fakes/fake_files.hpp"
+#include "tests/fakes/fake_preview.hpp"
 #include "tests/fakes/fake_registry.hpp"
 #include "tests/fakes/fake_settings.hpp"
 
@@ -33,6 +35,8 @@ struct FakePlatform : MessageBoxes,
                       FileDialogs,
                       Drawing,
                       WindowPrinting,
+                      FontFiles,
+                      Printers,
                       CalendarTimeConversions {
   struct Message {
     Text text;
@@ -73,6 +77,10 @@ struct FakePlatform : MessageBoxes,
   std::vector<FileDialog> file_dialogs;
   std::vector<std::string> drawn;  ///< What was drawn and printed, in words.
   std::int32_t pointer_resets = 0;
+  FakePreviewState preview;         ///< What the preview window shows, and what its user does.
+  FontFiles* font_files = nullptr;  ///< Where wide fonts come from.
+  std::vector<PrintSettings> print_jobs;
+  bool prints = true;  ///< Whether the printer dialog is answered with OK.
 
   FakeRegistry registry;
   FakeNetwork network;
@@ -102,7 +110,7 @@ struct FakePlatform : MessageBoxes,
     Network& used_network = real_network == nullptr ? network : *real_network;
     return {*this,         *this,         *this,          *this,       *this,      *this,         *this, *this,
             *cryptography, profiles,      settings_store, conversions, used_files, folder_picker, guids, *used_folders,
-            *this,         used_registry, used_network,   *this,       *this,      *this};
+            *this,         used_registry, used_network,   *this,       *this,      *this,         *this, *this};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
@@ -159,6 +167,23 @@ struct FakePlatform : MessageBoxes,
   void configure_printer(std::int32_t window) override { drawn.push_back("configure " + std::to_string(window)); }
   void send_to_printer(std::int32_t window) override { drawn.push_back("send " + std::to_string(window)); }
   void reset_pointer() override { ++pointer_resets; }
+  WindowImage image_of(std::intptr_t window) override {
+    drawn.push_back("image of " + std::to_string(window));
+    return {2, 1, {255, 0, 0, 0, 0, 255}};
+  }
+
+  std::vector<std::uint8_t> wide_font(bool is_fixed_width) override {
+    return font_files == nullptr ? std::vector<std::uint8_t>() : font_files->wide_font(is_fixed_width);
+  }
+  bool print(const Document& document, const PrintSettings& settings) override {
+    print_jobs.push_back(settings);
+    if (document.pages.empty()) return false;
+    return prints;
+  }
+
+  std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) override {
+    return std::make_unique<FakePreview>(preview, events, pages);
+  }
 
   void fill(std::span<std::uint8_t> bytes) override {
     if (random_bytes) return random_bytes(bytes);

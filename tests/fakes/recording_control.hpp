@@ -57,7 +57,8 @@ class RecordingControl : public Object {
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
     const std::size_t indexes = arguments.size() - (access == Access::put ? 1 : 0);
-    std::string name = names_.at(static_cast<std::size_t>(member));
+    const auto index = static_cast<std::size_t>(member);
+    std::string name = index < names_.size() ? names_[index] : '#' + std::to_string(member);
     for (std::size_t i = 0; i < indexes; ++i) name += (i == 0 ? "(" : ", ") + shown(arguments[i]);
     if (indexes > 0) name += ')';
     std::string use = name;

@@ -8,6 +8,7 @@
 #include "platform/posix/posix_folders.hpp"
 #include "platform/posix/posix_guids.hpp"
 #include "platform/posix/posix_input_boxes.hpp"
+#include "platform/posix/posix_printers.hpp"
 #include "platform/posix/posix_registry.hpp"
 #include "platform/posix/posix_settings.hpp"
 #include "platform/posix/posix_time_conversions.hpp"
@@ -49,6 +50,9 @@ class PosixClock final : public Clock {
 class PosixFormWindows final : public FormWindows {
  public:
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
+
+  /// A window that has a size and a state but cannot be shown.
+  std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) override;
 };
 
 /// Controls of other makers exist on Windows only.
@@ -69,6 +73,13 @@ class PosixDrawing final : public Drawing {
  public:
   void draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text, std::int32_t colour,
                  bool breaks_words) override;
+  [[nodiscard]] WindowImage image_of(std::intptr_t window) override;
+};
+
+/// TrueType fonts of the system's folder.
+class PosixFontFiles final : public FontFiles {
+ public:
+  [[nodiscard]] std::vector<std::uint8_t> wide_font(bool is_fixed_width) override;
 };
 
 /// The library that prints windows exists on Windows only.
@@ -102,13 +113,15 @@ struct PosixPlatform {
   PosixFileDialogs file_dialogs;
   PosixDrawing drawing;
   PosixWindowPrinting window_printing;
+  PosixFontFiles font_files;
+  PosixPrinters printers{font_files};
   PosixTimeConversions time_conversions;
 
   [[nodiscard]] Platform platform() {
-    return {message_boxes, screen,        computer,     clock,          form_windows,   control_makers,
-            message_pump,  random_source, cryptography, profiles,       settings_store, time_conversions,
-            files,         folder_picker, guids,        folders,        input_boxes,    registry,
-            network,       file_dialogs,  drawing,      window_printing};
+    return {message_boxes, screen,        computer,     clock,           form_windows,   control_makers,
+            message_pump,  random_source, cryptography, profiles,        settings_store, time_conversions,
+            files,         folder_picker, guids,        folders,         input_boxes,    registry,
+            network,       file_dialogs,  drawing,      window_printing, font_files,     printers};
   }
 };
 

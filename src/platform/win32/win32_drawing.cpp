@@ -64,6 +64,35 @@ void Win32Drawing::draw_text(std::intptr_t device_context, const PixelRectangle&
   SetTextColor(context, before);
 }
 
+WindowImage Win32Drawing::image_of(std::intptr_t window) {
+  const HWND handle = reinterpret_cast<HWND>(window);  // NOLINT(performance-no-int-to-ptr): the seam keeps handles so.
+  RECT place{};
+  if (GetWindowRect(handle, &place) == FALSE) raise(ErrorNumber::invalid_procedure_call);
+  WindowImage image;
+  image.width = static_cast<std::int32_t>(place.right - place.left);
+  image.height = static_cast<std::int32_t>(place.bottom - place.top);
+  BITMAPINFO information{};
+  information.bmiHeader = {sizeof(BITMAPINFOHEADER), image.width, -image.height, 1, 32, BI_RGB, 0, 0, 0, 0, 0};
+  void* bits = nullptr;
+  const HDC context = CreateCompatibleDC(nullptr);
+  const HBITMAP bitmap = CreateDIBSection(context, &information, DIB_RGB_COLORS, &bits, nullptr, 0);
+  if (bitmap != nullptr) {
+    const HGDIOBJ before = SelectObject(context, bitmap);
+    PrintWindow(handle, context, 0);
+    GdiFlush();
+    const auto* pixel = static_cast<const std::uint8_t*>(bits);
+    const auto count = static_cast<std::size_t>(image.width) * static_cast<std::size_t>(image.height);
+    image.pixels.reserve(count * 3);
+    for (std::size_t i = 0; i < count; ++i, pixel += 4)
+      image.pixels.insert(image.pixels.end(), {pixel[2], pixel[1], pixel[0]});
+    SelectObject(context, before);
+    DeleteObject(bitmap);
+  }
+  DeleteDC(context);
+  if (image.pixels.empty()) raise(ErrorNumber::invalid_procedure_call);
+  return image;
+}
+
 void Win32WindowPrinting::configure_printer(std::int32_t window) { call_helper("ConfigurePrinter", window); }
 
 void Win32WindowPrinting::send_to_printer(std::int32_t window) { call_helper("SendToPrinter", window); }

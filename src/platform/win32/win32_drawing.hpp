@@ -8,6 +8,7 @@ class Win32Drawing final : public Drawing {
  public:
   void draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text, std::int32_t colour,
                  bool breaks_words) override;
+  [[nodiscard]] WindowImage image_of(std::intptr_t window) override;
 };
 
 class Win32WindowPrinting final : public WindowPrinting {

@@ -1,0 +1,77 @@
+#include <algorithm>
+#include <filesystem>
+
+#include "cli/commands.hpp"
+#include "cli/failure.hpp"
+#include "cli/files.hpp"
+#include "controls/grid.hpp"
+#include "platform/posix/posix_platform.hpp"
+#include "preview/print_control.hpp"
+
+namespace talutil::cli {
+
+namespace {
+
+constexpr std::int16_t comma_text = 3;
+
+/// A text that is UTF-8, or else in code page 1252, as the files of hosts are.
+Text text_of_file(const std::string& path) {
+  const std::string bytes = read_bytes(path);
+  Text text = from_utf8(bytes);
+  return text.find(u'\uFFFD') == Text::npos ? text : from_ansi(bytes);
+}
+
+/// Columns as wide as their longest text, to a limit.
+void fit_columns(Grid& grid) {
+  constexpr std::int32_t character = 100;  // Twips of the grid's letters, Courier of 8 points.
+  constexpr std::int32_t padding = 130;
+  constexpr std::int32_t widest = 5000;
+  for (std::int32_t c = 0; c < grid.Cols(); ++c) {
+    std::size_t longest = 3;
+    for (std::int32_t r = 0; r < grid.Rows(); ++r) longest = std::max(longest, grid.TextMatrix(r, c).size());
+    grid.put_ColWidth(c, std::min(widest, static_cast<std::int32_t>(longest) * character + padding));
+  }
+}
+
+void add_table(PrintControl& print, const Platform& platform, const std::string& path) {
+  const auto grid = std::make_shared<Grid>(platform);
+  grid->LoadGrid(utf8_text(path, "the file's name"), comma_text, Boolean(true));
+  if (grid->Rows() > 0) grid->put_FixedRows(1);
+  fit_columns(*grid);
+  print.RenderObject = ObjectRef(grid);
+  print.put_RenderControl(0);
+}
+
+}  // namespace
+
+void report(const ReportOptions& options) {
+  posix::PosixPlatform posix_platform;
+  const Platform platform = posix_platform.platform();
+  const std::filesystem::path source(options.file);
+  const std::string output =
+      options.pdf.empty() ? std::filesystem::path(source).replace_extension(".pdf").string() : options.pdf;
+  if (output == options.file) throw usage_failure(options.file + ": give --pdf another name");
+  const std::string title = options.title.empty() ? source.stem().string() : options.title;
+
+  const auto print = std::make_shared<PrintControl>(platform);
+  print->put_PaperSize(options.paper == "A3" ? 8 : 9);
+  print->put_Orientation(options.landscape ? 1 : 0);
+  print->Header = u"  " + utf8_text(title, "--title");
+  print->StartDoc();
+  try {
+    if (source.extension() == ".csv")
+      add_table(*print, platform, options.file);
+    else
+      print->put_Text(text_of_file(options.file));
+  } catch (const RunTimeError& error) {
+    throw run_time_failure(options.file + ": " + error_words(error));
+  }
+  print->EndDoc();
+  try {
+    PdfExport(platform).ConvertDocument(ObjectRef(print), utf8_text(output, "--pdf"));
+  } catch (const RunTimeError& error) {
+    throw run_time_failure(output + ": " + error_words(error));
+  }
+}
+
+}  // namespace talutil::cli

@@ -1,0 +1,28 @@
+#pragma once
+
+#include <cstdint>
+
+#include "automation/text.hpp"
+
+namespace talutil {
+
+struct Document;
+
+/// How a document is to be printed, by the codes of the platform's printing functions.
+struct PrintSettings {
+  Text title;  ///< The name of the print job.
+  std::int32_t paper_size = 9;
+  std::int32_t orientation = 0;  ///< 0 portrait, 1 landscape.
+  std::int32_t duplex = 0;       ///< 1 simplex, 2 vertical, 3 horizontal, 0 as the printer has it.
+  bool shows_dialog = false;
+};
+
+class Printers {
+ public:
+  virtual ~Printers() = default;
+
+  /// Prints a document. False when the dialog was cancelled. Raises 482 where there is no printer, or it fails.
+  virtual bool print(const Document& document, const PrintSettings& settings) = 0;
+};
+
+}  // namespace talutil

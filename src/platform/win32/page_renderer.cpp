@@ -1,0 +1,141 @@
+#include "platform/win32/page_renderer.hpp"
+
+#include <cmath>
+#include <map>
+
+#include "preview/font_metrics.hpp"
+
+namespace talutil::win32 {
+
+namespace {
+
+int rounded(double value) { return static_cast<int>(std::lround(value)); }
+
+/// The fonts of one page on one device.
+class Fonts {
+ public:
+  Fonts(HDC device, double scale) : device_(device), scale_(scale), before_(GetCurrentObject(device, OBJ_FONT)) {}
+  Fonts(const Fonts&) = delete;
+  Fonts& operator=(const Fonts&) = delete;
+  ~Fonts() {
+    SelectObject(device_, before_);
+    for (const auto& [key, font] : fonts_) DeleteObject(font);
+  }
+
+  void select(const FontStyle& style) {
+    static constexpr const wchar_t* names[] = {L"Courier New", L"Arial", L"Times New Roman"};
+    const Key key{style.family, style.is_bold, style.points};
+    HFONT& font = fonts_[key];
+    if (font == nullptr) {
+      constexpr double twips_per_point = 20;
+      font =
+          CreateFontW(-rounded(style.points * twips_per_point * scale_), 0, 0, 0, style.is_bold ? FW_BOLD : FW_NORMAL,
+                      FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_TT_PRECIS, CLIP_DEFAULT_PRECIS, CLEARTYPE_QUALITY,
+                      DEFAULT_PITCH, names[static_cast<std::size_t>(style.family)]);
+    }
+    SelectObject(device_, font);
+  }
+
+ private:
+  using Key = std::tuple<FontFamily, bool, float>;
+
+  HDC device_;
+  double scale_;
+  HGDIOBJ before_;
+  std::map<Key, HFONT> fonts_;
+};
+
+class Drawer {
+ public:
+  Drawer(HDC device, const PagePlacement& placement)
+      : device_(device), placement_(placement), fonts_(device, placement.scale_y) {
+    SetBkMode(device, TRANSPARENT);
+    SetTextAlign(device, TA_BASELINE | TA_LEFT);
+  }
+
+  void draw(const TextRun& run) {
+    fonts_.select(run.font);
+    SetTextColor(device_, run.colour);
+    const auto length = static_cast<int>(run.text.size());
+    // How far each character reaches by the device's font, brought to the width of the layout.
+    std::vector<int> ends(run.text.size());
+    SIZE natural{};
+    GetTextExtentExPointW(device_, wide(run.text), length, 0, nullptr, ends.data(), &natural);
+    const double stretch = natural.cx == 0 ? 1 : run.width * placement_.scale_x / natural.cx;
+    int before = 0;
+    for (int& end : ends) {
+      const int here = rounded(end * stretch);
+      end = here - before;
+      before = here;
+    }
+    ExtTextOutW(device_, x_of(run.left), y_of(run.top + baseline(run.font)), 0, nullptr, wide(run.text),
+                static_cast<UINT>(length), ends.data());
+  }
+
+  void draw(const Box& box) {
+    const RECT place = rectangle_of(box.place);
+    if (box.fill) {
+      const HBRUSH brush = CreateSolidBrush(*box.fill);
+      FillRect(device_, &place, brush);
+      DeleteObject(brush);
+    }
+    if (box.line_width == 0) return;
+    const HPEN pen =
+        CreatePen(PS_INSIDEFRAME, std::max(1, rounded(box.line_width * placement_.scale_y)), box.line_colour);
+    const HGDIOBJ pen_before = SelectObject(device_, pen);
+    const POINT corners[] = {{place.left, place.top},
+                             {place.right, place.top},
+                             {place.right, place.bottom},
+                             {place.left, place.bottom},
+                             {place.left, place.top}};
+    Polyline(device_, corners, box.place.height == 0 ? 2 : 5);
+    SelectObject(device_, pen_before);
+    DeleteObject(pen);
+  }
+
+  void draw(const Picture& picture) {
+    if (!picture.pixels) return;
+    // The device wants blue first and rows of a multiple of four bytes.
+    const std::size_t row_bytes = (static_cast<std::size_t>(picture.width) * 3 + 3) / 4 * 4;
+    std::vector<std::uint8_t> rows(row_bytes * static_cast<std::size_t>(picture.height));
+    const std::uint8_t* source = picture.pixels->data();
+    for (std::int32_t y = 0; y < picture.height; ++y) {
+      std::uint8_t* target = rows.data() + row_bytes * static_cast<std::size_t>(y);
+      for (std::int32_t x = 0; x < picture.width; ++x, source += 3, target += 3) {
+        target[0] = source[2];
+        target[1] = source[1];
+        target[2] = source[0];
+      }
+    }
+    BITMAPINFO information{};
+    information.bmiHeader = {sizeof(BITMAPINFOHEADER), picture.width, -picture.height, 1, 24, BI_RGB, 0, 0, 0, 0, 0};
+    const RECT place = rectangle_of(picture.place);
+    SetStretchBltMode(device_, HALFTONE);
+    StretchDIBits(device_, place.left, place.top, place.right - place.left, place.bottom - place.top, 0, 0,
+                  picture.width, picture.height, rows.data(), &information, DIB_RGB_COLORS, SRCCOPY);
+  }
+
+ private:
+  [[nodiscard]] int x_of(std::int32_t twips) const { return placement_.left + rounded(twips * placement_.scale_x); }
+  [[nodiscard]] int y_of(std::int32_t twips) const { return placement_.top + rounded(twips * placement_.scale_y); }
+  [[nodiscard]] RECT rectangle_of(const Rectangle& place) const {
+    return {x_of(place.left), y_of(place.top), x_of(place.left + place.width), y_of(place.top + place.height)};
+  }
+
+  HDC device_;
+  const PagePlacement& placement_;
+  Fonts fonts_;
+};
+
+}  // namespace
+
+void draw_page(HDC device, const Page& page, const PagePlacement& placement) {
+  const int saved = SaveDC(device);
+  {
+    Drawer drawer(device, placement);
+    for (const PageItem& item : page.items) std::visit([&](const auto& held) { drawer.draw(held); }, item);
+  }
+  RestoreDC(device, saved);
+}
+
+}  // namespace talutil::win32

@@ -1,0 +1,162 @@
+#include "platform/win32/win32_printers.hpp"
+
+#include <algorithm>
+
+#include "automation/run_time_error.hpp"
+#include "platform/win32/handle.hpp"
+#include "platform/win32/page_renderer.hpp"
+// After windows.h.
+#include <cderr.h>
+#include <commdlg.h>
+
+namespace talutil::win32 {
+
+namespace {
+
+constexpr double twips_per_inch = 1440;
+
+[[noreturn]] void raise_printer_error(const Text& what) {
+  throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::printer_error), u"Printer error: " + what);
+}
+
+/// The dialog's answer, with the memory and the device that it hands over.
+class PrintDialog {
+ public:
+  PrintDialog() {
+    native_.lStructSize = sizeof native_;
+    native_.hwndOwner = GetActiveWindow();
+    if (show_ == nullptr || last_error_ == nullptr) raise_printer_error(u"comdlg32.dll is missing");
+  }
+  PrintDialog(const PrintDialog&) = delete;
+  PrintDialog& operator=(const PrintDialog&) = delete;
+  ~PrintDialog() {
+    if (native_.hDC != nullptr) DeleteDC(native_.hDC);
+    if (native_.hDevMode != nullptr) GlobalFree(native_.hDevMode);
+    if (native_.hDevNames != nullptr) GlobalFree(native_.hDevNames);
+  }
+
+  /// Takes the default printer, set up as the document is. Raises 482 where there is none.
+  void prepare(const PrintSettings& settings) {
+    native_.Flags = PD_RETURNDEFAULT;
+    if (show_(&native_) == FALSE) raise_printer_error(u"no printer is installed");
+    auto* const mode = static_cast<DEVMODEW*>(native_.hDevMode == nullptr ? nullptr : GlobalLock(native_.hDevMode));
+    if (mode == nullptr) return;
+    mode->dmFields |= DM_ORIENTATION | DM_PAPERSIZE;
+    mode->dmOrientation = settings.orientation == 1 ? DMORIENT_LANDSCAPE : DMORIENT_PORTRAIT;
+    mode->dmPaperSize = static_cast<short>(settings.paper_size);
+    if (settings.duplex != 0) {
+      mode->dmFields |= DM_DUPLEX;
+      mode->dmDuplex = static_cast<short>(settings.duplex);
+    }
+    GlobalUnlock(native_.hDevMode);
+  }
+
+  /// Lets the user choose among the pages. False when the dialog is cancelled.
+  bool ask(std::size_t pages) {
+    native_.Flags = PD_ALLPAGES | PD_NOSELECTION | PD_RETURNDC | PD_USEDEVMODECOPIESANDCOLLATE;
+    native_.nMinPage = native_.nFromPage = 1;
+    native_.nMaxPage = native_.nToPage = static_cast<WORD>(std::min<std::size_t>(pages, 0xFFFF));
+    native_.nCopies = 1;
+    if (show_(&native_) != FALSE) return true;
+    if (last_error_() != 0) raise_printer_error(u"the printer dialog failed");
+    return false;
+  }
+
+  /// The device for printing without asking.
+  void open() {
+    auto* const names = static_cast<DEVNAMES*>(GlobalLock(native_.hDevNames));
+    auto* const mode = static_cast<DEVMODEW*>(native_.hDevMode == nullptr ? nullptr : GlobalLock(native_.hDevMode));
+    if (names != nullptr) {
+      const auto* const words = reinterpret_cast<const wchar_t*>(names);
+      native_.hDC = CreateDCW(words + names->wDriverOffset, words + names->wDeviceOffset, nullptr, mode);
+      GlobalUnlock(native_.hDevNames);
+    }
+    if (mode != nullptr) GlobalUnlock(native_.hDevMode);
+  }
+
+  [[nodiscard]] HDC device() const noexcept { return native_.hDC; }
+
+  /// The pages that were chosen, counted from 0, behind the last one.
+  [[nodiscard]] std::pair<std::size_t, std::size_t> range(std::size_t pages) const noexcept {
+    if ((native_.Flags & PD_PAGENUMS) == 0) return {0, pages};
+    const std::size_t first = std::max<std::size_t>(native_.nFromPage, 1) - 1;
+    return {std::min(first, pages), std::min<std::size_t>(std::max(native_.nToPage, native_.nFromPage), pages)};
+  }
+
+ private:
+  using Show = BOOL(WINAPI*)(PRINTDLGW*);
+  using LastError = DWORD(WINAPI*)();
+
+  PRINTDLGW native_{};
+  Show show_ = late_function<Show>(L"comdlg32.dll", "PrintDlgW");
+  LastError last_error_ = late_function<LastError>(L"comdlg32.dll", "CommDlgExtendedError");
+};
+
+/// One job of the spooler; taken back unless it is complete.
+class PrintJob {
+ public:
+  PrintJob(HDC device, const Text& title) : device_(device) {
+    DOCINFOW information{sizeof information, wide(title), nullptr, nullptr, 0};
+    if (StartDocW(device, &information) <= 0) raise_printer_error(u"the document could not be started");
+  }
+  PrintJob(const PrintJob&) = delete;
+  PrintJob& operator=(const PrintJob&) = delete;
+  ~PrintJob() {
+    if (!is_complete_) AbortDoc(device_);
+  }
+
+  void add(const Page& page) const {
+    if (StartPage(device_) <= 0) raise_printer_error(u"a page could not be started");
+    const double scale_x = GetDeviceCaps(device_, LOGPIXELSX) / twips_per_inch;
+    const double scale_y = GetDeviceCaps(device_, LOGPIXELSY) / twips_per_inch;
+    draw_page(device_, page,
+              {-GetDeviceCaps(device_, PHYSICALOFFSETX), -GetDeviceCaps(device_, PHYSICALOFFSETY), scale_x, scale_y});
+    if (EndPage(device_) <= 0) raise_printer_error(u"a page could not be printed");
+  }
+
+  void complete() {
+    if (EndDoc(device_) <= 0) raise_printer_error(u"the document could not be ended");
+    is_complete_ = true;
+  }
+
+ private:
+  HDC device_;
+  bool is_complete_ = false;
+};
+
+}  // namespace
+
+bool Win32Printers::print(const Document& document, const PrintSettings& settings) {
+  PrintDialog dialog;
+  dialog.prepare(settings);
+  if (!settings.shows_dialog)
+    dialog.open();
+  else if (!dialog.ask(document.pages.size()))
+    return false;
+  if (dialog.device() == nullptr) raise_printer_error(u"the printer does not answer");
+  PrintJob job(dialog.device(), settings.title);
+  const auto [first, end] = dialog.range(document.pages.size());
+  for (std::size_t page = first; page < end; ++page) job.add(document.pages[page]);
+  job.complete();
+  return true;
+}
+
+std::vector<std::uint8_t> Win32FontFiles::wide_font(bool is_fixed_width) {
+  std::vector<std::uint8_t> bytes;
+  const HDC context = CreateCompatibleDC(nullptr);
+  const HFONT font =
+      CreateFontW(-16, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_TT_ONLY_PRECIS,
+                  CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY, DEFAULT_PITCH, is_fixed_width ? L"Courier New" : L"Arial");
+  const HGDIOBJ before = SelectObject(context, font);
+  const DWORD size = GetFontData(context, 0, 0, nullptr, 0);
+  if (size != GDI_ERROR && size > 0) {
+    bytes.resize(size);
+    if (GetFontData(context, 0, 0, bytes.data(), size) != size) bytes.clear();
+  }
+  SelectObject(context, before);
+  DeleteObject(font);
+  DeleteDC(context);
+  return bytes;
+}
+
+}  // namespace talutil::win32

@@ -1,0 +1,58 @@
+#pragma once
+
+#include <array>
+#include <memory>
+#include <unordered_map>
+
+#include "platform/font_files.hpp"
+#include "preview/page_model.hpp"
+
+namespace talutil {
+
+/// The widths of characters, the same for every renderer: those of the standard fonts of PDF for code page 1252
+/// (source: the PDF library's own tables), those of an embedded font for all others.
+class FontMetrics {
+ public:
+  explicit FontMetrics(FontFiles& files);
+  FontMetrics(const FontMetrics&) = delete;
+  FontMetrics& operator=(const FontMetrics&) = delete;
+  ~FontMetrics();
+
+  /// The width of a character, in thousandths of the font's size.
+  [[nodiscard]] std::int32_t width(char16_t unit, const FontStyle& font);
+
+  /// The width of a text on one line, in twips.
+  [[nodiscard]] double width(TextView text, const FontStyle& font);
+
+  /// Whether a character is drawn in the other font.
+  [[nodiscard]] static bool is_wide(char16_t unit) noexcept;
+
+ private:
+  struct Library;
+
+  FontFiles& files_;
+  std::unique_ptr<Library> library_;
+  std::array<std::array<std::uint16_t, 256>, 6> widths_{};  ///< By code of the code page, for family and weight.
+  std::unordered_map<char16_t, std::int32_t> wide_widths_[2];
+};
+
+/// Twips of a width in thousandths of a font's size.
+[[nodiscard]] constexpr double to_twips(double thousandths, const FontStyle& font) noexcept {
+  constexpr double twips_per_point = 20;
+  return thousandths * font.points * twips_per_point / 1000;
+}
+
+/// From a line's top to the next one's.
+[[nodiscard]] constexpr std::int32_t line_height(const FontStyle& font) noexcept {
+  return static_cast<std::int32_t>(to_twips(1200, font));
+}
+
+/// From a line's top to the foot of its letters.
+[[nodiscard]] constexpr std::int32_t baseline(const FontStyle& font) noexcept {
+  return static_cast<std::int32_t>(to_twips(900, font));
+}
+
+/// The family that stands for a font's name: Courier for fixed widths, Times for those with serifs, else Helvetica.
+[[nodiscard]] FontFamily family_of(TextView font_name);
+
+}  // namespace talutil

@@ -1,0 +1,79 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <variant>
+#include <vector>
+
+#include "automation/text.hpp"
+
+/// Documents as pages: laid out once, then drawn on the screen, on a printer and into PDF by renderers that share
+/// nothing but this model. All lengths are twips (1/1440 inch) from the top left corner of the paper; colours are
+/// 0x00BBGGRR.
+namespace talutil {
+
+struct Rectangle {
+  std::int32_t left = 0;
+  std::int32_t top = 0;
+  std::int32_t width = 0;
+  std::int32_t height = 0;
+  friend bool operator==(const Rectangle&, const Rectangle&) = default;
+};
+
+enum class FontFamily : std::uint8_t { courier, helvetica, times };
+
+struct FontStyle {
+  FontFamily family = FontFamily::courier;
+  bool is_bold = false;
+  float points = 10;
+  friend bool operator==(const FontStyle&, const FontStyle&) = default;
+};
+
+/// Characters of one line that are drawn in one go.
+struct TextRun {
+  std::int32_t left = 0;
+  std::int32_t top = 0;  ///< Of the line, not of its letters.
+  std::int32_t width = 0;
+  FontStyle font;
+  bool is_wide = false;  ///< Characters beyond code page 1252, drawn in another font.
+  std::uint32_t colour = 0;
+  Text text;
+};
+
+/// A filled area, a frame, or both; without height or width a rule.
+struct Box {
+  Rectangle place;
+  std::optional<std::uint32_t> fill;
+  std::int32_t line_width = 0;  ///< 0 for no frame.
+  std::uint32_t line_colour = 0;
+};
+
+struct Picture {
+  Rectangle place;
+  std::int32_t width = 0;  ///< In pixels, as the height.
+  std::int32_t height = 0;
+  std::shared_ptr<const std::vector<std::uint8_t>> pixels;  ///< Red, green, blue, row by row from the top.
+};
+
+using PageItem = std::variant<TextRun, Box, Picture>;
+
+struct Page {
+  std::int32_t width = 0;
+  std::int32_t height = 0;
+  std::vector<PageItem> items;  ///< Later ones lie over earlier ones.
+};
+
+/// Where a section of a report begins.
+struct Bookmark {
+  Text title;
+  std::size_t page = 0;
+};
+
+struct Document {
+  Text title;
+  std::vector<Page> pages;
+  std::vector<Bookmark> bookmarks;
+};
+
+}  // namespace talutil

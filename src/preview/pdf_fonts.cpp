@@ -1,0 +1,42 @@
+#include "preview/pdf_fonts.hpp"
+
+#include "automation/run_time_error.hpp"
+
+namespace talutil {
+
+PdfDocument::PdfDocument(FontFiles& files) : files_(files), document_(HPDF_New(nullptr, nullptr)) {
+  if (document_ == nullptr) raise(ErrorNumber::out_of_memory);
+  HPDF_SetCompressionMode(document_, HPDF_COMP_ALL);
+  HPDF_UseUTFEncodings(document_);
+}
+
+HPDF_Font PdfDocument::standard_font(FontFamily family, bool is_bold) {
+  static constexpr const char* names[] = {"Courier",        "Courier-Bold", "Helvetica",
+                                          "Helvetica-Bold", "Times-Roman",  "Times-Bold"};
+  const std::size_t index = font_index(family, is_bold);
+  if (standard_[index] == nullptr) standard_[index] = HPDF_GetFont(document_, names[index], "WinAnsiEncoding");
+  if (standard_[index] == nullptr) raise(ErrorNumber::out_of_memory);
+  return standard_[index];
+}
+
+HPDF_Font PdfDocument::wide_font(bool is_fixed_width) {
+  WideFont& wide = wide_[is_fixed_width ? 1 : 0];
+  if (wide.is_sought) return wide.font;
+  wide.is_sought = true;
+  const auto bytes = files_.wide_font(is_fixed_width);
+  if (bytes.empty()) return nullptr;
+  const char* const name =
+      HPDF_LoadTTFontFromMem(document_, bytes.data(), static_cast<HPDF_UINT>(bytes.size()), HPDF_TRUE);
+  if (name != nullptr) wide.font = HPDF_GetFont(document_, name, "UTF-8");
+  // A font that cannot be used, or loaded twice under one name, is none.
+  if (wide.font == nullptr) HPDF_ResetError(document_);
+  return wide.font;
+}
+
+void PdfDocument::check() const {
+  const HPDF_STATUS status = HPDF_GetError(document_);
+  if (status == HPDF_OK) return;
+  raise(status == HPDF_FAILD_TO_ALLOC_MEM ? ErrorNumber::out_of_memory : ErrorNumber::internal_error);
+}
+
+}  // namespace talutil

@@ -1,0 +1,49 @@
+#pragma once
+
+#include <hpdf.h>
+
+#include <array>
+
+#include "platform/font_files.hpp"
+#include "preview/page_model.hpp"
+
+namespace talutil {
+
+/// A document of the PDF library with the fonts that are used in it.
+class PdfDocument {
+ public:
+  /// Raises 7 without memory.
+  explicit PdfDocument(FontFiles& files);
+  PdfDocument(const PdfDocument&) = delete;
+  PdfDocument& operator=(const PdfDocument&) = delete;
+  ~PdfDocument() { HPDF_Free(document_); }
+
+  [[nodiscard]] HPDF_Doc get() const noexcept { return document_; }
+
+  /// A standard font, for text in code page 1252.
+  [[nodiscard]] HPDF_Font standard_font(FontFamily family, bool is_bold);
+
+  /// An embedded font for all other characters, for text in UTF-8; null where the platform has none.
+  [[nodiscard]] HPDF_Font wide_font(bool is_fixed_width);
+
+  /// Raises 7 or 51 when the library has failed since.
+  void check() const;
+
+ private:
+  struct WideFont {
+    bool is_sought = false;
+    HPDF_Font font = nullptr;
+  };
+
+  FontFiles& files_;
+  HPDF_Doc document_;
+  std::array<HPDF_Font, 6> standard_{};
+  std::array<WideFont, 2> wide_;
+};
+
+/// The place of a family and weight among the six standard fonts.
+[[nodiscard]] constexpr std::size_t font_index(FontFamily family, bool is_bold) noexcept {
+  return static_cast<std::size_t>(family) * 2 + (is_bold ? 1 : 0);
+}
+
+}  // namespace talutil

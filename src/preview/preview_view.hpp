@@ -1,0 +1,123 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+
+#include "automation/text.hpp"
+
+namespace talutil {
+
+class PrintControl;
+
+/// The entries of the preview window's menus, by name; those with entries below them only open these.
+enum class PreviewMenu : std::uint8_t {
+  mnuFile,
+  mnuPrinter,
+  mnuExportPDF,
+  mnuClose,
+  mnuOptions,
+  mnuZoom,
+  mnu25,
+  mnu50,
+  mnu75,
+  mnu100,
+  mnu125,
+  mnu150,
+  mnu200,
+  mnuPrev,
+  mnuNext,
+  mnuPaper,
+  mnuPaperSize,
+  mnuA4,
+  mnuA3,
+  mnuDuplex,
+  mnuVertical,
+  mnuHorizontal,
+  mnuSimplex,
+};
+
+struct PreviewMenuItem {
+  PreviewMenu item;
+  TextView caption;
+  std::uint8_t level;  ///< 0 stands in the bar, 1 below it, 2 below that.
+};
+
+/// In their order. "Vertcial" is what users know.
+inline constexpr PreviewMenuItem preview_menu[] = {
+    {PreviewMenu::mnuFile, u"File", 0},
+    {PreviewMenu::mnuPrinter, u"Send Document to Printer", 1},
+    {PreviewMenu::mnuExportPDF, u"Export to Adobe PDF Format", 1},
+    {PreviewMenu::mnuClose, u"Close", 1},
+    {PreviewMenu::mnuOptions, u"Options", 0},
+    {PreviewMenu::mnuZoom, u"Zoom", 1},
+    {PreviewMenu::mnu25, u"25%", 2},
+    {PreviewMenu::mnu50, u"50%", 2},
+    {PreviewMenu::mnu75, u"75%", 2},
+    {PreviewMenu::mnu100, u"100%", 2},
+    {PreviewMenu::mnu125, u"125%", 2},
+    {PreviewMenu::mnu150, u"150%", 2},
+    {PreviewMenu::mnu200, u"200%", 2},
+    {PreviewMenu::mnuPrev, u"Prev Page", 1},
+    {PreviewMenu::mnuNext, u"Next Page", 1},
+    {PreviewMenu::mnuPaper, u"Paper", 0},
+    {PreviewMenu::mnuPaperSize, u"Size", 1},
+    {PreviewMenu::mnuA4, u"A4", 2},
+    {PreviewMenu::mnuA3, u"A3", 2},
+    {PreviewMenu::mnuDuplex, u"Duplex", 1},
+    {PreviewMenu::mnuVertical, u"Vertcial", 2},
+    {PreviewMenu::mnuHorizontal, u"Horizontal", 2},
+    {PreviewMenu::mnuSimplex, u"Simplex", 2},
+};
+
+/// What a preview window tells its presenter. None of these throws.
+class PreviewEvents {
+ public:
+  virtual ~PreviewEvents() = default;
+
+  /// The window is shown. Coming back from another program does not count.
+  virtual void activated() noexcept = 0;
+
+  /// The window has another size; not told while it is being made.
+  virtual void resized() noexcept = 0;
+  virtual void chosen(PreviewMenu item) noexcept = 0;
+
+  /// A key by the platform's code. Answers the code that it is to be passed on as.
+  virtual std::int32_t key_down(std::int32_t code) noexcept = 0;
+
+  /// The window is about to go, whoever has closed it.
+  virtual void closing() noexcept = 0;
+
+  /// The next zoom of the menu, larger or smaller: what Ctrl and the mouse wheel do.
+  virtual void zoom_step(bool larger) noexcept = 0;
+};
+
+/// The preview window, hidden until it is shown. Sizes are twips.
+class PreviewView {
+ public:
+  virtual ~PreviewView() = default;
+
+  virtual void set_caption(TextView caption) = 0;
+
+  /// 0 normal, 1 minimised, 2 maximised.
+  [[nodiscard]] virtual std::int32_t window_state() const = 0;
+  virtual void set_window_state(std::int32_t state) = 0;
+  [[nodiscard]] virtual float width() const = 0;
+  virtual void set_width(float width) = 0;
+  [[nodiscard]] virtual float height() const = 0;
+  virtual void set_height(float height) = 0;
+  [[nodiscard]] virtual float inner_width() const = 0;
+  [[nodiscard]] virtual float inner_height() const = 0;
+
+  /// The size of the pages' part of the window.
+  virtual void size_pages(float width, float height) = 0;
+  virtual void check(PreviewMenu item, bool is_checked) = 0;
+
+  /// The document, the page or the zoom is another one.
+  virtual void show_page() = 0;
+
+  /// Shows the window and returns when it was closed. Raises 445 where there are no windows.
+  virtual void show_modal() = 0;
+  virtual void close() = 0;
+};
+
+}  // namespace talutil

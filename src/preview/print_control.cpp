@@ -1,0 +1,144 @@
+#include "preview/print_control.hpp"
+
+#include <algorithm>
+#include <cmath>
+
+#include "automation/checked.hpp"
+#include "controls/common_dialog.hpp"
+#include "preview/pdf_writer.hpp"
+
+namespace talutil {
+
+namespace {
+
+constexpr std::int32_t landscape = 1;
+
+std::int32_t checked_code(std::int32_t code, std::int32_t most) {
+  if (code < 0 || code > most) raise(ErrorNumber::invalid_procedure_call);
+  return code;
+}
+
+}  // namespace
+
+PrintControl::PrintControl(const Platform& platform) : platform_(platform), metrics_(platform.font_files) {}
+
+void PrintControl::put_Zoom(float percent) {
+  zoom_ = std::isnan(percent) ? zoom_ : std::clamp(percent, smallest_zoom, largest_zoom);
+}
+
+void PrintControl::put_PaperSize(std::int32_t code) {
+  if (paper_size(code).code != code) raise(ErrorNumber::invalid_procedure_call);
+  paper_size_ = code;
+}
+
+void PrintControl::put_Orientation(std::int32_t orientation) { orientation_ = checked_code(orientation, landscape); }
+
+void PrintControl::put_Duplex(std::int32_t duplex) { duplex_ = checked_code(duplex, 3); }
+
+std::int32_t PrintControl::PageWidth() const noexcept {
+  const auto& paper = paper_size(paper_size_);
+  return orientation_ == landscape ? paper.height : paper.width;
+}
+
+std::int32_t PrintControl::PageHeight() const noexcept {
+  const auto& paper = paper_size(paper_size_);
+  return orientation_ == landscape ? paper.width : paper.height;
+}
+
+std::int32_t PrintControl::PageCount() const noexcept { return static_cast<std::int32_t>(document_.pages.size()); }
+
+void PrintControl::put_CurrentPage(std::int32_t page) {
+  current_page_ = std::clamp(page, std::min(1, PageCount()), PageCount());
+}
+
+FontStyle PrintControl::text_font() const {
+  const float size = FontSize * static_cast<float>(TextScale) / 100;
+  return {family_of(FontName), false, std::clamp(size, 2.0F, 200.0F)};
+}
+
+ReportComposer& PrintControl::composer() {
+  if (!composer_) StartDoc();
+  return *composer_;
+}
+
+void PrintControl::StartDoc() {
+  constexpr float header_points = 10;
+  constexpr std::int32_t smallest_room = 720;
+  PageSetup setup;
+  setup.width = PageWidth();
+  setup.height = PageHeight();
+  setup.margin_left = MarginLeft;
+  setup.margin_top = MarginTop;
+  setup.margin_right = MarginRight;
+  setup.margin_bottom = MarginBottom;
+  const std::int64_t across = std::int64_t{setup.width} - MarginLeft - MarginRight;
+  const std::int64_t down = std::int64_t{setup.height} - MarginTop - MarginBottom;
+  if (std::min({MarginLeft, MarginTop, MarginRight, MarginBottom}) < 0 || across < smallest_room ||
+      down < smallest_room) {
+    raise(ErrorNumber::invalid_procedure_call);
+  }
+  setup.header = Header;
+  setup.header_font = {family_of(HeaderFontName), false, header_points};
+  setup.has_rule = HeaderRule == 1;
+  setup.footer = format_date(platform_.clock.now(), u"DD/MM/YYYY");
+  setup.wraps_words = bool(WordWrap);
+  document_ = {};
+  current_page_ = 0;
+  composer_.emplace(metrics_, std::move(setup));
+  if (const TextView title = trim_blanks(Header); !title.empty()) composer_->begin_section(Text(title));
+}
+
+void PrintControl::put_Text(const Text& text) { composer().add_text(text, text_font()); }
+
+void PrintControl::TextBox(const Text& text, std::int32_t left, std::int32_t top, std::int32_t width,
+                           std::int32_t height) {
+  const std::int32_t from_left = PhysicalPage ? 0 : MarginLeft;
+  const std::int32_t from_top = PhysicalPage ? 0 : MarginTop;
+  composer().add_text_box(text, {checked_add(left, from_left), checked_add(top, from_top), width, height}, text_font());
+}
+
+void PrintControl::put_RenderControl(std::int32_t window) {
+  const Variant source = std::exchange(RenderObject, {});
+  if (const auto* const object = source.get_if<ObjectRef>(); object != nullptr && *object) {
+    const Control grid(*object);
+    if (grid.answers(u"Rows") && grid.answers(u"Cols") && grid.answers(u"TextMatrix")) {
+      composer().add_grid(grid, {family_of(FontName), false, 8});
+      return;
+    }
+  }
+  WindowImage image = platform_.drawing.image_of(window);
+  Picture picture;
+  picture.width = image.width;
+  picture.height = image.height;
+  picture.place.width = round_to<std::int32_t>(static_cast<float>(image.width) * platform_.screen.twips_per_pixel_x());
+  picture.place.height =
+      round_to<std::int32_t>(static_cast<float>(image.height) * platform_.screen.twips_per_pixel_y());
+  picture.pixels = std::make_shared<const std::vector<std::uint8_t>>(std::move(image.pixels));
+  composer().add_picture(std::move(picture));
+}
+
+void PrintControl::EndDoc() {
+  document_ = composer().finish();
+  composer_.reset();
+  put_CurrentPage(1);
+}
+
+void PrintControl::PrintDoc(Boolean dialog) {
+  if (document_.pages.empty()) raise(ErrorNumber::invalid_procedure_call);
+  const PrintSettings settings{DocName.empty() ? document_.title : DocName, paper_size_, orientation_, duplex_,
+                               bool(dialog)};
+  if (!platform_.printers.print(document_, settings)) {
+    throw RunTimeError(CommonDialog::cancelled, Text(CommonDialog::cancelled_description));
+  }
+}
+
+void PdfExport::ConvertDocument(const Variant& control, const Text& file) const {
+  const auto* const object = control.get_if<ObjectRef>();
+  const auto* const source = object == nullptr ? nullptr : dynamic_cast<PrintControl*>(object->get());
+  if (source == nullptr) raise(ErrorNumber::type_mismatch);
+  const Document& document = source->document();
+  write_pdf(document, {Title.empty() ? document.title : Title, Author, Subject, Creator}, platform_.font_files,
+            platform_.files, file);
+}
+
+}  // namespace talutil

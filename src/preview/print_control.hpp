@@ -1,0 +1,177 @@
+#pragma once
+
+#include <memory>
+#include <optional>
+
+#include "controls/control.hpp"
+#include "preview/report_composer.hpp"
+
+namespace talutil {
+
+/// The print control: reports are laid out on its pages, looked at, printed and exported. Lengths are twips.
+///
+/// Settings that are put while a document is being made, or after, count for the next one.
+class PrintControl final : public TableObject<PrintControl> {
+ public:
+  // The identifiers by which hosts' builders put the fixed settings.
+  static constexpr std::int32_t show_guides_id = 34;
+  static constexpr std::int32_t text_scale_id = 57;
+  static constexpr std::int32_t header_rule_id = 60;
+  static constexpr std::int32_t word_wrap_id = 126;
+  static constexpr std::int32_t physical_page_id = 152;
+
+  static constexpr float smallest_zoom = 10;
+  static constexpr float largest_zoom = 400;
+  static constexpr std::int32_t usual_margin = 1134;  ///< 2 cm.
+
+  explicit PrintControl(const Platform& platform);
+
+  Text HeaderFontName = u"Courier New";
+  Text FontName = u"Courier New";
+  float FontSize = 10;
+  Text Header;                   ///< Above every page of the next document.
+  Text DocName;                  ///< The name of the print job; the header where it is empty.
+  Boolean ShowGuides;            ///< The margins are drawn on the screen.
+  std::int32_t HeaderRule = 1;   ///< 1 draws a rule below the header.
+  Boolean PhysicalPage{true};    ///< Positions count from the edge of the paper, else from the margins.
+  Boolean WordWrap{true};        ///< Flowing text breaks between words, else anywhere.
+  std::int32_t TextScale = 100;  ///< The size of flowing text, percent.
+  Variant RenderObject;          ///< The grid that the next RenderControl shows, where it can be driven.
+
+  /// The page shown, percent of its size; the nearest of 10 and 400 beyond these.
+  [[nodiscard]] float Zoom() const noexcept { return zoom_; }
+  void put_Zoom(float percent);
+
+  /// A code of the platform's printing functions: 8 is A3, 9 A4. Raises 5 for a size that is not known.
+  [[nodiscard]] std::int32_t PaperSize() const noexcept { return paper_size_; }
+  void put_PaperSize(std::int32_t code);
+
+  /// 0 portrait, 1 landscape; 5 for others.
+  [[nodiscard]] std::int32_t Orientation() const noexcept { return orientation_; }
+  void put_Orientation(std::int32_t orientation);
+
+  /// 1 simplex, 2 vertical, 3 horizontal, 0 as the printer has it; 5 for others.
+  [[nodiscard]] std::int32_t Duplex() const noexcept { return duplex_; }
+  void put_Duplex(std::int32_t duplex);
+
+  [[nodiscard]] std::int32_t PageWidth() const noexcept;
+  [[nodiscard]] std::int32_t PageHeight() const noexcept;
+  std::int32_t MarginLeft = usual_margin;
+  std::int32_t MarginTop = usual_margin;
+  std::int32_t MarginRight = usual_margin;
+  std::int32_t MarginBottom = usual_margin;
+
+  /// The page shown, from 1; the nearest there is for others. 0 before the first document.
+  [[nodiscard]] std::int32_t CurrentPage() const noexcept { return current_page_; }
+  void put_CurrentPage(std::int32_t page);
+  [[nodiscard]] std::int32_t PageCount() const noexcept;
+
+  /// Begins a document; what was made before is gone. Raises 5 for margins that leave no room.
+  void StartDoc();
+
+  /// Flowing text, see ReportComposer.
+  void put_Text(const Text& text);
+
+  /// A text in a box.
+  void TextBox(const Text& text, std::int32_t left, std::int32_t top, std::int32_t width, std::int32_t height);
+
+  /// Puts a control of the host on the pages, by its window: the grid in RenderObject as it looks, else the picture of
+  /// the window. RenderObject is empty afterwards.
+  void put_RenderControl(std::int32_t window);
+
+  /// Ends the document and shows its first page.
+  void EndDoc();
+
+  /// Prints the document, after the printer dialog where it is asked for. Raises 32755 when that is cancelled, 482 when
+  /// there is no printer or it fails, 5 without a document.
+  void PrintDoc(Boolean dialog);
+
+  [[nodiscard]] const Document& document() const noexcept { return document_; }
+
+ private:
+  [[nodiscard]] ReportComposer& composer();
+  [[nodiscard]] FontStyle text_font() const;
+  [[nodiscard]] Text text_so_far() const { return {}; }
+  [[nodiscard]] std::int32_t no_window() const noexcept { return 0; }
+
+  template <class P>
+  friend constexpr auto members_of(std::type_identity<PrintControl>);
+
+  const Platform& platform_;
+  FontMetrics metrics_;
+  std::optional<ReportComposer> composer_;
+  Document document_;
+  float zoom_ = 100;
+  std::int32_t paper_size_ = 9;
+  std::int32_t orientation_ = 0;
+  std::int32_t duplex_ = 0;
+  std::int32_t current_page_ = 0;
+};
+
+/// The export of a print control's document to PDF.
+class PdfExport final : public TableObject<PdfExport> {
+ public:
+  explicit PdfExport(const Platform& platform) : platform_(platform) {}
+
+  Text Title;  ///< The document's own where it is empty.
+  Text Author = u"TALUtil";
+  Text Subject = u"ORV PDF Data";
+  Text Creator = u"TALUtil print preview";
+
+  /// Writes the document of a print control to a file, which is as it was when that fails. Raises 13 for another object
+  /// and what the file raises.
+  void ConvertDocument(const Variant& control, const Text& file) const;
+
+ private:
+  const Platform& platform_;
+};
+
+template <class P>
+constexpr auto members_of(std::type_identity<PrintControl>) {
+  using C = PrintControl;
+  return P::rows(
+      P::template property<&C::HeaderFontName>("HeaderFontName", "The font of headers and footers."),
+      P::template property<&C::FontName>("FontName", "The font of texts."),
+      P::template property<&C::FontSize>("FontSize", "Its size, in points."),
+      P::template property<&C::Header>("Header", "The text above every page."),
+      P::template property<&C::DocName>("DocName", "The name of the print job."),
+      P::template property<&C::ShowGuides>({"ShowGuides", C::show_guides_id}, "The margins are drawn on the screen."),
+      P::template property<&C::HeaderRule>({"HeaderRule", C::header_rule_id}, "1 draws a rule below the header."),
+      P::template property<&C::PhysicalPage>({"PhysicalPage", C::physical_page_id},
+                                             "Positions count from the edge of the paper."),
+      P::template property<&C::WordWrap>({"WordWrap", C::word_wrap_id}, "Flowing text breaks between words."),
+      P::template property<&C::TextScale>({"TextScale", C::text_scale_id}, "The size of flowing text, percent."),
+      P::template property<&C::RenderObject>("RenderObject", "The grid that the next RenderControl shows."),
+      P::template accessors<&C::Zoom, &C::put_Zoom>("Zoom", "The page shown, percent of its size."),
+      P::template accessors<&C::PaperSize, &C::put_PaperSize>("PaperSize", "The code of the paper: 8 A3, 9 A4."),
+      P::template accessors<&C::Orientation, &C::put_Orientation>("Orientation", "0 portrait, 1 landscape."),
+      P::template accessors<&C::Duplex, &C::put_Duplex>("Duplex", "1 simplex, 2 vertical, 3 horizontal."),
+      P::template get_only<&C::PageWidth>("PageWidth", "The width of the paper as it lies, in twips."),
+      P::template get_only<&C::PageHeight>("PageHeight", "Its height."),
+      P::template property<&C::MarginLeft>("MarginLeft", "The left margin, in twips."),
+      P::template property<&C::MarginTop>("MarginTop", "The top margin."),
+      P::template property<&C::MarginRight>("MarginRight", "The right margin."),
+      P::template property<&C::MarginBottom>("MarginBottom", "The bottom margin."),
+      P::template accessors<&C::CurrentPage, &C::put_CurrentPage>("CurrentPage", "The page shown, from 1."),
+      P::template get_only<&C::PageCount>("PageCount", "The pages of the document."),
+      P::template method<&C::StartDoc>("StartDoc", "Begins a document."),
+      P::template accessors<&C::text_so_far, &C::put_Text>("Text", "Putting it adds flowing text; reads as empty."),
+      P::template method<&C::TextBox>("TextBox", "Adds a text in a box.", "Text", "Left", "Top", "Width", "Height"),
+      P::template accessors<&C::no_window, &C::put_RenderControl>(
+          "RenderControl", "Putting the window of a control adds it to the pages; reads as 0."),
+      P::template method<&C::EndDoc>("EndDoc", "Ends the document and shows its first page."),
+      P::template method<&C::PrintDoc>("PrintDoc", "Prints the document.", optional("Dialog", 0)));
+}
+
+template <class P>
+constexpr auto members_of(std::type_identity<PdfExport>) {
+  using C = PdfExport;
+  return P::rows(P::template property<&C::Title>("Title", "The title of the file."),
+                 P::template property<&C::Author>("Author", "Its author."),
+                 P::template property<&C::Subject>("Subject", "Its subject."),
+                 P::template property<&C::Creator>("Creator", "The program that made it."),
+                 P::template method<&C::ConvertDocument>("ConvertDocument", "Writes a print control's document.",
+                                                         "Control", "FileName"));
+}
+
+}  // namespace talutil

@@ -1,0 +1,131 @@
+#include "automation/checked.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "preview/frm_print_preview.hpp"
+#include "preview/print_control.hpp"
+
+namespace talutil {
+
+namespace {
+
+constexpr std::int16_t paper_a3 = 8;
+constexpr std::int16_t paper_a4 = 9;
+
+struct MonthEndReport {
+  TextView caption;
+  TextView path;
+};
+
+// Where hosts look for them.
+constexpr MonthEndReport month_end_reports[] = {
+    {u"BankSummaryReport", u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\BankSummaryReport.pdf"},
+    {u"SalesReport", u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\SalesReport.pdf"},
+    {u"BadDebtsReport", u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\BadDebtsReport.pdf"},
+};
+
+/// The settings that every report has, and where they stand among the others.
+struct CommonSettings {
+  std::int16_t direction;
+  const Text& report_name;
+  const Text& export_name;
+};
+
+void set_up(FrmPrintPreview& form, const Control& print, const CommonSettings& settings) {
+  print.put(PrintControl::show_guides_id, Boolean(false));
+  print.put(PrintControl::header_rule_id, std::int16_t{1});
+  print.put(PrintControl::physical_page_id, Boolean(true));
+  print.put(PrintControl::word_wrap_id, Boolean(true));
+  print.put(PrintControl::text_scale_id, std::int16_t{100});
+  if (settings.direction == 1) print.put(u"Orientation", std::int16_t{0});
+  if (settings.direction == 2) print.put(u"Orientation", std::int16_t{1});
+  form.set_report_name(settings.report_name);
+  form.set_export_folder(settings.export_name);
+}
+
+bool is_unassigned(const Variant& value) { return value.is(Variant::Kind::empty); }
+
+/// Two blanks stand before each part.
+Text grid_header(const Text& report, const Variant& from, const Variant& to, const Locale& locale) {
+  const Text name = u"  " + report;
+  if (from.equals_text(u"DateTimeOnly")) return name + u"  " + format_date(to.to_date(locale), u"DD/MM/YYYY HH:MM");
+  if (is_unassigned(from) || is_unassigned(to)) return name;
+  return name + u"  " + format_date(from.to_date(locale), u"DD/MM/YYYY") + u" To " +
+         format_date(to.to_date(locale), u"DD/MM/YYYY");
+}
+
+/// Sets up a report on A4 with its name for a header.
+const Control& begin_plain_report(FrmPrintPreview& form, std::int16_t zoom, const CommonSettings& settings) {
+  const Control& print = form.print_control();
+  print.put(u"Zoom", static_cast<double>(zoom));
+  print.put(u"PaperSize", paper_a4);
+  set_up(form, print, settings);
+  print.put(u"Header", u"  " + settings.report_name);
+  print.call(u"StartDoc");
+  return print;
+}
+
+}  // namespace
+
+void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16_t& iPrintDirection,
+                                const Text& sReportName, const Text& sCsvName, const Variant& ctlGrid,
+                                const Variant& vStDate, const Variant& vEnDate, const Text& fWindowCaption) {
+  FrmPrintPreview& form = library_.preview();
+  form.set_caption_text(fWindowCaption);
+  const Control& print = form.print_control();
+  print.put(u"HeaderFontName", u"Courier New");
+  print.put(u"FontName", u"Courier New");
+  print.put(u"Zoom", static_cast<double>(iZoomLevel));
+  // Texts that are none of these leave the setting of the report before.
+  if (settings().sGridPaperDuplex == u"Horizontal") print.put(u"Duplex", std::int16_t{3});
+  if (settings().sGridPaperDuplex == u"Simplex") print.put(u"Duplex", std::int16_t{1});
+  if (settings().sGridPaperDuplex == u"Vertical") print.put(u"Duplex", std::int16_t{2});
+  if (settings().sGridPaperSize == u"A3") print.put(u"PaperSize", paper_a3);
+  if (settings().sGridPaperSize == u"A4") print.put(u"PaperSize", paper_a4);
+  set_up(form, print, {iPrintDirection, sReportName, sCsvName});
+  print.put(u"Header", grid_header(sReportName, vStDate, vEnDate, locale()));
+
+  const Control grid(ctlGrid);
+  print.call(u"StartDoc");
+  // Ours lays the grid out by asking it; another maker's has its window alone.
+  if (print.answers(u"RenderObject")) print.put(u"RenderObject", grid.object());
+  print.put(u"RenderControl", grid.get<std::int32_t>(u"hwnd"));
+  print.call(u"EndDoc");
+
+  if (!settings().AutomatedEndOfMonth.is_exactly_true()) return form.show_modal();
+  for (const MonthEndReport& report : month_end_reports) {
+    if (fWindowCaption == report.caption) form.ExportToPDF(Text(report.path), Boolean(false));
+  }
+  form.unload();
+}
+
+void ORVUtils::TextBoxPrintPreview(const std::int16_t& iZoomLevel, const std::int16_t& iPrintDirection,
+                                   const Text& sReportName, const Text& sCsvName, const Variant& ctlTextBox) {
+  FrmPrintPreview& form = library_.preview();
+  const Control& print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
+  print.put(u"Text", Control(ctlTextBox).get<Text>(u"Text"));
+  print.call(u"EndDoc");
+  form.show_modal();
+}
+
+void ORVUtils::ListBoxPrintPreview(const std::int16_t& iZoomLevel, const std::int16_t& iPrintDirection,
+                                   const Text& sReportName, const Text& sCsvName, const Variant& ctlListBox) {
+  constexpr std::int32_t height = 567;  // 1 cm.
+  constexpr double pitch = 680.4;       // Of which the fraction is lost at every line.
+  FrmPrintPreview& form = library_.preview();
+  const Control& print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
+  const Control list(ctlListBox);
+  const auto count = list.get<std::int32_t>(u"ListCount");
+  const auto left = print.get<std::int32_t>(u"MarginLeft");
+  const auto top = print.get<std::int32_t>(u"MarginTop");
+  const auto right = print.get<std::int32_t>(u"MarginRight");
+  const std::int32_t width = print.get<std::int32_t>(u"PageWidth") - (left + right);
+  std::int32_t y = 0;
+  for (std::int32_t i = 0; i < count; ++i) {
+    print.call(u"TextBox", {list.get<Text>(u"List", {i}), left, checked_add(top, y), width, height});
+    y = round_to<std::int32_t>(y + pitch);
+  }
+  print.call(u"EndDoc");
+  form.show_modal();
+}
+
+}  // namespace talutil

@@ -1,0 +1,108 @@
+// What other programs read from the PDF files.
+#include <gtest/gtest.h>
+#include <stdlib.h>
+
+#include <algorithm>
+#include <cmath>
+#include <cstdio>
+#include <sstream>
+
+#include "automation/run_time_error.hpp"
+#include "platform/posix/posix_platform.hpp"
+#include "preview/pdf_writer.hpp"
+#include "preview/report_composer.hpp"
+
+namespace talutil {
+
+namespace {
+
+std::string output_of(const std::string& command) {
+  std::string output;
+  FILE* const pipe = popen(command.c_str(), "r");
+  char buffer[4096];
+  while (const std::size_t size = fread(buffer, 1, sizeof buffer, pipe)) output.append(buffer, size);
+  pclose(pipe);
+  return output;
+}
+
+struct PdfTest : ::testing::Test {
+  posix::PosixFontFiles fonts;
+  posix::PosixFiles files;
+  std::string path = ::testing::TempDir() + "talutil_pdf_test.pdf";
+
+  ~PdfTest() override { remove(path.c_str()); }
+
+  void write(const Document& document) {
+    write_pdf(document, {u"Title", u"Author", u"Subject", u"Creator"}, fonts, files, from_utf8(path));
+  }
+};
+
+TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
+  FontMetrics metrics(fonts);
+  PageSetup setup;
+  setup.width = 11906;
+  setup.height = 16838;
+  setup.margin_left = setup.margin_top = setup.margin_right = setup.margin_bottom = 1134;
+  setup.header = u"  Report";
+  ReportComposer composer(metrics, setup);
+  for (const FontFamily family : {FontFamily::courier, FontFamily::helvetica, FontFamily::times}) {
+    for (const float points : {8.0F, 10.0F, 24.0F}) {
+      composer.add_text(u"one\ttwo caf\u00E9 \u041F\u0440\u0438\u0432\u0435\u0442 end\r\n",
+                        {family, points == 24, points});
+    }
+  }
+  composer.add_text(u"second page\f", {});
+  composer.add_text(u"last", {});
+  const Document document = composer.finish();
+  write(document);
+  EXPECT_EQ(output_of("qpdf --check " + path + " 2>&1 | grep -c 'No syntax or stream encoding errors'"), "1\n");
+  EXPECT_EQ(output_of("pdfinfo " + path + " | grep -c -E 'Title: +Title|Author: +Author|Pages: +2'"), "3\n");
+
+  // Each run that is a single word, is a word of the file at the same place.
+  struct Word {
+    double left = 0;
+    double right = 0;
+    std::string text;
+  };
+  std::vector<Word> found;
+  std::istringstream lines(output_of("pdftotext -bbox " + path + " -"));
+  for (std::string line; std::getline(lines, line);) {
+    Word word;
+    char text[100] = "";
+    constexpr const char* format = " <word xMin=\"%lf\" yMin=\"%*f\" xMax=\"%lf\" yMax=\"%*f\">%99[^<]";
+    if (sscanf(line.c_str(), format, &word.left, &word.right, text) != 3) continue;
+    word.text = text;
+    found.push_back(word);
+  }
+  std::size_t compared = 0;
+  for (const Page& page : document.pages) {
+    for (const PageItem& item : page.items) {
+      const auto* const run = std::get_if<TextRun>(&item);
+      if (run == nullptr || run->text.find(u' ') != Text::npos) continue;
+      const std::string text = to_utf8(run->text);
+      const bool is_there = std::ranges::any_of(found, [&](const Word& word) {
+        return word.text == text && std::abs(word.left * 20 - run->left) < 20 &&
+               std::abs(word.right * 20 - (run->left + run->width)) < 20;
+      });
+      EXPECT_TRUE(is_there) << text << " at " << run->left << ", width " << run->width;
+      ++compared;
+    }
+  }
+  EXPECT_GT(compared, 18U);
+}
+
+TEST_F(PdfTest, AFailedExportLeavesTheOldFile) {
+  std::FILE* const file = fopen(path.c_str(), "w");
+  fputs("old", file);
+  fclose(file);
+  Document document;
+  document.pages.push_back({100, 100, {}});
+  EXPECT_THROW(write_pdf(document, {}, fonts, files, u"/nonexistent/a.pdf"), RunTimeError);
+  EXPECT_EQ(output_of("cat " + path), "old");
+  write({});
+  EXPECT_EQ(output_of("pdfinfo " + path + " | grep Pages"), "Pages:           1\n") << "an empty document has a page";
+}
+
+}  // namespace
+
+}  // namespace talutil

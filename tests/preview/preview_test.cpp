@@ -1,0 +1,289 @@
+#include <gmock/gmock.h>
+
+#include "controls/grid.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "preview/frm_print_preview.hpp"
+#include "preview/print_control.hpp"
+#include "tests/fakes/error_of.hpp"
+#include "tests/fakes/fake_platform.hpp"
+#include "tests/fakes/recording_control.hpp"
+
+namespace talutil {
+
+namespace {
+
+using ::testing::ElementsAre;
+using testing::error_of;
+using ::testing::HasSubstr;
+using testing::RecordingControl;
+using Uses = std::vector<std::string>;
+
+/// The text of a page, a line each run: "left,top text".
+std::string runs_of(const Page& page) {
+  std::string lines;
+  for (const PageItem& item : page.items) {
+    if (const auto* const run = std::get_if<TextRun>(&item)) {
+      lines += std::to_string(run->left) + ',' + std::to_string(run->top) + ' ' + to_utf8(run->text) + '\n';
+    }
+  }
+  return lines;
+}
+
+struct Preview : ::testing::Test {
+  testing::FakePlatform platform;
+  Library library{platform.platform()};
+  ORVUtils utils{library};
+};
+
+/// A print control that notes how builders drive it.
+struct Builders : Preview {
+  std::shared_ptr<RecordingControl> print = std::make_shared<RecordingControl>();
+  std::shared_ptr<RecordingControl> source = std::make_shared<RecordingControl>();
+  Variant holder{ObjectRef(source)};
+
+  Builders() {
+    for (const char* property : {"HeaderFontName", "FontName", "Zoom", "Duplex", "PaperSize", "Orientation", "Header",
+                                 "Text", "RenderControl"}) {
+      print->values[property] = {};
+    }
+    print->values["MarginLeft"] = print->values["MarginTop"] = print->values["MarginRight"] = 100;
+    print->values["PageWidth"] = 10000;
+    print->values["CurrentPage"] = print->values["PageCount"] = std::int16_t{1};
+    print->methods = {"StartDoc", "EndDoc", "TextBox"};
+    platform.controls[u"VSPrinter8LibCtl.VSPrinter"] = print;
+    source->values["hwnd"] = 77;
+  }
+
+  std::string header_of(const Variant& from, const Variant& to) {
+    utils.GridPrintPreview(100, 1, u"Sales", u"C:\\x", holder, from, to, u"Cap");
+    return to_utf8(print->values["Header"].to_text());
+  }
+};
+
+const Uses fixed_settings{"put #34 = False", "put #60 = 1%", "put #152 = True", "put #126 = True", "put #57 = 100%"};
+
+Uses joined(std::initializer_list<Uses> parts) {
+  Uses all;
+  for (const Uses& part : parts) all.insert(all.end(), part.begin(), part.end());
+  return all;
+}
+
+TEST_F(Builders, SetThePrintControlUpInOrder) {
+  library.settings().sGridPaperDuplex = u"Horizontal";
+  library.settings().sGridPaperSize = u"A3";
+  platform.preview.user = [&](PreviewEvents&) { print->uses.emplace_back("shown"); };
+  utils.GridPrintPreview(75, 2, u"Sales", u"C:\\x", holder, Variant(), Variant(), u"Cap");
+  const Uses browsing{"CurrentPage", "PageCount", "CurrentPage", "put CurrentPage = 1%",
+                      "CurrentPage", "PageCount", "shown"};
+  EXPECT_EQ(print->uses, joined({{"put HeaderFontName = \"Courier New\"", "put FontName = \"Courier New\"",
+                                  "put Zoom = 75#", "put Duplex = 3%", "put PaperSize = 8%"},
+                                 fixed_settings,
+                                 {"put Orientation = 1%", "put Header = \"  Sales\"", "call StartDoc",
+                                  "put RenderControl = 77&", "call EndDoc"},
+                                 browsing}));
+  print->uses.clear();
+  library.settings().sGridPaperDuplex = u"horizontal";
+  library.settings().sGridPaperSize = u"a4";
+  utils.GridPrintPreview(75, 0, u"Sales", u"C:\\x", holder, Variant(), Variant(), u"");
+  EXPECT_EQ(print->uses[3], "put #34 = False") << "texts in another case set nothing";
+  EXPECT_EQ(print->uses[8], "put Header = \"  Sales\"") << "nor do other directions";
+
+  print->uses.clear();
+  source->values["Text"] = u"words";
+  utils.TextBoxPrintPreview(50, 1, u"Notes", u"C:\\x", holder);
+  EXPECT_EQ(print->uses, joined({{"put Zoom = 50#", "put PaperSize = 9%"},
+                                 fixed_settings,
+                                 {"put Orientation = 0%", "put Header = \"  Notes\"", "call StartDoc",
+                                  "put Text = \"words\"", "call EndDoc"},
+                                 browsing}));
+  print->uses.clear();
+  source->values = {{"ListCount", 3}, {"List(0&)", u"a"}, {"List(1&)", u"b"}, {"List(2&)", u"c"}};
+  utils.ListBoxPrintPreview(50, 0, u"Notes", u"C:\\x", holder);
+  const auto first = std::ranges::find(print->uses, "call TextBox(\"a\", 100&, 100&, 9800&, 567&)");
+  ASSERT_NE(first, print->uses.end());
+  EXPECT_EQ(first[1], "call TextBox(\"b\", 100&, 780&, 9800&, 567&)");
+  EXPECT_EQ(first[2], "call TextBox(\"c\", 100&, 1460&, 9800&, 567&)");
+}
+
+TEST_F(Builders, DatesStandInTheHeader) {
+  const Date from{39877.25};
+  EXPECT_EQ(header_of(u"DateTimeOnly", from), "  Sales  05/03/2009 06:00");
+  EXPECT_EQ(header_of(from, u"7/3/2009 8:30"), "  Sales  05/03/2009 To 07/03/2009");
+  EXPECT_EQ(header_of(Variant(), from), "  Sales");
+  EXPECT_EQ(header_of(from, Variant()), "  Sales");
+  EXPECT_EQ(error_of([&] { header_of(Null{}, from); }), 94);
+  EXPECT_EQ(error_of([&] { header_of(u"x", from); }), 13);
+}
+
+TEST_F(Preview, UnattendedRunsWriteThreeReports) {
+  library.settings().AutomatedEndOfMonth = Boolean(true);
+  library.settings().EventLog = 1;
+  library.settings().sORVPath = u"C:";
+  const auto grid = std::make_shared<Grid>(library.platform());
+  grid->put_Cols(1);
+  grid->AddItem(u"x", -1);
+  struct GridWithWindow final : Object {
+    explicit GridWithWindow(ObjectRef inner) : grid(std::move(inner)) {}
+    std::int32_t member_id(TextView name) override { return name == u"hwnd" ? -5 : grid->member_id(name); }
+    Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
+      return member == -5 ? Variant(1) : grid->invoke(member, access, arguments);
+    }
+    ObjectRef grid;
+  };
+  const Variant holder{ObjectRef(std::make_shared<GridWithWindow>(grid))};
+  for (const TextView caption : {u"SalesReport", u"BankSummaryReport", u"BadDebtsReport", u"salesreport"}) {
+    utils.GridPrintPreview(100, 1, u"Report", u"", holder, Variant(), Variant(), Text(caption));
+    EXPECT_EQ(platform.preview.windows, 0) << "unloaded";
+  }
+  const Text folder = u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\";
+  for (const TextView name : {u"SalesReport", u"BankSummaryReport", u"BadDebtsReport"}) {
+    EXPECT_THAT(platform.files.bytes(folder + Text(name) + u".pdf"), ::testing::StartsWith("%PDF-1."));
+  }
+  EXPECT_EQ(platform.files.files.size(), 4U) << "three reports and the event log";
+  EXPECT_THAT(platform.preview.uses, ::testing::Not(::testing::Contains("show")));
+  EXPECT_THAT(platform.files.bytes(u"C:\\EventLog.txt"), HasSubstr(":FormQueryUnLoad:frmPrintPreview"));
+  platform.files.failures = {{u"write", ErrorNumber::disk_full}};
+  utils.GridPrintPreview(100, 1, u"Report", u"", holder, Variant(), Variant(), u"SalesReport");
+}
+
+TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
+  const auto source = std::make_shared<RecordingControl>();
+  Text text;
+  for (int page = 0; page < 3; ++page) text += u"page\f";
+  source->values["Text"] = text + u"end";
+  auto& view = platform.preview;
+  FrmPrintPreview& form = library.preview();
+  view.width = 100;
+  view.user = [&](PreviewEvents& events) {
+    EXPECT_EQ(view.captions.back(), u"Notes           Page 1 of 4      Press F9 to Print.");
+    EXPECT_EQ(events.key_down(114), 115) << "passed on as F4";
+    EXPECT_EQ(view.captions.back(), u"Notes           Page 2 of 4      Press F9 to Print.");
+    for (int i = 0; i < 5; ++i) events.chosen(PreviewMenu::mnuNext);
+    EXPECT_NE(view.captions.back().find(u"Page 4 of 4"), Text::npos);
+    for (int i = 0; i < 5; ++i) events.key_down(113);
+    EXPECT_NE(view.captions.back().find(u"Page 1 of 4"), Text::npos);
+    EXPECT_EQ(events.key_down(18), 18) << "Alt stays Alt";
+
+    view.uses.clear();
+    events.chosen(PreviewMenu::mnu150);
+    EXPECT_EQ(view.uses, (Uses{"uncheck 6", "uncheck 7", "uncheck 8", "uncheck 9", "uncheck 10", "uncheck 11",
+                               "uncheck 12", "check 11"}));
+    events.zoom_step(true);
+    events.zoom_step(true);
+    EXPECT_THAT(view.checked, ElementsAre(PreviewMenu::mnu200));
+    EXPECT_EQ(form.print_control().get<double>(u"Zoom"), 200);
+
+    events.chosen(PreviewMenu::mnuA3);
+    events.chosen(PreviewMenu::mnuVertical);
+    platform.prints = false;
+    events.key_down(120);
+    ASSERT_EQ(platform.print_jobs.size(), 1U);
+    EXPECT_EQ(platform.print_jobs[0].paper_size, 8);
+    EXPECT_EQ(platform.print_jobs[0].duplex, 2);
+    EXPECT_TRUE(platform.print_jobs[0].shows_dialog);
+
+    events.resized();
+    EXPECT_EQ(view.width, 9000) << "600 pixels at least";
+    EXPECT_EQ(view.pages_width, 9000 - 300 - 150);
+    view.state = 1;
+    events.resized();
+    EXPECT_EQ(view.state, 0);
+
+    platform.chosen_files = {u"C:\\out\\a.pdf"};
+    events.chosen(PreviewMenu::mnuExportPDF);
+    EXPECT_THAT(platform.files.bytes(u"C:\\out\\a.pdf"), ::testing::StartsWith("%PDF"));
+    EXPECT_EQ(platform.file_dialogs.back().file_name, u"*.pdf");
+    EXPECT_EQ(platform.file_dialogs.back().folder, u"C:\\exports\\");
+    events.chosen(PreviewMenu::mnuExportPDF);
+    EXPECT_TRUE(platform.messages.empty()) << "a cancelled dialog is nobody's business";
+    EXPECT_EQ(error_of([&] { utils.TextBoxPrintPreview(1, 1, u"N", u"", ObjectRef(source)); }), 400);
+    view.width = 12000;
+  };
+  utils.TextBoxPrintPreview(100, 1, u"Notes", u"C:\\exports\\", ObjectRef(source));
+  EXPECT_FALSE(form.is_loaded());
+  EXPECT_EQ(view.windows, 0);
+  EXPECT_EQ(utils.GetCfgFileData(u"PrintPreview", u"WindowWidth", u"", u"", Boolean(false)), u"12000");
+}
+
+struct Pages : Preview {
+  std::shared_ptr<PrintControl> print = std::make_shared<PrintControl>(library.platform());
+
+  const Document& document_of(const Text& text) {
+    print->StartDoc();
+    print->put_Text(text);
+    print->EndDoc();
+    return print->document();
+  }
+};
+
+TEST_F(Pages, TextFlowsAndBreaks) {
+  print->Header = u"  Notes";
+  print->MarginRight = print->PageWidth() - print->MarginLeft - 1200;  // Ten letters of Courier.
+  const std::string page = runs_of(document_of(u"one two three four\r\nabcdefghijklmn\tx\r\n\r\nb\u0001").pages[0]);
+  EXPECT_EQ(page,
+            "1134,1134 one two \n1134,1374 three four\n1134,1614 abcdefghij\n1134,1854 klmn\n2094,1854 x\n"
+            "1134,2334 b^A\n"
+            "1134,654   Notes\n1134,15944 06/07/2009\n1014,15944 Page 1 of 1\n");
+  EXPECT_EQ(document_of(u"a\fb\f\fc").pages.size(), 4U);
+  Text lines;
+  for (int i = 0; i < 61; ++i) lines += u"x\n";
+  EXPECT_EQ(document_of(lines).pages.size(), 2U) << "60 lines of 240 twips";
+  EXPECT_EQ(document_of(u"").pages.size(), 1U);
+  EXPECT_EQ(print->document().bookmarks.size(), 1U);
+  EXPECT_EQ(print->CurrentPage(), 1);
+  print->MarginLeft = 12000;
+  EXPECT_EQ(error_of([&] { print->StartDoc(); }), 5);
+  EXPECT_EQ(error_of([&] { print->put_PaperSize(999); }), 5);
+  print->put_Zoom(-3);
+  EXPECT_EQ(print->Zoom(), 10);
+}
+
+TEST_F(Pages, ListsRunOffThePage) {
+  print->StartDoc();
+  for (std::int32_t i = 0; i < 1000; ++i)
+    print->TextBox(u"a long entry that is cut off", 1134, 1134 + i * 680, 1300, 567);
+  print->EndDoc();
+  EXPECT_EQ(print->document().pages.size(), 1U);
+  EXPECT_THAT(runs_of(print->document().pages[0]),
+              ::testing::StartsWith("1134,1134 a long\n1134,1374 entry that\n1134,1814 a long\n"));
+}
+
+TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
+  const auto grid = std::make_shared<Grid>(library.platform());
+  grid->put_Cols(5);
+  grid->AddItem(u"Name\tHidden\tSum\tDone\tFar", -1);
+  grid->put_FixedRows(1);
+  for (int i = 0; i < 60; ++i) grid->AddItem(u"N" + number_to_text(i) + u"\th\t12.5\tTrue\tfar", -1);
+  grid->put_ColHidden(1, Boolean(true));
+  grid->put_RowHidden(2, Boolean(true));
+  grid->put_ColDataType(3, 11);
+  grid->put_ColWidth(0, 600);
+  grid->put_ColWidth(4, 9000);
+  print->StartDoc();
+  print->RenderObject = ObjectRef(grid);
+  print->put_RenderControl(1);
+  print->EndDoc();
+  const Document& document = print->document();
+  ASSERT_EQ(document.pages.size(), 4U) << "two pages down, twice across";
+  // Courier of 8 points: 96 twips a letter, rows of 252.
+  const std::string first = runs_of(document.pages[0]);
+  EXPECT_THAT(first,
+              ::testing::StartsWith("1194,1164 Name\n1794,1164 Sum\n2794,1164 Done\n1194,1416 N0\n2290,1416 12.5\n"
+                                    "1194,1668 N2\n"));
+  EXPECT_THAT(runs_of(document.pages[1]), ::testing::StartsWith("1194,1164 Name\n")) << "headings on every page";
+  EXPECT_THAT(runs_of(document.pages[2]), ::testing::StartsWith("1194,1164 Far\n1194,1416 far\n"));
+
+  // What answers for nothing but its window is a picture.
+  print->StartDoc();
+  print->put_RenderControl(42);
+  print->EndDoc();
+  EXPECT_THAT(platform.drawn, ElementsAre("image of 42"));
+  const auto* const picture = std::get_if<Picture>(&print->document().pages[0].items[0]);
+  ASSERT_NE(picture, nullptr);
+  EXPECT_EQ(picture->place, (Rectangle{1134, 1134, 30, 15}));
+}
+
+}  // namespace
+
+}  // namespace talutil
