@@ -72,6 +72,7 @@ take_pictures &
 pictures_pid=$!
 client window
 client forms
+client preview
 kill $pictures_pid || true
 run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'
 
