@@ -95,6 +95,9 @@ class Grid final : public TableObject<Grid> {
   [[nodiscard]] std::int32_t RowSel() const noexcept { return row_end_; }
   void put_RowSel(std::int32_t row);
 
+  /// The window of the grid, which builders of reports ask for: 0 for a table that is not shown.
+  [[nodiscard]] std::int32_t hwnd() const noexcept { return 0; }
+
   /// Empties every cell.
   void Clear();
 
@@ -149,6 +152,7 @@ template <class P>
 constexpr auto members_of(std::type_identity<Grid>) {
   using G = Grid;
   return P::rows(
+      P::template get_only<&G::hwnd>("hwnd", "Its window: 0, since it has none."),
       P::template accessors<&G::Rows, &G::put_Rows>("Rows", "The number of rows."),
       P::template accessors<&G::Cols, &G::put_Cols>("Cols", "The number of columns."),
       P::template accessors<&G::FixedRows, &G::put_FixedRows>("FixedRows", "The rows that are headings."),

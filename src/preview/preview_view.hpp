@@ -91,6 +91,9 @@ class PreviewEvents {
   virtual void zoom_step(bool larger) noexcept = 0;
 };
 
+/// What is raised where a preview cannot be shown.
+inline constexpr TextView no_screen = u"There is no screen to show the preview on; export the report to PDF instead";
+
 /// The preview window, hidden until it is shown. Sizes are twips.
 class PreviewView {
  public:

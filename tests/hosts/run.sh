@@ -11,7 +11,7 @@ pictures=$talutil_build/screenshots
 passed=0
 failed=0
 
-need_packages xvfb imagemagick
+need_packages xvfb imagemagick ghostscript
 mkdir -p "$pictures"
 rm -f "$pictures"/*.wanted
 
@@ -73,6 +73,12 @@ pictures_pid=$!
 client window
 client forms
 client preview
+rm -f "$talutil_build"/printed_*.ps
+client printing
+words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/printed_report.ps" 2>&1 | tr -s ' \n' ' ')
+expect_success "the words of the printed report, which are: $words" \
+  test "${words#*Notes The first page*Page 1 of 2*Notes The second page*Page 2 of 2}" != "$words"
+expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
 run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'
 

@@ -25,8 +25,7 @@ class PreviewWindow final : public PreviewView {
   void check(PreviewMenu /*item*/, bool /*is_checked*/) override {}
   void show_page() override {}
   void show_modal() override {
-    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::action_not_supported),
-                       u"There is no screen to show the preview on; export the report to PDF instead");
+    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::action_not_supported), Text(no_screen));
   }
   void close() override {}
 

@@ -24,6 +24,8 @@ class Fonts {
 
   void select(const FontStyle& style) {
     static constexpr const wchar_t* names[] = {L"Courier New", L"Arial", L"Times New Roman"};
+    // Where a font is missing, the platform takes another of its kind.
+    static constexpr DWORD kinds[] = {FIXED_PITCH | FF_MODERN, VARIABLE_PITCH | FF_SWISS, VARIABLE_PITCH | FF_ROMAN};
     const Key key{style.family, style.is_bold, style.points};
     HFONT& font = fonts_[key];
     if (font == nullptr) {
@@ -31,7 +33,7 @@ class Fonts {
       font =
           CreateFontW(-rounded(style.points * twips_per_point * scale_), 0, 0, 0, style.is_bold ? FW_BOLD : FW_NORMAL,
                       FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_TT_PRECIS, CLIP_DEFAULT_PRECIS, CLEARTYPE_QUALITY,
-                      DEFAULT_PITCH, names[static_cast<std::size_t>(style.family)]);
+                      kinds[static_cast<std::size_t>(style.family)], names[static_cast<std::size_t>(style.family)]);
     }
     SelectObject(device_, font);
   }

@@ -287,8 +287,16 @@ class PreviewWindow final : public PreviewView {
   PreviewWindow(PreviewEvents& events, PrintControl* print) : events_(events) {
     constexpr int usual_width = 800;
     constexpr int usual_height = 600;
-    window_ = CreateWindowExW(0, frame_class, L"", WS_OVERLAPPEDWINDOW | WS_CLIPCHILDREN, CW_USEDEFAULT, CW_USEDEFAULT,
-                              usual_width, usual_height, nullptr, make_menu(), own_module(), nullptr);
+    const auto make = [](HWND parent) {
+      return CreateWindowExW(0, frame_class, L"", WS_OVERLAPPEDWINDOW | WS_CLIPCHILDREN, CW_USEDEFAULT, CW_USEDEFAULT,
+                             usual_width, usual_height, parent, make_menu(), own_module(), nullptr);
+    };
+    window_ = make(nullptr);
+    // Unattended runs may have no desktop to put windows on. They show none.
+    if (window_ == nullptr) {
+      window_ = make(HWND_MESSAGE);
+      has_desktop_ = false;
+    }
     if (window_ == nullptr) raise(ErrorNumber::internal_error);
     pages_ = std::make_unique<PagesWindow>(window_, events, print);
     SetWindowLongPtrW(window_, GWLP_USERDATA, reinterpret_cast<LONG_PTR>(this));
@@ -334,6 +342,9 @@ class PreviewWindow final : public PreviewView {
   void show_page() override { pages_->show(); }
 
   void show_modal() override {
+    if (!has_desktop_) {
+      throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::action_not_supported), Text(no_screen));
+    }
     const HWND owner = GetActiveWindow();
     if (owner != nullptr) EnableWindow(owner, FALSE);
     is_shown_ = true;
@@ -458,6 +469,7 @@ class PreviewWindow final : public PreviewView {
   HWND window_ = nullptr;
   std::unique_ptr<PagesWindow> pages_;
   std::int32_t state_ = 0;
+  bool has_desktop_ = true;
   bool is_shown_ = false;
   bool is_closed_ = false;
 };

@@ -144,9 +144,10 @@ bool Win32Printers::print(const Document& document, const PrintSettings& setting
 std::vector<std::uint8_t> Win32FontFiles::wide_font(bool is_fixed_width) {
   std::vector<std::uint8_t> bytes;
   const HDC context = CreateCompatibleDC(nullptr);
-  const HFONT font =
-      CreateFontW(-16, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_TT_ONLY_PRECIS,
-                  CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY, DEFAULT_PITCH, is_fixed_width ? L"Courier New" : L"Arial");
+  const HFONT font = CreateFontW(-16, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_TT_ONLY_PRECIS,
+                                 CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY,
+                                 is_fixed_width ? FIXED_PITCH | FF_MODERN : VARIABLE_PITCH | FF_SWISS,
+                                 is_fixed_width ? L"Courier New" : L"Arial");
   const HGDIOBJ before = SelectObject(context, font);
   const DWORD size = GetFontData(context, 0, 0, nullptr, 0);
   if (size != GDI_ERROR && size > 0) {
