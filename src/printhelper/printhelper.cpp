@@ -77,6 +77,8 @@ class Picture {
     context_ = CreateCompatibleDC(screen);
     if (bitmap_ != nullptr && context_ != nullptr) {
       before_ = SelectObject(context_, bitmap_);
+      // What a window does not draw of itself stays paper.
+      PatBlt(context_, 0, 0, size.width, size.height, WHITENESS);
       const HDC source = GetWindowDC(window);
       if (PrintWindow(window, context_, 0) == FALSE)
         BitBlt(context_, 0, 0, size.width, size.height, source, 0, 0, SRCCOPY);

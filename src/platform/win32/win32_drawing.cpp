@@ -78,6 +78,8 @@ WindowImage Win32Drawing::image_of(std::intptr_t window) {
   const HBITMAP bitmap = CreateDIBSection(context, &information, DIB_RGB_COLORS, &bits, nullptr, 0);
   if (bitmap != nullptr) {
     const HGDIOBJ before = SelectObject(context, bitmap);
+    // What a window does not draw of itself stays white.
+    PatBlt(context, 0, 0, image.width, image.height, WHITENESS);
     PrintWindow(handle, context, 0);
     GdiFlush();
     const auto* pixel = static_cast<const std::uint8_t*>(bits);
