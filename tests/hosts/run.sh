@@ -75,7 +75,7 @@ client forms
 client preview
 rm -f "$talutil_build"/printed_*.ps
 client printing
-words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/printed_report.ps" 2>&1 | tr -s '[:space:]' ' ')
+words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/printed_report.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
 expect_success "the words of the printed report, which are: $words" \
   test "${words#*Notes The first page*Page 1 of 2*Notes The second page*Page 2 of 2}" != "$words"
 expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
