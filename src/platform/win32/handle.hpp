@@ -47,4 +47,12 @@ template <class Function>
   return reinterpret_cast<Function>(reinterpret_cast<void*>(GetProcAddress(module, name)));
 }
 
+/// The module that this code is part of: the library's DLL, or a test.
+[[nodiscard]] inline HMODULE own_module() noexcept {
+  HMODULE module = nullptr;
+  GetModuleHandleExW(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_UNCHANGED_REFCOUNT,
+                     reinterpret_cast<const wchar_t*>(&own_module), &module);
+  return module;
+}
+
 }  // namespace talutil::win32

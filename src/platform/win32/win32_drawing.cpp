@@ -3,6 +3,7 @@
 #include <array>
 
 #include "automation/run_time_error.hpp"
+#include "platform/win32/handle.hpp"
 #include "platform/win32/win32_files.hpp"
 #include "platform/win32/windows.hpp"
 
@@ -24,13 +25,6 @@ HMODULE helper_beside(HMODULE module) {
   const Text helper = Text(program.substr(0, program.find_last_of(u'\\') + 1)) + u"printhelper.dll";
   // By its full path: a library of that name in another folder of the search order is not ours to run.
   return LoadLibraryExW(wide(helper), nullptr, LOAD_WITH_ALTERED_SEARCH_PATH);
-}
-
-HMODULE own_module() noexcept {
-  HMODULE module = nullptr;
-  GetModuleHandleExW(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_UNCHANGED_REFCOUNT,
-                     reinterpret_cast<const wchar_t*>(&own_module), &module);
-  return module;
 }
 
 void call_helper(const char* function, std::int32_t window) {

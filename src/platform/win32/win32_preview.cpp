@@ -3,6 +3,7 @@
 #include <cmath>
 
 #include "automation/run_time_error.hpp"
+#include "platform/win32/handle.hpp"
 #include "platform/win32/page_renderer.hpp"
 #include "platform/win32/win32_platform.hpp"
 #include "preview/preview_view.hpp"
@@ -18,13 +19,6 @@ constexpr const wchar_t* frame_class = L"TALUtilPreview";
 constexpr const wchar_t* pages_class = L"TALUtilPages";
 constexpr double twips_per_inch = 1440;
 constexpr UINT first_command = 100;
-
-HINSTANCE own_module() noexcept {
-  HMODULE module = nullptr;
-  GetModuleHandleExW(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_UNCHANGED_REFCOUNT,
-                     reinterpret_cast<const wchar_t*>(&own_module), &module);
-  return module;
-}
 
 /// A window class for as long as a window needs it: its procedure must not outlive the library.
 class WindowClass {
