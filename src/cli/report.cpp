@@ -38,6 +38,7 @@ void add_table(PrintControl& print, const Platform& platform, const std::string&
   grid->LoadGrid(utf8_text(path, "the file's name"), comma_text, Boolean(true));
   if (grid->Rows() > 0) grid->put_FixedRows(1);
   fit_columns(*grid);
+  grid->WordWrap = Boolean(true);
   print.RenderObject = ObjectRef(grid);
   print.put_RenderControl(0);
 }

@@ -40,6 +40,7 @@ class Grid final : public TableObject<Grid> {
   static constexpr std::int16_t text_setting = 0;
   static constexpr std::int16_t check_box_setting = 5;
   static constexpr std::int16_t boolean_type = 11;
+  static constexpr std::int16_t general_alignment = 9;
 
   // The check-box state of a cell.
   static constexpr std::int16_t no_check_box = 0;
@@ -85,6 +86,23 @@ class Grid final : public TableObject<Grid> {
   [[nodiscard]] Boolean RowHidden(std::int32_t row) const { return Boolean(rows_[index_in(rows_, row)].is_hidden); }
   void put_RowHidden(std::int32_t row, Boolean hidden) { rows_[index_in(rows_, row)].is_hidden = bool(hidden); }
 
+  /// How a column's texts are aligned, by threes (top, middle, bottom): 0 to 2 left, 3 to 5 centred, 6 to 8 right; 9
+  /// numbers right and texts left.
+  [[nodiscard]] std::int16_t ColAlignment(std::int32_t column) const { return at(column).alignment; }
+  void put_ColAlignment(std::int32_t column, std::int16_t alignment) { at(column).alignment = alignment; }
+
+  /// The height of a row, in twips; 0 or less where it is as high as its text.
+  [[nodiscard]] std::int32_t RowHeight(std::int32_t row) const { return rows_[index_in(rows_, row)].height; }
+  void put_RowHeight(std::int32_t row, std::int32_t height) { rows_[index_in(rows_, row)].height = height; }
+
+  // How it looks where it is shown or put on pages. Colours are 0x00BBGGRR.
+  Text FontName;               ///< Empty for the usual one of the place, as a size of 0.
+  float FontSize = 0;          ///< In points.
+  Boolean WordWrap;            ///< Long texts go on in the next line of their cell, else they are cut off.
+  std::int16_t GridLines = 1;  ///< 0 for none.
+  std::int32_t GridColor = 0xC0C0C0;
+  std::int32_t BackColorFixed = 0xE8E8E8;  ///< Behind the fixed rows.
+
   /// The type of a column's values, as automation numbers them: 11 is Boolean. 0 until it is put.
   [[nodiscard]] std::int16_t ColDataType(std::int32_t column) const { return at(column).data_type; }
   void put_ColDataType(std::int32_t column, std::int16_t type) { at(column).data_type = type; }
@@ -121,11 +139,13 @@ class Grid final : public TableObject<Grid> {
   struct Column {
     std::int32_t width = default_width;
     std::int16_t data_type = 0;
+    std::int16_t alignment = general_alignment;
     Boolean is_hidden;
   };
 
   struct TableRow {
     RowText text;
+    std::int32_t height = 0;
     bool is_hidden = false;
   };
 
@@ -165,6 +185,16 @@ constexpr auto members_of(std::type_identity<Grid>) {
       P::template accessors<&G::RowHidden, &G::put_RowHidden>("RowHidden", "Whether a row is hidden.", "Row"),
       P::template accessors<&G::ColDataType, &G::put_ColDataType>("ColDataType", "The type of a column; 11 Boolean.",
                                                                   "Col"),
+      P::template accessors<&G::ColAlignment, &G::put_ColAlignment>(
+          "ColAlignment", "0 left, 3 centred, 6 right, 9 numbers right.", "Col"),
+      P::template accessors<&G::RowHeight, &G::put_RowHeight>("RowHeight",
+                                                              "The height of a row, in twips; 0 its text's.", "Row"),
+      P::template property<&G::FontName>("FontName", "The font of its texts."),
+      P::template property<&G::FontSize>("FontSize", "Its size, in points."),
+      P::template property<&G::WordWrap>("WordWrap", "Long texts go on in the next line of their cell."),
+      P::template property<&G::GridLines>("GridLines", "0 for no lines between the cells."),
+      P::template property<&G::GridColor>("GridColor", "The colour of the lines."),
+      P::template property<&G::BackColorFixed>("BackColorFixed", "The colour behind the fixed rows."),
       P::template accessors<&G::Row, &G::put_Row>("Row", "The row where the selection begins."),
       P::template accessors<&G::RowSel, &G::put_RowSel>("RowSel", "The row where the selection ends."),
       P::template method<&G::Clear>("Clear", "Empties every cell."),

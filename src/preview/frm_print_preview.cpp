@@ -92,10 +92,15 @@ void FrmPrintPreview::load() {
 
   is_loading_ = true;
   utils_ = std::make_unique<ORVUtils>(library_);
-  utils_->AppendEventLog(u"FormLoad", Text(form_name));
-  utils_->LoadWindowState(form_, Text(settings_section));
-  twips_x_ = library_.platform().screen.twips_per_pixel_x();
-  twips_y_ = library_.platform().screen.twips_per_pixel_y();
+  try {
+    utils_->AppendEventLog(u"FormLoad", Text(form_name));
+    utils_->LoadWindowState(form_, Text(settings_section));
+    twips_x_ = library_.platform().screen.twips_per_pixel_x();
+    twips_y_ = library_.platform().screen.twips_per_pixel_y();
+  } catch (...) {
+    drop();
+    throw;
+  }
 }
 
 const Control& FrmPrintPreview::print_control() {
@@ -112,7 +117,16 @@ void FrmPrintPreview::query_unload() {
 
 void FrmPrintPreview::unload() {
   if (!is_loaded()) return;
+  struct Dropped {
+    FrmPrintPreview& form;
+    ~Dropped() { form.drop(); }
+  };
+  const Dropped dropped{*this};
   query_unload();
+}
+
+void FrmPrintPreview::drop() noexcept {
+  utils_.reset();
   form_.reset();
   view_.reset();
   print_.reset();
@@ -130,9 +144,22 @@ void FrmPrintPreview::show_modal() {
   is_shown_ = true;
   {
     const Shown shown{is_shown_};
+    failure_ = nullptr;
     view_->show_modal();
   }
   unload();
+  if (failure_) std::rethrow_exception(std::exchange(failure_, nullptr));
+}
+
+/// An error of the control closes the window: its user could do nothing about it, the caller of show_modal can.
+template <class Work>
+void FrmPrintPreview::guarded(Work work) noexcept {
+  try {
+    if (is_loaded()) work();
+  } catch (...) {
+    failure_ = std::current_exception();
+    silently([this] { view_->close(); });
+  }
 }
 
 void FrmPrintPreview::show_caption() {
@@ -150,8 +177,7 @@ void FrmPrintPreview::go_to(std::int32_t page) {
 }
 
 void FrmPrintPreview::activated() noexcept {
-  silently([this] {
-    if (!is_loaded()) return;
+  guarded([this] {
     if (view_->window_state() == minimised) view_->set_window_state(normal);
     show_caption();
     do_chosen(PreviewMenu::mnuPrev);
@@ -160,14 +186,14 @@ void FrmPrintPreview::activated() noexcept {
 }
 
 void FrmPrintPreview::resized() noexcept {
-  silently([this] { keep_size(); });
+  guarded([this] { keep_size(); });
 }
 
 void FrmPrintPreview::keep_size() {
   constexpr float smallest_width = 600;  // Pixels, as the others.
   constexpr float smallest_height = 400;
   constexpr float frame = 10;
-  if (!is_loaded() || twips_x_ == 0) return;
+  if (twips_x_ == 0) return;
   if (view_->window_state() == minimised) view_->set_window_state(normal);
   if (view_->inner_height() <= 0) return;
   if (view_->width() < smallest_width * twips_x_) view_->set_width(smallest_width * twips_x_);
@@ -184,7 +210,7 @@ void FrmPrintPreview::set_zoom(PreviewMenu chosen_item) {
 }
 
 void FrmPrintPreview::zoom_step(bool larger) noexcept {
-  silently([&] {
+  guarded([&] {
     const auto zoom = print_->get<double>(u"Zoom");
     if (larger) {
       const auto* const next =
@@ -258,9 +284,7 @@ void FrmPrintPreview::do_chosen(PreviewMenu item) {
 }
 
 void FrmPrintPreview::chosen(PreviewMenu item) noexcept {
-  silently([&] {
-    if (is_loaded()) do_chosen(item);
-  });
+  guarded([&] { do_chosen(item); });
 }
 
 std::int32_t FrmPrintPreview::key_down(std::int32_t code) noexcept {
@@ -274,7 +298,7 @@ std::int32_t FrmPrintPreview::key_down(std::int32_t code) noexcept {
 }
 
 void FrmPrintPreview::closing() noexcept {
-  silently([this] { query_unload(); });
+  guarded([this] { query_unload(); });
 }
 
 }  // namespace talutil

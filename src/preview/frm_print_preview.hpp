@@ -1,5 +1,6 @@
 #pragma once
 
+#include <exception>
 #include <memory>
 
 #include "automation/variant.hpp"
@@ -37,7 +38,8 @@ class FrmPrintPreview final : public PreviewEvents {
   /// Writes the document to a PDF file, making its folder. The flag has no meaning. Fails without a word.
   void ExportToPDF(const Text& path, Boolean flag);
 
-  /// Shows the window until it is closed. Raises 400 when it is on the screen already.
+  /// Shows the window until it is closed. Raises 400 when it is on the screen already, and what paging and zooming have
+  /// raised, which closes the window: printing and exporting alone fail without a word.
   void show_modal();
 
   void unload();
@@ -56,6 +58,9 @@ class FrmPrintPreview final : public PreviewEvents {
 
   void load();
   void query_unload();
+  void drop() noexcept;
+  template <class Work>
+  void guarded(Work work) noexcept;
   void do_chosen(PreviewMenu item);
   void show_caption();
   void go_to(std::int32_t page);
@@ -73,7 +78,8 @@ class FrmPrintPreview final : public PreviewEvents {
   std::unique_ptr<Control> save_dialog_;
   std::unique_ptr<Control> pdf_export_;
   ObjectRef form_;
-  bool is_loading_ = false;  ///< From loading until the first activation.
+  std::exception_ptr failure_;  ///< What the caller of show_modal is to be told.
+  bool is_loading_ = false;     ///< From loading until the first activation.
   bool is_shown_ = false;
   float twips_x_ = 0;
   float twips_y_ = 0;

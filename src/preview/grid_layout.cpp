@@ -54,22 +54,30 @@ struct ReportComposer::GridLayout {
   std::uint32_t heading_colour = usual_heading_colour;
   std::uint32_t line_colour = usual_line_colour;
   bool has_lines = true;
+  bool wraps = false;
   std::vector<Column> columns;
-  std::size_t heading_rows = 0;  ///< Of those shown.
-  std::size_t rows = 0;
-  std::vector<Cell> cells;  ///< Row by row.
+  std::size_t heading_rows = 0;       ///< Of those shown.
+  std::vector<std::int32_t> heights;  ///< Of the rows that are shown; 0 where a row is as high as its text.
+  std::vector<Cell> cells;            ///< Row by row.
 
   GridLayout(const Control& grid, const FontStyle& usual_font, std::int32_t room);
 
-  [[nodiscard]] std::int32_t row_height() const noexcept { return line_height(font) + cell_padding; }
+  [[nodiscard]] std::size_t rows() const noexcept { return heights.size(); }
+  [[nodiscard]] const Cell& cell(std::size_t row, std::size_t column) const {
+    return cells[row * columns.size() + column];
+  }
+  [[nodiscard]] std::int32_t height_of_lines(std::int32_t lines) const noexcept {
+    return lines * line_height(font) + cell_padding;
+  }
 };
 
 ReportComposer::GridLayout::GridLayout(const Control& grid, const FontStyle& usual_font, std::int32_t room)
     : font(usual_font),
       heading_colour(colour_or(grid, u"BackColorFixed", usual_heading_colour)),
       line_colour(colour_or(grid, u"GridColor", usual_line_colour)),
-      has_lines(answer_or<std::int32_t>(grid, u"GridLines", 1) != 0) {
-  if (grid.answers(u"FontName")) font.family = family_of(grid.get<Text>(u"FontName"));
+      has_lines(answer_or<std::int32_t>(grid, u"GridLines", 1) != 0),
+      wraps(answer_or<Boolean>(grid, u"WordWrap", Boolean(false))) {
+  if (const Text name = answer_or<Text>(grid, u"FontName", {}); !name.empty()) font.family = family_of(name);
   if (const auto size = answer_or<float>(grid, u"FontSize", font.points); size >= 4 && size <= 72) font.points = size;
   const auto column_count = grid.get<std::int32_t>(u"Cols");
   for (std::int32_t c = 0; c < column_count; ++c) {
@@ -88,7 +96,7 @@ ReportComposer::GridLayout::GridLayout(const Control& grid, const FontStyle& usu
   for (std::int32_t r = 0; r < row_count; ++r) {
     if (grid.answers(u"RowHidden") && grid.get<Boolean>(u"RowHidden", {r})) continue;
     if (r < fixed_rows) ++heading_rows;
-    ++rows;
+    heights.push_back(grid.answers(u"RowHeight") ? std::max(0, grid.get<std::int32_t>(u"RowHeight", {r})) : 0);
     text->set(0, r);
     for (const Column& column : columns) {
       Cell& cell = cells.emplace_back();
@@ -102,65 +110,85 @@ ReportComposer::GridLayout::GridLayout(const Control& grid, const FontStyle& usu
   }
 }
 
-void ReportComposer::add_row(const GridLayout& layout, std::size_t row, std::size_t first, std::size_t end) {
+void ReportComposer::add_cell(const GridLayout& layout, std::size_t row, std::size_t column_index,
+                              const Rectangle& place) {
+  const GridLayout::Column& column = layout.columns[column_index];
+  const GridLayout::Cell& cell = layout.cell(row, column_index);
   const bool is_heading = row < layout.heading_rows;
-  const std::int32_t height = layout.row_height();
+  if (column.is_boolean && !is_heading) {
+    const std::int32_t size = line_height(layout.font) * 3 / 5;
+    const Rectangle box{place.left + (place.width - size) / 2, place.top + (place.height - size) / 2, size, size};
+    page().items.emplace_back(Box{.place = box, .fill = {}, .line_width = hair_line, .line_colour = 0});
+    if (cell.is_ticked) {
+      const std::int32_t inset = size / 4;
+      page().items.emplace_back(
+          Box{.place = {box.left + inset, box.top + inset, size - 2 * inset, size - 2 * inset}, .fill = 0U});
+    }
+    return;
+  }
+  Alignment alignment = column.alignment;
+  if (alignment == Alignment::general) {
+    const bool is_number = !is_heading && text_to_number(cell.text).has_value();
+    alignment = is_number ? Alignment::right : Alignment::left;
+  }
+  const std::int32_t room = place.width - 2 * cell_padding;
+  const std::int32_t height = line_height(layout.font);
+  std::int32_t top = place.top + cell_padding / 2;
+  TextView rest = cell.text;
+  while (!rest.empty() && (top + height <= place.top + place.height || rest.size() == cell.text.size())) {
+    // Without wrapping there is the first line alone, as much of it as there is room for.
+    const TextView line = layout.wraps ? take_line(rest, room, layout.font)
+                                       : fitting(rest.substr(0, rest.find_first_of(u"\r\n")), room, layout.font);
+    if (!layout.wraps) rest = {};
+    const auto spare = static_cast<std::int32_t>(std::max(0.0, room - metrics_.width(line, layout.font)));
+    std::int32_t x = place.left + cell_padding;
+    if (alignment == Alignment::centre) x += spare / 2;
+    if (alignment == Alignment::right) x += spare;
+    add_runs(line, x, top, layout.font);
+    top += height;
+  }
+}
+
+void ReportComposer::add_row(const GridLayout& layout, std::size_t row, std::int32_t height, std::size_t first,
+                             std::size_t end) {
+  const bool is_heading = row < layout.heading_rows;
   std::int32_t left = setup_.margin_left;
   for (std::size_t c = first; c < end; ++c) {
-    const GridLayout::Column& column = layout.columns[c];
-    const GridLayout::Cell& cell = layout.cells[row * layout.columns.size() + c];
-    const Rectangle place{left, y_, column.width, height};
+    const Rectangle place{left, y_, layout.columns[c].width, height};
     if (is_heading || layout.has_lines) {
       page().items.emplace_back(Box{.place = place,
                                     .fill = is_heading ? std::optional(layout.heading_colour) : std::nullopt,
                                     .line_width = layout.has_lines ? hair_line : 0,
                                     .line_colour = layout.line_colour});
     }
-    if (column.is_boolean && !is_heading) {
-      const std::int32_t size = line_height(layout.font) * 3 / 5;
-      const Rectangle box{left + (column.width - size) / 2, y_ + (height - size) / 2, size, size};
-      page().items.emplace_back(Box{.place = box, .fill = {}, .line_width = hair_line, .line_colour = 0});
-      if (cell.is_ticked) {
-        const std::int32_t inset = size / 4;
-        page().items.emplace_back(
-            Box{.place = {box.left + inset, box.top + inset, size - 2 * inset, size - 2 * inset}, .fill = 0U});
-      }
-    } else if (!cell.text.empty()) {
-      const std::int32_t room = column.width - 2 * cell_padding;
-      const std::size_t line_end = std::min(cell.text.find_first_of(u"\r\n"), cell.text.size());
-      const TextView shown = fitting(TextView(cell.text).substr(0, line_end), room, layout.font);
-      Alignment alignment = column.alignment;
-      if (alignment == Alignment::general) {
-        const bool is_number = !is_heading && text_to_number(cell.text).has_value();
-        alignment = is_number ? Alignment::right : Alignment::left;
-      }
-      std::int32_t x = left + cell_padding;
-      const auto spare = static_cast<std::int32_t>(std::max(0.0, room - metrics_.width(shown, layout.font)));
-      if (alignment == Alignment::centre) x += spare / 2;
-      if (alignment == Alignment::right) x += spare;
-      add_runs(shown, x, y_ + cell_padding / 2, layout.font);
-    }
-    left += column.width;
+    add_cell(layout, row, c, place);
+    left += place.width;
   }
   y_ += height;
 }
 
-void ReportComposer::add_columns(const GridLayout& layout, std::size_t first, std::size_t end) {
-  const auto add_headings = [&] {
-    for (std::size_t row = 0; row < layout.heading_rows; ++row) add_row(layout, row, first, end);
-  };
-  add_headings();
-  for (std::size_t row = layout.heading_rows; row < layout.rows; ++row) {
-    if (y_ + layout.row_height() > setup_.bottom() && y_ > setup_.margin_top) {
-      begin_page();
-      add_headings();
+/// How high the rows are on every page that they are on: as the grid says, else as their longest text needs.
+std::vector<std::int32_t> ReportComposer::row_heights(const GridLayout& layout) {
+  // A row that is higher than a page is cut off.
+  const std::int32_t most = setup_.bottom() - setup_.margin_top;
+  std::vector<std::int32_t> heights(layout.rows());
+  for (std::size_t row = 0; row < heights.size(); ++row) {
+    std::int32_t most_lines = 1;
+    for (std::size_t c = 0; layout.wraps && layout.heights[row] == 0 && c < layout.columns.size(); ++c) {
+      std::int32_t lines = 0;
+      for (TextView rest = layout.cell(row, c).text; !rest.empty() && layout.height_of_lines(lines) < most; ++lines) {
+        (void)take_line(rest, layout.columns[c].width - 2 * cell_padding, layout.font);
+      }
+      most_lines = std::max(most_lines, lines);
     }
-    add_row(layout, row, first, end);
+    heights[row] = std::min(most, layout.heights[row] > 0 ? layout.heights[row] : layout.height_of_lines(most_lines));
   }
+  return heights;
 }
 
 void ReportComposer::add_grid(const Control& grid, const FontStyle& font) {
   const GridLayout layout(grid, font, setup_.room());
+  const std::vector<std::int32_t> heights = row_heights(layout);
   for (std::size_t first = 0; first < layout.columns.size();) {
     std::size_t end = first;
     std::int32_t width = 0;
@@ -168,7 +196,14 @@ void ReportComposer::add_grid(const Control& grid, const FontStyle& font) {
       width += layout.columns[end++].width;
     }
     if (first > 0) begin_page();
-    add_columns(layout, first, end);
+    const auto add = [&](std::size_t row) { add_row(layout, row, heights[row], first, end); };
+    for (std::size_t row = 0; row < layout.rows(); ++row) {
+      if (row >= layout.heading_rows && y_ + heights[row] > setup_.bottom() && y_ > setup_.margin_top) {
+        begin_page();
+        for (std::size_t heading = 0; heading < layout.heading_rows; ++heading) add(heading);
+      }
+      add(row);
+    }
     first = end;
   }
 }

@@ -119,8 +119,9 @@ void write_pdf(const Document& document, const PdfInformation& information, Font
   const auto file = files.open_output(path);
   PdfDocument pdf(fonts);
   const auto inform = [&](HPDF_InfoType type, const Text& text) {
-    if (!text.empty()) HPDF_SetInfoAttr(pdf.get(), type, to_ansi(text).c_str());
+    if (!text.empty()) HPDF_SetInfoAttr(pdf.get(), type, to_utf8(text).c_str());
   };
+  HPDF_SetCurrentEncoder(pdf.get(), "UTF-8");
   inform(HPDF_INFO_TITLE, information.title);
   inform(HPDF_INFO_AUTHOR, information.author);
   inform(HPDF_INFO_SUBJECT, information.subject);

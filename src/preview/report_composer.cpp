@@ -17,9 +17,11 @@ Box rule(std::int32_t left, std::int32_t top, std::int32_t width) {
   return {.place = {left, top, width, 0}, .fill = {}, .line_width = hair_line, .line_colour = black};
 }
 
-bool is_control(char16_t unit) noexcept { return (unit < u' ' && unit != u'\t') || unit == 0x7F; }
+bool is_control(char16_t unit) noexcept {
+  return (unit < u' ' && unit != u'\t' && unit != u'\r' && unit != u'\n') || unit == 0x7F;
+}
 
-/// Control characters by the letter that is typed with them.
+/// Control characters by the letter that is typed with them; those that end lines stay.
 Text with_visible_controls(TextView text) {
   Text result;
   for (const char16_t unit : text) {
@@ -156,29 +158,31 @@ TextView ReportComposer::fitting(TextView text, double room, const FontStyle& fo
   return text;
 }
 
+/// The next line of a text that is broken into a room's width: between words where there are any, after a character
+/// otherwise. What is left of the text begins behind the break.
+TextView ReportComposer::take_line(TextView& text, double room, const FontStyle& font) {
+  const std::size_t line_end = std::min(text.find_first_of(u"\r\n"), text.size());
+  const TextView line = text.substr(0, line_end);
+  std::size_t shown = fitting(line, room, font).size();
+  if (shown == line.size()) {
+    text.remove_prefix(std::min(line_end + (text.substr(line_end).starts_with(u"\r\n") ? 2 : 1), text.size()));
+    return line;
+  }
+  const std::size_t blank = line.find_last_of(u' ', shown);
+  if (blank != Text::npos && blank > 0) shown = blank;
+  // A room that is too narrow for any character has one all the same, so that there is an end.
+  shown = std::max<std::size_t>(shown, 1);
+  text.remove_prefix(std::min(text.find_first_not_of(u' ', shown), text.size()));
+  return line.substr(0, shown);
+}
+
 void ReportComposer::add_text_box(TextView text, const Rectangle& place, const FontStyle& font) {
   const std::int32_t height = line_height(font);
-  std::int32_t top = place.top;
-  for (std::size_t at = 0; at < text.size() && top + height <= place.top + std::max(place.height, height);) {
-    const std::size_t line_end = std::min(text.find_first_of(u"\r\n", at), text.size());
-    const Text line = with_visible_controls(text.substr(at, line_end - at));
-    TextView part = fitting(line, place.width, font);
-    std::size_t used = part.size();
-    if (used < line.size()) {
-      const std::size_t blank = part.find_last_of(u' ');
-      if (line[used] != u' ' && blank != Text::npos && blank > 0) used = blank;
-      part = part.substr(0, used);
-      if (used == 0) used = 1;
-    }
-    add_runs(part, place.left, top, font);
-    top += height;
-    // Shown control characters take two places: a line that has them is not continued.
-    if (used < line.size() && line.size() == line_end - at) {
-      at += used;
-      while (at < text.size() && text[at] == u' ') ++at;
-    } else {
-      at = text.substr(line_end).starts_with(u"\r\n") ? line_end + 2 : line_end + 1;
-    }
+  const Text shown = with_visible_controls(text);
+  TextView rest = shown;
+  for (std::int32_t top = place.top; !rest.empty() && top + height <= place.top + std::max(place.height, height);
+       top += height) {
+    add_runs(take_line(rest, place.width, font), place.left, top, font);
   }
 }
 

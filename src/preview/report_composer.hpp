@@ -45,8 +45,9 @@ class ReportComposer {
   /// A text in a box, cut off at its edges, wherever the box lies: no page is begun for it.
   void add_text_box(TextView text, const Rectangle& place, const FontStyle& font);
 
-  /// A grid as it looks: the rows and columns that it shows, widths, alignments, fonts and colours where it answers for
-  /// them. Its fixed rows stand on top of every page; columns that do not fit follow on pages of their own.
+  /// A grid as it looks: the rows and columns that it shows, widths, heights, alignments, fonts and colours where it
+  /// answers for them; long texts in more lines where it wraps them, else cut off. Its fixed rows stand on top of every
+  /// page; columns that do not fit follow on pages of their own.
   void add_grid(const Control& grid, const FontStyle& font);
 
   /// A picture, made smaller where it is larger than the page's room.
@@ -67,8 +68,10 @@ class ReportComposer {
   void add_paragraph(TextView text, const FontStyle& font);
   [[nodiscard]] double after_tab(double x, const FontStyle& font);
   [[nodiscard]] TextView fitting(TextView text, double room, const FontStyle& font);
-  void add_columns(const GridLayout& layout, std::size_t first, std::size_t end);
-  void add_row(const GridLayout& layout, std::size_t row, std::size_t first, std::size_t end);
+  [[nodiscard]] TextView take_line(TextView& text, double room, const FontStyle& font);
+  void add_cell(const GridLayout& layout, std::size_t row, std::size_t column, const Rectangle& place);
+  [[nodiscard]] std::vector<std::int32_t> row_heights(const GridLayout& layout);
+  void add_row(const GridLayout& layout, std::size_t row, std::int32_t height, std::size_t first, std::size_t end);
 
   FontMetrics& metrics_;
   PageSetup setup_;

@@ -206,6 +206,33 @@ TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
   EXPECT_EQ(utils.GetCfgFileData(u"PrintPreview", u"WindowWidth", u"", u"", Boolean(false)), u"12000");
 }
 
+TEST_F(Builders, ErrorsOfPagingReachTheCallerOthersNobody) {
+  source->values["Text"] = u"words";
+  const auto outcome = [&](PreviewMenu item) {
+    platform.preview.user = [&](PreviewEvents& events) {
+      print->before = [](const std::string& use) {
+        if (use == "PageCount" || use.starts_with("call Print")) raise(ErrorNumber::permission_denied);
+      };
+      events.chosen(item);
+      print->before = {};
+    };
+    const auto error = error_of([&] { utils.TextBoxPrintPreview(50, 1, u"Notes", u"C:\\x", holder); });
+    platform.preview.user = {};
+    EXPECT_EQ(platform.preview.windows, 0) << "closed";
+    return error;
+  };
+  print->methods.emplace_back("PrintDoc");
+  EXPECT_EQ(outcome(PreviewMenu::mnuNext), 70);
+  EXPECT_EQ(outcome(PreviewMenu::mnuPrinter), 0);
+  EXPECT_EQ(outcome(PreviewMenu::mnuExportPDF), 0);
+
+  library.settings().EventLog = 1;
+  library.settings().sORVPath = u"C:";
+  platform.files.failures = {{u"append", ErrorNumber::permission_denied}};
+  EXPECT_EQ(error_of([&] { utils.TextBoxPrintPreview(50, 1, u"Notes", u"C:\\x", holder); }), 70);
+  EXPECT_FALSE(library.preview().is_loaded()) << "a log that cannot be written leaves no half window";
+}
+
 struct Pages : Preview {
   std::shared_ptr<PrintControl> print = std::make_shared<PrintControl>(library.platform());
 
@@ -273,6 +300,46 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
                                     "1194,1668 N2\n"));
   EXPECT_THAT(runs_of(document.pages[1]), ::testing::StartsWith("1194,1164 Name\n")) << "headings on every page";
   EXPECT_THAT(runs_of(document.pages[2]), ::testing::StartsWith("1194,1164 Far\n1194,1416 far\n"));
+
+  // Long texts go on in the next line where the grid shows them so; a row's own height cuts them off.
+  const auto small = std::make_shared<Grid>(library.platform());
+  const auto runs_of_small = [&] {
+    print->StartDoc();
+    print->RenderObject = ObjectRef(small);
+    print->put_RenderControl(1);
+    print->EndDoc();
+    const std::string runs = runs_of(print->document().pages[0]);
+    return runs.substr(0, runs.find("1134,15944"));
+  };
+  small->put_Cols(2);
+  small->AddItem(u"one two three four\t7", -1);
+  small->AddItem(u"next\tb", -1);
+  small->put_ColAlignment(1, 3);
+  EXPECT_EQ(runs_of_small(), "1194,1164 one two t\n2586,1164 7\n1194,1416 next\n2586,1416 b\n");
+  small->WordWrap = Boolean(true);
+  EXPECT_EQ(runs_of_small(),
+            "1194,1164 one two\n1194,1356 three\n1194,1548 four\n2586,1164 7\n1194,1800 next\n2586,1800 b\n");
+  small->put_RowHeight(0, 450);
+  EXPECT_EQ(runs_of_small(), "1194,1164 one two\n1194,1356 three\n2586,1164 7\n1194,1614 next\n2586,1614 b\n");
+  small->FontName = u"Times New Roman";
+  small->FontSize = 20;
+  small->GridLines = 0;
+  (void)runs_of_small();
+  const auto& items = print->document().pages[0].items;
+  const auto* const run = std::get_if<TextRun>(&items[0]);
+  ASSERT_NE(run, nullptr) << "no lines";
+  EXPECT_EQ(run->font, (FontStyle{FontFamily::times, false, 20}));
+
+  // A grid that fails in the middle leaves the document as it was.
+  const auto broken = std::make_shared<RecordingControl>();
+  broken->values = {{"Rows", 2}, {"Cols", 1}, {"TextMatrix(0&, 0&)", u"a"}};
+  print->StartDoc();
+  print->put_Text(u"before");
+  print->RenderObject = ObjectRef(broken);
+  EXPECT_EQ(error_of([&] { print->put_RenderControl(1); }), 9);
+  print->put_Text(u"after");
+  print->EndDoc();
+  EXPECT_THAT(runs_of(print->document().pages[0]), ::testing::StartsWith("1134,1134 before\n1134,1374 after\n"));
 
   // What answers for nothing but its window is a picture.
   print->StartDoc();

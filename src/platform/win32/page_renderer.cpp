@@ -53,9 +53,13 @@ class Drawer {
       : device_(device), placement_(placement), fonts_(device, placement.scale_y) {
     SetBkMode(device, TRANSPARENT);
     SetTextAlign(device, TA_BASELINE | TA_LEFT);
+    // A device that only records has no edges.
+    has_edges_ = GetClipBox(device, &seen_) > NULLREGION && IsRectEmpty(&seen_) == FALSE &&
+                 GetObjectType(device) != OBJ_ENHMETADC;
   }
 
   void draw(const TextRun& run) {
+    if (is_unseen({run.left, run.top, run.width, line_height(run.font)})) return;
     fonts_.select(run.font);
     SetTextColor(device_, run.colour);
     const auto length = static_cast<int>(run.text.size());
@@ -75,6 +79,7 @@ class Drawer {
   }
 
   void draw(const Box& box) {
+    if (is_unseen(box.place)) return;
     const RECT place = rectangle_of(box.place);
     if (box.fill) {
       const HBRUSH brush = CreateSolidBrush(*box.fill);
@@ -96,7 +101,7 @@ class Drawer {
   }
 
   void draw(const Picture& picture) {
-    if (!picture.pixels) return;
+    if (!picture.pixels || is_unseen(picture.place)) return;
     // The device wants blue first and rows of a multiple of four bytes.
     const std::size_t row_bytes = (static_cast<std::size_t>(picture.width) * 3 + 3) / 4 * 4;
     std::vector<std::uint8_t> rows(row_bytes * static_cast<std::size_t>(picture.height));
@@ -124,8 +129,19 @@ class Drawer {
     return {x_of(place.left), y_of(place.top), x_of(place.left + place.width), y_of(place.top + place.height)};
   }
 
+  /// Whether a place lies where nothing is drawn. Letters and lines may reach a little beyond theirs.
+  [[nodiscard]] bool is_unseen(const Rectangle& place) const {
+    if (!has_edges_) return false;
+    constexpr LONG beyond = 8;
+    const RECT here = rectangle_of(place);
+    return here.right + beyond < seen_.left || here.left - beyond > seen_.right || here.bottom + beyond < seen_.top ||
+           here.top - beyond > seen_.bottom;
+  }
+
   HDC device_;
   const PagePlacement& placement_;
+  RECT seen_{};
+  bool has_edges_ = false;
   Fonts fonts_;
 };
 

@@ -157,9 +157,12 @@ class PagesWindow {
   void scroll_to(Bar& bar, int position) {
     position = std::clamp(position, 0, bar.last);
     if (position == bar.position) return;
-    bar.position = position;
+    const int distance = std::exchange(bar.position, position) - position;
     SetScrollPos(window_, bar.direction, position, TRUE);
-    InvalidateRect(window_, nullptr, FALSE);
+    // What stays in sight is moved, the rest drawn.
+    const bool is_down = bar.direction == SB_VERT;
+    ScrollWindowEx(window_, is_down ? 0 : distance, is_down ? distance : 0, nullptr, nullptr, nullptr, nullptr,
+                   SW_INVALIDATE);
   }
 
   void scroll_by(Bar& bar, int distance) { scroll_to(bar, bar.position + distance); }
@@ -219,13 +222,17 @@ class PagesWindow {
     const HDC screen = BeginPaint(window_, &painting);
     RECT room;
     GetClientRect(window_, &room);
+    const RECT& part = painting.rcPaint;
+    const int width = static_cast<int>(part.right - part.left);
+    const int height = static_cast<int>(part.bottom - part.top);
     const HDC memory = CreateCompatibleDC(screen);
-    const HBITMAP bitmap =
-        CreateCompatibleBitmap(screen, std::max(room.right, LONG{1}), std::max(room.bottom, LONG{1}));
+    const HBITMAP bitmap = CreateCompatibleBitmap(screen, std::max(width, 1), std::max(height, 1));
     const HGDIOBJ before = SelectObject(memory, bitmap);
+    SetWindowOrgEx(memory, static_cast<int>(part.left), static_cast<int>(part.top), nullptr);
     draw(memory, room);
     SelectClipRgn(memory, nullptr);
-    BitBlt(screen, 0, 0, room.right, room.bottom, memory, 0, 0, SRCCOPY);
+    BitBlt(screen, static_cast<int>(part.left), static_cast<int>(part.top), width, height, memory,
+           static_cast<int>(part.left), static_cast<int>(part.top), SRCCOPY);
     SelectObject(memory, before);
     DeleteObject(bitmap);
     DeleteDC(memory);

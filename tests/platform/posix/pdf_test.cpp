@@ -33,7 +33,8 @@ struct PdfTest : ::testing::Test {
   ~PdfTest() override { remove(path.c_str()); }
 
   void write(const Document& document) {
-    write_pdf(document, {u"Title", u"Author", u"Subject", u"Creator"}, fonts, files, from_utf8(path));
+    write_pdf(document, {u"Title \u041F\u0440\u0438 \u20AC", u"Author", u"Subject", u"Creator"}, fonts, files,
+              from_utf8(path));
   }
 };
 
@@ -56,7 +57,7 @@ TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
   const Document document = composer.finish();
   write(document);
   EXPECT_EQ(output_of("qpdf --check " + path + " 2>&1 | grep -c 'No syntax or stream encoding errors'"), "1\n");
-  EXPECT_EQ(output_of("pdfinfo " + path + " | grep -c -E 'Title: +Title|Author: +Author|Pages: +2'"), "3\n");
+  EXPECT_EQ(output_of("pdfinfo " + path + " | grep -c -E 'Title: +Title При €|Author: +Author|Pages: +2'"), "3\n");
 
   // Each run that is a single word, is a word of the file at the same place.
   struct Word {

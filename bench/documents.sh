@@ -1,0 +1,64 @@
+#!/usr/bin/env bash
+# Reports against other programs that make PDF: bench/documents.sh PATH_TO_TALUTIL
+# A table of 10,000 rows against LibreOffice, where it is installed, and a text of 100,000 lines against enscript and
+# ps2pdf; then what more pages cost. The ratios are of the best of three times, taken in turn.
+set -euo pipefail
+[ -x "${1:-}" ] || { echo "usage: bench/documents.sh PATH_TO_TALUTIL" >&2; exit 2; }
+talutil=$(realpath "$1")
+work=$(mktemp -d)
+trap 'rm -rf "$work"' EXIT
+cd "$work"
+
+# Seconds and peak kilobytes of a command.
+measure() { /usr/bin/env python3 - "$@" <<'P'
+import resource, subprocess, sys, time
+begin = time.monotonic()
+subprocess.run(sys.argv[1:], check=True, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
+print(f"{time.monotonic() - begin:.2f} {resource.getrusage(resource.RUSAGE_CHILDREN).ru_maxrss}")
+P
+}
+
+least() { sort -n | head -1; }
+
+compare() {  # WHAT, GOAL, ours, theirs: files of measurements
+  local ours theirs
+  ours=$(least <"$3")
+  theirs=$(least <"$4")
+  printf '%s: %s s, %s KB; theirs %s s, %s KB; ratio %s (goal: at most %s)\n' "$1" $ours $theirs \
+    "$(awk "BEGIN { printf \"%.3f\", ${ours% *} / ${theirs% *} }")" "$2"
+}
+
+awk 'BEGIN { print "Number,Name,Date,Amount,Remark"
+  for (i = 1; i <= 10000; ++i)
+    printf "%d,Customer %d,%02d/%02d/2026,%.2f,\"delivered, signed for %d\"\n", i, i * 7, i % 28 + 1, i % 12 + 1, i * 1.37, i }' >table.csv
+awk 'BEGIN { for (i = 1; i <= 100000; ++i) printf "Line %d of a text with some sixty characters, as in lists and logs\n", i }' >text.txt
+
+if command -v soffice >/dev/null; then
+  for _ in 1 2 3; do
+    measure "$talutil" report table.csv --pdf ours.pdf >>table-ours
+    measure soffice "-env:UserInstallation=file://$work/profile" --headless --convert-to pdf --outdir theirs table.csv >>table-theirs
+  done
+  compare "a table of 10,000 rows, against LibreOffice" 0.1 table-ours table-theirs
+else
+  echo "a table of 10,000 rows, against LibreOffice: not measured, soffice is not installed"
+fi
+if command -v enscript >/dev/null; then
+  for _ in 1 2 3; do
+    measure "$talutil" report text.txt --pdf ours.pdf >>text-ours
+    measure sh -c 'enscript -q -p - text.txt | ps2pdf - theirs.pdf' >>text-theirs
+  done
+  compare "a text of 100,000 lines, against enscript and ps2pdf" 0.5 text-ours text-theirs
+else
+  echo "a text of 100,000 lines, against enscript and ps2pdf: not measured, enscript is not installed"
+fi
+
+for lines in 1000 10000 100000; do
+  head -n "$lines" text.txt >part.txt
+  figures=$(measure "$talutil" report part.txt --pdf part.pdf)
+  pages=$(pdfinfo part.pdf | sed -n 's/^Pages: *//p')
+  printf '%s pages (%s KB of text): %s s, %s pages a second, peak memory %s KB\n' "$pages" \
+    "$(($(stat -c %s part.txt) / 1024))" "${figures% *}" "$(awk "BEGIN { printf \"%.0f\", $pages / (${figures% *} + 0.001) }")" "${figures#* }"
+done
+awk 'BEGIN { for (r = 0; r <= 10000; ++r) { for (c = 0; c < 200; ++c) printf c ? ",c%d.%d" : "r%d", r, c; print "" } }' >wide.csv
+measure "$talutil" report wide.csv --pdf wide.pdf >wide
+printf 'a table of 10,000 rows and 200 columns: %s s, %s KB, %s pages\n' $(cat wide) "$(pdfinfo wide.pdf | sed -n 's/^Pages: *//p')"
