@@ -29,6 +29,7 @@ std::string_view standard_description(std::int32_t number) noexcept {
     case ErrorNumber::path_not_found: return "Path not found";  // 76
     case ErrorNumber::object_variable_not_set: return "Object variable or With block variable not set";  // 91
     case ErrorNumber::invalid_use_of_null: return "Invalid use of Null";  // 94
+    case ErrorNumber::form_already_displayed: return "Form already displayed; can't show modally";  // 400
     case ErrorNumber::object_required: return "Object required";  // 424
     case ErrorNumber::cannot_create_object: return "ActiveX component can't create object";  // 429
     case ErrorNumber::member_not_supported: return "Object doesn't support this property or method";  // 438

@@ -33,6 +33,7 @@ enum class ErrorNumber : std::int32_t {
   path_not_found = 76,
   object_variable_not_set = 91,
   invalid_use_of_null = 94,
+  form_already_displayed = 400,
   object_required = 424,
   cannot_create_object = 429,
   member_not_supported = 438,

@@ -108,6 +108,12 @@ struct ReportOptions {
 };
 void report(const ReportOptions& options);
 
+struct SystemOptions {
+  bool json = false;
+  std::string item;  ///< A file or folder that details are wanted of; empty for none.
+};
+void system_information(const SystemOptions& options);
+
 struct LogTailOptions {
   std::string path;  ///< The event log, or the folder it is in.
   std::int64_t lines = 10;

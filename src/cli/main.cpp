@@ -26,6 +26,7 @@ struct Request {
   UnzipOptions unzip;
   ExportOptions export_table;
   ReportOptions report;
+  SystemOptions system;
   LogTailOptions log_tail;
   std::function<void()> run;
 };
@@ -216,6 +217,14 @@ void add_log(CLI::App& app, Request& request) {
   tail->callback([&] { request.run = [&] { log_tail(request.log_tail); }; });
 }
 
+void add_system(CLI::App& app, Request& request) {
+  auto* const command =
+      app.add_subcommand("sysinfo", "Print what is known of the machine, and of a file or folder where one is named");
+  command->add_option("PATH", request.system.item, "A file or folder (C:\\TAL, /var/log)");
+  command->add_flag("--json", request.system.json, "Print JSON; sizes are bytes, times seconds");
+  command->callback([&] { request.run = [&] { system_information(request.system); }; });
+}
+
 void add_printers(CLI::App& app, Request& request) {
   app.add_subcommand("idl", "Print the interface definition of the type library")->callback([&] {
     request.run = [] { std::cout << talutil::interface_definition(); };
@@ -260,6 +269,7 @@ int run(std::vector<std::string> words) {
   add_export(app, request);
   add_report(app, request);
   add_log(app, request);
+  add_system(app, request);
   add_printers(app, request);
   if (!words.empty() && !words.front().starts_with('-')) check_subcommand(app, words.front());
   if (!words.empty() && words.front() == "call") request.call.arguments = take_verbatim(words);

@@ -22,6 +22,7 @@
 #include "platform/win32/win32_folders.hpp"
 #include "platform/win32/win32_guids.hpp"
 #include "platform/win32/win32_input_boxes.hpp"
+#include "platform/win32/win32_machine.hpp"
 #include "platform/win32/win32_platform.hpp"
 #include "platform/win32/win32_printers.hpp"
 #include "platform/win32/win32_registry.hpp"
@@ -58,11 +59,13 @@ struct LoadedLibrary {
   win32::Win32WindowPrinting window_printing;
   win32::Win32FontFiles font_files;
   win32::Win32Printers printers;
+  win32::Win32Machine machine;
   Library library{Platform{message_boxes,  screen,           computer,      clock,         form_windows,
                            control_makers, message_pump,     random_source, cryptography,  profiles,
                            settings_store, time_conversions, files,         folder_picker, guids,
                            folders,        input_boxes,      registry,      network,       file_dialogs,
-                           drawing,        window_printing,  font_files,    printers}};
+                           drawing,        window_printing,  font_files,    printers,
+                           machine}};
 };
 
 struct Module {
@@ -75,10 +78,12 @@ struct Module {
 
 Module module_state;
 
-/// True when nothing of the library would be missed: no object, no lock, no object of a host in the settings.
+/// True when nothing of the library would be missed: no object, no lock, no object of a host in the settings, no window
+/// on the screen.
 bool nothing_is_held(Library& library) {
   const SharedSettings& settings = library.settings();
-  return !settings.FolderBrowseForm && !settings.SplashForm && !settings.DrawTextPictureBox;
+  return !settings.FolderBrowseForm && !settings.SplashForm && !settings.DrawTextPictureBox &&
+         !library.has_open_windows();
 }
 
 template <class C>

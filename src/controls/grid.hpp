@@ -114,7 +114,8 @@ class Grid final : public TableObject<Grid> {
   void put_RowSel(std::int32_t row);
 
   /// The window of the grid, which builders of reports ask for: 0 for a table that is not shown.
-  [[nodiscard]] std::int32_t hwnd() const noexcept { return 0; }
+  [[nodiscard]] std::int32_t hwnd() const noexcept { return window_; }
+  void set_window(std::int32_t window) noexcept { window_ = window; }
 
   /// Empties every cell.
   void Clear();
@@ -166,13 +167,14 @@ class Grid final : public TableObject<Grid> {
   std::int32_t fixed_columns_ = 0;
   std::int32_t row_ = -1;
   std::int32_t row_end_ = -1;
+  std::int32_t window_ = 0;
 };
 
 template <class P>
 constexpr auto members_of(std::type_identity<Grid>) {
   using G = Grid;
   return P::rows(
-      P::template get_only<&G::hwnd>("hwnd", "Its window: 0, since it has none."),
+      P::template get_only<&G::hwnd>("hwnd", "Its window; 0 while it is not shown."),
       P::template accessors<&G::Rows, &G::put_Rows>("Rows", "The number of rows."),
       P::template accessors<&G::Cols, &G::put_Cols>("Cols", "The number of columns."),
       P::template accessors<&G::FixedRows, &G::put_FixedRows>("FixedRows", "The rows that are headings."),

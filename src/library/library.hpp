@@ -11,8 +11,12 @@
 namespace talutil {
 
 class ControlFactory;
+class FrmCmdLineHelp;
 class FrmComponents;
+class FrmInputBox;
 class FrmPrintPreview;
+class FrmShKeys;
+class FrmSysInfo;
 
 /// One loaded library: the shared settings, the platform and the components window. The DLL has exactly one.
 class Library {
@@ -33,8 +37,18 @@ class Library {
   [[nodiscard]] FrmComponents& components() noexcept { return *components_; }
   [[nodiscard]] ControlFactory& controls() noexcept { return *controls_; }
 
-  /// The preview window, made when it is first asked for.
+  // Windows, made when they are first asked for.
   [[nodiscard]] FrmPrintPreview& preview();
+  [[nodiscard]] FrmInputBox& input_box();
+  [[nodiscard]] FrmShKeys& shortcut_keys();
+  [[nodiscard]] FrmCmdLineHelp& command_line_help();
+  [[nodiscard]] FrmSysInfo& system_information();
+
+  /// Whether one of them is on the screen.
+  [[nodiscard]] bool has_open_windows() const noexcept;
+
+  /// Takes those off the screen that nobody waits for.
+  void close_notices();
 
   /// The user's separators as they were at start-up, with the current year of the clock.
   [[nodiscard]] Locale locale() const;
@@ -48,6 +62,10 @@ class Library {
   std::unique_ptr<ControlFactory> controls_;
   std::unique_ptr<FrmComponents> components_;
   std::unique_ptr<FrmPrintPreview> preview_;
+  std::unique_ptr<FrmInputBox> input_box_;
+  std::unique_ptr<FrmShKeys> shortcut_keys_;
+  std::unique_ptr<FrmCmdLineHelp> command_line_help_;
+  std::unique_ptr<FrmSysInfo> system_information_;
 };
 
 }  // namespace talutil

@@ -1,6 +1,10 @@
 #include "automation/checked.hpp"
 #include "controls/control_factory.hpp"
+#include "forms/frm_input_box.hpp"
+#include "infoforms/frm_cmd_line_help.hpp"
 #include "infoforms/frm_components.hpp"
+#include "infoforms/frm_sh_keys.hpp"
+#include "infoforms/frm_sys_info.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "preview/frm_print_preview.hpp"
@@ -21,9 +25,31 @@ void Library::start() {
   settings_.ScreenTwipsPerPixelY = round_to<std::int32_t>(platform_.screen.twips_per_pixel_y());
 }
 
-FrmPrintPreview& Library::preview() {
-  if (!preview_) preview_ = std::make_unique<FrmPrintPreview>(*this);
-  return *preview_;
+namespace {
+
+template <class Window>
+Window& made_once(std::unique_ptr<Window>& window, Library& library) {
+  if (!window) window = std::make_unique<Window>(library);
+  return *window;
+}
+
+}  // namespace
+
+FrmPrintPreview& Library::preview() { return made_once(preview_, *this); }
+FrmInputBox& Library::input_box() { return made_once(input_box_, *this); }
+FrmShKeys& Library::shortcut_keys() { return made_once(shortcut_keys_, *this); }
+FrmCmdLineHelp& Library::command_line_help() { return made_once(command_line_help_, *this); }
+FrmSysInfo& Library::system_information() { return made_once(system_information_, *this); }
+
+bool Library::has_open_windows() const noexcept {
+  const auto is_open = [](const auto& window) { return window && window->is_loaded(); };
+  return is_open(preview_) || is_open(input_box_) || is_open(shortcut_keys_) || is_open(command_line_help_) ||
+         is_open(system_information_);
+}
+
+void Library::close_notices() {
+  if (input_box_ && !input_box_->is_shown_modal()) input_box_->unload();
+  if (shortcut_keys_) shortcut_keys_->unload();
 }
 
 Locale Library::locale() const {
@@ -41,6 +67,7 @@ void ORVUtils::Terminate() {
   if (settings().DebugMode == 1) {
     library_.platform().message_boxes.show(u"Closing ORVUtils Components form", MessageButtons::ok, {});
   }
+  library_.close_notices();
   library_.components().unload();
 }
 

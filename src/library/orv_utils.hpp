@@ -223,7 +223,12 @@ class ORVUtils {
   /// name machinery are converted as all others.
   virtual Variant ConvertCaseSuburbs(const Variant& vStr);
 
+  /// Shows the list of the host's shortcut keys, above all other windows, and returns; a list that is open already
+  /// comes to the front. Raises 445 where there is no screen.
   virtual void ShowShortCutKeys();
+
+  /// Shows the host's command-line switches with examples, until the user closes the window. Raises 445 where there is
+  /// no screen.
   virtual void ShowCmdLineHelp();
 
   /// A random password of iMaxLength characters; empty for 0 or less. iMix 0 draws decimal digits, 1 letters and
@@ -406,6 +411,8 @@ class ORVUtils {
   /// A stored duration in minutes. Writes back and raises what ConvertDatabaseDurationToNumber does.
   virtual std::int32_t ConvertDatabaseDurationToMinutes(Variant& vDuration);
 
+  /// Shows what is to be known of the machine (drives, memory, processor, operating system) and of a folder or file,
+  /// until the user closes the window. Raises 445 where there is no screen.
   virtual void ShowSysInfo();
 
   /// Deletes the files that match; wildcards may stand in the last part. Read-only files stay. Never fails and never
@@ -460,6 +467,11 @@ class ORVUtils {
   /// True when there is at least one digit.
   virtual Boolean NumbersInString(const Text& sSource);
 
+  /// Asks for a text in a box that stays above all other windows; the text in clear, though bPassword shows asterisks.
+  /// Empty when the box was closed by its menu. Without an entry (bShowUserInput False) OK gives the empty text. With
+  /// bNoFrame and bNonCloseable both True it is a notice: the call returns at once, with the result of the box's last
+  /// use, and the notice stays until Terminate. The prompt makes the box higher where it is long. lBackColor is
+  /// 0x00BBGGRR, or a system colour. Raises 400 when the box is on the screen already, 445 where there is no screen.
   virtual Text MyInputBox(const Text& sCaption, const Text& sPrompt, const Boolean& bPassword,
                           const Boolean& bShowUserInput, const Boolean& bNoFrame, const Boolean& bNonCloseable,
                           const std::int32_t& lBackColor);

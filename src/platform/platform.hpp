@@ -16,6 +16,7 @@
 #include "platform/font_files.hpp"
 #include "platform/guids.hpp"
 #include "platform/input_boxes.hpp"
+#include "platform/machine.hpp"
 #include "platform/network.hpp"
 #include "platform/printers.hpp"
 #include "platform/registry.hpp"
@@ -77,6 +78,9 @@ class HiddenWindow {
   [[nodiscard]] virtual std::intptr_t handle() const noexcept = 0;
 };
 
+class FormEvents;
+class FormView;
+struct FormDescription;
 class PreviewEvents;
 class PreviewView;
 class PrintControl;
@@ -85,6 +89,9 @@ class FormWindows {
  public:
   virtual ~FormWindows() = default;
   [[nodiscard]] virtual std::unique_ptr<HiddenWindow> make_hidden(TextView caption) = 0;
+
+  /// A window with controls. The description and the presenter outlive it. Raises 445 where there is no screen.
+  [[nodiscard]] virtual std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) = 0;
 
   /// The preview window, which shows the pages of a print control; null for another maker's, which shows them itself.
   /// Both outlive the view.
@@ -138,6 +145,7 @@ struct Platform {
   WindowPrinting& window_printing;
   FontFiles& font_files;
   Printers& printers;
+  Machine& machine;
 };
 
 }  // namespace talutil

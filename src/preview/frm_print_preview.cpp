@@ -135,7 +135,7 @@ void FrmPrintPreview::drop() noexcept {
 }
 
 void FrmPrintPreview::show_modal() {
-  if (is_shown_) throw RunTimeError(already_shown, u"Form already displayed; can't show modally");
+  if (is_shown_) raise(ErrorNumber::form_already_displayed);
   load();
   struct Shown {
     bool& flag;

@@ -20,9 +20,6 @@ class FrmPrintPreview final : public PreviewEvents {
   static constexpr TextView form_name = u"frmPrintPreview";
   static constexpr TextView settings_section = u"PrintPreview";
 
-  /// "Form already displayed; can't show modally".
-  static constexpr std::int32_t already_shown = 400;
-
   explicit FrmPrintPreview(Library& library);
   FrmPrintPreview(const FrmPrintPreview&) = delete;
   FrmPrintPreview& operator=(const FrmPrintPreview&) = delete;

@@ -14,6 +14,7 @@
 #include "platform/platform.hpp"
 #include "preview/page_model.hpp"
 #include "tests/fakes/fake_files.hpp"
+#include "tests/fakes/fake_form.hpp"
 #include "tests/fakes/fake_preview.hpp"
 #include "tests/fakes/fake_registry.hpp"
 #include "tests/fakes/fake_settings.hpp"
@@ -37,6 +38,7 @@ struct FakePlatform : MessageBoxes,
                       WindowPrinting,
                       FontFiles,
                       Printers,
+                      Machine,
                       CalendarTimeConversions {
   struct Message {
     Text text;
@@ -77,7 +79,11 @@ struct FakePlatform : MessageBoxes,
   std::vector<FileDialog> file_dialogs;
   std::vector<std::string> drawn;  ///< What was drawn and printed, in words.
   std::int32_t pointer_resets = 0;
-  FakePreviewState preview;         ///< What the preview window shows, and what its user does.
+  FakePreviewState preview;  ///< What the preview window shows, and what its user does.
+  FakeFormState form;        ///< What the other windows show.
+  std::vector<DriveFacts> drive_facts{{u"C:", u"Fixed", u"SYSTEM", u"NTFS", 1000ULL << 30, 250ULL << 30},
+                                      {u"D:", u"CD-ROM", u"", u"", 0, 0}};
+  std::map<Text, ItemFacts> items;  ///< Files and folders that there are details of.
   FontFiles* font_files = nullptr;  ///< Where wide fonts come from.
   std::vector<PrintSettings> print_jobs;
   bool prints = true;  ///< Whether the printer dialog is answered with OK.
@@ -108,9 +114,10 @@ struct FakePlatform : MessageBoxes,
     Folders* used_folders = real_folders == nullptr ? this : real_folders;
     Registry& used_registry = real_registry == nullptr ? registry : *real_registry;
     Network& used_network = real_network == nullptr ? network : *real_network;
-    return {*this,         *this,         *this,          *this,       *this,      *this,         *this, *this,
-            *cryptography, profiles,      settings_store, conversions, used_files, folder_picker, guids, *used_folders,
-            *this,         used_registry, used_network,   *this,       *this,      *this,         *this, *this};
+    return {*this, *this,         *this,    *this,          *this,        *this,      *this,
+            *this, *cryptography, profiles, settings_store, conversions,  used_files, folder_picker,
+            guids, *used_folders, *this,    used_registry,  used_network, *this,      *this,
+            *this, *this,         *this,    *this};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
@@ -179,6 +186,20 @@ struct FakePlatform : MessageBoxes,
     print_jobs.push_back(settings);
     if (document.pages.empty()) return false;
     return prints;
+  }
+
+  std::vector<DriveFacts> drives() override { return drive_facts; }
+  MemoryFacts memory() override { return {8ULL << 30, 2ULL << 30, 0, 0}; }
+  ProcessorFacts processor() override { return {u"A processor", u"x86", 4, 2400}; }
+  OperatingSystemFacts operating_system() override { return {u"A system", u"10.0", computer_name, u"me", u"", 93784}; }
+  ItemFacts item(const Text& path) override {
+    const auto found = items.find(path);
+    if (found == items.end()) raise(ErrorNumber::file_not_found);
+    return found->second;
+  }
+
+  std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& /*description*/) override {
+    return std::make_unique<FakeForm>(form, events);
   }
 
   std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) override {

@@ -47,6 +47,31 @@ inline void take_picture(const std::wstring& folder, const wchar_t* name) {
   check_equal(INVALID_FILE_ATTRIBUTES, GetFileAttributesW(wanted.c_str()), "a picture was taken");
 }
 
+/// The window of a class of the library's, once it is shown; null when it is not within some seconds.
+inline HWND wait_for_window(const std::wstring& class_name) {
+  for (int i = 0; i < 400; ++i) {
+    const auto windows = top_windows(
+        [&](HWND window) { return describe(window).class_name == class_name && IsWindowVisible(window) != FALSE; });
+    if (!windows.empty()) return windows[0];
+    Sleep(10);
+  }
+  return nullptr;
+}
+
+/// The text of a window or control as it is once that has handled what was sent before.
+inline std::wstring text_of(HWND window) {
+  std::wstring text(static_cast<std::size_t>(SendMessageW(window, WM_GETTEXTLENGTH, 0, 0)) + 1, L' ');
+  const auto length = SendMessageW(window, WM_GETTEXT, text.size(), reinterpret_cast<LPARAM>(text.data()));
+  text.resize(static_cast<std::size_t>(length));
+  return text;
+}
+
+/// How many drawing and window handles this process has.
+struct Handles {
+  DWORD drawing = GetGuiResources(GetCurrentProcess(), GR_GDIOBJECTS);
+  DWORD windows = GetGuiResources(GetCurrentProcess(), GR_USEROBJECTS);
+};
+
 /// What a user sees of a box before answering it.
 struct SeenBox {
   bool seen = false;

@@ -8,6 +8,7 @@
 #include "platform/posix/posix_folders.hpp"
 #include "platform/posix/posix_guids.hpp"
 #include "platform/posix/posix_input_boxes.hpp"
+#include "platform/posix/posix_machine.hpp"
 #include "platform/posix/posix_printers.hpp"
 #include "platform/posix/posix_registry.hpp"
 #include "platform/posix/posix_settings.hpp"
@@ -52,6 +53,7 @@ class PosixFormWindows final : public FormWindows {
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
 
   /// A window that has a size and a state but cannot be shown.
+  std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) override;
   std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) override;
 };
 
@@ -115,13 +117,14 @@ struct PosixPlatform {
   PosixWindowPrinting window_printing;
   PosixFontFiles font_files;
   PosixPrinters printers{font_files};
+  PosixMachine machine;
   PosixTimeConversions time_conversions;
 
   [[nodiscard]] Platform platform() {
-    return {message_boxes, screen,        computer,     clock,           form_windows,   control_makers,
-            message_pump,  random_source, cryptography, profiles,        settings_store, time_conversions,
-            files,         folder_picker, guids,        folders,         input_boxes,    registry,
-            network,       file_dialogs,  drawing,      window_printing, font_files,     printers};
+    return {message_boxes,   screen,       computer,    clock,          form_windows,     control_makers, message_pump,
+            random_source,   cryptography, profiles,    settings_store, time_conversions, files,          folder_picker,
+            guids,           folders,      input_boxes, registry,       network,          file_dialogs,   drawing,
+            window_printing, font_files,   printers,    machine};
   }
 };
 

@@ -3,9 +3,9 @@
 #include <cmath>
 
 #include "automation/run_time_error.hpp"
-#include "platform/win32/handle.hpp"
 #include "platform/win32/page_renderer.hpp"
 #include "platform/win32/win32_platform.hpp"
+#include "platform/win32/window.hpp"
 #include "preview/preview_view.hpp"
 #include "preview/print_control.hpp"
 // After windows.h.
@@ -17,36 +17,7 @@ namespace {
 
 constexpr const wchar_t* frame_class = L"TALUtilPreview";
 constexpr const wchar_t* pages_class = L"TALUtilPages";
-constexpr double twips_per_inch = 1440;
 constexpr UINT first_command = 100;
-
-/// A window class for as long as a window needs it: its procedure must not outlive the library.
-class WindowClass {
- public:
-  WindowClass(const wchar_t* name, WNDPROC procedure) : name_(name) {
-    WNDCLASSW description{};
-    description.lpfnWndProc = procedure;
-    description.hInstance = own_module();
-    description.lpszClassName = name;
-    description.hCursor = LoadCursorW(nullptr, IDC_ARROW);
-    description.hIcon = LoadIconW(nullptr, IDI_APPLICATION);
-    description.hbrBackground = reinterpret_cast<HBRUSH>(COLOR_APPWORKSPACE + 1);
-    RegisterClassW(&description);
-  }
-  WindowClass(const WindowClass&) = delete;
-  WindowClass& operator=(const WindowClass&) = delete;
-  ~WindowClass() { UnregisterClassW(name_, own_module()); }
-
- private:
-  const wchar_t* name_;
-};
-
-int dots_per_inch(HWND window) {
-  const HDC context = GetDC(window);
-  const int dots = GetDeviceCaps(context, LOGPIXELSX);
-  ReleaseDC(window, context);
-  return dots;
-}
 
 /// The pages: one is shown, with a shadow, in the middle of what room there is; scrolled by bars, wheel, keys and by
 /// dragging.
@@ -346,30 +317,15 @@ class PreviewWindow final : public PreviewView {
     if (!has_desktop_) {
       throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::action_not_supported), Text(no_screen));
     }
-    const HWND owner = GetActiveWindow();
-    if (owner != nullptr) EnableWindow(owner, FALSE);
+    const WaitingWindows others(window_);
     is_shown_ = true;
     ShowWindow(window_, command());
     SetForegroundWindow(window_);
     events_.resized();
     events_.activated();
     pages_->show();
-    MSG message;
-    while (!is_closed_) {
-      const BOOL answer = GetMessageW(&message, nullptr, 0, 0);
-      if (answer <= 0) {
-        // Quitting is for the loop of the host, which hears of it when this window is gone.
-        close();
-        if (answer == 0) PostQuitMessage(static_cast<int>(message.wParam));
-        break;
-      }
-      TranslateMessage(&message);
-      DispatchMessageW(&message);
-    }
-    if (owner != nullptr) {
-      EnableWindow(owner, TRUE);
-      SetForegroundWindow(owner);
-    }
+    handle_until(
+        is_closed_, [](const MSG&) { return false; }, [this] { close(); });
     ShowWindow(window_, SW_HIDE);
   }
 
@@ -465,8 +421,8 @@ class PreviewWindow final : public PreviewView {
   }
 
   PreviewEvents& events_;
-  WindowClass frame_window_class_{frame_class, &PreviewWindow::handle_message};
-  WindowClass pages_window_class_{pages_class, &PagesWindow::handle_message};
+  WindowClass frame_window_class_{frame_class, &PreviewWindow::handle_message, COLOR_APPWORKSPACE};
+  WindowClass pages_window_class_{pages_class, &PagesWindow::handle_message, COLOR_APPWORKSPACE};
   HWND window_ = nullptr;
   std::unique_ptr<PagesWindow> pages_;
   std::int32_t state_ = 0;

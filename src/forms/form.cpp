@@ -1,0 +1,71 @@
+#include "forms/form.hpp"
+
+#include "automation/run_time_error.hpp"
+#include "controls/common_dialog.hpp"
+#include "library/library.hpp"
+
+namespace talutil {
+
+Form::~Form() = default;
+
+FormView& Form::load() {
+  if (is_loaded()) return *view_;
+  auto view = library_.platform().form_windows.make_form(*this, description_);
+  fill(*view);
+  view_ = std::move(view);
+  return *view_;
+}
+
+void Form::unload() {
+  if (is_loaded()) view_->close(CloseMode::code);
+}
+
+void Form::show_modal() {
+  FormView& view = load();
+  struct Call {
+    int& calls;
+    explicit Call(int& count) : calls(count) { ++calls; }
+    Call(const Call&) = delete;
+    Call& operator=(const Call&) = delete;
+    ~Call() { --calls; }
+  };
+  {
+    const Call call(modal_calls_);
+    view.show_modal();
+  }
+  // A call within another one leaves the window to that.
+  if (modal_calls_ == 0) view_.reset();
+}
+
+template <class Work>
+void Form::told(Work work) noexcept {
+  try {
+    try {
+      work();
+    } catch (const RunTimeError& error) {
+      // The user who has cancelled a dialog knows.
+      if (error.number() == CommonDialog::cancelled) return;
+      library_.platform().message_boxes.show(error.description(), MessageButtons::ok, {});
+    }
+  } catch (...) {
+    // There is nobody left to tell.
+  }
+}
+
+void Form::clicked(std::uint8_t part) noexcept {
+  told([&] { on_click(part); });
+}
+
+void Form::tab_chosen(std::uint8_t /*part*/, std::int32_t tab) noexcept {
+  told([&] { on_tab(tab); });
+}
+
+void Form::escaped() noexcept {
+  told([&] { on_escape(); });
+}
+
+void Form::closing(CloseMode mode) noexcept {
+  told([&] { on_closing(mode); });
+}
+
+}  // namespace talutil

@@ -1,0 +1,29 @@
+#pragma once
+
+#include "controls/grid.hpp"
+#include "forms/form.hpp"
+
+namespace talutil {
+
+/// The switches of the host's command line, in a grid, with examples below it.
+class FrmCmdLineHelp final : public Form {
+ public:
+  static constexpr std::uint8_t Grid1 = 0;
+  static constexpr std::uint8_t rtbExamples = 1;
+
+  explicit FrmCmdLineHelp(Library& library);
+
+  /// Shows the window until it is closed.
+  void show() { show_modal(); }
+
+  [[nodiscard]] const Grid& grid() const noexcept { return grid_; }
+
+ protected:
+  void fill(FormView& view) override;
+  void on_click(std::uint8_t /*part*/) override {}
+
+ private:
+  Grid grid_;
+};
+
+}  // namespace talutil

@@ -1,0 +1,46 @@
+#include "platform/win32/window.hpp"
+
+namespace talutil::win32 {
+
+WindowClass::WindowClass(const wchar_t* name, WNDPROC procedure, int background) : name_(name) {
+  WNDCLASSW description{};
+  description.lpfnWndProc = procedure;
+  description.hInstance = own_module();
+  description.lpszClassName = name;
+  description.hCursor = LoadCursorW(nullptr, IDC_ARROW);
+  description.hIcon = LoadIconW(nullptr, IDI_APPLICATION);
+  description.hbrBackground = reinterpret_cast<HBRUSH>(static_cast<INT_PTR>(background + 1));
+  RegisterClassW(&description);
+}
+
+int dots_per_inch(HWND window) {
+  const HDC context = GetDC(window);
+  const int dots = GetDeviceCaps(context, LOGPIXELSX);
+  ReleaseDC(window, context);
+  return dots;
+}
+
+namespace {
+
+BOOL CALLBACK collect(HWND found, LPARAM list) {
+  if (IsWindowVisible(found) != FALSE && IsWindowEnabled(found) != FALSE) {
+    reinterpret_cast<std::vector<HWND>*>(list)->push_back(found);
+  }
+  return TRUE;
+}
+
+}  // namespace
+
+WaitingWindows::WaitingWindows(HWND window) : owner_(GetActiveWindow()) {
+  if (owner_ == window) owner_ = nullptr;
+  EnumThreadWindows(GetCurrentThreadId(), &collect, reinterpret_cast<LPARAM>(&windows_));
+  std::erase(windows_, window);
+  for (const HWND other : windows_) EnableWindow(other, FALSE);
+}
+
+WaitingWindows::~WaitingWindows() {
+  for (const HWND other : windows_) EnableWindow(other, TRUE);
+  if (owner_ != nullptr) SetForegroundWindow(owner_);
+}
+
+}  // namespace talutil::win32
