@@ -115,9 +115,9 @@ expect 'message box without a terminal' 0 'talutil: Closing ORVUtils Components 
 
 # ---- call: errors
 expect 'run-time error' 1 'talutil: GetData: error 5: Invalid procedure call or argument' call GetData A,B,C, 2 1
-expect 'not built yet' 1 \
-  "talutil: ShowSysInfo: error 445: Object doesn't support this action (not built yet; \"talutil list --missing\" shows all such members)" \
-  call ShowSysInfo
+expect 'a window without a screen' 1 'talutil: ShowSysInfo: error 445: There is no screen to show the window on' call ShowSysInfo
+expect_part 'an input box on the terminal' 0 'Name: Who are you?' call MyInputBox Name 'Who are you?'
+expect 'nothing is missing' 0 '' list --missing
 expect 'not a whole number' 1 \
   'talutil: GetData: iSt: "x" is not a whole number; write -2147483648 to 2147483647' call GetData A, x 2
 expect 'not a date' 1 \
@@ -129,7 +129,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, sysinfo, idl, reference' lst
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
 # ---- list, help
@@ -225,6 +225,11 @@ expect 'report' 0 '' report table.csv --title 'Sales €' --landscape --pdf sale
 verdict 'the words of the report' "Anne 1 Cork, IE" "$(pdftotext -layout sales.pdf - | grep Anne | tr -s ' ' | sed 's/^ //')"
 expect 'report: a text' 0 '' report shown.txt
 expect_part 'report: a missing file' 1 'none.txt' report none.txt
+expect_part 'system information' 0 'Operating system' sysinfo
+expect_part 'details of a file' 0 'Kind        File' sysinfo table.csv
+verdict 'system information in JSON' "file $(stat -c %s table.csv)" "$("$talutil" sysinfo --json table.csv |
+  python3 -c 'import json, sys; item = json.load(sys.stdin)["item"]; print(item["kind"], item["size"])')"
+expect 'details of a missing file' 1 'talutil: none.txt: error 53: File not found' sysinfo none.txt
 expect 'report over its own file' 2 'talutil: sales.pdf: give --pdf another name' report sales.pdf
 expect 'export: no such column' 2 'talutil: --hide: there is no column 4; table.csv has columns 1 to 3' export --from table.csv --hide 1,4 x.txt
 expect 'export: no such row' 2 'talutil: --rows: there is no row 4; table.csv has rows 0 to 3' export --from table.csv --rows 2-4 x.txt

@@ -182,8 +182,6 @@ Sub ToolkitErrors
   Err.Clear
   v = u.StripNulls("a", "b")
   CheckError "two arguments", 450, "Wrong number of arguments or invalid property assignment"
-  u.ShowSysInfo
-  CheckError "a member to come", 445, "Object doesn't support this action"
 End Sub
 
 Sub Configuration

@@ -72,6 +72,12 @@ take_pictures &
 pictures_pid=$!
 client window
 client forms
+client information
+# The same windows on a screen with larger dots, for the looks.
+dots() { wine reg.exe add 'HKCU\Control Panel\Desktop' /v LogPixels /t REG_DWORD /d "$1" /f >/dev/null 2>&1; }
+dots 144
+run information-144 wine "Z:\\build\\$folder\\tests\\hosts\\information_client.exe" "Z:\\build\\$folder" 0 144-
+dots 96
 client preview
 rm -f "$talutil_build"/printed_*.ps
 client printing

@@ -1,0 +1,235 @@
+#include <gmock/gmock.h>
+
+#include <set>
+
+#include "forms/frm_input_box.hpp"
+#include "infoforms/frm_cmd_line_help.hpp"
+#include "infoforms/frm_sh_keys.hpp"
+#include "infoforms/frm_sys_info.hpp"
+#include "infoforms/shortcut_keys.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "tests/fakes/error_of.hpp"
+#include "tests/fakes/fake_platform.hpp"
+#include "tests/fakes/recording_control.hpp"
+
+namespace talutil {
+
+namespace {
+
+using ::testing::ElementsAre;
+using testing::error_of;
+using testing::RecordingControl;
+
+struct Windows : ::testing::Test {
+  testing::FakePlatform platform;
+  Library library{platform.platform()};
+  ORVUtils utils{library};
+  testing::FakeFormState& form = platform.form;
+
+  static constexpr std::int32_t colour = 12640511;
+
+  Text ask(bool is_masked = false, bool has_entry = true, bool is_frameless = false, bool is_unclosable = false) {
+    return utils.MyInputBox(u"Caption", u"Prompt", Boolean(is_masked), Boolean(has_entry), Boolean(is_frameless),
+                            Boolean(is_unclosable), colour);
+  }
+  /// A user who types something and presses OK, or closes the box.
+  void user_types(const Text& text, bool closes = false) {
+    form.user = [this, text, closes](FormEvents& events) {
+      form.texts[FrmInputBox::txtUserInput] = text;
+      if (!closes) events.clicked(FrmInputBox::cmdOK);
+    };
+  }
+};
+
+TEST_F(Windows, InputBoxesKeepTheirResultAndTheirLostFrame) {
+  user_types(u"typed");
+  EXPECT_EQ(ask(true), u"typed");
+  EXPECT_THAT(form.uses, ElementsAre("on top", "show modal", "closed by code"));
+  EXPECT_EQ(form.caption, u"Caption");
+  EXPECT_EQ(form.texts[FrmInputBox::lblPrompt], u"Prompt");
+  EXPECT_TRUE(form.masked[FrmInputBox::txtUserInput]);
+  EXPECT_EQ(form.colour, colour);
+  EXPECT_EQ(form.windows, 0) << "unloaded";
+  user_types(u"typed", true);
+  EXPECT_EQ(ask(), u"") << "closed by its menu";
+  EXPECT_FALSE(form.masked[FrmInputBox::txtUserInput]) << "not from one use to the next";
+
+  user_types(u"kept");
+  EXPECT_EQ(ask(false, true, false, true), u"kept");
+  EXPECT_TRUE(form.hidden[FrmInputBox::cmdOK]);
+  form.user = [&](FormEvents& events) { events.escaped(); };
+  EXPECT_EQ(ask(false, true, true, false), u"") << "Esc, as the menu";
+  EXPECT_FALSE(form.has_frame);
+  user_types(u"kept");
+  EXPECT_EQ(ask(), u"kept");
+  EXPECT_FALSE(form.has_frame) << "once without a frame, always without";
+}
+
+TEST_F(Windows, NoticesStayUntilTheLibraryEnds) {
+  user_types(u"before");
+  EXPECT_EQ(ask(), u"before");
+  EXPECT_EQ(ask(false, false, true, true), u"before") << "nobody waits for a notice";
+  EXPECT_TRUE(form.hidden[FrmInputBox::txtUserInput] && form.hidden[FrmInputBox::cmdOK]);
+  EXPECT_TRUE(library.has_open_windows());
+  form.events->escaped();
+  EXPECT_TRUE(library.has_open_windows()) << "Esc is no way to close it";
+  EXPECT_EQ(error_of([&] { ask(); }), 400);
+  EXPECT_EQ(utils.MyInputBox(u"C", u"Nearly done", Boolean(), Boolean(), Boolean(true), Boolean(true), 0), u"before");
+  EXPECT_EQ(form.texts[FrmInputBox::lblPrompt], u"Nearly done");
+  EXPECT_EQ(form.windows, 1);
+  utils.Terminate();
+  EXPECT_FALSE(library.has_open_windows());
+
+  form.user = [&](FormEvents& events) {
+    EXPECT_EQ(error_of([&] { ask(false, false, true, true); }), 400) << "within a box that is waited for";
+    utils.Terminate();
+    EXPECT_TRUE(library.has_open_windows()) << "which stays";
+    form.texts[FrmInputBox::txtUserInput] = u"after";
+    events.clicked(FrmInputBox::cmdOK);
+  };
+  EXPECT_EQ(ask(), u"after");
+}
+
+TEST_F(Windows, ShortcutKeysArePrintedAndClosed) {
+  const auto print = std::make_shared<RecordingControl>();
+  print->values["Text"] = {};
+  print->methods = {"StartDoc", "EndDoc", "PrintDoc"};
+  platform.controls[u"VSPrinter8LibCtl.VSPrinter"] = print;
+  utils.ShowShortCutKeys();
+  utils.ShowShortCutKeys();
+  EXPECT_THAT(form.uses, ElementsAre("show", "on top", "show", "on top"));
+  EXPECT_EQ(form.windows, 1);
+  EXPECT_EQ(form.caption, u"  Shortcut keys List");
+  FrmShKeys& keys = library.shortcut_keys();
+  form.texts[FrmShKeys::Text1] = u"the keys";
+  form.events->clicked(FrmShKeys::cmdPrint);
+  EXPECT_THAT(print->uses,
+              ElementsAre("call StartDoc", "put Text = \"the keys\"", "call EndDoc", "call PrintDoc(True)"));
+  print->before = [](const std::string& use) {
+    if (use.starts_with("call Print")) raise(ErrorNumber::printer_error);
+  };
+  EXPECT_EQ(error_of([&] { keys.print(); }), 482);
+  form.events->clicked(FrmShKeys::cmdPrint);
+  ASSERT_EQ(platform.messages.size(), 1U) << "its user is told";
+
+  form.events->clicked(FrmShKeys::cmdCross);
+  EXPECT_EQ(keys.result(), -99);
+  EXPECT_TRUE(keys.is_loaded()) << "the button closes nothing";
+  form.events->escaped();
+  EXPECT_EQ(keys.result(), 0);
+  EXPECT_FALSE(keys.is_loaded());
+  utils.ShowShortCutKeys();
+  form.view->close(CloseMode::control_menu);
+  EXPECT_EQ(keys.result(), -99);
+  utils.ShowShortCutKeys();
+  keys.unload();
+  EXPECT_EQ(keys.result(), -99) << "left as it was";
+}
+
+TEST(ShortcutKeys, AreToldOnceAScreen) {
+  std::size_t entries = 0;
+  std::set<Text> keys;
+  TextView screen;
+  for (const ShortcutSection& section : shortcut_sections()) {
+    if (!section.is_menu) {
+      keys.clear();
+      screen = section.heading;
+    }
+    for (std::size_t at = 0; at < section.entries.size();) {
+      const std::size_t end = std::min(section.entries.find(u'\n', at), section.entries.size());
+      const TextView entry = section.entries.substr(at, end - at);
+      at = end + 1;
+      ++entries;
+      const std::size_t sign = entry.find(u" = ");
+      const TextView key = sign == Text::npos ? entry.substr(entry.rfind(u' ') + 1) : entry.substr(sign + 3);
+      const bool is_new = keys.emplace(trim_blanks(key)).second;
+      // These two buttons are one on every screen.
+      EXPECT_TRUE(is_new || entry == u"Get Data Button = F9") << to_utf8(screen) << ": " << to_utf8(entry);
+    }
+  }
+  EXPECT_GT(entries, 213U);
+  const std::string rich = to_utf8(shortcut_keys_rich_text());
+  EXPECT_TRUE(rich.starts_with("{\\rtf1\\ansi\\deff0{\\fonttbl{\\f0\\fmodern Courier New;}}"));
+  EXPECT_THAT(rich, ::testing::HasSubstr("\\ul\\b\\fs24 GENERAL\\ulnone\\b0\\fs20\\par\r\nCopy Text CTRL+C\\par\r\n"));
+  EXPECT_THAT(rich, ::testing::HasSubstr("Message Center to Employee = F12 \\par\r\n"));
+  EXPECT_THAT(rich, ::testing::HasSubstr("ORV User Options = CTRL+F4\\par"));
+}
+
+TEST_F(Windows, SwitchesStandInAGrid) {
+  form.user = [&](FormEvents& events) {
+    const Grid& grid = *form.table;
+    EXPECT_EQ(grid.Rows(), 10);
+    EXPECT_EQ(grid.Cols(), 2);
+    EXPECT_EQ(grid.TextMatrix(0, 1), u"Description");
+    EXPECT_EQ(grid.TextMatrix(8, 0), u"");
+    EXPECT_EQ(grid.TextMatrix(8, 1), u"  Preload the requested time out time if specified");
+    EXPECT_TRUE(form.texts[FrmCmdLineHelp::rtbExamples].ends_with(u"ORV.EXE\" SINEMP 120000002:1"));
+    if (form.windows++ < 3) utils.ShowCmdLineHelp();
+    events.escaped();
+  };
+  utils.ShowCmdLineHelp();
+  EXPECT_FALSE(library.has_open_windows());
+}
+
+TEST_F(Windows, TheSystemIsDescribed) {
+  platform.items[u"C:\\a.txt"] = {false, 1536, 3, std::nullopt, Date{40000.5}, std::nullopt};
+  form.user = [&](FormEvents& events) {
+    EXPECT_EQ(form.table->TextMatrix(1, 6), u"75%");
+    EXPECT_EQ(form.bar_column, 6);
+    EXPECT_EQ(form.table->TextMatrix(2, 3), u"not ready");
+    events.tab_chosen(FrmSysInfo::tabs, 1);
+    EXPECT_EQ(form.table->TextMatrix(1, 1), u"8.0 GB (8,589,934,592 bytes)");
+    EXPECT_EQ(form.bar_column, -1);
+    EXPECT_TRUE(form.hidden[FrmSysInfo::details]);
+    events.tab_chosen(FrmSysInfo::tabs, 4);
+    EXPECT_TRUE(form.hidden[FrmSysInfo::facts]);
+    form.texts[FrmSysInfo::path] = u"C:\\a.txt";
+    events.clicked(FrmSysInfo::show);
+    EXPECT_EQ(form.table->TextMatrix(3, 1), u"1.5 KB (1,536 bytes)");
+    EXPECT_EQ(form.table->TextMatrix(5, 1), u"06/07/2009 12:00");
+    EXPECT_EQ(form.table->TextMatrix(7, 1), u"read-only, hidden");
+    events.clicked(FrmSysInfo::copy);
+    platform.items.clear();
+    events.clicked(FrmSysInfo::refresh);
+    EXPECT_EQ(platform.messages.size(), 1U) << "the file has gone";
+    EXPECT_EQ(form.table->Rows(), 1);
+    events.clicked(FrmSysInfo::close);
+  };
+  utils.ShowSysInfo();
+  EXPECT_EQ(to_utf8(form.copied),
+            "Drives\r\n"
+            "  Drive  Kind    Label   File system  Total       Free      Used\r\n"
+            "  C:     Fixed   SYSTEM  NTFS         1,000.0 GB  250.0 GB  75%\r\n"
+            "  D:     CD-ROM          not ready\r\n"
+            "\r\nMemory\r\n"
+            "  Total             8.0 GB (8,589,934,592 bytes)\r\n"
+            "  Available         2.0 GB (2,147,483,648 bytes)\r\n"
+            "  Used              75%\r\n"
+            "  Page file, total  none\r\n"
+            "\r\nProcessor\r\n"
+            "  Name                A processor\r\n"
+            "  Architecture        x86\r\n"
+            "  Logical processors  4\r\n"
+            "  Speed               2400 MHz\r\n"
+            "\r\nOperating system\r\n"
+            "  Name         A system\r\n"
+            "  Version      10.0\r\n"
+            "  Computer     FAKEPC\r\n"
+            "  User         me\r\n"
+            "  Running for  1 days, 2 hours, 3 minutes\r\n"
+            "\r\nFolder or file\r\n"
+            "  Path        C:\\a.txt\r\n"
+            "  Kind        File\r\n"
+            "  Size        1.5 KB (1,536 bytes)\r\n"
+            "  Created     unknown\r\n"
+            "  Modified    06/07/2009 12:00\r\n"
+            "  Accessed    unknown\r\n"
+            "  Attributes  read-only, hidden\r\n");
+  EXPECT_EQ(size_words(1023), u"1,023 bytes");
+  EXPECT_EQ(size_words(~0ULL), u"16.0 EB");
+}
+
+}  // namespace
+
+}  // namespace talutil
