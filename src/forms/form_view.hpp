@@ -32,12 +32,12 @@ struct PartPlace {
 struct FormPart {
   std::uint8_t id = 0;  ///< Its own number on the window.
   PartKind kind = PartKind::label;
-  TextView caption;  ///< A letter behind "&" reaches the part by Alt.
-  PartPlace place;
   std::uint8_t follows = 0;  ///< Bits of part_follows.
   bool is_default = false;   ///< The button that Enter presses.
   bool is_growing = false;   ///< A label that is as high as its text, which it shows to the letter.
-  TextView tip{};            ///< Shown where the mouse rests on it.
+  PartPlace place;
+  TextView caption{};  ///< A letter behind "&" reaches the part by Alt.
+  TextView tip{};      ///< Shown where the mouse rests on it.
 };
 
 struct FormDescription {

@@ -13,11 +13,11 @@ using Box = FrmInputBox;
 constexpr FormPart parts[] = {
     {.id = Box::lblPrompt,
      .kind = PartKind::label,
-     .caption = u"This is the prompt label",
+     .is_growing = true,
      .place = {7, 7, 206, 16},
-     .is_growing = true},
-    {.id = Box::txtUserInput, .kind = PartKind::entry, .caption = {}, .place = {7, 30, 206, 13}},
-    {.id = Box::cmdOK, .kind = PartKind::button, .caption = u"OK", .place = {163, 50, 50, 14}, .is_default = true},
+     .caption = u"This is the prompt label"},
+    {.id = Box::txtUserInput, .kind = PartKind::entry, .place = {7, 30, 206, 13}},
+    {.id = Box::cmdOK, .kind = PartKind::button, .is_default = true, .place = {163, 50, 50, 14}, .caption = u"OK"},
 };
 
 constexpr FormDescription description{.parts = parts, .width = 220, .height = 71};

@@ -13,14 +13,14 @@ using namespace part_follows;
 constexpr FormPart parts[] = {
     {.id = Help::Grid1,
      .kind = PartKind::table,
-     .caption = u"Command line switches",
+     .follows = width | height,
      .place = {7, 7, 426, 122},
-     .follows = width | height},
+     .caption = u"Command line switches"},
     {.id = Help::rtbExamples,
      .kind = PartKind::rich_text,
-     .caption = u"Examples",
+     .follows = width | bottom,
      .place = {7, 135, 426, 68},
-     .follows = width | bottom},
+     .caption = u"Examples"},
 };
 
 constexpr FormDescription description{.parts = parts, .width = 440, .height = 210, .is_resizable = true};

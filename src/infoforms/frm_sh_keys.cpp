@@ -14,18 +14,14 @@ using Keys = FrmShKeys;
 using namespace part_follows;
 
 constexpr FormPart parts[] = {
-    {.id = Keys::cmdPrint, .kind = PartKind::button, .caption = u"Print", .place = {7, 5, 50, 14}},
+    {.id = Keys::cmdPrint, .kind = PartKind::button, .place = {7, 5, 50, 14}, .caption = u"Print"},
     {.id = Keys::cmdCross,
      .kind = PartKind::button,
-     .caption = u"Cross",
      .place = {60, 5, 50, 14},
+     .caption = u"Cross",
      .tip = u"Cancel changes and exit"},
-    {.id = Keys::keys_label, .kind = PartKind::label, .caption = u"Shortcut &keys:", .place = {120, 8, 80, 9}},
-    {.id = Keys::Text1,
-     .kind = PartKind::rich_text,
-     .caption = {},
-     .place = {7, 24, 306, 199},
-     .follows = width | height},
+    {.id = Keys::keys_label, .kind = PartKind::label, .place = {120, 8, 80, 9}, .caption = u"Shortcut &keys:"},
+    {.id = Keys::Text1, .kind = PartKind::rich_text, .follows = width | height, .place = {7, 24, 306, 199}},
 };
 
 constexpr FormDescription description{.parts = parts, .width = 320, .height = 230, .is_resizable = true};

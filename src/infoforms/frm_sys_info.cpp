@@ -16,52 +16,52 @@ using namespace part_follows;
 constexpr FormPart parts[] = {
     {.id = Info::tabs,
      .kind = PartKind::tabs,
-     .caption = u"System information",
+     .follows = width | height,
      .place = {7, 7, 386, 176},
-     .follows = width | height},
-    {.id = Info::path_label, .kind = PartKind::label, .caption = u"&Folder or file:", .place = {14, 29, 56, 9}},
-    {.id = Info::path, .kind = PartKind::entry, .caption = {}, .place = {72, 27, 168, 13}, .follows = width},
+     .caption = u"System information"},
+    {.id = Info::path_label, .kind = PartKind::label, .place = {14, 29, 56, 9}, .caption = u"&Folder or file:"},
+    {.id = Info::path, .kind = PartKind::entry, .follows = width, .place = {72, 27, 168, 13}},
     {.id = Info::show,
      .kind = PartKind::button,
-     .caption = u"&Show",
-     .place = {244, 26, 44, 14},
      .follows = right,
-     .is_default = true},
+     .is_default = true,
+     .place = {244, 26, 44, 14},
+     .caption = u"&Show"},
     {.id = Info::choose_folder,
      .kind = PartKind::button,
-     .caption = u"F&older...",
+     .follows = right,
      .place = {292, 26, 46, 14},
-     .follows = right},
+     .caption = u"F&older..."},
     {.id = Info::choose_file,
      .kind = PartKind::button,
-     .caption = u"F&ile...",
+     .follows = right,
      .place = {342, 26, 44, 14},
-     .follows = right},
+     .caption = u"F&ile..."},
     {.id = Info::facts,
      .kind = PartKind::table,
-     .caption = u"Facts",
+     .follows = width | height,
      .place = {14, 27, 372, 149},
-     .follows = width | height},
+     .caption = u"Facts"},
     {.id = Info::details,
      .kind = PartKind::table,
-     .caption = u"Details",
+     .follows = width | height,
      .place = {14, 46, 372, 130},
-     .follows = width | height},
+     .caption = u"Details"},
     {.id = Info::refresh,
      .kind = PartKind::button,
-     .caption = u"&Refresh",
+     .follows = bottom,
      .place = {7, 189, 56, 14},
-     .follows = bottom},
+     .caption = u"&Refresh"},
     {.id = Info::copy,
      .kind = PartKind::button,
-     .caption = u"&Copy as text",
+     .follows = bottom,
      .place = {67, 189, 62, 14},
-     .follows = bottom},
+     .caption = u"&Copy as text"},
     {.id = Info::close,
      .kind = PartKind::button,
-     .caption = u"Close",
+     .follows = right | bottom,
      .place = {337, 189, 56, 14},
-     .follows = right | bottom},
+     .caption = u"Close"},
 };
 
 constexpr FormDescription description{.parts = parts, .width = 400, .height = 210, .is_resizable = true};
@@ -73,13 +73,16 @@ constexpr std::int32_t item_tab = 4;
 void fill_grid(Grid& grid, const FactTable& table) {
   constexpr std::int32_t wide_columns[] = {2400, 5600};
   constexpr std::int32_t narrow_columns[] = {1300, 1100, 1300, 1150, 1050, 1050, 1100};
+  const bool is_list = table.columns.size() == 2;
+  const std::span<const std::int32_t> widths =
+      is_list ? std::span<const std::int32_t>(wide_columns) : std::span<const std::int32_t>(narrow_columns);
   grid.put_Rows(0);
   grid.put_Cols(static_cast<std::int32_t>(table.columns.size()));
   grid.put_Rows(static_cast<std::int32_t>(table.rows.size() + 1));
   grid.put_FixedRows(1);
   for (std::size_t c = 0; c < table.columns.size(); ++c) {
     const auto column = static_cast<std::int32_t>(c);
-    grid.put_ColWidth(column, table.columns.size() == 2 ? wide_columns[c] : narrow_columns[c]);
+    grid.put_ColWidth(column, widths[c]);
     grid.put_cell(0, column, table.columns[c]);
     for (std::size_t r = 0; r < table.rows.size(); ++r) {
       grid.put_cell(static_cast<std::int32_t>(r + 1), column, table.rows[r][c]);

@@ -1,7 +1,7 @@
 #include "infoforms/system_report.hpp"
 
 #include <algorithm>
-#include <array>
+#include <cmath>
 
 #include "automation/numbers.hpp"
 #include "automation/run_time_error.hpp"
@@ -26,8 +26,8 @@ Text size_with_bytes(std::uint64_t bytes) {
 
 Text percent(std::uint64_t part, std::uint64_t whole) {
   if (whole == 0) return {};
-  return number_words(static_cast<std::uint64_t>(static_cast<double>(part) * 100 / static_cast<double>(whole) + 0.5)) +
-         u"%";
+  const double share = static_cast<double>(part) * 100 / static_cast<double>(whole);
+  return number_words(static_cast<std::uint64_t>(std::lround(share))) + u"%";
 }
 
 Text time_words(std::uint64_t seconds) {
@@ -77,12 +77,12 @@ void count_into(Folder& folder, FolderCount& count) {
 
 Text size_words(std::uint64_t bytes) {
   static constexpr TextView units[] = {u"bytes", u"KB", u"MB", u"GB", u"TB", u"PB", u"EB"};
-  constexpr double step = 1024;
-  auto size = static_cast<double>(bytes);
+  constexpr std::uint64_t step = 1024;
+  std::uint64_t size = 1;
   std::size_t unit = 0;
-  for (; size >= step; size /= step) ++unit;
+  for (; bytes / size >= step; size *= step) ++unit;
   if (unit == 0) return number_words(bytes) + u" bytes";
-  const auto tenths = static_cast<std::uint64_t>(size * 10 + 0.5);
+  const std::uint64_t tenths = bytes / size * 10 + (bytes % size * 10 + size / 2) / size;
   return number_words(tenths / 10) + u"." + number_words(tenths % 10) + u" " + Text(units[unit]);
 }
 

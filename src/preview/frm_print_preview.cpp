@@ -1,7 +1,7 @@
 #include "preview/frm_print_preview.hpp"
 
 #include <algorithm>
-#include <ranges>
+#include <iterator>
 
 #include "automation/run_time_error.hpp"
 #include "controls/control_factory.hpp"
@@ -217,9 +217,9 @@ void FrmPrintPreview::zoom_step(bool larger) noexcept {
           std::ranges::find_if(zoom_items, [&](const ZoomItem& item) { return item.percent > zoom; });
       if (next != std::end(zoom_items)) set_zoom(next->item);
     } else {
-      const auto reversed = std::views::reverse(zoom_items);
-      const auto next = std::ranges::find_if(reversed, [&](const ZoomItem& item) { return item.percent < zoom; });
-      if (next != reversed.end()) set_zoom(next->item);
+      const auto next = std::find_if(std::rbegin(zoom_items), std::rend(zoom_items),
+                                     [&](const ZoomItem& item) { return item.percent < zoom; });
+      if (next != std::rend(zoom_items)) set_zoom(next->item);
     }
   });
 }

@@ -8,7 +8,6 @@ namespace talutil {
 namespace {
 
 constexpr std::int32_t hair_line = 10;  // Half a point.
-constexpr std::uint32_t grey_line = 0x00A0A0A0;
 constexpr std::uint32_t black = 0;
 
 std::int32_t rounded(double value) { return static_cast<std::int32_t>(std::lround(value)); }

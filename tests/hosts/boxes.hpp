@@ -5,8 +5,30 @@
 
 #include "client.hpp"
 
-/// Boxes that wait for a user, looked at and answered from another thread.
+/// Windows that wait for a user, looked at and used from another thread.
 namespace talutil::hosts {
+
+/// A control of a host with one property that is a text.
+class TextObject final : public NamelessObject {
+ public:
+  TextObject(const wchar_t* name, std::wstring text) : name_(name), text_(std::move(text)) {}
+  ULONG STDMETHODCALLTYPE AddRef() override { return 2; }
+  ULONG STDMETHODCALLTYPE Release() override { return 1; }
+  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR* name, UINT, LCID, DISPID* ids) override {
+    *ids = lstrcmpiW(*name, name_) == 0 ? 1 : DISPID_UNKNOWN;
+    return *ids == 1 ? S_OK : DISP_E_UNKNOWNNAME;
+  }
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
+                                   UINT*) override {
+    V_VT(result) = VT_BSTR;
+    V_BSTR(result) = SysAllocString(text_.c_str());
+    return S_OK;
+  }
+
+ private:
+  const wchar_t* name_;
+  std::wstring text_;
+};
 
 struct WindowText {
   std::wstring class_name;

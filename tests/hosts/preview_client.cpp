@@ -1,53 +1,12 @@
 // A client that opens the preview window: what it shows, its keys, and that nothing is left of it.
+#include <filesystem>
 #include <fstream>
-#include <sstream>
 
 #include "boxes.hpp"
-#include "table_object.hpp"
 
 using namespace talutil::hosts;
 
 namespace {
-
-/// A text box, or any object with one property.
-class TextObject final : public NamelessObject {
- public:
-  TextObject(const wchar_t* name, std::wstring text) : name_(name), text_(std::move(text)) {}
-  ULONG STDMETHODCALLTYPE AddRef() override { return 2; }
-  ULONG STDMETHODCALLTYPE Release() override { return 1; }
-  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR* name, UINT, LCID, DISPID* ids) override {
-    *ids = lstrcmpiW(*name, name_) == 0 ? 1 : DISPID_UNKNOWN;
-    return *ids == 1 ? S_OK : DISP_E_UNKNOWNNAME;
-  }
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
-                                   UINT*) override {
-    V_VT(result) = VT_BSTR;
-    V_BSTR(result) = SysAllocString(text_.c_str());
-    return S_OK;
-  }
-
- private:
-  const wchar_t* name_;
-  std::wstring text_;
-};
-
-HWND wait_for_preview() {
-  for (int i = 0; i < 200; ++i) {
-    const auto windows = top_windows([](HWND window) {
-      return describe(window).class_name == L"TALUtilPreview" && IsWindowVisible(window) != FALSE;
-    });
-    if (!windows.empty()) return windows[0];
-    Sleep(20);
-  }
-  return nullptr;
-}
-
-/// A caption as it is once the window has handled what was sent before.
-std::wstring caption_of(HWND window) {
-  std::array<wchar_t, 200> text{};
-  SendMessageW(window, WM_GETTEXT, text.size(), reinterpret_cast<LPARAM>(text.data()));
-  return text.data();
-}
 
 void press(HWND window, WPARAM key) { SendMessageW(window, WM_KEYDOWN, key, 0); }
 
@@ -58,7 +17,7 @@ void preview(_ORVUtils* u, const Desktop& desktop, const std::wstring& text, con
   bool is_seen = false;
   std::thread watcher([&] {
     desktop.enter();
-    const HWND window = wait_for_preview();
+    const HWND window = wait_for_window(L"TALUtilPreview");
     if (window == nullptr) return;
     is_seen = true;
     user(window);
@@ -74,12 +33,12 @@ void window_shows_pages(_ORVUtils* u, const Desktop& desktop, const std::wstring
   for (int i = 1; i <= 150; ++i)
     text += L"Line " + std::to_wstring(i) + L": caf\u00E9, \u041F\u0440\u0438\u0432\u0435\u0442, 12.50\t\u20AC\r\n";
   preview(u, desktop, text, [&](HWND window) {
-    check_equal(L"Notes           Page 1 of 3      Press F9 to Print.", caption_of(window), "the caption");
+    check_equal(L"Notes           Page 1 of 3      Press F9 to Print.", text_of(window), "the caption");
     press(window, VK_F3);
-    check_equal(L"Notes           Page 2 of 3      Press F9 to Print.", caption_of(window), "after F3");
+    check_equal(L"Notes           Page 2 of 3      Press F9 to Print.", text_of(window), "after F3");
     press(window, VK_NEXT);
     press(window, VK_NEXT);
-    check_equal(L"Notes           Page 3 of 3      Press F9 to Print.", caption_of(window), "the last page");
+    check_equal(L"Notes           Page 3 of 3      Press F9 to Print.", text_of(window), "the last page");
     press(window, VK_F2);
     press(window, VK_F2);
     Sleep(300);
@@ -108,12 +67,24 @@ void window_shows_pages(_ORVUtils* u, const Desktop& desktop, const std::wstring
 void nothing_is_left(_ORVUtils* u, const Desktop& desktop) {
   const auto open = [&] { preview(u, desktop, L"x", [](HWND window) { SendMessageW(window, WM_CLOSE, 0, 0); }); };
   for (int i = 0; i < 3; ++i) open();
-  const auto count = [](DWORD kind) { return GetGuiResources(GetCurrentProcess(), kind); };
-  const DWORD gdi = count(GR_GDIOBJECTS);
-  const DWORD user = count(GR_USEROBJECTS);
+  const Handles before;
   for (int i = 0; i < 20; ++i) open();
-  check(count(GR_GDIOBJECTS) <= gdi + 2, "GDI handles after 20 openings");
-  check(count(GR_USEROBJECTS) <= user + 2, "USER handles after 20 openings");
+  const Handles after;
+  check(after.drawing <= before.drawing + 2, "drawing handles after 20 openings");
+  check(after.windows <= before.windows + 2, "window handles after 20 openings");
+}
+
+void CALLBACK quit(HWND, UINT, UINT_PTR timer, DWORD) {
+  KillTimer(nullptr, timer);
+  PostQuitMessage(3);
+}
+
+void host_quits(_ORVUtils* u, const Desktop& desktop) {
+  SetTimer(nullptr, 0, 300, &quit);
+  preview(u, desktop, L"x", [](HWND) {});
+  MSG message{};
+  check(PeekMessageW(&message, nullptr, WM_QUIT, WM_QUIT, PM_REMOVE) != FALSE && message.wParam == 3,
+        "a host that quits gets its call back and hears of it");
 }
 
 void unattended_reports_are_written(_ORVUtils* u) {
@@ -130,12 +101,34 @@ void unattended_reports_are_written(_ORVUtils* u) {
       S_OK,
       u->GridPrintPreview(Short{100}, Short{2}, Text(L"Sales"), Text(L""), holder, empty, empty, Text(L"SalesReport")),
       "GridPrintPreview");
+  const auto start_of_file = [&] {
+    std::ifstream file(path, std::ios::binary);
+    std::string start(5, ' ');
+    file.read(start.data(), 5);
+    return start;
+  };
+  check_equal(std::string("%PDF-"), start_of_file(), "the report of an unattended run");
+
+  // What another program has open, or what is read-only, stays as it is, without a word.
+  const auto write_again = [&](const char* what) {
+    check_equal(S_OK,
+                u->GridPrintPreview(Short{100}, Short{2}, Text(L"Sales"), Text(L""), holder, empty, empty,
+                                    Text(L"SalesReport")),
+                what);
+  };
+  std::ofstream(std::filesystem::path(path)) << "older";
+  const HANDLE reader = CreateFileW(path, GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING, 0, nullptr);
+  write_again("a report that is open elsewhere");
+  check_equal(std::string("older"), start_of_file(), "the report that is open elsewhere");
+  CloseHandle(reader);
+  SetFileAttributesW(path, FILE_ATTRIBUTE_READONLY);
+  write_again("a read-only report");
+  check_equal(std::string("older"), start_of_file(), "the read-only report");
+  SetFileAttributesW(path, FILE_ATTRIBUTE_NORMAL);
+  write_again("a report that can be written again");
+  check_equal(std::string("%PDF-"), start_of_file(), "it is written again");
   u->put_AutomatedEndOfMonth(VARIANT_FALSE);
   DestroyWindow(window);
-  std::ifstream file(path, std::ios::binary);
-  std::string start(5, ' ');
-  file.read(start.data(), 5);
-  check_equal(std::string("%PDF-"), start, "the report of an unattended run");
 }
 
 }  // namespace
@@ -146,6 +139,7 @@ int wmain(int, wchar_t** arguments) {
     const Pointer<_ORVUtils> object = create_object();
     window_shows_pages(object.get(), desktop, std::wstring(arguments[1]) + L"\\..\\screenshots");
     nothing_is_left(object.get(), desktop);
+    host_quits(object.get(), desktop);
     unattended_reports_are_written(object.get());
   });
 }

@@ -77,48 +77,20 @@ LONG print_window(const std::wstring& folder, HWND window) {
   return answer;
 }
 
-class TextBox final : public NamelessObject {
- public:
-  ULONG STDMETHODCALLTYPE AddRef() override { return 2; }
-  ULONG STDMETHODCALLTYPE Release() override { return 1; }
-  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID* ids) override {
-    return *ids = 1, S_OK;
-  }
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
-                                   UINT*) override {
-    V_VT(result) = VT_BSTR;
-    V_BSTR(result) = SysAllocString(L"The first page\fThe second page");
-    return S_OK;
-  }
-};
-
 /// Opens a preview and prints from it, the printer dialog being answered with OK. Answers what stood on its title.
 std::wstring print_preview(_ORVUtils* u, const Desktop& desktop) {
-  TextBox box;
+  TextObject box(L"Text", L"The first page\fThe second page");
   Value holder(&box);
   std::wstring title;
   std::thread user([&] {
     desktop.enter();
-    HWND window = nullptr;
-    for (int i = 0; i < 200 && window == nullptr; ++i) {
-      const auto windows = top_windows([](HWND candidate) {
-        return describe(candidate).class_name == L"TALUtilPreview" && IsWindowVisible(candidate) != FALSE;
-      });
-      if (!windows.empty()) window = windows[0];
-      Sleep(20);
-    }
+    const HWND window = wait_for_window(L"TALUtilPreview");
     if (window == nullptr) return;
     Sleep(300);
     PostMessageW(window, WM_KEYDOWN, VK_F9, 0);
     Sleep(500);
-    HWND dialog = nullptr;
-    for (int i = 0; i < 40 && dialog == nullptr; ++i) {
-      const auto boxes = top_windows([](HWND candidate) {
-        return describe(candidate).class_name == L"#32770" && IsWindowVisible(candidate) != FALSE;
-      });
-      if (!boxes.empty()) dialog = boxes[0];
-      Sleep(50);
-    }
+    const std::atomic<bool> is_over = false;
+    const HWND dialog = wait_for_box(is_over);
     if (dialog != nullptr) {
       title = describe(dialog).text;
       SendMessageW(dialog, WM_COMMAND, IDOK, 0);
@@ -130,6 +102,17 @@ std::wstring print_preview(_ORVUtils* u, const Desktop& desktop) {
               "TextBoxPrintPreview");
   user.join();
   return title;
+}
+
+/// Prints the list of shortcut keys from its window.
+bool print_keys(_ORVUtils* u, const Desktop& desktop) {
+  check_equal(S_OK, u->ShowShortCutKeys(), "ShowShortCutKeys");
+  const HWND window = wait_for_window(L"TALUtilForm");
+  const SeenBox dialog = act_and_watch(
+      desktop, [](HWND box) { PostMessageW(box, WM_COMMAND, IDOK, 0); },
+      [&] { SendMessageW(FindWindowExW(window, nullptr, L"Button", L"Print"), BM_CLICK, 0, 0); });
+  SendMessageW(window, WM_CLOSE, 0, 0);
+  return dialog.title == L"Print";
 }
 
 }  // namespace
@@ -147,6 +130,8 @@ int wmain(int, wchar_t** arguments) {
     check_equal(1, print_window(folder, window), "a window with one");
     install_printer(L"/build/printed_report.ps");
     check_equal(L"Print", print_preview(object.get(), desktop), "the printer dialog");
+    install_printer(L"/build/printed_keys.ps");
+    check(print_keys(object.get(), desktop), "the printer dialog for the keys");
     DestroyWindow(window);
     remove_printer();
   });

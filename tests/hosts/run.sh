@@ -81,9 +81,13 @@ dots 96
 client preview
 rm -f "$talutil_build"/printed_*.ps
 client printing
-words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/printed_report.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
+words_of() { gs -q -sDEVICE=txtwrite -o - "$talutil_build/$1" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' '; }
+words=$(words_of printed_report.ps)
 expect_success "the words of the printed report, which are: $words" \
   test "${words#*Notes The first page*Page 1 of 2*Notes The second page*Page 2 of 2}" != "$words"
+words=$(words_of printed_keys.ps)
+expect_success "the words of the printed keys, which begin: ${words:0:100}" \
+  test "${words#*GENERAL Copy Text CTRL+C*ORV Help PDF = F1*Page 1 of *Telephone Contact = CTRL+T}" != "$words"
 expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
 run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'

@@ -137,9 +137,15 @@ class FormWindow final : public FormView {
     }
     SetWindowLongPtrW(window_, GWLP_USERDATA, reinterpret_cast<LONG_PTR>(this));
     for (const FormPart& part : description.parts) add(part);
+    // Tabs lie behind what stands on their pages.
+    for (const Control& control : controls_) {
+      constexpr UINT order_alone = SWP_NOMOVE | SWP_NOSIZE | SWP_NOACTIVATE;
+      if (control.part->kind == PartKind::tabs) SetWindowPos(control.window, HWND_BOTTOM, 0, 0, 0, 0, order_alone);
+    }
     inner_ = {font_.across(description.width), font_.down(description.height)};
     size_to_inside();
-    smallest_ = outer_size();
+    const SIZE size = outer_size();
+    smallest_ = {size.cx / 2, size.cy / 2};
   }
   FormWindow(const FormWindow&) = delete;
   FormWindow& operator=(const FormWindow&) = delete;
@@ -361,8 +367,6 @@ class FormWindow final : public FormView {
       SendMessageW(control, LVM_SETEXTENDEDLISTVIEWSTYLE, looks, looks);
     }
     if (part.kind == PartKind::entry) SendMessageW(control, EM_SETLIMITTEXT, 0, 0);
-    // Behind what stands on its pages.
-    if (part.kind == PartKind::tabs) SetWindowPos(control, HWND_BOTTOM, 0, 0, 0, 0, SWP_NOMOVE | SWP_NOSIZE);
     if (!part.tip.empty()) add_tip(control, part.tip);
   }
 
@@ -436,12 +440,16 @@ class FormWindow final : public FormView {
   void centre() const {
     RECT work{};
     SystemParametersInfoW(SPI_GETWORKAREA, 0, &work, 0);
-    const SIZE size = outer_size();
+    SIZE size = outer_size();
+    // One that can be resized need not be larger than the screen.
+    if (description_.is_resizable) {
+      size = {std::min(size.cx, work.right - work.left), std::min(size.cy, work.bottom - work.top)};
+    }
     const auto middle = [](LONG start, LONG end, LONG length) {
       return static_cast<int>(std::max(start, start + (end - start - length) / 2));
     };
-    SetWindowPos(window_, nullptr, middle(work.left, work.right, size.cx), middle(work.top, work.bottom, size.cy), 0, 0,
-                 SWP_NOSIZE | SWP_NOZORDER | SWP_NOACTIVATE);
+    SetWindowPos(window_, nullptr, middle(work.left, work.right, size.cx), middle(work.top, work.bottom, size.cy),
+                 static_cast<int>(size.cx), static_cast<int>(size.cy), SWP_NOZORDER | SWP_NOACTIVATE);
   }
 
   /// Puts a control where it belongs in a window that has grown by so much.
