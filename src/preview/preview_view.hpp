@@ -37,36 +37,36 @@ enum class PreviewMenu : std::uint8_t {
 };
 
 struct PreviewMenuItem {
-  PreviewMenu item;
   TextView caption;
+  PreviewMenu item;
   std::uint8_t level;  ///< 0 stands in the bar, 1 below it, 2 below that.
 };
 
 /// In their order. "Vertcial" is what users know.
 inline constexpr PreviewMenuItem preview_menu[] = {
-    {PreviewMenu::mnuFile, u"File", 0},
-    {PreviewMenu::mnuPrinter, u"Send Document to Printer", 1},
-    {PreviewMenu::mnuExportPDF, u"Export to Adobe PDF Format", 1},
-    {PreviewMenu::mnuClose, u"Close", 1},
-    {PreviewMenu::mnuOptions, u"Options", 0},
-    {PreviewMenu::mnuZoom, u"Zoom", 1},
-    {PreviewMenu::mnu25, u"25%", 2},
-    {PreviewMenu::mnu50, u"50%", 2},
-    {PreviewMenu::mnu75, u"75%", 2},
-    {PreviewMenu::mnu100, u"100%", 2},
-    {PreviewMenu::mnu125, u"125%", 2},
-    {PreviewMenu::mnu150, u"150%", 2},
-    {PreviewMenu::mnu200, u"200%", 2},
-    {PreviewMenu::mnuPrev, u"Prev Page", 1},
-    {PreviewMenu::mnuNext, u"Next Page", 1},
-    {PreviewMenu::mnuPaper, u"Paper", 0},
-    {PreviewMenu::mnuPaperSize, u"Size", 1},
-    {PreviewMenu::mnuA4, u"A4", 2},
-    {PreviewMenu::mnuA3, u"A3", 2},
-    {PreviewMenu::mnuDuplex, u"Duplex", 1},
-    {PreviewMenu::mnuVertical, u"Vertcial", 2},
-    {PreviewMenu::mnuHorizontal, u"Horizontal", 2},
-    {PreviewMenu::mnuSimplex, u"Simplex", 2},
+    {u"File", PreviewMenu::mnuFile, 0},
+    {u"Send Document to Printer", PreviewMenu::mnuPrinter, 1},
+    {u"Export to Adobe PDF Format", PreviewMenu::mnuExportPDF, 1},
+    {u"Close", PreviewMenu::mnuClose, 1},
+    {u"Options", PreviewMenu::mnuOptions, 0},
+    {u"Zoom", PreviewMenu::mnuZoom, 1},
+    {u"25%", PreviewMenu::mnu25, 2},
+    {u"50%", PreviewMenu::mnu50, 2},
+    {u"75%", PreviewMenu::mnu75, 2},
+    {u"100%", PreviewMenu::mnu100, 2},
+    {u"125%", PreviewMenu::mnu125, 2},
+    {u"150%", PreviewMenu::mnu150, 2},
+    {u"200%", PreviewMenu::mnu200, 2},
+    {u"Prev Page", PreviewMenu::mnuPrev, 1},
+    {u"Next Page", PreviewMenu::mnuNext, 1},
+    {u"Paper", PreviewMenu::mnuPaper, 0},
+    {u"Size", PreviewMenu::mnuPaperSize, 1},
+    {u"A4", PreviewMenu::mnuA4, 2},
+    {u"A3", PreviewMenu::mnuA3, 2},
+    {u"Duplex", PreviewMenu::mnuDuplex, 1},
+    {u"Vertcial", PreviewMenu::mnuVertical, 2},
+    {u"Horizontal", PreviewMenu::mnuHorizontal, 2},
+    {u"Simplex", PreviewMenu::mnuSimplex, 2},
 };
 
 /// What a preview window tells its presenter. None of these throws.
