@@ -16,14 +16,15 @@ constexpr FormPart parts[] = {
      .follows = width | height,
      .place = {7, 7, 426, 122},
      .caption = u"Command line switches"},
-    {.id = Help::rtbExamples,
-     .kind = PartKind::rich_text,
-     .follows = width | bottom,
-     .place = {7, 135, 426, 68},
-     .caption = u"Examples"},
+    {.id = Help::examples_label,
+     .kind = PartKind::label,
+     .follows = bottom,
+     .place = {7, 134, 80, 9},
+     .caption = u"&Examples:"},
+    {.id = Help::rtbExamples, .kind = PartKind::rich_text, .follows = width | bottom, .place = {7, 145, 426, 68}},
 };
 
-constexpr FormDescription description{.parts = parts, .width = 440, .height = 210, .is_resizable = true};
+constexpr FormDescription description{.parts = parts, .width = 440, .height = 220, .is_resizable = true};
 
 struct Switch {
   TextView command;

@@ -9,7 +9,8 @@ namespace talutil {
 class FrmCmdLineHelp final : public Form {
  public:
   static constexpr std::uint8_t Grid1 = 0;
-  static constexpr std::uint8_t rtbExamples = 1;
+  static constexpr std::uint8_t examples_label = 1;
+  static constexpr std::uint8_t rtbExamples = 2;
 
   explicit FrmCmdLineHelp(Library& library);
 

@@ -69,9 +69,9 @@ inline void take_picture(const std::wstring& folder, const wchar_t* name) {
   check_equal(INVALID_FILE_ATTRIBUTES, GetFileAttributesW(wanted.c_str()), "a picture was taken");
 }
 
-/// The window of a class of the library's, once it is shown; null when it is not within some seconds.
+/// The window of a class of the library's, once it is shown; null when it is not within half a minute.
 inline HWND wait_for_window(const std::wstring& class_name) {
-  for (int i = 0; i < 400; ++i) {
+  for (int i = 0; i < 3000; ++i) {
     const auto windows = top_windows(
         [&](HWND window) { return describe(window).class_name == class_name && IsWindowVisible(window) != FALSE; });
     if (!windows.empty()) return windows[0];

@@ -246,7 +246,7 @@ void boxes_are_entered_once(Session& session) {
   check_equal(L"a", answer, "the answer of the first");
 
   // A host that quits gets its box back, and hears of it in its own loop.
-  SetTimer(nullptr, 0, 300, &quit);
+  SetTimer(nullptr, 0, 1000, &quit);
   ask(session, {}, [](HWND) {});
   MSG message{};
   check(PeekMessageW(&message, nullptr, WM_QUIT, WM_QUIT, PM_REMOVE) != FALSE && message.wParam == 7, "it quits");

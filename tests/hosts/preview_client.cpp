@@ -80,7 +80,7 @@ void CALLBACK quit(HWND, UINT, UINT_PTR timer, DWORD) {
 }
 
 void host_quits(_ORVUtils* u, const Desktop& desktop) {
-  SetTimer(nullptr, 0, 300, &quit);
+  SetTimer(nullptr, 0, 1000, &quit);
   preview(u, desktop, L"x", [](HWND) {});
   MSG message{};
   check(PeekMessageW(&message, nullptr, WM_QUIT, WM_QUIT, PM_REMOVE) != FALSE && message.wParam == 3,

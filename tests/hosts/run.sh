@@ -90,6 +90,16 @@ expect_success "the words of the printed keys, which begin: ${words:0:100}" \
   test "${words#*GENERAL Copy Text CTRL+C*Page 1 of 6*ORV Help PDF = F1*Telephone Contact = CTRL+T}" != "$words"
 expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
+# The server lends its screen to later programs: for those without one, another is begun.
+restart_wine() {
+  in_wine_root /usr/lib/wine/wineserver32 -k 2>/dev/null || true
+  start_wine
+}
+restart_wine
+no_screen='445 There is no screen to show the window on'
+answers=$(DISPLAY='' wine cscript.exe //nologo 'Z:\checkout\tests\hosts\no_screen.vbs' 2>/dev/null | tr -d '\r')
+expect_success "windows without a screen, which answered: $answers" test "$answers" = "$no_screen"$'\n'"$no_screen"$'\n'"$no_screen"
+restart_wine
 run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'
 
 # A cipher text made on one side opens on the other.

@@ -276,6 +276,25 @@ TEST_F(Pages, ListsRunOffThePage) {
               ::testing::StartsWith("1134,1134 a long\n1134,1374 entry that\n1134,1814 a long\n"));
 }
 
+TEST_F(Preview, EndlessListsStayOnOnePage) {
+  struct List final : Object {
+    std::int32_t member_id(TextView name) override { return name == u"ListCount" ? 1 : 2; }
+    Variant invoke(std::int32_t member, Access /*access*/, std::span<const Variant> /*arguments*/) override {
+      return member == 1 ? Variant(100'000) : Variant(u"entry");
+    }
+  };
+  std::size_t entries = 0;
+  std::size_t pages = 0;
+  platform.preview.user = [&](PreviewEvents& /*events*/) {
+    const auto& document = dynamic_cast<PrintControl&>(*library.preview().print_control().object()).document();
+    pages = document.pages.size();
+    entries = document.pages[0].items.size();
+  };
+  utils.ListBoxPrintPreview(100, 1, u"Names", u"", ObjectRef(std::make_shared<List>()));
+  EXPECT_EQ(pages, 1U);
+  EXPECT_GE(entries, 100'000U);
+}
+
 TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   const auto grid = std::make_shared<Grid>(library.platform());
   grid->put_Cols(5);

@@ -2,13 +2,23 @@
 
 namespace talutil::win32 {
 
+namespace {
+
+/// The icon of the host's program, where it has one under the number that its tools give it.
+HICON host_icon() {
+  const HICON icon = LoadIconW(GetModuleHandleW(nullptr), MAKEINTRESOURCEW(1));
+  return icon != nullptr ? icon : LoadIconW(nullptr, IDI_APPLICATION);
+}
+
+}  // namespace
+
 WindowClass::WindowClass(const wchar_t* name, WNDPROC procedure, int background) : name_(name) {
   WNDCLASSW description{};
   description.lpfnWndProc = procedure;
   description.hInstance = own_module();
   description.lpszClassName = name;
   description.hCursor = LoadCursorW(nullptr, IDC_ARROW);
-  description.hIcon = LoadIconW(nullptr, IDI_APPLICATION);
+  description.hIcon = host_icon();
   description.hbrBackground = reinterpret_cast<HBRUSH>(static_cast<INT_PTR>(background + 1));
   RegisterClassW(&description);
 }
