@@ -135,8 +135,15 @@ class FormWindow final : public FormView {
     if (window_ == nullptr) {
       throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::action_not_supported), Text(no_screen_for_windows));
     }
+    try {
+      for (const FormPart& part : description.parts) add(part);
+    } catch (...) {
+      // Nobody else would: an object that was never made has no end.
+      for (const HWND tips : tips_) DestroyWindow(tips);
+      DestroyWindow(window_);
+      throw;
+    }
     SetWindowLongPtrW(window_, GWLP_USERDATA, reinterpret_cast<LONG_PTR>(this));
-    for (const FormPart& part : description.parts) add(part);
     // Tabs lie behind what stands on their pages.
     for (const Control& control : controls_) {
       constexpr UINT order_alone = SWP_NOMOVE | SWP_NOSIZE | SWP_NOACTIVATE;
