@@ -1,6 +1,8 @@
 # The libraries that tools/third_party.sh builds: archives::zip, archives::deflate and documents::pdf.
 set(flavour native)
-if(WIN32)
+if(WIN32 AND CMAKE_SIZEOF_VOID_P EQUAL 8)
+  set(flavour windows64)
+elseif(WIN32)
   set(flavour windows)
 elseif(TALUTIL_FUZZ)
   set(flavour fuzz)

@@ -4,11 +4,25 @@ add_compile_definitions(UNICODE _UNICODE WINVER=0x0601 _WIN32_WINNT=0x0601)
 file(GLOB win32_sources CONFIGURE_DEPENDS src/platform/win32/*.cpp)
 add_library(talutil_platform STATIC ${win32_sources})
 # The system's cryptography is loaded at its first use: most hosts never need it, and it is slow to load.
-find_program(dlltool i686-w64-mingw32-dlltool REQUIRED NO_CMAKE_FIND_ROOT_PATH)
+if(CMAKE_SIZEOF_VOID_P EQUAL 8)
+  set(idl_flags -m64 --win64)
+  set(manifest_kind manifest64)
+  # Without the bytes of the arguments, which 64-bit names do not have.
+  file(STRINGS cmake/bcrypt.def bcrypt_lines REGEX "^[A-Z]")
+  list(TRANSFORM bcrypt_lines REPLACE "@[0-9]+$" "")
+  list(JOIN bcrypt_lines "\n" bcrypt_text)
+  set(bcrypt_definition ${CMAKE_BINARY_DIR}/bcrypt.def)
+  file(CONFIGURE OUTPUT ${bcrypt_definition} CONTENT "${bcrypt_text}\n" @ONLY)
+else()
+  set(idl_flags -m32 --win32)
+  set(manifest_kind manifest)
+  set(bcrypt_definition ${CMAKE_SOURCE_DIR}/cmake/bcrypt.def)
+endif()
+find_program(dlltool ${talutil_tool_prefix}-dlltool REQUIRED NO_CMAKE_FIND_ROOT_PATH)
 set(delayed_bcrypt ${CMAKE_BINARY_DIR}/libbcrypt_delayed.a)
 add_custom_command(OUTPUT ${delayed_bcrypt}
-  COMMAND ${dlltool} --kill-at --input-def ${CMAKE_SOURCE_DIR}/cmake/bcrypt.def --output-delaylib ${delayed_bcrypt}
-  DEPENDS cmake/bcrypt.def)
+  COMMAND ${dlltool} --kill-at --input-def ${bcrypt_definition} --output-delaylib ${delayed_bcrypt}
+  DEPENDS ${bcrypt_definition})
 add_custom_target(delayed_imports DEPENDS ${delayed_bcrypt})
 add_dependencies(talutil_platform delayed_imports)
 target_link_libraries(talutil_platform PUBLIC talutil_core PRIVATE ${delayed_bcrypt} delayimp)
@@ -21,7 +35,7 @@ if(NOT EXISTS "${TALUTIL_STDOLE_DIR}/stdole2.tlb")
                       "before cmake, and run ./test wine once so that the Wine root exists")
 endif()
 find_program(host_compiler NAMES c++ g++ REQUIRED NO_CMAKE_FIND_ROOT_PATH)
-find_program(idl_compiler i686-w64-mingw32-widl REQUIRED NO_CMAKE_FIND_ROOT_PATH)
+find_program(idl_compiler ${talutil_tool_prefix}-widl REQUIRED NO_CMAKE_FIND_ROOT_PATH)
 set(generated ${CMAKE_BINARY_DIR}/generated)
 file(MAKE_DIRECTORY ${generated})
 file(GLOB table_headers CONFIGURE_DEPENDS src/automation/*.hpp src/library/*.hpp src/forms/c_control_position.hpp)
@@ -40,11 +54,11 @@ add_custom_command(
   OUTPUT ${generated}/TALUtil.tlb ${generated}/TALUtil.h ${CMAKE_BINARY_DIR}/TALUtil.manifest
   COMMAND ${generated}/write_idl idl > ${generated}/TALUtil.idl
   COMMAND ${generated}/write_idl header > ${generated}/TALUtil-header.idl
-  COMMAND ${generated}/write_idl manifest > ${CMAKE_BINARY_DIR}/TALUtil.manifest
-  COMMAND ${idl_compiler} -m32 --win32 -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
+  COMMAND ${generated}/write_idl ${manifest_kind} > ${CMAKE_BINARY_DIR}/TALUtil.manifest
+  COMMAND ${idl_compiler} ${idl_flags} -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
           -t -o ${generated}/TALUtil.tlb ${generated}/TALUtil.idl
   COMMAND ${generated}/mend_typelib ${generated}/TALUtil.tlb
-  COMMAND ${idl_compiler} -m32 --win32 -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
+  COMMAND ${idl_compiler} ${idl_flags} -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
           -h -o ${generated}/TALUtil.h ${generated}/TALUtil-header.idl
   # Clients have the platform's headers in place of the base types.
   COMMAND sed -i /base.h/d ${generated}/TALUtil.h
@@ -59,7 +73,8 @@ add_library(TALUtil SHARED ${com_sources} src/com/talutil.def ${generated}/talut
 set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
 target_include_directories(TALUtil PRIVATE ${generated})
 target_link_libraries(TALUtil PRIVATE talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)
-target_link_options(TALUtil PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup)
+# Sections on page boundaries are mapped; others are read and copied, which is most of the time that loading takes.
+target_link_options(TALUtil PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup -Wl,--file-alignment=4096)
 
 # In a folder of its own: the library finds it where a package puts it, beside the program or beside TALUtil.dll.
 add_library(printhelper SHARED src/printhelper/printhelper.cpp src/printhelper/printhelper.def)

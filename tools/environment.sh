@@ -9,6 +9,10 @@ talutil_cache=${XDG_CACHE_HOME:-$HOME/.cache}/talutil
 native_packages="build-essential zlib1g-dev cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata"
 exchange_packages="zip unzip p7zip-full python3 poppler-utils qpdf fonts-dejavu-core"
 windows_packages="binutils libz-mingw-w64-dev debootstrap debian-archive-keyring g++-mingw-w64-i686-posix mingw-w64-tools xvfb xauth"
+windows64_packages="libz-mingw-w64-dev g++-mingw-w64-x86-64-posix mingw-w64-tools wine64 xvfb xauth"
+
+# Every checkout on the machine shares what the compiler has made: paths count from the checkout's own folder.
+export CCACHE_BASEDIR=$talutil_top CCACHE_NOHASHDIR=1
 
 fail() {
   printf '%s: %s\n' "$(basename "$0")" "$*" >&2
@@ -110,11 +114,32 @@ make_wine_root() {
   mv -T "$unfinished" "$wine_root" 2>/dev/null || rm -rf "$unfinished"
 }
 
+# Two Wines run the programs: the 32-bit one of the root, and the 64-bit one of the machine's own packages, which needs
+# no root and no emulator. Both show the checkout as Z:\checkout and the build folder as Z:\build.
+wine_bits=32
+
+use_wine64() {
+  wine_bits=64
+  need_packages $windows64_packages
+}
+
+# The folder of the Wine prefix, as the host sees it, and the build folder as Wine's own programs see it.
+wine_prefix() { [ $wine_bits = 64 ] && echo "$talutil_build/wine64-prefix" || echo "$talutil_build/wine-prefix"; }
+build_below_wine() { [ $wine_bits = 64 ] && echo "$talutil_build" || echo /build; }
+
+# What Wine's programs see of the environment, and no more. A test may choose another locale for them.
+wine_environment() {
+  printf '%s\n' PATH=/usr/bin:/bin:/usr/sbin:/sbin USER=root "LANG=${WINE_LANG:-C.UTF-8}" \
+    ${WINE_LANG:+"LC_ALL=$WINE_LANG"} ${WINE_LOCPATH:+"LOCPATH=$WINE_LOCPATH"} ${DISPLAY:+"DISPLAY=$DISPLAY"} \
+    "WINEDEBUG=${WINEDEBUG:--all}" 'WINEDLLOVERRIDES=winedbg.exe=d;mscoree=d;mshtml=d'
+}
+
 # Runs a command inside the Wine root, with the checkout under /checkout (Z:\checkout) and the build
 # folder under /build (Z:\build). Mounts live in a namespace of their own and end with the command.
 in_wine_root() {
   mkdir -p "$talutil_build"
-  local limit=${WINE_TIMEOUT:-120}
+  local limit=${WINE_TIMEOUT:-120} variables
+  mapfile -t variables < <(wine_environment)
   # shellcheck disable=SC2016
   timeout --kill-after=5 "$limit" unshare --mount bash -euc '
     root=$1 top=$2 build=$3
@@ -123,30 +148,54 @@ in_wine_root() {
     mount --bind "$build" "$root/build"
     mount --rbind /dev "$root/dev"
     mount -t proc proc "$root/proc"
-    exec chroot "$root" env -i HOME=/root USER=root PATH=/usr/bin:/bin:/usr/sbin:/sbin LANG=C.UTF-8 \
-      ${DISPLAY:+DISPLAY=$DISPLAY} WINEARCH=win32 WINEPREFIX=/build/wine-prefix WINEDEBUG=${WINEDEBUG:--all} \
-      WINEDLLOVERRIDES="winedbg.exe=d;mscoree=d;mshtml=d" "$@"
-  ' in_wine_root "$wine_root" "$talutil_top" "$talutil_build" "$@"
+    exec chroot "$root" env -i HOME=/root WINEARCH=win32 WINEPREFIX=/build/wine-prefix "$@"
+  ' in_wine_root "$wine_root" "$talutil_top" "$talutil_build" "${variables[@]}" "$@"
 }
 
-wine() { in_wine_root /usr/lib/wine/wine "$@"; }
+in_wine64() {
+  local limit=${WINE_TIMEOUT:-120} variables
+  mapfile -t variables < <(wine_environment)
+  timeout --kill-after=5 "$limit" env -i HOME="$talutil_build" WINEARCH=win64 WINEPREFIX="$(wine_prefix)" \
+    "${variables[@]}" "$@"
+}
 
-# Makes the prefix when it is missing and keeps the Wine server for a minute after the last program,
-# so that a script host starts in a fraction of a second.
-start_wine() {
-  make_wine_root
-  if [ ! -f "$talutil_build/wine-prefix/system.reg" ]; then
-    say "making the Wine prefix (once a build folder)"
-    WINE_TIMEOUT=180 wine wineboot --init >/dev/null 2>&1 || fail "wineboot failed in $wine_root"
-    in_wine_root /usr/lib/wine/wineserver32 -w || true
+wine() { if [ $wine_bits = 64 ]; then in_wine64 /usr/lib/wine/wine64 "$@"; else in_wine_root /usr/lib/wine/wine "$@"; fi; }
+
+# A persistent server would hold the caller's standard output open.
+wine_server() {
+  if [ $wine_bits = 64 ]; then in_wine64 /usr/lib/wine/wineserver64 "$@"; else in_wine_root /usr/lib/wine/wineserver32 "$@"; fi \
+    >/dev/null 2>&1 || true
+}
+
+# Makes the prefix when it is missing. Its drive Z: is the whole machine until it is made, for Wine finds the
+# description of new prefixes there.
+make_wine_prefix() {
+  local prefix drive
+  prefix=$(wine_prefix)
+  [ ! -f "$prefix/made" ] || return 0
+  say "making the $wine_bits-bit Wine prefix (once a build folder)"
+  WINE_TIMEOUT=180 wine wineboot --init >/dev/null 2>&1 || fail "wineboot failed for $prefix"
+  wine_server -w
+  if [ $wine_bits = 64 ]; then
+    drive=$talutil_build/wine64-drive
+    mkdir -p "$drive"
+    ln -sfn "$talutil_top" "$drive/checkout"
+    ln -sfn "$talutil_build" "$drive/build"
+    ln -sfn "$drive" "$prefix/dosdevices/z:"
   fi
-  in_wine_root /usr/lib/wine/wineserver32 -p60 2>/dev/null || true
   # The tests' screen has no window manager, whose answers windows would wait two seconds for.
-  if [ ! -f "$talutil_build/wine-prefix/unmanaged" ]; then
-    wine reg.exe add 'HKCU\Software\Wine\X11 Driver' /v Managed /d N /f >/dev/null 2>&1 &&
-      touch "$talutil_build/wine-prefix/unmanaged" || true  # Slower, no worse.
-  fi
+  wine reg.exe add 'HKCU\Software\Wine\X11 Driver' /v Managed /d N /f >/dev/null 2>&1 || true  # Slower, no worse.
+  touch "$prefix/made"
 }
 
-# Where the cross build finds the platform's own type library.
+# Makes what is missing and keeps the Wine server for a minute after the last program, so that a script host starts in
+# a fraction of a second.
+start_wine() {
+  [ $wine_bits = 64 ] || make_wine_root
+  make_wine_prefix
+  wine_server -p60
+}
+
+# Where the cross builds find the platform's own type library.
 export TALUTIL_STDOLE_DIR=$wine_root/usr/lib/i386-linux-gnu/wine/i386-windows
+export TALUTIL_STDOLE64_DIR=/usr/lib/x86_64-linux-gnu/wine/x86_64-windows

@@ -2,7 +2,7 @@
 # Builds the libraries that the distribution does not offer in the form we need, once a machine, and prints the folder
 # that holds their headers and archives:
 #
-#   tools/third_party.sh native|windows|fuzz
+#   tools/third_party.sh native|windows|windows64|fuzz
 #
 # The sources are those of the distribution's source packages, checked by apt. The folder lies in the user's cache and
 # is named by a hash of this recipe and its patches, so that every checkout shares it and a change makes a new one.
@@ -22,11 +22,15 @@ trap clean_up EXIT
 case $flavour in
   native) cc=cc ar=ar flags="-O2 -fPIC" ;;
   windows)
-    cc=i686-w64-mingw32-gcc-posix ar=i686-w64-mingw32-ar
+    cc=i686-w64-mingw32-gcc-posix ar=i686-w64-mingw32-ar toolchain=mingw32
     flags="-O2 -msse2 -mfpmath=sse -mstackrealign -ffunction-sections -fdata-sections"
     ;;
+  windows64)
+    cc=x86_64-w64-mingw32-gcc-posix ar=x86_64-w64-mingw32-ar toolchain=mingw64
+    flags="-O2 -ffunction-sections -fdata-sections"
+    ;;
   fuzz) cc=clang ar=ar flags="-O1 -g1 -fPIC -fsanitize=address,fuzzer-no-link" ;;
-  *) fail "usage: $0 native|windows|fuzz" ;;
+  *) fail "usage: $0 native|windows|windows64|fuzz" ;;
 esac
 
 # Fetches the original archive of a source package and unpacks it below $work, under the package's name.
@@ -45,9 +49,9 @@ apply() { patch --quiet --directory "$work/$1" --strip=1 --input "$talutil_top/c
 
 build_libzip() {
   local crypto=(-DENABLE_OPENSSL=ON -DENABLE_WINDOWS_CRYPTO=OFF) system=() extra=""
-  if [ "$flavour" = windows ]; then
+  if [ "$flavour" = windows ] || [ "$flavour" = windows64 ]; then
     crypto=(-DENABLE_OPENSSL=OFF -DENABLE_WINDOWS_CRYPTO=ON)
-    system=(-DCMAKE_TOOLCHAIN_FILE="$talutil_top/cmake/mingw32.cmake")
+    system=(-DCMAKE_TOOLCHAIN_FILE="$talutil_top/cmake/$toolchain.cmake")
     # 64-bit times, so that a file dated 2040 can be packed.
     extra=" -D__MINGW_USE_VC2005_COMPAT"
   fi
@@ -62,7 +66,7 @@ build_libzip() {
 
 build_libdeflate() {
   local target=libdeflate.a
-  [ "$flavour" != windows ] || target=libdeflatestatic.lib
+  [ "${flavour#windows}" = "$flavour" ] || target=libdeflatestatic.lib
   make -C "$work/libdeflate" CC="$cc" AR="$ar" CFLAGS="$flags" "$target" >&2
   cp "$work/libdeflate/$target" "$made/lib/libdeflate.a"
   cp "$work/libdeflate/libdeflate.h" "$made/include/"
@@ -85,6 +89,7 @@ if [ ! -d "$prefix" ]; then
   {
     need_packages $native_packages
     [ "$flavour" != windows ] || need_packages $windows_packages
+    [ "$flavour" != windows64 ] || need_packages $windows64_packages
     [ "$flavour" != fuzz ] || need_packages clang
     say "building the $flavour libraries for archives and documents (once, half a minute)"
   } >&2

@@ -18,14 +18,14 @@ std::string class_entry(const identity::Class& entry) {
          "\" tlbid=\"{" + std::string(identity::type_library) + "}\" threadingModel=\"Apartment\"/>\n";
 }
 
-std::string manifest() {
+std::string manifest(const std::string& processor) {
   std::string classes;
   for (const identity::Class& entry : identity::classes) classes += class_entry(entry);
   return "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"yes\"?>\n"
          "<assembly xmlns=\"urn:schemas-microsoft-com:asm.v1\" manifestVersion=\"1.0\">\n"
          "  <assemblyIdentity type=\"win32\" name=\"TALUtil\" version=\"" +
          std::string(version_text) +
-         ".0\" processorArchitecture=\"x86\"/>\n"
+         ".0\" processorArchitecture=\"" + processor + "\"/>\n"
          "  <file name=\"TALUtil.dll\">\n" +
          classes + "    <typelib tlbid=\"{" + std::string(identity::type_library) + "}\" version=\"" +
          std::to_string(identity::type_library_major) + "." + std::to_string(identity::type_library_minor) +
@@ -40,9 +40,10 @@ int main(int argc, char** argv) {
   std::string text;
   if (what == "idl") text = std::string(import) + interface_definition(Dialect::type_library);
   if (what == "header") text = std::string(import) + interface_definition(Dialect::header);
-  if (what == "manifest") text = manifest();
+  if (what == "manifest") text = manifest("x86");
+  if (what == "manifest64") text = manifest("amd64");
   if (text.empty()) {
-    std::fputs("usage: write_idl idl|header|manifest\n", stderr);
+    std::fputs("usage: write_idl idl|header|manifest|manifest64\n", stderr);
     return 2;
   }
   return std::fputs(text.c_str(), stdout) < 0 ? 1 : 0;

@@ -16,6 +16,11 @@ namespace talutil::com {
 
 namespace {
 
+/// 32- and 64-bit programs see classes of their own, but the same program identifiers and type libraries.
+constexpr bool is_64_bit = sizeof(void*) == 8;
+constexpr SYSKIND system_kind = is_64_bit ? SYS_WIN64 : SYS_WIN32;
+constexpr REGSAM view_of_others = is_64_bit ? KEY_WOW64_32KEY : KEY_WOW64_64KEY;
+
 /// A registry key, open for writing.
 class Key {
  public:
@@ -85,6 +90,15 @@ void register_class(HKEY root, const identity::Class& entry, const std::wstring&
   Key::create(root, key + L"\\Programmable").set(nullptr, L"");
 }
 
+/// True while the library for the other kind of programs is registered.
+bool others_have(HKEY root, const identity::Class& entry) {
+  HKEY key = nullptr;
+  const std::wstring path = class_key(L"CLSID\\" + identifier_of(entry));
+  const LSTATUS status = RegOpenKeyExW(root, path.c_str(), 0, KEY_QUERY_VALUE | view_of_others, &key);
+  if (status == ERROR_SUCCESS) RegCloseKey(key);
+  return status == ERROR_SUCCESS;
+}
+
 void register_type_library(RegistrationScope scope, const std::wstring& path) {
   Pointer<ITypeLib> library;
   HRESULT result = LoadTypeLibEx(path.c_str(), REGKIND_NONE, library.receive());
@@ -115,13 +129,14 @@ HRESULT unregister_library(RegistrationScope scope) noexcept {
       if (status != ERROR_FILE_NOT_FOUND) Key::check(status);
     };
     for (const identity::Class& entry : identity::classes) {
-      remove(class_key(program_id_of(entry)));
+      // First: where there is one kind of programs alone, the view of the others is the same.
       remove(class_key(L"CLSID\\" + identifier_of(entry)));
+      if (!others_have(root_of(scope), entry)) remove(class_key(program_id_of(entry)));
     }
     const GUID library = guid_of(identity::type_library);
     const auto unregister = scope == RegistrationScope::user ? &UnRegisterTypeLibForUser : &UnRegisterTypeLib;
     const HRESULT result =
-        unregister(library, identity::type_library_major, identity::type_library_minor, 0, SYS_WIN32);
+        unregister(library, identity::type_library_major, identity::type_library_minor, 0, system_kind);
     // Wine answers E_INVALIDARG for a library that is not registered.
     if (FAILED(result) && result != TYPE_E_REGISTRYACCESS && result != TYPE_E_LIBNOTREGISTERED &&
         result != E_INVALIDARG) {

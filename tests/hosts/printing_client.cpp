@@ -10,6 +10,7 @@ using namespace talutil::hosts;
 namespace {
 
 constexpr const wchar_t* printer_name = L"TALUtilTest";
+constexpr const wchar_t* printer_environment = sizeof(void*) == 8 ? L"Windows x64" : L"Windows NT x86";
 constexpr const wchar_t* spooler_key = L"Software\\Wine\\Printing\\Spooler";
 
 BOOL CALLBACK save_description(HMODULE module, const wchar_t* type, wchar_t* name, LONG_PTR path) {
@@ -26,7 +27,7 @@ wchar_t* text(const wchar_t* constant) { return const_cast<wchar_t*>(constant); 
 void install_printer(const std::wstring& output) {
   std::array<wchar_t, MAX_PATH> folder{};
   DWORD needed = 0;
-  GetPrinterDriverDirectoryW(nullptr, text(L"Windows NT x86"), 1, reinterpret_cast<BYTE*>(folder.data()), sizeof folder,
+  GetPrinterDriverDirectoryW(nullptr, text(printer_environment), 1, reinterpret_cast<BYTE*>(folder.data()), sizeof folder,
                              &needed);
   std::wstring description = std::wstring(folder.data()) + L"\\test.ppd";
   EnumResourceNamesW(LoadLibraryW(L"winspool.drv"), L"PPDFILE", &save_description,
@@ -37,7 +38,7 @@ void install_printer(const std::wstring& output) {
   DRIVER_INFO_3W driver{};
   driver.cVersion = 3;
   driver.pName = text(L"Test PostScript");
-  driver.pEnvironment = text(L"Windows NT x86");
+  driver.pEnvironment = text(printer_environment);
   driver.pDriverPath = driver.pConfigFile = text(L"wineps.drv");
   driver.pDataFile = description.data();
   driver.pDefaultDataType = text(L"RAW");
@@ -122,15 +123,16 @@ int wmain(int, wchar_t** arguments) {
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
     const std::wstring folder = arguments[1];
+    const std::wstring output = arguments[2];  // As the machine below Wine names it.
     const HWND window = CreateWindowW(L"Static", L"A window to print", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 10, 10, 400,
                                       200, nullptr, nullptr, nullptr, nullptr);
     remove_printer();
     check_equal(0, print_window(folder, window), "a window without a printer");
-    install_printer(L"/build/printed_window.ps");
+    install_printer(output + L"/printed_window.ps");
     check_equal(1, print_window(folder, window), "a window with one");
-    install_printer(L"/build/printed_report.ps");
+    install_printer(output + L"/printed_report.ps");
     check_equal(L"Print", print_preview(object.get(), desktop), "the printer dialog");
-    install_printer(L"/build/printed_keys.ps");
+    install_printer(output + L"/printed_keys.ps");
     check(print_keys(object.get(), desktop), "the printer dialog for the keys");
     DestroyWindow(window);
     remove_printer();

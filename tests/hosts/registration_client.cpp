@@ -52,7 +52,7 @@ void is_registered(HKEY root, const std::string& scope, const std::wstring& path
       {object + L"\\TypeLib", nullptr, library.substr(8)},
       {position + L"\\InprocServer32", nullptr, path},
       {position + L"\\ProgID", nullptr, L"TALUtil.cControlPosition"},
-      {library + L"\\1.0\\0\\win32", nullptr, path},
+      {library + (sizeof(void*) == 8 ? L"\\1.0\\0\\win64" : L"\\1.0\\0\\win32"), nullptr, path},
       {interface_key + std::wstring(L"\\TypeLib"), nullptr, library.substr(8)},
   };
   for (const EntryRow& row : rows) {

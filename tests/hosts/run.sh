@@ -1,11 +1,12 @@
 #!/usr/bin/env bash
-# Runs the programs and scripts of this folder against TALUtil.dll: run.sh [NAME OF THE FOLDER BELOW build].
-# Each check that fails is a line; the last line is "N passed, N failed". Needs the windows preset to be built.
+# Runs the programs and scripts of this folder against TALUtil.dll: run.sh windows|windows64, the preset it was built by.
+# Each check that fails is a line; the last line is "N passed, N failed". Needs that preset to be built.
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 . "$talutil_top/tests/hosts/screen.sh"
 
 folder=${1:-windows}
+[ "$folder" != windows64 ] || use_wine64
 dll="Z:\\build\\$folder\\TALUtil.dll"
 pictures=$talutil_build/screenshots
 passed=0
@@ -19,7 +20,7 @@ start_screen
 
 # Runs one command; its own last line is its counts. Without them it has died, which is one failure more.
 run() {
-  local name=$1 log=$talutil_build/hosts-$1.log counts status=0
+  local name=$1 log=$talutil_build/$folder-$1.log counts status=0
   shift
   WINE_TIMEOUT=120 "$@" >"$log" 2>&1 || status=$?
   tr -d '\r' <"$log" | grep '^FAILED' || true
@@ -58,7 +59,7 @@ take_pictures() {
   done
 }
 
-client() { run "$1" wine "Z:\\build\\$folder\\tests\\hosts\\${1}_client.exe" "Z:\\build\\$folder"; }
+client() { run "$1" wine "Z:\\build\\$folder\\tests\\hosts\\${1}_client.exe" "Z:\\build\\$folder" "${@:2}"; }
 
 start_wine
 client registration
@@ -80,7 +81,7 @@ run information-144 wine "Z:\\build\\$folder\\tests\\hosts\\information_client.e
 dots 96
 client preview
 rm -f "$talutil_build"/printed_*.ps
-client printing
+client printing "$(build_below_wine)"
 words_of() { gs -q -sDEVICE=txtwrite -o - "$talutil_build/$1" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' '; }
 words=$(words_of printed_report.ps)
 expect_success "the words of the printed report, which are: $words" \
@@ -92,7 +93,7 @@ expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$t
 kill $pictures_pid || true
 # The server lends its screen to later programs: for those without one, another is begun.
 restart_wine() {
-  in_wine_root /usr/lib/wine/wineserver32 -k 2>/dev/null || true
+  wine_server -k
   start_wine
 }
 restart_wine

@@ -127,7 +127,7 @@ void slot_is_as_in_the_table(const Member& expected, const Slot& slot, std::size
   check(!slot.help.empty(), name + " has a help string");
   check_equal(static_cast<int>(kinds[static_cast<int>(expected.access)]), static_cast<int>(slot.kind),
               name + ", how it is used");
-  check_equal(static_cast<short>(4 * (7 + index)), slot.offset, name + ", its offset in the vtable");
+  check_equal(static_cast<short>(sizeof(void*) * (7 + index)), slot.offset, name + ", its offset in the vtable");
   check_equal(expected.identifier, slot.identifier, name + ", its identifier");
   const auto parameters = expected.parameters();
   const bool has_result = expected.result != ValueType::none;

@@ -32,7 +32,9 @@ TEST(PlatformDates, Parts) {
     EXPECT_EQ(parts, (DateParts{time.wYear, time.wMonth, time.wDay, time.wHour, time.wMinute, time.wSecond})) << days;
     double back = 0;
     ASSERT_EQ(VarDateFromUdate(&expected, 0, &back), S_OK) << days;
-    EXPECT_EQ(date_from_parts(parts), Date{back}) << days;
+    // The 64-bit platform adds day and time in other steps, which may round the last bit otherwise.
+    ASSERT_TRUE(date_from_parts(parts)) << days;
+    EXPECT_DOUBLE_EQ(date_from_parts(parts)->days, back) << days;
   }
 }
 
