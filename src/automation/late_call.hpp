@@ -18,6 +18,9 @@ struct Argument {
 
   Variant value;
   bool is_changed = false;
+  /// The earlier argument that is the same variable of the caller's; -1 for none. A member that writes to a variant
+  /// through one parameter sees it through the other, as with any reference.
+  std::int8_t same_variable_as = -1;
 };
 
 /// Calls one slot. The arguments are complete: defaults are filled in, the count is right.
@@ -68,10 +71,12 @@ class Cell {
   static constexpr bool is_written_back = passing<A>() == Passing::written_back;
   static constexpr bool is_record = is_written_back && std::is_same_v<T, SystemTime>;
 
-  void bind(Argument& argument, const Locale& locale) {
+  void bind(std::span<Argument> arguments, std::size_t place, const Locale& locale) {
+    Argument& argument = arguments[place];
     argument_ = &argument;
     if constexpr (std::is_same_v<T, Variant>) {
-      used_ = &argument.value;
+      const auto first = argument.same_variable_as;
+      used_ = is_written_back && first >= 0 ? &arguments[static_cast<std::size_t>(first)].value : &argument.value;
     } else if (T* const held = argument.value.get_if<T>()) {
       used_ = held;
     } else {
@@ -145,7 +150,7 @@ Variant late_method(void* target, std::span<Argument> arguments, const Locale& l
     return std::apply(
         [&](Cell<A>&... cell) -> Variant {
           std::size_t next = 0;
-          (cell.bind(arguments[next++], locale), ...);
+          (cell.bind(arguments, next++, locale), ...);
           return use_cells(
               [&]() -> Variant {
                 if constexpr (std::is_void_v<typename Traits::Result>) {

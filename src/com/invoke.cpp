@@ -6,6 +6,7 @@
 
 #include "com/boundary.hpp"
 #include "com/variant_bridge.hpp"
+#include "com/write_back.hpp"
 
 namespace talutil::com {
 
@@ -54,102 +55,6 @@ Variant argument_value(const Parameter& parameter, const VARIANT& given, const L
   return array_from(by_reference ? *V_ARRAYREF(&source) : V_ARRAY(&source), locale);
 }
 
-/// A value on its way back to a caller's variable: made first, stored when all are made.
-class WriteBack {
- public:
-  WriteBack(const VARIANT& target, const Variant& value, const Locale& locale) {
-    if (const auto* const time = value.get_if<SystemTime>()) {
-      record_ = system_time_of(resolved(target));
-      time_ = *time;
-      if (record_ != nullptr) return;
-    }
-    if (V_VT(&target) == (VT_BYREF | VT_VARIANT)) {
-      variable_ = const_cast<VARIANT*>(&resolved(target));
-      if ((V_VT(variable_) & VT_BYREF) == 0) {
-        if ((V_VT(variable_) & VT_ARRAY) != 0) require_resizable(V_ARRAY(variable_));
-        native_ = native_from(value, ArrayStyle::of_variants);
-        return;
-      }
-    } else {
-      variable_ = const_cast<VARIANT*>(&target);
-    }
-    make_typed(value, locale);
-  }
-
-  void store() noexcept {
-    if (record_ != nullptr) {
-      *record_ = time_;
-    } else if ((V_VT(variable_) & VT_BYREF) == 0) {
-      std::swap(*variable_, native_.get());
-    } else if ((V_VT(variable_) & VT_ARRAY) != 0) {
-      std::swap(*V_ARRAYREF(variable_), V_ARRAY(&native_.get()));
-      if (V_ARRAY(&native_.get()) == nullptr) V_VT(&native_.get()) = VT_EMPTY;
-    } else {
-      store_typed();
-    }
-  }
-
- private:
-  /// The variable has a type of its own, which it keeps.
-  void make_typed(const Variant& value, const Locale& locale) {
-    const VARTYPE type = V_VT(variable_) & ~VT_BYREF;
-    if ((type & VT_ARRAY) != 0) {
-      require_resizable(*V_ARRAYREF(variable_));
-      const VARTYPE element = type & VT_TYPEMASK;
-      if (element != VT_BSTR && element != VT_VARIANT) raise(ErrorNumber::type_mismatch);
-      native_ = native_from(value, element == VT_BSTR ? ArrayStyle::of_texts : ArrayStyle::of_variants);
-      return;
-    }
-    native_ = native_from(type == VT_BSTR ? Variant(value.to_text(locale)) : value, ArrayStyle::of_variants);
-    if (V_VT(&native_.get()) == type) return;
-    const HRESULT result = VariantChangeType(&native_.get(), &native_.get(), 0, type);
-    if (FAILED(result)) throw error_of(result, {});
-  }
-
-  void store_typed() noexcept {
-    VARIANT& native = native_.get();
-    switch (V_VT(&native)) {
-      case VT_BSTR:
-        std::swap(*V_BSTRREF(variable_), V_BSTR(&native));
-        break;
-      case VT_DISPATCH:
-        std::swap(*V_DISPATCHREF(variable_), V_DISPATCH(&native));
-        break;
-      case VT_UNKNOWN:
-        std::swap(*V_UNKNOWNREF(variable_), V_UNKNOWN(&native));
-        break;
-      case VT_UI1:
-      case VT_I1:
-        *V_UI1REF(variable_) = V_UI1(&native);
-        break;
-      case VT_I2:
-      case VT_UI2:
-      case VT_BOOL:
-        *V_I2REF(variable_) = V_I2(&native);
-        break;
-      case VT_I4:
-      case VT_UI4:
-      case VT_INT:
-      case VT_UINT:
-      case VT_ERROR:
-      case VT_R4:
-        *V_I4REF(variable_) = V_I4(&native);
-        break;
-      case VT_DECIMAL:
-        *V_DECIMALREF(variable_) = V_DECIMAL(&native);
-        break;
-      default:
-        *V_I8REF(variable_) = V_I8(&native);
-        break;
-    }
-  }
-
-  VARIANT* variable_ = nullptr;
-  OwnedVariant native_;
-  SystemTime* record_ = nullptr;  ///< The caller's, where it is a record that was written.
-  SystemTime time_;
-};
-
 /// One call: its arguments, and the way back of what the member wrote.
 class Call {
  public:
@@ -163,6 +68,7 @@ class Call {
       }
       if (invocation.bad_argument != nullptr) *invocation.bad_argument = static_cast<UINT>(at);
       arguments_[i].value = argument_value(member.parameters()[i], invocation.parameters->rgvarg[at], locale);
+      arguments_[i].same_variable_as = earlier_place_of(i, member);
     }
   }
 
@@ -171,7 +77,7 @@ class Call {
   void write_back() {
     std::array<std::optional<WriteBack>, most_parameters> changes;
     for (std::size_t i = 0; i < placement_.count; ++i) {
-      if (!arguments_[i].is_changed || placement_.argument[i] < 0) continue;
+      if (!arguments_[i].is_changed || placement_.argument[i] < 0 || arguments_[i].same_variable_as >= 0) continue;
       const VARIANT& target = invocation_.parameters->rgvarg[placement_.argument[i]];
       const bool is_written = (V_VT(&target) & VT_BYREF) != 0 || system_time_of(target) != nullptr;
       if (is_written) changes[i].emplace(target, arguments_[i].value, locale_);
@@ -182,6 +88,21 @@ class Call {
   }
 
  private:
+  /// The earlier argument that is the same variable, where both may be written to; -1 for none.
+  [[nodiscard]] std::int8_t earlier_place_of(std::size_t place, const Member& member) const {
+    const auto variable_at = [&](std::size_t i) -> const void* {
+      const Parameter& parameter = member.parameters()[i];
+      const bool is_variant = parameter.type == ValueType::variant && parameter.passing == Passing::written_back;
+      const int at = placement_.argument[i];
+      return is_variant && at >= 0 ? variable_of(invocation_.parameters->rgvarg[at]) : nullptr;
+    };
+    const void* const variable = variable_at(place);
+    for (std::size_t i = 0; variable != nullptr && i < place; ++i) {
+      if (variable_at(i) == variable) return static_cast<std::int8_t>(i);
+    }
+    return -1;
+  }
+
   const Invocation& invocation_;
   const Placement& placement_;
   const Locale& locale_;

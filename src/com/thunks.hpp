@@ -1,11 +1,15 @@
 #pragma once
 
+#include <algorithm>
+#include <array>
+#include <optional>
 #include <tuple>
 
 #include "automation/member_table.hpp"
 #include "com/boundary.hpp"
 #include "com/com_object.hpp"
 #include "com/variant_bridge.hpp"
+#include "com/write_back.hpp"
 
 /// The vtable, made from the interface table: for each row a function that takes automation's own types, calls
 /// the member and marshals back. Nothing is written per member.
@@ -51,7 +55,7 @@ template <>
 struct Wire<Variant> {
   using Type = VARIANT;
   static Variant from(const Type& value) { return variant_from(value); }
-  static OwnedVariant to(const Variant& value) { return native_from(value, ArrayStyle::of_texts); }
+  static OwnedVariant to(const Variant& value) { return native_from(value, ArrayStyle::of_variants); }
   static void store(Type& place, OwnedVariant value) noexcept { std::swap(place, value.get()); }
 };
 
@@ -76,8 +80,9 @@ template <class A>
 class WireCell {
  public:
   using T = std::remove_cvref_t<A>;
-  using Native = decltype(Wire<T>::to(std::declval<const T&>()));
   static constexpr bool is_written_back = passing<A>() == Passing::written_back;
+  /// A variant by reference may refer to a typed variable in its turn, which is written through and never replaced.
+  static constexpr bool is_variable = is_written_back && std::is_same_v<T, Variant>;
 
   explicit WireCell(WireParameter<A> given) {
     if constexpr (std::is_pointer_v<WireParameter<A>> && passing<A>() != Passing::by_value) {
@@ -89,39 +94,83 @@ class WireCell {
     if constexpr (is_written_back) before_ = value_;
   }
 
-  [[nodiscard]] T& value() noexcept { return value_; }
+  [[nodiscard]] T& value() noexcept {
+    if constexpr (is_variable) return first_ == nullptr ? value_ : first_->value();
+    return value_;
+  }
+
+  /// Where the caller's variable lies.
+  [[nodiscard]] const void* variable() const noexcept {
+    const void* const end = variable_of(*place_);
+    return end == nullptr ? place_ : end;
+  }
+
+  /// Makes this argument the same variable as an earlier one.
+  void share(WireCell& first) noexcept { first_ = &first; }
 
   /// Makes what goes back, if anything does. Nothing is stored before everything is made.
-  void prepare() {
+  void prepare(const Library& library) {
     if constexpr (is_written_back) {
-      is_changed_ = value_ != before_;
-      if (!is_changed_) return;
-      if constexpr (std::is_same_v<T, TextArray>) require_resizable(*place_);
-      native_ = Wire<T>::to(value_);
+      if (value_ == before_) return;
+      if constexpr (is_variable) {
+        if (first_ != nullptr) return;
+        native_.emplace(place_, value_, library.locale());
+      } else {
+        if constexpr (std::is_same_v<T, TextArray>) require_resizable(*place_);
+        native_.emplace(Wire<T>::to(value_));
+      }
     }
   }
 
   void store() noexcept {
     if constexpr (is_written_back) {
-      if (is_changed_) Wire<T>::store(*place_, std::move(native_));
+      if (!native_) return;
+      if constexpr (is_variable)
+        native_->store();
+      else
+        Wire<T>::store(*place_, std::move(*native_));
     }
   }
 
  private:
   struct Nothing {};
+  using Native = std::conditional_t<is_variable, WriteBack, decltype(Wire<T>::to(std::declval<const T&>()))>;
 
   typename Wire<T>::Type* place_ = nullptr;
   T value_{};
   [[no_unique_address]] std::conditional_t<is_written_back, T, Nothing> before_{};
-  [[no_unique_address]] std::conditional_t<is_written_back, Native, Nothing> native_{};
-  bool is_changed_ = false;
+  [[no_unique_address]] std::conditional_t<is_written_back, std::optional<Native>, Nothing> native_{};
+  [[no_unique_address]] std::conditional_t<is_variable, WireCell*, Nothing> first_{};
 };
 
+/// Variants that a caller passes twice are one variable: what is written to it through one parameter is seen through
+/// the other.
 template <class... A>
-void write_back(std::tuple<WireCell<A>...>& cells) {
+void find_shared_variables(std::tuple<WireCell<A>...>& cells) {
+  constexpr std::size_t count = (0 + ... + (WireCell<A>::is_variable ? 1 : 0));
+  if constexpr (count > 1) {
+    std::array<WireCell<Variant&>*, count> seen{};
+    std::size_t size = 0;
+    const auto look_at = [&](auto& cell) {
+      if constexpr (std::is_same_v<decltype(cell), WireCell<Variant&>&>) {
+        const auto end = seen.begin() + size;
+        const auto same =
+            std::find_if(seen.begin(), end, [&](auto* other) { return other->variable() == cell.variable(); });
+        if (same != end)
+          cell.share(**same);
+        else
+          seen[size++] = &cell;
+      }
+    };
+    std::apply([&](WireCell<A>&... cell) { (look_at(cell), ...); }, cells);
+  }
+}
+
+template <class... A>
+void write_back(std::tuple<WireCell<A>...>& cells, const Library& library) {
   std::apply(
-      [](WireCell<A>&... cell) {
-        (cell.prepare(), ...);
+      [&](WireCell<A>&... cell) {
+        (cell.prepare(library), ...);
         (cell.store(), ...);
       },
       cells);
@@ -129,14 +178,15 @@ void write_back(std::tuple<WireCell<A>...>& cells) {
 
 /// Runs a member; what it wrote back by then is stored even if it fails.
 template <class Function, class... A>
-auto run(std::tuple<WireCell<A>...>& cells, Function&& function) {
+auto run(std::tuple<WireCell<A>...>& cells, const Library& library, Function&& function) {
   if constexpr (!(WireCell<A>::is_written_back || ...)) {
     return function();
   } else {
+    find_shared_variables(cells);
     try {
       return function();
     } catch (...) {
-      write_back(cells);
+      write_back(cells, library);
       throw;
     }
   }
@@ -166,11 +216,12 @@ struct MethodThunk<C, M, R (Owner::*)(A...)> {
     initialize(*result);
     if ((is_null<A>(given) || ...)) return E_POINTER;
     return guarded([&] {
+      const Library& library = self->object.library();
       std::tuple<WireCell<A>...> cells{WireCell<A>(given)...};
-      auto answer = run(cells, [&] {
+      auto answer = run(cells, library, [&] {
         return std::apply([&](WireCell<A>&... cell) { return Wire<R>::to((self->object.*M)(cell.value()...)); }, cells);
       });
-      write_back(cells);
+      write_back(cells, library);
       Wire<R>::store(*result, std::move(answer));
     });
   }
@@ -181,9 +232,11 @@ struct MethodThunk<C, M, void (Owner::*)(A...)> {
   static HRESULT STDMETHODCALLTYPE call(ComObject<C>* self, WireParameter<A>... given) noexcept {
     if ((is_null<A>(given) || ...)) return E_POINTER;
     return guarded([&] {
+      const Library& library = self->object.library();
       std::tuple<WireCell<A>...> cells{WireCell<A>(given)...};
-      run(cells, [&] { std::apply([&](WireCell<A>&... cell) { (self->object.*M)(cell.value()...); }, cells); });
-      write_back(cells);
+      run(cells, library,
+          [&] { std::apply([&](WireCell<A>&... cell) { (self->object.*M)(cell.value()...); }, cells); });
+      write_back(cells, library);
     });
   }
 };

@@ -208,10 +208,9 @@ SystemTime* system_time_of(const VARIANT& value) noexcept {
 
 const VARIANT& resolved(const VARIANT& value) {
   const VARIANT* at = &value;
-  // A reference may lead to a variant that is a reference again, but honest callers stop after one or two.
   for (int depth = 0; V_VT(at) == (VT_BYREF | VT_VARIANT); ++depth) {
     at = V_VARIANTREF(at);
-    if (at == nullptr || depth == 8) raise(ErrorNumber::invalid_procedure_call);
+    if (at == nullptr || depth == most_references) raise(ErrorNumber::invalid_procedure_call);
   }
   return *at;
 }

@@ -94,7 +94,10 @@ void require_resizable(const SAFEARRAY* array);
 /// written where it lies. A null pointer for anything else.
 [[nodiscard]] SystemTime* system_time_of(const VARIANT& value) noexcept;
 
-/// The end of a chain of references to variants.
+/// A reference may lead to a variant that is a reference again, but honest callers stop after one or two.
+constexpr int most_references = 8;
+
+/// The end of a chain of references to variants. Raises 5 for one that leads nowhere or in circles.
 [[nodiscard]] const VARIANT& resolved(const VARIANT& value);
 
 }  // namespace talutil::com

@@ -392,6 +392,71 @@ void second_class(const Pointer<_cControlPosition>& position) {
   walk_vtable(position.get(), talutil::described<talutil::cControlPosition>);
 }
 
+/// A variable of the caller's, of a type of its own, and a variant that refers to it.
+struct TypedVariable {
+  VARTYPE type;
+  VARIANT variable{};
+
+  explicit TypedVariable(VARTYPE kind) : type(kind) {}
+  TypedVariable(const TypedVariable&) = delete;
+  TypedVariable& operator=(const TypedVariable&) = delete;
+  ~TypedVariable() { VariantClear(&variable); }
+
+  [[nodiscard]] VARIANT reference() {
+    VARIANT result{};
+    V_VT(&result) = static_cast<VARTYPE>(VT_BYREF | type);
+    V_BYREF(&result) = type == VT_VARIANT ? static_cast<void*>(&variable) : &V_I8(&variable);
+    return result;
+  }
+  [[nodiscard]] std::wstring text() {
+    Value shown_as_text;
+    require(VariantChangeType(shown_as_text, &variable, 0, VT_BSTR), "VariantChangeType");
+    return std::wstring(shown_as_text.text());
+  }
+};
+
+/// What a member writes to a variant that refers to a typed variable goes to that variable, which keeps its type, and
+/// the variant stays the reference that it was.
+void typed_variables_are_written_through(U* u) {
+  struct Row {
+    const char* name;
+    VARTYPE type;
+    const wchar_t* after;
+  };
+  // 10 March, which is 3 October to a user whose dates are month first.
+  const Row rows[] = {{"a text", VT_BSTR, L"10/03/2024"},
+                      {"a date", VT_DATE, L"45361"},
+                      {"a double", VT_R8, L"45361"},
+                      {"a variant", VT_VARIANT, L"10/03/2024"}};
+  for (const Row& row : rows) {
+    TypedVariable day(row.type);
+    if (row.type == VT_VARIANT || row.type == VT_BSTR) {
+      V_BSTR(&day.variable) = SysAllocString(L"10/3/2024");
+      V_VT(&day.variable) = VT_BSTR;
+    } else {
+      V_R8(&day.variable) = 45361.25;
+      V_VT(&day.variable) = row.type;
+    }
+    VARIANT reference = day.reference();
+    const VARIANT before = reference;
+    Value other_day(L"10/3/2024");
+    Value time(L"9:00");
+    Value other_time(L"10:30");
+    Value result;
+    check_equal(row.type == VT_R8 ? run_time_error(13) : S_OK,
+                u->GetTimeDifference(&reference, other_day, time, other_time, result), row.name);
+    check(std::memcmp(&before, &reference, sizeof before) == 0, std::string(row.name) + ": the reference stays");
+    if (row.type == VT_DATE) V_VT(&day.variable) = VT_R8;
+    check_equal(row.type == VT_R8 ? L"45361.25" : row.after, day.text(), row.name);
+  }
+  Value both(L"10/3/2024 9:00");
+  Value other(L"10/3/2024 10:30");
+  Value result;
+  check_equal(S_OK, u->GetTimeDifference(both, other, both, other, result), "one variable for a day and its time");
+  check_equal(L"0:0", result.text(), "the time of what has become a day");
+  check_equal(L"00:00", both.text(), "the variable after that");
+}
+
 void library_can_be_unloaded_only_when_idle(HMODULE module) {
   const auto can_unload =
       reinterpret_cast<HRESULT(WINAPI*)()>(reinterpret_cast<void*>(GetProcAddress(module, "DllCanUnloadNow")));
@@ -452,6 +517,7 @@ int wmain(int, wchar_t** arguments) {
     number_members(u);
     blank_is_written_back(u);
     lists_are_written_back(u);
+    typed_variables_are_written_through(u);
     dates(u);
     errors_have_number_and_text(u);
     counters_count_and_overflow(u);
