@@ -153,7 +153,10 @@ OwnedText::OwnedText(TextView text) : text_(nullptr) {
 OwnedArray::OwnedArray(const TextArray& array, ArrayStyle style) {
   if (!array.allocated) return;
   const VARTYPE type = style == ArrayStyle::of_texts ? VT_BSTR : VT_VARIANT;
-  array_ = SafeArrayCreateVector(type, array.lower_bound, static_cast<ULONG>(array.items.size()));
+  // Not SafeArrayCreateVector, whose arrays are documented to be of fixed size (FADF_FIXEDSIZE): a host's next call
+  // with the same variable could not resize one. Wine does not set the flag.
+  SAFEARRAYBOUND bound{static_cast<ULONG>(array.items.size()), array.lower_bound};
+  array_ = SafeArrayCreate(type, 1, &bound);
   if (array_ == nullptr) throw std::bad_alloc();
   // The array owns each element as soon as it stands in it, also when a later one cannot be made.
   const ArrayAccess access(array_);

@@ -457,6 +457,16 @@ void typed_variables_are_written_through(U* u) {
   check_equal(L"00:00", both.text(), "the variable after that");
 }
 
+void a_list_can_be_filled_again(U* u) {
+  Array list;
+  LONG count = 0;
+  for (const wchar_t* const text : {L"A,B,", L"C,"})
+    check_equal(S_OK, u->ReadCommaDelimStrToList(Text(text), list, Text(L","), &count), "a list that is filled again");
+  // The platform's reference says so of arrays that SafeArrayCreateVector makes; Wine does not set the first flag.
+  constexpr USHORT made_as_vector = 0x2000;
+  check_equal(0, list.get()->fFeatures & (FADF_FIXEDSIZE | made_as_vector), "an array that hosts can resize");
+}
+
 void library_can_be_unloaded_only_when_idle(HMODULE module) {
   const auto can_unload =
       reinterpret_cast<HRESULT(WINAPI*)()>(reinterpret_cast<void*>(GetProcAddress(module, "DllCanUnloadNow")));
@@ -517,6 +527,7 @@ int wmain(int, wchar_t** arguments) {
     number_members(u);
     blank_is_written_back(u);
     lists_are_written_back(u);
+    a_list_can_be_filled_again(u);
     typed_variables_are_written_through(u);
     dates(u);
     errors_have_number_and_text(u);
