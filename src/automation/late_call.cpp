@@ -132,18 +132,24 @@ Variant LateInterface::call(void* target, std::int32_t slot, std::span<Argument>
   const std::span<const Parameter> parameters = member.parameters();
   if (arguments.size() > parameters.size()) raise(ErrorNumber::wrong_argument_count);
 
-  const auto is_missing = [](const Argument& argument) {
-    const auto* const error = argument.value.get_if<ErrorValue>();
-    return error != nullptr && *error == missing_argument;
+  // Only what may be left out can be: in the place of another parameter, a variable that stands for an argument of the
+  // caller's own which was left out is an error value like any other.
+  const auto is_left_out = [&](std::size_t i) {
+    if (i >= arguments.size()) return true;
+    const auto* const error = arguments[i].value.get_if<ErrorValue>();
+    return parameters[i].is_optional && error != nullptr && *error == missing_argument;
   };
-  const bool complete = arguments.size() == parameters.size() && std::ranges::none_of(arguments, is_missing);
-  if (complete) return function(target, arguments, locale);
+  std::array<bool, most_parameters> is_given{};
+  bool is_complete = true;
+  for (std::size_t i = 0; i < parameters.size(); ++i) {
+    is_given[i] = !is_left_out(i);
+    is_complete = is_complete && is_given[i];
+  }
+  if (is_complete) return function(target, arguments, locale);
 
   // What is left out gets a place of its own, so that a default that a member writes to goes nowhere.
   std::array<Argument, most_parameters> all;
-  std::array<bool, most_parameters> is_given{};
   for (std::size_t i = 0; i < parameters.size(); ++i) {
-    is_given[i] = i < arguments.size() && !is_missing(arguments[i]);
     if (is_given[i]) continue;
     if (!parameters[i].is_optional) raise(ErrorNumber::argument_not_optional);
     all[i].value = parameters[i].default_value();

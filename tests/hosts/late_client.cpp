@@ -5,58 +5,13 @@
 #include <span>
 
 #include "com/module.hpp"
+#include "hostile_values.hpp"
 #include "library/identity.hpp"
 #include "slots.hpp"
 
 using namespace talutil::hosts;
 
 namespace {
-
-// What a late-bound caller can get beside success, whatever it sends.
-constexpr HRESULT documented_results[] = {DISP_E_BADPARAMCOUNT, DISP_E_PARAMNOTOPTIONAL, DISP_E_MEMBERNOTFOUND,
-                                          DISP_E_UNKNOWNNAME,   DISP_E_PARAMNOTFOUND,    E_POINTER};
-// 51, an error of no kind the library knows, is not among them.
-constexpr int documented_numbers[] = {5, 6, 7, 9, 10, 11, 13, 18, 52, 53, 57, 70, 75, 76, 91, 94, 424, 438, 445, 449};
-
-HostObject with_value(HostObject::Kind::with_value);
-HostObject without_value(HostObject::Kind::without_value);
-HostObject failing(HostObject::Kind::failing);
-
-struct Outcome {
-  HRESULT status = S_OK;
-  HRESULT code = S_OK;  ///< Of the exception, where there was one.
-  std::wstring source;
-  std::wstring description;
-  Value result;
-
-  [[nodiscard]] HRESULT error() const { return status == DISP_E_EXCEPTION ? code : status; }
-  [[nodiscard]] bool is_documented() const {
-    if (SUCCEEDED(status)) return true;
-    if (status != DISP_E_EXCEPTION)
-      return std::ranges::find(documented_results, status) != std::end(documented_results);
-    if (source != L"TALUtil.ORVUtils" || description.empty()) return false;
-    return code == HostObject::failure ||
-           std::ranges::any_of(documented_numbers, [this](int number) { return code == run_time_error(number); });
-  }
-};
-
-/// The arguments of one call, the last first, and the identifiers of the named ones, which stand in front.
-Outcome invoke(IDispatch* object, DISPID member, WORD flags, std::span<VARIANT> arguments,
-               std::span<DISPID> named = {}) {
-  Outcome outcome;
-  DISPPARAMS parameters{arguments.data(), named.data(), static_cast<UINT>(arguments.size()),
-                        static_cast<UINT>(named.size())};
-  EXCEPINFO exception{};
-  UINT bad_argument = 0;
-  outcome.status = object->Invoke(member, IID_NULL, LOCALE_USER_DEFAULT, flags, &parameters, outcome.result, &exception,
-                                  &bad_argument);
-  outcome.code = exception.scode;
-  outcome.source = view(exception.bstrSource);
-  outcome.description = view(exception.bstrDescription);
-  SysFreeString(exception.bstrSource);
-  SysFreeString(exception.bstrDescription);
-  return outcome;
-}
 
 DISPID identifier(IDispatch* object, const wchar_t* name) {
   DISPID id = DISPID_UNKNOWN;
@@ -344,141 +299,6 @@ void misuse(IDispatch* u) {
               "a result that nobody takes");
 }
 
-/// Places for what an argument refers to; cleared after the call, whatever the member made of them.
-struct Places {
-  Value cell;
-  VARIANT outer{};
-  Value argument;
-};
-
-struct Hostile {
-  std::string name;
-  std::function<void(Places&)> make;
-};
-
-/// The argument as given, by reference, in a variable, and in a variable by reference.
-void add_all_ways(std::vector<Hostile>& list, const std::string& name, const std::function<Value()>& make) {
-  const auto refer = [](Places& places) {
-    const VARTYPE type = places.cell.type();
-    // A decimal takes the whole of its VARIANT.
-    void* const data = type == VT_DECIMAL ? static_cast<void*>(&places.cell.get()) : &V_I8(&places.cell.get());
-    return Value::reference(type, data);
-  };
-  list.push_back({name, [make](Places& places) { places.argument = make(); }});
-  list.push_back({name + " by reference", [make, refer](Places& places) {
-                    places.cell = make();
-                    places.argument = refer(places);
-                  }});
-  list.push_back({name + " in a variable", [make](Places& places) {
-                    places.cell = make();
-                    places.argument = Value(&places.cell.get());
-                  }});
-  list.push_back({name + " in a variable by reference", [make, refer](Places& places) {
-                    places.cell = make();
-                    places.outer = refer(places).get();
-                    places.argument = Value(&places.outer);
-                  }});
-}
-
-Value array_value(VARTYPE type, LONG lower, std::initializer_list<const wchar_t*> items) {
-  Value result;
-  V_ARRAY(&result.get()) = std::exchange(Array(type, lower, items).get(), nullptr);
-  V_VT(&result.get()) = VT_ARRAY | type;
-  return result;
-}
-
-Value with_bits(VARTYPE type, LONGLONG bits) {
-  Value result = Value::of_type(type);
-  V_I8(&result.get()) = bits;
-  return result;
-}
-
-std::vector<Hostile> hostile_values() {
-  std::vector<Hostile> list;
-  // Every kind of variant there is and some there are not, all of them zero; texts, objects and arrays are null.
-  for (const int type : std::initializer_list<int>{0,
-                                                   1,
-                                                   2,
-                                                   3,
-                                                   4,
-                                                   5,
-                                                   6,
-                                                   7,
-                                                   8,
-                                                   9,
-                                                   10,
-                                                   11,
-                                                   13,
-                                                   14,
-                                                   15,
-                                                   16,
-                                                   17,
-                                                   18,
-                                                   19,
-                                                   20,
-                                                   21,
-                                                   22,
-                                                   23,
-                                                   24,
-                                                   25,
-                                                   26,
-                                                   27,
-                                                   28,
-                                                   29,
-                                                   30,
-                                                   31,
-                                                   36,
-                                                   64,
-                                                   72,
-                                                   VT_ARRAY | VT_BSTR,
-                                                   VT_ARRAY | VT_VARIANT,
-                                                   VT_ARRAY,
-                                                   VT_ARRAY | VT_I4,
-                                                   VT_VECTOR | VT_BSTR,
-                                                   VT_RESERVED | VT_I4}) {
-    add_all_ways(list, "zero of type " + std::to_string(type),
-                 [type] { return Value::of_type(static_cast<VARTYPE>(type)); });
-    list.push_back({"null reference of type " + std::to_string(type), [type](Places& places) {
-                      places.argument = Value::reference(static_cast<VARTYPE>(type), nullptr);
-                    }});
-  }
-  const double infinity = std::numeric_limits<double>::infinity();
-  add_all_ways(list, "number as text", [] { return Value(L"12"); });
-  add_all_ways(list, "text", [] { return Value(std::wstring_view(L"a\0\xD800,", 4)); });
-  add_all_ways(list, "missing", [] { return Value::missing(); });
-  add_all_ways(list, "other error", [] { return with_bits(VT_ERROR, E_FAIL); });
-  add_all_ways(list, "infinity", [infinity] { return Value(infinity); });
-  add_all_ways(list, "not a number", [] { return Value(std::numeric_limits<double>::quiet_NaN()); });
-  add_all_ways(list, "date beyond the calendar", [] { return with_bits(VT_DATE, 0x7FEFFFFFFFFFFFFFLL); });
-  add_all_ways(list, "largest currency", [] { return with_bits(VT_CY, std::numeric_limits<LONGLONG>::max()); });
-  add_all_ways(list, "largest whole number", [] { return with_bits(VT_UI8, -1); });
-  add_all_ways(list, "largest decimal", [] {
-    Value result;
-    result.get().decVal = DECIMAL{};
-    result.get().decVal.Hi32 = result.get().decVal.Lo32 = result.get().decVal.Mid32 = 0xFFFFFFFF;
-    V_VT(&result.get()) = VT_DECIMAL;
-    return result;
-  });
-  add_all_ways(list, "object with a value", [] { return Value(&with_value); });
-  add_all_ways(list, "object without a value", [] { return Value(&without_value); });
-  add_all_ways(list, "object that fails", [] { return Value(&failing); });
-  add_all_ways(list, "texts", [] { return array_value(VT_BSTR, 0, {L"a", L"b"}); });
-  add_all_ways(list, "variants from 1", [] { return array_value(VT_VARIANT, 1, {L"a"}); });
-  add_all_ways(list, "numbers", [] { return array_value(VT_I4, -1, {}); });
-  add_all_ways(list, "two dimensions", [] {
-    Value result;
-    V_ARRAY(&result.get()) = std::exchange(Array::square(VT_VARIANT).get(), nullptr);
-    V_VT(&result.get()) = VT_ARRAY | VT_VARIANT;
-    return result;
-  });
-  list.push_back({"a circle", [](Places& places) {
-                    V_VT(&places.outer) = VT_BYREF | VT_VARIANT;
-                    V_VARIANTREF(&places.outer) = &places.outer;
-                    places.argument = Value(&places.outer);
-                  }});
-  return list;
-}
-
 /// An argument that suits a parameter, for the places beside the hostile one.
 Value suitable(const SlotParameter& parameter) {
   switch (parameter.type == VT_PTR ? parameter.referenced : parameter.type) {
@@ -524,7 +344,7 @@ class Walk {
           if (fault.empty()) fault = std::move(found);
         }
       }
-      if (is_checking_) check(fault.empty(), fault);
+      check(fault.empty(), fault);
     }
   }
 
@@ -543,12 +363,6 @@ class Walk {
       }
     }
   }
-
-  void stop_checking() { is_checking_ = false; }
-  void leave_out(const wchar_t* member) {
-    std::erase_if(slots_, [member](const Slot& slot) { return slot.name == member; });
-  }
-  [[nodiscard]] int calls() const noexcept { return calls_; }
 
  private:
   bool is_to_come(const Slot& slot) const {
@@ -575,7 +389,6 @@ class Walk {
     const bool is_put = slot.kind == INVOKE_PROPERTYPUT;
     const Outcome outcome = invoke(object_, slot.identifier, static_cast<WORD>(slot.kind), arguments,
                                    is_put ? std::span<DISPID>(named) : std::span<DISPID>());
-    ++calls_;
     const std::string what = narrow(slot.name) + ", argument " + std::to_string(place) + ": " + value.name;
     if (!outcome.is_documented()) return what + ": answered " + shown(outcome.error()) + " " + narrow(outcome.source);
     // The list is the caller's: nothing in it may change, only what its references lead to.
@@ -587,15 +400,7 @@ class Walk {
   IDispatch* object_;
   std::vector<Slot> slots_;
   std::vector<Hostile> values_;
-  int calls_ = 0;
-  bool is_checking_ = true;
 };
-
-/// Without the platform's cache of texts, what is left on the heaps is what leaked.
-void free_texts_at_once() {
-  const auto no_cache = GetProcAddress(GetModuleHandleW(L"oleaut32.dll"), "SetOaNoCache");
-  if (check(no_cache != nullptr, "SetOaNoCache")) no_cache();
-}
 
 void release_settings(IDispatch* u) {
   for (const wchar_t* name : {L"FolderBrowseForm", L"SplashForm", L"DrawTextPictureBox"}) {
@@ -604,38 +409,6 @@ void release_settings(IDispatch* u) {
   for (const HostObject* object : {&with_value, &without_value, &failing}) {
     check_equal(1U, object->references, "references to a host's object after all calls");
   }
-}
-
-/// The bytes in use on all heaps of the process.
-std::size_t bytes_in_use() {
-  std::array<HANDLE, 32> heaps{};
-  const DWORD count = GetProcessHeaps(static_cast<DWORD>(heaps.size()), heaps.data());
-  std::size_t bytes = 0;
-  for (DWORD i = 0; i < count; ++i) {
-    PROCESS_HEAP_ENTRY entry{};
-    while (HeapWalk(heaps[i], &entry) != FALSE) {
-      if ((entry.wFlags & PROCESS_HEAP_ENTRY_BUSY) != 0) bytes += entry.cbData;
-    }
-  }
-  return bytes;
-}
-
-void memory_stays_flat(Walk& walk, IDispatch* u) {
-  constexpr int rounds = 100'000;
-  // Far less than one lost byte a call, far more than what settings of other lengths make of it.
-  constexpr std::size_t tolerance = 4096;
-  release_settings(u);
-  const std::size_t before = bytes_in_use();
-  walk.stop_checking();
-  // Of the longest lengths it makes 32767 draws, and looks for messages before each.
-  walk.leave_out(L"GenerateFilePassword");
-  const int first = walk.calls();
-  while (walk.calls() < first + rounds) walk.send_everything();
-  release_settings(u);
-  const std::size_t after = bytes_in_use();
-  check(before > 0 && after < before + tolerance, std::to_string(walk.calls() - first) + " calls took the heaps from " +
-                                                      std::to_string(before) + " to " + std::to_string(after) +
-                                                      " bytes");
 }
 
 void huge_text(IDispatch* u) {
@@ -654,7 +427,6 @@ int wmain(int, wchar_t**) {
     std::array<wchar_t, MAX_PATH> folder{};
     GetTempPathW(static_cast<DWORD>(folder.size()), folder.data());
     SetCurrentDirectoryW(folder.data());
-    free_texts_at_once();
     const Pointer<_ORVUtils> object = create_object();
     IDispatch* const u = object.get();
     properties(u);
@@ -671,7 +443,7 @@ int wmain(int, wchar_t**) {
     Walk walk(u);
     walk.send_wrong_counts();
     walk.send_everything();
-    memory_stays_flat(walk, u);
+    release_settings(u);
     put(u, L"DebugMode", Value(short{0}));
     check_equal(S_OK, use(u, L"Terminate").error(), "Terminate");
   });
