@@ -52,6 +52,19 @@ class ComObject {
     return left;
   }
 
+  /// Keeps the object for the length of a call: a member shows dialogs and lets messages in, and a host that handles
+  /// one may let go of its last reference.
+  class Keeper {
+   public:
+    explicit Keeper(ComObject* object) noexcept : object_(object) { add_reference(object); }
+    Keeper(const Keeper&) = delete;
+    Keeper& operator=(const Keeper&) = delete;
+    ~Keeper() { release(object_); }
+
+   private:
+    ComObject* object_;
+  };
+
   static HRESULT STDMETHODCALLTYPE type_information_count(ComObject*, UINT* count) noexcept {
     if (count == nullptr) return E_POINTER;
     *count = 1;
@@ -76,6 +89,7 @@ class ComObject {
                                                  UINT* bad_argument) noexcept {
     if (id == nullptr) return E_POINTER;
     if (*id != IID_NULL) return DISP_E_UNKNOWNINTERFACE;
+    const Keeper keeper(self);
     return invoke(late_interface<C>(), &self->object, self->object.library().locale(),
                   {member, flags, parameters, result, exception, bad_argument});
   }

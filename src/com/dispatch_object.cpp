@@ -222,6 +222,8 @@ class ObjectDispatch final : public IDispatch {
   HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS* parameters, VARIANT* result,
                                    EXCEPINFO* exception, UINT*) override {
     if (parameters == nullptr || (parameters->cArgs != 0 && parameters->rgvarg == nullptr)) return E_POINTER;
+    // A host may let go of the control while it handles one of its events.
+    const auto keeper = Pointer<ObjectDispatch>::shared(this);
     try {
       std::vector<Variant> arguments;
       arguments.reserve(parameters->cArgs);

@@ -215,6 +215,7 @@ struct MethodThunk<C, M, R (Owner::*)(A...)> {
     if (result == nullptr) return E_POINTER;
     initialize(*result);
     if ((is_null<A>(given) || ...)) return E_POINTER;
+    const typename ComObject<C>::Keeper keeper(self);
     return guarded([&] {
       const Library& library = self->object.library();
       std::tuple<WireCell<A>...> cells{WireCell<A>(given)...};
@@ -231,6 +232,7 @@ template <class C, auto M, class Owner, class... A>
 struct MethodThunk<C, M, void (Owner::*)(A...)> {
   static HRESULT STDMETHODCALLTYPE call(ComObject<C>* self, WireParameter<A>... given) noexcept {
     if ((is_null<A>(given) || ...)) return E_POINTER;
+    const typename ComObject<C>::Keeper keeper(self);
     return guarded([&] {
       const Library& library = self->object.library();
       std::tuple<WireCell<A>...> cells{WireCell<A>(given)...};
