@@ -1,6 +1,7 @@
 #pragma once
 
 #include "automation/run_time_error.hpp"
+#include "com/floating_point.hpp"
 #include "platform/win32/windows.hpp"
 
 /// The edge between exceptions and automation's results. No exception crosses it.
@@ -22,9 +23,10 @@ namespace talutil::com {
 /// The same as a late-bound caller takes it.
 [[nodiscard]] HRESULT report_current_exception(EXCEPINFO* information) noexcept;
 
-/// Runs a function at the boundary.
+/// Runs a function at the boundary, with the floating-point settings that it is compiled for.
 template <class Function>
 [[nodiscard]] HRESULT guarded(Function&& function) noexcept {
+  const FloatingPointSettings settings;
   try {
     function();
     return S_OK;

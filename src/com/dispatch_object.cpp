@@ -224,6 +224,7 @@ class ObjectDispatch final : public IDispatch {
     if (parameters == nullptr || (parameters->cArgs != 0 && parameters->rgvarg == nullptr)) return E_POINTER;
     // A host may let go of the control while it handles one of its events.
     const auto keeper = Pointer<ObjectDispatch>::shared(this);
+    const FloatingPointSettings settings;
     try {
       std::vector<Variant> arguments;
       arguments.reserve(parameters->cArgs);

@@ -166,6 +166,7 @@ HRESULT invoke(const LateInterface& table, void* target, const Locale& locale, c
   const std::int32_t slot = slot_for(table, invocation.member, invocation.flags);
   if (slot < 0) return DISP_E_MEMBERNOTFOUND;
   const Member& member = table.members[static_cast<std::size_t>(slot)];
+  const FloatingPointSettings settings;
   try {
     if (member.is_pending) raise(ErrorNumber::action_not_supported);
     Placement placement;

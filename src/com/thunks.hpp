@@ -255,7 +255,12 @@ struct PropertyThunk {
   static HRESULT STDMETHODCALLTYPE get(ComObject<C>* self, Type* result) noexcept {
     if (result == nullptr) return E_POINTER;
     initialize(*result);
-    return guarded([&] { Wire<Field>::store(*result, Wire<Field>::to(field(self))); });
+    if constexpr (std::is_arithmetic_v<Type>) {
+      *result = Wire<Field>::to(field(self));
+      return S_OK;
+    } else {
+      return guarded([&] { Wire<Field>::store(*result, Wire<Field>::to(field(self))); });
+    }
   }
 
   static HRESULT STDMETHODCALLTYPE put(ComObject<C>* self, Type value) noexcept {

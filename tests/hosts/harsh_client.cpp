@@ -1,9 +1,81 @@
-// A host that lets go of its objects while they work.
+// A host as old compilers make them: with floating-point exceptions unmasked, and letting go of its objects while they
+// work.
+#include <xmmintrin.h>
+
+#include <limits>
+
 #include "client.hpp"
 
 using namespace talutil::hosts;
 
 namespace {
+
+using U = _ORVUtils;
+
+std::uint16_t control_word() {
+  std::uint16_t value = 0;
+  __asm__ volatile("fnstcw %0" : "=m"(value));
+  return value;
+}
+
+/// Settings of the processor that a host may have, until the end of a scope.
+class Settings {
+ public:
+  Settings(std::uint16_t control, std::uint32_t sse_control) : control_(control_word()), sse_control_(_mm_getcsr()) {
+    set(control, sse_control);
+  }
+  Settings(const Settings&) = delete;
+  Settings& operator=(const Settings&) = delete;
+  ~Settings() { set(control_, sse_control_); }
+
+ private:
+  static void set(std::uint16_t control, std::uint32_t sse_control) {
+    __asm__ volatile("fnclex");
+    __asm__ volatile("fldcw %0" : : "m"(control));
+    _mm_setcsr(sse_control);
+  }
+
+  std::uint16_t control_;
+  std::uint32_t sse_control_;
+};
+
+Value not_a_number() { return Value(std::numeric_limits<double>::quiet_NaN()); }
+
+void unmasked_exceptions_do_no_harm(U* u) {
+  // Invalid operation, division by zero and overflow unmasked, in both units.
+  constexpr std::uint16_t control = 0x0272;
+  constexpr std::uint32_t sse_control = 0x1900;
+  HRESULT early = S_OK;
+  HRESULT late = S_OK;
+  std::uint16_t control_after = 0;
+  std::uint32_t sse_control_after = 0;
+  Value number = not_a_number();
+  Value result;
+  const Settings settings(control, sse_control);
+  early = u->GetDay(number, Short{});
+  VARIANT argument = number.get();
+  DISPPARAMS parameters{&argument, nullptr, 1, 0};
+  auto* name = const_cast<wchar_t*>(L"GetDay");
+  DISPID id = 0;
+  u->GetIDsOfNames(IID_NULL, &name, 1, LOCALE_USER_DEFAULT, &id);
+  late = u->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters, result, nullptr, nullptr);
+  control_after = control_word();
+  sse_control_after = _mm_getcsr() & ~0x3FU;
+  check(FAILED(early), "a NaN for a date, early");
+  check_equal(DISP_E_EXCEPTION, late, "a NaN for a date, late");
+  check_equal(control, control_after, "the control word comes back");
+  check_equal(sse_control, sse_control_after, "so does that of the newer unit");
+}
+
+void short_precision_changes_no_digit(U* u) {
+  constexpr std::uint16_t single_precision = 0x007F;
+  Text digits;
+  {
+    const Settings settings(single_precision, 0x1F80);
+    u->VerifyIntData(Short{0}, Value(L"123456789012345"), digits);
+  }
+  check_equal(L"123456789012345", digits.view(), "a number with 24 bits of precision");
+}
 
 /// A control that lets go of the library's object while that moves it.
 class LettingGo final : public NamelessObject {
@@ -73,6 +145,9 @@ void objects_outlive_their_calls() {
 
 int wmain(int, wchar_t**) {
   return run_checks([] {
+    const Pointer<U> object = create_object();
+    unmasked_exceptions_do_no_harm(object.get());
+    short_precision_changes_no_digit(object.get());
     objects_outlive_their_calls();
   });
 }

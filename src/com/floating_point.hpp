@@ -1,0 +1,47 @@
+#pragma once
+
+#include <xmmintrin.h>
+
+#include <cstdint>
+
+namespace talutil::com {
+
+/// The processor's floating-point settings as this library is compiled for them, for the length of a call: all
+/// exceptions masked, rounding to nearest, 53 bits in the old unit. Hosts of some compilers unmask exceptions, which a
+/// NaN in an argument would end them by; graphics libraries leave 24 bits behind, with which the run-time's conversions
+/// of numbers give other digits. The caller's settings come back at the end.
+class FloatingPointSettings {
+ public:
+  FloatingPointSettings() noexcept : control_(control()), sse_control_(_mm_getcsr()) {
+    if (control_ != standard_control) set_control(standard_control);
+    if ((sse_control_ & ~sse_flags) != standard_sse_control) _mm_setcsr(standard_sse_control);
+  }
+  FloatingPointSettings(const FloatingPointSettings&) = delete;
+  FloatingPointSettings& operator=(const FloatingPointSettings&) = delete;
+  ~FloatingPointSettings() {
+    if (control_ != standard_control) {
+      // What was raised while masked would be reported by the caller's next instruction.
+      __asm__ volatile("fnclex");
+      set_control(control_);
+    }
+    if ((sse_control_ & ~sse_flags) != standard_sse_control) _mm_setcsr(sse_control_);
+  }
+
+ private:
+  // The values that the system starts every thread with.
+  static constexpr std::uint16_t standard_control = 0x027F;
+  static constexpr std::uint32_t standard_sse_control = 0x1F80;
+  static constexpr std::uint32_t sse_flags = 0x3F;  ///< What was raised so far; no setting.
+
+  static std::uint16_t control() noexcept {
+    std::uint16_t value = 0;
+    __asm__ volatile("fnstcw %0" : "=m"(value));
+    return value;
+  }
+  static void set_control(std::uint16_t value) noexcept { __asm__ volatile("fldcw %0" : : "m"(value)); }
+
+  std::uint16_t control_;
+  std::uint32_t sse_control_;
+};
+
+}  // namespace talutil::com
