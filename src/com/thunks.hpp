@@ -205,6 +205,12 @@ void initialize(T& place) noexcept {
   place = T{};
 }
 
+/// The answer to a null pointer. The thread may still hold the information on an earlier error, which this is not.
+inline HRESULT null_pointer() noexcept {
+  SetErrorInfo(0, nullptr);
+  return E_POINTER;
+}
+
 template <class C, auto M, class Signature = decltype(M)>
 struct MethodThunk;
 
@@ -212,9 +218,9 @@ template <class C, auto M, class Owner, class R, class... A>
 struct MethodThunk<C, M, R (Owner::*)(A...)> {
   static HRESULT STDMETHODCALLTYPE call(ComObject<C>* self, WireParameter<A>... given,
                                         typename Wire<R>::Type* result) noexcept {
-    if (result == nullptr) return E_POINTER;
+    if (result == nullptr) return null_pointer();
     initialize(*result);
-    if ((is_null<A>(given) || ...)) return E_POINTER;
+    if ((is_null<A>(given) || ...)) return null_pointer();
     const typename ComObject<C>::Keeper keeper(self);
     return guarded([&] {
       const Library& library = self->object.library();
@@ -231,7 +237,7 @@ struct MethodThunk<C, M, R (Owner::*)(A...)> {
 template <class C, auto M, class Owner, class... A>
 struct MethodThunk<C, M, void (Owner::*)(A...)> {
   static HRESULT STDMETHODCALLTYPE call(ComObject<C>* self, WireParameter<A>... given) noexcept {
-    if ((is_null<A>(given) || ...)) return E_POINTER;
+    if ((is_null<A>(given) || ...)) return null_pointer();
     const typename ComObject<C>::Keeper keeper(self);
     return guarded([&] {
       const Library& library = self->object.library();
@@ -253,7 +259,7 @@ struct PropertyThunk {
   }
 
   static HRESULT STDMETHODCALLTYPE get(ComObject<C>* self, Type* result) noexcept {
-    if (result == nullptr) return E_POINTER;
+    if (result == nullptr) return null_pointer();
     initialize(*result);
     if constexpr (std::is_arithmetic_v<Type>) {
       *result = Wire<Field>::to(field(self));

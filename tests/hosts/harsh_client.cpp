@@ -141,6 +141,12 @@ void objects_outlive_their_calls() {
   check_equal(1U, control.left, "references that the call itself holds");
 }
 
+void a_null_pointer_leaves_no_old_error(U* u) {
+  u->StringReplace(Text(L"a"), Text(), Text(), Text());
+  check_equal(E_POINTER, u->StringReplace(nullptr, Text(), Text(), Text()), "a null pointer");
+  check_equal(L"(no error information)", error_text(), "information on it");
+}
+
 }  // namespace
 
 int wmain(int, wchar_t**) {
@@ -149,5 +155,6 @@ int wmain(int, wchar_t**) {
     unmasked_exceptions_do_no_harm(object.get());
     short_precision_changes_no_digit(object.get());
     objects_outlive_their_calls();
+    a_null_pointer_leaves_no_old_error(object.get());
   });
 }
