@@ -7,6 +7,7 @@
 #include "com/module.hpp"
 #include "com/pointer.hpp"
 #include "library/identity.hpp"
+#include "platform/win32/module_path.hpp"
 
 // In the platform's library, but not in the headers of the tool chain.
 extern "C" HRESULT WINAPI RegisterTypeLibForUser(ITypeLib* library, OLECHAR* path, OLECHAR* help_folder);
@@ -52,14 +53,6 @@ std::wstring text_of(const GUID& identifier) {
   std::array<wchar_t, 40> text{};
   StringFromGUID2(identifier, text.data(), static_cast<int>(text.size()));
   return text.data();
-}
-
-std::wstring module_path() {
-  std::array<wchar_t, MAX_PATH> path{};
-  if (GetModuleFileNameW(module_handle(), path.data(), static_cast<DWORD>(path.size())) == 0) {
-    throw error_of(HRESULT_FROM_WIN32(GetLastError()), {});
-  }
-  return path.data();
 }
 
 HKEY root_of(RegistrationScope scope) noexcept {
@@ -114,7 +107,8 @@ void register_type_library(RegistrationScope scope, const std::wstring& path) {
 
 HRESULT register_library(RegistrationScope scope) noexcept {
   const HRESULT result = guarded([scope] {
-    const std::wstring path = module_path();
+    const Text own_path = win32::module_path(module_handle());
+    const std::wstring path(own_path.begin(), own_path.end());
     for (const identity::Class& entry : identity::classes) register_class(root_of(scope), entry, path);
     register_type_library(scope, path);
   });

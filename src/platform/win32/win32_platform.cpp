@@ -3,6 +3,7 @@
 #include <array>
 
 #include "automation/run_time_error.hpp"
+#include "platform/win32/module_path.hpp"
 #include "platform/win32/windows.hpp"
 
 namespace talutil::win32 {
@@ -11,11 +12,9 @@ namespace {
 
 /// The host application's title: the name of its program, without folder and extension.
 Text host_title() {
-  std::array<wchar_t, MAX_PATH> path{};
-  const DWORD length = GetModuleFileNameW(nullptr, path.data(), static_cast<DWORD>(path.size()));
-  TextView name = view(path.data(), length);
-  name.remove_prefix(name.find_last_of(u'\\') + 1);
-  return Text(name.substr(0, name.find_last_of(u'.')));
+  const Text path = module_path(nullptr);
+  const Text name = path.substr(path.find_last_of(u'\\') + 1);
+  return name.substr(0, name.find_last_of(u'.'));
 }
 
 constexpr float twips_per_inch = 1440;
