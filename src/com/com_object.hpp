@@ -139,7 +139,6 @@ class ComObject {
  private:
   ErrorSupport error_support_{this};
   ClassInformation class_information_{this};
-  ModuleReference keeps_module_loaded_;
 };
 
 }  // namespace talutil::com

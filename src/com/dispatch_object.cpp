@@ -249,7 +249,6 @@ class ObjectDispatch final : public IDispatch {
 
   ObjectRef object_;
   std::atomic<ULONG> references_ = 1;
-  ModuleReference keeps_module_loaded_;
 };
 
 }  // namespace

@@ -1,5 +1,4 @@
 // The entry points of TALUtil.dll and the state of the loaded module.
-#include <array>
 #include <memory>
 #include <mutex>
 
@@ -14,6 +13,7 @@
 #include "controls/grid.hpp"
 #include "controls/zip_controls.hpp"
 #include "infoforms/frm_components.hpp"
+#include "platform/win32/module_path.hpp"
 #include "platform/win32/win32_cryptography.hpp"
 #include "platform/win32/win32_drawing.hpp"
 #include "platform/win32/win32_file_dialogs.hpp"
@@ -64,26 +64,29 @@ struct LoadedLibrary {
                            control_makers, message_pump,     random_source, cryptography,  profiles,
                            settings_store, time_conversions, files,         folder_picker, guids,
                            folders,        input_boxes,      registry,      network,       file_dialogs,
-                           drawing,        window_printing,  font_files,    printers,
-                           machine}};
+                           drawing,        window_printing,  font_files,    printers,      machine}};
 };
 
 struct Module {
   HINSTANCE handle = nullptr;
-  std::atomic<long> references = 0;
-  std::mutex starting;
-  // Never ended by us: what hosts put into the settings is not to be released under the loader's lock.
+  std::atomic<long> references = 0;  ///< Class objects and locks; made before the library is.
+  // A thread that starts the library may come back here: a control that is registered to stand for ours may lead to one
+  // of our classes.
+  std::recursive_mutex starting;
+  bool is_starting = false;
+  // Neither is ever released: what hosts put into the settings is not to be let go of under the loader's lock.
   LoadedLibrary* loaded = nullptr;
+  ITypeLib* type_library = nullptr;
 };
 
 Module module_state;
 
-/// True when nothing of the library would be missed: no object, no lock, no object of a host in the settings, no window
-/// on the screen.
-bool nothing_is_held(Library& library) {
-  const SharedSettings& settings = library.settings();
-  return !settings.FolderBrowseForm && !settings.SplashForm && !settings.DrawTextPictureBox &&
-         !library.has_open_windows();
+/// Keeps the DLL in the process until that ends. Hosts may hold objects, windows and timers of ours in ways that no
+/// count sees, and each unloading would leave a slot and some memory of the compiler's run-time behind.
+void stay_loaded() noexcept {
+  HMODULE module = nullptr;
+  GetModuleHandleExW(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_PIN,
+                     reinterpret_cast<const wchar_t*>(&module_state), &module);
 }
 
 template <class C>
@@ -155,28 +158,40 @@ static_assert(std::size(class_objects) == std::size(identity::classes));
 
 }  // namespace
 
-ModuleReference::ModuleReference() noexcept { ++module_state.references; }
-
-ModuleReference::~ModuleReference() { --module_state.references; }
-
 HINSTANCE module_handle() noexcept { return module_state.handle; }
 
 Library& module_library() {
   const std::lock_guard lock(module_state.starting);
-  if (module_state.loaded == nullptr) {
-    auto loaded = std::make_unique<LoadedLibrary>();
-    loaded->library.start();
-    module_state.loaded = loaded.release();
+  if (module_state.loaded != nullptr) return module_state.loaded->library;
+  if (module_state.is_starting) {
+    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::cannot_create_object),
+                       u"ActiveX component can't create object: TALUtil is just starting; a control that is registered "
+                       u"to stand for one of its own creates TALUtil in its turn");
   }
+  struct Starting {
+    Starting() noexcept { module_state.is_starting = true; }
+    Starting(const Starting&) = delete;
+    Starting& operator=(const Starting&) = delete;
+    ~Starting() { module_state.is_starting = false; }
+  };
+  const Starting starting;
+  auto loaded = std::make_unique<LoadedLibrary>();
+  loaded->library.start();
+  stay_loaded();
+  module_state.loaded = loaded.release();
   return module_state.loaded->library;
 }
 
 HRESULT type_information(const GUID& identifier, ITypeInfo** out) noexcept {
-  std::array<wchar_t, MAX_PATH> path{};
-  GetModuleFileNameW(module_state.handle, path.data(), static_cast<DWORD>(path.size()));
-  Pointer<ITypeLib> library;
-  const HRESULT result = LoadTypeLibEx(path.data(), REGKIND_NONE, library.receive());
-  return FAILED(result) ? result : library->GetTypeInfoOfGuid(identifier, out);
+  return guarded([&] {
+    if (module_state.type_library == nullptr) {
+      const Text path = win32::module_path(module_state.handle);
+      const HRESULT result = LoadTypeLibEx(win32::wide(path), REGKIND_NONE, &module_state.type_library);
+      if (FAILED(result)) throw error_of(result, {});
+    }
+    const HRESULT result = module_state.type_library->GetTypeInfoOfGuid(identifier, out);
+    if (FAILED(result)) throw error_of(result, {});
+  });
 }
 
 }  // namespace talutil::com
@@ -202,15 +217,8 @@ STDAPI DllGetClassObject(REFCLSID class_id, REFIID id, void** out) {
   return CLASS_E_CLASSNOTAVAILABLE;
 }
 
-STDAPI DllCanUnloadNow() {
-  if (module_state.references != 0) return S_FALSE;
-  if (module_state.loaded == nullptr) return S_OK;
-  Library& library = module_state.loaded->library;
-  if (!nothing_is_held(library)) return S_FALSE;
-  // The window may not outlive the code that made it; a member that needs it again loads it again.
-  if (library.components().is_loaded()) library.components().unload();
-  return S_OK;
-}
+// A library that has been started stays; one that was only asked for a class may go.
+STDAPI DllCanUnloadNow() { return module_state.loaded == nullptr && module_state.references == 0 ? S_OK : S_FALSE; }
 
 STDAPI DllRegisterServer() { return register_library(RegistrationScope::machine); }
 

@@ -6,23 +6,15 @@
 /// The loaded DLL: the one place with state that outlives a call.
 namespace talutil::com {
 
-/// Keeps the DLL loaded while it exists: every object and every lock of a host has one.
-class ModuleReference {
- public:
-  ModuleReference() noexcept;
-  ModuleReference(const ModuleReference&) = delete;
-  ModuleReference& operator=(const ModuleReference&) = delete;
-  ~ModuleReference();
-};
-
 [[nodiscard]] HINSTANCE module_handle() noexcept;
 
-/// The one library, made and started by the first call, before the first object is handed out. Not from
-/// DllMain: the start-up makes a window, which the loader's lock forbids. Raises what the start-up raises, and
-/// then tries again at the next call.
+/// The one library, made and started by the first call, before the first object is handed out; from then on the DLL
+/// stays in the process. Not from DllMain: the start-up creates controls, which the loader's lock forbids. Raises what
+/// the start-up raises, and then tries again at the next call; 429 for a call from within the start-up.
 [[nodiscard]] Library& module_library();
 
-/// The type information of one of the type library's interfaces or classes, from the DLL's own resource.
+/// The type information of one of the type library's interfaces or classes, from the DLL's own resource, which is read
+/// once.
 [[nodiscard]] HRESULT type_information(const GUID& identifier, ITypeInfo** out) noexcept;
 
 /// A class or interface identifier of library/identity.hpp.

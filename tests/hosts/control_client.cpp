@@ -12,6 +12,7 @@ constexpr const wchar_t* program_id = L"TALUtilTest.SystemInformation";
 constexpr const wchar_t* controls_key = L"Software\\TALUtil\\Controls";
 constexpr const wchar_t* program_key = L"Software\\Classes\\TALUtilTest.SystemInformation";
 constexpr const wchar_t* value_name = L"SystemInfoControl.MSysInfo";
+constexpr const wchar_t* grid_value_name = L"VSFlex8Ctl.VSFlexGrid";
 
 /// The control: an object that knows one identifier and no names.
 class SystemInformation final : public NamelessObject {
@@ -70,7 +71,8 @@ struct RegistryCleaner {
   RegistryCleaner() { clean(); }
   ~RegistryCleaner() { clean(); }
   static void clean() {
-    RegDeleteKeyValueW(HKEY_CURRENT_USER, controls_key, value_name);
+    for (const wchar_t* const name : {value_name, grid_value_name})
+      RegDeleteKeyValueW(HKEY_CURRENT_USER, controls_key, name);
     RegDeleteKeyW(HKEY_CURRENT_USER, controls_key);
     RegDeleteTreeW(HKEY_LOCAL_MACHINE, program_key);
   }
@@ -93,6 +95,18 @@ void missing_control_is_reported() {
   for (const wchar_t* const part : {missing_class_text, controls_key, value_name}) {
     check(text.find(part) != std::wstring::npos, narrow(text) + " names " + narrow(part));
   }
+}
+
+/// A control that stands for one of ours and creates the library in its turn, while the library starts.
+void control_leads_back() {
+  set(HKEY_CURRENT_USER, controls_key, grid_value_name, L"TALUtil.Grid");
+  Pointer<_ORVUtils> object;
+  check_equal(run_time_error(429),
+              CoCreateInstance(CLSID_ORVUtils, nullptr, CLSCTX_INPROC_SERVER, IID__ORVUtils, object.receive_untyped()),
+              "creating an object whose control leads back to it");
+  const std::wstring text = error_text();
+  check(text.find(L"TALUtil.Grid") != std::wstring::npos, narrow(text) + " names TALUtil.Grid");
+  RegDeleteKeyValueW(HKEY_CURRENT_USER, controls_key, grid_value_name);
 }
 
 void control_answers() {
@@ -131,6 +145,7 @@ int wmain(int, wchar_t**) {
     require(CoRegisterClassObject(control_class, &factory, CLSCTX_INPROC_SERVER, REGCLS_MULTIPLEUSE, &registration),
             "CoRegisterClassObject");
     missing_control_is_reported();
+    control_leads_back();
     control_answers();
     control_by_program_identifier();
     CoRevokeClassObject(registration);
