@@ -13,6 +13,7 @@
 #include "controls/grid.hpp"
 #include "controls/zip_controls.hpp"
 #include "infoforms/frm_components.hpp"
+#include "platform/win32/exception_frames.hpp"
 #include "platform/win32/module_path.hpp"
 #include "platform/win32/win32_cryptography.hpp"
 #include "platform/win32/win32_drawing.hpp"
@@ -204,6 +205,9 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, void* /*reserve
   if (reason == DLL_PROCESS_ATTACH) {
     module_state.handle = instance;
     DisableThreadLibraryCalls(instance);
+    win32::register_exception_frames(instance);
+  } else if (reason == DLL_PROCESS_DETACH) {
+    win32::unregister_exception_frames();
   }
   return TRUE;
 }

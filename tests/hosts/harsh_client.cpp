@@ -1,5 +1,5 @@
-// A host as old compilers make them: with floating-point exceptions unmasked, and letting go of its objects while they
-// work.
+// A host as old compilers make them: linked with the tool chain's run-time in its default, shared way, with
+// floating-point exceptions unmasked, and letting go of its objects while they work.
 #include <xmmintrin.h>
 
 #include <limits>
@@ -11,6 +11,10 @@ using namespace talutil::hosts;
 namespace {
 
 using U = _ORVUtils;
+
+void first_error_is_caught(U* u) {
+  check_equal(run_time_error(5), u->StringReplace(Text(L"a"), Text(), Text(), Text()), "the first run-time error");
+}
 
 std::uint16_t control_word() {
   std::uint16_t value = 0;
@@ -152,6 +156,7 @@ void a_null_pointer_leaves_no_old_error(U* u) {
 int wmain(int, wchar_t**) {
   return run_checks([] {
     const Pointer<U> object = create_object();
+    first_error_is_caught(object.get());
     unmasked_exceptions_do_no_harm(object.get());
     short_precision_changes_no_digit(object.get());
     objects_outlive_their_calls();

@@ -1,0 +1,50 @@
+#include "platform/win32/exception_frames.hpp"
+
+#include <cstring>
+
+namespace talutil::win32 {
+
+#ifdef __i386__
+
+extern "C" void __register_frame_info(const void* frames, void* object);
+extern "C" void* __deregister_frame_info(const void* frames);
+
+namespace {
+
+// The unwinder's own record of the tables: six words in this version of the compiler, with some to spare.
+long object_of_frames[16];
+const void* registered_frames = nullptr;
+
+/// The section ".eh_frame", whose name is cut to eight characters in the module's header.
+const void* frames_of(HMODULE module) noexcept {
+  const auto* const base = reinterpret_cast<const BYTE*>(module);
+  const auto* const header =
+      reinterpret_cast<const IMAGE_NT_HEADERS*>(base + reinterpret_cast<const IMAGE_DOS_HEADER*>(base)->e_lfanew);
+  const IMAGE_SECTION_HEADER* section = IMAGE_FIRST_SECTION(header);
+  for (int i = 0; i < header->FileHeader.NumberOfSections; ++i, ++section) {
+    if (std::memcmp(section->Name, ".eh_fram", sizeof section->Name) == 0) return base + section->VirtualAddress;
+  }
+  return nullptr;
+}
+
+}  // namespace
+
+void register_exception_frames(HMODULE module) noexcept {
+  if (GetModuleHandleW(L"libgcc_s_dw2-1.dll") == nullptr) return;
+  registered_frames = frames_of(module);
+  if (registered_frames != nullptr) __register_frame_info(registered_frames, &object_of_frames);
+}
+
+void unregister_exception_frames() noexcept {
+  if (registered_frames != nullptr) __deregister_frame_info(registered_frames);
+  registered_frames = nullptr;
+}
+
+#else
+
+void register_exception_frames(HMODULE /*module*/) noexcept {}
+void unregister_exception_frames() noexcept {}
+
+#endif
+
+}  // namespace talutil::win32
