@@ -13,9 +13,18 @@ namespace {
 
 using namespace talutil;
 
+/// Without a threading model: objects live in the program's first apartment, and calls from others go there.
 std::string class_entry(const identity::Class& entry) {
   return "    <comClass clsid=\"{" + std::string(entry.identifier) + "}\" progid=\"" + std::string(entry.program_id) +
-         "\" tlbid=\"{" + std::string(identity::type_library) + "}\" threadingModel=\"Apartment\"/>\n";
+         "\" tlbid=\"{" + std::string(identity::type_library) + "}\"/>\n";
+}
+
+/// How calls of an interface go to another apartment: by the platform's marshaller for type libraries, whose class
+/// identifier is a constant of the platform (PSOAInterface).
+std::string interface_entry(std::string_view name, std::string_view identifier) {
+  return "  <comInterfaceExternalProxyStub name=\"" + std::string(name) + "\" iid=\"{" + std::string(identifier) +
+         "}\" proxyStubClsid32=\"{00020424-0000-0000-C000-000000000046}\" numMethods=\"7\" tlbid=\"{" +
+         std::string(identity::type_library) + "}\"/>\n";
 }
 
 std::string manifest(const std::string& processor) {
@@ -24,12 +33,13 @@ std::string manifest(const std::string& processor) {
   return "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"yes\"?>\n"
          "<assembly xmlns=\"urn:schemas-microsoft-com:asm.v1\" manifestVersion=\"1.0\">\n"
          "  <assemblyIdentity type=\"win32\" name=\"TALUtil\" version=\"" +
-         std::string(version_text) +
-         ".0\" processorArchitecture=\"" + processor + "\"/>\n"
+         std::string(version_text) + ".0\" processorArchitecture=\"" + processor +
+         "\"/>\n"
          "  <file name=\"TALUtil.dll\">\n" +
          classes + "    <typelib tlbid=\"{" + std::string(identity::type_library) + "}\" version=\"" +
          std::to_string(identity::type_library_major) + "." + std::to_string(identity::type_library_minor) +
-         "\" helpdir=\"\"/>\n  </file>\n</assembly>\n";
+         "\" helpdir=\"\"/>\n  </file>\n" + interface_entry("_ORVUtils", identity::orv_utils_interface) +
+         interface_entry("_cControlPosition", identity::control_position_interface) + "</assembly>\n";
 }
 
 }  // namespace

@@ -41,6 +41,11 @@ class Key {
                          static_cast<DWORD>(value.size() + 1) * sizeof(wchar_t)));
   }
 
+  void remove(const wchar_t* name) const {
+    const LSTATUS status = RegDeleteValueW(handle_, name);
+    if (status != ERROR_FILE_NOT_FOUND) check(status);
+  }
+
   static void check(LSTATUS status) {
     if (status != ERROR_SUCCESS) throw error_of(HRESULT_FROM_WIN32(static_cast<DWORD>(status)), {});
   }
@@ -74,7 +79,9 @@ void register_class(HKEY root, const identity::Class& entry, const std::wstring&
   Key::create(root, key).set(nullptr, program_id);
   const Key server = Key::create(root, key + L"\\InprocServer32");
   server.set(nullptr, path);
-  server.set(L"ThreadingModel", L"Apartment");
+  // None: objects live in the host's first apartment, and calls from others go there. The settings are one block, which
+  // nothing locks. A registration of earlier versions may have left one.
+  server.remove(L"ThreadingModel");
   Key::create(root, key + L"\\ProgID").set(nullptr, program_id);
   Key::create(root, key + L"\\TypeLib").set(nullptr, text_of(guid_of(identity::type_library)));
   Key::create(root, key + L"\\Version")

@@ -1,10 +1,12 @@
 #pragma once
 
 #include <array>
+#include <atomic>
 #include <cstring>
 #include <functional>
 #include <stdexcept>
 #include <string>
+#include <thread>
 #include <vector>
 
 #include "checks.hpp"
@@ -172,6 +174,34 @@ inline Pointer<_ORVUtils> create_object() {
   require(CoCreateInstance(CLSID_ORVUtils, nullptr, CLSCTX_INPROC_SERVER, IID__ORVUtils, object.receive_untyped()),
           "creating TALUtil.ORVUtils");
   return object;
+}
+
+/// Handles the messages that wait for this thread, calls from other apartments among them.
+inline void handle_messages() {
+  MSG message;
+  while (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE) != 0) DispatchMessageW(&message);
+}
+
+/// Does the work on a thread with an apartment of its own, while this thread handles the calls that come from there and
+/// whatever else it is given.
+template <class Work, class Meanwhile = void (*)()>
+void on_another_thread(COINIT apartment, Work work, Meanwhile meanwhile = &handle_messages) {
+  std::atomic<bool> is_done = false;
+  std::thread thread([&] {
+    CoInitializeEx(nullptr, apartment);
+    try {
+      work();
+    } catch (const std::exception& error) {
+      check(false, error.what());
+    }
+    CoUninitialize();
+    is_done = true;
+  });
+  while (!is_done) {
+    MsgWaitForMultipleObjects(0, nullptr, FALSE, 1, QS_ALLINPUT);
+    meanwhile();
+  }
+  thread.join();
 }
 
 /// The description of the thread's error, with its source before it: "TALUtil.ORVUtils: Type mismatch".

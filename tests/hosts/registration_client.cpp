@@ -47,7 +47,7 @@ void is_registered(HKEY root, const std::string& scope, const std::wstring& path
       {L"TALUtil.ORVUtils\\CLSID", nullptr, object.substr(6)},
       {L"TALUtil.cControlPosition\\CLSID", nullptr, position.substr(6)},
       {object + L"\\InprocServer32", nullptr, path},
-      {object + L"\\InprocServer32", L"ThreadingModel", L"Apartment"},
+      {object + L"\\InprocServer32", L"ThreadingModel", L"(none)"},
       {object + L"\\ProgID", nullptr, L"TALUtil.ORVUtils"},
       {object + L"\\TypeLib", nullptr, library.substr(8)},
       {position + L"\\InprocServer32", nullptr, path},
@@ -77,6 +77,20 @@ void nothing_is_registered(const std::string& when) {
   }
 }
 
+/// What an early-bound caller gets on a thread of its own, which is in no apartment of this one.
+std::wstring reversed_in_another_apartment(HANDLE context) {
+  std::wstring answer;
+  on_another_thread(COINIT_MULTITHREADED, [&] {
+    ULONG_PTR cookie = 0;
+    ActivateActCtx(context, &cookie);
+    const Pointer<_ORVUtils> object = create_object();
+    Text result;
+    const HRESULT status = object->ReverseString(Text(L"abc"), result);
+    answer = (status == S_OK ? L"S_OK " : L"failed ") + std::wstring(result.view());
+  });
+  return answer;
+}
+
 /// Uses the library as a program with the assembly in its manifest does.
 void is_used_without_registration(const std::wstring& manifest) {
   ACTCTXW request{};
@@ -94,6 +108,7 @@ void is_used_without_registration(const std::wstring& manifest) {
     Text result;
     check_equal(S_OK, object->ReverseString(Text(L"abc"), result), "a call");
     check_equal(L"cba", result.view(), "its result");
+    check_equal(std::wstring(L"S_OK cba"), reversed_in_another_apartment(context), "a call from another apartment");
     Pointer<ITypeInfo> information;
     check_equal(S_OK, object->GetTypeInfo(0, 0, information.receive()), "its type information");
     object->Terminate();
