@@ -75,7 +75,7 @@ class HiddenWindow {
   virtual ~HiddenWindow() = default;
 
   /// The platform's window handle, for dialogs that want an owner; 0 where there are no windows.
-  [[nodiscard]] virtual std::intptr_t handle() const noexcept = 0;
+  [[nodiscard]] virtual std::intptr_t handle() = 0;
 };
 
 class FormEvents;

@@ -233,7 +233,7 @@ struct FakePlatform : MessageBoxes,
     Window(const Window&) = delete;
     Window& operator=(const Window&) = delete;
     ~Window() override { --owner_.open_windows; }
-    [[nodiscard]] std::intptr_t handle() const noexcept override { return owner_.window_handle; }
+    [[nodiscard]] std::intptr_t handle() override { return owner_.window_handle; }
 
    private:
     FakePlatform& owner_;

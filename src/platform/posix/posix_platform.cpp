@@ -43,7 +43,7 @@ char16_t first_character(std::string_view text, char16_t otherwise) {
 
 class Window final : public HiddenWindow {
  public:
-  [[nodiscard]] std::intptr_t handle() const noexcept override { return 0; }
+  [[nodiscard]] std::intptr_t handle() override { return 0; }
 };
 
 }  // namespace

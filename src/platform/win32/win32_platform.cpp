@@ -27,17 +27,33 @@ float twips_per_pixel(int capability) {
   return twips_per_inch / static_cast<float>(dots_per_inch);
 }
 
+/// The owner of dialogs. It is made when the first dialog wants it: until then a script that never looks for messages
+/// has no window that broadcasts would wait for. Windows end with their thread, after which it is made again.
 class Window final : public HiddenWindow {
  public:
-  explicit Window(HWND handle) noexcept : handle_(handle) {}
+  explicit Window(TextView caption) : caption_(caption) {}
   Window(const Window&) = delete;
   Window& operator=(const Window&) = delete;
-  ~Window() override { DestroyWindow(handle_); }
+  ~Window() override {
+    if (handle_ != nullptr) DestroyWindow(handle_);
+  }
 
-  [[nodiscard]] std::intptr_t handle() const noexcept override { return reinterpret_cast<std::intptr_t>(handle_); }
+  [[nodiscard]] std::intptr_t handle() override {
+    if (handle_ == nullptr || IsWindow(handle_) == FALSE) handle_ = make();
+    return reinterpret_cast<std::intptr_t>(handle_);
+  }
 
  private:
-  HWND handle_;
+  /// Of a class of the system's own, whose window procedure is there as long as the window is.
+  [[nodiscard]] HWND make() const {
+    HWND window =
+        CreateWindowExW(0, L"Static", wide(caption_), WS_POPUP, 0, 0, 0, 0, nullptr, nullptr, nullptr, nullptr);
+    if (window == nullptr) raise(ErrorNumber::internal_error);
+    return window;
+  }
+
+  Text caption_;
+  HWND handle_ = nullptr;
 };
 
 /// The first character of a setting of the user's locale; the given one where it is empty.
@@ -92,15 +108,7 @@ Date Win32Clock::now() {
 }
 
 std::unique_ptr<HiddenWindow> Win32FormWindows::make_hidden(TextView caption) {
-  // A class of the system's own: its window procedure stays where it is when the library is unloaded.
-  const auto make = [caption = Text(caption)](HWND parent) {
-    return CreateWindowExW(0, L"Static", wide(caption), WS_POPUP, 0, 0, 0, 0, parent, nullptr, nullptr, nullptr);
-  };
-  HWND window = make(nullptr);
-  // Where there is no desktop to put windows on, one that only takes messages does for everything but dialogs.
-  if (window == nullptr) window = make(HWND_MESSAGE);
-  if (window == nullptr) raise(ErrorNumber::internal_error);
-  return std::make_unique<Window>(window);
+  return std::make_unique<Window>(caption);
 }
 
 bool Win32MessagePump::handle_waiting() {

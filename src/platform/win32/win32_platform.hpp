@@ -29,7 +29,7 @@ class Win32Clock final : public Clock {
 
 class Win32FormWindows final : public FormWindows {
  public:
-  /// Raises 51 when the platform makes no window at all.
+  /// Its handle raises 51 where the platform makes no window.
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
   std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) override;
   std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) override;
