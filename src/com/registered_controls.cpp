@@ -22,11 +22,23 @@ Text registered_class(HKEY root, const Text& class_name) {
   return status == ERROR_SUCCESS ? Text(win32::view(value.data(), size / sizeof(wchar_t) - 1)) : Text();
 }
 
+/// Whether the process has rights that other programs of its user lack. Those can write to the user's part of the
+/// registry, and must not choose the code that runs here.
+bool is_elevated() noexcept {
+  HANDLE token = nullptr;
+  if (OpenProcessToken(GetCurrentProcess(), TOKEN_QUERY, &token) == FALSE) return false;
+  TOKEN_ELEVATION_TYPE type = TokenElevationTypeDefault;
+  DWORD size = sizeof type;
+  GetTokenInformation(token, TokenElevationType, &type, sizeof type, &size);
+  CloseHandle(token);
+  return type == TokenElevationTypeFull;
+}
+
 }  // namespace
 
 ObjectRef RegisteredControls::create(TextView class_name) {
   const Text name(class_name);
-  Text replacement = registered_class(HKEY_CURRENT_USER, name);
+  Text replacement = is_elevated() ? Text() : registered_class(HKEY_CURRENT_USER, name);
   if (replacement.empty()) replacement = registered_class(HKEY_LOCAL_MACHINE, name);
   if (replacement.empty()) return {};
 
