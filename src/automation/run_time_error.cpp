@@ -1,5 +1,8 @@
 #include "automation/run_time_error.hpp"
 
+#include <new>
+#include <stdexcept>
+
 namespace talutil {
 
 std::string_view standard_description(std::int32_t number) noexcept {
@@ -55,5 +58,19 @@ RunTimeError::RunTimeError(std::int32_t number, Text description, Text source)
       narrow_(to_utf8(description_)) {}
 
 void raise(ErrorNumber number) { throw RunTimeError(number); }
+
+RunTimeError current_error() {
+  try {
+    throw;
+  } catch (const RunTimeError& error) {
+    return error;
+  } catch (const std::bad_alloc&) {
+    return RunTimeError(ErrorNumber::out_of_memory);
+  } catch (const std::length_error&) {
+    return RunTimeError(ErrorNumber::out_of_memory);
+  } catch (...) {
+    return RunTimeError(ErrorNumber::internal_error);
+  }
+}
 
 }  // namespace talutil

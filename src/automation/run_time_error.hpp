@@ -70,4 +70,8 @@ class RunTimeError : public std::exception {
 
 [[noreturn]] void raise(ErrorNumber number);
 
+/// The exception being handled as a run-time error, for members that tell of every error: a failed allocation is 7,
+/// an exception of no kind we know 51.
+[[nodiscard]] RunTimeError current_error();
+
 }  // namespace talutil

@@ -79,7 +79,7 @@ float ORVUtils::ConvertDurationToNumber(const Variant& vT) {
   try {
     const Text text = StringReplace(vT.to_text(locale()), u"-", u"0");
     return decimal_hours(*this, format_date(formatted_date(text, locale()), time_pattern));
-  } catch (const RunTimeError&) {
+  } catch (...) {
     // What is no time has no hours: 0, without the default.
     return 0;
   }
@@ -114,9 +114,9 @@ Text ORVUtils::ConvertDatabaseDurationToNumber(Variant& vDuration) {
 Variant ORVUtils::ConvertNumberToDatabaseDuration(const std::int16_t& iMinutes) {
   try {
     return DurationToDateTime(hours_and_minutes_text(iMinutes / 60, iMinutes % 60));
-  } catch (const RunTimeError& error) {
-    library().platform().message_boxes.show(u"ORVUtils ConvertNumberToDatabaseDuration " + error.description(),
-                                            MessageButtons::ok, {});
+  } catch (...) {
+    library().platform().message_boxes.show(
+        u"ORVUtils ConvertNumberToDatabaseDuration " + current_error().description(), MessageButtons::ok, {});
     return epoch_text;
   }
 }

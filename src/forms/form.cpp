@@ -42,7 +42,8 @@ void Form::told(Work work) noexcept {
   try {
     try {
       work();
-    } catch (const RunTimeError& error) {
+    } catch (...) {
+      const RunTimeError error = current_error();
       // The user who has cancelled a dialog knows.
       if (error.number() == CommonDialog::cancelled) return;
       library_.platform().message_boxes.show(error.description(), MessageButtons::ok, {});

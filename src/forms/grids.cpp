@@ -1,5 +1,3 @@
-#include <algorithm>
-
 #include "automation/run_time_error.hpp"
 #include "forms/grid_export.hpp"
 #include "infoforms/frm_components.hpp"
@@ -22,7 +20,8 @@ template <class Work>
 void telling_errors(const Platform& platform, TextView member, Work work) {
   try {
     work();
-  } catch (const RunTimeError& error) {
+  } catch (...) {
+    const RunTimeError error = current_error();
     platform.screen.reset_pointer();
     platform.message_boxes.show(u"ORVUtils " + Text(member) + u' ' + error.description(), MessageButtons::ok, {});
   }
@@ -102,8 +101,8 @@ void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontS
     else
       grid_export.copy_selected_rows();
     grid_export.save(file, iDontSaveHeader == 0);
-  } catch (const RunTimeError&) {
-    // A cancelled dialog is one, and no export says why it did not come about.
+  } catch (...) {
+    // A cancelled dialog is an error too, and no export says why it did not come about.
   }
 }
 

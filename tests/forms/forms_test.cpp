@@ -153,7 +153,12 @@ TEST_F(Forms, TicksAreSetAndCounted) {
   EXPECT_EQ(message(), u"ORVUtils SelectGridRows It broke.");
   utils.SelectGridRows(3, Null{}, 1);
   EXPECT_EQ(message(), u"ORVUtils SelectGridRows Object required");
-  EXPECT_EQ(platform.pointer_resets, 3);
+  control->before = [](const std::string& use) {
+    if (use == "Cell(5%, 2&, 3&)") throw std::bad_alloc();
+  };
+  EXPECT_EQ(utils.CountGridSelectedRows(3, holder), 1);
+  EXPECT_EQ(message(), u"ORVUtils CountGridSelectedRows Out of memory");
+  EXPECT_EQ(platform.pointer_resets, 4);
   EXPECT_EQ(control.use_count(), 2);
 }
 
