@@ -26,7 +26,7 @@ ControlFactory::ControlFactory(const Platform& platform)
       makers_{
           {u"PolarCryptoLibCtl.Crypto", &make<Crypto>},
           {u"MSComDlg.CommonDialog", &make<CommonDialog>},
-          {u"VSFlex8Ctl.VSFlexGrid", &make<Grid>},
+          {Text(Grid::class_name), &make<Grid>},
           {u"SystemInfoControl.MSysInfo", &make<SystemInformation>},
           {Text(NameCaseConverter::class_name), &make<NameCaseConverter>},
           {u"DUZACTXLibCtl.duzactxctrl", &make<UnzipControl>},

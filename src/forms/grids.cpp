@@ -1,4 +1,6 @@
 #include "automation/run_time_error.hpp"
+#include "controls/control_factory.hpp"
+#include "controls/grid.hpp"
 #include "forms/grid_export.hpp"
 #include "infoforms/frm_components.hpp"
 #include "library/library.hpp"
@@ -93,7 +95,8 @@ void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontS
     if (file.empty()) return;
 
     const Control grid(m_Grid1);
-    const Control scratch(library_.components().control(u"Grid1"));
+    // A table of this call's own: a host that is asked for a cell may export another grid before it answers.
+    const Control scratch(library_.controls().create(Grid::class_name));
     GridExport grid_export(grid, scratch);
     // The sense is as hosts know it: True is every row, from the one that iDontSaveHeader tells.
     if (bSelection.is_exactly_true())

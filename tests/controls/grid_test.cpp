@@ -219,10 +219,20 @@ TEST_F(Grids, ExportsReadTheGridInOrder) {
                                                     "TextMatrix(2&, 1&)"}));
   EXPECT_EQ(file(u"C:\\a.txt"), "7\r\n");
   EXPECT_EQ(source->look_ups.size(), 5) << "one a member";
-  source->uses.clear();
-  platform.chosen_files = {u"C:\\a.txt"};
-  utils.ExportGridData(ObjectRef(source), 1, Boolean(false), u"Sales");
-  EXPECT_THAT(source->uses, ::testing::Contains("RowSel"));
+
+  // While a cell is asked for, the host exports this grid; then it has no memory left for the cell.
+  fill(3, 1);
+  platform.chosen_files = {u"C:\\outer.txt", u"C:\\inner.txt", u"C:\\none.txt"};
+  source->before = [&](const std::string& use) {
+    if (!use.starts_with("TextMatrix")) return;
+    if (platform.chosen_files.size() == 2) utils.ExportGridData(ObjectRef(grid), 0, Boolean(true), u"Sales");
+    if (platform.chosen_files.empty()) throw std::bad_alloc();
+  };
+  utils.ExportGridData(ObjectRef(source), 1, Boolean(true), u"Sales");
+  EXPECT_EQ(file(u"C:\\inner.txt"), "0/0\r\n1/0\r\n2/0\r\n");
+  EXPECT_EQ(file(u"C:\\outer.txt"), "7\r\n");
+  utils.ExportGridData(ObjectRef(source), 1, Boolean(true), u"Sales");
+  EXPECT_FALSE(platform.files.files.contains(u"C:\\none.txt")) << "and fails silently";
 }
 
 TEST_F(Grids, DialogsTellOfACancelOnlyWhenAsked) {
