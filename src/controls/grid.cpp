@@ -73,7 +73,11 @@ void RowText::keep(std::size_t columns) {
 }
 
 void RowText::tidy() {
+  // All memory first: when it ends, the places still fit the old text.
+  std::size_t used = 0;
+  for (const Place& place : cells_) used += place.length;
   Text units;
+  units.reserve(used);
   for (Place& place : cells_) {
     const TextView text = TextView(units_).substr(place.start, place.length);
     place.start = static_cast<std::uint32_t>(units.size());
@@ -155,12 +159,20 @@ void Grid::AddItem(const Text& item, std::int32_t index) {
     row.text.set(column, cells.substr(start, end - start), columns_.size());
     start = end + 1;
   }
-  rows_.insert(index == -1 ? rows_.end() : rows_.begin() + index, std::move(row));
+  const std::int32_t place = index == -1 ? Rows() : index;
+  rows_.insert(rows_.begin() + place, std::move(row));
+  if (place < fixed_rows_) ++fixed_rows_;
+  for (std::int32_t* const end : {&row_, &row_end_}) {
+    if (place <= *end) ++*end;
+  }
 }
 
 void Grid::RemoveItem(std::int32_t index) {
   rows_.erase(rows_.begin() + static_cast<std::ptrdiff_t>(index_in(rows_, index)));
-  fixed_rows_ = std::min(fixed_rows_, Rows());
+  if (index < fixed_rows_) --fixed_rows_;
+  for (std::int32_t* const end : {&row_, &row_end_}) {
+    if (index < *end) --*end;
+  }
   keep_selection_inside();
 }
 
@@ -212,14 +224,25 @@ void Grid::LoadGrid(const Text& file, std::int16_t format_code, Boolean fixed_ce
   const std::size_t columns = first_column + width;
   if (first_row + rows.size() > most_rows || columns > most_columns) raise(ErrorNumber::out_of_memory);
 
-  put_Cols(static_cast<std::int32_t>(columns));
-  put_Rows(static_cast<std::int32_t>(first_row));
-  put_Rows(static_cast<std::int32_t>(first_row + rows.size()));
-  for (std::size_t r = 0; r < rows.size(); ++r) {
-    for (std::size_t c = 0; c < rows[r].size(); ++c) {
-      rows_[first_row + r].text.set(first_column + c, rows[r][c], columns);
-    }
+  // Made aside and exchanged when complete, so that a table without room in memory leaves the old one.
+  std::vector<Column> new_columns = columns_;
+  new_columns.resize(columns);
+  std::vector<TableRow> new_rows(rows_.begin(), rows_.begin() + static_cast<std::ptrdiff_t>(first_row));
+  new_rows.reserve(first_row + rows.size());
+  for (TableRow& row : new_rows) row.text.keep(columns);
+  for (const std::vector<Text>& cells : rows) {
+    RowText& row = new_rows.emplace_back().text;
+    if (first_column > 0 && new_rows.size() <= rows_.size()) row = rows_[new_rows.size() - 1].text;
+    row.keep(first_column);
+    for (std::size_t c = 0; c < cells.size(); ++c) row.set(first_column + c, cells[c], columns);
   }
+  columns_.swap(new_columns);
+  rows_.swap(new_rows);
+  fixed_rows_ = std::min(fixed_rows_, Rows());
+  fixed_columns_ = std::min(fixed_columns_, Cols());
+  // What was selected is gone but for the rows that stay.
+  row_ = std::min(row_, static_cast<std::int32_t>(first_row) - 1);
+  row_end_ = std::min(row_end_, static_cast<std::int32_t>(first_row) - 1);
 }
 
 }  // namespace talutil

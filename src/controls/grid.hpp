@@ -123,10 +123,11 @@ class Grid final : public TableObject<Grid> {
   void Clear();
 
   /// Adds a row, before another one or (-1) at the end, with the cells of a text that has tabs between them. Cells
-  /// beyond the last column are dropped.
+  /// beyond the last column are dropped. Before a fixed row it is fixed too; the selection stays on its rows.
   void AddItem(const Text& item, std::int32_t index);
 
-  /// Takes a row out.
+  /// Takes a row out. The other fixed rows stay fixed, and the selection on its rows; a row of it that is taken out
+  /// gives its place to the one behind it.
   void RemoveItem(std::int32_t index);
 
   /// Writes the table to a file: comma text 3 and tab text 4, cells with a separator, quote or line break in quotes;
@@ -134,8 +135,8 @@ class Grid final : public TableObject<Grid> {
   /// where that lacks a character. Raises 5 for another format, and what the file raises, after which it is as it was.
   void SaveGrid(const Text& file, std::int16_t format, Boolean fixed_cells) const;
 
-  /// Reads such a file into the table, which takes its size; without `fixed_cells` the fixed rows and columns stay and
-  /// the file's cells follow them. Widths, types and hidden columns stay. Raises as SaveGrid, and changes nothing then.
+  /// Reads such a file into the table, which takes its size; as many rows and columns are fixed as before, if it has so
+  /// many. Without `fixed_cells` their cells stay and the file's follow them. Widths, types and hidden columns stay. Raises as SaveGrid, and changes nothing then.
   void LoadGrid(const Text& file, std::int16_t format, Boolean fixed_cells);
 
  private:
