@@ -17,6 +17,14 @@ constexpr std::int32_t computer_name_property = 0x68030010;
 // The data connection's number for a connection that is gone for good: restarting is all a user can do.
 constexpr std::int32_t connection_terminated = 17142;
 
+/// Which of the places a name is; raises 438 for none.
+std::size_t place_of(TextView name) {
+  constexpr const auto& places = FrmComponents::places;
+  const auto* const place = std::ranges::find(places, name, &FrmComponents::Place::name);
+  if (place == places.end()) raise(ErrorNumber::member_not_supported);
+  return static_cast<std::size_t>(place - places.begin());
+}
+
 }  // namespace
 
 FrmComponents::FrmComponents(const Platform& platform, const ControlFactory& factory, SharedSettings& settings)
@@ -24,20 +32,22 @@ FrmComponents::FrmComponents(const Platform& platform, const ControlFactory& fac
 
 void FrmComponents::load() {
   if (is_loaded()) return;
-  // Everything is made before anything is kept, so that a control that cannot be made leaves no half window.
+  // Everything is made and set before anything is kept, so that a control that fails leaves no half window and the
+  // next use tries again.
   auto window = platform_.form_windows.make_hidden(caption);
-  std::array<ObjectRef, places.size()> controls;
+  Controls controls;
   std::ranges::transform(places, controls.begin(),
                          [this](const Place& place) { return factory_.create(place.class_name); });
-  window_ = std::move(window);
-  controls_ = std::move(controls);
-  last_database_error_ = 0;
-
-  const Control dialog(control(u"dlgSave2"));
+  const Control dialog(controls[place_of(u"dlgSave2")]);
   dialog.put(u"DialogTitle", u"Save Data to File");
   dialog.put(u"Filter", u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");
   dialog.put(u"Flags", file_dialog_flag::overwrite_prompt | file_dialog_flag::hide_read_only);
-  settings_.ComputerName = Control(control(u"MSysInfo1")).get<Text>(computer_name_property);
+  const Control information(controls[place_of(u"MSysInfo1")]);
+  settings_.ComputerName = information.get<Text>(computer_name_property);
+
+  window_ = std::move(window);
+  controls_ = std::move(controls);
+  last_database_error_ = 0;
 }
 
 void FrmComponents::unload() {
@@ -49,9 +59,7 @@ void FrmComponents::unload() {
 
 ObjectRef FrmComponents::control(TextView name) {
   load();
-  const auto* const place = std::ranges::find(places, name, &Place::name);
-  if (place == places.end()) raise(ErrorNumber::member_not_supported);
-  return controls_[static_cast<std::size_t>(place - places.begin())];
+  return controls_[place_of(name)];
 }
 
 std::intptr_t FrmComponents::owner_handle() {

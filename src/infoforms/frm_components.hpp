@@ -37,7 +37,8 @@ class FrmComponents {
 
   [[nodiscard]] bool is_loaded() const noexcept { return window_ != nullptr; }
 
-  /// Makes the window and its controls if there are none, and reads ComputerName from MSysInfo1.
+  /// Makes the window and its controls if there are none, and reads ComputerName from MSysInfo1. Raises what a control
+  /// raises, after which there is no window.
   void load();
 
   /// Closes the window with its controls. One that is not loaded is loaded first, as hosts observe.
@@ -57,11 +58,13 @@ class FrmComponents {
   [[nodiscard]] std::int32_t last_database_error() const noexcept { return last_database_error_; }
 
  private:
+  using Controls = std::array<ObjectRef, places.size()>;
+
   const Platform& platform_;
   const ControlFactory& factory_;
   SharedSettings& settings_;
   std::unique_ptr<HiddenWindow> window_;
-  std::array<ObjectRef, places.size()> controls_;
+  Controls controls_;
   std::int32_t last_database_error_ = 0;
 };
 

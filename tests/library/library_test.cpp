@@ -9,6 +9,7 @@
 #include "library/library.hpp"
 #include "tests/fakes/error_of.hpp"
 #include "tests/fakes/fake_platform.hpp"
+#include "tests/fakes/recording_control.hpp"
 
 namespace talutil {
 namespace {
@@ -115,9 +116,13 @@ TEST_F(LibraryTest, AnotherMakersControlTakesItsPlace) {
   EXPECT_EQ(library.settings().ComputerName, u"THEIRS");
 }
 
-TEST_F(LibraryTest, AControlThatCannotBeMadeLeavesNoHalfWindow) {
+TEST_F(LibraryTest, AControlThatFailsLeavesNoHalfWindow) {
   platform.controls[u"DZACTXLibCtl.dzactxctrl"] = nullptr;
-  EXPECT_EQ(error_of([&] { library.start(); }), 429);
+  EXPECT_EQ(error_of([&] { library.start(); }), 429) << "one that cannot be made";
+  EXPECT_EQ(platform.open_windows, 0);
+  platform.controls.clear();
+  platform.controls[u"SystemInfoControl.MSysInfo"] = std::make_shared<testing::RecordingControl>();
+  EXPECT_EQ(error_of([&] { library.start(); }), 9) << "one without a computer's name";
   EXPECT_EQ(platform.open_windows, 0);
   platform.controls.clear();
   library.start();
