@@ -1,4 +1,3 @@
-#include "automation/checked.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 
@@ -29,9 +28,10 @@ std::int32_t select(const Control& combo, const Variant& index) {
   return combo.get<std::int32_t>(u"ListIndex");
 }
 
-/// Two blanks before the bracket, as users know the message.
+/// Two blanks before the bracket, as users know the message. Null joined with a text is that text.
 void report(const Control& combo, MessageBoxes& boxes) {
-  const Text text = combo.get<Text>(u"Text");
+  const Variant value = combo.get(u"Text").value();
+  const Text text = value.is_null() ? Text() : value.to_text();
   boxes.show(u"The Dropdown List text  ['" + text + u"'] is not a valid selection", MessageButtons::ok, {});
 }
 

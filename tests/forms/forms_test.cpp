@@ -94,6 +94,9 @@ TEST_F(Forms, CombosSearchForTypedText) {
   control->values["SearchIndex"] = std::int32_t{-1};
   EXPECT_EQ(utils.SearchComboEx(holder, u"x", 1, 1), -1);
   EXPECT_EQ(message(), u"The Dropdown List text  ['abc'] is not a valid selection") << "the control's text";
+  control->values["Text"] = Null{};
+  EXPECT_EQ(utils.SearchComboEx(holder, u"x", 1, 1), -1);
+  EXPECT_EQ(message(), u"The Dropdown List text  [''] is not a valid selection");
   control->values["ListIndex"] = std::int32_t{40000};
   control->methods = {"Refresh"};
   EXPECT_EQ(error_of([&] { utils.SearchCombo(holder, 0); }), 6);
