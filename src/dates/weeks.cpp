@@ -53,8 +53,9 @@ std::int16_t ORVUtils::GetWeekNumber(const Variant& vDate) {
 Variant ORVUtils::WeekYearToDate(std::int16_t& iWeek, const std::int16_t& iYear, const std::int16_t& iDay) {
   iWeek = std::clamp<std::int16_t>(iWeek, 1, WeekTables::last_week);
   WeekTables& tables = library().week_tables();
-  tables.fill_starts(iYear, is_leap_calendar(library()));
-  tables.fill_ends(iYear, is_leap_calendar(library()));
+  const bool is_leap = is_leap_calendar(library());
+  tables.fill_starts(iYear, is_leap);
+  tables.fill_ends(iYear, is_leap);
   if (iDay == 0) {
     // The start of the week after the one asked for, unlike mode 1.
     const Date new_year = Variant(u"1/1/" + number_to_text(std::int32_t{iYear})).to_date(locale());
