@@ -1,5 +1,3 @@
-#include <cmath>
-
 #include "automation/checked.hpp"
 #include "automation/run_time_error.hpp"
 #include "library/library.hpp"
@@ -46,7 +44,7 @@ std::int32_t ORVUtils::GetMaxPages(const std::int32_t& iRowsPerPage, const std::
   if (iRowsPerPage == 0) raise(ErrorNumber::division_by_zero);
   // Pages are counted in single precision, so that the count is off beyond 2^24; hosts have it so.
   const double rows_per_page = iRowsPerPage;
-  auto pages = static_cast<float>(std::nearbyint(iRowCount / rows_per_page));
+  auto pages = static_cast<float>(round_to<std::int32_t>(iRowCount / rows_per_page));
   if (pages * rows_per_page > iRowCount) pages -= 1;
   if (std::int64_t{iRowCount} % iRowsPerPage > 0) pages += 1;
   return round_to<std::int32_t>(pages);
