@@ -54,9 +54,9 @@ chrono::year_month_day calendar_of(std::int32_t day) noexcept { return day_zero 
 /// Months counted from the year 0 on.
 std::int64_t months_of(std::int64_t year, std::int64_t month) noexcept { return year * 12 + month - 1; }
 
-/// Raises 5 for a month that no date is near.
+/// Raises 5 for a month that no date is near. Days and hours of 16 bits reach back a little less than 94 years.
 chrono::year_month month_of(std::int64_t months) {
-  if (months < 0 || months > months_of(last_year + 1, 12)) raise(ErrorNumber::invalid_procedure_call);
+  if (months < 0 || months > months_of(last_year + 94, 12)) raise(ErrorNumber::invalid_procedure_call);
   const auto month = static_cast<unsigned>(months % 12);
   return chrono::year{static_cast<int>(months / 12)} / chrono::month{month + 1};
 }
