@@ -110,12 +110,9 @@ class Line {
     return text_.substr(parts_[i].begin, parts_[i].end - parts_[i].begin);
   }
 
-  /// The characters around a part; a NUL at the ends.
+  /// The character before a part; a NUL at the start.
   [[nodiscard]] char16_t before(std::size_t i) const {
     return parts_[i].begin > 0 ? text_[parts_[i].begin - 1] : u'\0';
-  }
-  [[nodiscard]] char16_t after(std::size_t i) const {
-    return parts_[i].end < text_.size() ? text_[parts_[i].end] : u'\0';
   }
 
   [[nodiscard]] bool holds(Place place, std::size_t i) const {
@@ -128,8 +125,6 @@ class Line {
         return !is_first;
       case Place::before_last:
         return !is_last;
-      case Place::inside:
-        return !is_first && !is_last && before(i) == after(i) && (before(i) == u' ' || before(i) == u'-');
     }
     return false;
   }

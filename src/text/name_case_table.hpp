@@ -6,16 +6,15 @@
 #include "automation/text.hpp"
 
 /// What name case knows of single words. Every row may be changed and rows may be added, in any order; words are
-/// ASCII and met in any case. Sources: common English, Scottish, Irish, Dutch, German, French, Italian, Spanish and
-/// Portuguese usage, and the postal abbreviations of Australia.
+/// ASCII and met in any case. Sources: common English, Scottish and Irish usage, and the postal abbreviations of
+/// Australia.
 namespace talutil::name_case_table {
 
 /// Where in a line a spelling holds. Numbers at the start of a line ("12 La Trobe St") are not its first word.
 enum class Place : std::uint8_t {
   anywhere,
   after_first,  ///< not in the first word
-  before_last,  ///< not in the last word
-  inside        ///< in neither, and between two blanks or two hyphens
+  before_last   ///< not in the last word
 };
 
 struct Spelling {
@@ -73,56 +72,6 @@ inline constexpr Spelling spellings[] = {
     {u"Macquarie"},
     {u"Macready"},
     {u"Macrossan"},
-
-    // Particles of names, and small words of companies and places.
-    {u"af", Place::inside},
-    {u"al", Place::inside},
-    {u"and", Place::inside},
-    {u"at", Place::inside},
-    {u"av", Place::inside},
-    {u"bin", Place::inside},
-    {u"binte", Place::inside},
-    {u"d", Place::inside},
-    {u"da", Place::inside},
-    {u"das", Place::inside},
-    {u"de", Place::inside},
-    {u"degli", Place::inside},
-    {u"dei", Place::inside},
-    {u"del", Place::inside},
-    {u"della", Place::inside},
-    {u"delle", Place::inside},
-    {u"dem", Place::inside},
-    {u"den", Place::inside},
-    {u"der", Place::inside},
-    {u"des", Place::inside},
-    {u"di", Place::inside},
-    {u"do", Place::inside},
-    {u"dos", Place::inside},
-    {u"du", Place::inside},
-    {u"e", Place::inside},
-    {u"el", Place::inside},
-    {u"for", Place::inside},
-    {u"ibn", Place::inside},
-    {u"in", Place::inside},
-    {u"la", Place::inside},
-    {u"las", Place::inside},
-    {u"le", Place::inside},
-    {u"les", Place::inside},
-    {u"los", Place::inside},
-    {u"of", Place::inside},
-    {u"on", Place::inside},
-    {u"op", Place::inside},
-    {u"the", Place::inside},
-    {u"te", Place::inside},
-    {u"ten", Place::inside},
-    {u"ter", Place::inside},
-    {u"upon", Place::inside},
-    {u"van", Place::inside},
-    {u"vom", Place::inside},
-    {u"von", Place::inside},
-    {u"zu", Place::inside},
-    {u"zum", Place::inside},
-    {u"zur", Place::inside},
 
     // Roman numerals. Never in the first word: Xi and Vi are names too. The other numerals of one letter are capitals
     // as all words are.
