@@ -1,5 +1,6 @@
 #include "dates/date_arguments.hpp"
 
+#include "automation/checked.hpp"
 #include "automation/run_time_error.hpp"
 
 namespace talutil {
@@ -23,8 +24,12 @@ Text short_date_text(std::int32_t day, std::int32_t month, std::int32_t year) {
   return number_to_text(day) + u"/" + number_to_text(month) + u"/" + number_to_text(year);
 }
 
-Text hours_and_minutes_text(std::int32_t hours, std::int32_t minutes) {
-  return number_to_text(hours) + u":" + number_to_text(minutes);
+Text hours_and_minutes_text(std::int32_t minutes) {
+  return number_to_text(minutes / 60) + u":" + number_to_text(minutes % 60);
+}
+
+std::int32_t in_minutes(std::int32_t hours, std::int32_t minutes) {
+  return checked_add(checked_multiply(hours, 60), minutes);
 }
 
 }  // namespace talutil

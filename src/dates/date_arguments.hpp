@@ -19,8 +19,11 @@ namespace talutil {
 /// "day/month/year", each in its shortest form.
 [[nodiscard]] Text short_date_text(std::int32_t day, std::int32_t month, std::int32_t year);
 
-/// "hours:minutes", each in its shortest form.
-[[nodiscard]] Text hours_and_minutes_text(std::int32_t hours, std::int32_t minutes);
+/// Minutes as "hours:minutes", each in its shortest form and with the sign of the whole.
+[[nodiscard]] Text hours_and_minutes_text(std::int32_t minutes);
+
+/// Hours and minutes as minutes. Raises 6 beyond 32 bits.
+[[nodiscard]] std::int32_t in_minutes(std::int32_t hours, std::int32_t minutes);
 
 inline constexpr TextView date_pattern = u"DD/MM/YYYY";
 inline constexpr TextView date_and_time_pattern = u"DD/MM/YYYY HH:MM";

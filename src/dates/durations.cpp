@@ -24,7 +24,7 @@ Text full_text(const Variant& value, const Locale& locale) {
 
 /// The minutes of a stored duration. One of day 0 by its test text is a bare time of day, as durations were stored
 /// once: the argument is rewritten first.
-std::int32_t minutes_of(Variant& argument, Variant value, TextView test_text, const Locale& locale) {
+std::int32_t stored_minutes(Variant& argument, Variant value, TextView test_text, const Locale& locale) {
   constexpr TextView day_zero = u"30/12/1899";
   constexpr std::size_t time_length = 5;
   if (test_text.starts_with(day_zero)) {
@@ -38,7 +38,7 @@ std::int32_t minutes_of(Variant& argument, Variant value, TextView test_text, co
 std::int32_t minutes_by_formatted_text(Variant& argument, const Locale& locale) {
   const Variant value = argument.value();
   const Text test_text = format_date(formatted_date(value, locale), date_and_time_pattern);
-  return minutes_of(argument, value, test_text, locale);
+  return stored_minutes(argument, value, test_text, locale);
 }
 
 /// The number before the first colon; 0 where there is none.
@@ -65,14 +65,13 @@ float decimal_hours(ORVUtils& utils, const Text& time) {
 
 Variant ORVUtils::DateTimeToDuration(Variant& vDate) {
   const Variant value = vDate.value();
-  const std::int32_t minutes = minutes_of(vDate, value, full_text(value, locale()), locale());
-  return hours_and_minutes_text(minutes / 60, minutes % 60);
+  return hours_and_minutes_text(stored_minutes(vDate, value, full_text(value, locale()), locale()));
 }
 
 Variant ORVUtils::DurationToDateTime(const Variant& vDuration) {
   const Text time = format_date(formatted_date(vDuration, locale()), time_pattern);
   const std::int32_t hours = hours_of(*this, time);
-  return date_add(DateInterval::minute, hours * 60 + last_minutes(time), epoch);
+  return date_add(DateInterval::minute, in_minutes(hours, last_minutes(time)), epoch);
 }
 
 float ORVUtils::ConvertDurationToNumber(const Variant& vT) {
@@ -104,8 +103,7 @@ Variant ORVUtils::DurToTime(Text& sDuration) {
 }
 
 Text ORVUtils::ConvertDatabaseDurationToNumber(Variant& vDuration) {
-  const std::int32_t minutes = minutes_by_formatted_text(vDuration, locale());
-  float hours = decimal_hours(*this, hours_and_minutes_text(minutes / 60, minutes % 60));
+  float hours = decimal_hours(*this, hours_and_minutes_text(minutes_by_formatted_text(vDuration, locale())));
   // More than a day has never been a job: it counts as an hour.
   if (hours > 24) hours = 1;
   return number_to_text(hours, locale());
@@ -113,7 +111,7 @@ Text ORVUtils::ConvertDatabaseDurationToNumber(Variant& vDuration) {
 
 Variant ORVUtils::ConvertNumberToDatabaseDuration(const std::int16_t& iMinutes) {
   try {
-    return DurationToDateTime(hours_and_minutes_text(iMinutes / 60, iMinutes % 60));
+    return DurationToDateTime(hours_and_minutes_text(iMinutes));
   } catch (...) {
     library().platform().message_boxes.show(
         u"ORVUtils ConvertNumberToDatabaseDuration " + current_error().description(), MessageButtons::ok, {});
@@ -127,7 +125,7 @@ std::int32_t ORVUtils::ConvertDatabaseDurationToMinutes(Variant& vDuration) {
 
 std::int32_t ORVUtils::ConvertTimeToMinutes(const Variant& vTime) {
   const DateParts time = parts_of(formatted_date(vTime, locale()));
-  return time.hour * 60 + time.minute;
+  return in_minutes(time.hour, time.minute);
 }
 
 }  // namespace talutil

@@ -1,7 +1,6 @@
 #include <algorithm>
 #include <cstdlib>
 
-#include "automation/checked.hpp"
 #include "dates/date_arguments.hpp"
 #include "library/orv_utils.hpp"
 
@@ -25,9 +24,6 @@ std::int32_t distance(DateInterval interval, const Variant& start, const Variant
   return std::abs(date_difference(interval, first, last));
 }
 
-/// The minutes of a time "HH:MM".
-std::int32_t minutes_of(const DateParts& time) noexcept { return time.hour * 60 + time.minute; }
-
 }  // namespace
 
 std::int32_t ORVUtils::GetDaysInPeriod(const Variant& vStartDate, const Variant& vEndDate) {
@@ -45,6 +41,10 @@ Variant ORVUtils::GetTimeDifference(Variant& vStDate, Variant& vEnDate, Variant&
     argument = format_date(date, pattern);
     return date;
   };
+  const auto rewrite_time = [&](Variant& argument) {
+    const DateParts time = parts_of(rewrite(argument, time_pattern));
+    return in_minutes(time.hour, time.minute);
+  };
   const Date start = rewrite(vStDate, date_pattern);
   const Date end = rewrite(vEnDate, date_pattern);
   std::int32_t hours = 0;
@@ -52,10 +52,9 @@ Variant ORVUtils::GetTimeDifference(Variant& vStDate, Variant& vEnDate, Variant&
   if (*vEnDate.get_if<Text>() > *vStDate.get_if<Text>()) {
     hours = date_difference(DateInterval::hour, day_of(start), day_of(end));
   }
-  const std::int32_t start_minutes = minutes_of(parts_of(rewrite(vStTime, time_pattern)));
-  const std::int32_t end_minutes = minutes_of(parts_of(rewrite(vEnTime, time_pattern)));
-  const std::int32_t total = checked_add(end_minutes - start_minutes, checked_multiply(60, hours));
-  return hours_and_minutes_text(total / 60, total % 60);
+  const std::int32_t start_minutes = rewrite_time(vStTime);
+  const std::int32_t end_minutes = rewrite_time(vEnTime);
+  return hours_and_minutes_text(in_minutes(hours, end_minutes - start_minutes));
 }
 
 }  // namespace talutil

@@ -142,7 +142,7 @@ Variant ORVUtils::AddTimeToDate(const Variant& vSrcDate, const Text& sTime) {
   const DateParts day = parts_of(formatted_date(vSrcDate, locale()));
   const DateParts time = parts_of(formatted_date(sTime, locale()));
   const Text text =
-      short_date_text(day.day, day.month, day.year) + u" " + hours_and_minutes_text(time.hour, time.minute);
+      short_date_text(day.day, day.month, day.year) + u" " + hours_and_minutes_text(in_minutes(time.hour, time.minute));
   return reformatted(text, date_and_time_pattern, locale());
 }
 
