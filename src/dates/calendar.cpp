@@ -47,11 +47,14 @@ bool is_text(const Variant& value, TextView text) {
 /// The text for a date that is not missing; empty for 1 January 1980 and before. Mode 3 has the current time for
 /// that day.
 Text shown_date(std::int16_t mode, Date date, Clock& clock) {
-  Text shown = format_date(date, mode == 2 ? date_and_time_pattern : date_pattern);
-  // Compared as shown: what seconds are beyond the day does not count.
-  const auto order = compare_dates(Variant(shown).to_date(), missing_date);
-  if (std::is_gt(order)) return shown;
-  return mode == 3 && std::is_eq(order) ? format_date(clock.now(), date_and_time_pattern) : Text();
+  // Compared as it is shown: what lies beyond the day, or beyond the minute in mode 2, does not count.
+  const bool shows_time = mode == 2;
+  const Date first_shown = date_add(shows_time ? DateInterval::minute : DateInterval::day, 1, missing_date);
+  if (std::is_gteq(compare_dates(date, first_shown))) {
+    return format_date(date, shows_time ? date_and_time_pattern : date_pattern);
+  }
+  const bool is_missing_day = std::is_gteq(compare_dates(date, missing_date));
+  return mode == 3 && is_missing_day ? format_date(clock.now(), date_and_time_pattern) : Text();
 }
 
 }  // namespace
