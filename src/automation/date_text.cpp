@@ -19,7 +19,6 @@ std::int32_t month_number(TextView word) {
   return found == std::end(month_names) ? 0 : static_cast<std::int32_t>(found - month_names) + 1;
 }
 
-constexpr bool is_digit(char16_t unit) noexcept { return unit >= u'0' && unit <= u'9'; }
 constexpr bool is_letter(char16_t unit) noexcept {
   return (unit >= u'A' && unit <= u'Z') || (unit >= u'a' && unit <= u'z');
 }
@@ -50,7 +49,7 @@ class Reader {
   /// A number of at most four digits. Longer ones stay where they are: no part of a date has them.
   std::optional<std::int32_t> take_number() noexcept {
     const Reader before = *this;
-    const TextView digits = take_while(is_digit);
+    const TextView digits = take_while(is_decimal_digit);
     if (digits.empty() || digits.size() > 4) {
       *this = before;
       return {};

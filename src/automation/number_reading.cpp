@@ -27,7 +27,6 @@ struct Decimal {
   }
 };
 
-constexpr bool is_digit(char16_t unit) noexcept { return unit >= u'0' && unit <= u'9'; }
 constexpr bool is_letter(char16_t unit, char16_t upper) noexcept { return unit == upper || unit == upper + 32; }
 constexpr bool starts_exponent(char16_t unit) noexcept { return is_letter(unit, u'E') || is_letter(unit, u'D'); }
 
@@ -108,7 +107,7 @@ class Reader {
 };
 
 constexpr int digit_value(char16_t unit) noexcept {
-  if (is_digit(unit)) return unit - u'0';
+  if (is_decimal_digit(unit)) return unit - u'0';
   for (char16_t letter = u'A'; letter <= u'F'; ++letter) {
     if (is_letter(unit, letter)) return 10 + (letter - u'A');
   }
@@ -134,9 +133,9 @@ bool read_exponent(Reader& reader, Decimal& decimal) {
   reader.take();
   const bool is_negative = reader.take_if(u'-');
   if (!is_negative) reader.take_if(u'+');
-  if (!is_digit(reader.peek())) return false;
+  if (!is_decimal_digit(reader.peek())) return false;
   std::int64_t exponent = 0;
-  while (is_digit(reader.peek())) exponent = append_to_exponent(exponent, reader.take());
+  while (is_decimal_digit(reader.peek())) exponent = append_to_exponent(exponent, reader.take());
   decimal.point += is_negative ? -exponent : exponent;
   return true;
 }
@@ -167,7 +166,7 @@ bool read_digits(Reader& reader, char16_t point, char16_t thousands, Decimal& de
   bool is_fraction = false;
   for (;;) {
     const char16_t unit = reader.peek();
-    if (is_digit(unit)) {
+    if (is_decimal_digit(unit)) {
       decimal.append(unit, is_fraction);
       has_digit = true;
     } else if (unit == point && !is_fraction) {

@@ -19,6 +19,8 @@ using TextView = std::u16string_view;
 /// Blanks, tabs, line breaks and their relatives beyond ASCII: what conversions from text skip at the ends.
 [[nodiscard]] bool is_white_space(char16_t unit) noexcept;
 
+[[nodiscard]] constexpr bool is_decimal_digit(char16_t unit) noexcept { return unit >= u'0' && unit <= u'9'; }
+
 /// Equal but for the case of letters, code unit by code unit.
 [[nodiscard]] bool equals_without_case(TextView a, TextView b) noexcept;
 

@@ -119,8 +119,7 @@ Variant ORVUtils::VerifyNullDate(const std::int16_t& iFlag, Variant& vDate) {
 
 Variant ORVUtils::GetDateFromString(const Text& sText) {
   constexpr std::size_t length = 8;
-  const bool is_digits = std::ranges::all_of(sText, [](char16_t unit) { return unit >= u'0' && unit <= u'9'; });
-  if (sText.size() != length || !is_digits) return u"";
+  if (sText.size() != length || !std::ranges::all_of(sText, is_decimal_digit)) return u"";
   const auto number = [&](std::size_t at, std::size_t count) {
     return static_cast<std::int16_t>(leading_number(TextView(sText).substr(at, count)));
   };

@@ -1,5 +1,6 @@
 #include <algorithm>
 
+#include "automation/checked.hpp"
 #include "automation/run_time_error.hpp"
 #include "dates/date_arguments.hpp"
 #include "library/library.hpp"
@@ -41,11 +42,32 @@ std::int32_t minutes_by_formatted_text(Variant& argument, const Locale& locale) 
   return stored_minutes(argument, value, test_text, locale);
 }
 
-/// The number before the first colon; 0 where there is none.
+bool is_whole_number(TextView text) {
+  if (text.starts_with(u'-')) text.remove_prefix(1);
+  return !text.empty() && std::ranges::all_of(text, is_decimal_digit);
+}
+
+/// "hours:minutes" as the members put it together: "1:30", "26:0", "0:-5". The minutes are read from the last two
+/// characters, so there are no more: "-1:-30" would lose its second sign.
+bool is_hours_and_minutes(TextView text) {
+  const std::size_t colon = text.find(u':');
+  if (colon == TextView::npos || text.size() - colon > 3) return false;
+  return is_whole_number(text.substr(0, colon)) && is_whole_number(text.substr(colon + 1));
+}
+
+/// The time of a duration as "HH:MM". Hours and minutes that are no time of day, from 24:0 on, stay as they are.
+Text time_text(const Variant& duration, const Locale& locale) {
+  const Variant value = duration.value();
+  const auto* const text = value.get_if<Text>();
+  if (text != nullptr && is_hours_and_minutes(*text)) return reformatted(*text, time_pattern, locale);
+  return format_date(formatted_date(value, locale), time_pattern);
+}
+
+/// The number before the first colon; 0 where there is none. Raises 6 beyond 32 bits.
 std::int32_t hours_of(ORVUtils& utils, const Text& time) {
   const std::int32_t colon = utils.MyPos(u":", time, 1);
   if (colon < 1) return 0;
-  return static_cast<std::int32_t>(leading_number(TextView(time).substr(0, static_cast<std::size_t>(colon - 1))));
+  return round_to<std::int32_t>(leading_number(TextView(time).substr(0, static_cast<std::size_t>(colon - 1))));
 }
 
 /// The number that the last two characters are; with the colon among them it is 0.
@@ -69,7 +91,7 @@ Variant ORVUtils::DateTimeToDuration(Variant& vDate) {
 }
 
 Variant ORVUtils::DurationToDateTime(const Variant& vDuration) {
-  const Text time = format_date(formatted_date(vDuration, locale()), time_pattern);
+  const Text time = time_text(vDuration, locale());
   const std::int32_t hours = hours_of(*this, time);
   return date_add(DateInterval::minute, in_minutes(hours, last_minutes(time)), epoch);
 }

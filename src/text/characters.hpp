@@ -10,8 +10,7 @@ constexpr TextView line_break = u"\r\n";
 
 /// True for 0 to 9, and for the characters whose ANSI substitute is one of them.
 [[nodiscard]] inline bool is_digit(char16_t unit) noexcept {
-  const std::uint8_t code = ansi_code(unit);
-  return code >= u'0' && code <= u'9';
+  return is_decimal_digit(ansi_code(unit));
 }
 
 }  // namespace talutil

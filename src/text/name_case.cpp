@@ -37,11 +37,9 @@ constexpr bool is_apostrophe(char16_t unit) noexcept {
   return unit == u'\'' || unit == u'\u00B4' || unit == u'`' || unit == u'\u2018' || unit == u'\u2019';
 }
 
-constexpr bool is_digit_unit(char16_t unit) noexcept { return unit >= u'0' && unit <= u'9'; }
-
 /// Letters of every script, digits and combining marks make words; all else parts them.
 bool is_in_word(char16_t unit) noexcept {
-  if (unit < 0x80) return is_digit_unit(unit) || (fold(unit) >= u'A' && fold(unit) <= u'Z');
+  if (unit < 0x80) return is_decimal_digit(unit) || (fold(unit) >= u'A' && fold(unit) <= u'Z');
   if (is_white_space(unit) || is_apostrophe(unit)) return false;
   if (unit <= 0xBF) return unit == u'\u00AA' || unit == u'\u00B5' || unit == u'\u00BA';
   const bool is_punctuation = (unit >= 0x2000 && unit <= 0x206F) || (unit >= 0x3000 && unit <= 0x3003);
@@ -57,7 +55,7 @@ struct Part {
 Text capitalised(TextView word) {
   Text result = lower_case(word);
   // Numbers before the first letter ("12A") do not count.
-  const auto letter = std::ranges::find_if_not(result, is_digit_unit);
+  const auto letter = std::ranges::find_if_not(result, is_decimal_digit);
   if (letter != result.end()) *letter = upper_case(*letter);
   constexpr char16_t sigma = u'\u03C3';
   constexpr char16_t final_sigma = u'\u03C2';
@@ -68,7 +66,7 @@ Text capitalised(TextView word) {
 /// "1st", "22nd": digits and an ending that stays small.
 bool is_ordinal(TextView word) noexcept {
   constexpr TextView endings[] = {u"st", u"nd", u"rd", u"th"};
-  if (word.size() < 3 || !std::ranges::all_of(word.substr(0, word.size() - 2), is_digit_unit)) return false;
+  if (word.size() < 3 || !std::ranges::all_of(word.substr(0, word.size() - 2), is_decimal_digit)) return false;
   return std::ranges::any_of(endings,
                              [&](TextView ending) { return is_same_word(word.substr(word.size() - 2), ending); });
 }
@@ -92,7 +90,7 @@ class Line {
       while (at < text.size() && is_in_word(text[at])) ++at;
       parts_.push_back({begin, at});
     }
-    const auto first = std::ranges::find_if(parts_, [&](const Part& part) { return !is_digit_unit(text[part.begin]); });
+    const auto first = std::ranges::find_if(parts_, [&](const Part& part) { return !is_decimal_digit(text[part.begin]); });
     first_ = static_cast<std::size_t>(first - parts_.begin());
   }
 
