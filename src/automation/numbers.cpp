@@ -3,6 +3,7 @@
 #include <array>
 #include <charconv>
 #include <cmath>
+#include <string_view>
 
 #include "automation/run_time_error.hpp"
 
@@ -10,12 +11,25 @@ namespace talutil {
 
 namespace {
 
+/// The significant digits of a fraction below 1 that is written without an exponent; 0 for other numbers.
+std::size_t digits_of_fraction(std::string_view number) noexcept {
+  if (number.starts_with('-')) number.remove_prefix(1);
+  return number.starts_with("0.") ? number.size() - number.find_first_of("123456789") : 0;
+}
+
 template <class Number>
 Text to_significant_digits(Number value, int digits, const Locale& locale) {
   if (value == 0) return u"0";  // Without the sign of a negative zero.
   std::array<char, 32> buffer;
-  const auto written =
-      std::to_chars(buffer.data(), buffer.data() + buffer.size(), value, std::chars_format::general, digits);
+  char* const end = buffer.data() + buffer.size();
+  auto written = std::to_chars(buffer.data(), end, value, std::chars_format::general, digits);
+  // Windows writes no more decimal places than it writes digits: 3.5 / 42 is 8.33333333333333E-02.
+  const std::string_view plain(buffer.data(), written.ptr);
+  const std::size_t fraction_digits = digits_of_fraction(plain);
+  if (fraction_digits > 0 && plain.size() - plain.find('.') - 1 > static_cast<std::size_t>(digits)) {
+    const int places = static_cast<int>(fraction_digits) - 1;
+    written = std::to_chars(buffer.data(), end, value, std::chars_format::scientific, places);
+  }
   Text text(buffer.data(), written.ptr);
   for (char16_t& unit : text) unit = unit == u'.' ? locale.decimal_separator : upper_case(unit);
   return text;

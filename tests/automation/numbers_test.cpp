@@ -81,6 +81,8 @@ TEST(Numbers, ToText) {
       {"first double with an exponent", 1e15, u"1E+15", u"1E+15"},
       {"small", 0.0001, u"0.0001", u"0.0001"},
       {"smaller", 0.00001, u"1E-05", u"1E-05"},
+      {"as many decimal places as digits", 0.012345678901234, u"0.012345678901234", u"1.234568E-02"},
+      {"one more", -3.5 / 42, u"-8.33333333333333E-02", u"-8.333334E-02"},
       {"rounded", 2.0 / 3, u"0.666666666666667", u"0.6666667"},
       {"three digits of exponent", 1e20, u"1E+20", u"1E+20"},
   };

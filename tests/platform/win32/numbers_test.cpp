@@ -28,13 +28,15 @@ TEST(PlatformNumbers, NumbersToText) {
     const double number = generator.number();
     const auto single = static_cast<float>(number);
     const CY currency{.int64 = static_cast<std::int64_t>(std::fmod(number, 9e18))};
-    if (!is_tie(number, 15)) {
-      EXPECT_EQ(outcome([&] { return number_to_text(number); }),
-                platform_outcome<BSTR>([&](BSTR* text) { return VarBstrFromR8(number, british_english, 0, text); }));
+    if (const std::string text = outcome([&] { return number_to_text(number); });
+        !is_tie(number, 15) && !is_long_fraction(text)) {
+      EXPECT_EQ(text,
+                platform_outcome<BSTR>([&](BSTR* result) { return VarBstrFromR8(number, british_english, 0, result); }));
     }
-    if (!is_tie(single, 7)) {
-      EXPECT_EQ(outcome([&] { return number_to_text(single); }),
-                platform_outcome<BSTR>([&](BSTR* text) { return VarBstrFromR4(single, british_english, 0, text); }));
+    if (const std::string text = outcome([&] { return number_to_text(single); });
+        !is_tie(single, 7) && !is_long_fraction(text)) {
+      EXPECT_EQ(text,
+                platform_outcome<BSTR>([&](BSTR* result) { return VarBstrFromR4(single, british_english, 0, result); }));
     }
     EXPECT_EQ(outcome([&] { return number_to_text(Currency{currency.int64}); }),
               platform_outcome<BSTR>([&](BSTR* text) { return VarBstrFromCy(currency, british_english, 0, text); }));
