@@ -26,24 +26,25 @@ struct Mix {
   float scale = 0;
   float offset = 0;
   std::int32_t previous = 36;  ///< What the first draw may not be.
+  bool draws = true;           ///< Else its number stays 0.
 };
 
-/// Mix 2 with an iHex of neither 0 nor 1 draws nothing: its number stays 0.
+/// Mix 2 with an iHex of neither 0 nor 1 draws nothing.
 Mix mix_of(std::int16_t mix, std::int16_t hex) {
   if (mix == 0) return {decimal_digits, 9, 0, 11};
   if (mix == 1) return {character_table, 82};
   if (mix == 2 && hex == 0) return {character_table, 92};
   if (mix == 2 && hex == 1) return {character_table, 15, 83};
-  if (mix == 2) return {character_table};
+  if (mix == 2) return {.characters = character_table, .draws = false};
   return {};
 }
 
 /// Draws until the number differs from the one before, so that no two neighbours are the same draw.
 std::int32_t draw(const Mix& mix, std::int32_t previous, RandomSingles& random, MessagePump& messages) {
   messages.handle_waiting();
-  if (mix.scale == 0) {
-    // There is nothing to draw, so a repeated number stays one for good: the member does not return. It sleeps
-    // between the host's messages, and gives up when the host is told to.
+  if (!mix.draws) {
+    // A repeated number stays one for good: the member does not return. It sleeps between the host's messages, and
+    // gives up when the host is told to.
     while (previous == 0) {
       if (!messages.wait_and_handle()) raise(ErrorNumber::user_interrupt);
     }
