@@ -39,6 +39,14 @@ class PlainRepeatedUse final : public RepeatedUse {
 
 }  // namespace
 
+std::optional<std::int32_t> Object::find_member(TextView name) {
+  try {
+    return member_id(name);
+  } catch (const RunTimeError&) {
+    return {};
+  }
+}
+
 std::unique_ptr<RepeatedUse> Object::repeat(std::int32_t member, Access access, std::span<const Variant> arguments) {
   return std::make_unique<PlainRepeatedUse>(*this, member, access, arguments);
 }
@@ -49,22 +57,24 @@ Control::Control(ObjectRef object) : object_(std::move(object)) {
   if (!object_) raise(ErrorNumber::object_variable_not_set);
 }
 
-std::int32_t Control::identifier_of(TextView member) const {
+const Control::Known* Control::find_known(TextView member) const noexcept {
   // A member uses few names, so that a search costs less than a hash.
-  const auto known = std::ranges::find_if(known_, [&](const Known& entry) { return entry.name == member; });
-  if (known != known_.end()) return known->identifier;
+  const auto known = std::ranges::find(known_, member, &Known::name);
+  return known == known_.end() ? nullptr : &*known;
+}
+
+std::int32_t Control::identifier_of(TextView member) const {
+  if (const Known* const known = find_known(member)) return known->identifier;
   const std::int32_t identifier = object_->member_id(member);
   known_.push_back({Text(member), identifier});
   return identifier;
 }
 
 bool Control::answers(TextView member) const {
-  try {
-    static_cast<void>(identifier_of(member));
-    return true;
-  } catch (const RunTimeError&) {
-    return false;
-  }
+  if (find_known(member) != nullptr) return true;
+  const auto identifier = object_->find_member(member);
+  if (identifier) known_.push_back({Text(member), *identifier});
+  return identifier.has_value();
 }
 
 void Control::put(TextView member, std::initializer_list<Variant> indexes, Variant value) const {

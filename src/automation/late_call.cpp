@@ -106,10 +106,16 @@ Variant detail::late_pending(void* /*target*/, std::span<Argument> /*arguments*/
   raise(ErrorNumber::action_not_supported);
 }
 
-std::int32_t LateInterface::identifier_of(TextView name) const {
+std::optional<std::int32_t> LateInterface::find_identifier(TextView name) const {
   const std::int32_t slot = find(name);
-  if (slot < 0) raise(ErrorNumber::member_not_supported);
+  if (slot < 0) return {};
   return members[static_cast<std::size_t>(slot)].identifier;
+}
+
+std::int32_t LateInterface::identifier_of(TextView name) const {
+  const auto identifier = find_identifier(name);
+  if (!identifier) raise(ErrorNumber::member_not_supported);
+  return *identifier;
 }
 
 std::int32_t LateInterface::slot_of(std::int32_t identifier, Access access) const noexcept {

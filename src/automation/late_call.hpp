@@ -238,7 +238,8 @@ struct LateInterface {
   std::span<const LateCall> calls;
   std::int32_t (*find)(TextView name);  ///< The first slot of a name; -1 when there is none.
 
-  /// The identifier of a name. Raises 438 for an unknown one.
+  /// The identifier of a name; empty for an unknown one, for which the second raises 438.
+  [[nodiscard]] std::optional<std::int32_t> find_identifier(TextView name) const;
   [[nodiscard]] std::int32_t identifier_of(TextView name) const;
 
   /// The slot for an access of a member; -1 when the member has none. A call also reaches a property's get.

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <initializer_list>
 #include <memory>
+#include <optional>
 #include <span>
 
 #include "automation/text.hpp"
@@ -45,6 +46,9 @@ class Object {
 
   /// The dispatch identifier of a member, names compared without case. Raises 438 when there is none.
   [[nodiscard]] virtual std::int32_t member_id(TextView name) = 0;
+
+  /// The same without an error, empty when there is none. Objects that can tell without raising one override it.
+  [[nodiscard]] virtual std::optional<std::int32_t> find_member(TextView name);
 
   /// Uses a member. For a put the last argument is the value. Raises 438 when the object has no such member.
   virtual Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) = 0;

@@ -197,6 +197,7 @@ class Control {
     std::int32_t identifier;
   };
 
+  [[nodiscard]] const Known* find_known(TextView member) const noexcept;
   [[nodiscard]] std::int32_t identifier_of(TextView member) const;
 
   ObjectRef object_;

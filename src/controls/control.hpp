@@ -16,6 +16,9 @@ template <class Derived>
 class TableObject : public Object {
  public:
   std::int32_t member_id(TextView name) override { return late_interface<Derived>().identifier_of(name); }
+  std::optional<std::int32_t> find_member(TextView name) override {
+    return late_interface<Derived>().find_identifier(name);
+  }
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
     const LateInterface& table = late_interface<Derived>();
