@@ -152,11 +152,15 @@ class DispatchObject final : public Object {
   explicit DispatchObject(Pointer<IDispatch> dispatch) noexcept : dispatch_(std::move(dispatch)) {}
 
   std::int32_t member_id(TextView name) override {
-    Text text(name);
-    auto* names = reinterpret_cast<wchar_t*>(text.data());
     DISPID id = DISPID_UNKNOWN;
-    const HRESULT result = dispatch_->GetIDsOfNames(IID_NULL, &names, 1, LOCALE_USER_DEFAULT, &id);
+    const HRESULT result = look_up(name, id);
     if (FAILED(result)) throw error_of(result, {});
+    return id;
+  }
+
+  std::optional<std::int32_t> find_member(TextView name) override {
+    DISPID id = DISPID_UNKNOWN;
+    if (FAILED(look_up(name, id))) return {};
     return id;
   }
 
@@ -171,6 +175,12 @@ class DispatchObject final : public Object {
   [[nodiscard]] const Pointer<IDispatch>& dispatch() const noexcept { return dispatch_; }
 
  private:
+  HRESULT look_up(TextView name, DISPID& id) {
+    Text text(name);
+    auto* names = reinterpret_cast<wchar_t*>(text.data());
+    return dispatch_->GetIDsOfNames(IID_NULL, &names, 1, LOCALE_USER_DEFAULT, &id);
+  }
+
   Pointer<IDispatch> dispatch_;
 };
 
