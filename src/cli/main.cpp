@@ -280,7 +280,9 @@ int run(std::vector<std::string> words) {
     return app.exit(help_or_version);
   } catch (const CLI::ParseError& error) {
     std::string message = error.what();
-    message.front() = talutil::fold_case(message.front());
+    // A name in capitals, as of an argument that is missing, stays as it is.
+    const bool is_name = message.size() > 1 && talutil::fold_case(message[1]) != message[1];
+    if (!is_name) message.front() = talutil::fold_case(message.front());
     throw usage_failure(message + "; see \"talutil --help\"");
   }
   request.run();

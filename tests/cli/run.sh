@@ -130,6 +130,7 @@ expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetDa
 expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
   'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, sysinfo, idl, reference' lst
+expect_part 'no member' 2 ': MEMBER is required; see' call -- GetYear
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
 # ---- list, help
