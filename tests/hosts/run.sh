@@ -103,6 +103,52 @@ expect_success "windows without a screen, which answered: $answers" test "$answe
 restart_wine
 run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'
 
+# Third-party clients: script hosts, and a compiler with an importer of type libraries of its own. Each does the same
+# work and prints it. TALUTIL_WITHOUT_PASCAL=1 leaves the compiled ones out.
+clients='Z:\checkout\tests\hosts\clients'
+programs=$talutil_build/$folder/tests/hosts/pascal
+
+prints_expected() {
+  local name=$1 output=$talutil_build/$folder-$1.txt tables=$talutil_top/tests/hosts/clients status=0
+  shift
+  "$@" "$name" >"$output" || status=$?
+  awk -v client="$name" -v status="$status" -f "$tables/compare.awk" "$tables/expected.txt" "$output"
+}
+
+compile() { "$pascal/compiler" -n -ve -T"$(cat "$pascal/target")" -Fu"$pascal/units" -FU"$1" -Fu"$1" -FE"$1" "${@:2}"; }
+
+# The type library's unit is made by the importer, so the early-bound client compiles only if that reads it right.
+compile_clients() {
+  local sources=$talutil_top/tests/hosts/clients
+  pascal=$("$talutil_top/tools/pascal.sh" "$folder") || return 1
+  rm -rf "$programs"
+  mkdir -p "$programs/late" "$programs/early"
+  compile "$programs/late" "$sources/import_unit.pas" && compile "$programs/late" "$sources/client.pas" &&
+    wine "Z:\\build\\$folder\\tests\\hosts\\pascal\\late\\import_unit.exe" "$dll" \
+      "Z:\\build\\$folder\\tests\\hosts\\pascal\\early\\" &&
+    compile "$programs/early" -dearly "$sources/client.pas"
+}
+
+script_host() { wine cscript.exe //nologo "$@"; }
+# Nothing that an earlier run has left may look like this one's work.
+rm -rf "$(wine_prefix)/drive_c/clients"
+for key in 'HKCU\Software\TALUtil\Settings' 'HKCU\Software\TALUtil Clients'; do
+  wine reg.exe delete "$key" /f >/dev/null 2>&1 || true
+done
+run vbscript prints_expected vbscript script_host "$clients\\client.vbs"
+run jscript prints_expected jscript script_host "$clients\\client.js"
+run script_control prints_expected script_control script_host "$clients\\script_control.vbs" "$clients\\client.vbs"
+if [ "${TALUTIL_WITHOUT_PASCAL:-}" = 1 ]; then
+  echo "left out: the Free Pascal clients, since TALUTIL_WITHOUT_PASCAL is 1"
+elif compile_clients >"$talutil_build/$folder-pascal.log" 2>&1; then
+  run pascal_late prints_expected pascal_late wine "Z:\\build\\$folder\\tests\\hosts\\pascal\\late\\client.exe"
+  run pascal_early prints_expected pascal_early wine "Z:\\build\\$folder\\tests\\hosts\\pascal\\early\\client.exe"
+else
+  tail -5 "$talutil_build/$folder-pascal.log"
+  echo "FAILED the Free Pascal clients could not be built; TALUTIL_WITHOUT_PASCAL=1 leaves them out"
+  failed=$((failed + 1))
+fi
+
 # A cipher text made on one side opens on the other.
 talutil=$talutil_build/asan/talutil
 secret="O´Neil, 5 €"

@@ -1,0 +1,38 @@
+# Compares what a client has printed with expected.txt: awk -v client=NAME -v status=ITS_STATUS -f compare.awk
+# expected.txt OUTPUT. Prints a line for each difference, then the counts.
+
+function name_of(line) { return substr(line, 1, index(line, "=") - 1) }
+
+FNR == NR && /^[a-z_]+: / {
+  if (index($0, client ": ") != 1) next
+  $0 = substr($0, length(client) + 3)
+  own[name_of($0)] = 1
+  expected[name_of($0)] = $0
+  next
+}
+FNR == NR {
+  if ($0 != "" && $0 !~ /^#/ && !(name_of($0) in own)) expected[name_of($0)] = $0
+  next
+}
+{
+  sub(/\r$/, "")
+  if (!index($0, "=")) next
+  printed[name_of($0)] = $0
+  if (!(name_of($0) in expected)) fail("nothing", $0)
+}
+
+END {
+  for (name in expected) {
+    wanted = expected[name] == name "=-" ? "nothing" : expected[name]
+    got = name in printed ? printed[name] : "nothing"
+    if (got != wanted) fail(wanted, got)
+    else if (wanted != "nothing") ++passed
+  }
+  if (status != 0) fail("to end with status 0", "status " status)
+  printf "%d passed, %d failed\n", passed, failed
+}
+
+function fail(wanted, got) {
+  printf "FAILED %s: expected %s, got %s\n", client, wanted, got
+  ++failed
+}

@@ -1,0 +1,11 @@
+' A host that embeds scripts: hands its own object to a script control, which runs the script of client.vbs.
+'
+'   cscript //nologo script_control.vbs FILE CLIENT
+Option Explicit
+
+Dim control
+Set control = CreateObject("MSScriptControl.ScriptControl")
+control.Language = "VBScript"
+control.AllowUI = False
+control.AddObject "WScript", WScript, False
+control.AddCode CreateObject("Scripting.FileSystemObject").OpenTextFile(WScript.Arguments(0)).ReadAll
