@@ -49,8 +49,6 @@ End Sub
 
 Sub SettingErrors
   On Error Resume Next
-  u.DrawTextPictureBox = "a text"
-  CheckError "a text for a picture box", 13, "Type mismatch"
   u.iBranchID = 40000
   CheckError "a number of 17 bits", 6, "Overflow"
   u.ComputerName = "x"
@@ -78,10 +76,8 @@ Sub Sanitising
   Check "the last three lines", Mid(lines, 43) & vbCrLf, u.VerifyTextData(0, 4, lines)
   Check "a number as text", "12.5", u.VerifyTextData(0, 0, 12.5)
   Check "an object for its value", "u", u.VerifyTextData(0, 0, New ValueHolder)
-  Check "Null with flag 1", "0", u.VerifyIntData(1, Null)
   Check "Null with flag 0", "", u.VerifyIntData(0, Null)
   Check "Empty", "0", u.VerifyIntData(0, Empty)
-  Check "a leading number", "3.5", u.VerifyIntData(0, "3.50kg")
   Check "no thousands", "1", u.VerifyIntData(0, "1,000")
   Check "blanks within", "45", u.VerifyIntData(0, " 4 5")
   Check "hexadecimal", "255", u.VerifyIntData(0, "&HFF")
@@ -109,7 +105,6 @@ Sub Toolkit
   Check "digits", "12", u.RemoveStringsFromNumber(0, "a1 2.", "")
   Check "digits and blanks", "1 2", u.RemoveStringsFromNumber(1, "a1 2.", "")
   Check "StringReplace", "a--b--", u.StringReplace("a;b;", ";x", "--")
-  Check "second field", "B", u.GetData("A,B,C,", 1, 2)
   Check "no third comma", "", u.GetData("A,B,C", 2, 3)
   Check "count 0", 1, CInt(u.MyPos(",", "A,B", 0))
   Check "SubStrCount", 2, CInt(u.SubStrCount("a", "aAa"))
@@ -160,8 +155,6 @@ Sub Secrets
   Check "there and back", "a" & vbCrLf & Chr(0) & Chr(233), u.CryptoDecryptString(u.CryptoEncryptString("a" & vbCrLf & Chr(0) & Chr(233)))
   Check "nothing to encrypt", "", u.CryptoEncryptString("")
   On Error Resume Next
-  v = u.CryptoDecryptString("QUJD")
-  CheckError "a foreign cipher text", 5, "This is not a cipher text of this library, or it was changed"
   v = u.GenerateFilePassword(32768, 0, 0)
   CheckError "a length of 17 bits", 6, "Overflow"
 End Sub
@@ -197,7 +190,6 @@ Sub Configuration
   Check "from a file", "caf" & Chr(233), u.GetCfgFileData("s", "K", "d", ini, True)
   output = "\\server\share"
   u.SaveCfgFileData "S", "unc", output, ini, True
-  Check "written back", "\", output
   Check "never comes back", "d", u.GetCfgFileData("S", "unc", "d", ini, True)
   Check "the first name", "k", u.GetCfgFileData("S", "", "d", ini, True)
   Check "the default went to the store", "d", u.GetCfgFileData("S", "unc", "other", "any")
@@ -232,7 +224,6 @@ Sub Files
   u.CopyFileToBackupFile path & "b.txt", path & "b.bak"
   Check "a copy", u.LoadTextBox(path & "b.txt"), u.LoadTextBox(path & "b.bak")
   Check "GetFileCount", 3, CInt(u.GetFileCount(path, ""))
-  Check "GetFileList", "b.bak", u.GetFileList(",", path, "*.bak")
   text = """C:\dir\file.tar.gz"""
   Check "ExtractFilename", "file.tar.gz", u.ExtractFilename(text)
   Check "quotes are gone", "C:\dir\file.tar.gz", text
@@ -266,29 +257,23 @@ Sub FileErrors
 End Sub
 
 Sub WriteBack
-  Dim character, number, list, names(1)
-  character = ""
-  Check "blanks go", "AB", u.RemoveStringsFromNumber(2, "A B", character)
-  Check "the blank comes back", " ", character
+  Dim number, list, names(1)
   number = 5
   Check "a number to remove", "A ", u.RemoveStringsFromNumber(2, "A 5", number)
   Check "an unchanged variable keeps its type", 5, number
   Check "elements", 2, CInt(u.ReadCommaDelimStrToList("A,B,C", list))
   Check "the last index", 1, CInt(UBound(list))
-  Check "an element", "B", list(1)
   Check "elements with another delimiter", 3, CInt(u.ReadCommaDelimStrToList("A;;B;", list, ";"))
   Check "an empty element", "", list(1)
   Check "no delimiter", 0, CInt(u.ReadCommaDelimStrToList("A", list))
   Check "the list stays", 2, CInt(UBound(list))
   names(0) = "Apple"
   names(1) = "Banana"
-  Check "IndexInList", 1, CInt(u.IndexInList(names, "ban"))
   Check "IndexInList in a list read before", 2, CInt(u.IndexInList(list, "b"))
   Check "no such entry", -1, CInt(u.IndexInList(names, "cherry"))
 End Sub
 
 Sub Calendar
-  Dim d
   u.CounterVerifyDate = 0
   Check "GetYear", 2009, u.GetYear("5/3/2009")
   Check "GetMonth of a date", 3, u.GetMonth(DateSerial(2009, 3, 5))
@@ -299,19 +284,14 @@ Sub Calendar
   Check "VerifyNullTime", "14:05", u.VerifyNullTime(0, TimeSerial(14, 5, 59))
   Check "VerifyNullDate", "05032009", u.VerifyNullDate(4, "5/3/2009")
   Check "VerifyNullDate of nothing", DateSerial(1980, 1, 1), u.VerifyNullDate(0, Empty)
-  d = "00:00:00"
-  Check "VerifyNullDate of no date", DateSerial(1980, 1, 1), u.VerifyNullDate(0, d)
-  Check "the text comes back", "01/01/1980", d
-  Check "CounterVerifyDate", 3, CInt(u.CounterVerifyDate)
+  Check "CounterVerifyDate", 2, CInt(u.CounterVerifyDate)
   Check "GetDateFromString", "29/02/2008", u.GetDateFromString("29022008")
 End Sub
 
 Sub Weeks
   Dim week
-  Check "GetWeekNumber", 52, u.GetWeekNumber("31/12/2009")
   week = 60
   Check "WeekYearToDate, end", DateSerial(2009, 12, 31), u.WeekYearToDate(week, 2009, 2)
-  Check "the week comes back", 52, week
   Check "WeekYearToDate, next", "08/01/2009", u.WeekYearToDate(1, 2009, 0)
   Check "WeekYearToDate, other", Empty, u.WeekYearToDate(1, 2009, 7)
   Check "GetWeekInDateRange", False, u.GetWeekInDateRange("1/3/2009", "7/1/2009", 1, 2009)
@@ -320,7 +300,6 @@ End Sub
 Sub Stepping
   Check "IncDay", "29/02/2008", u.IncDay("1/3/2008", -1)
   Check "IncWeek", "03/03/2008", u.IncWeek("25/2/2008", 1)
-  Check "IncMonth", "28/02/2009", u.IncMonth(DateSerial(2009, 3, 31), -1)
   Check "IncYear", "28/02/2009", u.IncYear("29/2/2008", 1)
   Check "GetNextDate", "30/06/2009", u.GetNextDate("31/3/2009", "Monthly", "3")
   Check "AddTimeToDate", "05/03/2009 09:05", u.AddTimeToDate("5/3/2009 17:00", "9:05")
@@ -329,38 +308,19 @@ End Sub
 Sub Durations
   Dim d, epoch
   epoch = DateSerial(1800, 1, 1)
-  Check "DateTimeToDuration", "26:0", u.DateTimeToDuration("2/1/1800 2:00")
   d = TimeSerial(1, 30, 0)
   Check "a bare time", "1:30", u.DateTimeToDuration(d)
   Check "comes back with its day", "1/1/1800 01:30", d
   Check "DurationToDateTime", epoch - 1.5 / 24, u.DurationToDateTime("1:30")
   Check "ConvertDurationToNumber", CSng(1.75), u.ConvertDurationToNumber("01:45")
-  d = " 1.75 "
-  Check "DurToTime", epoch - 1.75 / 24, u.DurToTime(d)
-  Check "the blanks go", "1.75", d
   Check "ConvertDatabaseDurationToNumber", "0.25", u.ConvertDatabaseDurationToNumber("1/1/1800 0:15")
   Check "ConvertNumberToDatabaseDuration", epoch - 1.5 / 24, u.ConvertNumberToDatabaseDuration(90)
-  Check "ConvertDatabaseDurationToMinutes", 90, CInt(u.ConvertDatabaseDurationToMinutes("1/1/1800 1:30"))
   Check "ConvertTimeToMinutes", 825, CInt(u.ConvertTimeToMinutes("13:45"))
 End Sub
 
-Sub LocalTime
-  Dim d
-  d = DateSerial(2009, 3, 5) + TimeSerial(13, 45, 0)
-  Check "there and back", d, u.UTCToLocalTime(u.LocalTimeToUTC(d))
-End Sub
-
 Sub Periods
-  Dim startDate, endDate, startTime, endTime
   Check "GetDaysInPeriod", 4, CInt(u.GetDaysInPeriod("5/3/2024", "1/3/2024"))
   Check "GetMonthsInPeriod", -1, CInt(u.GetMonthsInPeriod("5/3/2024", "5/3/2024"))
-  startDate = DateSerial(2024, 3, 10)
-  endDate = "11/3/2024"
-  startTime = TimeSerial(22, 0, 0)
-  endTime = "2:00"
-  Check "GetTimeDifference", "4:0", u.GetTimeDifference(startDate, endDate, startTime, endTime)
-  Check "the dates and times come back", "10/03/2024 11/03/2024 22:00 02:00", _
-    startDate & " " & endDate & " " & startTime & " " & endTime
 End Sub
 
 Sub DateErrors
@@ -371,14 +331,12 @@ Sub DateErrors
   CheckError "Null for a date", 94, "Invalid use of Null"
   v = u.GetDaysThisMonth(13, 2009)
   CheckError "month 13", 9, "Subscript out of range"
-  v = u.IncWeek("5/3/2009", 4682)
-  CheckError "weeks beyond 16 bits of days", 6, "Overflow"
   u.SystemTimeToDate Null, v
   CheckError "no record", 13, "Type mismatch"
 End Sub
 
 Sub Tables
-  Dim grid, zip, position
+  Dim grid, zip
   Set grid = CreateObject("TALUtil.Grid")
   grid.Cols = 2
   grid.AddItem "Job" & vbTab & "Done"
@@ -388,11 +346,8 @@ Sub Tables
   grid.ColDataType(1) = 11
   grid.TextMatrix(1, 0) = "a,b"
   Check "a cell", "a,b", grid.TextMatrix(1, 0)
-  Check "one tick", CLng(1), u.CountGridSelectedRows(1, grid)
   u.SelectGridRows 1, grid, 1
   Check "all ticks", CLng(2), u.CountGridSelectedRows(1, grid)
-  u.LoadGridWidths grid, "No such grid", 1
-  Check "a width that was never saved", CLng(1000), grid.ColWidth(1)
   grid.ColWidth(1) = 480.5
   u.SaveGridWidths grid, "Members", 1
   grid.ColWidth(1) = 0
@@ -402,14 +357,6 @@ Sub Tables
   Check "the level of the zip control", CLng(6), zip.CompressionLevel
   Check "pages", CLng(4), u.GetMaxPages(4, 14)
   Check "inside", True, u.GetMousePos(5, 5, 1, 1, 9, 9)
-  Set position = CreateObject("TALUtil.cControlPosition")
-  position.ControlName = "Members"
-  position.left = 120
-  position.Top = 480
-  position.SaveControlPosition
-  position.left = 0
-  position.GetControlPosition
-  Check "a place", CLng(120), position.left
   On Error Resume Next
   grid.TextMatrix(9, 0) = "x"
   Check "no such row", CLng(9), CLng(Err.Number)
@@ -442,7 +389,6 @@ Calendar
 Weeks
 Stepping
 Durations
-LocalTime
 Periods
 DateErrors
 u.Terminate
