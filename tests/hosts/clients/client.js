@@ -22,6 +22,15 @@ function say_error(name, step) {
   }
 }
 
+// The members that combo boxes and grids are driven by. A property with an index can be read, but not put.
+function HostControl() {
+  this.Text = "typed";
+  this.ListCount = 3;
+  this.Cols = 3;
+  this.ItemData = function (index) { return index === 0 ? 7 : 12; };
+  this.ColWidth = function (column) { return column === 2 ? 1000 : 480 * column; };
+}
+
 function texts_and_lists() {
   var list, character = "";
   say("text", u.VerifyTextData(20, 1, "  Smith & \"Sons\", Pty #1  "));
@@ -78,12 +87,13 @@ function settings_and_files() {
 }
 
 function controls() {
-  var grid = new ActiveXObject("TALUtil.Grid"), position = new ActiveXObject("TALUtil.cControlPosition");
+  var control = new HostControl(), grid = new ActiveXObject("TALUtil.Grid");
+  var position = new ActiveXObject("TALUtil.cControlPosition");
+  say("combo", u.GetComboListIndex(control, 12));
+  say("combo.text", "[" + control.Text + "]");
+  u.SaveGridWidths(control, client, 1);
   grid.Cols = 3;
-  grid.ColWidth(1) = 480;
-  u.SaveGridWidths(grid, client, 1);
   grid.ColWidth(0) = 0;
-  grid.ColWidth(1) = 0;
   u.LoadGridWidths(grid, client, 1);
   say("widths", grid.ColWidth(0) + " " + grid.ColWidth(1) + " " + grid.ColWidth(2));
   position.ControlName = client;

@@ -148,10 +148,16 @@ var
   week: SmallInt = 60;
   date, typed_time: TDateTime;
   {$ifdef early}parts: TALUtil_1_0_TLB.SYSTEMTIME;{$endif}
+  typed_date: WideString = '00:00:00';
+  reference: OleVariant;
 begin
   missing := '00:00:00';
   Say('date', FormatDateTime('yyyy', TDateTime(u.VerifyNullDate(I(0)^, missing))));
   Say('date.back', missing);
+  TVarData(reference).VType := varByRef or varOleStr;
+  TVarData(reference).VPointer := @typed_date;
+  u.VerifyNullDate(I(0)^, reference);
+  Say('date.typed', typed_date);
   Say('month', u.IncMonth(Day(2009, 1, 31)^, I(1)^));
   SayNumber('week', u.GetWeekNumber(Day(2009, 12, 31)^));
   Say('week.start', FormatDateTime('m', TDateTime(u.WeekYearToDate(week, I(2009)^, I(1)^))));
@@ -171,7 +177,7 @@ begin
   Say('record', Format('%d-%d ', [parts.wMonth, parts.wHour]) + FormatDateTime('dd/mm/yyyy hh:nn', date));
   {$else}
   Say('difference.typed', u.GetTimeDifference(date, date, typed_time, typed_time));
-  Say('difference.typed.back', FormatDateTime('hh:nn', typed_time));
+  Say('difference.typed.back', FormatDateTime('dd/mm/yyyy', date) + FormatDateTime(' hh:nn', typed_time));
   {$endif}
 end;
 
