@@ -99,6 +99,11 @@ class Reader {
     if (is_next) take();
     return is_next;
   }
+  bool take_if(TextView wanted) noexcept {
+    const bool is_next = !wanted.empty() && rest_.starts_with(wanted);
+    if (is_next) rest_.remove_prefix(wanted.size());
+    return is_next;
+  }
   [[nodiscard]] bool is_at_end() const noexcept { return rest_.empty(); }
 
  private:
@@ -183,11 +188,15 @@ class Marks {
  public:
   enum class Side : std::uint8_t { before, behind };
 
-  explicit Marks(const Locale& locale) noexcept : units_{u'+', u'-', locale.currency_symbol, u'(', u')'} {}
+  explicit Marks(const Locale& locale) noexcept : currency_(locale.currency()) {}
 
   void read(Reader& reader, Side side) noexcept {
     const std::size_t wrong_bracket = side == Side::before ? closing : opening;
     for (;;) {
+      if (!has_currency_ && reader.take_if(currency_)) {
+        has_currency_ = true;
+        continue;
+      }
       const char16_t unit = reader.peek();
       const auto at = static_cast<std::size_t>(std::ranges::find(units_, unit) - units_.begin());
       const bool is_mark = unit != 0 && at < units_.size() && at != wrong_bracket && !seen_[at];
@@ -202,10 +211,12 @@ class Marks {
 
  private:
   static constexpr std::size_t minus = 1;
-  static constexpr std::size_t opening = 3;
-  static constexpr std::size_t closing = 4;
-  std::array<char16_t, 5> units_;
-  std::array<bool, 5> seen_{};
+  static constexpr std::size_t opening = 2;
+  static constexpr std::size_t closing = 3;
+  static constexpr std::array<char16_t, 4> units_{u'+', u'-', u'(', u')'};
+  std::array<bool, units_.size()> seen_{};
+  TextView currency_;
+  bool has_currency_ = false;
 };
 
 struct Reading {

@@ -11,7 +11,7 @@ namespace talutil {
 namespace {
 
 constexpr double infinity = std::numeric_limits<double>::infinity();
-constexpr Locale comma_locale{.decimal_separator = u',', .thousands_separator = u'.', .currency_symbol = u'\u20AC'};
+constexpr Locale comma_locale{.decimal_separator = u',', .thousands_separator = u'.', .currency_symbol = {u'\u20AC'}};
 
 struct ReadingRow {
   const char* name;

@@ -78,7 +78,7 @@ Locale PosixComputer::locale() {
   }
   // The first character tells the symbol's place.
   if (const auto currency = item(CRNCYSTR); !currency.empty()) {
-    result.currency_symbol = first_character(currency.substr(1), result.currency_symbol);
+    result.set_currency(from_utf8(currency.substr(1)));
   }
   return result;
 }

@@ -56,11 +56,17 @@ class Window final : public HiddenWindow {
   HWND handle_ = nullptr;
 };
 
-/// The first character of a setting of the user's locale; the given one where it is empty.
-char16_t user_character(LCTYPE setting, char16_t otherwise) {
+/// A setting of the user's locale; empty where there is none.
+Text user_setting(LCTYPE setting) {
   std::array<wchar_t, 16> text{};
   const int length = GetLocaleInfoW(LOCALE_USER_DEFAULT, setting, text.data(), static_cast<int>(text.size()));
-  return length > 1 ? static_cast<char16_t>(text[0]) : otherwise;
+  return length > 1 ? Text(view(text.data(), static_cast<std::size_t>(length) - 1)) : Text();
+}
+
+/// The first character of such a setting; the given one where it is empty.
+char16_t user_character(LCTYPE setting, char16_t otherwise) {
+  const Text text = user_setting(setting);
+  return text.empty() ? otherwise : text.front();
 }
 
 }  // namespace
@@ -97,7 +103,7 @@ Locale Win32Computer::locale() {
   Locale result;
   result.decimal_separator = user_character(LOCALE_SDECIMAL, standard.decimal_separator);
   result.thousands_separator = user_character(LOCALE_STHOUSAND, standard.thousands_separator);
-  result.currency_symbol = user_character(LOCALE_SCURRENCY, standard.currency_symbol);
+  result.set_currency(user_setting(LOCALE_SCURRENCY));
   return result;
 }
 

@@ -11,7 +11,7 @@
 namespace talutil {
 
 constexpr LCID british_english = 0x0809;
-constexpr Locale british{.currency_symbol = u'\u00A3'};
+constexpr Locale british{.currency_symbol = {u'\u00A3'}};
 constexpr int generated_count = 10000;
 
 inline Variant to_value(Variant value) { return value; }
