@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <utility>
 
 #include "platform/win32/windows.hpp"
@@ -38,11 +39,23 @@ struct FindHandle {
   }
 };
 
+/// A library of the system's own folder; null when it is missing. By its bare name alone a library of the same name in
+/// the program's or the current folder would be taken.
+[[nodiscard]] inline HMODULE system_library(const wchar_t* name) {
+  // Searched and not named by its path, so that the manifest of a program still chooses the version of the controls.
+  const HMODULE module = LoadLibraryExW(name, nullptr, LOAD_LIBRARY_SEARCH_SYSTEM32);
+  if (module != nullptr || GetLastError() != ERROR_INVALID_PARAMETER) return module;
+  // Windows 7 without the update of 2011 that brought the flag (KB2533623).
+  std::array<wchar_t, MAX_PATH> folder{};
+  const UINT length = GetSystemDirectoryW(folder.data(), static_cast<UINT>(folder.size()));
+  return LoadLibraryW(wide(Text(view(folder.data(), length)) + u'\\' + Text(view(name, lstrlenW(name)))));
+}
+
 /// A function of a system library that few callers need: loaded at its first use, so that others do not wait for it.
 /// Null when the library or the function is missing.
 template <class Function>
 [[nodiscard]] Function late_function(const wchar_t* library, const char* name) {
-  const HMODULE module = LoadLibraryW(library);
+  const HMODULE module = system_library(library);
   if (module == nullptr) return nullptr;
   return reinterpret_cast<Function>(reinterpret_cast<void*>(GetProcAddress(module, name)));
 }

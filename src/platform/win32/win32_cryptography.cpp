@@ -5,6 +5,7 @@
 
 #include "automation/checked.hpp"
 #include "automation/run_time_error.hpp"
+#include "platform/win32/handle.hpp"
 #include "platform/win32/windows.hpp"
 // After windows.h.
 #include <bcrypt.h>
@@ -14,6 +15,11 @@ namespace talutil {
 namespace win32 {
 
 namespace {
+
+/// The import is delayed until the first call, which would then look for the library by its bare name.
+void load_cryptography() {
+  if (GetModuleHandleW(L"bcrypt.dll") == nullptr) static_cast<void>(system_library(L"bcrypt.dll"));
+}
 
 void require(NTSTATUS status) {
   if (status < 0) raise(ErrorNumber::internal_error);
@@ -58,6 +64,7 @@ BCRYPT_AUTHENTICATED_CIPHER_MODE_INFO mode_info(const Cryptography::Nonce& nonce
 }  // namespace
 
 void Win32RandomSource::fill(std::span<std::uint8_t> bytes) {
+  load_cryptography();
   require(BCryptGenRandom(nullptr, pointer(bytes), length(bytes), BCRYPT_USE_SYSTEM_PREFERRED_RNG));
 }
 
@@ -68,6 +75,7 @@ Win32Cryptography::~Win32Cryptography() {
 void* Win32Cryptography::cipher() {
   if (cipher_ != nullptr) return cipher_;
   BCRYPT_ALG_HANDLE handle = nullptr;
+  load_cryptography();
   require(BCryptOpenAlgorithmProvider(&handle, BCRYPT_AES_ALGORITHM, nullptr, 0));
   Algorithm opened(handle);
   std::array<wchar_t, sizeof BCRYPT_CHAIN_MODE_GCM / sizeof(wchar_t)> mode{BCRYPT_CHAIN_MODE_GCM};
@@ -100,6 +108,7 @@ bool Win32Cryptography::open(const Key& key, const Nonce& nonce, ByteView associ
 
 Cryptography::Key Win32Cryptography::derive_key(ByteView pass_phrase, ByteView salt, std::uint32_t rounds) {
   BCRYPT_ALG_HANDLE handle = nullptr;
+  load_cryptography();
   require(BCryptOpenAlgorithmProvider(&handle, BCRYPT_SHA256_ALGORITHM, nullptr, BCRYPT_ALG_HANDLE_HMAC_FLAG));
   const Algorithm hash(handle);
   Key key{};

@@ -22,7 +22,7 @@ constexpr int first_id = 100;
 
 /// What the system's own controls need before the first of them is made.
 void load_controls() {
-  if (GetModuleHandleW(L"riched20.dll") == nullptr) LoadLibraryW(L"riched20.dll");
+  static_cast<void>(system_library(L"riched20.dll"));
   const auto start = late_function<BOOL(WINAPI*)(const INITCOMMONCONTROLSEX*)>(L"comctl32.dll", "InitCommonControlsEx");
   const INITCOMMONCONTROLSEX wanted{sizeof wanted, ICC_LISTVIEW_CLASSES | ICC_TAB_CLASSES | ICC_BAR_CLASSES};
   if (start != nullptr) start(&wanted);
