@@ -4,18 +4,10 @@
 // After windows.h.
 #include <commctrl.h>
 
-// The header that the interface compiler made of the type library declares records whose names windows.h has taken.
-#define SYSTEMTIME TALUtil_SYSTEMTIME
-#define FILETIME TALUtil_FILETIME
-#define GUID TALUtil_GUID
-#undef __CRT_UUID_DECL
-#undef DEFINE_GUID
-#define DEFINE_GUID(name, a, b, c, ...) inline constexpr IID name = {a, b, c, {__VA_ARGS__}}
+// Defines the identifiers that the header declares.
+#include <initguid.h>
+// After initguid.h.
 #include "TALUtil.h"
-#undef SYSTEMTIME
-#undef FILETIME
-#undef GUID
-#undef DEFINE_GUID
 
 namespace {
 

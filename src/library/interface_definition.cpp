@@ -25,7 +25,12 @@ std::string hexadecimal(std::int32_t value) {
   return "0x" + std::string(digits.data(), end.ptr);
 }
 
-std::string_view type_name(ValueType type) {
+/// The platform's own headers have records of these names, so those of the header for C++ clients have a prefix.
+std::string record_name(std::string_view name, Dialect dialect) {
+  return (dialect == Dialect::header ? "TALUtil_" : "") + std::string(name);
+}
+
+std::string type_name(ValueType type, Dialect dialect) {
   switch (type) {
     case ValueType::boolean:
       return "VARIANT_BOOL";
@@ -44,7 +49,7 @@ std::string_view type_name(ValueType type) {
     case ValueType::text_array:
       return "SAFEARRAY(BSTR)";
     case ValueType::system_time:
-      return "SYSTEMTIME";
+      return record_name("SYSTEMTIME", dialect);
     case ValueType::none:
     case ValueType::object:
       break;
@@ -67,7 +72,7 @@ void write_parameter(std::string& out, const Parameter& parameter, Dialect diale
   out += by_value ? "[in" : "[in, out";
   out += default_value(parameter, dialect);
   out += "] ";
-  out += type_name(parameter.type);
+  out += type_name(parameter.type, dialect);
   out += by_value ? " " : "* ";
   out += parameter.name;
 }
@@ -88,7 +93,7 @@ void write_member(std::string& out, const Member& member, Dialect dialect) {
   if (member.result != ValueType::none) {
     out += separator;
     out += "[out, retval] ";
-    out += type_name(member.result);
+    out += type_name(member.result, dialect);
     out += "* result";
   }
   out += ");\n";
@@ -145,12 +150,13 @@ std::string interface_definition(Dialect dialect) {
          ")]\nlibrary ";
   out += identity::library_name;
   out += " {\n  importlib(\"stdole2.tlb\");\n";
-  write_record(out, "SYSTEMTIME", identity::system_time_record,
+  write_record(out, record_name("SYSTEMTIME", dialect), identity::system_time_record,
                {"short wYear", "short wMonth", "short wDayOfWeek", "short wDay", "short wHour", "short wMinute",
                 "short wSecond", "short wMilliseconds"});
-  write_record(out, "FILETIME", identity::file_time_record, {"long dwLowDateTime", "long dwHighDateTime"});
-  write_record(out, dialect == Dialect::type_library ? guid_stand_in : "GUID", identity::guid_record,
-               {"long Data1", "short Data2", "short Data3", "unsigned char Data4[8]"});
+  write_record(out, record_name("FILETIME", dialect), identity::file_time_record,
+               {"long dwLowDateTime", "long dwHighDateTime"});
+  write_record(out, dialect == Dialect::type_library ? guid_stand_in : record_name("GUID", dialect),
+               identity::guid_record, {"long Data1", "short Data2", "short Data3", "unsigned char Data4[8]"});
   write_record(out, "TRect", identity::rectangle_record, {"long left", "long Top", "long Right", "long Bottom"});
   write_class(out,
               {"ORVUtils", "The common toolkit.", identity::orv_utils_class, identity::orv_utils_interface,

@@ -8,7 +8,8 @@ namespace talutil {
 ///
 /// The compiler refuses a default on a text passed by reference, and takes the name GUID for the platform's own
 /// record. What it is given for the type library differs there, and the build mends the library afterwards; what
-/// it is given for the header of C++ clients has the references but no defaults.
+/// it is given for the header of C++ clients has the references but no defaults, and records with a prefix, so that the
+/// header can follow the platform's own.
 enum class Dialect { published, type_library, header };
 
 /// What stands for GUID until the type library is mended: a name with the same hash, so that the library's index

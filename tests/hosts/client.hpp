@@ -12,19 +12,10 @@
 #include "checks.hpp"
 #include "com/pointer.hpp"
 
-// The header that the interface compiler makes declares records whose names windows.h has taken.
-#define SYSTEMTIME TALUtil_SYSTEMTIME
-#define FILETIME TALUtil_FILETIME
-#define GUID TALUtil_GUID
-#undef __CRT_UUID_DECL
-#undef DEFINE_GUID
-#define DEFINE_GUID(name, a, b, c, ...) inline constexpr IID name = {a, b, c, {__VA_ARGS__}}
+// Defines the identifiers that the header declares.
+#include <initguid.h>
+// After initguid.h.
 #include "TALUtil.h"
-#undef SYSTEMTIME
-#undef FILETIME
-#undef GUID
-#undef DEFINE_GUID
-#include <guiddef.h>
 
 namespace talutil::hosts {
 
