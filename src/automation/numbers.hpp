@@ -23,8 +23,8 @@ struct Currency {
 [[nodiscard]] double leading_number(TextView text);
 
 /// Standard number-to-text form: at most 15 significant digits (7 for a single), no thousands separators,
-/// no trailing zeros, exponent form below 1E-04, from 1E+15 (1E+07) on, and where a fraction would need more than 15 (7)
-/// decimal places.
+/// no trailing zeros, exponent form below 1E-04, from 1E+15 (1E+07) on, and where a fraction would need more than 15
+/// (7) decimal places.
 [[nodiscard]] Text number_to_text(double value, const Locale& locale = {});
 [[nodiscard]] Text number_to_text(float value, const Locale& locale = {});
 [[nodiscard]] Text number_to_text(std::int32_t value);

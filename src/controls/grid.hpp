@@ -136,7 +136,8 @@ class Grid final : public TableObject<Grid> {
   void SaveGrid(const Text& file, std::int16_t format, Boolean fixed_cells) const;
 
   /// Reads such a file into the table, which takes its size; as many rows and columns are fixed as before, if it has so
-  /// many. Without `fixed_cells` their cells stay and the file's follow them. Widths, types and hidden columns stay. Raises as SaveGrid, and changes nothing then.
+  /// many. Without `fixed_cells` their cells stay and the file's follow them. Widths, types and hidden columns stay.
+  /// Raises as SaveGrid, and changes nothing then.
   void LoadGrid(const Text& file, std::int16_t format, Boolean fixed_cells);
 
  private:

@@ -67,6 +67,9 @@ expect_success "regsvr32, for the machine and for the user" wine regsvr32.exe /s
 client type_library
 client early
 client late
+client harsh
+client apartment
+client agreement
 client control
 rm -f "$pictures"/*.png
 take_pictures &
