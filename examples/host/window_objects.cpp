@@ -167,6 +167,8 @@ Scriptable* picture_object(HWND window, int width, int height) {
   pictures()[window] = picture;
   auto* const box = new Scriptable;
   box->property(L"hDC", [picture] { return variant(static_cast<LONG>(reinterpret_cast<LONG_PTR>(picture->context))); });
+  box->property(L"ScaleMode", [] { return variant(scale_twips); });
+  box->method(L"ScaleX", [](const Scriptable::Arguments& arguments) { return variant(number_of(arguments.at(0))); });
   box->method(L"TextWidth", [picture](const Scriptable::Arguments& arguments) {
     return variant(twips(picture->size_of(text_of(arguments.at(0))).cx));
   });

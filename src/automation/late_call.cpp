@@ -55,6 +55,12 @@ ObjectRef convert(const Variant& value, const Locale& /*locale*/) {
   raise(ErrorNumber::type_mismatch);
 }
 
+ObjectRef object_of_kind(const Variant& value, ObjectKind is_of_kind) {
+  auto object = convert<ObjectRef>(value, {});
+  if (object != nullptr && !is_of_kind(Control(object))) raise(ErrorNumber::type_mismatch);
+  return object;
+}
+
 namespace {
 
 constexpr struct {

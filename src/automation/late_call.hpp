@@ -53,6 +53,9 @@ TextArray convert(const Variant& value, const Locale& locale);
 template <>
 ObjectRef convert(const Variant& value, const Locale& locale);
 
+/// The same for a property that keeps objects of one kind only: raises 13 for an object of another.
+[[nodiscard]] ObjectRef object_of_kind(const Variant& value, ObjectKind is_of_kind);
+
 /// A record, or an object with the fields of one, read in their order. Raises 13 for anything else, 91 for an empty
 /// reference and 438 for an object that lacks a field.
 template <>
@@ -176,11 +179,14 @@ Variant late_get(void* target, std::span<Argument> /*arguments*/, const Locale& 
     return object.*M;
 }
 
-template <class Target, auto M>
+template <class Target, auto M, ObjectKind Kind = any_object>
 Variant late_put(void* target, std::span<Argument> arguments, const Locale& locale) {
   using Traits = MemberTraits<M>;
   auto& object = part_of<typename Traits::Class>(*static_cast<Target*>(target));
-  object.*M = convert<typename Traits::Result>(arguments[0].value, locale);
+  if constexpr (std::is_same_v<typename Traits::Result, ObjectRef>)
+    object.*M = object_of_kind(arguments[0].value, Kind);
+  else
+    object.*M = convert<typename Traits::Result>(arguments[0].value, locale);
   return {};
 }
 
@@ -196,9 +202,9 @@ struct LateCalls {
     return {&detail::late_get<Target, M>};
   }
 
-  template <auto M>
+  template <auto M, ObjectKind Kind = any_object>
   static constexpr std::array<LateCall, 1> put_only(MemberName, const char*) {
-    return {&detail::late_put<Target, M>};
+    return {&detail::late_put<Target, M, Kind>};
   }
 
   template <auto M>

@@ -78,6 +78,10 @@ consteval Passing passing() {
     return std::is_const_v<std::remove_reference_t<P>> ? Passing::by_reference : Passing::written_back;
 }
 
+/// What a property that keeps an object may ask of one that is put.
+using ObjectKind = bool (*)(const Control& object);
+constexpr bool any_object(const Control& /*object*/) { return true; }
+
 /// What a row says of a parameter: its published name and, for one that callers may leave out, its default.
 struct ParameterName {
   constexpr ParameterName(const char* parameter) : name(parameter) {}
@@ -197,7 +201,7 @@ struct Describe {
     return {accessor(name, help, Access::get, value_type<PropertyType<M>>())};
   }
 
-  template <auto M>
+  template <auto M, ObjectKind = any_object>
   static constexpr std::array<Member, 1> put_only(MemberName name, const char* help) {
     Member member = accessor(name, help, Access::put, ValueType::none);
     member.parameter_count = 1;

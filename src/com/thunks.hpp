@@ -249,7 +249,7 @@ struct MethodThunk<C, M, void (Owner::*)(A...)> {
   }
 };
 
-template <class C, auto M>
+template <class C, auto M, ObjectKind Kind = any_object>
 struct PropertyThunk {
   using Field = typename MemberTraits<M>::Result;
   using Type = typename Wire<PropertyType<M>>::Type;
@@ -272,7 +272,7 @@ struct PropertyThunk {
   static HRESULT STDMETHODCALLTYPE put(ComObject<C>* self, Type value) noexcept {
     return guarded([&] {
       if constexpr (std::is_same_v<Field, ObjectRef>)
-        field(self) = convert<ObjectRef>(variant_from(value), {});
+        field(self) = object_of_kind(variant_from(value), Kind);
       else
         field(self) = Wire<Field>::from(value);
     });
@@ -296,8 +296,8 @@ struct Vtable {
     return {};
   }
 
-  template <auto M>
-  static constexpr SlotList<&PropertyThunk<C, M>::put> put_only(MemberName, const char*) {
+  template <auto M, ObjectKind Kind = any_object>
+  static constexpr SlotList<&PropertyThunk<C, M, Kind>::put> put_only(MemberName, const char*) {
     return {};
   }
 

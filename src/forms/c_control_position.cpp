@@ -1,6 +1,7 @@
 #include "forms/c_control_position.hpp"
 
 #include "automation/checked.hpp"
+#include "forms/host_objects.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 
@@ -9,9 +10,6 @@ namespace talutil {
 namespace {
 
 constexpr std::int16_t twips = 1;
-
-/// Forms and picture boxes have a scale of their own; other controls do not answer for one.
-bool has_scale(const Control& control) { return control.answers(u"ScaleMode") && control.answers(u"ScaleX"); }
 
 /// A distance between the mouse and where its drag began.
 float distance(float mouse, std::int32_t start) { return static_cast<float>(double{mouse} - start); }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "automation/member_table.hpp"
+#include "forms/host_objects.hpp"
 #include "library/orv_utils.hpp"
 
 namespace talutil {
@@ -30,11 +31,12 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
       P::template property<&S::CounterVerifyTime>("CounterVerifyTime",
                                                   "How often VerifyNullTime was called since the host last set it."),
       P::template property<&S::GSTValue>("GSTValue", "The sales tax rate, kept for the host."),
-      P::template put_only<&S::FolderBrowseForm>("FolderBrowseForm", "A form kept for the host."),
+      P::template put_only<&S::FolderBrowseForm, has_window>("FolderBrowseForm", "A form kept for the host."),
       P::template property_put_first<&S::BookingScreenDate>("BookingScreenDate",
                                                             "The date of the booking screen, kept for the host."),
-      P::template put_only<&S::SplashForm>("SplashForm", "A form kept for the host."),
-      P::template put_only<&S::DrawTextPictureBox>("DrawTextPictureBox", "The picture box that MyDrawText draws on."),
+      P::template put_only<&S::SplashForm, has_window>("SplashForm", "A form kept for the host."),
+      P::template put_only<&S::DrawTextPictureBox, has_scale>("DrawTextPictureBox",
+                                                              "The picture box that MyDrawText draws on."),
       P::template put_only<&S::VersionMajor>("VersionMajor", "The host's major version."),
       P::template put_only<&S::VersionMinor>("VersionMinor", "The host's minor version."),
       P::template put_only<&S::VersionRevision>("VersionRevision", "The host's revision."),
@@ -286,9 +288,9 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
           "iOption"),
       P::template method<&U::NumbersInString>("NumbersInString", "Whether a text has a digit.", "sSource"),
       P::template method<&U::MyInputBox>("MyInputBox", "Asks for a text in a box that stays on top.", "sCaption",
-                                          "sPrompt", optional("bPassword", 0), optional("bShowUserInput", -1),
-                                          optional("bNoFrame", 0), optional("bNonCloseable", 0),
-                                          optional("lBackColor", 12640511)),
+                                         "sPrompt", optional("bPassword", 0), optional("bShowUserInput", -1),
+                                         optional("bNoFrame", 0), optional("bNonCloseable", 0),
+                                         optional("lBackColor", 12640511)),
       P::template method<&U::ConvertTimeToMinutes>("ConvertTimeToMinutes", "A time of day in minutes.", "vTime"),
       P::template method<&U::MyInstrDelim>("MyInstrDelim",
                                            "Whether a text is one of the fields that a delimiter closes.",

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <array>
 #include <atomic>
 #include <cstring>
@@ -231,16 +232,23 @@ class NamelessObject : public IDispatch {
 /// other member is unknown. Its references are counted for the client to see.
 class HostObject final : public NamelessObject {
  public:
-  enum class Kind { with_value, without_value, failing };
+  enum class Kind { with_value, without_value, failing, form };
   explicit HostObject(Kind kind) noexcept : kind_(kind) {}
 
   ULONG references = 1;
 
   ULONG STDMETHODCALLTYPE AddRef() override { return ++references; }
   ULONG STDMETHODCALLTYPE Release() override { return --references; }
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO* exception,
-                                   UINT*) override {
-    if (id != DISPID_VALUE || kind_ == Kind::without_value) return DISP_E_MEMBERNOTFOUND;
+  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR* name, UINT, LCID, DISPID* id) override {
+    constexpr std::wstring_view known[] = {L"hwnd", L"ScaleMode", L"ScaleX"};
+    const auto* const found = std::ranges::find(known, *name);
+    *id = kind_ == Kind::form && found != std::end(known) ? static_cast<DISPID>(found - known) + 1 : DISPID_UNKNOWN;
+    return *id == DISPID_UNKNOWN ? DISP_E_UNKNOWNNAME : S_OK;
+  }
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS*, VARIANT* result,
+                                   EXCEPINFO* exception, UINT*) override {
+    const bool has_value = kind_ == Kind::with_value || kind_ == Kind::failing;
+    if (id != DISPID_VALUE || (flags & DISPATCH_PROPERTYGET) == 0 || !has_value) return DISP_E_MEMBERNOTFOUND;
     if (kind_ == Kind::failing) {
       exception->scode = failure;
       exception->bstrDescription = SysAllocString(L"not today");

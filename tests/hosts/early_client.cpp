@@ -62,12 +62,14 @@ void properties_keep_what_they_are_given(U* u) {
 void object_properties_hold_references(U* u) {
   using Put = HRESULT (STDMETHODCALLTYPE U::*)(VARIANT);
   for (const Put put : {Put{&U::put_FolderBrowseForm}, Put{&U::put_SplashForm}, Put{&U::put_DrawTextPictureBox}}) {
-    HostObject form(HostObject::Kind::with_value);
+    HostObject form(HostObject::Kind::form);
+    HostObject other(HostObject::Kind::with_value);
     check_equal(S_OK, (u->*put)(Value(&form).get()), "putting an object");
     check_equal(2U, form.references, "references after the put");
     check_equal(run_time_error(13), (u->*put)(Value(L"a text").get()), "putting a text");
     check_equal(L"TALUtil.ORVUtils: Type mismatch", error_text(), "its error");
     check_equal(run_time_error(13), (u->*put)(Value().get()), "putting Empty");
+    check_equal(run_time_error(13), (u->*put)(Value(&other).get()), "putting an object of another kind");
     check_equal(2U, form.references, "references after a refused put");
     VARIANT variable = Value(&form).get();
     check_equal(S_OK, (u->*put)(Value(&variable).get()), "putting a reference to a variable with an object");

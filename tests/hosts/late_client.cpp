@@ -49,12 +49,14 @@ void properties(IDispatch* u) {
   check_equal(DISP_E_MEMBERNOTFOUND, put(u, L"ComputerName", Value(L"x")).error(), "a put on ComputerName");
   check_equal(DISP_E_MEMBERNOTFOUND, use(u, L"SplashForm").error(), "a get of SplashForm");
   check_equal(DISP_E_MEMBERNOTFOUND, put(u, L"GetData", Value(L"x")).error(), "a put on a method");
-  HostObject form(HostObject::Kind::with_value);
+  HostObject form(HostObject::Kind::form);
   check_equal(S_OK, put(u, L"SplashForm", Value(&form), DISPATCH_PROPERTYPUTREF).error(), "a reference");
   check_equal(2U, form.references, "references after the put");
   const auto text_by_reference = put(u, L"sUserName", Value(L"x"), DISPATCH_PROPERTYPUTREF);
   check_equal(DISP_E_MEMBERNOTFOUND, text_by_reference.error(), "a reference for a text");
   check_equal(run_time_error(13), put(u, L"SplashForm", Value(L"x")).error(), "a text for an object");
+  check_equal(run_time_error(13), put(u, L"SplashForm", Value(&with_value)).error(), "an object that is no form");
+  check_equal(2U, form.references, "references after a refused put");
   check_equal(S_OK, put(u, L"SplashForm", Value(static_cast<IDispatch*>(nullptr))).error(), "an empty reference");
   check_equal(1U, form.references, "references after that");
 }

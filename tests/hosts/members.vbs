@@ -43,12 +43,18 @@ Sub Settings
   Check "a single", CSng(12.5), u.GSTValue
   u.BookingScreenDate = DateSerial(2009, 7, 1)
   Check "a date", DateSerial(2009, 7, 1), u.BookingScreenDate
-  Set u.FolderBrowseForm = u
+  Set u.FolderBrowseForm = New Form
   Set u.FolderBrowseForm = Nothing
 End Sub
 
+Class Form
+  Public hwnd
+End Class
+
 Sub SettingErrors
   On Error Resume Next
+  Set u.DrawTextPictureBox = CreateObject("Scripting.Dictionary")
+  CheckError "a dictionary for a picture box", 13, "Type mismatch"
   u.iBranchID = 40000
   CheckError "a number of 17 bits", 6, "Overflow"
   u.ComputerName = "x"

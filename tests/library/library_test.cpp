@@ -1,4 +1,4 @@
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
 #include <algorithm>
 
@@ -85,14 +85,32 @@ TEST_F(LibraryTest, ObjectsShareOneBlockOfSettings) {
   EXPECT_EQ(error_of([&] { late(u"ComputerName", Access::put, {Variant(u"x")}); }), 438);
 }
 
-TEST_F(LibraryTest, ObjectPropertiesKeepTheirReferenceUntilTheNextPut) {
-  const auto form = std::make_shared<ForeignSystemInformation>();
-  late(u"SplashForm", Access::put, {Variant(ObjectRef(form))});
-  EXPECT_EQ(form.use_count(), 2);
-  EXPECT_EQ(error_of([&] { late(u"SplashForm", Access::put, {Variant(u"a text")}); }), 13);
-  EXPECT_EQ(library.settings().SplashForm, form);
-  late(u"SplashForm", Access::put, {Variant(ObjectRef())});
-  EXPECT_EQ(form.use_count(), 1);
+TEST_F(LibraryTest, ObjectPropertiesKeepObjectsOfTheirKindUntilTheNextPut) {
+  using talutil::testing::RecordingControl;
+  const auto object_with = [](std::map<std::string, Variant> values) {
+    const auto object = std::make_shared<RecordingControl>();
+    object->values = std::move(values);
+    return object;
+  };
+  const auto form = object_with({{"hwnd", 1}});
+  const auto box = object_with({{"ScaleMode", 1}, {"ScaleX", 1.0F}});
+  const struct {
+    TextView property;
+    std::shared_ptr<RecordingControl> fits;
+    std::shared_ptr<RecordingControl> does_not;
+  } rows[] = {{u"FolderBrowseForm", form, box}, {u"SplashForm", form, box}, {u"DrawTextPictureBox", box, form}};
+  for (const auto& row : rows) {
+    const auto put = [&](const Variant& value) { late(row.property, Access::put, {value}); };
+    const auto references = row.fits.use_count();
+    put(ObjectRef(row.fits));
+    for (const Variant& other : {Variant(ObjectRef(row.does_not)), Variant(u"a text"), Variant()}) {
+      EXPECT_EQ(error_of([&] { put(other); }), 13);
+    }
+    EXPECT_EQ(row.fits.use_count(), references + 1) << "kept, once";
+    EXPECT_THAT(row.fits->uses, ::testing::IsEmpty()) << "asked for names alone";
+    put(ObjectRef());
+    EXPECT_EQ(row.fits.use_count(), references);
+  }
 }
 
 TEST_F(LibraryTest, EveryPendingMemberAnswers445AndNoOther) {
