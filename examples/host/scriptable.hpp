@@ -9,11 +9,12 @@
 #include <string>
 #include <vector>
 
-/// An automation object made of functions: the library drives a host's windows through such objects, by name.
+/// An automation object made of functions: the library drives a host's windows through such objects, by name. A member
+/// answers only as what it is, as real controls do: a method when it is called, a property when it is read or put.
 ///
 ///     auto* const form = new Scriptable;
 ///     form->property(L"Width", [=] { return variant(width_of(window)); }, [=](const VARIANT& v) { ... });
-///     form->method(L"Refresh", [=](Arguments) { UpdateWindow(window); return VARIANT{}; });
+///     form->method(L"Refresh", {0, 0}, [=](const Scriptable::Arguments&) { UpdateWindow(window); return VARIANT{}; });
 class Scriptable : public IDispatch {
  public:
   /// The arguments of a use, in the order that they are written.
@@ -22,9 +23,20 @@ class Scriptable : public IDispatch {
   using Getter = std::function<VARIANT()>;
   using Setter = std::function<void(const VARIANT&)>;
 
-  void method(const wchar_t* name, Method call) { members_.push_back({name, std::move(call), {}}); }
-  void property(const wchar_t* name, Getter get, Setter put = {}) {
-    members_.push_back({name, [get = std::move(get)](const Arguments&) { return get(); }, std::move(put)});
+  /// How many arguments a method takes.
+  struct Count {
+    std::size_t least;
+    std::size_t most;
+  };
+
+  void method(const wchar_t* name, Count count, Method call) {
+    members_.push_back({name, count, std::move(call), {}, {}, {}});
+  }
+
+  /// Any of the functions may be missing. `put` takes a value (`form.Width = 100`), `set` a reference to an object
+  /// (`Set control.Container = form`). A caller may try the one after the other.
+  void property(const wchar_t* name, Getter get, Setter put = {}, Setter set = {}) {
+    members_.push_back({name, {0, 0}, {}, std::move(get), std::move(put), std::move(set)});
   }
 
   HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override {
@@ -54,22 +66,8 @@ class Scriptable : public IDispatch {
   HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS* parameters, VARIANT* result,
                                    EXCEPINFO* exception, UINT*) override {
     if (id < 1 || static_cast<std::size_t>(id) > members_.size()) return DISP_E_MEMBERNOTFOUND;
-    const Member& member = members_[static_cast<std::size_t>(id) - 1];
     try {
-      if ((flags & DISPATCH_PROPERTYPUT) != 0) {
-        if (!member.put || parameters->cArgs != 1) return DISP_E_MEMBERNOTFOUND;
-        member.put(parameters->rgvarg[0]);
-        return S_OK;
-      }
-      // Automation hands arguments over last first.
-      const Arguments arguments(std::reverse_iterator(parameters->rgvarg + parameters->cArgs),
-                                std::reverse_iterator(parameters->rgvarg));
-      VARIANT answer = member.call(arguments);
-      if (result != nullptr)
-        *result = answer;
-      else
-        VariantClear(&answer);
-      return S_OK;
+      return use(members_[static_cast<std::size_t>(id) - 1], flags, *parameters, result);
     } catch (const std::exception& error) {
       if (exception != nullptr) {
         const std::string text = error.what();
@@ -85,9 +83,43 @@ class Scriptable : public IDispatch {
  private:
   struct Member {
     const wchar_t* name;
+    Count count;
     Method call;
+    Getter get;
     Setter put;
+    Setter set;
   };
+
+  static HRESULT use(const Member& member, WORD flags, const DISPPARAMS& given, VARIANT* result) {
+    // Callers that are bound late cannot tell a function from a property and ask for a value with both flags.
+    if ((flags & DISPATCH_METHOD) != 0 && member.call) {
+      if (given.cArgs < member.count.least || given.cArgs > member.count.most) return DISP_E_BADPARAMCOUNT;
+      // Automation hands arguments over last first.
+      const Arguments arguments(std::reverse_iterator(given.rgvarg + given.cArgs), std::reverse_iterator(given.rgvarg));
+      return answer(member.call(arguments), result);
+    }
+    if ((flags & DISPATCH_PROPERTYGET) != 0 && member.get) {
+      return given.cArgs == 0 ? answer(member.get(), result) : DISP_E_BADPARAMCOUNT;
+    }
+    if ((flags & DISPATCH_PROPERTYPUTREF) != 0 && member.set) return take(member.set, given);
+    if ((flags & DISPATCH_PROPERTYPUT) != 0 && member.put) return take(member.put, given);
+    return DISP_E_MEMBERNOTFOUND;
+  }
+
+  static HRESULT take(const Setter& setter, const DISPPARAMS& given) {
+    if (given.cArgs != 1) return DISP_E_BADPARAMCOUNT;
+    setter(given.rgvarg[0]);
+    return S_OK;
+  }
+
+  /// Hands a value over to the caller, who may not want it.
+  static HRESULT answer(VARIANT value, VARIANT* result) {
+    if (result != nullptr)
+      *result = value;
+    else
+      VariantClear(&value);
+    return S_OK;
+  }
 
   virtual ~Scriptable() = default;
 

@@ -69,6 +69,14 @@ std::map<HWND, std::shared_ptr<Picture>>& pictures() {
   return all;
 }
 
+/// What can be drawn on has a scale: twips, since this host has no other.
+void add_scale(Scriptable& object) {
+  object.property(L"ScaleMode", [] { return variant(scale_twips); });
+  const auto same = [](const Scriptable::Arguments& arguments) { return variant(number_of(arguments.at(0))); };
+  object.method(L"ScaleX", {1, 3}, same);
+  object.method(L"ScaleY", {1, 3}, same);
+}
+
 }  // namespace
 
 float twips_per_pixel() {
@@ -112,13 +120,9 @@ Scriptable* form_object(HWND window) {
       });
   form->property(L"ScaleWidth", [inner] { return variant(twips(inner().right)); });
   form->property(L"ScaleHeight", [inner] { return variant(twips(inner().bottom)); });
-  form->property(L"ScaleMode", [] { return variant(scale_twips); });
-  // From twips to twips: this host has no other scale.
-  const auto same = [](const Scriptable::Arguments& arguments) { return variant(number_of(arguments.at(0))); };
-  form->method(L"ScaleX", same);
-  form->method(L"ScaleY", same);
+  add_scale(*form);
   form->property(L"hwnd", [window] { return variant(static_cast<LONG>(reinterpret_cast<LONG_PTR>(window))); });
-  form->method(L"Refresh", [window](const Scriptable::Arguments&) {
+  form->method(L"Refresh", {0, 0}, [window](const Scriptable::Arguments&) {
     RedrawWindow(window, nullptr, nullptr, RDW_INVALIDATE | RDW_UPDATENOW | RDW_ALLCHILDREN);
     return VARIANT{};
   });
@@ -132,7 +136,7 @@ Scriptable* control_object(HWND window, IDispatch* container) {
   control->property(L"Width", [window] { return variant(twips(place_of(window).right - place_of(window).left)); });
   control->property(L"Height", [window] { return variant(twips(place_of(window).bottom - place_of(window).top)); });
   control->property(L"Container", [container] { return variant(container); });
-  control->method(L"Move", [window](const Scriptable::Arguments& arguments) {
+  control->method(L"Move", {2, 2}, [window](const Scriptable::Arguments& arguments) {
     SetWindowPos(window, nullptr, pixels(number_of(arguments.at(0))), pixels(number_of(arguments.at(1))), 0, 0,
                  SWP_NOSIZE | SWP_NOZORDER);
     return VARIANT{};
@@ -152,7 +156,7 @@ Scriptable* combo_object(HWND window) {
       [window](const VARIANT& text) { SetWindowTextW(window, text_of(text).c_str()); });
   combo->property(L"ListCount",
                   [window] { return variant(static_cast<LONG>(SendMessageW(window, CB_GETCOUNT, 0, 0))); });
-  combo->method(L"ItemData", [window](const Scriptable::Arguments& arguments) {
+  combo->method(L"ItemData", {1, 1}, [window](const Scriptable::Arguments& arguments) {
     return variant(
         static_cast<LONG>(SendMessageW(window, CB_GETITEMDATA, static_cast<WPARAM>(number_of(arguments.at(0))), 0)));
   });
@@ -167,12 +171,11 @@ Scriptable* picture_object(HWND window, int width, int height) {
   pictures()[window] = picture;
   auto* const box = new Scriptable;
   box->property(L"hDC", [picture] { return variant(static_cast<LONG>(reinterpret_cast<LONG_PTR>(picture->context))); });
-  box->property(L"ScaleMode", [] { return variant(scale_twips); });
-  box->method(L"ScaleX", [](const Scriptable::Arguments& arguments) { return variant(number_of(arguments.at(0))); });
-  box->method(L"TextWidth", [picture](const Scriptable::Arguments& arguments) {
+  add_scale(*box);
+  box->method(L"TextWidth", {1, 1}, [picture](const Scriptable::Arguments& arguments) {
     return variant(twips(picture->size_of(text_of(arguments.at(0))).cx));
   });
-  box->method(L"TextHeight", [picture](const Scriptable::Arguments& arguments) {
+  box->method(L"TextHeight", {1, 1}, [picture](const Scriptable::Arguments& arguments) {
     return variant(twips(picture->size_of(text_of(arguments.at(0))).cy));
   });
   box->property(
@@ -190,7 +193,7 @@ Scriptable* picture_object(HWND window, int width, int height) {
         picture->is_bold = number_of(bold) != 0;
         SelectObject(picture->context, picture->fonts[picture->is_bold ? 1 : 0]);
       });
-  box->method(L"Print", [picture, window](const Scriptable::Arguments& arguments) {
+  box->method(L"Print", {1, 1}, [picture, window](const Scriptable::Arguments& arguments) {
     const std::wstring text = text_of(arguments.at(0));
     SetTextColor(picture->context, picture->colour);
     TextOutW(picture->context, pixels(picture->x), pixels(picture->y), text.c_str(), static_cast<int>(text.size()));

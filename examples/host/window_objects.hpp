@@ -13,8 +13,8 @@ Scriptable* control_object(HWND window, IDispatch* container);
 /// A combo box: Text, ListCount, ItemData(i), ListIndex.
 Scriptable* combo_object(HWND window);
 
-/// A picture box over a bitmap: hDC, TextWidth, TextHeight, CurrentX, CurrentY, ForeColor, FontBold, Print. The owner
-/// paints the window from the bitmap with `paint_picture`.
+/// A picture box over a bitmap: hDC, ScaleMode, ScaleX, ScaleY, TextWidth, TextHeight, CurrentX, CurrentY, ForeColor,
+/// FontBold, Print. The owner paints the window from the bitmap with `paint_picture`.
 Scriptable* picture_object(HWND window, int width, int height);
 void paint_picture(HWND window, HDC target);
 

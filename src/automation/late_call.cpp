@@ -126,8 +126,7 @@ std::int32_t LateInterface::identifier_of(TextView name) const {
 
 std::int32_t LateInterface::slot_of(std::int32_t identifier, Access access) const noexcept {
   const auto fits = [&](const Member& member) {
-    return member.identifier == identifier &&
-           (member.access == access || (access == Access::call && member.access == Access::get));
+    return member.identifier == identifier && (member.access == Access::put) == (access == Access::put);
   };
   // Identifiers count the slots, so the first guess is nearly always right.
   const auto guess = static_cast<std::size_t>(identifier - members.front().identifier);

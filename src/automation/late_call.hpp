@@ -248,7 +248,8 @@ struct LateInterface {
   [[nodiscard]] std::optional<std::int32_t> find_identifier(TextView name) const;
   [[nodiscard]] std::int32_t identifier_of(TextView name) const;
 
-  /// The slot for an access of a member; -1 when the member has none. A call also reaches a property's get.
+  /// The slot for an access of a member; -1 when the member has none. A call also reaches a property's get, and a get a
+  /// method, as for callers that are bound late.
   [[nodiscard]] std::int32_t slot_of(std::int32_t identifier, Access access) const noexcept;
 
   /// Calls a slot with the arguments as given: defaults stand in for those left out at the end or marked

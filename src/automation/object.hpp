@@ -12,7 +12,8 @@ namespace talutil {
 
 class Variant;
 
-/// How a member of an object is used.
+/// How a member of an object is used: `call` runs a method as a statement, `get` asks for a value, which may be a
+/// property's or a function's answer (a caller that is bound late cannot know which), `put` gives a property its value.
 enum class Access : std::uint8_t { call, get, put };
 
 /// The dispatch identifier of an object's default member.

@@ -83,7 +83,7 @@ class NativeArguments {
 class DispatchUse final : public RepeatedUse {
  public:
   DispatchUse(Pointer<IDispatch> dispatch, std::int32_t member, Access access, std::span<const Variant> arguments)
-      : dispatch_(std::move(dispatch)), member_(member), flags_(flags_of(access)), arguments_(arguments) {}
+      : dispatch_(std::move(dispatch)), member_(member), access_(access), arguments_(arguments) {}
   DispatchUse(const DispatchUse&) = delete;
   DispatchUse& operator=(const DispatchUse&) = delete;
   ~DispatchUse() override { clear(result_); }
@@ -113,34 +113,45 @@ class DispatchUse final : public RepeatedUse {
   }
 
  private:
-  static WORD flags_of(Access access) noexcept {
-    switch (access) {
-      case Access::put:
-        return DISPATCH_PROPERTYPUT;
-      case Access::get:
-        return DISPATCH_PROPERTYGET;
-      case Access::call:
-        break;
-    }
-    return DISPATCH_METHOD;
-  }
-
   void invoke() {
     clear(result_);
     V_VT(&result_) = VT_EMPTY;
-    DISPID value = DISPID_PROPERTYPUT;
-    const bool is_put = flags_ == DISPATCH_PROPERTYPUT;
-    DISPPARAMS parameters{arguments_.data(), is_put ? &value : nullptr, arguments_.size(), is_put ? 1U : 0U};
     ExceptionInformation exception;
-    const HRESULT status = dispatch_->Invoke(member_, IID_NULL, LOCALE_USER_DEFAULT, flags_, &parameters,
-                                             is_put ? nullptr : &result_, exception.get(), nullptr);
+    const HRESULT status = use(exception);
     if (status == DISP_E_EXCEPTION) throw exception.error();
     if (FAILED(status)) throw error_of(status, {});
   }
 
+  HRESULT use(ExceptionInformation& exception) {
+    switch (access_) {
+      case Access::call:
+        return invoke(DISPATCH_METHOD, exception);
+      case Access::get:
+        // An object that goes by its type information answers for a function only to the first flag and for a property
+        // only to the second. Which of them a member is (ScaleX, TextWidth, ItemData) differs from object to object.
+        return invoke(DISPATCH_METHOD | DISPATCH_PROPERTYGET, exception);
+      case Access::put:
+        break;
+    }
+    // A property that keeps an object is one put by reference; only some take it as any other value too.
+    if (V_VT(arguments_.data()) == VT_DISPATCH) {
+      const HRESULT status = invoke(DISPATCH_PROPERTYPUTREF, exception);
+      if (status != DISP_E_MEMBERNOTFOUND) return status;
+    }
+    return invoke(DISPATCH_PROPERTYPUT, exception);
+  }
+
+  HRESULT invoke(WORD flags, ExceptionInformation& exception) {
+    DISPID value = DISPID_PROPERTYPUT;
+    const bool is_put = access_ == Access::put;
+    DISPPARAMS parameters{arguments_.data(), is_put ? &value : nullptr, arguments_.size(), is_put ? 1U : 0U};
+    return dispatch_->Invoke(member_, IID_NULL, LOCALE_USER_DEFAULT, flags, &parameters, is_put ? nullptr : &result_,
+                             exception.get(), nullptr);
+  }
+
   Pointer<IDispatch> dispatch_;
   std::int32_t member_;
-  WORD flags_;
+  Access access_;
   NativeArguments arguments_;
   VARIANT result_{};
   Text converted_;

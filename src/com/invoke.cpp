@@ -121,8 +121,7 @@ HRESULT check_required(const Member& member, const Invocation& invocation, const
 
 /// The slot for the way a caller uses a member; -1 when the member has none.
 std::int32_t slot_for(const LateInterface& table, DISPID member, WORD flags) noexcept {
-  if ((flags & put_flags) == 0)
-    return table.slot_of(member, (flags & DISPATCH_METHOD) != 0 ? Access::call : Access::get);
+  if ((flags & put_flags) == 0) return table.slot_of(member, Access::get);
   const std::int32_t slot = table.slot_of(member, Access::put);
   // A reference is put only where an object is kept.
   const bool by_reference_only = (flags & put_flags) == DISPATCH_PROPERTYPUTREF;

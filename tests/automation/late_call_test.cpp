@@ -75,6 +75,7 @@ TEST_F(LateCallTest, CoercesArgumentsAndFillsDefaults) {
   EXPECT_EQ(call(u"Size", Access::get), Variant(std::int32_t{12}));
   EXPECT_EQ(call(u"Size", Access::call), Variant(std::int32_t{12}));
   EXPECT_EQ(call(u"Name", Access::get), Variant(u"sample"));
+  EXPECT_EQ(call(u"Join", Access::get, {Variant(u"a"), Variant(u"b")}), Variant(u"a-b")) << "a method's answer";
 }
 
 TEST_F(LateCallTest, WritesBackWhatChangedInTheTypeOfTheParameter) {

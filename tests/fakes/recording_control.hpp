@@ -8,6 +8,7 @@
 
 #include "automation/run_time_error.hpp"
 #include "automation/variant.hpp"
+#include "tests/fakes/host_members.hpp"
 
 namespace talutil::testing {
 
@@ -34,11 +35,12 @@ inline std::string shown(const Variant& value) {
 }
 
 /// A control of a host: it answers with the values it is given and notes how it is used. A member is there when it has
-/// a value, "Name" or "Name(1&)" with indexes; a put makes one.
+/// a value, "Name" or "Name(1&)" with indexes, or is among the methods, which answer with nothing; it is used as what
+/// host_members declares it to be, or not at all.
 class RecordingControl : public Object {
  public:
   std::map<std::string, Variant> values;
-  std::vector<std::string> methods;  ///< Calls that are answered with nothing.
+  std::vector<std::string> methods;
   std::vector<std::string> uses;
   std::vector<std::string> look_ups;
   std::function<void(const std::string& use)> before;  ///< Called before each use, and may throw.
@@ -49,8 +51,8 @@ class RecordingControl : public Object {
     const auto found = std::ranges::find(names_, member);
     if (found != names_.end()) return static_cast<std::int32_t>(found - names_.begin());
     const auto is_named = [&](const auto& entry) { return entry.first.substr(0, entry.first.find('(')) == member; };
-    const bool is_known = std::ranges::any_of(values, is_named) || std::ranges::find(methods, member) != methods.end();
-    if (!is_known) raise(ErrorNumber::member_not_supported);
+    const bool is_there = std::ranges::any_of(values, is_named) || std::ranges::find(methods, member) != methods.end();
+    if (!is_there || uses_of(member) == 0) raise(ErrorNumber::member_not_supported);
     names_.push_back(member);
     return static_cast<std::int32_t>(names_.size() - 1);
   }
@@ -59,6 +61,9 @@ class RecordingControl : public Object {
     const std::size_t indexes = arguments.size() - (access == Access::put ? 1 : 0);
     const auto index = static_cast<std::size_t>(member);
     std::string name = index < names_.size() ? names_[index] : '#' + std::to_string(member);
+    // Members that have a number alone are properties.
+    const unsigned declared = index < names_.size() ? uses_of(name) : property;
+    if ((declared & wanted(access, arguments)) == 0) raise(ErrorNumber::member_not_supported);
     for (std::size_t i = 0; i < indexes; ++i) name += (i == 0 ? "(" : ", ") + shown(arguments[i]);
     if (indexes > 0) name += ')';
     std::string use = name;
@@ -76,6 +81,12 @@ class RecordingControl : public Object {
   }
 
  private:
+  static unsigned wanted(Access access, std::span<const Variant> arguments) {
+    if (access == Access::call) return function;
+    if (access == Access::get) return function | readable;
+    return arguments.back().is(Variant::Kind::object) ? writable | set_by_reference : writable;
+  }
+
   std::vector<std::string> names_;
 };
 

@@ -18,8 +18,9 @@ class TextObject final : public NamelessObject {
     *ids = lstrcmpiW(*name, name_) == 0 ? 1 : DISPID_UNKNOWN;
     return *ids == 1 ? S_OK : DISP_E_UNKNOWNNAME;
   }
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID, REFIID, LCID, WORD flags, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
                                    UINT*) override {
+    if ((flags & DISPATCH_PROPERTYGET) == 0) return DISP_E_MEMBERNOTFOUND;
     V_VT(result) = VT_BSTR;
     V_BSTR(result) = SysAllocString(text_.c_str());
     return S_OK;

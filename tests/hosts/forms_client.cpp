@@ -188,8 +188,9 @@ class FormObject final : public NamelessObject {
     *ids = lstrcmpiW(*name, L"hwnd") == 0 ? 1 : lstrcmpiW(*name, L"Refresh") == 0 ? 2 : DISPID_UNKNOWN;
     return *ids == DISPID_UNKNOWN ? DISP_E_UNKNOWNNAME : S_OK;
   }
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
                                    UINT*) override {
+    if ((flags & (id == 2 ? DISPATCH_METHOD : DISPATCH_PROPERTYGET)) == 0) return DISP_E_MEMBERNOTFOUND;
     uses.push_back(id);
     if (id == 2) return UpdateWindow(window_), S_OK;
     V_VT(result) = VT_I4;

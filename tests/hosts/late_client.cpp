@@ -214,12 +214,13 @@ class RecordObject final : public NamelessObject {
   HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS* given, VARIANT* result, EXCEPINFO*,
                                    UINT*) override {
     short& field = fields.at(static_cast<std::size_t>(id - 1));
-    if ((flags & DISPATCH_PROPERTYPUT) != 0) {
+    if (flags == DISPATCH_PROPERTYPUT) {
       field = V_I2(&given->rgvarg[0]);
       ++puts;
-    } else {
-      *result = Value(field).get();
+      return S_OK;
     }
+    if ((flags & DISPATCH_PROPERTYGET) == 0) return DISP_E_MEMBERNOTFOUND;
+    *result = Value(field).get();
     return S_OK;
   }
 };

@@ -70,6 +70,7 @@ client late
 client harsh
 client apartment
 client agreement
+client objects
 client control
 rm -f "$pictures"/*.png
 take_pictures &

@@ -7,7 +7,8 @@
 
 namespace talutil::hosts {
 
-/// A grid of the client's, as another maker's would be: members by name, counted look-ups and references.
+/// A grid of the client's, as another maker's would be: properties by name, of which TextMatrix can be put; counted
+/// look-ups and references.
 class TableObject final : public NamelessObject {
  public:
   TableObject(LONG rows, LONG columns)
@@ -56,6 +57,8 @@ class TableObject final : public NamelessObject {
       const HRESULT status = before(id, flags, exception);
       if (status != S_OK) return status;
     }
+    const bool is_put = flags == DISPATCH_PROPERTYPUT;
+    if (is_put ? id != TextMatrix : (flags & DISPATCH_PROPERTYGET) == 0) return DISP_E_MEMBERNOTFOUND;
     const auto argument = [&](UINT index) { return V_I4(&parameters->rgvarg[parameters->cArgs - 1 - index]); };
     const auto answer = [&](LONG number) {
       V_VT(result) = VT_I4;
@@ -83,7 +86,7 @@ class TableObject final : public NamelessObject {
         return S_OK;
       case TextMatrix: {
         std::wstring& cell = text(argument(0), argument(1));
-        if (flags == DISPATCH_PROPERTYPUT) {
+        if (is_put) {
           const VARIANT& value = parameters->rgvarg[0];
           cell = V_VT(&value) == VT_BOOL ? (V_BOOL(&value) != 0 ? L"True" : L"False") : L"?";
           return S_OK;

@@ -1,0 +1,205 @@
+// A client whose objects answer a use only as what the member is.
+#include <cmath>
+
+#include "examples/host/window_objects.hpp"
+#include "client.hpp"
+
+using namespace talutil::hosts;
+
+namespace {
+
+/// A picture box as its type information describes it: functions are functions, properties have their accessors.
+class PictureBox {
+ public:
+  virtual VARIANT_BOOL STDMETHODCALLTYPE get_FontBold() { return bold; }
+  virtual void STDMETHODCALLTYPE put_FontBold(VARIANT_BOOL value) { bold = value; }
+  virtual LONG STDMETHODCALLTYPE get_ForeColor() { return colour; }
+  virtual void STDMETHODCALLTYPE put_ForeColor(LONG value) { colour = value; }
+  virtual double STDMETHODCALLTYPE get_CurrentX() { return x; }
+  virtual void STDMETHODCALLTYPE put_CurrentX(double value) { x = value; }
+  virtual double STDMETHODCALLTYPE get_CurrentY() { return y; }
+  virtual void STDMETHODCALLTYPE put_CurrentY(double value) { y = value; }
+  virtual LONG STDMETHODCALLTYPE get_hDC() { return static_cast<LONG>(reinterpret_cast<LONG_PTR>(context)); }
+  virtual short STDMETHODCALLTYPE get_ScaleMode() { return 1; }
+  virtual double STDMETHODCALLTYPE ScaleX(double value) { return value; }
+  virtual double STDMETHODCALLTYPE TextWidth(BSTR text) { return 100.0 * SysStringLen(text); }
+  virtual double STDMETHODCALLTYPE TextHeight(BSTR) { return 200; }
+  virtual void STDMETHODCALLTYPE Print(BSTR text) {
+    printed = std::wstring(view(text)) + (bold != 0 ? L" bold" : L"") + L" in " + std::to_wstring(colour) + L" at " +
+              std::to_wstring(std::lround(x)) + L"," + std::to_wstring(std::lround(y));
+  }
+
+  HDC context = CreateCompatibleDC(nullptr);
+  VARIANT_BOOL bold = VARIANT_FALSE;
+  LONG colour = 5;
+  double x = 0;
+  double y = 0;
+  std::wstring printed;
+
+  PictureBox() = default;
+  PictureBox(const PictureBox&) = delete;
+  PictureBox& operator=(const PictureBox&) = delete;
+  ~PictureBox() { DeleteDC(context); }
+};
+
+/// The box for automation, by way of the platform's own use of type information.
+class TypedPictureBox final : public NamelessObject {
+ public:
+  TypedPictureBox() {
+    const auto name = [](const wchar_t* text) { return const_cast<wchar_t*>(text); };
+    PARAMDATA boolean{name(L"value"), VT_BOOL};
+    PARAMDATA number{name(L"value"), VT_I4};
+    PARAMDATA twips{name(L"value"), VT_R8};
+    PARAMDATA text{name(L"value"), VT_BSTR};
+    UINT slot = 0;
+    std::vector<METHODDATA> members;
+    const auto add = [&](const wchar_t* member, DISPID id, PARAMDATA* parameter, WORD use, VARTYPE result) {
+      const UINT count = parameter == nullptr ? 0 : 1;
+      members.push_back({name(member), parameter, id, slot++, CC_STDCALL, count, use, result});
+    };
+    const auto add_property = [&](const wchar_t* member, DISPID id, PARAMDATA& value) {
+      add(member, id, nullptr, DISPATCH_PROPERTYGET, value.vt);
+      add(member, id, &value, DISPATCH_PROPERTYPUT, VT_EMPTY);
+    };
+    add_property(L"FontBold", 1, boolean);
+    add_property(L"ForeColor", 2, number);
+    add_property(L"CurrentX", 3, twips);
+    add_property(L"CurrentY", 4, twips);
+    add(L"hDC", 5, nullptr, DISPATCH_PROPERTYGET, VT_I4);
+    add(L"ScaleMode", 6, nullptr, DISPATCH_PROPERTYGET, VT_I2);
+    add(L"ScaleX", 7, &twips, DISPATCH_METHOD, VT_R8);
+    add(L"TextWidth", 8, &text, DISPATCH_METHOD, VT_R8);
+    add(L"TextHeight", 9, &text, DISPATCH_METHOD, VT_R8);
+    add(L"Print", 10, &text, DISPATCH_METHOD, VT_EMPTY);
+    INTERFACEDATA all{members.data(), static_cast<UINT>(members.size())};
+    Pointer<ITypeInfo> class_information;
+    require(CreateDispTypeInfo(&all, LOCALE_USER_DEFAULT, class_information.receive()), "CreateDispTypeInfo");
+    // What it makes describes a class; the members are those of its interface.
+    HREFTYPE members_type = 0;
+    require(class_information->GetRefTypeOfImplType(0, &members_type), "GetRefTypeOfImplType");
+    require(class_information->GetRefTypeInfo(members_type, information_.receive()), "GetRefTypeInfo");
+  }
+
+  PictureBox box;
+  ULONG references = 1;
+
+  ULONG STDMETHODCALLTYPE AddRef() override { return ++references; }
+  ULONG STDMETHODCALLTYPE Release() override { return --references; }
+  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR* names, UINT count, LCID, DISPID* ids) override {
+    return DispGetIDsOfNames(information_.get(), names, count, ids);
+  }
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS* parameters, VARIANT* result,
+                                   EXCEPINFO* exception, UINT* argument) override {
+    return DispInvoke(&box, information_.get(), id, flags, parameters, result, exception, argument);
+  }
+
+ private:
+  Pointer<ITypeInfo> information_;
+};
+
+HRESULT draw(_ORVUtils* u, const wchar_t* text) {
+  return u->MyDrawText(Short{10}, Short{20}, Short{50}, Short{40}, Value(text), Long{255}, Short{0},
+                       Number<VARIANT_BOOL>{VARIANT_TRUE}, Number<VARIANT_BOOL>{});
+}
+
+void typed_picture_boxes_are_drawn_on(_ORVUtils* u) {
+  TypedPictureBox picture;
+  check_equal(S_OK, u->put_DrawTextPictureBox(Value(&picture).get()), "a picture box");
+  check_equal(S_OK, draw(u, L"abc"), "a text that has room");
+  check_equal(L"abc bold in 255 at 300,350", picture.box.printed, "what the box printed");
+  check_equal(S_OK, draw(u, L"longer than the rectangle"), "a text that has none");
+  check_equal(L"abc bold in 255 at 300,350", picture.box.printed, "which is not printed");
+  check_equal(5, picture.box.colour, "the colour is put back");
+  u->put_DrawTextPictureBox(Value(static_cast<IDispatch*>(nullptr)).get());
+  check_equal(1U, picture.references, "references afterwards");
+}
+
+HWND window(const wchar_t* window_class, DWORD style, int x, int y, int width, int height, HWND parent) {
+  return CreateWindowW(window_class, L"", style, x, y, width, height, parent, nullptr, nullptr, nullptr);
+}
+
+/// Holds one of the host's own objects, of which nothing must be left at the end.
+class Held {
+ public:
+  Held(Scriptable* object, const char* name) : object_(object), name_(name) {}
+  Held(const Held&) = delete;
+  Held& operator=(const Held&) = delete;
+  ~Held() { check_equal(0U, object_->Release(), std::string("references to ") + name_); }
+  [[nodiscard]] Scriptable* get() const { return object_; }
+
+ private:
+  Scriptable* object_;
+  const char* name_;
+};
+
+void controls_are_dragged_on_a_form() {
+  const HWND outer = window(L"Static", WS_OVERLAPPEDWINDOW, 0, 0, 400, 300, nullptr);
+  const Held form(form_object(outer), "the form");
+  const Held control(control_object(window(L"Static", WS_CHILD, 10, 10, 100, 50, outer), form.get()), "the control");
+  Pointer<_cControlPosition> position;
+  require(CoCreateInstance(CLSID_cControlPosition, nullptr, CLSCTX_INPROC_SERVER, IID__cControlPosition,
+                           position.receive_untyped()),
+          "creating TALUtil.cControlPosition");
+  const float pixel = twips_per_pixel();
+  check_equal(S_OK, position->DragControl(Value(form.get()), Value(control.get()), 20 * pixel, 30 * pixel), "a drag");
+  LONG left = 0;
+  LONG top = 0;
+  position->get_left(&left);
+  position->get_Top(&top);
+  check_equal(std::lround(30 * pixel), left, "its left");
+  check_equal(std::lround(40 * pixel), top, "its top");
+  DestroyWindow(outer);
+}
+
+void combo_entries_are_found(_ORVUtils* u) {
+  const HWND box = window(L"ComboBox", CBS_DROPDOWN, 0, 0, 100, 100, nullptr);
+  for (const LONG key : {7, 19, 42}) {
+    SendMessageW(box, CB_SETITEMDATA,
+                 static_cast<WPARAM>(SendMessageW(box, CB_ADDSTRING, 0, reinterpret_cast<LPARAM>(L"entry"))), key);
+  }
+  const Held combo(combo_object(box), "the combo");
+  LONG index = 0;
+  check_equal(S_OK, u->GetComboListIndex(Value(combo.get()), Long{42}, &index), "a search for a key");
+  check_equal(2, index, "its index");
+  DestroyWindow(box);
+}
+
+/// A search for what the combo's Text answers, here an object, in a control that takes it in one way or the other.
+std::wstring search_text_is_put(_ORVUtils* u, bool by_reference) {
+  std::wstring how = L"not at all";
+  HostObject text(HostObject::Kind::with_value);
+  const Held combo(new Scriptable, "the combo");
+  const auto take = [&](const wchar_t* way) {
+    return [&how, &text, way](const VARIANT& value) {
+      how = V_VT(&value) == VT_DISPATCH && V_DISPATCH(&value) == &text ? way : L"as another value";
+    };
+  };
+  const auto ignore = [](const VARIANT&) {};
+  const auto number = [] { return variant(LONG{0}); };
+  combo.get()->method(L"Refresh", {0, 0}, [](const Scriptable::Arguments&) { return VARIANT{}; });
+  combo.get()->property(L"Text", [&] { return variant(&text); });
+  combo.get()->property(L"SearchText", {}, by_reference ? Scriptable::Setter() : take(L"as a value"),
+                        by_reference ? take(L"by reference") : Scriptable::Setter());
+  for (const wchar_t* name : {L"ListIndex", L"ColumnSearch", L"SearchMethod", L"Action", L"SearchIndex"}) {
+    combo.get()->property(name, number, ignore);
+  }
+  LONG index = 0;
+  check_equal(S_OK, u->SearchCombo(Value(combo.get()), Short{0}, &index), "a search for an object");
+  check_equal(1U, text.references, "references to it");
+  return how;
+}
+
+}  // namespace
+
+int wmain(int, wchar_t**) {
+  return run_checks([] {
+    const Pointer<_ORVUtils> object = create_object();
+    _ORVUtils* const u = object.get();
+    typed_picture_boxes_are_drawn_on(u);
+    controls_are_dragged_on_a_form();
+    combo_entries_are_found(u);
+    check_equal(L"by reference", search_text_is_put(u, true), "a property that keeps an object");
+    check_equal(L"as a value", search_text_is_put(u, false), "one that takes any value");
+    object->Terminate();
+  });
+}
