@@ -35,11 +35,15 @@ std::string_view standard_description(std::int32_t number) noexcept {
     case ErrorNumber::form_already_displayed: return "Form already displayed; can't show modally";  // 400
     case ErrorNumber::object_required: return "Object required";  // 424
     case ErrorNumber::cannot_create_object: return "ActiveX component can't create object";  // 429
+    case ErrorNumber::interface_not_supported: return "Class does not support Automation or does not support expected interface";  // 430
     case ErrorNumber::member_not_supported: return "Object doesn't support this property or method";  // 438
     case ErrorNumber::action_not_supported: return "Object doesn't support this action";  // 445
+    case ErrorNumber::named_arguments_not_supported: return "Object doesn't support named arguments";  // 446
+    case ErrorNumber::locale_not_supported: return "Object doesn't support current locale setting";  // 447
     case ErrorNumber::named_argument_not_found: return "Named argument not found";  // 448
     case ErrorNumber::argument_not_optional: return "Argument not optional";  // 449
     case ErrorNumber::wrong_argument_count: return "Wrong number of arguments or invalid property assignment";  // 450
+    case ErrorNumber::not_a_collection: return "Property let procedure not defined and property get procedure did not return an object";  // 451
     case ErrorNumber::missing_entry_point: return "Can't find DLL entry point";  // 453
     case ErrorNumber::printer_error: return "Printer error";  // 482
   }
@@ -51,10 +55,10 @@ RunTimeError::RunTimeError(ErrorNumber number)
     : RunTimeError(static_cast<std::int32_t>(number),
                    from_utf8(standard_description(static_cast<std::int32_t>(number)))) {}
 
-RunTimeError::RunTimeError(std::int32_t number, Text description, Text source)
+RunTimeError::RunTimeError(std::int32_t number, Text description, std::optional<ErrorOrigin> origin)
     : number_(number),
       description_(std::move(description)),
-      source_(std::move(source)),
+      origin_(std::move(origin)),
       narrow_(to_utf8(description_)) {}
 
 void raise(ErrorNumber number) { throw RunTimeError(number); }

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <exception>
+#include <optional>
 #include <string_view>
 
 #include "automation/text.hpp"
@@ -36,11 +37,15 @@ enum class ErrorNumber : std::int32_t {
   form_already_displayed = 400,
   object_required = 424,
   cannot_create_object = 429,
+  interface_not_supported = 430,
   member_not_supported = 438,
   action_not_supported = 445,
+  named_arguments_not_supported = 446,
+  locale_not_supported = 447,
   named_argument_not_found = 448,
   argument_not_optional = 449,
   wrong_argument_count = 450,
+  not_a_collection = 451,
   missing_entry_point = 453,
   printer_error = 482,
 };
@@ -48,23 +53,33 @@ enum class ErrorNumber : std::int32_t {
 /// The standard text of a number; the text of an unknown number is "Application-defined or object-defined error".
 [[nodiscard]] std::string_view standard_description(std::int32_t number) noexcept;
 
-/// The one exception of the library: what a host sees as Err.Number, Err.Description and Err.Source.
+/// Where an error comes from that another object raised, as that object tells it, and where to read about it: what a
+/// host sees as Err.Source, Err.HelpFile and Err.HelpContext. What the object does not tell is empty.
+struct ErrorOrigin {
+  Text source;
+  Text help_file;
+  std::uint32_t help_context = 0;
+
+  friend bool operator==(const ErrorOrigin&, const ErrorOrigin&) = default;
+};
+
+/// The one exception of the library: what a host sees as Err.Number and Err.Description.
 class RunTimeError : public std::exception {
  public:
   explicit RunTimeError(ErrorNumber number);
 
-  /// An empty source stands for the library's own; another is that of a control which raised the error.
-  RunTimeError(std::int32_t number, Text description, Text source = {});
+  /// Without an origin the error is the library's own.
+  RunTimeError(std::int32_t number, Text description, std::optional<ErrorOrigin> origin = {});
 
   [[nodiscard]] std::int32_t number() const noexcept { return number_; }
   [[nodiscard]] const Text& description() const noexcept { return description_; }
-  [[nodiscard]] const Text& source() const noexcept { return source_; }
+  [[nodiscard]] const std::optional<ErrorOrigin>& origin() const noexcept { return origin_; }
   [[nodiscard]] const char* what() const noexcept override { return narrow_.c_str(); }
 
  private:
   std::int32_t number_;
   Text description_;
-  Text source_;
+  std::optional<ErrorOrigin> origin_;
   std::string narrow_;
 };
 

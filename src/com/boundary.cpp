@@ -1,5 +1,6 @@
 #include "com/boundary.hpp"
 
+#include <array>
 #include <new>
 #include <stdexcept>
 
@@ -30,17 +31,45 @@ constexpr PlatformResult platform_results[] = {
     {DISP_E_PARAMNOTOPTIONAL, ErrorNumber::argument_not_optional},
     {DISP_E_PARAMNOTFOUND, ErrorNumber::named_argument_not_found},
     {DISP_E_DIVBYZERO, ErrorNumber::division_by_zero},
+    {DISP_E_NONAMEDARGS, ErrorNumber::named_arguments_not_supported},
+    {DISP_E_UNKNOWNLCID, ErrorNumber::locale_not_supported},
+    {DISP_E_NOTACOLLECTION, ErrorNumber::not_a_collection},
     {E_OUTOFMEMORY, ErrorNumber::out_of_memory},
     {E_INVALIDARG, ErrorNumber::invalid_procedure_call},
+    {E_NOTIMPL, ErrorNumber::action_not_supported},
+    {E_ACCESSDENIED, ErrorNumber::permission_denied},
+    {E_NOINTERFACE, ErrorNumber::interface_not_supported},
 };
+
+std::int32_t number_of(HRESULT result) noexcept {
+  const auto bits = static_cast<std::uint32_t>(result);
+  if ((bits & 0xFFFF0000) == run_time_facility) return static_cast<std::int32_t>(bits & 0xFFFF);
+  for (const auto& known : platform_results) {
+    if (known.result == result) return static_cast<std::int32_t>(known.number);
+  }
+  return result;
+}
+
+bool is_run_time_number(std::int32_t number) noexcept { return number > 0 && number <= 0xFFFF; }
+
+/// What the system says of a result, in one line.
+Text system_text(HRESULT result) {
+  std::array<wchar_t, 512> text{};
+  constexpr DWORD flags = FORMAT_MESSAGE_FROM_SYSTEM | FORMAT_MESSAGE_IGNORE_INSERTS | FORMAT_MESSAGE_MAX_WIDTH_MASK;
+  const DWORD size = FormatMessageW(flags, nullptr, static_cast<DWORD>(result), 0, text.data(),
+                                    static_cast<DWORD>(text.size()), nullptr);
+  TextView line = win32::view(text.data(), size);
+  while (!line.empty() && line.back() <= u' ') line.remove_suffix(1);
+  return line.empty() ? from_utf8(standard_description(result)) : Text(line);
+}
 
 BSTR description_of(const RunTimeError& error) noexcept {
   return SysAllocStringLen(win32::wide(error.description()), static_cast<UINT>(error.description().size()));
 }
 
-/// An error of the host's control keeps the source that it came with.
+/// An error of the host's control keeps the source that it came with; one that came with none is still not ours.
 const wchar_t* source_of(const RunTimeError& error) noexcept {
-  return error.source().empty() ? source_name : win32::wide(error.source());
+  return error.origin() ? win32::wide(error.origin()->source) : source_name;
 }
 
 }  // namespace
@@ -50,17 +79,17 @@ HRESULT result_of(std::int32_t number) noexcept {
   return static_cast<HRESULT>(bits <= 0xFFFF ? run_time_facility + bits : bits);
 }
 
-RunTimeError error_of(HRESULT result, TextView description, TextView source) {
-  const auto bits = static_cast<std::uint32_t>(result);
-  std::int32_t number = result;
-  if ((bits & 0xFFFF0000) == run_time_facility) number = static_cast<std::int32_t>(bits & 0xFFFF);
-  for (const auto& known : platform_results) {
-    if (known.result == result) number = static_cast<std::int32_t>(known.number);
-  }
-  if (!description.empty()) return {number, Text(description), Text(source)};
-  const std::string_view standard = standard_description(number);
-  return {number, Text(standard.begin(), standard.end()), Text(source)};
+RunTimeError error_of(HRESULT result, TextView description, const ErrorOrigin& told) {
+  const std::int32_t number = number_of(result);
+  // A run-time error that nobody claims is what a late-bound call of the library's met with.
+  std::optional<ErrorOrigin> origin;
+  if (told != ErrorOrigin{} || !is_run_time_number(number)) origin = told;
+  if (!description.empty()) return {number, Text(description), std::move(origin)};
+  return {number, is_run_time_number(number) ? from_utf8(standard_description(number)) : system_text(result),
+          std::move(origin)};
 }
+
+RunTimeError system_error(HRESULT result) { return {result, system_text(result)}; }
 
 RunTimeError current_error() noexcept {
   try {
@@ -83,6 +112,10 @@ HRESULT report_current_exception() noexcept {
   if (SUCCEEDED(CreateErrorInfo(creator.receive()))) {
     creator->SetSource(const_cast<wchar_t*>(source_of(error)));
     creator->SetDescription(const_cast<wchar_t*>(win32::wide(error.description())));
+    if (error.origin()) {
+      creator->SetHelpFile(const_cast<wchar_t*>(win32::wide(error.origin()->help_file)));
+      creator->SetHelpContext(error.origin()->help_context);
+    }
     if (SUCCEEDED(creator->QueryInterface(IID_IErrorInfo, information.receive_untyped()))) {
       SetErrorInfo(0, information.get());
     }
@@ -97,6 +130,11 @@ HRESULT report_current_exception(EXCEPINFO* information) noexcept {
     information->scode = result_of(error.number());
     information->bstrSource = SysAllocString(source_of(error));
     information->bstrDescription = description_of(error);
+    if (!error.origin()) return DISP_E_EXCEPTION;
+    const Text& help_file = error.origin()->help_file;
+    // Most callers look for no help, nor free its text, until they have heard of some.
+    if (!help_file.empty()) information->bstrHelpFile = SysAllocString(win32::wide(help_file));
+    information->dwHelpContext = error.origin()->help_context;
   }
   return DISP_E_EXCEPTION;
 }

@@ -32,7 +32,9 @@ class ExceptionInformation {
   [[nodiscard]] RunTimeError error() {
     if (information_.pfnDeferredFillIn != nullptr) information_.pfnDeferredFillIn(&information_);
     const HRESULT result = information_.scode != 0 ? information_.scode : result_of(information_.wCode);
-    return error_of(result, view_of(information_.bstrDescription), view_of(information_.bstrSource));
+    return error_of(
+        result, view_of(information_.bstrDescription),
+        {Text(view_of(information_.bstrSource)), Text(view_of(information_.bstrHelpFile)), information_.dwHelpContext});
   }
 
  private:

@@ -97,7 +97,7 @@ HRESULT create_object(REFIID id, void** out) noexcept {
     auto* const made = new ComObject<C>(module_library());
     const HRESULT result = ComObject<C>::query_interface(made, &id, out);
     ComObject<C>::release(made);
-    if (FAILED(result)) throw error_of(result, {});
+    if (FAILED(result)) throw system_error(result);
   });
 }
 
@@ -108,7 +108,7 @@ HRESULT create_control(REFIID id, void** out) noexcept {
     Pointer<IDispatch> made;
     *made.receive() = dispatch_from(std::make_shared<C>(module_library().platform()));
     const HRESULT result = made->QueryInterface(id, out);
-    if (FAILED(result)) throw error_of(result, {});
+    if (FAILED(result)) throw system_error(result);
   });
 }
 

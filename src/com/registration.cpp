@@ -47,7 +47,7 @@ class Key {
   }
 
   static void check(LSTATUS status) {
-    if (status != ERROR_SUCCESS) throw error_of(HRESULT_FROM_WIN32(static_cast<DWORD>(status)), {});
+    if (status != ERROR_SUCCESS) throw system_error(HRESULT_FROM_WIN32(static_cast<DWORD>(status)));
   }
 
  private:
@@ -107,7 +107,7 @@ void register_type_library(RegistrationScope scope, const std::wstring& path) {
     result = scope == RegistrationScope::user ? RegisterTypeLibForUser(library.get(), name, nullptr)
                                               : RegisterTypeLib(library.get(), name, nullptr);
   }
-  if (FAILED(result)) throw error_of(result, {});
+  if (FAILED(result)) throw system_error(result);
 }
 
 }  // namespace
@@ -141,7 +141,7 @@ HRESULT unregister_library(RegistrationScope scope) noexcept {
     // Wine answers E_INVALIDARG for a library that is not registered.
     if (FAILED(result) && result != TYPE_E_REGISTRYACCESS && result != TYPE_E_LIBNOTREGISTERED &&
         result != E_INVALIDARG) {
-      throw error_of(result, {});
+      throw system_error(result);
     }
   });
 }

@@ -31,26 +31,6 @@ void grids_are_driven(_ORVUtils* u) {
   check_equal(1U, table.references, "references that are left");
 }
 
-void errors_keep_their_source(_ORVUtils* u) {
-  TableObject table(3, 1);
-  table.before = [](DISPID, WORD, EXCEPINFO* exception) {
-    exception->scode = static_cast<HRESULT>(0x80041234U);
-    exception->bstrSource = SysAllocString(L"OtherGrid");
-    exception->bstrDescription = SysAllocString(L"The grid is busy.");
-    return DISP_E_EXCEPTION;
-  };
-  {
-    Value grid(&table);
-    check_equal(static_cast<HRESULT>(0x80041234U), u->SaveGridWidths(grid, Text(L"Grid"), Short{0}), "its number");
-    check_equal(L"OtherGrid: The grid is busy.", error_text(), "its source and its text");
-    check_equal(run_time_error(438), u->LoadWindowState(grid, Text(L"Form")), "a member that is missing");
-    Value nothing(static_cast<IDispatch*>(nullptr));
-    check_equal(run_time_error(91), u->SaveGridWidths(nothing, Text(L"Grid"), Short{0}), "an empty reference");
-    check_equal(run_time_error(424), u->SaveGridWidths(Value::null(), Text(L"Grid"), Short{0}), "Null");
-  }
-  check_equal(1U, table.references, "references after errors");
-}
-
 /// The host lets go of its variable, and calls the library again, in the middle of a call.
 void hosts_may_do_anything_in_between(_ORVUtils* u) {
   TableObject table(50, 1);
@@ -257,7 +237,6 @@ int wmain(int, wchar_t** arguments) {
     _ORVUtils* const u = object.get();
     const std::wstring folder = arguments[1];
     grids_are_driven(u);
-    errors_keep_their_source(u);
     hosts_may_do_anything_in_between(u);
     confirmations_ask_twice(u, desktop, folder + L"\\..\\screenshots");
     failures_are_told(u, desktop);

@@ -32,8 +32,9 @@ struct Outcome {
     if (SUCCEEDED(status)) return true;
     if (status != DISP_E_EXCEPTION)
       return std::ranges::find(documented_results, status) != std::end(documented_results);
-    if (source != L"TALUtil.ORVUtils" || description.empty()) return false;
-    return code == HostObject::failure ||
+    if (description.empty()) return false;
+    if (code == HostObject::failure) return source.empty();
+    return source == L"TALUtil.ORVUtils" &&
            std::ranges::any_of(documented_numbers, [this](int number) { return code == run_time_error(number); });
   }
 };

@@ -1,8 +1,8 @@
-// A client whose objects answer a use only as what the member is.
+// A client whose objects answer a use only as what the member is, and what the library makes of objects that fail.
 #include <cmath>
 
 #include "examples/host/window_objects.hpp"
-#include "client.hpp"
+#include "table_object.hpp"
 
 using namespace talutil::hosts;
 
@@ -189,6 +189,127 @@ std::wstring search_text_is_put(_ORVUtils* u, bool by_reference) {
   return how;
 }
 
+/// What a caller hears of an error: "source: description", help file and context.
+struct Heard {
+  HRESULT number = S_OK;
+  std::wstring text;
+  std::wstring help;
+};
+
+Heard early(_ORVUtils* u, Value& grid) {
+  Heard heard{u->SaveGridWidths(grid, Text(L"Grid"), Short{0}), {}, {}};
+  Pointer<IErrorInfo> error;
+  GetErrorInfo(0, error.receive());
+  if (!error) return heard;
+  Text help;
+  DWORD context = 0;
+  error->GetHelpFile(help);
+  error->GetHelpContext(&context);
+  heard.help = std::wstring(help.view()) + L"#" + std::to_wstring(context);
+  SetErrorInfo(0, error.get());
+  heard.text = error_text();
+  return heard;
+}
+
+Heard late(_ORVUtils* u, Value& grid) {
+  DISPID id = 0;
+  auto* name = const_cast<wchar_t*>(L"SaveGridWidths");
+  require(u->GetIDsOfNames(IID_NULL, &name, 1, LOCALE_USER_DEFAULT, &id), "SaveGridWidths");
+  const Value start(short{0});
+  const Value section(L"Grid");
+  std::array<VARIANT, 3> arguments{start.get(), section.get(), grid.get()};
+  DISPPARAMS parameters{arguments.data(), nullptr, 3, 0};
+  EXCEPINFO exception{};
+  Heard heard{u->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters, nullptr, &exception, nullptr),
+              std::wstring(view(exception.bstrSource)) + L": " + std::wstring(view(exception.bstrDescription)),
+              std::wstring(view(exception.bstrHelpFile)) + L"#" + std::to_wstring(exception.dwHelpContext)};
+  if (heard.number == DISP_E_EXCEPTION) heard.number = exception.scode;
+  for (BSTR text : {exception.bstrSource, exception.bstrDescription, exception.bstrHelpFile}) SysFreeString(text);
+  return heard;
+}
+
+constexpr auto their_error = static_cast<HRESULT>(0x80041234U);
+
+HRESULT raise_with_help(EXCEPINFO* exception) {
+  exception->scode = their_error;
+  exception->bstrSource = SysAllocString(L"OtherGrid");
+  exception->bstrDescription = SysAllocString(L"The grid is busy.");
+  exception->bstrHelpFile = SysAllocString(L"grid.chm");
+  exception->dwHelpContext = 77;
+  return DISP_E_EXCEPTION;
+}
+
+template <HRESULT Code>
+HRESULT raise_bare(EXCEPINFO* exception) {
+  exception->scode = Code;
+  return DISP_E_EXCEPTION;
+}
+
+template <HRESULT Code>
+HRESULT answer(EXCEPINFO*) {
+  return Code;
+}
+
+void errors_of_objects_reach_the_caller(_ORVUtils* u) {
+  constexpr auto unplugged = static_cast<HRESULT>(0x80070002U);  // Known to the system, unknown to hosts.
+  const struct {
+    const char* name;
+    HRESULT (*fails)(EXCEPINFO*);
+    HRESULT number;
+    const wchar_t* text;  ///< None: whatever the system calls it.
+    const wchar_t* help;
+  } rows[] = {
+      {"with everything", raise_with_help, their_error, L"OtherGrid: The grid is busy.", L"grid.chm#77"},
+      {"with a number alone", raise_bare<unplugged>, unplugged, nullptr, L"#0"},
+      {"no exception", answer<unplugged>, unplugged, nullptr, L"#0"},
+      {"E_NOTIMPL", answer<E_NOTIMPL>, run_time_error(445), L"TALUtil.ORVUtils: Object doesn't support this action",
+       L"#0"},
+      {"E_ACCESSDENIED", answer<E_ACCESSDENIED>, run_time_error(70), L"TALUtil.ORVUtils: Permission denied", L"#0"},
+      {"E_NOINTERFACE", answer<E_NOINTERFACE>, run_time_error(430),
+       L"TALUtil.ORVUtils: Class does not support Automation or does not support expected interface", L"#0"},
+      {"DISP_E_NONAMEDARGS", answer<DISP_E_NONAMEDARGS>, run_time_error(446),
+       L"TALUtil.ORVUtils: Object doesn't support named arguments", L"#0"},
+      {"DISP_E_NOTACOLLECTION", answer<DISP_E_NOTACOLLECTION>, run_time_error(451),
+       L"TALUtil.ORVUtils: Property let procedure not defined and property get procedure did not return an object",
+       L"#0"},
+  };
+  TableObject table(3, 1);
+  Value grid(&table);
+  for (const auto& row : rows) {
+    table.before = [&](DISPID, WORD, EXCEPINFO* exception) { return row.fails(exception); };
+    for (const auto hear : {early, late}) {
+      const Heard heard = hear(u, grid);
+      const std::string name = std::string(row.name) + (hear == early ? ", early" : ", late");
+      check_equal(row.number, heard.number, name);
+      check_equal(row.help, heard.help, name + ": its help");
+      if (row.text != nullptr) {
+        check_equal(row.text, heard.text, name);
+        continue;
+      }
+      const bool is_general = heard.text.find(L"Application-defined") != std::wstring::npos;
+      check(heard.text.starts_with(L": ") && heard.text.size() > 2 && !is_general, name + ": " + narrow(heard.text));
+    }
+  }
+  check_equal(2U, table.references, "references after errors");
+}
+
+void what_cannot_be_driven_is_an_error(_ORVUtils* u) {
+  HostObject other(HostObject::Kind::with_value);
+  struct {
+    const char* name;
+    Value grid;
+    int error;
+  } rows[] = {
+      {"an object without the members", Value(&other), 438},
+      {"an empty reference", Value(static_cast<IDispatch*>(nullptr)), 91},
+      {"Null", Value::null(), 424},
+  };
+  for (auto& row : rows) {
+    check_equal(run_time_error(row.error), early(u, row.grid).number, std::string(row.name) + ", early");
+    check_equal(run_time_error(row.error), late(u, row.grid).number, std::string(row.name) + ", late");
+  }
+}
+
 }  // namespace
 
 int wmain(int, wchar_t**) {
@@ -200,6 +321,8 @@ int wmain(int, wchar_t**) {
     combo_entries_are_found(u);
     check_equal(L"by reference", search_text_is_put(u, true), "a property that keeps an object");
     check_equal(L"as a value", search_text_is_put(u, false), "one that takes any value");
+    errors_of_objects_reach_the_caller(u);
+    what_cannot_be_driven_is_an_error(u);
     object->Terminate();
   });
 }
