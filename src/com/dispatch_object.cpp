@@ -197,6 +197,16 @@ class DispatchObject final : public Object {
   Pointer<IDispatch> dispatch_;
 };
 
+/// The host's object, of a kind that cannot be driven late-bound.
+class UndrivenObject final : public Object {
+ public:
+  std::int32_t member_id(TextView /*name*/) override { raise(ErrorNumber::type_mismatch); }
+
+  Variant invoke(std::int32_t /*member*/, Access /*access*/, std::span<const Variant> /*arguments*/) override {
+    raise(ErrorNumber::type_mismatch);
+  }
+};
+
 /// One of ours, for a host.
 class ObjectDispatch final : public IDispatch {
  public:
@@ -279,8 +289,10 @@ class ObjectDispatch final : public IDispatch {
 ObjectRef object_from(IUnknown* object) {
   if (object == nullptr) return {};
   Pointer<IDispatch> dispatch;
-  if (FAILED(object->QueryInterface(IID_IDispatch, dispatch.receive_untyped()))) raise(ErrorNumber::type_mismatch);
-  return std::make_shared<DispatchObject>(std::move(dispatch));
+  if (SUCCEEDED(object->QueryInterface(IID_IDispatch, dispatch.receive_untyped()))) {
+    return std::make_shared<DispatchObject>(std::move(dispatch));
+  }
+  return std::make_shared<UndrivenObject>();
 }
 
 IDispatch* dispatch_from(const ObjectRef& object) {
@@ -288,6 +300,7 @@ IDispatch* dispatch_from(const ObjectRef& object) {
   if (const auto* const theirs = dynamic_cast<DispatchObject*>(object.get())) {
     return Pointer<IDispatch>(theirs->dispatch()).release();
   }
+  if (dynamic_cast<UndrivenObject*>(object.get()) != nullptr) raise(ErrorNumber::type_mismatch);
   return new ObjectDispatch(object);
 }
 

@@ -228,8 +228,27 @@ class NamelessObject : public IDispatch {
   }
 };
 
-/// An automation object of the client's: its default member answers a value, or there is none, or it fails; every
-/// other member is unknown. Its references are counted for the client to see.
+/// An object of the client's that has no automation at all.
+class UndrivenObject final : public IUnknown {
+ public:
+  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override {
+    *out = id == IID_IUnknown ? this : nullptr;
+    return *out == nullptr ? E_NOINTERFACE : S_OK;
+  }
+  ULONG STDMETHODCALLTYPE AddRef() override { return 2; }
+  ULONG STDMETHODCALLTYPE Release() override { return 1; }
+
+  [[nodiscard]] Value value() {
+    Value result;
+    V_VT(&result.get()) = VT_UNKNOWN;
+    V_UNKNOWN(&result.get()) = this;
+    return result;
+  }
+};
+
+/// An automation object of the client's: its default property answers a value, or there is none, or it fails; every
+/// other member is unknown, but that a form knows the names by which forms and picture boxes are told. Its references
+/// are counted for the client to see.
 class HostObject final : public NamelessObject {
  public:
   enum class Kind { with_value, without_value, failing, form };

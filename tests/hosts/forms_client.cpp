@@ -124,6 +124,10 @@ void failures_are_told(_ORVUtils* u, const Desktop& desktop) {
   Value nothing;
   check_equal(L"forms_client|OK|ORVUtils SelectGridRows Object required", text_of([&] { tick(u, nothing, 1); }),
               "an error while ticking");
+  UndrivenObject object;
+  Value undriven = object.value();
+  check_equal(L"forms_client|OK|ORVUtils SelectGridRows Type mismatch", text_of([&] { tick(u, undriven, 1); }),
+              "an object without automation");
 }
 
 /// Exports a table, the user saving to what the dialog proposes.
@@ -155,6 +159,9 @@ void grids_are_exported(_ORVUtils* u, const Desktop& desktop, const std::wstring
   Value grid(&table);
   check_equal(std::string("\"a,b\",\r\n,\x80\r\n"), exported(u, desktop, folder, grid, IDOK), "the file");
   check_equal(std::string("(no file)"), exported(u, desktop, folder, grid, IDCANCEL), "after Cancel");
+  UndrivenObject object;
+  Value undriven = object.value();
+  check_equal(std::string("(no file)"), exported(u, desktop, folder, undriven, IDOK), "an object without automation");
 }
 
 /// A form as PrintScreen wants it.

@@ -105,6 +105,8 @@ HRESULT draw(_ORVUtils* u, const wchar_t* text) {
 void typed_picture_boxes_are_drawn_on(_ORVUtils* u) {
   TypedPictureBox picture;
   check_equal(S_OK, u->put_DrawTextPictureBox(Value(&picture).get()), "a picture box");
+  UndrivenObject undriven;
+  check_equal(run_time_error(13), u->put_DrawTextPictureBox(undriven.value().get()), "an object without automation");
   check_equal(S_OK, draw(u, L"abc"), "a text that has room");
   check_equal(L"abc bold in 255 at 300,350", picture.box.printed, "what the box printed");
   check_equal(S_OK, draw(u, L"longer than the rectangle"), "a text that has none");
@@ -294,12 +296,14 @@ void errors_of_objects_reach_the_caller(_ORVUtils* u) {
 }
 
 void what_cannot_be_driven_is_an_error(_ORVUtils* u) {
+  UndrivenObject undriven;
   HostObject other(HostObject::Kind::with_value);
   struct {
     const char* name;
     Value grid;
     int error;
   } rows[] = {
+      {"an object without automation", undriven.value(), 13},
       {"an object without the members", Value(&other), 438},
       {"an empty reference", Value(static_cast<IDispatch*>(nullptr)), 91},
       {"Null", Value::null(), 424},
