@@ -277,11 +277,12 @@ struct Describe {
 constexpr char fold_case(char c) noexcept { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; }
 
 /// Names of the interface are ASCII and compared without case.
-constexpr bool same_name(std::string_view a, std::string_view b) noexcept {
+template <class Char>
+constexpr bool same_name(std::string_view name, std::basic_string_view<Char> other) noexcept {
   // Lengths first, by hand: the check of a whole table compares every pair while compiling.
-  if (a.size() != b.size()) return false;
-  for (std::size_t i = 0; i < a.size(); ++i) {
-    if (fold_case(a[i]) != fold_case(b[i])) return false;
+  if (name.size() != other.size()) return false;
+  for (std::size_t i = 0; i < name.size(); ++i) {
+    if (other[i] >= 0x80 || fold_case(name[i]) != fold_case(static_cast<char>(other[i]))) return false;
   }
   return true;
 }
@@ -329,11 +330,7 @@ class NameIndex {
   [[nodiscard]] constexpr std::int32_t find(std::span<const Member> members,
                                             std::basic_string_view<Char> name) const noexcept {
     for (std::size_t at = hash(name) % Slots; slots_[at] != 0; at = (at + 1) % Slots) {
-      const std::string_view candidate = members[slots_[at] - 1].name;
-      if (std::equal(candidate.begin(), candidate.end(), name.begin(), name.end(),
-                     [](char a, Char b) { return b < 0x80 && fold_case(a) == fold_case(static_cast<char>(b)); })) {
-        return slots_[at] - 1;
-      }
+      if (same_name(members[slots_[at] - 1].name, name)) return slots_[at] - 1;
     }
     return -1;
   }

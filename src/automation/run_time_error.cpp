@@ -55,25 +55,34 @@ RunTimeError::RunTimeError(ErrorNumber number)
     : RunTimeError(static_cast<std::int32_t>(number),
                    from_utf8(standard_description(static_cast<std::int32_t>(number)))) {}
 
-RunTimeError::RunTimeError(std::int32_t number, Text description, std::optional<ErrorOrigin> origin)
-    : number_(number),
-      description_(std::move(description)),
-      origin_(std::move(origin)),
-      narrow_(to_utf8(description_)) {}
+RunTimeError::RunTimeError(std::int32_t number, Text description, std::optional<ErrorOrigin> origin) {
+  std::string narrow = to_utf8(description);
+  contents_ =
+      std::make_shared<Contents>(Contents{number, std::move(description), std::move(origin), std::move(narrow)});
+}
 
 void raise(ErrorNumber number) { throw RunTimeError(number); }
 
-RunTimeError current_error() {
+const RunTimeError& out_of_memory_error() {
+  static const RunTimeError error(ErrorNumber::out_of_memory);
+  return error;
+}
+
+RunTimeError current_error() noexcept {
   try {
     throw;
   } catch (const RunTimeError& error) {
     return error;
   } catch (const std::bad_alloc&) {
-    return RunTimeError(ErrorNumber::out_of_memory);
+    return out_of_memory_error();
   } catch (const std::length_error&) {
-    return RunTimeError(ErrorNumber::out_of_memory);
+    return out_of_memory_error();
   } catch (...) {
+  }
+  try {
     return RunTimeError(ErrorNumber::internal_error);
+  } catch (...) {
+    return out_of_memory_error();
   }
 }
 

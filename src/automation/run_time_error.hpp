@@ -2,7 +2,9 @@
 
 #include <cstdint>
 #include <exception>
+#include <memory>
 #include <optional>
+#include <string>
 #include <string_view>
 
 #include "automation/text.hpp"
@@ -63,7 +65,8 @@ struct ErrorOrigin {
   friend bool operator==(const ErrorOrigin&, const ErrorOrigin&) = default;
 };
 
-/// The one exception of the library: what a host sees as Err.Number and Err.Description.
+/// The one exception of the library: what a host sees as Err.Number and Err.Description. Copies share their texts, so
+/// that handing one on needs no memory.
 class RunTimeError : public std::exception {
  public:
   explicit RunTimeError(ErrorNumber number);
@@ -71,22 +74,28 @@ class RunTimeError : public std::exception {
   /// Without an origin the error is the library's own.
   RunTimeError(std::int32_t number, Text description, std::optional<ErrorOrigin> origin = {});
 
-  [[nodiscard]] std::int32_t number() const noexcept { return number_; }
-  [[nodiscard]] const Text& description() const noexcept { return description_; }
-  [[nodiscard]] const std::optional<ErrorOrigin>& origin() const noexcept { return origin_; }
-  [[nodiscard]] const char* what() const noexcept override { return narrow_.c_str(); }
+  [[nodiscard]] std::int32_t number() const noexcept { return contents_->number; }
+  [[nodiscard]] const Text& description() const noexcept { return contents_->description; }
+  [[nodiscard]] const std::optional<ErrorOrigin>& origin() const noexcept { return contents_->origin; }
+  [[nodiscard]] const char* what() const noexcept override { return contents_->narrow.c_str(); }
 
  private:
-  std::int32_t number_;
-  Text description_;
-  std::optional<ErrorOrigin> origin_;
-  std::string narrow_;
+  struct Contents {
+    std::int32_t number;
+    Text description;
+    std::optional<ErrorOrigin> origin;
+    std::string narrow;
+  };
+
+  std::shared_ptr<const Contents> contents_;
 };
 
 [[noreturn]] void raise(ErrorNumber number);
 
-/// The exception being handled as a run-time error, for members that tell of every error: a failed allocation is 7,
-/// an exception of no kind we know 51.
-[[nodiscard]] RunTimeError current_error();
+/// Error 7, made ahead: at the first call, which is that of the start-up, for when there is no memory to make it.
+[[nodiscard]] const RunTimeError& out_of_memory_error();
+
+/// The exception being handled as a run-time error: a failed allocation is 7, an exception of no kind we know 51.
+[[nodiscard]] RunTimeError current_error() noexcept;
 
 }  // namespace talutil

@@ -1,8 +1,6 @@
 #include "com/boundary.hpp"
 
 #include <array>
-#include <new>
-#include <stdexcept>
 
 #include "com/pointer.hpp"
 
@@ -90,20 +88,6 @@ RunTimeError error_of(HRESULT result, TextView description, const ErrorOrigin& t
 }
 
 RunTimeError system_error(HRESULT result) { return {result, system_text(result)}; }
-
-RunTimeError current_error() noexcept {
-  try {
-    throw;
-  } catch (const RunTimeError& error) {
-    return error;
-  } catch (const std::bad_alloc&) {
-    return RunTimeError(ErrorNumber::out_of_memory);
-  } catch (const std::length_error&) {
-    return RunTimeError(ErrorNumber::out_of_memory);
-  } catch (...) {
-    return RunTimeError(ErrorNumber::internal_error);
-  }
-}
 
 HRESULT report_current_exception() noexcept {
   const RunTimeError error = current_error();

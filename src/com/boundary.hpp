@@ -18,9 +18,6 @@ namespace talutil::com {
 /// The failed result of a function of the system's, which leaves the library as it came.
 [[nodiscard]] RunTimeError system_error(HRESULT result);
 
-/// The exception being handled as a run-time error: a failed allocation is 7, one of no kind we know 51.
-[[nodiscard]] RunTimeError current_error() noexcept;
-
 /// Hands the exception being handled to the caller's thread as error information, and gives its HRESULT.
 [[nodiscard]] HRESULT report_current_exception() noexcept;
 

@@ -144,10 +144,8 @@ HRESULT find_identifiers(const LateInterface& table, wchar_t** names, UINT count
   HRESULT result = S_OK;
   for (UINT i = 1; i < count; ++i) {
     const auto parameters = member.parameters();
-    const auto found = std::ranges::find_if(parameters, [&](const Parameter& parameter) {
-      const TextView name = name_at(i);
-      return same_name(parameter.name, to_utf8(name));
-    });
+    const auto found = std::ranges::find_if(
+        parameters, [&](const Parameter& parameter) { return same_name(parameter.name, name_at(i)); });
     if (found == parameters.end())
       result = DISP_E_UNKNOWNNAME;
     else

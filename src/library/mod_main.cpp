@@ -1,4 +1,5 @@
 #include "automation/checked.hpp"
+#include "automation/run_time_error.hpp"
 #include "controls/control_factory.hpp"
 #include "forms/frm_input_box.hpp"
 #include "infoforms/frm_cmd_line_help.hpp"
@@ -19,6 +20,7 @@ Library::Library(const Platform& platform)
 Library::~Library() = default;
 
 void Library::start() {
+  static_cast<void>(out_of_memory_error());
   locale_ = platform_.computer.locale();
   components_->load();
   settings_.ScreenTwipsPerPixelX = round_to<std::int32_t>(platform_.screen.twips_per_pixel_x());
