@@ -69,12 +69,12 @@ void ExportBare(benchmark::State& state) {
     std::string text;
     for (std::int32_t r = 0; r < QuickGrid::rows; ++r) {
       const Variant row = r;
-      if (grid.invoke(5, Access::get, {&row, 1}).to_boolean()) continue;
+      if (grid.invoke(5, Access::get, {&row, 1}).to_boolean(plain_numbers)) continue;
       for (std::int32_t c = 0; c < QuickGrid::columns; ++c) {
         const Variant cell[] = {r, c};
-        if (grid.invoke(4, Access::get, {cell + 1, 1}).to_boolean()) continue;
+        if (grid.invoke(4, Access::get, {cell + 1, 1}).to_boolean(plain_numbers)) continue;
         if (c > 0) text += ',';
-        text += to_ansi(grid.invoke(6, Access::get, cell).to_text());
+        text += to_ansi(grid.invoke(6, Access::get, cell).to_text(plain_numbers));
       }
       text += "\r\n";
     }

@@ -22,12 +22,12 @@ class PlainRepeatedUse final : public RepeatedUse {
 
   void set(std::size_t argument, std::int32_t value) override { arguments_.at(argument) = value; }
   Variant run() override { return object_.invoke(member_, access_, arguments_); }
-  TextView run_text() override {
+  TextView run_text(const Locale& locale) override {
     answer_ = run();
-    if (!answer_.is(Variant::Kind::text)) answer_ = answer_.to_text();
+    if (!answer_.is(Variant::Kind::text)) answer_ = answer_.to_text(locale);
     return *answer_.get_if<Text>();
   }
-  bool run_truth() override { return bool(run().to_boolean()); }
+  bool run_truth(const Locale& locale) override { return bool(run().to_boolean(locale)); }
 
  private:
   Object& object_;
@@ -51,9 +51,9 @@ std::unique_ptr<RepeatedUse> Object::repeat(std::int32_t member, Access access, 
   return std::make_unique<PlainRepeatedUse>(*this, member, access, arguments);
 }
 
-Control::Control(const Variant& holder) : Control(object_in(holder)) {}
+Control::Control(const Variant& holder, const Locale& locale) : Control(object_in(holder), locale) {}
 
-Control::Control(ObjectRef object) : object_(std::move(object)) {
+Control::Control(ObjectRef object, const Locale& locale) : object_(std::move(object)), locale_(locale) {
   if (!object_) raise(ErrorNumber::object_variable_not_set);
 }
 

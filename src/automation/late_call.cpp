@@ -76,18 +76,19 @@ constexpr struct {
 }  // namespace
 
 template <>
-SystemTime convert(const Variant& value, const Locale& /*locale*/) {
+SystemTime convert(const Variant& value, const Locale& locale) {
   if (const auto* const record = value.get_if<SystemTime>()) return *record;
   if (!value.is(Variant::Kind::object)) raise(ErrorNumber::type_mismatch);
-  const Control object(value);
+  const Control object(value, locale);
   SystemTime time;
   for (const auto& [name, field] : record_fields) time.*field = object.get<std::int16_t>(name);
   return time;
 }
 
-void detail::put_changed_fields(const Variant& holder, const SystemTime& before, const SystemTime& after) {
+void detail::put_changed_fields(const Variant& holder, const SystemTime& before, const SystemTime& after,
+                                const Locale& locale) {
   if (!holder.is(Variant::Kind::object)) return;
-  const Control object(holder);
+  const Control object(holder, locale);
   for (const auto& [name, field] : record_fields) {
     if (after.*field != before.*field) object.put(name, after.*field);
   }

@@ -64,7 +64,7 @@ SystemTime convert(const Variant& value, const Locale& locale);
 namespace detail {
 
 /// Puts the fields that differ to an object that stands for a record; nothing for a record itself.
-void put_changed_fields(const Variant& holder, const SystemTime& before, const SystemTime& after);
+void put_changed_fields(const Variant& holder, const SystemTime& before, const SystemTime& after, const Locale& locale);
 
 /// One parameter during a call: the argument's own value where its type fits, else a converted copy.
 template <class A>
@@ -77,6 +77,7 @@ class Cell {
   void bind(std::span<Argument> arguments, std::size_t place, const Locale& locale) {
     Argument& argument = arguments[place];
     argument_ = &argument;
+    locale_ = &locale;
     if constexpr (std::is_same_v<T, Variant>) {
       const auto first = argument.same_variable_as;
       used_ = is_written_back && first >= 0 ? &arguments[static_cast<std::size_t>(first)].value : &argument.value;
@@ -91,7 +92,7 @@ class Cell {
 
   /// An object that stands for a record gets what the member wrote while errors can still be told.
   void give_back() {
-    if constexpr (is_record) put_changed_fields(argument_->value, before_, *used_);
+    if constexpr (is_record) put_changed_fields(argument_->value, before_, *used_, *locale_);
   }
 
   /// What the member wrote is kept however it ended.
@@ -112,6 +113,7 @@ class Cell {
   struct Nothing {};
 
   Argument* argument_ = nullptr;
+  const Locale* locale_ = nullptr;
   T* used_ = nullptr;
   T converted_{};
   [[no_unique_address]] std::conditional_t<is_written_back, T, Nothing> before_{};

@@ -28,4 +28,7 @@ struct Locale {
   }
 };
 
+/// Numbers as settings keep them and as leading_number reads them, whoever the user is: with a full stop.
+inline constexpr Locale plain_numbers{};
+
 }  // namespace talutil

@@ -6,6 +6,7 @@
 #include <optional>
 #include <span>
 
+#include "automation/locale.hpp"
 #include "automation/text.hpp"
 
 namespace talutil {
@@ -32,8 +33,8 @@ class RepeatedUse {
   virtual Variant run() = 0;
 
   /// The same with the answer as a text, or as a truth; these raise what the conversions of Variant raise.
-  virtual TextView run_text() = 0;
-  virtual bool run_truth() = 0;
+  virtual TextView run_text(const Locale& locale) = 0;
+  virtual bool run_truth(const Locale& locale) = 0;
 };
 
 /// A late-bound automation object: a control of ours, or one of the host's. Members are named or given by

@@ -173,6 +173,7 @@ bool Variant::equals_text(TextView text, const Locale& locale) const {
 }
 
 std::partial_ordering compare(const Variant& a, const Variant& b) {
+  constexpr Locale any;  // No text is read as a number, and no number is written.
   const Variant left = a.value();
   const Variant right = b.value();
   if (left.is(Variant::Kind::null) || right.is(Variant::Kind::null)) return std::partial_ordering::unordered;
@@ -181,9 +182,9 @@ std::partial_ordering compare(const Variant& a, const Variant& b) {
     return value.is(Variant::Kind::text) || value.is(Variant::Kind::empty);
   };
   if ((is_text[0] || is_text[1]) && empty_or_text(left) && empty_or_text(right))
-    return left.to_text() <=> right.to_text();
+    return left.to_text(any) <=> right.to_text(any);
   // Asked for also beside a text, which it comes before: what is no number is refused.
-  const double numbers[] = {is_text[0] ? 1 : left.to_double(), is_text[1] ? 1 : right.to_double()};
+  const double numbers[] = {is_text[0] ? 1 : left.to_double(any), is_text[1] ? 1 : right.to_double(any)};
   if (is_text[0]) return std::partial_ordering::greater;
   if (is_text[1]) return std::partial_ordering::less;
   return numbers[0] <=> numbers[1];

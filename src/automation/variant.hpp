@@ -114,30 +114,30 @@ class Variant {
   /// for an empty object reference and 438 for an object without a default member.
   [[nodiscard]] Variant value() const;
 
-  [[nodiscard]] Text to_text(const Locale& locale = {}) const;
-  [[nodiscard]] std::int16_t to_int16(const Locale& locale = {}) const;
-  [[nodiscard]] std::int32_t to_int32(const Locale& locale = {}) const;
-  [[nodiscard]] float to_single(const Locale& locale = {}) const;
-  [[nodiscard]] double to_double(const Locale& locale = {}) const;
-  [[nodiscard]] Currency to_currency(const Locale& locale = {}) const;
-  [[nodiscard]] Boolean to_boolean(const Locale& locale = {}) const;
+  [[nodiscard]] Text to_text(const Locale& locale) const;
+  [[nodiscard]] std::int16_t to_int16(const Locale& locale) const;
+  [[nodiscard]] std::int32_t to_int32(const Locale& locale) const;
+  [[nodiscard]] float to_single(const Locale& locale) const;
+  [[nodiscard]] double to_double(const Locale& locale) const;
+  [[nodiscard]] Currency to_currency(const Locale& locale) const;
+  [[nodiscard]] Boolean to_boolean(const Locale& locale) const;
 
   /// Text is read day first. Numbers are days.
-  [[nodiscard]] Date to_date(const Locale& locale = {}) const;
+  [[nodiscard]] Date to_date(const Locale& locale) const;
 
   /// True for a date and for a text that reads as one; never for a number, Null or Empty.
-  [[nodiscard]] bool is_date(const Locale& locale = {}) const;
+  [[nodiscard]] bool is_date(const Locale& locale) const;
 
   /// True for Null itself (an object answers for its default member).
   [[nodiscard]] bool is_null() const;
 
   /// Compares with a text, code by code, as hosts compare a variant with a text: every kind is converted to
   /// text first, Empty equals the empty text, Null equals nothing. Raises 13 for an error value or an array.
-  [[nodiscard]] bool equals_text(TextView text, const Locale& locale = {}) const;
+  [[nodiscard]] bool equals_text(TextView text, const Locale& locale) const;
 
   /// Compares with a number, as hosts compare a variant with one: a text counts as the number that it reads as
   /// (raises 13 for one that reads as none), Empty as 0; Null equals nothing.
-  [[nodiscard]] bool equals_number(double number, const Locale& locale = {}) const;
+  [[nodiscard]] bool equals_number(double number, const Locale& locale) const;
 
   /// Same kind and same value; objects by identity.
   friend bool operator==(const Variant&, const Variant&) = default;
@@ -162,9 +162,9 @@ inline constexpr ErrorValue missing_argument{static_cast<std::int32_t>(0x8002000
 /// lives, which is that of a member's call; the reference to the object is kept as long.
 class Control {
  public:
-  /// Raises 424 for a variant that holds no object, 91 for an empty reference.
-  explicit Control(const Variant& holder);
-  explicit Control(ObjectRef object);
+  /// Answers are converted by the locale. Raises 424 for a variant that holds no object, 91 for an empty reference.
+  Control(const Variant& holder, const Locale& locale);
+  Control(ObjectRef object, const Locale& locale);
 
   /// A member that the object lacks raises 438, here and below.
   template <class T = Variant>
@@ -190,6 +190,7 @@ class Control {
   [[nodiscard]] bool answers(TextView member) const;
 
   [[nodiscard]] const ObjectRef& object() const noexcept { return object_; }
+  [[nodiscard]] const Locale& locale() const noexcept { return locale_; }
 
  private:
   struct Known {
@@ -201,6 +202,7 @@ class Control {
   [[nodiscard]] std::int32_t identifier_of(TextView member) const;
 
   ObjectRef object_;
+  Locale locale_;
   mutable std::vector<Known> known_;
 };
 
@@ -210,17 +212,17 @@ T Control::get(std::int32_t member, std::initializer_list<Variant> indexes) cons
   if constexpr (std::is_same_v<T, Variant>)
     return value;
   else if constexpr (std::is_same_v<T, Text>)
-    return value.to_text();
+    return value.to_text(locale_);
   else if constexpr (std::is_same_v<T, Boolean>)
-    return value.to_boolean();
+    return value.to_boolean(locale_);
   else if constexpr (std::is_same_v<T, std::int16_t>)
-    return value.to_int16();
+    return value.to_int16(locale_);
   else if constexpr (std::is_same_v<T, std::int32_t>)
-    return value.to_int32();
+    return value.to_int32(locale_);
   else if constexpr (std::is_same_v<T, float>)
-    return value.to_single();
+    return value.to_single(locale_);
   else
-    return value.to_double();
+    return value.to_double(locale_);
 }
 
 }  // namespace talutil

@@ -145,7 +145,7 @@ std::string signature(const Entry& entry) {
 
 std::string default_words(const Parameter& parameter) {
   if (!parameter.is_optional) return {};
-  const std::string text = to_utf8(parameter.default_value().to_text());
+  const std::string text = to_utf8(parameter.default_value().to_text(plain_numbers));
   return parameter.type == ValueType::text ? '"' + text + '"' : text;
 }
 

@@ -66,8 +66,8 @@ void export_table(const ExportOptions& options) {
   if (!options.rows.empty()) select_rows(*source, options);
 
   on_file(options.output, [&] {
-    const Control grid{ObjectRef(source)};
-    const Control scratch{ObjectRef(std::make_shared<Grid>(platform.platform()))};
+    const Control grid(source, platform.computer.locale());
+    const Control scratch(std::make_shared<Grid>(platform.platform()), platform.computer.locale());
     GridExport work(grid, scratch);
     if (options.rows.empty())
       work.copy_all_rows(0);

@@ -17,7 +17,7 @@ std::string parameter_json(const Parameter& parameter) {
                                   {"type", json::text(type_name(parameter.type))},
                                   {"written_back", flag(parameter.passing == Passing::written_back)},
                                   {"optional", flag(parameter.is_optional)}};
-  if (parameter.is_optional) fields.emplace_back("default", json::value(parameter.default_value(), Locale{}));
+  if (parameter.is_optional) fields.emplace_back("default", json::value(parameter.default_value(), plain_numbers));
   return json::object(fields);
 }
 

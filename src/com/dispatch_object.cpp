@@ -102,16 +102,16 @@ class DispatchUse final : public RepeatedUse {
     return V_VT(&result_) == VT_EMPTY ? Variant() : variant_from(result_);
   }
 
-  TextView run_text() override {
+  TextView run_text(const Locale& locale) override {
     invoke();
     if (V_VT(&result_) == VT_BSTR) return win32::view(V_BSTR(&result_), SysStringLen(V_BSTR(&result_)));
-    return converted_ = variant_from(result_).to_text();
+    return converted_ = variant_from(result_).to_text(locale);
   }
 
-  bool run_truth() override {
+  bool run_truth(const Locale& locale) override {
     invoke();
     if (V_VT(&result_) == VT_BOOL) return V_BOOL(&result_) != VARIANT_FALSE;
-    return bool(variant_from(result_).to_boolean());
+    return bool(variant_from(result_).to_boolean(locale));
   }
 
  private:

@@ -12,7 +12,7 @@ class CommonDialog final : public TableObject<CommonDialog> {
   static constexpr std::int32_t cancelled = 32755;
   static constexpr TextView cancelled_description = u"Cancel was selected.";
 
-  explicit CommonDialog(const Platform& platform) : dialogs_(platform.file_dialogs) {}
+  explicit CommonDialog(const Platform& platform) : TableObject(platform), dialogs_(platform.file_dialogs) {}
 
   Text DialogTitle;
   Text Filter;

@@ -26,8 +26,20 @@ class TableObject : public Object {
     if (arguments.size() > given.size()) raise(ErrorNumber::wrong_argument_count);
     for (std::size_t i = 0; i < arguments.size(); ++i) given[i].value = arguments[i];
     return table.call(static_cast<Derived*>(this), table.slot_of(member, access),
-                      std::span(given).first(arguments.size()), Locale{});
+                      std::span(given).first(arguments.size()), locale_);
   }
+
+ protected:
+  /// Values are converted by the locale.
+  explicit TableObject(const Locale& locale) : locale_(locale) {}
+
+  /// By the user's separators.
+  explicit TableObject(const Platform& platform) : TableObject(platform.computer.locale()) {}
+
+  [[nodiscard]] const Locale& locale() const noexcept { return locale_; }
+
+ private:
+  Locale locale_;
 };
 
 }  // namespace talutil

@@ -20,7 +20,9 @@ T opened(std::optional<T> result) {
   return std::move(*result);
 }
 
-Variant data_object(Bytes bytes) { return ObjectRef(std::make_shared<CryptoData>(std::move(bytes))); }
+Variant data_object(Bytes bytes, const Locale& locale) {
+  return ObjectRef(std::make_shared<CryptoData>(std::move(bytes), locale));
+}
 
 }  // namespace
 
@@ -42,11 +44,12 @@ Variant CryptoKey::Encrypt(const std::int32_t& Algorithm, const Variant& Data, c
   const Bytes& plain = checked_input(Algorithm, Data, Final);
   Cryptography::Nonce nonce{};
   platform_.random_source.fill(nonce);
-  return data_object(cipher_text::seal(plain, key_, nonce, platform_.cryptography));
+  return data_object(cipher_text::seal(plain, key_, nonce, platform_.cryptography), locale());
 }
 
 Variant CryptoKey::Decrypt(const std::int32_t& Algorithm, const Variant& Data, const Boolean& Final) const {
-  return data_object(opened(cipher_text::open(checked_input(Algorithm, Data, Final), key_, platform_.cryptography)));
+  return data_object(opened(cipher_text::open(checked_input(Algorithm, Data, Final), key_, platform_.cryptography)),
+                     locale());
 }
 
 Variant Crypto::CreateKey(const Text& PassPhrase, const std::int32_t& KeyBits, const std::int32_t& Derivation) const {
@@ -55,9 +58,9 @@ Variant Crypto::CreateKey(const Text& PassPhrase, const std::int32_t& KeyBits, c
 }
 
 Variant Crypto::CreateData(const Text& Source, const std::int32_t& Format) const {
-  if (Format == CryptoData::encoded) return data_object(opened(cipher_text::decode(Source)));
+  if (Format == CryptoData::encoded) return data_object(opened(cipher_text::decode(Source)), locale());
   require(Format == CryptoData::plain);
-  return data_object(cipher_text::to_bytes(Source));
+  return data_object(cipher_text::to_bytes(Source), locale());
 }
 
 }  // namespace talutil

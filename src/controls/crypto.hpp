@@ -11,7 +11,7 @@ class CryptoData final : public TableObject<CryptoData> {
   static constexpr std::int32_t encoded = 1;  ///< Base64
   static constexpr std::int32_t plain = 3;    ///< The code units of a text
 
-  explicit CryptoData(Bytes bytes) noexcept : bytes_(std::move(bytes)) {}
+  CryptoData(Bytes bytes, const Locale& locale) : TableObject(locale), bytes_(std::move(bytes)) {}
 
   /// The data in one of the forms. Raises 5 for another code and for bytes that have no such form.
   [[nodiscard]] Text Read(const std::int32_t& Format) const;
@@ -30,7 +30,8 @@ class CryptoKey final : public TableObject<CryptoKey> {
   static constexpr std::int32_t no_padding = 2;    ///< The mode needs none
   static constexpr std::int32_t aes = 9;           ///< AES with the key's 256 bits
 
-  CryptoKey(const Platform& platform, const Cryptography::Key& key) : platform_(platform), key_(key) {}
+  CryptoKey(const Platform& platform, const Cryptography::Key& key)
+      : TableObject(platform), platform_(platform), key_(key) {}
 
   std::int32_t Mode = 0;
   std::int32_t Padding = 0;
@@ -56,7 +57,7 @@ class Crypto final : public TableObject<Crypto> {
   static constexpr std::int32_t key_bits = 256;
   static constexpr std::int32_t from_pass_phrase = 1;
 
-  explicit Crypto(const Platform& platform) : platform_(platform) {}
+  explicit Crypto(const Platform& platform) : TableObject(platform), platform_(platform) {}
 
   /// A key object. Raises 5 for any KeyBits but 256 and any Derivation but 1, a pass phrase.
   [[nodiscard]] Variant CreateKey(const Text& PassPhrase, const std::int32_t& KeyBits,

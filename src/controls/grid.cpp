@@ -33,9 +33,9 @@ constexpr char16_t separator_of(Grid::Format format) noexcept {
   return format == Grid::Format::tab_text ? u'\t' : u',';
 }
 
-bool is_true(TextView text) {
+bool is_true(TextView text, const Locale& locale) {
   if (equals_without_case(text, u"True")) return true;
-  return text_to_number(text).value_or(0) != 0;
+  return text_to_number(text, locale).value_or(0) != 0;
 }
 
 }  // namespace
@@ -124,13 +124,13 @@ Variant Grid::Cell(std::int16_t setting, std::int32_t row, std::int32_t column) 
   if (setting == text_setting) return text;
   if (setting != check_box_setting) raise(ErrorNumber::invalid_procedure_call);
   if (at(column).data_type != boolean_type) return no_check_box;
-  return is_true(text) ? ticked : not_ticked;
+  return is_true(text, locale()) ? ticked : not_ticked;
 }
 
 void Grid::put_Cell(std::int16_t setting, std::int32_t row, std::int32_t column, const Variant& value) {
-  if (setting == text_setting) return put_TextMatrix(row, column, value.to_text());
+  if (setting == text_setting) return put_TextMatrix(row, column, value.to_text(locale()));
   if (setting != check_box_setting) raise(ErrorNumber::invalid_procedure_call);
-  const std::int16_t state = value.to_int16();
+  const std::int16_t state = value.to_int16(locale());
   if (state != ticked && state != not_ticked) raise(ErrorNumber::invalid_procedure_call);
   put_TextMatrix(row, column, state == ticked ? u"True" : u"False");
 }

@@ -55,7 +55,7 @@ class Grid final : public TableObject<Grid> {
   static constexpr std::int32_t most_columns = 32767;
   static constexpr std::int32_t default_width = 1000;  ///< In twips.
 
-  explicit Grid(const Platform& platform) : files_(platform.files) {}
+  explicit Grid(const Platform& platform) : TableObject(platform), files_(platform.files) {}
 
   /// The size of the table. Cells that it loses are gone; new ones are empty. Fewer rows or columns than are fixed take
   /// the fixed ones with them. Raise 5 for a negative number and 7 beyond the limits above.

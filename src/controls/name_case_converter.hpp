@@ -10,7 +10,7 @@ class NameCaseConverter final : public TableObject<NameCaseConverter> {
  public:
   static constexpr TextView class_name = u"TALUtil.NameCaseConverter";
 
-  explicit NameCaseConverter(const Platform& /*platform*/) {}
+  explicit NameCaseConverter(const Platform& platform) : TableObject(platform) {}
 
   /// The text in name case, by the rules of name_case.hpp.
   [[nodiscard]] Text NameCase(const Text& Name) const { return name_case(Name); }

@@ -7,7 +7,7 @@ namespace talutil {
 /// The system information control, as far as the library needs it: the name of the computer.
 class SystemInformation final : public TableObject<SystemInformation> {
  public:
-  explicit SystemInformation(const Platform& platform) : computer_(platform.computer) {}
+  explicit SystemInformation(const Platform& platform) : TableObject(platform), computer_(platform.computer) {}
 
   /// Read each time it is asked for.
   [[nodiscard]] Text computer_name() const { return computer_.name(); }

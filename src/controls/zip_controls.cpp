@@ -60,7 +60,7 @@ bool ArchiveControl::watch(std::uint64_t done, std::uint64_t total, TextView nam
   try {
     const std::array<Variant, 3> arguments{static_cast<double>(done), static_cast<double>(total), Variant(name)};
     const Variant answer = kept_alive->invoke(default_member, Access::call, arguments);
-    return answer.to_boolean() == Boolean(false);
+    return answer.to_boolean(platform_.computer.locale()) == Boolean(false);
   } catch (const RunTimeError&) {
     return false;
   }

@@ -69,7 +69,7 @@ class ZipControl final : public TableObject<ZipControl>, public ArchiveControl {
   static constexpr std::int32_t default_level = 6;
   static constexpr std::int32_t default_volume_size = 100'000'000;
 
-  explicit ZipControl(const Platform& platform) : ArchiveControl(platform) {}
+  explicit ZipControl(const Platform& platform) : TableObject(platform), ArchiveControl(platform) {}
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override;
 
@@ -111,7 +111,7 @@ class UnzipControl final : public TableObject<UnzipControl>, public ArchiveContr
   static constexpr std::int32_t extract = 8;
   static constexpr std::int32_t default_largest_ratio = 200;
 
-  explicit UnzipControl(const Platform& platform) : ArchiveControl(platform) {}
+  explicit UnzipControl(const Platform& platform) : TableObject(platform), ArchiveControl(platform) {}
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override;
 

@@ -32,8 +32,9 @@ cControlPosition::~cControlPosition() = default;
 Text cControlPosition::settings_item() const { return number_to_text(ControlID) + u"ControlSize"; }
 
 void cControlPosition::DragControl(const Variant& vForm, const Variant& oCtrl, float X, float Y) {
-  const Control form(vForm);
-  const Control control(oCtrl);
+  const Locale locale = library_.locale();
+  const Control form(vForm, locale);
+  const Control control(oCtrl, locale);
   float across = distance(X, DragStartX);
   float down = distance(Y, DragStartY);
   if (has_scale(control)) {
@@ -42,7 +43,7 @@ void cControlPosition::DragControl(const Variant& vForm, const Variant& oCtrl, f
     down = control.get<float>(u"ScaleY", {down, mode, twips});
   }
   // From the distances as the mouse told them, whatever the control's own scale has made of them.
-  if (const Control container(control.get(u"Container")); has_scale(container)) {
+  if (const Control container(control.get(u"Container"), locale); has_scale(container)) {
     const Variant mode = container.get(u"ScaleMode");
     across = container.get<float>(u"ScaleX", {distance(X, DragStartX), twips, mode});
     down = container.get<float>(u"ScaleY", {distance(Y, DragStartY), twips, mode});

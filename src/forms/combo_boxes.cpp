@@ -31,20 +31,20 @@ std::int32_t select(const Control& combo, const Variant& index) {
 /// Two blanks before the bracket, as users know the message. Null joined with a text is that text.
 void report(const Control& combo, MessageBoxes& boxes) {
   const Variant value = combo.get(u"Text").value();
-  const Text text = value.is_null() ? Text() : value.to_text();
+  const Text text = value.is_null() ? Text() : value.to_text(combo.locale());
   boxes.show(u"The Dropdown List text  ['" + text + u"'] is not a valid selection", MessageButtons::ok, {});
 }
 
 }  // namespace
 
 std::int32_t ORVUtils::GetComboListIndex(const Variant& cboCombo, const std::int32_t& vBranchUniqueID) {
-  const Control combo(cboCombo);
+  const Control combo(cboCombo, locale());
   combo.put(u"Text", u"");
   // Keys are positive; 0 stands for none.
   if (vBranchUniqueID <= 0) return not_found;
   const auto count = combo.get<std::int32_t>(u"ListCount");
   for (std::int32_t i = 0; i < count; ++i) {
-    if (combo.get(u"ItemData", {i}).equals_number(vBranchUniqueID)) return i;
+    if (combo.get(u"ItemData", {i}).equals_number(vBranchUniqueID, combo.locale())) return i;
   }
   return not_found;
 }
@@ -53,7 +53,7 @@ std::int32_t ORVUtils::SearchCombo(const Variant& cboCombo, const std::int16_t& 
   // The control's own method for what users type into it.
   constexpr std::int32_t typed_text_method = 2;
   constexpr std::int16_t remove_commas = 1;
-  const Control combo(cboCombo);
+  const Control combo(cboCombo, locale());
   combo.call(u"Refresh");
   const auto selected = combo.get<std::int16_t>(u"ListIndex");
   const Variant text = combo.get(u"Text");
@@ -62,8 +62,9 @@ std::int32_t ORVUtils::SearchCombo(const Variant& cboCombo, const std::int16_t& 
 
   const Variant found = search(combo, text, typed_text_method);
   // Without the flag the selection stays, and it is the result, not the entry found.
-  const std::int32_t result =
-      found.equals_number(not_found) ? not_found : select(combo, msgFlag == select_found ? found : Variant(selected));
+  const std::int32_t result = found.equals_number(not_found, combo.locale())
+                                  ? not_found
+                                  : select(combo, msgFlag == select_found ? found : Variant(selected));
   if (msgFlag == report_failure && result == not_found) report(combo, library_.platform().message_boxes);
   return result;
 }
@@ -71,9 +72,9 @@ std::int32_t ORVUtils::SearchCombo(const Variant& cboCombo, const std::int16_t& 
 std::int32_t ORVUtils::SearchComboEx(const Variant& cboCombo, const Text& sFind, const std::int32_t& SearchMethod,
                                      const std::int16_t& msgFlag) {
   constexpr std::int16_t first_entry = 0;
-  const Control combo(cboCombo);
+  const Control combo(cboCombo, locale());
   const Variant found = search(combo, sFind, SearchMethod);
-  const std::int32_t result = found.equals_number(not_found)
+  const std::int32_t result = found.equals_number(not_found, combo.locale())
                                   ? not_found
                                   : select(combo, msgFlag == select_found ? found : Variant(first_entry));
   if (msgFlag == report_failure && result == not_found) report(combo, library_.platform().message_boxes);

@@ -51,7 +51,7 @@ std::int32_t ORVUtils::GetMaxPages(const std::int32_t& iRowsPerPage, const std::
 }
 
 void ORVUtils::PrintScreen(const Variant& vForm) {
-  const Control form(vForm);
+  const Control form(vForm, locale());
   WindowPrinting& printing = library_.platform().window_printing;
   printing.configure_printer(form.get<std::int32_t>(u"hwnd"));
   form.call(u"Refresh");
@@ -63,7 +63,7 @@ void ORVUtils::MyDrawText(const std::int16_t& iDestX1, const std::int16_t& iDest
                           const std::int16_t& iJustify, const Boolean& bBold, const Boolean& bWordWrap) {
   const Text text = sText.to_text(locale());
   if (text.empty()) return;
-  const Control box(settings().DrawTextPictureBox);
+  const Control box(settings().DrawTextPictureBox, locale());
   const Restored bold(box, u"FontBold");
   const Restored colour(box, u"ForeColor");
   box.put(u"FontBold", bBold);

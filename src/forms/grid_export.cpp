@@ -42,18 +42,18 @@ void GridExport::copy_rows(std::int32_t first, std::int32_t last) {
     const auto r = static_cast<std::int32_t>(at);
     RepeatedUse& hidden_row = use(row_hidden, u"RowHidden", {r});
     hidden_row.set(0, r);
-    if (hidden_row.run_truth()) continue;
+    if (hidden_row.run_truth(grid_.locale())) continue;
     table_.put(u"Rows", copied_ + 1);
     const auto columns = grid_.get<std::int32_t>(u"Cols");
     std::int32_t k = 0;
     for (std::int32_t c = 0; c < columns; ++c) {
       RepeatedUse& hidden_column = use(column_hidden, u"ColHidden", {c});
       hidden_column.set(0, c);
-      if (hidden_column.run_truth()) continue;
+      if (hidden_column.run_truth(grid_.locale())) continue;
       RepeatedUse& cell = use(text, u"TextMatrix", {r, c});
       cell.set(0, r);
       cell.set(1, c);
-      const TextView shown = cell.run_text();
+      const TextView shown = cell.run_text(grid_.locale());
       if (own_table_ != nullptr)
         own_table_->put_cell(copied_, k, shown);
       else

@@ -32,7 +32,7 @@ void telling_errors(const Platform& platform, TextView member, Work work) {
 }  // namespace
 
 void ORVUtils::LoadGridWidths(const Variant& Grid1, const Text& sCFGStr, const std::int16_t& iStartColumn) {
-  const Control grid(Grid1);
+  const Control grid(Grid1, plain_numbers);
   const auto columns = grid.get<std::int32_t>(u"Cols");
   for (std::int32_t c = iStartColumn; c < columns; ++c) {
     const Text width = GetCfgFileData(sCFGStr, width_item(c), u"1000", settings().sNatNameC, Boolean(false));
@@ -41,7 +41,7 @@ void ORVUtils::LoadGridWidths(const Variant& Grid1, const Text& sCFGStr, const s
 }
 
 void ORVUtils::SaveGridWidths(const Variant& Grid1, const Text& sCFGStr, const std::int16_t& iStartColumn) {
-  const Control grid(Grid1);
+  const Control grid(Grid1, plain_numbers);
   const auto columns = grid.get<std::int32_t>(u"Cols");
   for (std::int32_t c = iStartColumn; c < columns; ++c) {
     Text width = grid.get<Text>(u"ColWidth", {c});
@@ -51,10 +51,10 @@ void ORVUtils::SaveGridWidths(const Variant& Grid1, const Text& sCFGStr, const s
 
 void ORVUtils::SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid, const std::int16_t& iSwitch) {
   telling_errors(library_.platform(), u"SelectGridRows", [&] {
-    const Control grid(vGrid);
+    const Control grid(vGrid, locale());
     const auto rows = grid.get<std::int32_t>(u"Rows");
     const auto first = grid.get<std::int32_t>(u"FixedRows");
-    if (rows <= first || !grid.get(u"ColDataType", {lColumn}).equals_number(boolean_column)) return;
+    if (rows <= first || !grid.get(u"ColDataType", {lColumn}).equals_number(boolean_column, grid.locale())) return;
     if (iSwitch != 0 && iSwitch != 1) return;
     const auto tick = grid.repeated_put(u"TextMatrix", {first, lColumn, Boolean(iSwitch == 1)});
     for (std::int32_t r = first; r < rows; ++r) {
@@ -67,15 +67,15 @@ void ORVUtils::SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid,
 std::int32_t ORVUtils::CountGridSelectedRows(const std::int32_t& lColumn, const Variant& vGrid) {
   std::int32_t count = 0;
   telling_errors(library_.platform(), u"CountGridSelectedRows", [&] {
-    const Control grid(vGrid);
-    if (!grid.get(u"ColDataType", {lColumn}).equals_number(boolean_column)) return;
+    const Control grid(vGrid, locale());
+    if (!grid.get(u"ColDataType", {lColumn}).equals_number(boolean_column, grid.locale())) return;
     const auto rows = grid.get<std::int32_t>(u"Rows");
     const auto first = grid.get<std::int32_t>(u"FixedRows");
     if (rows <= first) return;
     const auto state = grid.repeated_get(u"Cell", {check_box_setting, first, lColumn});
     for (std::int32_t r = first; r < rows; ++r) {
       state->set(1, r);
-      if (state->run().equals_number(ticked)) ++count;
+      if (state->run().equals_number(ticked, grid.locale())) ++count;
     }
   });
   return count;
@@ -84,7 +84,7 @@ std::int32_t ORVUtils::CountGridSelectedRows(const std::int32_t& lColumn, const 
 void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontSaveHeader, const Boolean& bSelection,
                               const Text& sFilename) {
   try {
-    const Control dialog(library_.components().control(u"dlgSave2"));
+    const Control dialog(library_.components().control(u"dlgSave2"), locale());
     // The reports folder closes with a backslash of its own.
     dialog.put(u"InitDir", settings().sReportsDir + sFilename + u'\\');
     VerifyFilePath(dialog.get<Text>(u"InitDir"));
@@ -94,9 +94,9 @@ void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontS
     const Text file = dialog.get<Text>(u"FileName");
     if (file.empty()) return;
 
-    const Control grid(m_Grid1);
+    const Control grid(m_Grid1, locale());
     // A table of this call's own: a host that is asked for a cell may export another grid before it answers.
-    const Control scratch(library_.controls().create(Grid::class_name));
+    const Control scratch(library_.controls().create(Grid::class_name), locale());
     GridExport grid_export(grid, scratch);
     // The sense is as hosts know it: True is every row, from the one that iDontSaveHeader tells.
     if (bSelection.is_exactly_true())

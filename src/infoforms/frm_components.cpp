@@ -38,11 +38,12 @@ void FrmComponents::load() {
   Controls controls;
   std::ranges::transform(places, controls.begin(),
                          [this](const Place& place) { return factory_.create(place.class_name); });
-  const Control dialog(controls[place_of(u"dlgSave2")]);
+  const Locale locale = platform_.computer.locale();
+  const Control dialog(controls[place_of(u"dlgSave2")], locale);
   dialog.put(u"DialogTitle", u"Save Data to File");
   dialog.put(u"Filter", u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");
   dialog.put(u"Flags", file_dialog_flag::overwrite_prompt | file_dialog_flag::hide_read_only);
-  const Control information(controls[place_of(u"MSysInfo1")]);
+  const Control information(controls[place_of(u"MSysInfo1")], locale);
   settings_.ComputerName = information.get<Text>(computer_name_property);
 
   window_ = std::move(window);

@@ -43,7 +43,7 @@ void FrmShKeys::show() {
 }
 
 void FrmShKeys::print() {
-  const Control print(library().controls().create(u"VSPrinter8LibCtl.VSPrinter"));
+  const Control print(library().controls().create(u"VSPrinter8LibCtl.VSPrinter"), library().locale());
   print.call(u"StartDoc");
   print.put(u"Text", load().text(Text1));
   print.call(u"EndDoc");

@@ -50,7 +50,7 @@ class Library {
   /// Takes those off the screen that nobody waits for.
   void close_notices();
 
-  /// The user's separators as they were at start-up, with the current year of the clock.
+  /// The user's separators, with the current year of the clock.
   [[nodiscard]] Locale locale() const;
 
  private:
@@ -58,7 +58,6 @@ class Library {
   SharedSettings settings_;
   WeekTables week_tables_;
   ModZipFiles zip_files_;
-  Locale locale_;
   std::unique_ptr<ControlFactory> controls_;
   std::unique_ptr<FrmComponents> components_;
   std::unique_ptr<FrmPrintPreview> preview_;

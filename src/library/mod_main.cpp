@@ -21,7 +21,6 @@ Library::~Library() = default;
 
 void Library::start() {
   static_cast<void>(out_of_memory_error());
-  locale_ = platform_.computer.locale();
   components_->load();
   settings_.ScreenTwipsPerPixelX = round_to<std::int32_t>(platform_.screen.twips_per_pixel_x());
   settings_.ScreenTwipsPerPixelY = round_to<std::int32_t>(platform_.screen.twips_per_pixel_y());
@@ -55,7 +54,7 @@ void Library::close_notices() {
 }
 
 Locale Library::locale() const {
-  Locale locale = locale_;
+  Locale locale = platform_.computer.locale();
   locale.current_year = parts_of(platform_.clock.now()).year;
   return locale;
 }

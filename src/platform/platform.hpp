@@ -57,7 +57,7 @@ class Computer {
   /// The machine's own name; empty where it has none.
   [[nodiscard]] virtual Text name() = 0;
 
-  /// The user's separators. The year in it is not the platform's to fill.
+  /// The user's separators, as they were when first asked for. The year in it is not the platform's to fill.
   [[nodiscard]] virtual Locale locale() = 0;
 };
 

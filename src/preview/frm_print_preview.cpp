@@ -48,7 +48,7 @@ void silently(Work work) noexcept {
 /// The window as the members that remember windows see it.
 class FrmPrintPreview::FormObject final : public TableObject<FormObject> {
  public:
-  explicit FormObject(PreviewView& view) noexcept : view_(view) {}
+  FormObject(PreviewView& view, const Locale& locale) : TableObject(locale), view_(view) {}
 
   [[nodiscard]] std::int32_t state() const { return view_.window_state(); }
   void set_state(std::int32_t state) { view_.set_window_state(state); }
@@ -78,9 +78,10 @@ void FrmPrintPreview::load() {
   if (is_loaded()) return;
   // Everything is made before anything is kept, so that a control that cannot be made leaves no half window.
   const ControlFactory& controls = library_.controls();
-  auto print = std::make_unique<Control>(controls.create(u"VSPrinter8LibCtl.VSPrinter"));
-  auto dialog = std::make_unique<Control>(controls.create(u"MSComDlg.CommonDialog"));
-  auto pdf = std::make_unique<Control>(controls.create(u"VSPDF8LibCtl.VSPDF8"));
+  const Locale locale = library_.locale();
+  auto print = std::make_unique<Control>(controls.create(u"VSPrinter8LibCtl.VSPrinter"), locale);
+  auto dialog = std::make_unique<Control>(controls.create(u"MSComDlg.CommonDialog"), locale);
+  auto pdf = std::make_unique<Control>(controls.create(u"VSPDF8LibCtl.VSPDF8"), locale);
   dialog->put(u"DialogTitle", u"Save Data to PDF File");
   dialog->put(u"Filter", u"Adobe PDF Format *.pdf|*.pdf");
   pdf->put(u"Subject", u"ORV PDF Data");
@@ -88,7 +89,7 @@ void FrmPrintPreview::load() {
   print_ = std::move(print);
   save_dialog_ = std::move(dialog);
   pdf_export_ = std::move(pdf);
-  form_ = std::make_shared<FormObject>(*view_);
+  form_ = std::make_shared<FormObject>(*view_, locale);
 
   is_loading_ = true;
   utils_ = std::make_unique<ORVUtils>(library_);

@@ -85,7 +85,8 @@ ReportComposer::GridLayout::GridLayout(const Control& grid, const FontStyle& usu
     const auto width = grid.answers(u"ColWidth") ? grid.get<std::int32_t>(u"ColWidth", {c}) : 1000;
     if (width == 0) continue;
     Column column{c, std::clamp(width, 2 * cell_padding, room), false, Alignment::general};
-    column.is_boolean = grid.answers(u"ColDataType") && grid.get(u"ColDataType", {c}).equals_number(boolean_type);
+    column.is_boolean =
+        grid.answers(u"ColDataType") && grid.get(u"ColDataType", {c}).equals_number(boolean_type, grid.locale());
     if (grid.answers(u"ColAlignment")) column.alignment = alignment_of(grid.get<std::int32_t>(u"ColAlignment", {c}));
     columns.push_back(column);
   }
@@ -101,11 +102,11 @@ ReportComposer::GridLayout::GridLayout(const Control& grid, const FontStyle& usu
     for (const Column& column : columns) {
       Cell& cell = cells.emplace_back();
       if (column.is_boolean && r >= fixed_rows) {
-        cell.is_ticked = grid.get(u"Cell", {check_box_setting, r, column.index}).equals_number(1);
+        cell.is_ticked = grid.get(u"Cell", {check_box_setting, r, column.index}).equals_number(1, grid.locale());
         continue;
       }
       text->set(1, column.index);
-      cell.text = text->run_text();
+      cell.text = text->run_text(grid.locale());
     }
   }
 }

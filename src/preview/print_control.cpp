@@ -20,7 +20,8 @@ std::int32_t checked_code(std::int32_t code, std::int32_t most) {
 
 }  // namespace
 
-PrintControl::PrintControl(const Platform& platform) : platform_(platform), metrics_(platform.font_files) {}
+PrintControl::PrintControl(const Platform& platform)
+    : TableObject(platform), platform_(platform), metrics_(platform.font_files) {}
 
 void PrintControl::put_Zoom(float percent) {
   zoom_ = std::isnan(percent) ? zoom_ : std::clamp(percent, smallest_zoom, largest_zoom);
@@ -100,7 +101,7 @@ void PrintControl::TextBox(const Text& text, std::int32_t left, std::int32_t top
 void PrintControl::put_RenderControl(std::int32_t window) {
   const Variant source = std::exchange(RenderObject, {});
   if (const auto* const object = source.get_if<ObjectRef>(); object != nullptr && *object) {
-    const Control grid(*object);
+    const Control grid(*object, locale());
     if (grid.answers(u"Rows") && grid.answers(u"Cols") && grid.answers(u"TextMatrix")) {
       composer().add_grid(grid, {family_of(FontName), false, 8});
       return;

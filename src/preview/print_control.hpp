@@ -111,7 +111,7 @@ class PrintControl final : public TableObject<PrintControl> {
 /// The export of a print control's document to PDF.
 class PdfExport final : public TableObject<PdfExport> {
  public:
-  explicit PdfExport(const Platform& platform) : platform_(platform) {}
+  explicit PdfExport(const Platform& platform) : TableObject(platform), platform_(platform) {}
 
   Text Title;  ///< The document's own where it is empty.
   Text Author = u"TALUtil";

@@ -47,7 +47,8 @@ bool is_unassigned(const Variant& value) { return value.is(Variant::Kind::empty)
 /// Two blanks stand before each part.
 Text grid_header(const Text& report, const Variant& from, const Variant& to, const Locale& locale) {
   const Text name = u"  " + report;
-  if (from.equals_text(u"DateTimeOnly")) return name + u"  " + format_date(to.to_date(locale), u"DD/MM/YYYY HH:MM");
+  if (from.equals_text(u"DateTimeOnly", locale))
+    return name + u"  " + format_date(to.to_date(locale), u"DD/MM/YYYY HH:MM");
   if (is_unassigned(from) || is_unassigned(to)) return name;
   return name + u"  " + format_date(from.to_date(locale), u"DD/MM/YYYY") + u" To " +
          format_date(to.to_date(locale), u"DD/MM/YYYY");
@@ -84,7 +85,7 @@ void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16
   set_up(form, print, {iPrintDirection, sReportName, sCsvName});
   print.put(u"Header", grid_header(sReportName, vStDate, vEnDate, locale()));
 
-  const Control grid(ctlGrid);
+  const Control grid(ctlGrid, locale());
   print.call(u"StartDoc");
   // Ours lays the grid out by asking it; another maker's has its window alone.
   if (print.answers(u"RenderObject")) print.put(u"RenderObject", grid.object());
@@ -102,7 +103,7 @@ void ORVUtils::TextBoxPrintPreview(const std::int16_t& iZoomLevel, const std::in
                                    const Text& sReportName, const Text& sCsvName, const Variant& ctlTextBox) {
   FrmPrintPreview& form = library_.preview();
   const Control& print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
-  print.put(u"Text", Control(ctlTextBox).get<Text>(u"Text"));
+  print.put(u"Text", Control(ctlTextBox, locale()).get<Text>(u"Text"));
   print.call(u"EndDoc");
   form.show_modal();
 }
@@ -113,7 +114,7 @@ void ORVUtils::ListBoxPrintPreview(const std::int16_t& iZoomLevel, const std::in
   constexpr double pitch = 680.4;       // Of which the fraction is lost at every line.
   FrmPrintPreview& form = library_.preview();
   const Control& print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
-  const Control list(ctlListBox);
+  const Control list(ctlListBox, locale());
   const auto count = list.get<std::int32_t>(u"ListCount");
   const auto left = print.get<std::int32_t>(u"MarginLeft");
   const auto top = print.get<std::int32_t>(u"MarginTop");

@@ -150,14 +150,14 @@ void ModZipFiles::unzip(const Control& control, MessageBoxes& boxes, const Text&
 
 void ORVUtils::CallZIPFiles(const Text& sZipName, const Text& sItems, const std::int16_t& iMultiVolume,
                             const Text& sEncryptionPassword, const Boolean& /*bUseFilePath*/) {
-  const Control control(library_.components().control(u"ZipCtrl"));
+  const Control control(library_.components().control(u"ZipCtrl"), locale());
   library_.zip_files().zip(control, library_.platform().message_boxes, sZipName, sItems, iMultiVolume,
                            sEncryptionPassword);
 }
 
 void ORVUtils::CallUnZIPFiles(const Text& sUnZipName, const Text& sDestPath, const Text& sItems,
                               const Boolean& bOverWrite) {
-  const Control control(library_.components().control(u"UnZipCtrl"));
+  const Control control(library_.components().control(u"UnZipCtrl"), locale());
   library_.zip_files().unzip(control, library_.platform().message_boxes, sUnZipName, sDestPath, sItems, bOverWrite);
 }
 

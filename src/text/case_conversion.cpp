@@ -15,8 +15,8 @@ constexpr std::int16_t style_upper = 3;
 
 /// By a converter of its own, which is gone when the caller goes on.
 Text in_name_case(const ORVUtils& utils, const Text& text) {
-  const Control converter(utils.library().controls().create(NameCaseConverter::class_name));
-  return converter.call(u"NameCase", {text}).to_text(utils.locale());
+  const Control converter(utils.library().controls().create(NameCaseConverter::class_name), utils.locale());
+  return converter.call(u"NameCase", {text}).to_text(converter.locale());
 }
 
 bool names_machinery(const Variant& value, const Locale& locale) {

@@ -20,13 +20,14 @@ constexpr std::int32_t plain_text = 3;
 
 /// Puts a text through an operation of the control's key. All objects made on the way are gone afterwards.
 Text transform(const ORVUtils& utils, TextView operation, const Text& source, std::int32_t from, std::int32_t to) {
-  const Control crypto(utils.library().components().control(u"Crypto1"));
-  const Control key(crypto.call(u"CreateKey", {pass_phrase, key_bits, key_derivation}));
+  const Locale locale = utils.locale();
+  const Control crypto(utils.library().components().control(u"Crypto1"), locale);
+  const Control key(crypto.call(u"CreateKey", {pass_phrase, key_bits, key_derivation}), locale);
   key.put(u"Mode", key_mode);
   key.put(u"Padding", key_padding);
-  const Control input(crypto.call(u"CreateData", {source, from}));
-  const Control output(key.call(operation, {algorithm, input.object(), Boolean(true)}));
-  return output.call(u"Read", {to}).to_text(utils.locale());
+  const Control input(crypto.call(u"CreateData", {source, from}), locale);
+  const Control output(key.call(operation, {algorithm, input.object(), Boolean(true)}), locale);
+  return output.call(u"Read", {to}).to_text(locale);
 }
 
 }  // namespace

@@ -100,9 +100,9 @@ TEST(Date, Intervals) {
       {"years", year, -1, u"29/2/2008", "28/02/2007", u"1/1/1899", -109},
   };
   for (const auto& row : rows) {
-    const Date from = Variant(row.from).to_date();
+    const Date from = Variant(row.from).to_date(plain_numbers);
     EXPECT_EQ(outcome([&] { return date_add(row.interval, row.count, from); }), row.added) << row.name;
-    EXPECT_EQ(date_difference(row.interval, from, Variant(row.to).to_date()), row.boundaries) << row.name;
+    EXPECT_EQ(date_difference(row.interval, from, Variant(row.to).to_date(plain_numbers)), row.boundaries) << row.name;
   }
   EXPECT_EQ(outcome([] { return date_add(day, 1, Date{2958465}); }), "error 5");
   EXPECT_EQ(outcome([] { return date_add(month, -1, Date{-657434}); }), "error 5");
@@ -113,7 +113,7 @@ TEST(Date, Intervals) {
 }
 
 TEST(Date, Patterns) {
-  const Date date = Variant(u"5/3/0109 1:02:09").to_date();
+  const Date date = Variant(u"5/3/0109 1:02:09").to_date(plain_numbers);
   EXPECT_EQ(format_date(date, u"d-m-yy yyyy D/M"), u"5-3-09 0109 5/3");
   EXPECT_EQ(format_date(date, u"hh:mm:ss mm, h.n.s (HhMm) nn"), u"01:02:09 03, 1.2.9 (0102) 02");
 }

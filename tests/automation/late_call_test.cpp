@@ -55,7 +55,7 @@ class LateCallTest : public ::testing::Test {
   Variant call(TextView name, Access access, std::vector<Argument> arguments = {}) {
     given_ = std::move(arguments);
     const LateInterface& members = late_interface<Sample>();
-    return members.call(&sample_, members.slot_of(members.identifier_of(name), access), given_, Locale{});
+    return members.call(&sample_, members.slot_of(members.identifier_of(name), access), given_, plain_numbers);
   }
 
   std::int32_t error(TextView name, Access access, std::vector<Argument> arguments = {}) {

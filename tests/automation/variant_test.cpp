@@ -82,21 +82,21 @@ TEST(Variant, Conversions) {
   };
   for (const auto& row : rows) {
     const Variant& value = row.value;
-    EXPECT_EQ(outcome([&] { return value.to_text(); }), row.text) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_double(); }), row.number) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_int16(); }), row.int16) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_currency(); }), row.currency) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_boolean(); }), row.boolean) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_date(); }), row.date) << row.name;
+    EXPECT_EQ(outcome([&] { return value.to_text(plain_numbers); }), row.text) << row.name;
+    EXPECT_EQ(outcome([&] { return value.to_double(plain_numbers); }), row.number) << row.name;
+    EXPECT_EQ(outcome([&] { return value.to_int16(plain_numbers); }), row.int16) << row.name;
+    EXPECT_EQ(outcome([&] { return value.to_currency(plain_numbers); }), row.currency) << row.name;
+    EXPECT_EQ(outcome([&] { return value.to_boolean(plain_numbers); }), row.boolean) << row.name;
+    EXPECT_EQ(outcome([&] { return value.to_date(plain_numbers); }), row.date) << row.name;
   }
 }
 
 TEST(Variant, NarrowConversions) {
-  EXPECT_EQ(Variant(u"&HFFFF").to_int32(), 65535);
-  EXPECT_EQ(outcome([] { return Variant(2147483647.5).to_int32(); }), "error 6");
-  EXPECT_EQ(Variant(Boolean::from_bits(5)).to_boolean().bits(), 5);
-  EXPECT_EQ(outcome([] { return Variant(1e39).to_single(); }), "error 6");
-  EXPECT_EQ(Variant(u"-3.4e38").to_single(), -3.4e38F);
+  EXPECT_EQ(Variant(u"&HFFFF").to_int32(plain_numbers), 65535);
+  EXPECT_EQ(outcome([] { return Variant(2147483647.5).to_int32(plain_numbers); }), "error 6");
+  EXPECT_EQ(Variant(Boolean::from_bits(5)).to_boolean(plain_numbers).bits(), 5);
+  EXPECT_EQ(outcome([] { return Variant(1e39).to_single(plain_numbers); }), "error 6");
+  EXPECT_EQ(Variant(u"-3.4e38").to_single(plain_numbers), -3.4e38F);
   const Locale locale{.decimal_separator = u',', .thousands_separator = u'.', .current_year = 2012};
   EXPECT_EQ(Variant(1.5).to_text(locale), u"1,5");
   EXPECT_EQ(Variant(u"1.234,5").to_double(locale), 1234.5);
@@ -124,12 +124,12 @@ TEST(Variant, Questions) {
       {"error", missing_argument, false, false, "error 13"},
   };
   for (const auto& row : rows) {
-    EXPECT_EQ(row.value.is_date(), row.is_date) << row.name;
+    EXPECT_EQ(row.value.is_date(plain_numbers), row.is_date) << row.name;
     EXPECT_EQ(row.value.is_null(), row.is_null) << row.name;
-    EXPECT_EQ(outcome([&] { return Boolean(row.value.equals_text(u"7")); }), row.equals_7) << row.name;
+    EXPECT_EQ(outcome([&] { return Boolean(row.value.equals_text(u"7", plain_numbers)); }), row.equals_7) << row.name;
   }
-  EXPECT_TRUE(Variant().equals_text(u""));
-  EXPECT_FALSE(Variant(Null{}).equals_text(u""));
+  EXPECT_TRUE(Variant().equals_text(u"", plain_numbers));
+  EXPECT_FALSE(Variant(Null{}).equals_text(u"", plain_numbers));
   EXPECT_EQ(outcome([] { return Boolean(Variant(ObjectRef()).is_null()); }), "error 91");
 }
 
@@ -145,7 +145,7 @@ TEST(Variant, TextArrayBounds) {
 
 TEST(Control, UsesMembersByNameAndIdentifier) {
   const auto holder = std::make_shared<Holder>(u"2.5");
-  const Control control{Variant(ObjectRef(holder))};
+  const Control control(Variant(ObjectRef(holder)), plain_numbers);
   EXPECT_EQ(control.get<std::int32_t>(u"item"), 2);
   EXPECT_EQ(holder->last_member, 7);
   EXPECT_EQ(holder->last_access, Access::get);
@@ -163,8 +163,8 @@ TEST(Control, UsesMembersByNameAndIdentifier) {
   EXPECT_EQ(holder->last_access, Access::call);
 
   EXPECT_EQ(outcome([&] { return control.get(u"Other"); }), "error 438");
-  EXPECT_EQ(outcome([] { return Control(Variant(5)).get(0); }), "error 424");
-  EXPECT_EQ(outcome([] { return Control(Variant(ObjectRef())).get(0); }), "error 91");
+  EXPECT_EQ(outcome([] { return Control(Variant(5), plain_numbers).get(0); }), "error 424");
+  EXPECT_EQ(outcome([] { return Control(Variant(ObjectRef()), plain_numbers).get(0); }), "error 91");
 }
 
 }  // namespace

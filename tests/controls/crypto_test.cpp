@@ -92,9 +92,9 @@ TEST_F(Encryption, WhateverIsWrongWithACipherTextIsOneError) {
 }
 
 TEST_F(Encryption, TheControlKnowsItsCodesAndNoOthers) {
-  const Control crypto(library.components().control(u"Crypto1"));
-  const Control key(crypto.call(u"CreateKey", {u"pass", 256, 1}));
-  const Control data(crypto.call(u"CreateData", {u"text", 3}));
+  const Control crypto(library.components().control(u"Crypto1"), plain_numbers);
+  const Control key(crypto.call(u"CreateKey", {u"pass", 256, 1}), plain_numbers);
+  const Control data(crypto.call(u"CreateData", {u"text", 3}), plain_numbers);
   const Variant input(data.object());
   const auto encrypt = [&](std::int32_t algorithm, const Variant& given, bool final) {
     return error_of([&] { key.call(u"Encrypt", {algorithm, given, Boolean(final)}); });
@@ -112,7 +112,7 @@ TEST_F(Encryption, TheControlKnowsItsCodesAndNoOthers) {
   EXPECT_EQ(error_of([&] { crypto.call(u"CreateData", {u"text", 2}); }), 5);
   EXPECT_EQ(error_of([&] { data.call(u"Read", {2}); }), 5);
   // The key of one pass phrase does not open what that of another has closed.
-  const Control mine(crypto.call(u"CreateData", {vectors[0].cipher, 1}));
+  const Control mine(crypto.call(u"CreateData", {vectors[0].cipher, 1}), plain_numbers);
   EXPECT_EQ(error_of([&] { key.call(u"Decrypt", {9, mine.object(), Boolean(true)}); }), 5);
 }
 

@@ -22,7 +22,7 @@ struct Grids : ::testing::Test {
   Library library{platform.platform()};
   ORVUtils utils{library};
   std::shared_ptr<Grid> grid = std::make_shared<Grid>(library.platform());
-  Control control{ObjectRef(grid)};
+  Control control{grid, library.locale()};
 
   /// A table of texts "r,c".
   void fill(std::int32_t rows, std::int32_t columns) {
@@ -241,8 +241,27 @@ TEST_F(Grids, ExportsReadTheGridInOrder) {
   EXPECT_FALSE(platform.files.files.contains(u"C:\\none.txt")) << "and fails silently";
 }
 
+TEST_F(Grids, ConvertByTheUsersSeparators) {
+  platform.separators = {.decimal_separator = u',', .thousands_separator = u'.'};
+  library.start();
+  const Control theirs(std::make_shared<Grid>(library.platform()), library.locale());
+  theirs.put(u"Rows", 1);
+  theirs.put(u"Cols", 1);
+  theirs.put(u"ColWidth", {0}, u"1000,4");
+  EXPECT_EQ(theirs.get(u"ColWidth", {0}), Variant(1000));
+  theirs.put(u"TextMatrix", {0, 0}, 1.5);
+  EXPECT_EQ(theirs.get(u"TextMatrix", {0, 0}), Variant(u"1,5"));
+  EXPECT_EQ(theirs.get<float>(u"TextMatrix", {0, 0}), 1.5F);
+
+  const auto host = std::make_shared<RecordingControl>();
+  host->values = {{"Cols", 1}, {"ColWidth(0&)", 240.5}};
+  utils.SaveGridWidths(ObjectRef(host), u"Grid", 0);
+  utils.LoadGridWidths(ObjectRef(host), u"Grid", 0);
+  EXPECT_EQ(host->values["ColWidth(0&)"], Variant(240.5)) << "kept as whoever reads it back does";
+}
+
 TEST_F(Grids, DialogsTellOfACancelOnlyWhenAsked) {
-  const Control dialog(library.components().control(u"Open1"));
+  const Control dialog(library.components().control(u"Open1"), plain_numbers);
   dialog.put(u"FileName", u"a.txt");
   dialog.call(u"ShowOpen");
   EXPECT_EQ(dialog.get<Text>(u"FileName"), u"a.txt");

@@ -224,7 +224,7 @@ class FieldsObject final : public Object {
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
     auto& [name, value] = *std::next(fields.begin(), member - 1);
     if (access == Access::get) return value;
-    value = arguments[0].to_int16();
+    value = arguments[0].to_int16(plain_numbers);
     puts.push_back(name);
     return {};
   }
@@ -236,11 +236,11 @@ TEST_F(DateMembers, ObjectsStandForRecords) {
                     {u"wHour", 9},    {u"wMinute", 0}, {u"wSecond", 0}, {u"wMilliseconds", 88}};
   const LateInterface& members = late_interface<ORVUtils>();
   const auto use = [&](TextView member, std::vector<Argument> arguments) {
-    members.call(&utils, members.slot_of(members.identifier_of(member), Access::call), arguments, Locale{});
+    members.call(&utils, members.slot_of(members.identifier_of(member), Access::call), arguments, plain_numbers);
     return arguments;
   };
   const Variant holder = ObjectRef(object);
-  EXPECT_EQ(use(u"SystemTimeToDate", {holder, Variant()})[1].value.to_text(), u"31/03/2009 09:00");
+  EXPECT_EQ(use(u"SystemTimeToDate", {holder, Variant()})[1].value.to_text(plain_numbers), u"31/03/2009 09:00");
   const auto after = use(u"DateToSystemTime", {Variant(u"5/3/2009 13:00"), holder});
   EXPECT_EQ(object->puts, (std::vector<Text>{u"wDay", u"wHour"}));
   EXPECT_EQ(object->fields[u"wHour"], 13);

@@ -47,14 +47,14 @@ class LateMembers : public ::testing::Test {
     if (written == u"@null") return Null{};
     if (written == u"@empty") return {};
     if (written == u"@error") return ErrorValue{5};
-    if (written.starts_with(u'=')) return Variant(written.substr(1)).to_double();
-    if (written.starts_with(u'#')) return Variant(written.substr(1, written.size() - 2)).to_date();
+    if (written.starts_with(u'=')) return Variant(written.substr(1)).to_double(plain_numbers);
+    if (written.starts_with(u'#')) return Variant(written.substr(1, written.size() - 2)).to_date(plain_numbers);
     return written;
   }
 
   static std::string shown(const Variant& value) {
     if (value.is(Variant::Kind::empty)) return "Empty";
-    const std::string text = to_utf8(value.to_text());
+    const std::string text = to_utf8(value.to_text(plain_numbers));
     return value.is(Variant::Kind::date) ? "#" + text + "#" : text;
   }
 };

@@ -17,7 +17,7 @@ inline std::string shown(const Variant& value) {
   if (value.is(Variant::Kind::null)) return "Null";
   if (value.is(Variant::Kind::empty)) return "Empty";
   if (value.is(Variant::Kind::object)) return "an object";
-  const std::string text = to_utf8(value.to_text());
+  const std::string text = to_utf8(value.to_text(plain_numbers));
   switch (value.kind()) {
     case Variant::Kind::text:
       return '"' + text + '"';

@@ -123,7 +123,7 @@ TEST_F(LibraryTest, EveryPendingMemberAnswers445AndNoOther) {
       arguments.emplace_back(parameter.type == ValueType::text_array ? Variant() : Variant(std::int16_t{0}));
     }
     const std::int32_t number =
-        error_of([&] { members.call(&utils, static_cast<std::int32_t>(slot), arguments, Locale{}); });
+        error_of([&] { members.call(&utils, static_cast<std::int32_t>(slot), arguments, plain_numbers); });
     EXPECT_EQ(number == 445, member.is_pending) << member.name;
   }
 }
@@ -149,13 +149,13 @@ TEST_F(LibraryTest, AControlThatFailsLeavesNoHalfWindow) {
 
 TEST_F(LibraryTest, ControlsOfTheComponentsWindow) {
   FrmComponents& form = library.components();
-  EXPECT_EQ(Control(form.control(u"dlgSave2")).get<Text>(u"dialogtitle"), u"Save Data to File");
-  EXPECT_EQ(Control(form.control(u"dlgSave2")).get<Text>(u"Filter"),
+  EXPECT_EQ(Control(form.control(u"dlgSave2"), plain_numbers).get<Text>(u"dialogtitle"), u"Save Data to File");
+  EXPECT_EQ(Control(form.control(u"dlgSave2"), plain_numbers).get<Text>(u"Filter"),
             u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");
-  EXPECT_EQ(Control(form.control(u"Open1")).get<Text>(u"Filter"), u"");
-  EXPECT_EQ(Control(form.control(u"MSysInfo1")).get<Text>(u"ComputerName"), u"FAKEPC");
+  EXPECT_EQ(Control(form.control(u"Open1"), plain_numbers).get<Text>(u"Filter"), u"");
+  EXPECT_EQ(Control(form.control(u"MSysInfo1"), plain_numbers).get<Text>(u"ComputerName"), u"FAKEPC");
   for (const TextView name : {u"Crypto1", u"Grid1", u"UnZipCtrl", u"ZipCtrl"}) {
-    EXPECT_EQ(error_of([&] { Control(form.control(name)).call(u"Anything"); }), 438) << to_utf8(name);
+    EXPECT_EQ(error_of([&] { Control(form.control(name), plain_numbers).call(u"Anything"); }), 438) << to_utf8(name);
   }
   EXPECT_EQ(error_of([&] { static_cast<void>(form.control(u"Label1")); }), 438);
   EXPECT_EQ(form.owner_handle(), platform.window_handle);

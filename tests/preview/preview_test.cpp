@@ -57,7 +57,7 @@ struct Builders : Preview {
 
   std::string header_of(const Variant& from, const Variant& to) {
     utils.GridPrintPreview(100, 1, u"Sales", u"C:\\x", holder, from, to, u"Cap");
-    return to_utf8(print->values["Header"].to_text());
+    return to_utf8(print->values["Header"].to_text(plain_numbers));
   }
 };
 

@@ -26,7 +26,8 @@ struct RecordingArchiveControl final : Object {
     if (access == Access::put) {
       const Variant& value = arguments.front();
       const std::string mark = value.is(Variant::Kind::text) ? "\"" : value.is(Variant::Kind::int16) ? "%" : "";
-      uses.push_back(std::to_string(member) + "=" + (mark == "%" ? "" : mark) + to_utf8(value.to_text()) + mark);
+      uses.push_back(std::to_string(member) + "=" + (mark == "%" ? "" : mark) + to_utf8(value.to_text(plain_numbers)) +
+                     mark);
       return {};
     }
     uses.push_back("get " + std::to_string(member));
@@ -154,7 +155,7 @@ struct Handler final : Object {
 TEST_F(ZipFilesTest, ControlsTellOfTheirProgress) {
   write_file(folder, u"a.txt", "first");
   auto own = std::make_shared<ZipControl>(library.platform());
-  const Control control{ObjectRef(own)};
+  const Control control(own, plain_numbers);
   const auto handler = std::make_shared<Handler>();
   control.put(u"ZIPFile", folder + u"a.zip");
   control.put(u"ItemList", folder + u"a.txt");
@@ -193,7 +194,7 @@ TEST_F(ZipFilesTest, TheUnzipControlLooksAndTests) {
   write_file(folder, u"a.txt", "first");
   zip(folder + u"a.zip", folder + u"*.*");
   auto own = std::make_shared<UnzipControl>(library.platform());
-  const Control control{ObjectRef(own)};
+  const Control control(own, plain_numbers);
   control.put(UnzipControl::archive_name, folder + u"a.zip");
   for (const std::int32_t action : {UnzipControl::look, UnzipControl::test}) {
     control.put(UnzipControl::action, action);

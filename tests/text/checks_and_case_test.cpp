@@ -130,7 +130,7 @@ class ForeignConverter final : public Object {
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
     EXPECT_TRUE(member == 1 && access == Access::call && arguments.size() == 1);
     if (fails) throw RunTimeError(1234, u"theirs");
-    return Variant(u"<" + arguments[0].to_text() + u">");
+    return Variant(u"<" + arguments[0].to_text(plain_numbers) + u">");
   }
   bool fails = false;
 };

@@ -46,6 +46,26 @@ class Window final : public HiddenWindow {
   [[nodiscard]] std::intptr_t handle() override { return 0; }
 };
 
+Locale environment_locale() {
+  Locale result;
+  const LocaleHandle environment(newlocale(LC_CTYPE_MASK | LC_NUMERIC_MASK | LC_MONETARY_MASK, "", nullptr));
+  // An environment that names a locale the machine does not have.
+  if (!environment) return result;
+  const auto item = [&](nl_item wanted) { return std::string_view(nl_langinfo_l(wanted, environment.get())); };
+
+  result.decimal_separator = first_character(item(RADIXCHAR), result.decimal_separator);
+  result.thousands_separator = first_character(item(THOUSEP), result.thousands_separator);
+  // Some locales have a decimal comma and no thousands separator; one character cannot be both.
+  if (result.thousands_separator == result.decimal_separator) {
+    result.thousands_separator = result.decimal_separator == u',' ? u'.' : u',';
+  }
+  // The first character tells the symbol's place.
+  if (const auto currency = item(CRNCYSTR); !currency.empty()) {
+    result.set_currency(from_utf8(currency.substr(1)));
+  }
+  return result;
+}
+
 }  // namespace
 
 MessageAnswer PosixMessageBoxes::show(TextView text, MessageButtons buttons, TextView title) {
@@ -64,23 +84,8 @@ Text PosixComputer::name() {
 }
 
 Locale PosixComputer::locale() {
-  Locale result;
-  const LocaleHandle environment(newlocale(LC_CTYPE_MASK | LC_NUMERIC_MASK | LC_MONETARY_MASK, "", nullptr));
-  // An environment that names a locale the machine does not have.
-  if (!environment) return result;
-  const auto item = [&](nl_item wanted) { return std::string_view(nl_langinfo_l(wanted, environment.get())); };
-
-  result.decimal_separator = first_character(item(RADIXCHAR), result.decimal_separator);
-  result.thousands_separator = first_character(item(THOUSEP), result.thousands_separator);
-  // Some locales have a decimal comma and no thousands separator; one character cannot be both.
-  if (result.thousands_separator == result.decimal_separator) {
-    result.thousands_separator = result.decimal_separator == u',' ? u'.' : u',';
-  }
-  // The first character tells the symbol's place.
-  if (const auto currency = item(CRNCYSTR); !currency.empty()) {
-    result.set_currency(from_utf8(currency.substr(1)));
-  }
-  return result;
+  if (!locale_) locale_ = environment_locale();
+  return *locale_;
 }
 
 Date PosixClock::now() {

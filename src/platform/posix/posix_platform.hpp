@@ -1,5 +1,7 @@
 #pragma once
 
+#include <optional>
+
 #include "platform/platform.hpp"
 #include "platform/posix/posix_cryptography.hpp"
 #include "platform/posix/posix_file_dialogs.hpp"
@@ -40,6 +42,9 @@ class PosixComputer final : public Computer {
 
   /// From the environment (LC_ALL, LC_NUMERIC and so on); what it leaves open is as in the standard locale.
   Locale locale() override;
+
+ private:
+  std::optional<Locale> locale_;
 };
 
 class PosixClock final : public Clock {

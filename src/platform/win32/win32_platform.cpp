@@ -99,11 +99,12 @@ Text Win32Computer::name() {
 }
 
 Locale Win32Computer::locale() {
-  const Locale standard;
+  if (locale_) return *locale_;
   Locale result;
-  result.decimal_separator = user_character(LOCALE_SDECIMAL, standard.decimal_separator);
-  result.thousands_separator = user_character(LOCALE_STHOUSAND, standard.thousands_separator);
+  result.decimal_separator = user_character(LOCALE_SDECIMAL, result.decimal_separator);
+  result.thousands_separator = user_character(LOCALE_STHOUSAND, result.thousands_separator);
   result.set_currency(user_setting(LOCALE_SCURRENCY));
+  locale_ = result;
   return result;
 }
 

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <optional>
+
 #include "platform/platform.hpp"
 
 namespace talutil::win32 {
@@ -20,6 +22,9 @@ class Win32Computer final : public Computer {
  public:
   Text name() override;
   Locale locale() override;
+
+ private:
+  std::optional<Locale> locale_;
 };
 
 class Win32Clock final : public Clock {

@@ -59,7 +59,7 @@ TEST_F(PosixZones, TodaysOffsetCountsForEveryDate) {
     localtime_r(&now, &local);
     const std::int32_t minutes = local.tm_isdst > 0 ? row.summer_minutes : row.standard_minutes;
     for (const TextView text : {u"05/01/2009 13:45", u"05/07/2009 13:45", u"31/12/1700 23:59"}) {
-      const Date date = Variant(text).to_date();
+      const Date date = Variant(text).to_date(plain_numbers);
       const Date utc = date_add(DateInterval::minute, -minutes, date);
       EXPECT_EQ(date_to_text(utils.LocalTimeToUTC(date)), date_to_text(utc)) << row.name;
       EXPECT_EQ(date_to_text(utils.UTCToLocalTime(utc)), date_to_text(date)) << row.name;
