@@ -57,7 +57,8 @@ ObjectRef convert(const Variant& value, const Locale& /*locale*/) {
 
 ObjectRef object_of_kind(const Variant& value, ObjectKind is_of_kind) {
   auto object = convert<ObjectRef>(value, {});
-  if (object != nullptr && !is_of_kind(Control(object))) raise(ErrorNumber::type_mismatch);
+  // Its members are looked up and not used, so that no separators count.
+  if (object != nullptr && !is_of_kind(Control(object, Locale{}))) raise(ErrorNumber::type_mismatch);
   return object;
 }
 

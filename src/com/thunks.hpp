@@ -62,7 +62,7 @@ struct Wire<Variant> {
 template <>
 struct Wire<TextArray> {
   using Type = SAFEARRAY*;
-  static TextArray from(Type value) { return array_from(value, {}); }
+  static TextArray from(Type value, const Locale& locale) { return array_from(value, locale); }
   static OwnedArray to(const TextArray& value) { return {value, ArrayStyle::of_texts}; }
   static void store(Type& place, OwnedArray value) noexcept {
     if (place != nullptr) SafeArrayDestroy(place);
@@ -84,8 +84,11 @@ class WireCell {
   /// A variant by reference may refer to a typed variable in its turn, which is written through and never replaced.
   static constexpr bool is_variable = is_written_back && std::is_same_v<T, Variant>;
 
-  explicit WireCell(WireParameter<A> given) {
-    if constexpr (std::is_pointer_v<WireParameter<A>> && passing<A>() != Passing::by_value) {
+  WireCell(WireParameter<A> given, const Library& library) {
+    if constexpr (std::is_same_v<T, TextArray>) {
+      place_ = given;
+      value_ = Wire<T>::from(*given, library.locale());
+    } else if constexpr (passing<A>() != Passing::by_value) {
       place_ = given;
       value_ = Wire<T>::from(*given);
     } else {
@@ -224,7 +227,7 @@ struct MethodThunk<C, M, R (Owner::*)(A...)> {
     const typename ComObject<C>::Keeper keeper(self);
     return guarded([&] {
       const Library& library = self->object.library();
-      std::tuple<WireCell<A>...> cells{WireCell<A>(given)...};
+      std::tuple<WireCell<A>...> cells{WireCell<A>(given, library)...};
       auto answer = run(cells, library, [&] {
         return std::apply([&](WireCell<A>&... cell) { return Wire<R>::to((self->object.*M)(cell.value()...)); }, cells);
       });
@@ -241,7 +244,7 @@ struct MethodThunk<C, M, void (Owner::*)(A...)> {
     const typename ComObject<C>::Keeper keeper(self);
     return guarded([&] {
       const Library& library = self->object.library();
-      std::tuple<WireCell<A>...> cells{WireCell<A>(given)...};
+      std::tuple<WireCell<A>...> cells{WireCell<A>(given, library)...};
       run(cells, library,
           [&] { std::apply([&](WireCell<A>&... cell) { (self->object.*M)(cell.value()...); }, cells); });
       write_back(cells, library);

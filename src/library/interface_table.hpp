@@ -1,7 +1,7 @@
 #pragma once
 
 #include "automation/member_table.hpp"
-#include "forms/host_objects.hpp"
+#include "library/host_objects.hpp"
 #include "library/orv_utils.hpp"
 
 namespace talutil {

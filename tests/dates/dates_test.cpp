@@ -195,8 +195,9 @@ TEST_F(DateMembers, WeekTablesHaveTheCalendarOfTheCurrentYear) {
 
 TEST_F(DateMembers, MinutesThatHaveNoTextAreReportedInABox) {
   EXPECT_EQ(call(u"ConvertNumberToDatabaseDuration", u"-90"), "1/1/1800 00:00");
-  EXPECT_EQ(platform.messages, (std::vector<FakePlatform::Message>{
-                                   {u"ORVUtils ConvertNumberToDatabaseDuration Type mismatch", MessageButtons::ok}}));
+  EXPECT_EQ(platform.messages,
+            (std::vector<FakePlatform::Message>{
+                {u"ORVUtils ConvertNumberToDatabaseDuration Type mismatch", MessageButtons::ok, {}}}));
 }
 
 TEST_F(DateMembers, DurationsUseTheObjectsTextMembers) {
