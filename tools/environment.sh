@@ -152,12 +152,14 @@ in_wine_root() {
   ' in_wine_root "$wine_root" "$talutil_top" "$talutil_build" "${variables[@]}" "$@"
 }
 
-in_wine64() {
+# The current folder is one that a drive leads to: programs ask for it by its drive.
+in_wine64() (
   local limit=${WINE_TIMEOUT:-120} variables
   mapfile -t variables < <(wine_environment)
-  timeout --kill-after=5 "$limit" env -i HOME="$talutil_build" WINEARCH=win64 WINEPREFIX="$(wine_prefix)" \
+  mkdir -p "$talutil_build/wine64-drive"
+  cd "$talutil_build/wine64-drive" && timeout --kill-after=5 "$limit" env -i HOME="$talutil_build" WINEARCH=win64 WINEPREFIX="$(wine_prefix)" \
     "${variables[@]}" "$@"
-}
+)
 
 wine() { if [ $wine_bits = 64 ]; then in_wine64 /usr/lib/wine/wine64 "$@"; else in_wine_root /usr/lib/wine/wine "$@"; fi; }
 
@@ -178,7 +180,6 @@ make_wine_prefix() {
   wine_server -w
   if [ $wine_bits = 64 ]; then
     drive=$talutil_build/wine64-drive
-    mkdir -p "$drive"
     ln -sfn "$talutil_top" "$drive/checkout"
     ln -sfn "$talutil_build" "$drive/build"
     ln -sfn "$drive" "$prefix/dosdevices/z:"

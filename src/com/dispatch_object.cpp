@@ -131,7 +131,7 @@ class DispatchUse final : public RepeatedUse {
       case Access::get:
         // An object that goes by its type information answers for a function only to the first flag and for a property
         // only to the second. Which of them a member is (ScaleX, TextWidth, ItemData) differs from object to object.
-        return invoke(DISPATCH_METHOD | DISPATCH_PROPERTYGET, exception);
+        return read(exception);
       case Access::put:
         break;
     }
@@ -141,6 +141,13 @@ class DispatchUse final : public RepeatedUse {
       if (status != DISP_E_MEMBERNOTFOUND) return status;
     }
     return invoke(DISPATCH_PROPERTYPUT, exception);
+  }
+
+  HRESULT read(ExceptionInformation& exception) {
+    const HRESULT status = invoke(DISPATCH_METHOD | DISPATCH_PROPERTYGET, exception);
+    // Wine's JScript takes both flags for a call, and has a bare failure for a plain property, which is none.
+    if (status != E_FAIL || arguments_.size() != 0) return status;
+    return invoke(DISPATCH_PROPERTYGET, exception);
   }
 
   HRESULT invoke(WORD flags, ExceptionInformation& exception) {

@@ -71,9 +71,10 @@ struct RegistryCleaner {
   RegistryCleaner() { clean(); }
   ~RegistryCleaner() { clean(); }
   static void clean() {
-    for (const wchar_t* const name : {value_name, grid_value_name})
-      RegDeleteKeyValueW(HKEY_CURRENT_USER, controls_key, name);
-    RegDeleteKeyW(HKEY_CURRENT_USER, controls_key);
+    for (const HKEY root : {HKEY_CURRENT_USER, HKEY_LOCAL_MACHINE}) {
+      for (const wchar_t* const name : {value_name, grid_value_name}) RegDeleteKeyValueW(root, controls_key, name);
+      RegDeleteKeyW(root, controls_key);
+    }
     RegDeleteTreeW(HKEY_LOCAL_MACHINE, program_key);
   }
 };
@@ -85,7 +86,7 @@ std::wstring computer_name(_ORVUtils* u) {
 }
 
 void missing_control_is_reported() {
-  set(HKEY_CURRENT_USER, controls_key, value_name, missing_class_text);
+  set(HKEY_LOCAL_MACHINE, controls_key, value_name, missing_class_text);
   Pointer<_ORVUtils> object;
   check_equal(run_time_error(429),
               CoCreateInstance(CLSID_ORVUtils, nullptr, CLSCTX_INPROC_SERVER, IID__ORVUtils, object.receive_untyped()),
@@ -99,18 +100,18 @@ void missing_control_is_reported() {
 
 /// A control that stands for one of ours and creates the library in its turn, while the library starts.
 void control_leads_back() {
-  set(HKEY_CURRENT_USER, controls_key, grid_value_name, L"TALUtil.Grid");
+  set(HKEY_LOCAL_MACHINE, controls_key, grid_value_name, L"TALUtil.Grid");
   Pointer<_ORVUtils> object;
   check_equal(run_time_error(429),
               CoCreateInstance(CLSID_ORVUtils, nullptr, CLSCTX_INPROC_SERVER, IID__ORVUtils, object.receive_untyped()),
               "creating an object whose control leads back to it");
   const std::wstring text = error_text();
   check(text.find(L"TALUtil.Grid") != std::wstring::npos, narrow(text) + " names TALUtil.Grid");
-  RegDeleteKeyValueW(HKEY_CURRENT_USER, controls_key, grid_value_name);
+  RegDeleteKeyValueW(HKEY_LOCAL_MACHINE, controls_key, grid_value_name);
 }
 
 void control_answers() {
-  set(HKEY_CURRENT_USER, controls_key, value_name, control_class_text);
+  set(HKEY_LOCAL_MACHINE, controls_key, value_name, control_class_text);
   SystemInformation::answer = L"FRONT-DESK";
   const Pointer<_ORVUtils> object = create_object();
   check_equal(L"FRONT-DESK", computer_name(object.get()), "ComputerName");
@@ -126,13 +127,31 @@ void control_answers() {
 
 void control_by_program_identifier() {
   set(HKEY_LOCAL_MACHINE, (std::wstring(program_key) + L"\\CLSID").c_str(), nullptr, control_class_text);
-  set(HKEY_CURRENT_USER, controls_key, value_name, program_id);
+  set(HKEY_LOCAL_MACHINE, controls_key, value_name, program_id);
   SystemInformation::answer = L"BACK-OFFICE";
   const Pointer<_ORVUtils> object = create_object();
   // A window that is not loaded is loaded and closed again, which reads the name anew.
   object->Terminate();
   check_equal(L"BACK-OFFICE", computer_name(object.get()), "ComputerName of a window loaded again");
   check_equal(0, SystemInformation::alive, "controls after that");
+}
+
+bool is_elevated() {
+  HANDLE token = nullptr;
+  TOKEN_ELEVATION_TYPE type = TokenElevationTypeDefault;
+  DWORD size = 0;
+  OpenProcessToken(GetCurrentProcess(), TOKEN_QUERY, &token);
+  GetTokenInformation(token, TokenElevationType, &type, sizeof type, &size);
+  CloseHandle(token);
+  return type == TokenElevationTypeFull;
+}
+
+/// What every program of the user may write does not choose the code of an elevated one. Wine's programs are elevated.
+void users_part_is_for_plain_programs() {
+  const Pointer<_ORVUtils> object = create_object();
+  RegDeleteKeyValueW(HKEY_LOCAL_MACHINE, controls_key, value_name);
+  set(HKEY_CURRENT_USER, controls_key, value_name, missing_class_text);
+  check_equal(is_elevated() ? S_OK : run_time_error(429), object->Terminate(), "a control in the user's part");
 }
 
 }  // namespace
@@ -148,6 +167,7 @@ int wmain(int, wchar_t**) {
     control_leads_back();
     control_answers();
     control_by_program_identifier();
+    users_part_is_for_plain_programs();
     CoRevokeClassObject(registration);
   });
 }

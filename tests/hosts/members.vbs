@@ -43,13 +43,8 @@ Sub Settings
   Check "a single", CSng(12.5), u.GSTValue
   u.BookingScreenDate = DateSerial(2009, 7, 1)
   Check "a date", DateSerial(2009, 7, 1), u.BookingScreenDate
-  Set u.FolderBrowseForm = New Form
   Set u.FolderBrowseForm = Nothing
 End Sub
-
-Class Form
-  Public hwnd
-End Class
 
 Sub SettingErrors
   On Error Resume Next
