@@ -182,11 +182,6 @@ bool is_ascii(TextView text) noexcept {
   return all < 0x80;
 }
 
-std::int16_t asc(TextView text) {
-  if (text.empty()) raise(ErrorNumber::invalid_procedure_call);
-  return ansi_code(text.front());
-}
-
 Text chr(std::int32_t code) {
   if (code < 0 || code > 255) raise(ErrorNumber::invalid_procedure_call);
   return Text(1, unit_of(static_cast<std::uint8_t>(code)));

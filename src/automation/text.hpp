@@ -24,16 +24,13 @@ using TextView = std::u16string_view;
 /// Equal but for the case of letters, code unit by code unit.
 [[nodiscard]] bool equals_without_case(TextView a, TextView b) noexcept;
 
-/// The code that the platform's Asc primitive gives for one code unit: its byte in code page 1252 (0 to
-/// 255), with the code page's best fit for characters it does not hold (U+0100 counts as "A") and 63, the
-/// question mark, where there is none. Source: the platform's own conversion, see ansi_code_page.cpp.
+/// The byte of one code unit in code page 1252 (0 to 255), with the code page's best fit for characters it does
+/// not hold (U+0100 counts as "A") and 63, the question mark, where there is none. Source: the platform's own
+/// conversion, see ansi_code_page.cpp. Members compare characters by the platform's page (platform/code_page.hpp).
 [[nodiscard]] std::uint8_t ansi_code(char16_t unit) noexcept;
 
 /// Whether every character is below 128.
 [[nodiscard]] bool is_ascii(TextView text) noexcept;
-
-/// The code of the first character, as Asc gives it. Raises 5 for an empty text.
-[[nodiscard]] std::int16_t asc(TextView text);
 
 /// The one-character text of a code of code page 1252, 0 to 255. Raises 5 outside that range.
 [[nodiscard]] Text chr(std::int32_t code);

@@ -15,6 +15,7 @@
 #include "infoforms/frm_components.hpp"
 #include "platform/win32/exception_frames.hpp"
 #include "platform/win32/module_path.hpp"
+#include "platform/win32/win32_code_page.hpp"
 #include "platform/win32/win32_cryptography.hpp"
 #include "platform/win32/win32_drawing.hpp"
 #include "platform/win32/win32_file_dialogs.hpp"
@@ -61,11 +62,12 @@ struct LoadedLibrary {
   win32::Win32FontFiles font_files;
   win32::Win32Printers printers;
   win32::Win32Machine machine;
-  Library library{Platform{message_boxes,  screen,           computer,      clock,         form_windows,
-                           control_makers, message_pump,     random_source, cryptography,  profiles,
-                           settings_store, time_conversions, files,         folder_picker, guids,
-                           folders,        input_boxes,      registry,      network,       file_dialogs,
-                           drawing,        window_printing,  font_files,    printers,      machine}};
+  win32::Win32CodePage code_page;
+  Library library{Platform{
+      message_boxes,   screen,       computer,    clock,          form_windows,     control_makers, message_pump,
+      random_source,   cryptography, profiles,    settings_store, time_conversions, files,          folder_picker,
+      guids,           folders,      input_boxes, registry,       network,          file_dialogs,   drawing,
+      window_printing, font_files,   printers,    machine,        code_page}};
 };
 
 struct Module {

@@ -7,6 +7,7 @@
 #include "automation/locale.hpp"
 #include "automation/object.hpp"
 #include "automation/text.hpp"
+#include "platform/code_page.hpp"
 #include "platform/cryptography.hpp"
 #include "platform/drawing.hpp"
 #include "platform/file_dialogs.hpp"
@@ -146,6 +147,7 @@ struct Platform {
   FontFiles& font_files;
   Printers& printers;
   Machine& machine;
+  CodePage& code_page;
 };
 
 }  // namespace talutil

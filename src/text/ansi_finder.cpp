@@ -12,18 +12,20 @@ constexpr std::size_t code_unit_count = 0x10000;
 // Enough of them to make up for 64 KB of answers.
 constexpr std::uint32_t questions_before_keeping = 1024;
 
-/// ASCII and the upper half of Latin-1, whose code is the unit itself.
-constexpr bool is_near(char16_t unit) noexcept { return (unit < 0x80) | (static_cast<char16_t>(unit - 0xA0) < 0x60); }
+/// ASCII, and as much of Latin-1 as the page has in its places: there the code is the unit itself.
+constexpr bool is_near(char16_t unit, char16_t latin_count) noexcept {
+  return (unit < 0x80) | (static_cast<char16_t>(unit - 0xA0) < latin_count);
+}
 
 /// 1 for a character that may match: the wanted one, and one that is not near. Without a branch, since the
 /// letters around vary too much to be guessed, and for the compiler's vectors.
-constexpr char16_t is_candidate(char16_t unit, char16_t wanted) noexcept {
-  return static_cast<char16_t>(int{unit == wanted} | int{!is_near(unit)});
+constexpr char16_t is_candidate(char16_t unit, char16_t wanted, char16_t latin_count) noexcept {
+  return static_cast<char16_t>(int{unit == wanted} | int{!is_near(unit, latin_count)});
 }
 
-bool is_plain_block(const char16_t* block, char16_t wanted) noexcept {
+bool is_plain_block(const char16_t* block, char16_t wanted, char16_t latin_count) noexcept {
   char16_t candidates = 0;
-  for (std::size_t i = 0; i < block_length; ++i) candidates |= is_candidate(block[i], wanted);
+  for (std::size_t i = 0; i < block_length; ++i) candidates |= is_candidate(block[i], wanted, latin_count);
   return candidates == 0;
 }
 
@@ -33,7 +35,7 @@ std::size_t AnsiFinder::find(TextView text, std::size_t from) {
   while (answers_.empty()) {
     if (from == text.size()) return from;
     const std::size_t length = std::min(block_length, text.size() - from);
-    if (length < block_length || !is_plain_block(text.data() + from, code_)) {
+    if (length < block_length || !is_plain_block(text.data() + from, near_wanted_, latin_count_)) {
       const std::size_t found = find_in_block(text.substr(from, length));
       if (found < length) return from + found;
     }
@@ -53,7 +55,7 @@ std::size_t AnsiFinder::find_other(TextView text, std::size_t from) {
 std::size_t AnsiFinder::find_in_block(TextView block) {
   std::size_t at = 0;
   for (; at < block.size(); ++at) {
-    if (is_candidate(block[at], code_) != 0 && matches(block[at])) break;
+    if (is_candidate(block[at], near_wanted_, latin_count_) != 0 && matches(block[at])) break;
   }
   return at;
 }
@@ -68,7 +70,7 @@ std::size_t AnsiFinder::skip(Answer answer, TextView text, std::size_t from) {
 }
 
 bool AnsiFinder::matches(char16_t unit) {
-  if (answers_.empty()) return is_near(unit) ? unit == code_ : ask(unit);
+  if (answers_.empty()) return is_near(unit, latin_count_) ? unit == code_ : ask(unit);
   Answer& answer = answers_[unit];
   if (answer == unknown) answer = ask(unit) ? yes : no;
   return answer == yes;
@@ -76,7 +78,7 @@ bool AnsiFinder::matches(char16_t unit) {
 
 bool AnsiFinder::ask(char16_t unit) {
   if (answers_.empty() && ++questions_ == questions_before_keeping) answers_.assign(code_unit_count, unknown);
-  return ansi_code(unit) == code_;
+  return page_.code(unit) == code_;
 }
 
 }  // namespace talutil

@@ -3,18 +3,22 @@
 #include <cstdint>
 #include <vector>
 
-#include "automation/text.hpp"
+#include "platform/code_page.hpp"
 
 namespace talutil {
 
-/// Finds the characters of one ANSI code in long texts.
+/// Finds the characters that have the code of a wanted one in long texts.
 ///
-/// Nearly all text is ASCII and Latin-1, where a character can match only by being the wanted one, so such
-/// text is passed over in blocks. For the others the finder asks for their code; once it has asked often, it
-/// keeps the answers.
+/// Nearly all text is ASCII, and Latin-1 where the code page has it: there a character can match only by being the
+/// wanted one, so such text is passed over in blocks. For the others the finder asks for their code; once it has asked
+/// often, it keeps the answers.
 class AnsiFinder {
  public:
-  explicit AnsiFinder(std::uint8_t code) noexcept : code_(code) {}
+  AnsiFinder(CodePage& page, char16_t wanted)
+      : page_(page),
+        code_(page.code(wanted)),
+        near_wanted_(static_cast<char16_t>(code_)),
+        latin_count_(page.latin_count()) {}
 
   /// The index of the first character of the code at or after `from`; the text's size when there is none.
   [[nodiscard]] std::size_t find(TextView text, std::size_t from);
@@ -30,7 +34,10 @@ class AnsiFinder {
   [[nodiscard]] bool matches(char16_t unit);
   [[nodiscard]] bool ask(char16_t unit);
 
-  std::uint8_t code_;
+  CodePage& page_;
+  std::uint32_t code_;
+  char16_t near_wanted_;  ///< The one near character that can match. A longer code is cut, and belongs to none.
+  char16_t latin_count_;
   std::uint32_t questions_ = 0;
   std::vector<Answer> answers_;  ///< One for each code unit; empty at first.
 };

@@ -2,15 +2,19 @@
 
 #include <cstdint>
 
-#include "automation/text.hpp"
+#include "platform/code_page.hpp"
 
 namespace talutil {
 
 constexpr TextView line_break = u"\r\n";
 
-/// True for 0 to 9, and for the characters whose ANSI substitute is one of them.
-[[nodiscard]] inline bool is_digit(char16_t unit) noexcept {
-  return is_decimal_digit(ansi_code(unit));
+/// True for the codes of 0 to 9, which some pages also give for characters that they do not hold.
+[[nodiscard]] constexpr bool is_digit_code(std::uint32_t code) noexcept { return code >= u'0' && code <= u'9'; }
+
+/// A test of characters that looks at their codes.
+template <class Test>
+[[nodiscard]] auto by_code(CodePage& page, Test test) {
+  return [&page, test](char16_t unit) { return test(page.code(unit)); };
 }
 
 }  // namespace talutil

@@ -4,6 +4,7 @@
 
 #include "automation/checked.hpp"
 #include "automation/text.hpp"
+#include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "text/characters.hpp"
 
@@ -84,6 +85,7 @@ std::int16_t ORVUtils::StringPosition(const Text& sSource, const std::int16_t& i
   if (iOption != 1) return 0;
   const Text s = upper_case(TextView(sSource));
   const auto length = static_cast<std::int64_t>(s.size());
+  const auto is_digit = by_code(library_.platform().code_page, is_digit_code);
   const std::int32_t blanks = SubStrCount(u" ", s);
   for (std::int32_t k = 1; k <= blanks; ++k) {
     const std::int32_t blank = MyPos(u" ", s, k);

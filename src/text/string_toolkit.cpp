@@ -5,6 +5,7 @@
 
 #include "automation/checked.hpp"
 #include "automation/text.hpp"
+#include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "text/ansi_finder.hpp"
 #include "text/characters.hpp"
@@ -59,23 +60,24 @@ Text replace_word(TextView text, TextView word, TextView replacement) {
 Text ORVUtils::StripNulls(const Text& s) { return Text(up_to_nul(s)); }
 
 Text ORVUtils::RemoveNumberFromString(const Text& sTemp) {
-  // A character without an ANSI substitute counts as a question mark and goes too.
-  return keep_if(sTemp, [](char16_t unit) { return ansi_code(unit) >= u'A'; });
+  // A character that counts as a question mark, because the code page does not hold it, goes too.
+  return keep_if(sTemp, by_code(library_.platform().code_page, [](std::uint32_t code) { return code >= u'A'; }));
 }
 
 Text ORVUtils::RemoveStringsFromNumber(const std::int16_t& iOption, const Text& sTemp, Text& sCharacter) {
   if (sTemp.empty()) return {};
+  CodePage& page = library_.platform().code_page;
   switch (iOption) {
     case 0:
-      return keep_if(sTemp, is_digit);
+      return keep_if(sTemp, by_code(page, is_digit_code));
     case 1:
-      return keep_if(sTemp, [](char16_t unit) { return is_digit(unit) || ansi_code(unit) == u' '; });
+      return keep_if(sTemp, by_code(page, [](std::uint32_t code) { return is_digit_code(code) || code == u' '; }));
     case 2:
       if (sCharacter.empty()) sCharacter.assign(1, u' ');
       // One character is compared with the whole of sCharacter, so a longer one removes nothing.
       return keep_if(sTemp, [&](char16_t unit) { return TextView(&unit, 1) != sCharacter; });
     case 3:
-      return keep_if(sTemp, [](char16_t unit) { return is_digit(unit) || ansi_code(unit) == u'.'; });
+      return keep_if(sTemp, by_code(page, [](std::uint32_t code) { return is_digit_code(code) || code == u'.'; }));
     default:
       return {};
   }
@@ -84,7 +86,7 @@ Text ORVUtils::RemoveStringsFromNumber(const std::int16_t& iOption, const Text& 
 Text ORVUtils::StringReplace(const Text& sSrc, const Text& sChr, const Text& sReplace) {
   if (sSrc.empty()) return {};
   if (sChr.empty()) raise(ErrorNumber::invalid_procedure_call);
-  AnsiFinder finder(ansi_code(sChr.front()));
+  AnsiFinder finder(library_.platform().code_page, sChr.front());
   Text result;
   // Room for some longer replacements, so that most texts need not be moved while they grow.
   result.reserve(sSrc.size() + (sReplace.size() > 1 ? sSrc.size() / 8 : 0));

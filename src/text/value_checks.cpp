@@ -1,5 +1,6 @@
 #include <algorithm>
 
+#include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "text/characters.hpp"
 
@@ -13,17 +14,17 @@ Text middle(const Text& text, std::int32_t position, std::size_t count = Text::n
   return start < text.size() ? text.substr(start, count) : Text();
 }
 
-bool is_number_character(char16_t unit) noexcept { return is_digit(unit) || ansi_code(unit) == u'.'; }
+constexpr bool is_number_code(std::uint32_t code) noexcept { return is_digit_code(code) || code == u'.'; }
 
-bool is_password_character(char16_t unit) noexcept {
-  const std::uint8_t code = ansi_code(unit);
-  return is_digit(unit) || (code >= u'A' && code <= u'Z');
+constexpr bool is_password_code(std::uint32_t code) noexcept {
+  return is_digit_code(code) || (code >= u'A' && code <= u'Z');
 }
 
 }  // namespace
 
 Boolean ORVUtils::IsValueNumber(const Text& sText) {
-  return Boolean(!sText.empty() && std::ranges::all_of(sText, is_number_character));
+  CodePage& page = library_.platform().code_page;
+  return Boolean(!sText.empty() && std::ranges::all_of(sText, by_code(page, is_number_code)));
 }
 
 Boolean ORVUtils::IsValueDate(const Text& sText) {
@@ -53,9 +54,11 @@ Boolean ORVUtils::VerifyEmail(const Text& sTemp) {
 }
 
 Boolean ORVUtils::VerifyPasswordText(const Text& sPassword) {
-  return Boolean(std::ranges::all_of(sPassword, is_password_character));
+  return Boolean(std::ranges::all_of(sPassword, by_code(library_.platform().code_page, is_password_code)));
 }
 
-Boolean ORVUtils::NumbersInString(const Text& sSource) { return Boolean(std::ranges::any_of(sSource, is_digit)); }
+Boolean ORVUtils::NumbersInString(const Text& sSource) {
+  return Boolean(std::ranges::any_of(sSource, by_code(library_.platform().code_page, is_digit_code)));
+}
 
 }  // namespace talutil

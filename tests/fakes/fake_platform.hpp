@@ -97,12 +97,15 @@ struct FakePlatform : MessageBoxes,
   FakeFolderPicker folder_picker;
   FakeGuids guids;
 
+  WesternCodePage code_page;
+
   // Real parts, for tests on a platform that is fake but for one of them.
   TimeConversions* real_time_conversions = nullptr;
   Files* real_files = nullptr;
   Folders* real_folders = nullptr;
   Registry* real_registry = nullptr;
   Network* real_network = nullptr;
+  CodePage* real_code_page = nullptr;
 
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;
@@ -114,10 +117,11 @@ struct FakePlatform : MessageBoxes,
     Folders* used_folders = real_folders == nullptr ? this : real_folders;
     Registry& used_registry = real_registry == nullptr ? registry : *real_registry;
     Network& used_network = real_network == nullptr ? network : *real_network;
-    return {*this, *this,         *this,    *this,          *this,        *this,      *this,
-            *this, *cryptography, profiles, settings_store, conversions,  used_files, folder_picker,
-            guids, *used_folders, *this,    used_registry,  used_network, *this,      *this,
-            *this, *this,         *this,    *this};
+    CodePage& used_code_page = real_code_page == nullptr ? code_page : *real_code_page;
+    return {*this, *this,         *this,    *this,          *this,         *this,      *this,
+            *this, *cryptography, profiles, settings_store, conversions,   used_files, folder_picker,
+            guids, *used_folders, *this,    used_registry,  used_network,  *this,      *this,
+            *this, *this,         *this,    *this,          used_code_page};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {

@@ -80,24 +80,6 @@ TEST_F(StringToolkit, StringReplace) {
   EXPECT_EQ(error_of([&] { (void)utils.StringReplace(u"a", u"", u"x"); }), 5);
 }
 
-// Long texts take another way through the finder than short ones; both must agree with Asc on every unit.
-TEST_F(StringToolkit, StringReplaceAgreesWithAscOnEveryCharacter) {
-  Text every;
-  for (std::uint32_t unit = 0; unit <= 0xFFFF; ++unit) every += static_cast<char16_t>(unit);
-  for (const char16_t wanted : Text(u"?&' +\0A\x0081\u20AC\u00E9\u0160", 11)) {
-    Text expected;
-    for (const char16_t unit : every) {
-      if (ansi_code(unit) != ansi_code(wanted)) expected += unit;
-    }
-    EXPECT_EQ(utils.StringReplace(every, Text(1, wanted), u""), expected) << static_cast<int>(wanted);
-    Text by_pieces;
-    for (std::size_t at = 0; at < every.size(); at += 100) {
-      by_pieces += utils.StringReplace(every.substr(at, 100), Text(1, wanted), u"");
-    }
-    EXPECT_EQ(by_pieces, expected) << static_cast<int>(wanted);
-  }
-}
-
 TEST_F(StringToolkit, CrlfStringReplaceReplacesLineFeedsOfItsOwnToo) {
   EXPECT_EQ(utils.CRLFStringReplace(u"A\r\nB", u"\n."), u"A\n..\n.B");
   const std::vector<Text> calls = {u"StringReplace|A\r\nB|\r|\n.", u"StringReplace|A\n.\nB|\n|\n."};

@@ -3,6 +3,7 @@
 #include <optional>
 
 #include "platform/platform.hpp"
+#include "platform/posix/posix_code_page.hpp"
 #include "platform/posix/posix_cryptography.hpp"
 #include "platform/posix/posix_file_dialogs.hpp"
 #include "platform/posix/posix_files.hpp"
@@ -98,6 +99,12 @@ class PosixWindowPrinting final : public WindowPrinting {
 
 /// One of each, for a library to use. Must outlive it.
 struct PosixPlatform {
+  /// With the code page that the environment chooses, or the one of a number. Throws std::runtime_error for an unknown
+  /// one.
+  PosixPlatform() : PosixPlatform(chosen_code_page()) {}
+  explicit PosixPlatform(std::uint32_t code_page_number) : code_page(make_code_page(code_page_number)) {}
+
+  std::unique_ptr<CodePage> code_page;
   PosixMessageBoxes message_boxes;
   PosixScreen screen;
   PosixComputer computer;
@@ -129,7 +136,7 @@ struct PosixPlatform {
     return {message_boxes,   screen,       computer,    clock,          form_windows,     control_makers, message_pump,
             random_source,   cryptography, profiles,    settings_store, time_conversions, files,          folder_picker,
             guids,           folders,      input_boxes, registry,       network,          file_dialogs,   drawing,
-            window_printing, font_files,   printers,    machine};
+            window_printing, font_files,   printers,    machine,        *code_page};
   }
 };
 

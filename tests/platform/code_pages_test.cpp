@@ -1,0 +1,125 @@
+// Code pages as both platforms have them, and the members that compare characters by them.
+#include <gtest/gtest.h>
+
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
+#include "tests/fakes/fake_platform.hpp"
+#include "tests/platform/real_code_page.hpp"
+
+namespace talutil::testing {
+namespace {
+
+/// A toolkit on a fake platform that has one of the real code pages.
+struct Toolkit {
+  explicit Toolkit(std::uint32_t number) : page(real_code_page(number)) {}
+
+  std::unique_ptr<CodePage> page;
+  FakePlatform platform;
+  Library library{with_page()};
+  ORVUtils utils{library};
+
+ private:
+  Platform with_page() {
+    platform.real_code_page = page.get();
+    return platform.platform();
+  }
+};
+
+TEST(CodePages, BytesAndTexts) {
+  const struct {
+    const char* name;
+    std::uint32_t page;
+    TextView text;
+    std::string_view bytes;
+  } both_ways[] = {
+      {"Western", 1252, u"O\u2019Neil \u20AC", "O\x92Neil \x80"},
+      {"Cyrillic", 1251, u"\u041E\u043B\u044C\u0433\u0430 \u21165", "\xCE\xEB\xFC\xE3\xE0 \xB9\x35"},
+      {"Greek", 1253, u"\u038F\u03C1\u03B1", "\xBF\xF1\xE1"},
+      {"a mark stays apart from its letter", 1258, u"\u00EA\u0301", "\xEA\xEC"},
+      {"one and two bytes", 932, u"A\u6771\u4EACz", "A\x93\x8C\x8B\x9Ez"},
+      {"a pair of units", 65001, u"\u0416\U0001F600", "\xD0\x96\xF0\x9F\x98\x80"},
+      {"nothing", 932, u"", ""},
+  };
+  for (const auto& row : both_ways) {
+    const auto page = real_code_page(row.page);
+    EXPECT_EQ(page->bytes_of(row.text), row.bytes) << row.name;
+    EXPECT_EQ(page->text_of(row.bytes), row.text) << row.name;
+  }
+  const char16_t lone[] = {0xD800, u'a'};
+  EXPECT_EQ(real_code_page(1251)->bytes_of(u"\u6771a\U0001F600"), "?a??");
+  EXPECT_EQ(real_code_page(65001)->bytes_of(TextView(lone, 2)), "\xEF\xBF\xBD\x61");
+  EXPECT_EQ(real_code_page(65001)->text_of("\xFF\x61"), u"\uFFFDa");
+}
+
+TEST(CodePages, CodesAreTheBytesAsOneNumber) {
+  const struct {
+    std::uint32_t page;
+    char16_t unit;
+    std::uint32_t code;
+    char16_t latin_count;
+  } rows[] = {
+      {1252, u'\u20AC', 0x80, 0x60}, {1251, u'\u0416', 0xC6, 1},      {1251, u'\u6771', u'?', 1},
+      {932, u'\u6771', 0x938C, 0},   {65001, u'\u6771', 0xE69DB1, 0}, {932, u'\\', u'\\', 0},
+  };
+  for (const auto& row : rows) {
+    EXPECT_EQ(real_code_page(row.page)->code(row.unit), row.code) << row.page << " " << static_cast<int>(row.unit);
+    EXPECT_EQ(real_code_page(row.page)->latin_count(), row.latin_count) << row.page;
+  }
+}
+
+TEST(CodePages, MembersKeepTheLettersOfThePage) {
+  const auto verified = [](ORVUtils& utils, const Text& text) { return utils.VerifyTextData(0, 0, text); };
+  const auto without_numbers = [](ORVUtils& utils, const Text& text) { return utils.RemoveNumberFromString(text); };
+  const auto digits = [](ORVUtils& utils, const Text& text) {
+    Text character;
+    return utils.RemoveStringsFromNumber(0, text, character);
+  };
+  const auto replaced = [](ORVUtils& utils, const Text& text) { return utils.StringReplace(text, text, u"-"); };
+  const struct {
+    const char* name;
+    std::uint32_t page;
+    Text (*call)(ORVUtils& utils, const Text& text);
+    Text text, expected;
+  } rows[] = {
+      // The acute accent in the place of the quote is not in the page, and goes with the question mark.
+      {"Cyrillic", 1251, verified, u"\u041E\u043B\u044C\u0433\u0430 \u041E'\u041D\u0438\u043B?",
+       u"\u041E\u043B\u044C\u0433\u0430 \u041E\u041D\u0438\u043B"},
+      {"Greek", 1253, verified, u"\u038F\u03C1\u03B1 #5?", u"\u038F\u03C1\u03B1 5"},
+      {"beyond the page", 932, verified, u"\u6771\u0E01\uFF1F?'", u"\u6771\uFF1F\u00B4"},
+      {"all but the question mark", 65001, verified, u"\u0416\u6771\u0E01\U0001F600?", u"\u0416\u6771\u0E01\U0001F600"},
+      {"letters", 1251, without_numbers, u"\u0434\u043E\u043C 5?", u"\u0434\u043E\u043C"},
+      {"a digit of two bytes is none", 932, digits, u"\uFF155", u"5"},
+      {"one character of two bytes", 932, replaced, u"\u6771\u4EAC\u90FD\u6771", u"-\u4EAC\u90FD-"},
+      {"all characters of one code", 932, replaced, u"\u2225\u2016\u2260", u"--\u2260"},
+  };
+  for (const auto& row : rows) {
+    Toolkit toolkit(row.page);
+    EXPECT_EQ(row.call(toolkit.utils, row.text), row.expected) << row.name << ", " << row.page;
+  }
+}
+
+// Long texts are passed over in blocks, short ones are not; both must agree with the page on every unit.
+TEST(CodePages, StringReplaceAgreesWithThePageOnEveryCharacter) {
+  Text every;
+  for (std::uint32_t unit = 0; unit <= 0xFFFF; ++unit) every += static_cast<char16_t>(unit);
+  for (const std::uint32_t number : {1252, 1251, 932, 65001}) {
+    Toolkit toolkit(number);
+    std::vector<std::string> bytes;
+    for (const char16_t unit : every) bytes.push_back(toolkit.page->bytes_of(TextView(&unit, 1)));
+    for (const char16_t wanted : Text(u"?& \0A\x0081\u20AC\u00E9\u0416\u6771\xD800", 11)) {
+      Text expected;
+      for (const char16_t unit : every) {
+        if (bytes[unit] != bytes[wanted]) expected += unit;
+      }
+      EXPECT_EQ(toolkit.utils.StringReplace(every, Text(1, wanted), u""), expected) << number << " " << int{wanted};
+      Text by_pieces;
+      for (std::size_t at = 0; at < every.size(); at += 100) {
+        by_pieces += toolkit.utils.StringReplace(every.substr(at, 100), Text(1, wanted), u"");
+      }
+      EXPECT_EQ(by_pieces, expected) << number << " " << int{wanted};
+    }
+  }
+}
+
+}  // namespace
+}  // namespace talutil::testing
