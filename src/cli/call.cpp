@@ -53,7 +53,7 @@ void print_json(const Member& member, const Variant& result, const std::vector<A
 }  // namespace
 
 void call(const CallOptions& options) {
-  Session session;
+  Session session(options.code_page);
   const Entry entry = find_entry(Session::members().members, options.member);
   const Member& member = slot_for(entry, options.arguments.size());
   check_count(member, options.arguments.size());

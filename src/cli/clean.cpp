@@ -28,10 +28,10 @@ struct Column {
 
 /// The columns in the file's order. Each needs exactly one line in the plan, so that nothing passes uncleaned.
 std::vector<Column> match_columns(const std::vector<std::string>& header, std::vector<PlanColumn> plan,
-                                  const std::string& plan_path) {
+                                  const std::string& plan_path, CodePage& page) {
   std::vector<Column> columns;
   for (const std::string& bytes : header) {
-    const std::string name = to_utf8(from_ansi(bytes));
+    const std::string name = to_utf8(page.text_of(bytes));
     const auto found = std::ranges::find(plan, name, &PlanColumn::name);
     if (found == plan.end()) {
       const bool twice = std::ranges::find(columns, name, &Column::name) != columns.end();
@@ -60,21 +60,21 @@ std::string in_quotes(std::string_view text, char quote) {
 
 std::string sql_name(std::string_view name) { return is_plain_name(name) ? std::string(name) : in_quotes(name, '"'); }
 
-std::string insert_opening(const std::string& table, const std::vector<Column>& columns) {
+std::string insert_opening(const std::string& table, const std::vector<Column>& columns, CodePage& page) {
   std::string opening = "INSERT INTO " + sql_name(table);
   std::string_view separator = " (";
   for (const Column& column : columns) {
     opening += separator;
-    opening += sql_name(to_ansi(from_utf8(column.name)));
+    opening += sql_name(page.bytes_of(from_utf8(column.name)));
     separator = ", ";
   }
   return opening + ") VALUES ";
 }
 
 /// Every value is quoted, numbers too: a number may have the user's decimal comma.
-void append_value(std::string& sql, std::size_t index, const Text& value) {
+void append_value(std::string& sql, std::size_t index, const std::string& value) {
   sql += index == 0 ? "(" : ", ";
-  sql += in_quotes(to_ansi(value), '\'');
+  sql += in_quotes(value, '\'');
 }
 
 struct Totals {
@@ -83,7 +83,8 @@ struct Totals {
 };
 
 /// Cleans the rows after the header.
-Totals clean_rows(CsvReader& reader, const std::string& opening, std::vector<Column>& columns, Cleaner& cleaner) {
+Totals clean_rows(CsvReader& reader, const std::string& opening, std::vector<Column>& columns, Cleaner& cleaner,
+                  CodePage& page) {
   Totals totals;
   std::vector<std::string> row;
   while (reader.read(row)) {
@@ -96,10 +97,10 @@ Totals clean_rows(CsvReader& reader, const std::string& opening, std::vector<Col
     totals.sql += opening;
     for (std::size_t i = 0; i < row.size(); ++i) {
       Column& column = columns[i];
-      const Text before = from_ansi(row[i]);
+      const Text before = page.text_of(row[i]);
       Text after =
           within(place + ", column \"" + column.name + "\"", [&] { return cleaner.clean(column.steps, before); });
-      append_value(totals.sql, i, after);
+      append_value(totals.sql, i, page.bytes_of(after));
       if (after == before) continue;
       if (++column.changed > 1) continue;
       column.before = before;
@@ -142,7 +143,8 @@ void clean(const CleanOptions& options) {
     throw usage_failure("--output " + output + " is the CSV file itself; name another file");
   }
 
-  Session session;
+  Session session(options.code_page);
+  CodePage& page = *session.platform().code_page;
   put_settings(session, options.settings);
   const std::string plan_text = read_bytes(options.plan);
   auto plan = within(options.plan, [&] { return read_plan(plan_text, Session::members().members, session.locale()); });
@@ -153,8 +155,8 @@ void clean(const CleanOptions& options) {
   const Totals totals = within(options.csv, [&] {
     std::vector<std::string> header;
     if (!reader.read(header)) throw run_time_failure("is empty; its first row must name the columns");
-    columns = match_columns(header, std::move(plan), options.plan);
-    return clean_rows(reader, insert_opening(table, columns), columns, cleaner);
+    columns = match_columns(header, std::move(plan), options.plan, page);
+    return clean_rows(reader, insert_opening(table, columns, page), columns, cleaner, page);
   });
   write_bytes(output, totals.sql);
   const std::chrono::duration<double> elapsed = std::chrono::steady_clock::now() - start;

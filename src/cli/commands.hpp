@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -22,6 +23,7 @@ struct CallOptions {
   std::string member;
   std::vector<std::string> arguments;
   std::vector<std::string> settings;  ///< NAME=VALUE, put in this order before the call.
+  std::optional<std::uint32_t> code_page;
   bool json = false;
 };
 void call(const CallOptions& options);
@@ -29,9 +31,10 @@ void call(const CallOptions& options);
 struct CleanOptions {
   std::string csv;
   std::string plan;
-  std::string output;                 ///< Empty for the CSV file's name with .sql.
-  std::vector<std::string> settings;  ///< NAME=VALUE, put in this order before the first row.
-  std::string table;                  ///< Empty for the CSV file's name without folder and extension.
+  std::string output;                      ///< Empty for the CSV file's name with .sql.
+  std::vector<std::string> settings;       ///< NAME=VALUE, put in this order before the first row.
+  std::string table;                       ///< Empty for the CSV file's name without folder and extension.
+  std::optional<std::uint32_t> code_page;  ///< That of the files too.
 };
 void clean(const CleanOptions& options);
 

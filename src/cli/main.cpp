@@ -8,6 +8,7 @@
 #include "cli/failure.hpp"
 #include "library/interface_definition.hpp"
 #include "library/version.hpp"
+#include "platform/posix/posix_code_page.hpp"
 
 namespace {
 
@@ -82,6 +83,13 @@ void add_settings(CLI::App& command, std::vector<std::string>& settings, const s
   command.add_option("--set", settings, help)->allow_extra_args(false)->type_name("NAME=VALUE");
 }
 
+void add_code_page(CLI::App& command, std::optional<std::uint32_t>& number, const std::string& use) {
+  command
+      .add_option("--code-page", number, "The ANSI code page " + use + "; TALUTIL_CODE_PAGE, else 1252, if not given")
+      ->check(CLI::IsMember(talutil::posix::code_page_numbers()))
+      ->type_name("NUMBER");
+}
+
 void add_call(CLI::App& app, Request& request) {
   auto* const command = app.add_subcommand("call", "Call a method, read a setting or put one: MEMBER [ARGUMENT]...");
   // What is no option of ours is an argument, in its order: "-1" and "-x" need no "--" before them.
@@ -89,6 +97,7 @@ void add_call(CLI::App& app, Request& request) {
   command->set_help_flag("--help", "Print this help message and exit");
   command->add_option("MEMBER", request.call.member, "The member's name, in any case")->required();
   add_settings(*command, request.call.settings, "Put a setting before the call; may be repeated");
+  add_code_page(*command, request.call.code_page, "by which characters are compared");
   command->add_flag("--json", request.call.json, "Print {\"result\": ..., \"arguments\": {...}}");
   command->footer("Arguments are texts as typed, and become what the parameter wants. For what a text cannot say:\n" +
                   written_forms_help() +
@@ -103,12 +112,12 @@ void add_call(CLI::App& app, Request& request) {
 
 void add_clean(CLI::App& app, Request& request) {
   auto* const command = app.add_subcommand("clean", "Clean a CSV file field by field and write it as SQL inserts");
-  command->add_option("CSV", request.clean.csv, "The file, in code page 1252, its first row the columns' names")
-      ->required();
+  command->add_option("CSV", request.clean.csv, "The file, its first row the columns' names")->required();
   command->add_option("--plan", request.clean.plan, "Which members clean which column (see below)")->required();
   command->add_option("--output", request.clean.output, "The SQL file; else the CSV file's name with .sql");
   command->add_option("--table", request.clean.table, "The table; else the CSV file's name");
   add_settings(*command, request.clean.settings, "Put a setting first, for example iCharactercase=1");
+  add_code_page(*command, request.clean.code_page, "of both files, by which characters are compared too");
   command->footer(
       "A plan has one line a column: its name, a member and the member's arguments before the value.\n"
       "\"|\" hands the result to another member, \"list\" cleans each element of a comma list, \"*\" stands\n"
@@ -257,7 +266,9 @@ int run(std::vector<std::string> words) {
   CLI::App app("TALUtil on the command line: its members listed, explained and called.", "talutil");
   app.set_version_flag("--version", talutil::version_text);
   app.require_subcommand(1);
-  app.footer("\"talutil help MEMBER\" explains a member, \"talutil call --help\" how arguments are written.");
+  app.footer(
+      "\"talutil help MEMBER\" explains a member, \"talutil call --help\" how arguments are written.\n"
+      "TALUTIL_CODE_PAGE names the ANSI code page by which characters are compared (1251, 932, 65001 ...); else 1252.");
   Request request;
   add_list(app, request);
   add_help(app, request);

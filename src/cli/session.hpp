@@ -1,5 +1,7 @@
 #pragma once
 
+#include <optional>
+
 #include "automation/late_call.hpp"
 #include "cli/reading_progress.hpp"
 #include "library/interface_table.hpp"
@@ -11,7 +13,9 @@ namespace talutil::cli {
 /// A started library with one toolkit object, called late-bound as scripts call it.
 class Session {
  public:
-  Session() {
+  /// With the code page of a number; with that of the environment where there is none.
+  explicit Session(std::optional<std::uint32_t> code_page = {})
+      : platform_(code_page ? *code_page : posix::chosen_code_page()) {
     platform_.files.set_progress(reading_progress());
     library_.start();
   }

@@ -166,6 +166,20 @@ verdict 'the summary' 'Name      1  "#" -> ""' "$(clean 'ID,Name,Tags,Code\n0,#,
 verdict 'the counters' 'CounterVerifyText 3, CounterVerifyInt 1' \
   "$(clean 'ID,Name,Tags,Code\n0,x,"a,b",\n' | grep Counter)"
 
+# ---- the code page of texts
+expect 'by code page 1252' 0 'é 5' call VerifyTextData 0 0 'éЖ 5?'
+expect 'by another' 0 'Ж 5' call --code-page 1251 VerifyTextData 0 0 'éЖ 5?'
+TALUTIL_CODE_PAGE=932 expect 'by the environment' 0 '東 5' call VerifyTextData 0 0 'é東 5?'
+TALUTIL_CODE_PAGE=932 expect 'the option counts more' 0 'é 5' call --code-page 1252 VerifyTextData 0 0 'é東 5?'
+expect_part 'an unknown page' 2 '--code-page: 99 not in {874,932' call --code-page 99 VerifyTextData 0 0 x
+TALUTIL_CODE_PAGE=1251x expect 'an unknown page in the environment' 1 \
+  'talutil: TALUTIL_CODE_PAGE: "1251x" is no code page that there is; choose one of 874, 932, 936, 949, 950, 1250, 1251, 1252, 1253, 1254, 1255, 1256, 1257, 1258, 65001' \
+  call VerifyTextData 0 0 x
+iconv -t CP1251 <<<"Имя${nl}Ольга?" >in.csv
+echo 'Имя VerifyTextData 0 0' >names
+"$talutil" clean in.csv --plan names --code-page 1251 --output out.sql >log 2>&1
+verdict 'files in another code page' 'INSERT INTO in ("Имя") VALUES ('"'Ольга');" "$(iconv -f CP1251 out.sql | tr -d '\r')"
+
 refused() {  # name, message, CSV
   local actual
   actual=$(clean "$3")
