@@ -28,7 +28,7 @@ class Drawing {
  public:
   virtual ~Drawing() = default;
 
-  /// Draws ANSI text from the top left corner of a rectangle, cut off at its edges, in the font of the device context.
+  /// Draws a text from the top left corner of a rectangle, cut off at its edges, in the font of the device context.
   /// The colour is 0x00BBGGRR, or a system colour with the highest bit set. With `breaks_words` lines break between
   /// words. Raises 5 for a device context that is none, 445 where there are none.
   virtual void draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text, std::int32_t colour,

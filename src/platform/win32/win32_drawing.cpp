@@ -2,20 +2,15 @@
 
 #include <array>
 
+#include "automation/checked.hpp"
 #include "automation/run_time_error.hpp"
+#include "platform/win32/colours.hpp"
 #include "platform/win32/handle.hpp"
-#include "platform/win32/win32_files.hpp"
 #include "platform/win32/windows.hpp"
 
 namespace talutil::win32 {
 
 namespace {
-
-COLORREF colour_of(std::int32_t colour) noexcept {
-  constexpr std::uint32_t system_colour = 0x80000000;
-  const auto bits = static_cast<std::uint32_t>(colour);
-  return (bits & system_colour) != 0 ? GetSysColor(static_cast<int>(bits & 0xFF)) : bits & 0xFFFFFF;
-}
 
 /// The print helper in the folder of a module: the program's for null. Null where there is none.
 HMODULE helper_beside(HMODULE module) {
@@ -47,13 +42,15 @@ void call_helper(const char* function, std::int32_t window) {
 
 void Win32Drawing::draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text,
                              std::int32_t colour, bool breaks_words) {
+  const auto length = checked_cast<std::int32_t>(text.size());
   const HDC context = reinterpret_cast<HDC>(device_context);  // NOLINT(performance-no-int-to-ptr): the seam's handles.
   const COLORREF before = SetTextColor(context, colour_of(colour));
   if (before == CLR_INVALID) raise(ErrorNumber::invalid_procedure_call);
   const int background_before = SetBkMode(context, TRANSPARENT);
   RECT rectangle{place.left, place.top, place.right, place.bottom};
-  const std::string ansi = to_platform_ansi(text);
-  DrawTextA(context, ansi.data(), static_cast<int>(ansi.size()), &rectangle, breaks_words ? DT_WORDBREAK : 0);
+  // Not by DrawTextA: characters beyond the ANSI code page would become question marks, and drawing does not follow a
+  // program that has UTF-8 for its own page.
+  DrawTextW(context, wide(text.data()), length, &rectangle, breaks_words ? DT_WORDBREAK : 0);
   SetBkMode(context, background_before);
   SetTextColor(context, before);
 }

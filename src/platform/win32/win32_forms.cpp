@@ -7,6 +7,7 @@
 #include "automation/run_time_error.hpp"
 #include "controls/grid.hpp"
 #include "forms/form_view.hpp"
+#include "platform/win32/colours.hpp"
 #include "platform/win32/win32_platform.hpp"
 #include "platform/win32/window.hpp"
 // After windows.h.
@@ -113,16 +114,6 @@ COLORREF readable_on(COLORREF colour) noexcept {
   constexpr int middle = 128'000;
   const int brightness = GetRValue(colour) * 299 + GetGValue(colour) * 587 + GetBValue(colour) * 114;
   return brightness < middle ? RGB(255, 255, 255) : RGB(0, 0, 0);
-}
-
-/// A colour as hosts give it: system colours by their number with the highest bit set, the buttons' one for a number
-/// that there is none for.
-COLORREF colour_of(std::int32_t colour) {
-  const auto bits = static_cast<std::uint32_t>(colour);
-  constexpr std::uint32_t system_colour = 0x80000000;
-  if ((bits & system_colour) == 0) return bits & 0xFFFFFF;
-  const auto index = static_cast<int>(bits & 0xFFFFFF);
-  return GetSysColor(index <= COLOR_MENUBAR ? index : COLOR_BTNFACE);
 }
 
 class FormWindow final : public FormView {

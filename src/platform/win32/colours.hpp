@@ -1,0 +1,19 @@
+#pragma once
+
+#include <cstdint>
+
+#include "platform/win32/windows.hpp"
+
+namespace talutil::win32 {
+
+/// A colour as hosts give it: system colours by their number with the highest bit set, the buttons' one for a number
+/// that there is none for.
+inline COLORREF colour_of(std::int32_t colour) noexcept {
+  const auto bits = static_cast<std::uint32_t>(colour);
+  constexpr std::uint32_t system_colour = 0x80000000;
+  if ((bits & system_colour) == 0) return bits & 0xFFFFFF;
+  const auto index = static_cast<int>(bits & 0xFFFFFF);
+  return GetSysColor(index <= COLOR_MENUBAR ? index : COLOR_BTNFACE);
+}
+
+}  // namespace talutil::win32
