@@ -12,7 +12,7 @@ pictures=$talutil_build/screenshots
 passed=0
 failed=0
 
-need_packages xvfb imagemagick ghostscript
+need_packages xvfb imagemagick ghostscript locales
 mkdir -p "$pictures"
 rm -f "$pictures"/*.wanted
 
@@ -152,6 +152,16 @@ else
   echo "FAILED the Free Pascal clients could not be built; TALUTIL_WITHOUT_PASCAL=1 leaves them out"
   failed=$((failed + 1))
 fi
+
+# The system's code page is that of the locale in which Wine's server begins.
+mkdir -p "$talutil_build/locales"
+localedef -i ru_RU -f UTF-8 "$talutil_build/locales/ru_RU.UTF-8"
+export WINE_LANG=ru_RU.UTF-8 WINE_LOCPATH
+WINE_LOCPATH=$(build_below_wine)/locales
+restart_wine
+run code-page wine cscript.exe //nologo 'Z:\checkout\tests\hosts\code_page.vbs'
+unset WINE_LANG WINE_LOCPATH
+restart_wine
 
 # A cipher text made on one side opens on the other.
 talutil=$talutil_build/asan/talutil
