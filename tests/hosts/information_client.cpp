@@ -216,7 +216,11 @@ void boxes_take_texts(const Session& session) {
   });
   ask(session, {.prompt = L"", .colour = static_cast<LONG>(0x8000000F)}, enter);
   ask(session, {.colour = static_cast<LONG>(0x800000FF)}, enter);
-  ask(session, {.colour = -1}, enter);
+  constexpr const wchar_t* formatted = L"{\\rtf1 as it was written}";
+  ask(session, {.prompt = formatted, .colour = -1}, [&](HWND window) {
+    check_equal(formatted, text_of(controls(window, L"Static").at(0)), "a prompt that looks like rich text");
+    press(VK_RETURN);
+  });
 }
 
 Session* timer_session = nullptr;

@@ -161,7 +161,8 @@ class FormWindow final : public FormView {
 
   void set_text(std::uint8_t part, TextView text) override {
     const HWND control = window_of(part);
-    if (!text.starts_with(u"{\\rtf")) {
+    // Elsewhere a text that looks like rich text is what the host has written.
+    if (control_of(part).part->kind != PartKind::rich_text || !text.starts_with(u"{\\rtf")) {
       SetWindowTextW(control, wide(Text(up_to_nul(text))));
       return;
     }
