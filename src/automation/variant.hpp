@@ -45,7 +45,9 @@ struct ErrorValue {
 
 /// An array that is not one of texts. It can be carried, but nothing converts it.
 struct ForeignArray {
-  friend constexpr bool operator==(ForeignArray, ForeignArray) noexcept = default;
+  /// The platform's own copy, for when it is handed back; the same for copies of this value.
+  std::shared_ptr<const void> contents;
+  friend bool operator==(const ForeignArray&, const ForeignArray&) noexcept = default;
 };
 
 /// The automation variant as a value. Conversions follow automation's rules: halves round to even, out of
@@ -88,7 +90,7 @@ class Variant {
   Variant(ErrorValue value) noexcept : storage_(value) {}
   Variant(SystemTime value) noexcept : storage_(value) {}
   Variant(TextArray value) noexcept : storage_(std::move(value)) {}
-  Variant(ForeignArray value) noexcept : storage_(value) {}
+  Variant(ForeignArray value) noexcept : storage_(std::move(value)) {}
   Variant(ObjectRef value) noexcept : storage_(std::move(value)) {}
   Variant(bool) = delete;
   Variant(const void*) = delete;

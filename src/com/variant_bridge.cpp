@@ -140,7 +140,19 @@ void put(VARIANT& out, const ObjectRef& value) {
 }
 // Records go back into the caller's own; a variable that holds none cannot take one.
 void put(VARIANT&, const SystemTime&) { raise(ErrorNumber::type_mismatch); }
-void put(VARIANT&, ForeignArray) { raise(ErrorNumber::type_mismatch); }
+void put(VARIANT& out, const ForeignArray& value) {
+  if (FAILED(VariantCopy(&out, static_cast<const VARIANT*>(value.contents.get())))) throw std::bad_alloc();
+}
+
+/// A copy of an array that members can do nothing with but hand it back.
+ForeignArray kept_array(SAFEARRAY* array, VARTYPE element) {
+  auto copy = std::make_shared<OwnedVariant>();
+  VARIANT& native = copy->get();
+  V_VT(&native) = static_cast<VARTYPE>(VT_ARRAY | element);
+  // Elements that cannot be copied are those of a broken array.
+  if (array != nullptr && FAILED(SafeArrayCopy(array, &V_ARRAY(&native)))) raise(ErrorNumber::type_mismatch);
+  return {std::shared_ptr<const void>(copy, &native)};
+}
 
 }  // namespace
 
@@ -225,7 +237,7 @@ Variant variant_from(const VARIANT& value) {
   if (by_reference && V_BYREF(&source) == nullptr) raise(ErrorNumber::invalid_procedure_call);
   if ((V_VT(&source) & VT_ARRAY) != 0) {
     SAFEARRAY* const array = by_reference ? *V_ARRAYREF(&source) : V_ARRAY(&source);
-    if (type != VT_BSTR || array == nullptr || SafeArrayGetDim(array) != 1) return ForeignArray{};
+    if (type != VT_BSTR || array == nullptr || SafeArrayGetDim(array) != 1) return kept_array(array, type);
     return array_from(array, {});
   }
   if (type == VT_EMPTY) return {};

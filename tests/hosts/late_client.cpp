@@ -126,6 +126,18 @@ void write_back_of_arrays(IDispatch* u) {
   fixed.get()->fFeatures &= static_cast<USHORT>(~FADF_FIXEDSIZE);
 }
 
+void other_arrays_come_back(IDispatch* u) {
+  for (const VARTYPE type : std::initializer_list<VARTYPE>{VT_VARIANT, VT_BSTR}) {
+    const Value list = array_value(type, 1, {L"x", L"y"});
+    const Outcome outcome = use(u, L"ConvertCaseSuburbs", list);
+    check_equal(S_OK, outcome.error(), "an array that no style applies to");
+    if (!check_equal(VT_ARRAY | VT_VARIANT, outcome.result.type(), "what comes back")) continue;
+    check_equal(L"[x|y|]", contents(V_ARRAY(&outcome.result.get())), "its elements");
+  }
+  const Value numbers = array_value(VT_I4, -1, {});
+  check_equal(VT_ARRAY | VT_I4, use(u, L"ConvertCaseSuburbs", numbers).result.type(), "an array of numbers");
+}
+
 void write_back_of_numbers(IDispatch* u) {
   const auto clamp = [u](const Value& week) {
     return use(u, L"WeekYearToDate", week, Value(short{2009}), Value(short{1}));
@@ -436,6 +448,7 @@ int wmain(int, wchar_t**) {
     write_back_of_text(u);
     write_back_of_arrays(u);
     write_back_of_numbers(u);
+    other_arrays_come_back(u);
     records(u);
     objects_as_records(u);
     optional_and_named_arguments(u);
