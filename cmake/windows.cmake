@@ -77,7 +77,8 @@ target_link_libraries(TALUtil PRIVATE talutil_platform ole32 oleaut32 uuid advap
 target_link_options(TALUtil PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup -Wl,--file-alignment=4096)
 
 # In a folder of its own: the library finds it where a package puts it, beside the program or beside TALUtil.dll.
-add_library(printhelper SHARED src/printhelper/printhelper.cpp src/printhelper/printhelper.def)
+add_library(printhelper SHARED src/printhelper/printhelper.cpp src/printhelper/printhelper.def
+            src/platform/win32/exception_frames.cpp)
 set_target_properties(printhelper PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/printhelper)
 target_link_libraries(printhelper PRIVATE talutil_options gdi32 user32 winspool)
 target_link_options(printhelper PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup)

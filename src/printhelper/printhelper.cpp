@@ -11,6 +11,8 @@
 // After windows.h.
 #include <winspool.h>
 
+#include "platform/win32/exception_frames.hpp"
+
 namespace {
 
 /// The printer's settings for one window, kept from ConfigurePrinter to SendToPrinter.
@@ -153,6 +155,12 @@ std::int32_t without_exceptions(std::int32_t handle, Work work) noexcept {
 }
 
 }  // namespace
+
+extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, void* /*reserved*/) {
+  if (reason == DLL_PROCESS_ATTACH) talutil::win32::register_exception_frames(instance);
+  if (reason == DLL_PROCESS_DETACH) talutil::win32::unregister_exception_frames();
+  return TRUE;
+}
 
 /// Prepares the default printer for a window: its paper lies as the window does.
 extern "C" std::int32_t WINAPI ConfigurePrinter(std::int32_t window) noexcept {

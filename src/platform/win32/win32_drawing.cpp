@@ -1,11 +1,10 @@
 #include "platform/win32/win32_drawing.hpp"
 
-#include <array>
-
 #include "automation/checked.hpp"
 #include "automation/run_time_error.hpp"
 #include "platform/win32/colours.hpp"
 #include "platform/win32/handle.hpp"
+#include "platform/win32/module_path.hpp"
 #include "platform/win32/windows.hpp"
 
 namespace talutil::win32 {
@@ -14,10 +13,8 @@ namespace {
 
 /// The print helper in the folder of a module: the program's for null. Null where there is none.
 HMODULE helper_beside(HMODULE module) {
-  std::array<wchar_t, MAX_PATH> path{};
-  const DWORD length = GetModuleFileNameW(module, path.data(), static_cast<DWORD>(path.size()));
-  const TextView program = view(path.data(), length);
-  const Text helper = Text(program.substr(0, program.find_last_of(u'\\') + 1)) + u"printhelper.dll";
+  const Text program = module_path(module);
+  const Text helper = program.substr(0, program.find_last_of(u'\\') + 1) + u"printhelper.dll";
   // By its full path: a library of that name in another folder of the search order is not ours to run.
   return LoadLibraryExW(wide(helper), nullptr, LOAD_WITH_ALTERED_SEARCH_PATH);
 }
