@@ -131,7 +131,8 @@ std::int32_t LateInterface::slot_of(std::int32_t identifier, Access access) cons
     return member.identifier == identifier && (member.access == Access::put) == (access == Access::put);
   };
   // Identifiers count the slots, so the first guess is nearly always right.
-  const auto guess = static_cast<std::size_t>(identifier - members.front().identifier);
+  const auto guess = static_cast<std::size_t>(static_cast<std::uint32_t>(identifier) -
+                                              static_cast<std::uint32_t>(members.front().identifier));
   if (guess < members.size() && fits(members[guess])) return static_cast<std::int32_t>(guess);
   const auto found = std::ranges::find_if(members, fits);
   return found == members.end() ? -1 : static_cast<std::int32_t>(found - members.begin());

@@ -116,7 +116,7 @@ HRESULT report_current_exception(EXCEPINFO* information) noexcept {
     information->bstrDescription = description_of(error);
     if (!error.origin()) return DISP_E_EXCEPTION;
     const Text& help_file = error.origin()->help_file;
-    // Most callers look for no help, nor free its text, until they have heard of some.
+    // None rather than an empty one: a caller that shows no help may not free its text.
     if (!help_file.empty()) information->bstrHelpFile = SysAllocString(win32::wide(help_file));
     information->dwHelpContext = error.origin()->help_context;
   }
