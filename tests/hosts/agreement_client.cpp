@@ -3,8 +3,10 @@
 // parameters; error, result and everything that was written back must be the same, and memory must stay flat.
 #include <random>
 
+#include "examples/host/window_objects.hpp"
 #include "hostile_values.hpp"
 #include "slots.hpp"
+#include "typed_picture_box.hpp"
 
 using namespace talutil::hosts;
 
@@ -36,6 +38,34 @@ constexpr std::wstring_view left_out[] = {L"BrowseForFolder",
                                           L"Terminate",
                                           L"DebugMode",
                                           L"bIsProgrammer"};
+
+/// Objects of a host's, each of whose members answers only as what it is.
+class HostWindows {
+ public:
+  HostWindows()
+      : window_(CreateWindowW(L"Static", L"", WS_OVERLAPPEDWINDOW, 0, 0, 400, 300, nullptr, nullptr, nullptr, nullptr)),
+        box_(CreateWindowW(L"ComboBox", L"", CBS_DROPDOWN, 0, 0, 100, 100, nullptr, nullptr, nullptr, nullptr)) {
+    for (const LPARAM key : {2, 12, 70000})
+      SendMessageW(box_, CB_SETITEMDATA, static_cast<WPARAM>(SendMessageW(box_, CB_ADDSTRING, 0, LPARAM(L"entry"))),
+                   key);
+    *form.receive() = form_object(window_);
+    *combo.receive() = combo_object(box_);
+  }
+  HostWindows(const HostWindows&) = delete;
+  HostWindows& operator=(const HostWindows&) = delete;
+  ~HostWindows() {
+    DestroyWindow(window_);
+    DestroyWindow(box_);
+  }
+
+  Pointer<IDispatch> form;
+  Pointer<IDispatch> combo;
+  TypedPictureBox picture_box;
+
+ private:
+  HWND window_;
+  HWND box_;
+};
 
 /// A type and a value in a line.
 std::wstring shown_value(const VARIANT& value) {
@@ -253,7 +283,8 @@ std::wstring call_late(IDispatch* object, const Choice& choice) {
 
 class Calls {
  public:
-  Calls(IDispatch* object, unsigned seed) : object_(object), slots_(slots_of(object)), random_(seed) {
+  Calls(IDispatch* object, HostWindows& windows, unsigned seed)
+      : object_(object), slots_(slots_of(object)), random_(seed) {
     std::erase_if(slots_, [](const Slot& slot) {
       return std::ranges::find(left_out, slot.name) != std::end(left_out) ||
              std::ranges::any_of(slot.parameters,
@@ -265,6 +296,9 @@ class Calls {
     }
     for (const std::wstring_view text : texts)
       add_all_ways(values_, "text " + narrow(text), [text] { return Value(text); });
+    for (IDispatch* const host :
+         {windows.form.get(), windows.combo.get(), static_cast<IDispatch*>(&windows.picture_box)})
+      add_all_ways(values_, "an object of the host's", [host] { return Value(host); });
     for (const double number : doubles) {
       add_all_ways(values_, "date", [number] {
         Value date(number);
@@ -368,7 +402,8 @@ int wmain(int count, wchar_t** arguments) {
     SetCurrentDirectoryW(folder.data());
     free_texts_at_once();
     const Pointer<_ORVUtils> object = create_object();
-    Calls calls(object.get(), seed);
+    HostWindows windows;
+    Calls calls(object.get(), windows, seed);
     memory_stays_flat(calls, object.get(), wanted);
   });
 }
