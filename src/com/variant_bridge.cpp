@@ -141,7 +141,9 @@ void put(VARIANT& out, const ObjectRef& value) {
 // Records go back into the caller's own; a variable that holds none cannot take one.
 void put(VARIANT&, const SystemTime&) { raise(ErrorNumber::type_mismatch); }
 void put(VARIANT& out, const ForeignArray& value) {
-  if (FAILED(VariantCopy(&out, static_cast<const VARIANT*>(value.contents.get())))) throw std::bad_alloc();
+  // The platform's function takes no constant, and changes none.
+  auto* const native = const_cast<VARIANT*>(static_cast<const VARIANT*>(value.contents.get()));
+  if (FAILED(VariantCopy(&out, native))) throw std::bad_alloc();
 }
 
 /// A copy of an array that members can do nothing with but hand it back.
