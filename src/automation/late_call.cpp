@@ -110,10 +110,6 @@ Variant Parameter::default_value() const {
   }
 }
 
-Variant detail::late_pending(void* /*target*/, std::span<Argument> /*arguments*/, const Locale& /*locale*/) {
-  raise(ErrorNumber::action_not_supported);
-}
-
 std::optional<std::int32_t> LateInterface::find_identifier(TextView name) const {
   const std::int32_t slot = find(name);
   if (slot < 0) return {};

@@ -192,8 +192,6 @@ Variant late_put(void* target, std::span<Argument> arguments, const Locale& loca
   return {};
 }
 
-Variant late_pending(void* target, std::span<Argument> arguments, const Locale& locale);
-
 }  // namespace detail
 
 /// The policy that makes the functions behind late binding, slot by slot.
@@ -227,11 +225,6 @@ struct LateCalls {
   template <auto M, class... Names>
   static constexpr std::array<LateCall, 1> method(MemberName, const char*, Names...) {
     return {&detail::late_method<Target, M>};
-  }
-
-  template <auto M, class... Names>
-  static constexpr std::array<LateCall, 1> pending(MemberName, const char*, Names...) {
-    return {&detail::late_pending};
   }
 
   template <class... Rows>

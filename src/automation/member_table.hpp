@@ -135,7 +135,6 @@ struct Member {
   std::string_view help;
   std::int32_t identifier = 0;
   Access access = Access::call;
-  bool is_pending = false;  ///< Has its slot but answers 445 for now.
   ValueType result = ValueType::none;
   std::uint8_t parameter_count = 0;
   std::array<Parameter, most_parameters> all_parameters{};
@@ -242,13 +241,6 @@ struct Describe {
        ...);
     });
     return {member};
-  }
-
-  template <auto M, class... Names>
-  static constexpr std::array<Member, 1> pending(MemberName name, const char* help, Names... names) {
-    std::array<Member, 1> slot = method<M>(name, help, names...);
-    slot[0].is_pending = true;
-    return slot;
   }
 
   template <class... Rows>

@@ -72,9 +72,7 @@ Variant call_slot(Session& session, const Member& member, const std::vector<std:
     }
     return session.call(member, arguments);
   } catch (const RunTimeError& error) {
-    std::string message = name + ": " + error_words(error);
-    if (member.is_pending) message += " (not built yet; \"talutil list --missing\" shows all such members)";
-    throw run_time_failure(message);
+    throw run_time_failure(name + ": " + error_words(error));
   }
 }
 

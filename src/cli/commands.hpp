@@ -9,7 +9,6 @@
 namespace talutil::cli {
 
 struct ListOptions {
-  bool missing = false;
   bool json = false;
 };
 void list(const ListOptions& options);

@@ -51,7 +51,6 @@ void print_usage(const Entry& entry) {
 void help(const std::string& member) {
   const Entry entry = find_entry(Session::members().members, member);
   std::cout << signature(entry) << "\n\n  " << entry.any().help << '\n';
-  if (entry.any().is_pending) std::cout << "  Not built yet: every call answers error 445.\n";
   if (entry.is_method()) {
     print_arguments(entry.call->parameters());
   } else {

@@ -26,7 +26,6 @@ std::string entry_json(const Entry& entry) {
   std::vector<json::Field> fields{{"name", json::text(member.name)},
                                   {"access", json::text(access_words(entry))},
                                   {"type", json::text(type_name(entry.type()))},
-                                  {"built", flag(!member.is_pending)},
                                   {"signature", json::text(signature(entry))},
                                   {"help", json::text(member.help)}};
   if (entry.is_method()) {
@@ -37,20 +36,19 @@ std::string entry_json(const Entry& entry) {
   return json::object(fields);
 }
 
-void print_line(const Entry& entry, bool mark_missing) {
+void print_line(const Entry& entry) {
   constexpr std::size_t access_width = 9;
   std::string line = access_words(entry);
   line.resize(access_width, ' ');
-  std::cout << line << signature(entry) << (mark_missing && entry.any().is_pending ? "  (not built yet)" : "") << '\n';
+  std::cout << line << signature(entry) << '\n';
 }
 
 }  // namespace
 
 void list(const ListOptions& options) {
-  std::vector<Entry> entries = entries_of(Session::members().members);
-  if (options.missing) std::erase_if(entries, [](const Entry& entry) { return !entry.any().is_pending; });
+  const std::vector<Entry> entries = entries_of(Session::members().members);
   if (!options.json) {
-    for (const Entry& entry : entries) print_line(entry, !options.missing);
+    for (const Entry& entry : entries) print_line(entry);
     return;
   }
   std::string separator = "[\n";

@@ -61,7 +61,6 @@ void add_report(CLI::App& app, Request& request) {
 
 void add_list(CLI::App& app, Request& request) {
   auto* const command = app.add_subcommand("list", "List every member with its access and signature");
-  command->add_flag("--missing", request.list.missing, "Only those not built yet");
   command->add_flag("--json", request.list.json, "As a JSON array");
   command->callback([&] { request.run = [&] { list(request.list); }; });
 }

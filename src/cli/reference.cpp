@@ -19,23 +19,20 @@ std::string cell(std::string_view text) {
   return result;
 }
 
-std::string_view pending_cell(const Entry& entry) { return entry.any().is_pending ? "not built yet" : ""; }
-
 void print_settings(const std::vector<Entry>& entries) {
-  std::cout << "| Setting | Type | Access | What it is | |\n|---|---|---|---|---|\n";
+  std::cout << "| Setting | Type | Access | What it is |\n|---|---|---|---|\n";
   for (const Entry& entry : entries) {
     if (entry.is_method()) continue;
     std::cout << "| `" << entry.any().name << "` | " << type_name(entry.type()) << " | " << access_words(entry) << " | "
-              << cell(entry.any().help) << " | " << pending_cell(entry) << " |\n";
+              << cell(entry.any().help) << " |\n";
   }
 }
 
 void print_methods(const std::vector<Entry>& entries) {
-  std::cout << "| Method | What it does | |\n|---|---|---|\n";
+  std::cout << "| Method | What it does |\n|---|---|\n";
   for (const Entry& entry : entries) {
     if (!entry.is_method()) continue;
-    std::cout << "| `" << signature(entry) << "` | " << cell(entry.any().help) << " | " << pending_cell(entry)
-              << " |\n";
+    std::cout << "| `" << signature(entry) << "` | " << cell(entry.any().help) << " |\n";
   }
 }
 

@@ -165,7 +165,6 @@ HRESULT invoke(const LateInterface& table, void* target, const Locale& locale, c
   const Member& member = table.members[static_cast<std::size_t>(slot)];
   const FloatingPointSettings settings;
   try {
-    if (member.is_pending) raise(ErrorNumber::action_not_supported);
     Placement placement;
     HRESULT result = place_arguments(member, *given, invocation.bad_argument, placement);
     if (SUCCEEDED(result)) result = check_required(member, invocation, placement);

@@ -320,11 +320,6 @@ struct Vtable {
     return {};
   }
 
-  template <auto M, class... Names>
-  static constexpr SlotList<&MethodThunk<C, M>::call> pending(MemberName, const char*, Names...) {
-    return {};
-  }
-
   template <class... Rows>
   static constexpr auto rows(const Rows&...) -> decltype((SlotList<>{} + ... + Rows{})) {
     return {};

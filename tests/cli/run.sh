@@ -117,7 +117,6 @@ expect 'message box without a terminal' 0 'talutil: Closing ORVUtils Components 
 expect 'run-time error' 1 'talutil: GetData: error 5: Invalid procedure call or argument' call GetData A,B,C, 2 1
 expect 'a window without a screen' 1 'talutil: ShowSysInfo: error 445: There is no screen to show the window on' call ShowSysInfo
 expect_part 'an input box on the terminal' 0 'Name: Who are you?' call MyInputBox Name 'Who are you?'
-expect 'nothing is missing' 0 '' list --missing
 expect 'not a whole number' 1 \
   'talutil: GetData: iSt: "x" is not a whole number; write -2147483648 to 2147483647' call GetData A, x 2
 expect 'not a date' 1 \
@@ -139,8 +138,6 @@ expect_part 'list: put only' 0 "${nl}put      SplashForm As Variant${nl}" list
 expect_part 'list: method' 0 \
   "${nl}call     ReadCommaDelimStrToList(sTemp As String, ByRef sFList As String(), [sDelimiter As String = \",\"]) As Long${nl}" list
 verdict 'each name once' '' "$("$talutil" list | cut -c10- | sed 's/[( ].*//' | sort | uniq -d)"
-verdict 'missing and built make all' "$("$talutil" list | wc -l)" \
-  $(($("$talutil" list --missing | wc -l) + $("$talutil" list | grep -vc 'not built yet')))
 expect_part 'help: written back, default' 0 'sDelimiter  String; "," when left out' help readcommadelimstrtolist
 if command -v python3 >/dev/null; then
   verdict 'list --json is JSON' "$("$talutil" list | wc -l)" \

@@ -113,21 +113,6 @@ TEST_F(LibraryTest, ObjectPropertiesKeepObjectsOfTheirKindUntilTheNextPut) {
   }
 }
 
-TEST_F(LibraryTest, EveryPendingMemberAnswers445AndNoOther) {
-  const LateInterface& members = late_interface<ORVUtils>();
-  library.settings().DebugMode = 0;
-  for (std::size_t slot = 0; slot < members.members.size(); ++slot) {
-    const Member& member = members.members[slot];
-    std::vector<Argument> arguments;
-    for (const Parameter& parameter : member.parameters()) {
-      arguments.emplace_back(parameter.type == ValueType::text_array ? Variant() : Variant(std::int16_t{0}));
-    }
-    const std::int32_t number =
-        error_of([&] { members.call(&utils, static_cast<std::int32_t>(slot), arguments, plain_numbers); });
-    EXPECT_EQ(number == 445, member.is_pending) << member.name;
-  }
-}
-
 TEST_F(LibraryTest, AnotherMakersControlTakesItsPlace) {
   platform.controls[u"SystemInfoControl.MSysInfo"] = std::make_shared<ForeignSystemInformation>();
   library.start();
