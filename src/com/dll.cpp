@@ -15,21 +15,7 @@
 #include "infoforms/frm_components.hpp"
 #include "platform/win32/exception_frames.hpp"
 #include "platform/win32/module_path.hpp"
-#include "platform/win32/win32_code_page.hpp"
-#include "platform/win32/win32_cryptography.hpp"
-#include "platform/win32/win32_drawing.hpp"
-#include "platform/win32/win32_file_dialogs.hpp"
-#include "platform/win32/win32_files.hpp"
-#include "platform/win32/win32_folder_picker.hpp"
-#include "platform/win32/win32_folders.hpp"
-#include "platform/win32/win32_guids.hpp"
-#include "platform/win32/win32_input_boxes.hpp"
-#include "platform/win32/win32_machine.hpp"
 #include "platform/win32/win32_platform.hpp"
-#include "platform/win32/win32_printers.hpp"
-#include "platform/win32/win32_registry.hpp"
-#include "platform/win32/win32_settings.hpp"
-#include "platform/win32/win32_time_conversions.hpp"
 
 namespace talutil::com {
 
@@ -37,37 +23,9 @@ namespace {
 
 /// The platform of the DLL and the library on it.
 struct LoadedLibrary {
-  win32::Win32MessageBoxes message_boxes;
-  win32::Win32Screen screen;
-  win32::Win32Computer computer;
-  win32::Win32Clock clock;
-  win32::Win32FormWindows form_windows;
   RegisteredControls control_makers;
-  win32::Win32MessagePump message_pump;
-  win32::Win32RandomSource random_source;
-  win32::Win32Cryptography cryptography;
-  win32::Win32Profiles profiles;
-  win32::Win32SettingsStore settings_store;
-  win32::Win32TimeConversions time_conversions;
-  win32::Win32Files files;
-  win32::Win32FolderPicker folder_picker;
-  win32::Win32Guids guids;
-  win32::Win32Folders folders;
-  win32::Win32InputBoxes input_boxes;
-  win32::Win32Registry registry;
-  win32::Win32Network network;
-  win32::Win32FileDialogs file_dialogs;
-  win32::Win32Drawing drawing;
-  win32::Win32WindowPrinting window_printing;
-  win32::Win32FontFiles font_files;
-  win32::Win32Printers printers;
-  win32::Win32Machine machine;
-  win32::Win32CodePage code_page;
-  Library library{Platform{
-      message_boxes,   screen,       computer,    clock,          form_windows,     control_makers, message_pump,
-      random_source,   cryptography, profiles,    settings_store, time_conversions, files,          folder_picker,
-      guids,           folders,      input_boxes, registry,       network,          file_dialogs,   drawing,
-      window_printing, font_files,   printers,    machine,        code_page}};
+  win32::Win32Platform platform{control_makers};
+  Library library{platform.platform()};
 };
 
 struct Module {
