@@ -1,8 +1,9 @@
+#include "automation/control.hpp"
+
 #include <algorithm>
 #include <array>
 
 #include "automation/run_time_error.hpp"
-#include "automation/variant.hpp"
 
 namespace talutil {
 

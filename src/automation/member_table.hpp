@@ -8,9 +8,9 @@
 #include <string_view>
 #include <type_traits>
 
+#include "automation/control.hpp"
 #include "automation/object.hpp"
 #include "automation/system_time.hpp"
-#include "automation/variant.hpp"
 
 /// A class that is driven through automation has one table of its members, a function template over a policy:
 ///

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "automation/variant.hpp"
+#include "automation/control.hpp"
 
 namespace talutil {
 

@@ -2,8 +2,8 @@
 
 #include <algorithm>
 
+#include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
-#include "automation/variant.hpp"
 #include "controls/control_factory.hpp"
 
 namespace talutil {

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "automation/variant.hpp"
+#include "automation/control.hpp"
 
 /// What kind of a thing a host's object is. Objects tell by the members that they answer for, which are looked up and
 /// not used.

@@ -3,7 +3,7 @@
 #include <exception>
 #include <memory>
 
-#include "automation/variant.hpp"
+#include "automation/control.hpp"
 #include "controls/control.hpp"
 #include "preview/preview_view.hpp"
 

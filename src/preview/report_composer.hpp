@@ -1,6 +1,6 @@
 #pragma once
 
-#include "automation/variant.hpp"
+#include "automation/control.hpp"
 #include "preview/font_metrics.hpp"
 #include "preview/page_model.hpp"
 

@@ -2,8 +2,8 @@
 
 #include <array>
 
+#include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
-#include "automation/variant.hpp"
 #include "controls/zip_controls.hpp"
 #include "infoforms/frm_components.hpp"
 #include "library/library.hpp"

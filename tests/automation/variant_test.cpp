@@ -1,4 +1,4 @@
-#include "automation/variant.hpp"
+#include "automation/control.hpp"
 
 #include <gtest/gtest.h>
 

@@ -1,6 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "automation/variant.hpp"
+#include "automation/control.hpp"
 #include "controls/zip_controls.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
