@@ -1,4 +1,5 @@
-# The libraries that tools/third_party.sh builds: archives::zip, archives::deflate and documents::pdf.
+# The libraries that tools/third_party.sh builds: archives::zip, archives::deflate and documents::pdf. Configuring looks
+# for them and installs nothing.
 set(flavour native)
 if(WIN32 AND CMAKE_SIZEOF_VOID_P EQUAL 8)
   set(flavour windows64)
@@ -7,10 +8,11 @@ elseif(WIN32)
 elseif(TALUTIL_FUZZ)
   set(flavour fuzz)
 endif()
-execute_process(COMMAND ${CMAKE_SOURCE_DIR}/tools/third_party.sh ${flavour} OUTPUT_VARIABLE third_party
-                OUTPUT_STRIP_TRAILING_WHITESPACE RESULT_VARIABLE status)
-if(NOT status EQUAL 0)
-  message(FATAL_ERROR "tools/third_party.sh ${flavour} failed; its reason stands above")
+execute_process(COMMAND ${CMAKE_SOURCE_DIR}/tools/third_party.sh --where ${flavour} OUTPUT_VARIABLE third_party
+                OUTPUT_STRIP_TRAILING_WHITESPACE COMMAND_ERROR_IS_FATAL ANY)
+if(NOT EXISTS ${third_party}/lib)
+  message(FATAL_ERROR "The libraries for archives and documents are not in ${third_party}: run "
+                      "\"tools/third_party.sh ${flavour}\" once, which installs what it needs and builds them")
 endif()
 set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS tools/third_party.sh)
 # The DLL brings no other with it.

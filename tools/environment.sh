@@ -35,6 +35,9 @@ need_packages() {
     fail "could not install: ${missing[*]}"
 }
 
+# The kind of third-party libraries that a preset is built with.
+flavour_of() { case $1 in windows* | fuzz) echo "$1" ;; *) echo native ;; esac; }
+
 # The Wine root: a small i386 Debian of its own, because 32-bit Wine cannot stand beside the 64-bit
 # packages. Its folder is named by a hash of the recipe, so every checkout on the machine shares it and
 # a changed recipe makes a new one. The folder appears under its name only when it is complete.

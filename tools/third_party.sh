@@ -2,7 +2,8 @@
 # Builds the libraries that the distribution does not offer in the form we need, once a machine, and prints the folder
 # that holds their headers and archives:
 #
-#   tools/third_party.sh native|windows|windows64|fuzz
+#   tools/third_party.sh native|windows|windows64|fuzz            builds them if they are not there
+#   tools/third_party.sh --where native|windows|windows64|fuzz    builds nothing
 #
 # The sources are those of the distribution's source packages, checked by apt. The folder lies in the user's cache and
 # is named by a hash of this recipe and its patches, so that every checkout shares it and a change makes a new one.
@@ -11,6 +12,8 @@ set -euo pipefail
 
 suite=bookworm
 recipe=$(cat "${BASH_SOURCE[0]}" "$talutil_top"/cmake/patches/*.patch | sha256sum | cut -c1-12)
+is_asked_only=
+[ "${1:-}" != --where ] || { is_asked_only=1; shift; }
 flavour=${1:-}
 prefix=$talutil_cache/third-party-$recipe/$flavour
 work=
@@ -30,7 +33,7 @@ case $flavour in
     flags="-O2 -ffunction-sections -fdata-sections"
     ;;
   fuzz) cc=clang ar=ar flags="-O1 -g1 -fPIC -fsanitize=address,fuzzer-no-link" ;;
-  *) fail "usage: $0 native|windows|windows64|fuzz" ;;
+  *) fail "usage: $0 [--where] native|windows|windows64|fuzz" ;;
 esac
 
 # Fetches the original archive of a source package and unpacks it below $work, under the package's name.
@@ -85,7 +88,7 @@ build_libharu() {
   cp "$work"/libharu/include/*.h "$made/include/"
 }
 
-if [ ! -d "$prefix" ]; then
+if [ -z "$is_asked_only" ] && [ ! -d "$prefix" ]; then
   {
     need_packages $native_packages
     [ "$flavour" != windows ] || need_packages $windows_packages
