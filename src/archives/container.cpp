@@ -128,7 +128,7 @@ zip_int64_t Container::read_or_write(void* data, zip_uint64_t length, zip_source
         writing_->write_at(write_place_, {static_cast<const char*>(data), static_cast<std::size_t>(length)});
       });
       write_place_ += length;
-      // Also while old entries are copied, which nothing else tells of.
+      // Also while old entries are copied, which nothing else reports.
       progress_->advance(0, {});
       return static_cast<zip_int64_t>(length);
     case ZIP_SOURCE_SEEK_WRITE:

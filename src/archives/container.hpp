@@ -15,7 +15,7 @@ namespace talutil::archives {
 /// What a callback of the container library has thrown. Exceptions do not pass through C.
 class Fault {
  public:
-  /// `other` stands for what the library has no clear word for: damage while reading, a fault of ours while writing.
+  /// `other` stands for what the library has no clear word for: damage while reading, our own fault while writing.
   explicit Fault(Code other) noexcept : other_(other) {}
 
   /// Does something inside a callback; what it throws is kept and answered by the library's word for failure.
@@ -56,7 +56,7 @@ class Container {
   /// Throws for the last failure of the library.
   [[noreturn]] void fail() const { fault_.fail(zip_get_error(archive_)); }
 
-  /// Writes what was added. Throws as what is told about it did, and then nothing counts as written.
+  /// Writes what was added. Throws what the progress callback threw, and then nothing counts as written.
   void write();
 
  private:

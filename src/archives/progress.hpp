@@ -8,7 +8,7 @@
 
 namespace talutil::archives {
 
-/// How far a run is, told to whoever watches it; the watcher ends the run by answering false.
+/// How far a run is, reported to whoever watches it; the watcher ends the run by answering false.
 class Progress {
  public:
   using Watcher = std::function<bool(std::uint64_t done, std::uint64_t total, TextView name)>;

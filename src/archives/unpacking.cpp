@@ -236,7 +236,7 @@ class Password {
   bool is_proved_ = false;
 };
 
-/// Entries that were not unpacked, to be told at the end.
+/// Entries that were not unpacked, to be reported at the end.
 class PassedOver {
  public:
   void add(const Text& entry) {

@@ -90,7 +90,7 @@ class Cell {
     if constexpr (is_written_back) before_ = *used_;
   }
 
-  /// An object that stands for a record gets what the member wrote while errors can still be told.
+  /// An object that stands for a record gets what the member wrote while errors can still be reported.
   void give_back() {
     if constexpr (is_record) put_changed_fields(argument_->value, before_, *used_, *locale_);
   }

@@ -37,7 +37,7 @@ class RepeatedUse {
   virtual bool run_truth(const Locale& locale) = 0;
 };
 
-/// A late-bound automation object: a control of ours, or one of the host's. Members are named or given by
+/// A late-bound automation object: one of our controls, or one of the host's. Members are named or given by
 /// dispatch identifier.
 class Object {
  public:

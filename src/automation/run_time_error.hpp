@@ -55,8 +55,8 @@ enum class ErrorNumber : std::int32_t {
 /// The standard text of a number; the text of an unknown number is "Application-defined or object-defined error".
 [[nodiscard]] std::string_view standard_description(std::int32_t number) noexcept;
 
-/// Where an error comes from that another object raised, as that object tells it, and where to read about it: what a
-/// host sees as Err.Source, Err.HelpFile and Err.HelpContext. What the object does not tell is empty.
+/// Where an error comes from that another object raised, as that object reports it, and where to read about it: what a
+/// host sees as Err.Source, Err.HelpFile and Err.HelpContext. What the object does not say is empty.
 struct ErrorOrigin {
   Text source;
   Text help_file;

@@ -87,7 +87,7 @@ archives::PasswordQuestion question(InputBoxes& boxes) {
   };
 }
 
-/// Does the work of a subcommand; a failure is told with the archive's name and the code that hosts know.
+/// Does the work of a subcommand; a failure is reported with the archive's name and the code that hosts expect.
 template <class Work>
 void on_archive(const std::string& archive, Work work) {
   try {

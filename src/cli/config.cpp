@@ -116,7 +116,7 @@ void config_set(const ConfigOptions& options) {
               << ": an empty value, and one that begins with a backslash, is read as a "
               << "missing one\n";
   }
-  // The platform tells nobody of a file that cannot be written: what is read now tells.
+  // The platform does not report a file that cannot be written: reading it back shows.
   ProfileDocument expected("");
   expected.put(section, item, from_ansi(to_ansi(written)));
   const Text read = session.platform().profiles.value(file, section, item);

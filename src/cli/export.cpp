@@ -45,7 +45,7 @@ void select_rows(Grid& grid, const ExportOptions& options) {
   grid.put_RowSel(last);
 }
 
-/// Does some work on a file; a run-time error is told with the file's name.
+/// Does some work on a file; a run-time error is reported with the file's name.
 template <class Work>
 void on_file(const std::string& path, Work work) {
   try {

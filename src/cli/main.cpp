@@ -91,7 +91,7 @@ void add_code_page(CLI::App& command, std::optional<std::uint32_t>& number, cons
 
 void add_call(CLI::App& app, Request& request) {
   auto* const command = app.add_subcommand("call", "Call a method, read a setting or put one: MEMBER [ARGUMENT]...");
-  // What is no option of ours is an argument, in its order: "-1" and "-x" need no "--" before them.
+  // What is not one of our options is an argument, in its order: "-1" and "-x" need no "--" before them.
   command->allow_extras();
   command->set_help_flag("--help", "Print this help message and exit");
   command->add_option("MEMBER", request.call.member, "The member's name, in any case")->required();

@@ -4,7 +4,7 @@
 
 namespace talutil::cli {
 
-/// Tells on standard error how far a file above 50 MB is read, where that is a terminal; else tells nothing.
+/// Reports on standard error how far a file above 50 MB is read, where that is a terminal; silent elsewhere.
 [[nodiscard]] posix::PosixFiles::Progress reading_progress();
 
 }  // namespace talutil::cli

@@ -77,11 +77,11 @@ HRESULT result_of(std::int32_t number) noexcept {
   return static_cast<HRESULT>(bits <= 0xFFFF ? run_time_facility + bits : bits);
 }
 
-RunTimeError error_of(HRESULT result, TextView description, const ErrorOrigin& told) {
+RunTimeError error_of(HRESULT result, TextView description, const ErrorOrigin& reported) {
   const std::int32_t number = number_of(result);
   // A run-time error that nobody claims is what a late-bound call of the library's met with.
   std::optional<ErrorOrigin> origin;
-  if (told != ErrorOrigin{} || !is_run_time_number(number)) origin = told;
+  if (reported != ErrorOrigin{} || !is_run_time_number(number)) origin = reported;
   if (!description.empty()) return {number, Text(description), std::move(origin)};
   return {number, is_run_time_number(number) ? from_utf8(standard_description(number)) : system_text(result),
           std::move(origin)};

@@ -11,9 +11,9 @@ namespace talutil::com {
 /// stays what it was.
 [[nodiscard]] HRESULT result_of(std::int32_t number) noexcept;
 
-/// A run-time error from the failed result of another object, with what it told of it. Results that hosts know by a
-/// run-time number become that number; others stay what they are and, where the object told no text, have the system's.
-[[nodiscard]] RunTimeError error_of(HRESULT result, TextView description, const ErrorOrigin& told = {});
+/// A run-time error from the failed result of another object, with what it reported. Results that hosts know by a
+/// run-time number become that number; others stay what they are and, where the object gave no text, have the system's.
+[[nodiscard]] RunTimeError error_of(HRESULT result, TextView description, const ErrorOrigin& reported = {});
 
 /// The failed result of a function of the system's, which leaves the library as it came.
 [[nodiscard]] RunTimeError system_error(HRESULT result);

@@ -15,7 +15,7 @@ namespace talutil::com {
 
 namespace {
 
-/// What an object told of its failure; its texts are freed here.
+/// What an object reported of its failure; its texts are freed here.
 class ExceptionInformation {
  public:
   ExceptionInformation() = default;
@@ -214,7 +214,7 @@ class UndrivenObject final : public Object {
   }
 };
 
-/// One of ours, for a host.
+/// One of our objects, for a host.
 class ObjectDispatch final : public IDispatch {
  public:
   explicit ObjectDispatch(ObjectRef object) noexcept : object_(std::move(object)) {}

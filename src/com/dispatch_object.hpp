@@ -6,7 +6,7 @@
 /// Objects on their way between automation and the library, in both directions.
 namespace talutil::com {
 
-/// A host's object, or another maker's control, as ours. An empty pointer is an empty reference. An object that cannot
+/// A host's object, or a third-party control, as ours. An empty pointer is an empty reference. An object that cannot
 /// be driven late-bound raises 13 at each use, and not before: a member may have its own way with errors.
 [[nodiscard]] ObjectRef object_from(IUnknown* object);
 

@@ -42,7 +42,7 @@ struct Module {
 
 Module module_state;
 
-/// Keeps the DLL in the process until that ends. Hosts may hold objects, windows and timers of ours in ways that no
+/// Keeps the DLL in the process until that ends. Hosts may hold our objects, windows and timers in ways that no
 /// count sees, and each unloading would leave a slot and some memory of the compiler's run-time behind.
 void stay_loaded() noexcept {
   HMODULE module = nullptr;

@@ -37,7 +37,7 @@ double decimal_to_double(DECIMAL value) {
   return result;
 }
 
-/// A whole number of any size as the smallest kind of ours that holds it.
+/// A whole number of any size as our smallest kind that holds it.
 template <class T>
 Variant whole_number(T value) {
   if (std::in_range<std::int16_t>(value)) return static_cast<std::int16_t>(value);

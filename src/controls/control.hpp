@@ -8,7 +8,7 @@
 #include "platform/platform.hpp"
 
 /// Our own controls. Each is a class with a table of its members (see member_table.hpp) and is driven
-/// late-bound, exactly as another maker's would be: names are found without case, identifiers may be given
+/// late-bound, exactly as a third-party one would be: names are found without case, identifiers may be given
 /// by the table where hosts know them, and what a control does not have raises 438.
 namespace talutil {
 

@@ -19,7 +19,7 @@ Text day_and_month(std::int32_t day_of_year, bool is_leap_calendar) {
 }
 
 /// The layout of the tables comes from today's year, not from the one they are filled for: the calendar object
-/// that hosts used to provide was never told of that year.
+/// that hosts used to provide never heard of that year.
 bool is_leap_calendar(Library& library) { return is_leap_year(parts_of(library.platform().clock.now()).year); }
 
 }  // namespace

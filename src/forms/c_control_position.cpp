@@ -42,7 +42,7 @@ void cControlPosition::DragControl(const Variant& vForm, const Variant& oCtrl, f
     across = control.get<float>(u"ScaleX", {across, mode, twips});
     down = control.get<float>(u"ScaleY", {down, mode, twips});
   }
-  // From the distances as the mouse told them, whatever the control's own scale has made of them.
+  // From the distances that the mouse reported, whatever the control's own scale has made of them.
   if (const Control container(control.get(u"Container"), locale); has_scale(container)) {
     const Variant mode = container.get(u"ScaleMode");
     across = container.get<float>(u"ScaleX", {distance(X, DragStartX), twips, mode});

@@ -38,7 +38,7 @@ void Form::show_modal() {
 }
 
 template <class Work>
-void Form::told(Work work) noexcept {
+void Form::report_errors(Work work) noexcept {
   try {
     try {
       work();
@@ -54,19 +54,19 @@ void Form::told(Work work) noexcept {
 }
 
 void Form::clicked(std::uint8_t part) noexcept {
-  told([&] { on_click(part); });
+  report_errors([&] { on_click(part); });
 }
 
 void Form::tab_chosen(std::uint8_t /*part*/, std::int32_t tab) noexcept {
-  told([&] { on_tab(tab); });
+  report_errors([&] { on_tab(tab); });
 }
 
 void Form::escaped() noexcept {
-  told([&] { on_escape(); });
+  report_errors([&] { on_escape(); });
 }
 
 void Form::closing(CloseMode mode) noexcept {
-  told([&] { on_closing(mode); });
+  report_errors([&] { on_closing(mode); });
 }
 
 }  // namespace talutil

@@ -47,7 +47,7 @@ class Form : public FormEvents {
 
  private:
   template <class Work>
-  void told(Work work) noexcept;
+  void report_errors(Work work) noexcept;
 
   Library& library_;
   const FormDescription& description_;

@@ -50,7 +50,7 @@ struct FormDescription {
 /// Who closes a window, by the numbers that forms know.
 enum class CloseMode : std::uint8_t { control_menu = 0, code = 1 };
 
-/// What a window tells its presenter. None of these throws.
+/// What a window reports to its presenter. None of these throws.
 class FormEvents {
  public:
   virtual ~FormEvents() = default;

@@ -7,7 +7,7 @@ namespace talutil {
 class Grid;
 
 /// Copies what a grid shows into a table and saves that as comma text. Hidden rows and columns are left out. Grids are
-/// driven in the order told; the source is only read.
+/// driven in a fixed order; the source is only read.
 class GridExport {
  public:
   /// Empties the table and gives it a column for each that the grid shows.
@@ -27,7 +27,7 @@ class GridExport {
 
   const Control& grid_;
   const Control& table_;
-  Grid* own_table_;  ///< The table, where it is a grid of ours: cells go into it without detour. Else null.
+  Grid* own_table_;  ///< The table, where it is our own grid: cells go into it without detour. Else null.
   std::int32_t copied_ = 0;
 };
 

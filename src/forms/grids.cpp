@@ -17,9 +17,9 @@ constexpr double ticked = 1;
 
 Text width_item(std::int32_t column) { return number_to_text(column) + u"ColWidth"; }
 
-/// Does the work of a member that tells its errors in a message box.
+/// Does the work of a member that reports its errors in a message box.
 template <class Work>
-void telling_errors(const Platform& platform, TextView member, Work work) {
+void reporting_errors(const Platform& platform, TextView member, Work work) {
   try {
     work();
   } catch (...) {
@@ -50,7 +50,7 @@ void ORVUtils::SaveGridWidths(const Variant& Grid1, const Text& sCFGStr, const s
 }
 
 void ORVUtils::SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid, const std::int16_t& iSwitch) {
-  telling_errors(library_.platform(), u"SelectGridRows", [&] {
+  reporting_errors(library_.platform(), u"SelectGridRows", [&] {
     const Control grid(vGrid, locale());
     const auto rows = grid.get<std::int32_t>(u"Rows");
     const auto first = grid.get<std::int32_t>(u"FixedRows");
@@ -66,7 +66,7 @@ void ORVUtils::SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid,
 
 std::int32_t ORVUtils::CountGridSelectedRows(const std::int32_t& lColumn, const Variant& vGrid) {
   std::int32_t count = 0;
-  telling_errors(library_.platform(), u"CountGridSelectedRows", [&] {
+  reporting_errors(library_.platform(), u"CountGridSelectedRows", [&] {
     const Control grid(vGrid, locale());
     if (!grid.get(u"ColDataType", {lColumn}).equals_number(boolean_column, grid.locale())) return;
     const auto rows = grid.get<std::int32_t>(u"Rows");
@@ -98,7 +98,7 @@ void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontS
     // A table of this call's own: a host that is asked for a cell may export another grid before it answers.
     const Control scratch(library_.controls().create(Grid::class_name), locale());
     GridExport grid_export(grid, scratch);
-    // The sense is as hosts know it: True is every row, from the one that iDontSaveHeader tells.
+    // The sense is as hosts know it: True is every row, from the one that iDontSaveHeader gives.
     if (bSelection.is_exactly_true())
       grid_export.copy_all_rows(iDontSaveHeader);
     else

@@ -160,7 +160,7 @@ void FrmSysInfo::on_click(std::uint8_t part) {
     }
     case refresh:
       read();
-      // What has gone meanwhile is told, and shown no longer.
+      // What has gone meanwhile is reported, and shown no longer.
       if (const Text typed = view.text(path); item_ && !typed.empty()) {
         item_.reset();
         show_tab(view);

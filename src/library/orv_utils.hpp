@@ -12,7 +12,7 @@ class Library;
 
 /// The toolkit object that hosts create. Objects have no state of their own: settings live in the library.
 ///
-/// Members stand in the order of their slots. The signature tells the interface: `T` is passed by value,
+/// Members stand in the order of their slots. The signature states the interface: `T` is passed by value,
 /// `const T&` by reference and never changed, `T&` by reference and written back. Members call one another
 /// through the object, so an override of one is seen by the others. Any run-time error leaves a member as
 /// RunTimeError; what it had written back by then stays written.
@@ -306,13 +306,13 @@ class ORVUtils {
                                const Boolean& bSaveToFile);
 
   /// Packs the items of a list (see item_list.hpp) into an archive, encrypted where a password is given; 1 for
-  /// iMultiVolume makes a split set. What goes wrong is told in a message box and not to the caller. bUseFilePath is
-  /// not used.
+  /// iMultiVolume makes a split set. What goes wrong is shown in a message box and not reported to the caller.
+  /// bUseFilePath is not used.
   virtual void CallZIPFiles(const Text& sZipName, const Text& sItems, const std::int16_t& iMultiVolume,
                             const Text& sEncryptionPassword, const Boolean& bUseFilePath);
 
-  /// Unpacks the entries of a list, or all, below a folder. What goes wrong is told in a message box. Encrypted entries
-  /// are tried with the password of the last CallZIPFiles, then the user is asked.
+  /// Unpacks the entries of a list, or all, below a folder. What goes wrong is shown in a message box. Encrypted
+  /// entries are tried with the password of the last CallZIPFiles, then the user is asked.
   virtual void CallUnZIPFiles(const Text& sUnZipName, const Text& sDestPath, const Text& sItems,
                               const Boolean& bOverWrite);
 
@@ -351,7 +351,7 @@ class ORVUtils {
 
   /// Has a list-combo control search for the text typed into it. 0 when there is none, -1 when it is not found, else
   /// the ListIndex of the control afterwards: that of the entry found with msgFlag 2, else the one it had before.
-  /// @param msgFlag 1 tells of a failed search in a message box, 2 selects the entry found
+  /// @param msgFlag 1 reports a failed search in a message box, 2 selects the entry found
   /// Adds 1 to CounterVerifyText. Raises what the control raises, 6 for a ListIndex beyond 16 bits.
   virtual std::int32_t SearchCombo(const Variant& cboCombo, const std::int16_t& msgFlag);
 
@@ -415,8 +415,8 @@ class ORVUtils {
   /// until the user closes the window. Raises 445 where there is no screen.
   virtual void ShowSysInfo();
 
-  /// Deletes the files that match; wildcards may stand in the last part. Read-only files stay. Never fails and never
-  /// tells.
+  /// Deletes the files that match; wildcards may stand in the last part. Read-only files stay. No failure is
+  /// reported.
   virtual void DeleteFiles(const Text& sFileSpec);
 
   /// True, whatever the address: the test is switched off.
@@ -427,10 +427,10 @@ class ORVUtils {
   virtual void AppendEventLog(const Text& sEventName, const Text& sEventForm);
 
   /// Ticks (iSwitch 1) or clears (0) all rows of a column of check boxes, one whose ColDataType is 11; hidden rows too.
-  /// An error is told in a message box and ends it.
+  /// An error is shown in a message box and ends it.
   virtual void SelectGridRows(const std::int32_t& lColumn, const Variant& vGrid, const std::int16_t& iSwitch);
 
-  /// The ticked rows of a column of check boxes, hidden ones too; 0 for another column. An error is told in a message
+  /// The ticked rows of a column of check boxes, hidden ones too; 0 for another column. An error is shown in a message
   /// box; the result is then what was counted before.
   virtual std::int32_t CountGridSelectedRows(const std::int32_t& lColumn, const Variant& vGrid);
 
@@ -446,11 +446,11 @@ class ORVUtils {
   /// opened, -1 for a type other than 1 (text) and 4 (number).
   virtual std::int32_t REGISTRY_QueryValue(const Text& sKeyName, const Text& sValueName);
 
-  /// A value as text; empty where it cannot be read. No failure is told.
+  /// A value as text; empty where it cannot be read. No failure is reported.
   virtual Text REGISTRY_ReturnValue(const Text& sKeyName, const Text& sValueName);
 
   /// Writes a value of a key that exists, as type 1 or 4; other types write nothing. Raises what the conversion of the
-  /// value raises (94 for Null, 13, 6), but tells no failure of the registry.
+  /// value raises (94 for Null, 13, 6), but reports no failure of the registry.
   virtual void REGISTRY_SetKeyValue(const Text& sKeyName, const Text& sValueName, const Variant& vValueSetting,
                                     const std::int32_t& lValueType);
 
@@ -506,7 +506,7 @@ class ORVUtils {
   virtual void SystemTimeToDate(const SystemTime& system_time, Date& the_date);
 
   /// A local time as UTC and back, to the second, by the zone's offset of today whatever the date: summers and
-  /// winters are not told apart. Times before 1601 are beyond the conversion.
+  /// winters are not distinguished. Times before 1601 are beyond the conversion.
   virtual Date LocalTimeToUTC(Date the_date);
   virtual Date UTCToLocalTime(Date the_date);
 

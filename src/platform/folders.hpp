@@ -10,7 +10,7 @@
 #include "automation/text.hpp"
 #include "platform/files.hpp"
 
-/// Folders as archives need them: held open, their entries used by exact name, links told apart.
+/// Folders as archives need them: held open, their entries used by exact name, links recognised.
 namespace talutil {
 
 enum class FileKind : std::uint8_t { file, folder, link, other };

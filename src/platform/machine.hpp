@@ -7,7 +7,7 @@
 #include "automation/date.hpp"
 #include "automation/text.hpp"
 
-/// What the system information tells of the machine. Sizes are bytes; what the platform does not tell is 0 or empty.
+/// What the system information shows of the machine. Sizes are bytes; what the platform does not report is 0 or empty.
 namespace talutil {
 
 struct DriveFacts {

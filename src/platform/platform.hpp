@@ -94,7 +94,7 @@ class FormWindows {
   /// A window with controls. The description and the presenter outlive it. Raises 445 where there is no screen.
   [[nodiscard]] virtual std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) = 0;
 
-  /// The preview window, which shows the pages of a print control; null for another maker's, which shows them itself.
+  /// The preview window, which shows the pages of a print control; null for a third-party one, which shows them itself.
   /// Both outlive the view.
   [[nodiscard]] virtual std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) = 0;
 };
@@ -115,7 +115,7 @@ class ControlMakers {
  public:
   virtual ~ControlMakers() = default;
 
-  /// Another maker's control that the user has registered to stand for a class name; nothing where none is.
+  /// A third-party control that the user has registered to stand for a class name; nothing where none is.
   /// Raises 429 when one is registered but cannot be created.
   [[nodiscard]] virtual ObjectRef create(TextView class_name) = 0;
 };

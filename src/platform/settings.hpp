@@ -22,7 +22,7 @@ class Profiles {
   [[nodiscard]] virtual Text item_names(const Text& file, const Text& section) = 0;
 
   /// Puts a value in the place of the item's, or adds the item at the end of its section, or both at the end of the
-  /// file. Nobody is told when that fails.
+  /// file. A failure is not reported.
   virtual void put(const Text& file, const Text& section, const Text& item, const Text& value) = 0;
 };
 
@@ -32,10 +32,10 @@ class SettingsStore {
  public:
   virtual ~SettingsStore() = default;
 
-  /// Empty when there is none. Raises an error that tells what is wrong with the store when it cannot be read.
+  /// Empty when there is none. Raises an error that says what is wrong with the store when it cannot be read.
   [[nodiscard]] virtual std::optional<Text> value(const Text& application, const Text& section, const Text& key) = 0;
 
-  /// Raises an error that tells what is wrong with the store when it cannot be written.
+  /// Raises an error that says what is wrong with the store when it cannot be written.
   virtual void put(const Text& application, const Text& section, const Text& key, const Text& value) = 0;
 };
 

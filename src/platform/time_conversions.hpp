@@ -5,7 +5,7 @@
 namespace talutil {
 
 /// The platform's conversions of broken-down times and of local time, which goes by the offset of today whatever
-/// date is converted. Each leaves its output as it was where the platform refuses, and tells nobody.
+/// date is converted. Each leaves its output as it was where the platform refuses, and reports nothing.
 class TimeConversions {
  public:
   virtual ~TimeConversions() = default;

@@ -75,7 +75,7 @@ class FrmPrintPreview final : public PreviewEvents {
   std::unique_ptr<Control> save_dialog_;
   std::unique_ptr<Control> pdf_export_;
   ObjectRef form_;
-  std::exception_ptr failure_;  ///< What the caller of show_modal is to be told.
+  std::exception_ptr failure_;  ///< What show_modal raises at its end.
   bool is_loading_ = false;     ///< From loading until the first activation.
   bool is_shown_ = false;
   float twips_x_ = 0;

@@ -69,7 +69,7 @@ inline constexpr PreviewMenuItem preview_menu[] = {
     {u"Simplex", PreviewMenu::mnuSimplex, 2},
 };
 
-/// What a preview window tells its presenter. None of these throws.
+/// What a preview window reports to its presenter. None of these throws.
 class PreviewEvents {
  public:
   virtual ~PreviewEvents() = default;
@@ -77,7 +77,7 @@ class PreviewEvents {
   /// The window is shown. Coming back from another program does not count.
   virtual void activated() noexcept = 0;
 
-  /// The window has another size; not told while it is being made.
+  /// The window has another size; not reported while it is being made.
   virtual void resized() noexcept = 0;
   virtual void chosen(PreviewMenu item) noexcept = 0;
 

@@ -87,7 +87,7 @@ void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16
 
   const Control grid(ctlGrid, locale());
   print.call(u"StartDoc");
-  // Ours lays the grid out by asking it; another maker's has its window alone.
+  // Ours lays the grid out by asking it; a third-party one has its window alone.
   if (print.answers(u"RenderObject")) print.put(u"RenderObject", grid.object());
   print.put(u"RenderControl", grid.get<std::int32_t>(u"hwnd"));
   print.call(u"EndDoc");

@@ -63,7 +63,7 @@ constexpr std::array<TextView, 22> explanations = {
     u"ZE_MVUSAGE   Improper use of a multi-volume ZIP file - You tried to use a Multi-Volume ZIP file like a "
     u"non-multi-volume ZIP file. For example, you can not grow an existing multi-volume ZIP file."};
 
-// What another maker's control in the place of ours is told under these identifiers is told to ours too: its settings
+// What a third-party control in the place of ours is given under these identifiers is given to ours too: its settings
 // are emptied one by one, since a control keeps those of the last action.
 using Identifiers = std::initializer_list<std::int32_t>;
 

@@ -10,7 +10,7 @@ namespace talutil {
 Boolean ORVUtils::PingSite(const Text& /*sAddress*/) { return Boolean(true); }
 
 Variant ORVUtils::GetIpAddrTable() {
-  // The room for 21 rows, no more: a machine with more addresses has none as far as hosts are told.
+  // The room for 21 rows, no more: a machine with more addresses has none as far as hosts see.
   std::array<std::uint8_t, 512> table{};
   constexpr std::size_t first_row = 4;
   constexpr std::size_t row_size = 24;

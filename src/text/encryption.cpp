@@ -9,7 +9,7 @@ namespace {
 /// The same in every library, so that a cipher text of one installation is read by all others.
 constexpr TextView pass_phrase = u"w4Tq%Lp2#Zr9!Kb7&Nt8*Hy3@Jm5^Xc1";
 
-// What the encryption control on the components window is told; another maker's in its place knows these codes.
+// What the encryption control on the components window is given; a third-party one in its place knows these codes.
 constexpr std::int32_t key_bits = 256;
 constexpr std::int32_t key_derivation = 1;
 constexpr std::int32_t key_mode = 1;

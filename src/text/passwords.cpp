@@ -44,7 +44,7 @@ std::int32_t draw(const Mix& mix, std::int32_t previous, RandomSingles& random, 
   messages.handle_waiting();
   if (!mix.draws) {
     // A repeated number stays one for good: the member does not return. It sleeps between the host's messages, and
-    // gives up when the host is told to.
+    // gives up when the host is asked to.
     while (previous == 0) {
       if (!messages.wait_and_handle()) raise(ErrorNumber::user_interrupt);
     }

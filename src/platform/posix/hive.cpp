@@ -71,7 +71,7 @@ void Hive::bind_tree(const Statement& statement, TextView key) const {
 
 void Hive::open() {
   if (database_) return;
-  std::error_code ignored;  // SQLite tells below that it cannot open the file.
+  std::error_code ignored;  // SQLite reports below that it cannot open the file.
   std::filesystem::create_directories(std::filesystem::path(path_).parent_path(), ignored);
   sqlite3* handle = nullptr;
   const int status = sqlite3_open(path_.c_str(), &handle);
@@ -127,7 +127,7 @@ void Hive::put(TextView key, TextView name, const Value& value) {
   require(sqlite3_bind_int64(row, 5, value.type), SQLITE_OK);
   bind(insert_, 6, value.data);
   const int status = sqlite3_step(row);
-  // The reason goes with the reset, so it is told first.
+  // The reason goes with the reset, so it is read first.
   require(status, SQLITE_DONE);
   sqlite3_reset(row);
 }

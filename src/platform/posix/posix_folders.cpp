@@ -178,7 +178,7 @@ class PosixFolder final : public Folder {
   [[nodiscard]] std::unique_ptr<StoredFile> open(TextView name) override {
     Descriptor file(openat(folder_.get(), to_utf8(name).c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     if (file.get() < 0) raise_for(errno, {});
-    // What another writes just now is not to be read; from here on its locks are no matter of ours.
+    // What another writes just now is not to be read; from here on its locks do not concern us.
     lock(file, LOCK_SH);
     flock(file.get(), LOCK_UN);
     return std::make_unique<PosixStoredFile>(std::move(file));

@@ -59,7 +59,7 @@ Locale environment_locale() {
   if (result.thousands_separator == result.decimal_separator) {
     result.thousands_separator = result.decimal_separator == u',' ? u'.' : u',';
   }
-  // The first character tells the symbol's place.
+  // The first character stands for the symbol's place.
   if (const auto currency = item(CRNCYSTR); !currency.empty()) {
     result.set_currency(from_utf8(currency.substr(1)));
   }

@@ -63,7 +63,7 @@ class PosixFormWindows final : public FormWindows {
   std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) override;
 };
 
-/// Controls of other makers exist on Windows only.
+/// Third-party controls exist on Windows only.
 class PosixControlMakers final : public ControlMakers {
  public:
   ObjectRef create(TextView /*class_name*/) override { return nullptr; }

@@ -73,7 +73,7 @@ void PosixProfiles::put(const Text& file, const Text& section, const Text& item,
     output->write(after);
     output->close();
   } catch (const RunTimeError&) {
-    // As on the other platform, nobody is told.
+    // As on the other platform, this is not reported.
     return;
   }
 }

@@ -14,7 +14,7 @@ namespace {
 // As sequential files are opened: others may read and write meanwhile.
 constexpr DWORD shared = FILE_SHARE_READ | FILE_SHARE_WRITE;
 
-/// A missing drive is told as a missing file by some systems.
+/// Some systems report a missing drive as a missing file.
 [[noreturn]] void raise_for_path(DWORD code, const Text& path) {
   const bool drive_is_missing =
       path.find(u':') == 1 && GetDriveTypeW(wide(path.substr(0, 2) + u"\\")) <= DRIVE_NO_ROOT_DIR;

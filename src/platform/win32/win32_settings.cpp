@@ -14,7 +14,7 @@ namespace {
 
 constexpr TextView settings_key = u"Software\\TALUtil\\Settings\\";
 
-/// What the profile functions put into a buffer of theirs; a null item lists the names.
+/// What the profile functions put into the buffer; a null item lists the names.
 Text read_profile(const Text& file, const Text& section, const char* item) {
   std::array<char, Profiles::longest_value + 1> buffer{};
   const DWORD count = GetPrivateProfileStringA(to_ansi(section).c_str(), item, "", buffer.data(),

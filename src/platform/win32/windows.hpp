@@ -17,7 +17,7 @@
 
 namespace talutil::win32 {
 
-// Wide characters of the platform and code units of ours are the same 16 bits.
+// The platform's wide characters and our code units are the same 16 bits.
 inline const wchar_t* wide(const char16_t* text) noexcept { return reinterpret_cast<const wchar_t*>(text); }
 inline const wchar_t* wide(const Text& text) noexcept { return wide(text.c_str()); }
 inline TextView view(const wchar_t* text, std::size_t length) noexcept {
