@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <vector>
 
+#include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
 
 namespace talutil {

@@ -1,5 +1,6 @@
 #include <charconv>
 
+#include "automation/control.hpp"
 #include "cli/commands.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"

@@ -1,6 +1,7 @@
 #include "forms/c_control_position.hpp"
 
 #include "automation/checked.hpp"
+#include "automation/control.hpp"
 #include "library/host_objects.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"

@@ -1,4 +1,5 @@
 #include "automation/checked.hpp"
+#include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"

@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "automation/checked.hpp"
+#include "automation/control.hpp"
 #include "controls/grid.hpp"
 
 namespace talutil {

@@ -1,3 +1,4 @@
+#include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
 #include "controls/control_factory.hpp"
 #include "controls/grid.hpp"

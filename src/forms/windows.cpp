@@ -1,3 +1,4 @@
+#include "automation/control.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 

@@ -1,5 +1,6 @@
 #include "infoforms/frm_sh_keys.hpp"
 
+#include "automation/control.hpp"
 #include "controls/control.hpp"
 #include "controls/control_factory.hpp"
 #include "infoforms/shortcut_keys.hpp"

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <iterator>
 
+#include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
 #include "controls/control_factory.hpp"
 #include "library/library.hpp"

@@ -2,6 +2,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "automation/control.hpp"
 #include "preview/report_composer.hpp"
 
 namespace talutil {

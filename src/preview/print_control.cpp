@@ -4,6 +4,7 @@
 #include <cmath>
 
 #include "automation/checked.hpp"
+#include "automation/control.hpp"
 #include "controls/common_dialog.hpp"
 #include "preview/pdf_writer.hpp"
 

@@ -1,4 +1,5 @@
 #include "automation/checked.hpp"
+#include "automation/control.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "preview/frm_print_preview.hpp"

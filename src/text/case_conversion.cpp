@@ -1,3 +1,4 @@
+#include "automation/control.hpp"
 #include "controls/control_factory.hpp"
 #include "controls/name_case_converter.hpp"
 #include "library/library.hpp"

@@ -2,6 +2,7 @@
 
 #include <set>
 
+#include "automation/control.hpp"
 #include "controls/cipher_text.hpp"
 #include "infoforms/frm_components.hpp"
 #include "tests/text/recording_utils.hpp"

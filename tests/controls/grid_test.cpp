@@ -1,4 +1,5 @@
 #include "controls/grid.hpp"
+#include "automation/control.hpp"
 
 #include <gmock/gmock.h>
 

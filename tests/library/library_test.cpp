@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "automation/control.hpp"
 #include "automation/late_call.hpp"
 #include "controls/control_factory.hpp"
 #include "infoforms/frm_components.hpp"
