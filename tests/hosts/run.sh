@@ -61,7 +61,12 @@ take_pictures() {
 
 client() { run "$1" wine "Z:\\build\\$folder\\tests\\hosts\\${1}_client.exe" "Z:\\build\\$folder" "${@:2}"; }
 
-start_wine
+# The server lends its screen, or that it has none, to later programs: for those with another, one is begun anew.
+restart_wine() {
+  wine_server -k
+  start_wine
+}
+restart_wine
 client registration
 expect_success "regsvr32, for the machine and for the user" wine regsvr32.exe /s /i:user "$dll"
 client type_library
@@ -95,11 +100,6 @@ expect_success "the words of the printed keys, which begin: ${words:0:100}" \
   test "${words#*GENERAL Copy Text CTRL+C*Page 1 of 6*ORV Help PDF = F1*Telephone Contact = CTRL+T}" != "$words"
 expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
-# The server lends its screen to later programs: for those without one, another is begun.
-restart_wine() {
-  wine_server -k
-  start_wine
-}
 restart_wine
 no_screen='445 There is no screen to show the window on'
 answers=$(DISPLAY='' wine cscript.exe //nologo 'Z:\checkout\tests\hosts\no_screen.vbs' 2>/dev/null | tr -d '\r')
