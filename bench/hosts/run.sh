@@ -6,6 +6,7 @@ set -euo pipefail
 . "$talutil_top/tests/hosts/screen.sh"
 
 folder=${1:-windows}
+[ "$folder" != windows64 ] || use_wine64
 start_wine
 start_screen
 wine regsvr32.exe /s "Z:\\build\\$folder\\TALUtil.dll" 2>/dev/null
