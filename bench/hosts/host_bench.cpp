@@ -170,14 +170,15 @@ class AnsweredDialog final : public IClassFactory {
 
   explicit AnsweredDialog(std::wstring path) : dialog_(std::move(path)) {
     constexpr std::wstring_view text = L"{61C0A9F4-2F0E-4F6D-8A11-0D5C7E39B248}";
-    RegSetKeyValueW(HKEY_CURRENT_USER, key, name, REG_SZ, text.data(), static_cast<DWORD>((text.size() + 1) * 2));
+    RegSetKeyValueW(HKEY_LOCAL_MACHINE, key, name, REG_SZ, text.data(), static_cast<DWORD>((text.size() + 1) * 2));
     require(CoRegisterClassObject(class_id, this, CLSCTX_INPROC_SERVER, REGCLS_MULTIPLEUSE, &cookie_), "the dialog");
   }
   AnsweredDialog(const AnsweredDialog&) = delete;
   AnsweredDialog& operator=(const AnsweredDialog&) = delete;
   ~AnsweredDialog() {
     CoRevokeClassObject(cookie_);
-    RegDeleteKeyValueW(HKEY_CURRENT_USER, key, name);
+    RegDeleteKeyValueW(HKEY_LOCAL_MACHINE, key, name);
+    RegDeleteKeyW(HKEY_LOCAL_MACHINE, key);
   }
 
   HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override {
