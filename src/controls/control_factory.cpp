@@ -1,5 +1,7 @@
 #include "controls/control_factory.hpp"
 
+#include <algorithm>
+
 #include "automation/run_time_error.hpp"
 #include "controls/common_dialog.hpp"
 #include "controls/control.hpp"
@@ -19,29 +21,28 @@ ObjectRef make(const Platform& platform) {
   return std::make_shared<Made>(platform);
 }
 
+constexpr struct {
+  TextView class_name;
+  ObjectRef (*make)(const Platform& platform);
+} makers[] = {
+    {u"PolarCryptoLibCtl.Crypto", &make<Crypto>},
+    {u"MSComDlg.CommonDialog", &make<CommonDialog>},
+    {Grid::class_name, &make<Grid>},
+    {u"SystemInfoControl.MSysInfo", &make<SystemInformation>},
+    {NameCaseConverter::class_name, &make<NameCaseConverter>},
+    {u"DUZACTXLibCtl.duzactxctrl", &make<UnzipControl>},
+    {u"DZACTXLibCtl.dzactxctrl", &make<ZipControl>},
+    {u"VSPrinter8LibCtl.VSPrinter", &make<PrintControl>},
+    {u"VSPDF8LibCtl.VSPDF8", &make<PdfExport>},
+};
+
 }  // namespace
-
-ControlFactory::ControlFactory(const Platform& platform)
-    : platform_(platform),
-      makers_{
-          {u"PolarCryptoLibCtl.Crypto", &make<Crypto>},
-          {u"MSComDlg.CommonDialog", &make<CommonDialog>},
-          {Text(Grid::class_name), &make<Grid>},
-          {u"SystemInfoControl.MSysInfo", &make<SystemInformation>},
-          {Text(NameCaseConverter::class_name), &make<NameCaseConverter>},
-          {u"DUZACTXLibCtl.duzactxctrl", &make<UnzipControl>},
-          {u"DZACTXLibCtl.dzactxctrl", &make<ZipControl>},
-          {u"VSPrinter8LibCtl.VSPrinter", &make<PrintControl>},
-          {u"VSPDF8LibCtl.VSPDF8", &make<PdfExport>},
-      } {}
-
-void ControlFactory::register_maker(TextView class_name, Maker maker) { makers_[Text(class_name)] = maker; }
 
 ObjectRef ControlFactory::create(TextView class_name) const {
   if (ObjectRef theirs = platform_.control_makers.create(class_name)) return theirs;
-  const auto found = makers_.find(class_name);
-  if (found == makers_.end()) raise(ErrorNumber::cannot_create_object);
-  return found->second(platform_);
+  const auto* const own = std::ranges::find(makers, class_name, [](const auto& maker) { return maker.class_name; });
+  if (own == std::end(makers)) raise(ErrorNumber::cannot_create_object);
+  return own->make(platform_);
 }
 
 }  // namespace talutil

@@ -1,7 +1,5 @@
 #pragma once
 
-#include <map>
-
 #include "platform/platform.hpp"
 
 namespace talutil {
@@ -10,19 +8,13 @@ namespace talutil {
 /// maker's takes the place of one when the user has registered it under that name.
 class ControlFactory {
  public:
-  using Maker = ObjectRef (*)(const Platform& platform);
-
-  explicit ControlFactory(const Platform& platform);
-
-  /// Puts a maker in the place of the one that stood under the class name.
-  void register_maker(TextView class_name, Maker maker);
+  explicit ControlFactory(const Platform& platform) : platform_(platform) {}
 
   /// A new control. Raises 429 for a class name nobody makes.
   [[nodiscard]] ObjectRef create(TextView class_name) const;
 
  private:
   const Platform& platform_;
-  std::map<Text, Maker, std::less<>> makers_;
 };
 
 }  // namespace talutil

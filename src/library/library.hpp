@@ -35,7 +35,7 @@ class Library {
   [[nodiscard]] ModZipFiles& zip_files() noexcept { return zip_files_; }
   [[nodiscard]] const Platform& platform() const noexcept { return platform_; }
   [[nodiscard]] FrmComponents& components() noexcept { return *components_; }
-  [[nodiscard]] ControlFactory& controls() noexcept { return *controls_; }
+  [[nodiscard]] const ControlFactory& controls() const noexcept { return *controls_; }
 
   // Windows, made when they are first asked for.
   [[nodiscard]] FrmPrintPreview& preview();
