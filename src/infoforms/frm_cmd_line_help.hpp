@@ -17,8 +17,6 @@ class FrmCmdLineHelp final : public Form {
   /// Shows the window until it is closed.
   void show() { show_modal(); }
 
-  [[nodiscard]] const Grid& grid() const noexcept { return grid_; }
-
  protected:
   void fill(FormView& view) override;
   void on_click(std::uint8_t /*part*/) override {}

@@ -30,9 +30,6 @@ class FrmSysInfo final : public Form {
   /// Shows the window until it is closed.
   void show_window() { show_modal(); }
 
-  /// The table of the tab that is shown.
-  [[nodiscard]] const Grid& grid() const noexcept { return is_item_shown() ? details_ : facts_; }
-
  protected:
   void fill(FormView& view) override;
   void on_click(std::uint8_t part) override;
