@@ -222,6 +222,11 @@ struct LateCalls {
     return {&detail::late_method<Target, G>, &detail::late_method<Target, S>};
   }
 
+  template <auto S, class... Names>
+  static constexpr std::array<LateCall, 1> setter(MemberName, const char*, Names...) {
+    return {&detail::late_method<Target, S>};
+  }
+
   template <auto M, class... Names>
   static constexpr std::array<LateCall, 1> method(MemberName, const char*, Names...) {
     return {&detail::late_method<Target, M>};

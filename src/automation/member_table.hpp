@@ -223,10 +223,17 @@ struct Describe {
   /// indexes. Controls have them; interfaces do not.
   template <auto G, auto S, class... Names>
   static constexpr std::array<Member, 2> accessors(MemberName name, const char* help, Names... names) {
-    std::array<Member, 2> slots{method<G>(name, help, names...)[0], method<S>(name, help, names..., "value")[0]};
+    std::array<Member, 2> slots{method<G>(name, help, names...)[0], setter<S>(name, help, names...)[0]};
     slots[0].access = Access::get;
-    slots[1].access = Access::put;
     return slots;
+  }
+
+  /// A property that can be put and not read, with or without indexes: S takes the value after them.
+  template <auto S, class... Names>
+  static constexpr std::array<Member, 1> setter(MemberName name, const char* help, Names... names) {
+    std::array<Member, 1> slot = method<S>(name, help, names..., "value");
+    slot[0].access = Access::put;
+    return slot;
   }
 
   template <auto M, class... Names>

@@ -91,11 +91,6 @@ class PrintControl final : public TableObject<PrintControl> {
  private:
   [[nodiscard]] ReportComposer& composer();
   [[nodiscard]] FontStyle text_font() const;
-  [[nodiscard]] Text text_so_far() const { return {}; }
-  [[nodiscard]] std::int32_t no_window() const noexcept { return 0; }
-
-  template <class P>
-  friend constexpr auto members_of(std::type_identity<PrintControl>);
 
   const Platform& platform_;
   FontMetrics metrics_;
@@ -155,10 +150,10 @@ constexpr auto members_of(std::type_identity<PrintControl>) {
       P::template accessors<&C::CurrentPage, &C::put_CurrentPage>("CurrentPage", "The page shown, from 1."),
       P::template get_only<&C::PageCount>("PageCount", "The pages of the document."),
       P::template method<&C::StartDoc>("StartDoc", "Begins a document."),
-      P::template accessors<&C::text_so_far, &C::put_Text>("Text", "Putting it adds flowing text; reads as empty."),
+      P::template setter<&C::put_Text>("Text", "Putting it adds flowing text."),
       P::template method<&C::TextBox>("TextBox", "Adds a text in a box.", "Text", "Left", "Top", "Width", "Height"),
-      P::template accessors<&C::no_window, &C::put_RenderControl>(
-          "RenderControl", "Putting the window of a control adds it to the pages; reads as 0."),
+      P::template setter<&C::put_RenderControl>("RenderControl",
+                                                "Putting the window of a control adds it to the pages."),
       P::template method<&C::EndDoc>("EndDoc", "Ends the document and shows its first page."),
       P::template method<&C::PrintDoc>("PrintDoc", "Prints the document.", optional("Dialog", 0)));
 }
