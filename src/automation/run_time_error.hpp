@@ -12,6 +12,7 @@
 namespace talutil {
 
 /// The standard run-time errors that hosts know by number. The texts are those that hosts show.
+/// Some are only passed on: a third-party object may raise them by number alone, and the text comes from here.
 enum class ErrorNumber : std::int32_t {
   invalid_procedure_call = 5,
   overflow = 6,
