@@ -7,37 +7,172 @@
 
 namespace talutil::win32 {
 
-/// An open file of the system, closed at its end.
-class FileHandle {
+/// A handle that is given back at its end. A policy says of a kind of handle what its type is and how it is given back;
+/// none is a null handle, unless the policy has another. A policy with data says also where it came from.
+template <class Policy>
+class Owned {
  public:
-  explicit FileHandle(HANDLE handle = INVALID_HANDLE_VALUE) noexcept : handle_(handle) {}
-  FileHandle(FileHandle&& other) noexcept : handle_(std::exchange(other.handle_, INVALID_HANDLE_VALUE)) {}
-  FileHandle& operator=(FileHandle&& other) noexcept {
-    std::swap(handle_, other.handle_);
+  using Handle = typename Policy::Handle;
+
+  explicit Owned(Handle handle = none(), Policy policy = {}) noexcept : handle_(handle), policy_(policy) {}
+  Owned(Owned&& other) noexcept : handle_(other.release()), policy_(other.policy_) {}
+  Owned& operator=(Owned&& other) noexcept {
+    if (this == &other) return *this;
+    reset();
+    policy_ = other.policy_;
+    handle_ = other.release();
     return *this;
   }
-  ~FileHandle() { close(); }
+  ~Owned() { reset(); }
 
-  [[nodiscard]] HANDLE get() const noexcept { return handle_; }
-  [[nodiscard]] bool is_open() const noexcept { return handle_ != INVALID_HANDLE_VALUE; }
-  void close() noexcept {
-    if (is_open()) CloseHandle(std::exchange(handle_, INVALID_HANDLE_VALUE));
+  [[nodiscard]] Handle get() const noexcept { return handle_; }
+  [[nodiscard]] explicit operator bool() const noexcept { return handle_ != none(); }
+  [[nodiscard]] Handle release() noexcept { return std::exchange(handle_, none()); }
+
+  /// For functions that give a handle through an argument.
+  [[nodiscard]] Handle* receive() noexcept {
+    reset();
+    return &handle_;
+  }
+
+  /// The system's last error stays: what went wrong is often asked for when handles have ended already.
+  void reset(Handle handle = none()) noexcept {
+    const Handle before = std::exchange(handle_, handle);
+    if (before == none()) return;
+    const DWORD reason = GetLastError();
+    policy_.close(before);
+    SetLastError(reason);
   }
 
  private:
-  HANDLE handle_;
+  static Handle none() noexcept {
+    if constexpr (requires { Policy::none(); })
+      return Policy::none();
+    else
+      return {};
+  }
+
+  Handle handle_;
+  [[no_unique_address]] Policy policy_;
 };
 
-/// Ends a search of the system.
-struct FindHandle {
-  HANDLE handle;
-  explicit FindHandle(HANDLE found) : handle(found) {}
-  FindHandle(const FindHandle&) = delete;
-  FindHandle& operator=(const FindHandle&) = delete;
-  ~FindHandle() {
-    if (handle != INVALID_HANDLE_VALUE) FindClose(handle);
-  }
+/// The kinds of handles. Those that need a header of their own stand where they are used.
+namespace kind {
+
+struct KernelObject {
+  using Handle = HANDLE;
+  static void close(HANDLE object) noexcept { CloseHandle(object); }
 };
+
+struct File : KernelObject {
+  static HANDLE none() noexcept { return INVALID_HANDLE_VALUE; }
+};
+
+struct FileSearch {
+  using Handle = HANDLE;
+  static HANDLE none() noexcept { return INVALID_HANDLE_VALUE; }
+  static void close(HANDLE search) noexcept { FindClose(search); }
+};
+
+struct RegistryKey {
+  using Handle = HKEY;
+  static void close(HKEY key) noexcept { RegCloseKey(key); }
+};
+
+struct GlobalMemory {
+  using Handle = HGLOBAL;
+  static void close(HGLOBAL block) noexcept { GlobalFree(block); }
+};
+
+struct LockedMemory {
+  using Handle = void*;
+  HGLOBAL block;
+  void close(void* /*bytes*/) const noexcept { GlobalUnlock(block); }
+};
+
+struct Window {
+  using Handle = HWND;
+  static void close(HWND window) noexcept { DestroyWindow(window); }
+};
+
+struct Menu {
+  using Handle = HMENU;
+  static void close(HMENU menu) noexcept { DestroyMenu(menu); }
+};
+
+struct Hook {
+  using Handle = HHOOK;
+  static void close(HHOOK hook) noexcept { UnhookWindowsHookEx(hook); }
+};
+
+/// The clipboard, open: TRUE.
+struct Clipboard {
+  using Handle = BOOL;
+  static void close(BOOL /*is_open*/) noexcept { CloseClipboard(); }
+};
+
+template <class Object>
+struct GdiObject {
+  using Handle = Object;
+  static void close(Object object) noexcept { DeleteObject(object); }
+};
+using Bitmap = GdiObject<HBITMAP>;
+using Brush = GdiObject<HBRUSH>;
+using Font = GdiObject<HFONT>;
+using Pen = GdiObject<HPEN>;
+
+/// A device context of our own making.
+struct MadeDevice {
+  using Handle = HDC;
+  static void close(HDC device) noexcept { DeleteDC(device); }
+};
+
+/// The device context of a window, or of the screen for a null one.
+struct WindowDevice {
+  using Handle = HDC;
+  HWND window;
+  void close(HDC device) const noexcept { ReleaseDC(window, device); }
+};
+
+/// The device context of a window that is being drawn.
+struct Painting {
+  using Handle = HDC;
+  HWND window;
+  const PAINTSTRUCT* painting;
+  void close(HDC /*device*/) const noexcept { EndPaint(window, painting); }
+};
+
+/// What was selected into a device context before, and is again at the end: an object may not end while it is selected.
+struct Selection {
+  using Handle = HGDIOBJ;
+  HDC device;
+  void close(HGDIOBJ before) const noexcept { SelectObject(device, before); }
+};
+
+/// The state of a device context, to come back to.
+struct SavedState {
+  using Handle = int;
+  HDC device;
+  void close(int state) const noexcept { RestoreDC(device, state); }
+};
+
+}  // namespace kind
+
+[[nodiscard]] inline Owned<kind::WindowDevice> device_of(HWND window) noexcept {
+  return Owned<kind::WindowDevice>(GetDC(window), {window});
+}
+
+[[nodiscard]] inline Owned<kind::Selection> select(HDC device, HGDIOBJ object) noexcept {
+  return Owned<kind::Selection>(SelectObject(device, object), {device});
+}
+
+[[nodiscard]] inline Owned<kind::SavedState> save_state(HDC device) noexcept {
+  return Owned<kind::SavedState>(SaveDC(device), {device});
+}
+
+[[nodiscard]] inline Owned<kind::LockedMemory> lock(HGLOBAL block) noexcept {
+  return Owned<kind::LockedMemory>(block == nullptr ? nullptr : GlobalLock(block), {block});
+}
 
 /// A library of the system's own folder; null when it is missing. By its bare name alone a library of the same name in
 /// the program's or the current folder would be taken.

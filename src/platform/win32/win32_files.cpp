@@ -33,15 +33,16 @@ void require_usable(const Text& path, bool is_to_be_written) {
   if ((attributes & refused) != 0) raise(ErrorNumber::path_file_access);
 }
 
-FileHandle open_file(const Text& path, DWORD access, DWORD sharing, DWORD disposition) {
+Owned<kind::File> open_file(const Text& path, DWORD access, DWORD sharing, DWORD disposition) {
   require_usable(path, access != GENERIC_READ);
-  FileHandle file(CreateFileW(wide(path), access, sharing, nullptr, disposition, FILE_ATTRIBUTE_NORMAL, nullptr));
-  if (!file.is_open()) raise_for_path(GetLastError(), path);
+  Owned<kind::File> file(
+      CreateFileW(wide(path), access, sharing, nullptr, disposition, FILE_ATTRIBUTE_NORMAL, nullptr));
+  if (!file) raise_for_path(GetLastError(), path);
   if (GetFileType(file.get()) != FILE_TYPE_DISK) raise(ErrorNumber::bad_file_name_or_number);
   return file;
 }
 
-void write_all(const FileHandle& file, std::string_view bytes) {
+void write_all(const Owned<kind::File>& file, std::string_view bytes) {
   constexpr std::size_t longest = 1U << 24U;
   while (!bytes.empty()) {
     const std::string_view part = bytes.substr(0, longest);
@@ -71,7 +72,7 @@ class Win32InputFile final : public InputFile {
   }
 
  private:
-  FileHandle file_;
+  Owned<kind::File> file_;
   std::uint64_t size_ = 0;
 };
 
@@ -82,11 +83,11 @@ class Win32OutputFile final : public OutputFile {
   explicit Win32OutputFile(const Text& path) : path_(path) {
     require_usable(path, true);
     // Whatever is wrong with the target shows now and not when everything is written.
-    FileHandle target(CreateFileW(wide(path_), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
+    Owned<kind::File> target(CreateFileW(wide(path_), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
     const DWORD reason = GetLastError();
-    if (!target.is_open() && reason != ERROR_FILE_NOT_FOUND) raise_for_path(reason, path_);
-    replaces_ = target.is_open();
-    target.close();
+    if (!target && reason != ERROR_FILE_NOT_FOUND) raise_for_path(reason, path_);
+    replaces_ = static_cast<bool>(target);
+    target.reset();
     make_file();
   }
   Win32OutputFile(const Win32OutputFile&) = delete;
@@ -94,7 +95,7 @@ class Win32OutputFile final : public OutputFile {
 
   ~Win32OutputFile() override {
     if (temporary_.empty()) return;
-    file_.close();
+    file_.reset();
     DeleteFileW(wide(temporary_));
   }
 
@@ -102,7 +103,7 @@ class Win32OutputFile final : public OutputFile {
 
   void close() override {
     if (FlushFileBuffers(file_.get()) == 0) raise_last_error();
-    file_.close();
+    file_.reset();
     if (temporary_.empty()) return;
     // Keeps the attributes and rights of the file that is replaced.
     const BOOL is_done = replaces_ ? ReplaceFileW(wide(path_), wide(temporary_), nullptr, 0, nullptr, nullptr)
@@ -133,7 +134,7 @@ class Win32OutputFile final : public OutputFile {
   Text path_;
   Text temporary_;
   bool replaces_ = false;
-  FileHandle file_;
+  Owned<kind::File> file_;
 };
 
 bool is_nothing_found(DWORD code) {
@@ -157,8 +158,8 @@ void Win32Files::search(const Text& pattern, std::uint32_t mask, const std::func
   require_pattern(pattern);
   WIN32_FIND_DATAW entry;
   const Text whole = is_open_ended(pattern) ? pattern + u"*.*" : pattern;
-  const FindHandle search(FindFirstFileW(wide(whole), &entry));
-  if (search.handle == INVALID_HANDLE_VALUE) {
+  const Owned<kind::FileSearch> search(FindFirstFileW(wide(whole), &entry));
+  if (!search) {
     const DWORD reason = GetLastError();
     if (is_nothing_found(reason)) return;
     raise_for(reason);
@@ -166,7 +167,7 @@ void Win32Files::search(const Text& pattern, std::uint32_t mask, const std::func
   do {
     if ((entry.dwFileAttributes & passed_over & ~mask) != 0) continue;
     if (!found(view(entry.cFileName, wcslen(entry.cFileName)))) return;
-  } while (FindNextFileW(search.handle, &entry) != 0);
+  } while (FindNextFileW(search.get(), &entry) != 0);
 }
 
 std::uint32_t Win32Files::attributes(const Text& path) {
@@ -198,7 +199,7 @@ std::unique_ptr<OutputFile> Win32Files::open_output(const Text& path) {
 }
 
 void Win32Files::append(const Text& path, std::string_view bytes) {
-  const FileHandle file = open_file(path, FILE_APPEND_DATA | GENERIC_READ, shared, OPEN_ALWAYS);
+  const Owned<kind::File> file = open_file(path, FILE_APPEND_DATA | GENERIC_READ, shared, OPEN_ALWAYS);
   // A byte beyond every file: those who append wait for one another, and nobody else notices.
   OVERLAPPED far_byte{};
   far_byte.Offset = 0xFFFFFFFE;
@@ -210,7 +211,7 @@ void Win32Files::append(const Text& path, std::string_view bytes) {
     write_all(file, bytes);
   } catch (const RunTimeError&) {
     // A part of the line is worse than none: the next one would be glued to it.
-    const FileHandle whole = open_file(path, GENERIC_WRITE, shared, OPEN_EXISTING);
+    const Owned<kind::File> whole = open_file(path, GENERIC_WRITE, shared, OPEN_EXISTING);
     if (SetFilePointerEx(whole.get(), before, nullptr, FILE_BEGIN) == 0 || SetEndOfFile(whole.get()) == 0) {
       raise(ErrorNumber::device_io_error);
     }

@@ -39,13 +39,13 @@ FILETIME file_time(std::int64_t seconds) {
   return {static_cast<DWORD>(ticks), static_cast<DWORD>(ticks >> 32U)};
 }
 
-void seek(const FileHandle& file, std::uint64_t offset) {
+void seek(const Owned<kind::File>& file, std::uint64_t offset) {
   LARGE_INTEGER place{};
   place.QuadPart = static_cast<LONGLONG>(offset);
   if (SetFilePointerEx(file.get(), place, nullptr, FILE_BEGIN) == 0) raise_last_error();
 }
 
-std::size_t read_file(const FileHandle& file, std::uint64_t offset, std::span<char> buffer) {
+std::size_t read_file(const Owned<kind::File>& file, std::uint64_t offset, std::span<char> buffer) {
   seek(file, offset);
   std::size_t done = 0;
   while (done < buffer.size()) {
@@ -64,7 +64,7 @@ class Win32StoredFile final : public StoredFile {
   Win32StoredFile(const Text& path, DWORD sharing)
       : file_(CreateFileW(wide(path), GENERIC_READ, sharing, nullptr, OPEN_EXISTING, 0, nullptr)) {
     LARGE_INTEGER size{};
-    if (!file_.is_open() || GetFileSizeEx(file_.get(), &size) == 0) raise_last_error();
+    if (!file_ || GetFileSizeEx(file_.get(), &size) == 0) raise_last_error();
     size_ = static_cast<std::uint64_t>(size.QuadPart);
   }
 
@@ -74,7 +74,7 @@ class Win32StoredFile final : public StoredFile {
   }
 
  private:
-  FileHandle file_;
+  Owned<kind::File> file_;
   std::uint64_t size_ = 0;
 };
 
@@ -91,10 +91,10 @@ class Win32NewFile final : public NewFile {
     do {
       temporary_ = folder + u".talutil-" + number_to_text(static_cast<std::int32_t>(GetCurrentProcessId())) + u"-" +
                    number_to_text(next++);
-      file_ = FileHandle(CreateFileW(wide(temporary_), GENERIC_READ | GENERIC_WRITE, FILE_SHARE_READ, nullptr,
-                                     CREATE_NEW, FILE_ATTRIBUTE_NORMAL, nullptr));
-    } while (!file_.is_open() && GetLastError() == ERROR_FILE_EXISTS);
-    if (file_.is_open()) return;
+      file_ = Owned<kind::File>(CreateFileW(wide(temporary_), GENERIC_READ | GENERIC_WRITE, FILE_SHARE_READ, nullptr,
+                                            CREATE_NEW, FILE_ATTRIBUTE_NORMAL, nullptr));
+    } while (!file_ && GetLastError() == ERROR_FILE_EXISTS);
+    if (file_) return;
     temporary_.clear();
     raise_last_error();
   }
@@ -102,7 +102,7 @@ class Win32NewFile final : public NewFile {
   Win32NewFile& operator=(const Win32NewFile&) = delete;
 
   ~Win32NewFile() override {
-    file_.close();
+    file_.reset();
     if (!temporary_.empty()) DeleteFileW(wide(temporary_));
   }
 
@@ -130,7 +130,7 @@ class Win32NewFile final : public NewFile {
       const FILETIME time = file_time(facts->modified);
       if (SetFileTime(file_.get(), nullptr, nullptr, &time) == 0) raise_last_error();
     }
-    file_.close();
+    file_.reset();
     if (facts != nullptr && (facts->attributes & kept_attributes) != 0) {
       SetFileAttributesW(wide(temporary_), facts->attributes & kept_attributes);
     }
@@ -153,7 +153,7 @@ class Win32NewFile final : public NewFile {
   Text path_;
   Text temporary_;
   std::unique_ptr<Win32StoredFile> replaced_;
-  FileHandle file_;
+  Owned<kind::File> file_;
   std::uint64_t size_ = 0;
 };
 
@@ -170,12 +170,12 @@ class Win32Folder final : public Folder {
 
   void list(const std::function<void(TextView name, const FileFacts& facts)>& found) override {
     WIN32_FIND_DATAW entry;
-    const FindHandle search(FindFirstFileW(wide(path_ + u"*"), &entry));
-    if (search.handle == INVALID_HANDLE_VALUE) raise_last_error();
+    const Owned<kind::FileSearch> search(FindFirstFileW(wide(path_ + u"*"), &entry));
+    if (!search) raise_last_error();
     do {
       const TextView name = view(entry.cFileName, wcslen(entry.cFileName));
       if (name != u"." && name != u"..") found(name, facts_of(entry));
-    } while (FindNextFileW(search.handle, &entry) != 0);
+    } while (FindNextFileW(search.get(), &entry) != 0);
   }
 
   [[nodiscard]] std::optional<FileFacts> facts(TextView name) override {
@@ -207,9 +207,9 @@ class Win32Folder final : public Folder {
   void set_facts(TextView name, const FileFacts& facts) override {
     const Text path = below(name);
     const FILETIME time = file_time(facts.modified);
-    const FileHandle entry(CreateFileW(wide(path), FILE_WRITE_ATTRIBUTES, FILE_SHARE_READ | FILE_SHARE_WRITE, nullptr,
-                                       OPEN_EXISTING, FILE_FLAG_BACKUP_SEMANTICS, nullptr));
-    if (entry.is_open()) SetFileTime(entry.get(), nullptr, nullptr, &time);
+    const Owned<kind::File> entry(CreateFileW(wide(path), FILE_WRITE_ATTRIBUTES, FILE_SHARE_READ | FILE_SHARE_WRITE,
+                                              nullptr, OPEN_EXISTING, FILE_FLAG_BACKUP_SEMANTICS, nullptr));
+    if (entry) SetFileTime(entry.get(), nullptr, nullptr, &time);
     if ((facts.attributes & kept_attributes) != 0) SetFileAttributesW(wide(path), facts.attributes & kept_attributes);
   }
 

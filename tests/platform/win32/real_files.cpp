@@ -41,7 +41,7 @@ void set_read_only(const Text& path, bool read_only) {
 }
 
 std::shared_ptr<void> lock_file(const Text& path) {
-  return std::make_shared<win32::FileHandle>(
+  return std::make_shared<win32::Owned<win32::kind::File>>(
       CreateFileW(win32::wide(path), GENERIC_READ, 0, nullptr, OPEN_EXISTING, 0, nullptr));
 }
 
