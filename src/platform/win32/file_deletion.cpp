@@ -1,8 +1,8 @@
 // DeleteFile of the scripting run time's file-system object, called the way scripts call it.
 #include "automation/run_time_error.hpp"
 #include "platform/file_names.hpp"
+#include "platform/win32/handle.hpp"
 #include "platform/win32/win32_files.hpp"
-#include "platform/win32/windows.hpp"
 
 namespace talutil::win32 {
 
@@ -11,19 +11,24 @@ namespace {
 /// Run-time errors of automation objects are this facility's codes.
 constexpr HRESULT run_time_facility = static_cast<HRESULT>(0x800A0000);
 
-struct Release {
-  void operator()(IUnknown* object) const noexcept { object->Release(); }
+struct Reference {
+  using Handle = IDispatch*;
+  static void close(IDispatch* object) noexcept { object->Release(); }
 };
-using ObjectPointer = std::unique_ptr<IDispatch, Release>;
 
-ObjectPointer create_file_system_object() {
+struct AutomationText {
+  using Handle = BSTR;
+  static void close(BSTR text) noexcept { SysFreeString(text); }
+};
+
+Owned<Reference> create_file_system_object() {
   CLSID class_id;
   void* object = nullptr;
   if (FAILED(CLSIDFromProgID(L"Scripting.FileSystemObject", &class_id)) ||
       FAILED(CoCreateInstance(class_id, nullptr, CLSCTX_INPROC_SERVER, IID_IDispatch, &object))) {
     raise(ErrorNumber::cannot_create_object);
   }
-  return ObjectPointer(static_cast<IDispatch*>(object));
+  return Owned<Reference>(static_cast<IDispatch*>(object));
 }
 
 [[noreturn]] void raise_for_result(HRESULT result, const EXCEPINFO& exception) {
@@ -37,7 +42,7 @@ ObjectPointer create_file_system_object() {
 }  // namespace
 
 void Win32Files::delete_files(const Text& pattern) {
-  const ObjectPointer object = create_file_system_object();
+  const Owned<Reference> object = create_file_system_object();
   // Some versions of that object take wildcards in a folder's name for any folder, and call no match a success.
   require_pattern(pattern);
   bool matches = false;
@@ -50,22 +55,22 @@ void Win32Files::delete_files(const Text& pattern) {
   wchar_t name[] = L"DeleteFile";
   LPOLESTR names = name;
   DISPID member = 0;
-  if (FAILED(object->GetIDsOfNames(IID_NULL, &names, 1, LOCALE_USER_DEFAULT, &member))) {
+  if (FAILED(object.get()->GetIDsOfNames(IID_NULL, &names, 1, LOCALE_USER_DEFAULT, &member))) {
     raise(ErrorNumber::member_not_supported);
   }
+  const Owned<AutomationText> text(SysAllocStringLen(wide(pattern), static_cast<UINT>(pattern.size())));
   VARIANT arguments[2];  // The last one first.
   V_VT(&arguments[0]) = VT_BOOL;
   V_BOOL(&arguments[0]) = VARIANT_FALSE;
   V_VT(&arguments[1]) = VT_BSTR;
-  V_BSTR(&arguments[1]) = SysAllocStringLen(wide(pattern), static_cast<UINT>(pattern.size()));
+  V_BSTR(&arguments[1]) = text.get();
   DISPPARAMS parameters{arguments, nullptr, 2, 0};
   EXCEPINFO exception{};
-  const HRESULT result =
-      object->Invoke(member, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters, nullptr, &exception, nullptr);
-  VariantClear(&arguments[1]);
-  SysFreeString(exception.bstrSource);
-  SysFreeString(exception.bstrDescription);
-  SysFreeString(exception.bstrHelpFile);
+  const HRESULT result = object.get()->Invoke(member, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters,
+                                              nullptr, &exception, nullptr);
+  const Owned<AutomationText> source(exception.bstrSource);
+  const Owned<AutomationText> description(exception.bstrDescription);
+  const Owned<AutomationText> help_file(exception.bstrHelpFile);
   if (FAILED(result)) raise_for_result(result, exception);
 }
 

@@ -1,12 +1,9 @@
 #include "platform/win32/win32_cryptography.hpp"
 
 #include <array>
-#include <type_traits>
 
 #include "automation/checked.hpp"
 #include "automation/run_time_error.hpp"
-#include "platform/win32/handle.hpp"
-#include "platform/win32/windows.hpp"
 // After windows.h.
 #include <bcrypt.h>
 
@@ -33,19 +30,15 @@ UCHAR* pointer(ByteView bytes) noexcept {
 
 ULONG length(ByteView bytes) { return checked_cast<std::int32_t>(bytes.size()); }
 
-struct CloseAlgorithm {
-  void operator()(BCRYPT_ALG_HANDLE handle) const noexcept { BCryptCloseAlgorithmProvider(handle, 0); }
+struct CipherKey {
+  using Handle = BCRYPT_KEY_HANDLE;
+  static void close(BCRYPT_KEY_HANDLE key) noexcept { BCryptDestroyKey(key); }
 };
-struct DestroyKey {
-  void operator()(BCRYPT_KEY_HANDLE handle) const noexcept { BCryptDestroyKey(handle); }
-};
-using Algorithm = std::unique_ptr<void, CloseAlgorithm>;
-using KeyHandle = std::unique_ptr<void, DestroyKey>;
 
-KeyHandle import_key(BCRYPT_ALG_HANDLE cipher, const Cryptography::Key& key) {
-  BCRYPT_KEY_HANDLE handle = nullptr;
-  require(BCryptGenerateSymmetricKey(cipher, &handle, nullptr, 0, pointer(key), length(key), 0));
-  return KeyHandle(handle);
+Owned<CipherKey> import_key(BCRYPT_ALG_HANDLE cipher, const Cryptography::Key& key) {
+  Owned<CipherKey> imported;
+  require(BCryptGenerateSymmetricKey(cipher, imported.receive(), nullptr, 0, pointer(key), length(key), 0));
+  return imported;
 }
 
 BCRYPT_AUTHENTICATED_CIPHER_MODE_INFO mode_info(const Cryptography::Nonce& nonce, ByteView associated,
@@ -68,24 +61,22 @@ void Win32RandomSource::fill(std::span<std::uint8_t> bytes) {
   require(BCryptGenRandom(nullptr, pointer(bytes), length(bytes), BCRYPT_USE_SYSTEM_PREFERRED_RNG));
 }
 
-Win32Cryptography::~Win32Cryptography() {
-  if (cipher_ != nullptr) BCryptCloseAlgorithmProvider(cipher_, 0);
-}
+void CipherProvider::close(void* provider) noexcept { BCryptCloseAlgorithmProvider(provider, 0); }
 
 void* Win32Cryptography::cipher() {
-  if (cipher_ != nullptr) return cipher_;
-  BCRYPT_ALG_HANDLE handle = nullptr;
+  if (cipher_) return cipher_.get();
+  Owned<CipherProvider> opened;
   load_cryptography();
-  require(BCryptOpenAlgorithmProvider(&handle, BCRYPT_AES_ALGORITHM, nullptr, 0));
-  Algorithm opened(handle);
+  require(BCryptOpenAlgorithmProvider(opened.receive(), BCRYPT_AES_ALGORITHM, nullptr, 0));
   std::array<wchar_t, sizeof BCRYPT_CHAIN_MODE_GCM / sizeof(wchar_t)> mode{BCRYPT_CHAIN_MODE_GCM};
-  require(BCryptSetProperty(handle, BCRYPT_CHAINING_MODE, reinterpret_cast<UCHAR*>(mode.data()), sizeof mode, 0));
-  return cipher_ = opened.release();
+  require(BCryptSetProperty(opened.get(), BCRYPT_CHAINING_MODE, reinterpret_cast<UCHAR*>(mode.data()), sizeof mode, 0));
+  cipher_ = std::move(opened);
+  return cipher_.get();
 }
 
 Cryptography::Tag Win32Cryptography::seal(const Key& key, const Nonce& nonce, ByteView associated,
                                           std::span<std::uint8_t> data) {
-  const KeyHandle handle = import_key(cipher(), key);
+  const Owned<CipherKey> handle = import_key(cipher(), key);
   Tag tag{};
   auto info = mode_info(nonce, associated, tag);
   ULONG written = 0;
@@ -96,7 +87,7 @@ Cryptography::Tag Win32Cryptography::seal(const Key& key, const Nonce& nonce, By
 
 bool Win32Cryptography::open(const Key& key, const Nonce& nonce, ByteView associated, std::span<std::uint8_t> data,
                              const Tag& tag) {
-  const KeyHandle handle = import_key(cipher(), key);
+  const Owned<CipherKey> handle = import_key(cipher(), key);
   auto info = mode_info(nonce, associated, tag);
   ULONG written = 0;
   const NTSTATUS status = BCryptDecrypt(handle.get(), pointer(data), length(data), &info, nullptr, 0, pointer(data),
@@ -107,10 +98,9 @@ bool Win32Cryptography::open(const Key& key, const Nonce& nonce, ByteView associ
 }
 
 Cryptography::Key Win32Cryptography::derive_key(ByteView pass_phrase, ByteView salt, std::uint32_t rounds) {
-  BCRYPT_ALG_HANDLE handle = nullptr;
+  Owned<CipherProvider> hash;
   load_cryptography();
-  require(BCryptOpenAlgorithmProvider(&handle, BCRYPT_SHA256_ALGORITHM, nullptr, BCRYPT_ALG_HANDLE_HMAC_FLAG));
-  const Algorithm hash(handle);
+  require(BCryptOpenAlgorithmProvider(hash.receive(), BCRYPT_SHA256_ALGORITHM, nullptr, BCRYPT_ALG_HANDLE_HMAC_FLAG));
   Key key{};
   require(BCryptDeriveKeyPBKDF2(hash.get(), pointer(pass_phrase), length(pass_phrase), pointer(salt), length(salt),
                                 rounds, key.data(), length(key), 0));

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/cryptography.hpp"
+#include "platform/win32/handle.hpp"
 
 namespace talutil::win32 {
 
@@ -10,11 +11,14 @@ class Win32RandomSource final : public RandomSource {
   void fill(std::span<std::uint8_t> bytes) override;
 };
 
+struct CipherProvider {
+  using Handle = void*;
+  static void close(void* provider) noexcept;
+};
+
 /// Cryptography Next Generation (bcrypt.dll). The cipher is opened at its first use and kept.
 class Win32Cryptography final : public Cryptography {
  public:
-  ~Win32Cryptography() override;
-
   Tag seal(const Key& key, const Nonce& nonce, ByteView associated, std::span<std::uint8_t> data) override;
   bool open(const Key& key, const Nonce& nonce, ByteView associated, std::span<std::uint8_t> data,
             const Tag& tag) override;
@@ -24,7 +28,7 @@ class Win32Cryptography final : public Cryptography {
 
   void* cipher();
 
-  void* cipher_ = nullptr;
+  Owned<CipherProvider> cipher_;
 };
 
 }  // namespace talutil::win32

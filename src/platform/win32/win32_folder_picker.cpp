@@ -10,6 +10,11 @@ namespace talutil::win32 {
 
 namespace {
 
+struct ItemList {
+  using Handle = PIDLIST_ABSOLUTE;
+  static void close(PIDLIST_ABSOLUTE items) noexcept { CoTaskMemFree(items); }
+};
+
 /// Text in the code page of the platform's ANSI functions.
 Text from_platform_ansi(const char* bytes) {
   const int length = MultiByteToWideChar(CP_ACP, 0, bytes, -1, nullptr, 0);
@@ -32,12 +37,11 @@ std::optional<Text> Win32FolderPicker::choose(TextView title, std::intptr_t owne
   BROWSEINFOA dialog{};
   dialog.hwndOwner = reinterpret_cast<HWND>(owner);  // NOLINT(performance-no-int-to-ptr): the seam keeps handles so.
   dialog.lpszTitle = caption.c_str();
-  PIDLIST_ABSOLUTE const items = browse(&dialog);
-  if (items == nullptr) return std::nullopt;
+  const Owned<ItemList> items(browse(&dialog));
+  if (!items) return std::nullopt;
   // Blanks, which stay where the chosen thing is no folder of the file system.
   std::string path(MAX_PATH, ' ');
-  get_path(items, path.data());
-  CoTaskMemFree(items);
+  get_path(items.get(), path.data());
   return from_platform_ansi(path.c_str());
 }
 

@@ -1,12 +1,10 @@
 #include "platform/win32/win32_settings.hpp"
 
 #include <array>
-#include <memory>
-#include <type_traits>
 
 #include "automation/numbers.hpp"
 #include "automation/run_time_error.hpp"
-#include "platform/win32/windows.hpp"
+#include "platform/win32/handle.hpp"
 
 namespace talutil::win32 {
 
@@ -21,11 +19,6 @@ Text read_profile(const Text& file, const Text& section, const char* item) {
                                                static_cast<DWORD>(buffer.size()), to_ansi(file).c_str());
   return from_ansi({buffer.data(), count});
 }
-
-struct CloseKey {
-  void operator()(HKEY key) const noexcept { RegCloseKey(key); }
-};
-using Key = std::unique_ptr<std::remove_pointer_t<HKEY>, CloseKey>;
 
 /// Names end at a NUL, as the system's do.
 Text path_of(const Text& application, const Text& section) {
@@ -64,18 +57,19 @@ void Win32Profiles::put(const Text& file, const Text& section, const Text& item,
 
 std::optional<Text> Win32SettingsStore::value(const Text& application, const Text& section, const Text& key) {
   const Text path = path_of(application, section);
-  HKEY handle = nullptr;
-  if (!is_there(RegOpenKeyExW(HKEY_CURRENT_USER, wide(path), 0, KEY_QUERY_VALUE, &handle), path)) return std::nullopt;
-  const Key opened(handle);
+  Owned<kind::RegistryKey> opened;
+  if (!is_there(RegOpenKeyExW(HKEY_CURRENT_USER, wide(path), 0, KEY_QUERY_VALUE, opened.receive()), path)) {
+    return std::nullopt;
+  }
   Text text;
   DWORD type = 0;
   DWORD bytes = 0;
-  LSTATUS status = RegQueryValueExW(handle, wide(key), nullptr, &type, nullptr, &bytes);
+  LSTATUS status = RegQueryValueExW(opened.get(), wide(key), nullptr, &type, nullptr, &bytes);
   // Another process can make it longer between the two questions.
   while (status == ERROR_SUCCESS || status == ERROR_MORE_DATA) {
     text.resize((bytes + 1) / sizeof(char16_t));
     bytes = bytes_of(text.size());
-    status = RegQueryValueExW(handle, wide(key), nullptr, &type, reinterpret_cast<BYTE*>(text.data()), &bytes);
+    status = RegQueryValueExW(opened.get(), wide(key), nullptr, &type, reinterpret_cast<BYTE*>(text.data()), &bytes);
     if (status == ERROR_SUCCESS) break;
   }
   if (!is_there(status, path) || type != REG_SZ) return std::nullopt;
@@ -86,12 +80,13 @@ std::optional<Text> Win32SettingsStore::value(const Text& application, const Tex
 
 void Win32SettingsStore::put(const Text& application, const Text& section, const Text& key, const Text& value) {
   const Text path = path_of(application, section);
-  HKEY handle = nullptr;
-  require(RegCreateKeyExW(HKEY_CURRENT_USER, wide(path), 0, nullptr, 0, KEY_SET_VALUE, nullptr, &handle, nullptr),
-          path);
-  const Key opened(handle);
+  Owned<kind::RegistryKey> opened;
+  require(
+      RegCreateKeyExW(HKEY_CURRENT_USER, wide(path), 0, nullptr, 0, KEY_SET_VALUE, nullptr, opened.receive(), nullptr),
+      path);
   const DWORD bytes = bytes_of(value.size() + 1);
-  require(RegSetValueExW(handle, wide(key), 0, REG_SZ, reinterpret_cast<const BYTE*>(value.c_str()), bytes), path);
+  require(RegSetValueExW(opened.get(), wide(key), 0, REG_SZ, reinterpret_cast<const BYTE*>(value.c_str()), bytes),
+          path);
 }
 
 }  // namespace talutil::win32
