@@ -3,6 +3,7 @@
 #include <cmath>
 #include <map>
 
+#include "platform/win32/handle.hpp"
 #include "preview/font_metrics.hpp"
 
 namespace talutil::win32 {
@@ -14,28 +15,23 @@ int rounded(double value) { return static_cast<int>(std::lround(value)); }
 /// The fonts of one page on one device.
 class Fonts {
  public:
-  Fonts(HDC device, double scale) : device_(device), scale_(scale), before_(GetCurrentObject(device, OBJ_FONT)) {}
-  Fonts(const Fonts&) = delete;
-  Fonts& operator=(const Fonts&) = delete;
-  ~Fonts() {
-    SelectObject(device_, before_);
-    for (const auto& [key, font] : fonts_) DeleteObject(font);
-  }
+  Fonts(HDC device, double scale)
+      : device_(device), scale_(scale), before_(GetCurrentObject(device, OBJ_FONT), {device}) {}
 
   void select(const FontStyle& style) {
     static constexpr const wchar_t* names[] = {L"Courier New", L"Arial", L"Times New Roman"};
     // Where a font is missing, the platform takes another of its kind.
     static constexpr DWORD kinds[] = {FIXED_PITCH | FF_MODERN, VARIABLE_PITCH | FF_SWISS, VARIABLE_PITCH | FF_ROMAN};
     const Key key{style.family, style.is_bold, style.points};
-    HFONT& font = fonts_[key];
-    if (font == nullptr) {
+    Owned<kind::Font>& font = fonts_[key];
+    if (!font) {
       constexpr double twips_per_point = 20;
-      font =
-          CreateFontW(-rounded(style.points * twips_per_point * scale_), 0, 0, 0, style.is_bold ? FW_BOLD : FW_NORMAL,
-                      FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_TT_PRECIS, CLIP_DEFAULT_PRECIS, CLEARTYPE_QUALITY,
-                      kinds[static_cast<std::size_t>(style.family)], names[static_cast<std::size_t>(style.family)]);
+      font.reset(CreateFontW(-rounded(style.points * twips_per_point * scale_), 0, 0, 0,
+                             style.is_bold ? FW_BOLD : FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_TT_PRECIS,
+                             CLIP_DEFAULT_PRECIS, CLEARTYPE_QUALITY, kinds[static_cast<std::size_t>(style.family)],
+                             names[static_cast<std::size_t>(style.family)]));
     }
-    SelectObject(device_, font);
+    SelectObject(device_, font.get());
   }
 
  private:
@@ -43,8 +39,8 @@ class Fonts {
 
   HDC device_;
   double scale_;
-  HGDIOBJ before_;
-  std::map<Key, HFONT> fonts_;
+  std::map<Key, Owned<kind::Font>> fonts_;
+  Owned<kind::Selection> before_;
 };
 
 class Drawer {
@@ -82,22 +78,19 @@ class Drawer {
     if (is_unseen(box.place)) return;
     const RECT place = rectangle_of(box.place);
     if (box.fill) {
-      const HBRUSH brush = CreateSolidBrush(*box.fill);
-      FillRect(device_, &place, brush);
-      DeleteObject(brush);
+      const Owned<kind::Brush> brush(CreateSolidBrush(*box.fill));
+      FillRect(device_, &place, brush.get());
     }
     if (box.line_width == 0) return;
-    const HPEN pen =
-        CreatePen(PS_INSIDEFRAME, std::max(1, rounded(box.line_width * placement_.scale_y)), box.line_colour);
-    const HGDIOBJ pen_before = SelectObject(device_, pen);
+    const Owned<kind::Pen> pen(
+        CreatePen(PS_INSIDEFRAME, std::max(1, rounded(box.line_width * placement_.scale_y)), box.line_colour));
+    const Owned<kind::Selection> selected = select(device_, pen.get());
     const POINT corners[] = {{place.left, place.top},
                              {place.right, place.top},
                              {place.right, place.bottom},
                              {place.left, place.bottom},
                              {place.left, place.top}};
     Polyline(device_, corners, box.place.height == 0 ? 2 : 5);
-    SelectObject(device_, pen_before);
-    DeleteObject(pen);
   }
 
   void draw(const Picture& picture) {
@@ -148,12 +141,9 @@ class Drawer {
 }  // namespace
 
 void draw_page(HDC device, const Page& page, const PagePlacement& placement) {
-  const int saved = SaveDC(device);
-  {
-    Drawer drawer(device, placement);
-    for (const PageItem& item : page.items) std::visit([&](const auto& held) { drawer.draw(held); }, item);
-  }
-  RestoreDC(device, saved);
+  const Owned<kind::SavedState> saved = save_state(device);
+  Drawer drawer(device, placement);
+  for (const PageItem& item : page.items) std::visit([&](const auto& held) { drawer.draw(held); }, item);
 }
 
 }  // namespace talutil::win32

@@ -5,7 +5,6 @@
 #include "platform/win32/colours.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/module_path.hpp"
-#include "platform/win32/windows.hpp"
 
 namespace talutil::win32 {
 
@@ -62,23 +61,20 @@ WindowImage Win32Drawing::image_of(std::intptr_t window) {
   BITMAPINFO information{};
   information.bmiHeader = {sizeof(BITMAPINFOHEADER), image.width, -image.height, 1, 32, BI_RGB, 0, 0, 0, 0, 0};
   void* bits = nullptr;
-  const HDC context = CreateCompatibleDC(nullptr);
-  const HBITMAP bitmap = CreateDIBSection(context, &information, DIB_RGB_COLORS, &bits, nullptr, 0);
-  if (bitmap != nullptr) {
-    const HGDIOBJ before = SelectObject(context, bitmap);
+  const Owned<kind::MadeDevice> context(CreateCompatibleDC(nullptr));
+  const Owned<kind::Bitmap> bitmap(CreateDIBSection(context.get(), &information, DIB_RGB_COLORS, &bits, nullptr, 0));
+  if (bitmap) {
+    const Owned<kind::Selection> selected = select(context.get(), bitmap.get());
     // What a window does not draw of itself stays white.
-    PatBlt(context, 0, 0, image.width, image.height, WHITENESS);
-    PrintWindow(handle, context, 0);
+    PatBlt(context.get(), 0, 0, image.width, image.height, WHITENESS);
+    PrintWindow(handle, context.get(), 0);
     GdiFlush();
     const auto* pixel = static_cast<const std::uint8_t*>(bits);
     const auto count = static_cast<std::size_t>(image.width) * static_cast<std::size_t>(image.height);
     image.pixels.reserve(count * 3);
     for (std::size_t i = 0; i < count; ++i, pixel += 4)
       image.pixels.insert(image.pixels.end(), {pixel[2], pixel[1], pixel[0]});
-    SelectObject(context, before);
-    DeleteObject(bitmap);
   }
-  DeleteDC(context);
   if (image.pixels.empty()) raise(ErrorNumber::invalid_procedure_call);
   return image;
 }

@@ -27,20 +27,14 @@ class PrintDialog {
     native_.hwndOwner = GetActiveWindow();
     if (show_ == nullptr || last_error_ == nullptr) raise_printer_error(u"comdlg32.dll is missing");
   }
-  PrintDialog(const PrintDialog&) = delete;
-  PrintDialog& operator=(const PrintDialog&) = delete;
-  ~PrintDialog() {
-    if (native_.hDC != nullptr) DeleteDC(native_.hDC);
-    if (native_.hDevMode != nullptr) GlobalFree(native_.hDevMode);
-    if (native_.hDevNames != nullptr) GlobalFree(native_.hDevNames);
-  }
 
   /// Takes the default printer, set up as the document is. Raises 482 where there is none.
   void prepare(const PrintSettings& settings) {
     native_.Flags = PD_RETURNDEFAULT;
-    if (show_(&native_) == FALSE) raise_printer_error(u"no printer is installed");
-    auto* const mode = static_cast<DEVMODEW*>(native_.hDevMode == nullptr ? nullptr : GlobalLock(native_.hDevMode));
-    if (mode == nullptr) return;
+    if (!show()) raise_printer_error(u"no printer is installed");
+    const Owned<kind::LockedMemory> locked = lock(mode_.get());
+    if (!locked) return;
+    auto* const mode = static_cast<DEVMODEW*>(locked.get());
     mode->dmFields |= DM_ORIENTATION | DM_PAPERSIZE;
     mode->dmOrientation = settings.orientation == 1 ? DMORIENT_LANDSCAPE : DMORIENT_PORTRAIT;
     mode->dmPaperSize = static_cast<short>(settings.paper_size);
@@ -48,7 +42,6 @@ class PrintDialog {
       mode->dmFields |= DM_DUPLEX;
       mode->dmDuplex = static_cast<short>(settings.duplex);
     }
-    GlobalUnlock(native_.hDevMode);
   }
 
   /// Lets the user choose among the pages. False when the dialog is cancelled.
@@ -57,24 +50,23 @@ class PrintDialog {
     native_.nMinPage = native_.nFromPage = 1;
     native_.nMaxPage = native_.nToPage = static_cast<WORD>(std::min<std::size_t>(pages, 0xFFFF));
     native_.nCopies = 1;
-    if (show_(&native_) != FALSE) return true;
+    if (show()) return true;
     if (last_error_() != 0) raise_printer_error(u"the printer dialog failed");
     return false;
   }
 
   /// The device for printing without asking.
   void open() {
-    auto* const names = static_cast<DEVNAMES*>(GlobalLock(native_.hDevNames));
-    auto* const mode = static_cast<DEVMODEW*>(native_.hDevMode == nullptr ? nullptr : GlobalLock(native_.hDevMode));
-    if (names != nullptr) {
-      const auto* const words = reinterpret_cast<const wchar_t*>(names);
-      native_.hDC = CreateDCW(words + names->wDriverOffset, words + names->wDeviceOffset, nullptr, mode);
-      GlobalUnlock(native_.hDevNames);
-    }
-    if (mode != nullptr) GlobalUnlock(native_.hDevMode);
+    const Owned<kind::LockedMemory> locked = lock(names_.get());
+    const Owned<kind::LockedMemory> mode = lock(mode_.get());
+    if (!locked) return;
+    const auto* const names = static_cast<const DEVNAMES*>(locked.get());
+    const auto* const words = static_cast<const wchar_t*>(locked.get());
+    device_.reset(CreateDCW(words + names->wDriverOffset, words + names->wDeviceOffset, nullptr,
+                            static_cast<const DEVMODEW*>(mode.get())));
   }
 
-  [[nodiscard]] HDC device() const noexcept { return native_.hDC; }
+  [[nodiscard]] HDC device() const noexcept { return device_.get(); }
 
   /// The pages that were chosen, counted from 0, behind the last one.
   [[nodiscard]] std::pair<std::size_t, std::size_t> range(std::size_t pages) const noexcept {
@@ -87,7 +79,21 @@ class PrintDialog {
   using Show = BOOL(WINAPI*)(PRINTDLGW*);
   using LastError = DWORD(WINAPI*)();
 
+  /// The dialog takes the memory that it has handed over before, and may hand over other.
+  [[nodiscard]] bool show() noexcept {
+    native_.hDevMode = mode_.release();
+    native_.hDevNames = names_.release();
+    const BOOL is_answered = show_(&native_);
+    mode_.reset(native_.hDevMode);
+    names_.reset(native_.hDevNames);
+    device_.reset(std::exchange(native_.hDC, nullptr));
+    return is_answered != FALSE;
+  }
+
   PRINTDLGW native_{};
+  Owned<kind::GlobalMemory> mode_;
+  Owned<kind::GlobalMemory> names_;
+  Owned<kind::MadeDevice> device_;
   Show show_ = late_function<Show>(L"comdlg32.dll", "PrintDlgW");
   LastError last_error_ = late_function<LastError>(L"comdlg32.dll", "CommDlgExtendedError");
 };
@@ -143,20 +149,17 @@ bool Win32Printers::print(const Document& document, const PrintSettings& setting
 
 std::vector<std::uint8_t> Win32FontFiles::wide_font(bool is_fixed_width) {
   std::vector<std::uint8_t> bytes;
-  const HDC context = CreateCompatibleDC(nullptr);
-  const HFONT font = CreateFontW(-16, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_TT_ONLY_PRECIS,
-                                 CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY,
-                                 is_fixed_width ? FIXED_PITCH | FF_MODERN : VARIABLE_PITCH | FF_SWISS,
-                                 is_fixed_width ? L"Courier New" : L"Arial");
-  const HGDIOBJ before = SelectObject(context, font);
-  const DWORD size = GetFontData(context, 0, 0, nullptr, 0);
+  const Owned<kind::MadeDevice> context(CreateCompatibleDC(nullptr));
+  const Owned<kind::Font> font(CreateFontW(-16, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET,
+                                           OUT_TT_ONLY_PRECIS, CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY,
+                                           is_fixed_width ? FIXED_PITCH | FF_MODERN : VARIABLE_PITCH | FF_SWISS,
+                                           is_fixed_width ? L"Courier New" : L"Arial"));
+  const Owned<kind::Selection> selected = select(context.get(), font.get());
+  const DWORD size = GetFontData(context.get(), 0, 0, nullptr, 0);
   if (size != GDI_ERROR && size > 0) {
     bytes.resize(size);
-    if (GetFontData(context, 0, 0, bytes.data(), size) != size) bytes.clear();
+    if (GetFontData(context.get(), 0, 0, bytes.data(), size) != size) bytes.clear();
   }
-  SelectObject(context, before);
-  DeleteObject(font);
-  DeleteDC(context);
   return bytes;
 }
 
