@@ -36,43 +36,34 @@ class SystemFont {
     NONCLIENTMETRICSW metrics{};
     metrics.cbSize = sizeof metrics;
     if (SystemParametersInfoW(SPI_GETNONCLIENTMETRICS, sizeof metrics, &metrics, 0) != FALSE) {
-      font_ = CreateFontIndirectW(&metrics.lfMessageFont);
+      font_.reset(CreateFontIndirectW(&metrics.lfMessageFont));
     }
-    const HDC context = GetDC(nullptr);
-    const HGDIOBJ before = SelectObject(context, get());
+    const Owned<kind::WindowDevice> context = device_of(nullptr);
+    const Owned<kind::Selection> selected = select(context.get(), get());
     constexpr wchar_t letters[] = L"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz";
     SIZE size{};
-    GetTextExtentPoint32W(context, letters, 52, &size);
+    GetTextExtentPoint32W(context.get(), letters, 52, &size);
     // The average letter, rounded as the system's dialogs round it.
     width_ = (static_cast<int>(size.cx) / 26 + 1) / 2;
     height_ = static_cast<int>(size.cy);
-    SelectObject(context, before);
-    ReleaseDC(nullptr, context);
-  }
-  SystemFont(const SystemFont&) = delete;
-  SystemFont& operator=(const SystemFont&) = delete;
-  ~SystemFont() {
-    if (font_ != nullptr) DeleteObject(font_);
   }
 
-  [[nodiscard]] HGDIOBJ get() const noexcept { return font_ != nullptr ? font_ : GetStockObject(DEFAULT_GUI_FONT); }
+  [[nodiscard]] HGDIOBJ get() const noexcept { return font_ ? font_.get() : GetStockObject(DEFAULT_GUI_FONT); }
   [[nodiscard]] int across(int units) const noexcept { return MulDiv(units, width_, 4); }
   [[nodiscard]] int down(int units) const noexcept { return MulDiv(units, height_, 8); }
 
   /// How high a text is that is broken into a width.
   [[nodiscard]] int height_of(const Text& text, int width) const {
     RECT place{0, 0, width, 0};
-    const HDC context = GetDC(nullptr);
-    const HGDIOBJ before = SelectObject(context, get());
+    const Owned<kind::WindowDevice> context = device_of(nullptr);
+    const Owned<kind::Selection> selected = select(context.get(), get());
     constexpr UINT format = DT_CALCRECT | DT_WORDBREAK | DT_NOPREFIX | DT_EXPANDTABS | DT_EDITCONTROL;
-    DrawTextW(context, wide(text), -1, &place, format);
-    SelectObject(context, before);
-    ReleaseDC(nullptr, context);
+    DrawTextW(context.get(), wide(text), -1, &place, format);
     return static_cast<int>(place.bottom);
   }
 
  private:
-  HFONT font_ = nullptr;
+  Owned<kind::Font> font_;
   int width_ = 0;
   int height_ = 0;
 };
@@ -121,20 +112,13 @@ class FormWindow final : public FormView {
   FormWindow(FormEvents& events, const FormDescription& description) : events_(events), description_(description) {
     load_controls();
     style_ = description.is_resizable ? WS_OVERLAPPEDWINDOW : WS_POPUP | WS_CAPTION | WS_SYSMENU;
-    window_ = CreateWindowExW(WS_EX_CONTROLPARENT, form_class, L"", style_ | WS_CLIPCHILDREN, 0, 0, 0, 0, nullptr,
-                              nullptr, own_module(), nullptr);
-    if (window_ == nullptr) {
+    window_.reset(CreateWindowExW(WS_EX_CONTROLPARENT, form_class, L"", style_ | WS_CLIPCHILDREN, 0, 0, 0, 0, nullptr,
+                                  nullptr, own_module(), nullptr));
+    if (!window_) {
       throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::action_not_supported), Text(no_screen_for_windows));
     }
-    try {
-      for (const FormPart& part : description.parts) add(part);
-    } catch (...) {
-      // Nobody else would: an object that was never made has no end.
-      for (const HWND tips : tips_) DestroyWindow(tips);
-      DestroyWindow(window_);
-      throw;
-    }
-    SetWindowLongPtrW(window_, GWLP_USERDATA, reinterpret_cast<LONG_PTR>(this));
+    for (const FormPart& part : description.parts) add(part);
+    SetWindowLongPtrW(window_.get(), GWLP_USERDATA, reinterpret_cast<LONG_PTR>(this));
     // Tabs lie behind what stands on their pages.
     for (const Control& control : controls_) {
       constexpr UINT order_alone = SWP_NOMOVE | SWP_NOSIZE | SWP_NOACTIVATE;
@@ -148,16 +132,10 @@ class FormWindow final : public FormView {
   FormWindow(const FormWindow&) = delete;
   FormWindow& operator=(const FormWindow&) = delete;
   ~FormWindow() override {
-    unhook();
-    for (const HWND tips : tips_) DestroyWindow(tips);
-    if (window_ != nullptr) {
-      SetWindowLongPtrW(window_, GWLP_USERDATA, 0);
-      DestroyWindow(window_);
-    }
-    if (brush_ != nullptr) DeleteObject(brush_);
+    if (window_) SetWindowLongPtrW(window_.get(), GWLP_USERDATA, 0);
   }
 
-  void set_caption(TextView caption) override { SetWindowTextW(window_, wide(Text(up_to_nul(caption)))); }
+  void set_caption(TextView caption) override { SetWindowTextW(window_.get(), wide(Text(up_to_nul(caption)))); }
 
   void set_text(std::uint8_t part, TextView text) override {
     const HWND control = window_of(part);
@@ -189,20 +167,19 @@ class FormWindow final : public FormView {
   void mask(std::uint8_t part) override { SendMessageW(window_of(part), EM_SETPASSWORDCHAR, L'*', 0); }
 
   void set_colour(std::int32_t colour) override {
-    if (brush_ != nullptr) DeleteObject(brush_);
     colour_ = colour_of(colour);
-    brush_ = CreateSolidBrush(colour_);
-    InvalidateRect(window_, nullptr, TRUE);
+    brush_.reset(CreateSolidBrush(colour_));
+    InvalidateRect(window_.get(), nullptr, TRUE);
   }
 
   void remove_frame() override {
     style_ = WS_POPUP;
-    SetWindowLongPtrW(window_, GWL_STYLE, static_cast<LONG>(style_ | WS_CLIPCHILDREN));
+    SetWindowLongPtrW(window_.get(), GWL_STYLE, static_cast<LONG>(style_ | WS_CLIPCHILDREN));
     size_to_inside();
   }
 
   void keep_on_top() override {
-    SetWindowPos(window_, HWND_TOPMOST, 0, 0, 0, 0, SWP_NOSIZE | SWP_NOMOVE | SWP_NOACTIVATE);
+    SetWindowPos(window_.get(), HWND_TOPMOST, 0, 0, 0, 0, SWP_NOSIZE | SWP_NOMOVE | SWP_NOACTIVATE);
   }
 
   void fit() override {
@@ -252,7 +229,7 @@ class FormWindow final : public FormView {
     table.set_window(static_cast<std::int32_t>(reinterpret_cast<LONG_PTR>(control.window)));
     while (SendMessageW(control.window, LVM_DELETECOLUMN, 0, 0) != 0) {
     }
-    const int dots = dots_per_inch(window_);
+    const int dots = dots_per_inch(window_.get());
     RECT room{};
     GetClientRect(control.window, &room);
     int rest = static_cast<int>(room.right) - GetSystemMetrics(SM_CXVSCROLL);
@@ -275,47 +252,48 @@ class FormWindow final : public FormView {
   void copy(TextView text) override {
     const std::size_t size = (text.size() + 1) * sizeof(char16_t);
     // Another program may have it open for a moment.
-    for (int tries = 0; OpenClipboard(window_) == FALSE; ++tries) {
+    Owned<kind::Clipboard> clipboard(OpenClipboard(window_.get()));
+    for (int tries = 0; !clipboard; ++tries) {
       constexpr std::int32_t cannot_open_clipboard = 521;
       if (tries == 10) throw RunTimeError(cannot_open_clipboard, u"Can't open Clipboard");
       Sleep(20);
+      clipboard.reset(OpenClipboard(window_.get()));
     }
     EmptyClipboard();
-    const HGLOBAL block = GlobalAlloc(GMEM_MOVEABLE, size);
-    if (block != nullptr) {
-      auto* const target = static_cast<char16_t*>(GlobalLock(block));
-      *std::ranges::copy(text, target).out = u'\0';
-      GlobalUnlock(block);
-      if (SetClipboardData(CF_UNICODETEXT, block) == nullptr) GlobalFree(block);
+    Owned<kind::GlobalMemory> block(GlobalAlloc(GMEM_MOVEABLE, size));
+    if (!block) return;
+    {
+      const Owned<kind::LockedMemory> locked = lock(block.get());
+      *std::ranges::copy(text, static_cast<char16_t*>(locked.get())).out = u'\0';
     }
-    CloseClipboard();
+    if (SetClipboardData(CF_UNICODETEXT, block.get()) != nullptr) static_cast<void>(block.release());
   }
 
   void show() override {
     if (!is_shown_) centre();
     is_shown_ = true;
-    ShowWindow(window_, SW_SHOWNORMAL);
-    SetForegroundWindow(window_);
-    RedrawWindow(window_, nullptr, nullptr, RDW_ERASE | RDW_INVALIDATE | RDW_UPDATENOW | RDW_ALLCHILDREN);
+    ShowWindow(window_.get(), SW_SHOWNORMAL);
+    SetForegroundWindow(window_.get());
+    RedrawWindow(window_.get(), nullptr, nullptr, RDW_ERASE | RDW_INVALIDATE | RDW_UPDATENOW | RDW_ALLCHILDREN);
     // The keys of a window that nobody waits for come by way of the host's loop.
-    if (hook_ == nullptr) hook_ = SetWindowsHookExW(WH_GETMESSAGE, &take_message, nullptr, GetCurrentThreadId());
+    if (!hook_) hook_.reset(SetWindowsHookExW(WH_GETMESSAGE, &take_message, nullptr, GetCurrentThreadId()));
   }
 
   void show_modal() override {
     const auto translate = [this](MSG& message) { return take(message); };
     const auto quit = [this] { close(CloseMode::code); };
     if (is_modal_) {
-      SetForegroundWindow(window_);
+      SetForegroundWindow(window_.get());
       handle_until(is_closed_, translate, quit);
       return;
     }
     is_modal_ = true;
-    const WaitingWindows others(window_);
-    SetWindowLongPtrW(window_, GWLP_HWNDPARENT, reinterpret_cast<LONG_PTR>(others.owner()));
+    const WaitingWindows others(window_.get());
+    SetWindowLongPtrW(window_.get(), GWLP_HWNDPARENT, reinterpret_cast<LONG_PTR>(others.owner()));
     show();
-    unhook();
+    hook_.reset();
     handle_until(is_closed_, translate, quit);
-    if (window_ != nullptr) ShowWindow(window_, SW_HIDE);
+    if (window_) ShowWindow(window_.get(), SW_HIDE);
   }
 
   [[nodiscard]] bool is_open() const override { return !is_closed_; }
@@ -327,15 +305,15 @@ class FormWindow final : public FormView {
     for (Control& control : controls_) {
       if (control.table != nullptr) std::exchange(control.table, nullptr)->set_window(0);
     }
-    unhook();
-    if (!is_modal_ && window_ != nullptr) DestroyWindow(window_);
+    hook_.reset();
+    if (!is_modal_) window_.reset();
     // Wakes the loop.
     if (is_modal_) PostThreadMessageW(GetCurrentThreadId(), WM_NULL, 0, 0);
   }
 
   static LRESULT CALLBACK handle_message(HWND window, UINT message, WPARAM what, LPARAM value) noexcept {
     auto* const self = reinterpret_cast<FormWindow*>(GetWindowLongPtrW(window, GWLP_USERDATA));
-    if (self == nullptr || self->window_ == nullptr) return DefWindowProcW(window, message, what, value);
+    if (self == nullptr || !self->window_) return DefWindowProcW(window, message, what, value);
     try {
       if (const auto answer = self->answer(message, what, value)) return *answer;
     } catch (...) {
@@ -370,11 +348,11 @@ class FormWindow final : public FormView {
   }
 
   [[nodiscard]] HWND make_control(const FormPart& part, const ControlKind& kind, const RECT& place) const {
-    const HWND control =
-        CreateWindowExW(kind.extended_style, kind.class_name, wide(Text(part.caption)),
-                        WS_CHILD | WS_VISIBLE | kind.style, static_cast<int>(place.left), static_cast<int>(place.top),
-                        static_cast<int>(place.right - place.left), static_cast<int>(place.bottom - place.top), window_,
-                        reinterpret_cast<HMENU>(static_cast<INT_PTR>(first_id + part.id)), own_module(), nullptr);
+    const HWND control = CreateWindowExW(
+        kind.extended_style, kind.class_name, wide(Text(part.caption)), WS_CHILD | WS_VISIBLE | kind.style,
+        static_cast<int>(place.left), static_cast<int>(place.top), static_cast<int>(place.right - place.left),
+        static_cast<int>(place.bottom - place.top), window_.get(),
+        reinterpret_cast<HMENU>(static_cast<INT_PTR>(first_id + part.id)), own_module(), nullptr);
     if (control == nullptr) raise(ErrorNumber::internal_error);
     SendMessageW(control, WM_SETFONT, reinterpret_cast<WPARAM>(font_.get()), FALSE);
     return control;
@@ -382,17 +360,17 @@ class FormWindow final : public FormView {
 
   void add_tip(HWND control, TextView tip) {
     // Without an owner: some systems put a window below its own tips, which keeps it from the top.
-    const HWND tips = CreateWindowExW(WS_EX_TOPMOST, L"tooltips_class32", nullptr, WS_POPUP | TTS_ALWAYSTIP, 0, 0, 0, 0,
-                                      nullptr, nullptr, own_module(), nullptr);
-    tips_.push_back(tips);
+    Owned<kind::Window> tips(CreateWindowExW(WS_EX_TOPMOST, L"tooltips_class32", nullptr, WS_POPUP | TTS_ALWAYSTIP, 0,
+                                             0, 0, 0, nullptr, nullptr, own_module(), nullptr));
     Text text(tip);
     TTTOOLINFOW tool{};
     tool.cbSize = TTTOOLINFOW_V1_SIZE;
     tool.uFlags = TTF_IDISHWND | TTF_SUBCLASS;
-    tool.hwnd = window_;
+    tool.hwnd = window_.get();
     tool.uId = reinterpret_cast<UINT_PTR>(control);
     tool.lpszText = reinterpret_cast<wchar_t*>(text.data());
-    SendMessageW(tips, TTM_ADDTOOLW, 0, reinterpret_cast<LPARAM>(&tool));
+    SendMessageW(tips.get(), TTM_ADDTOOLW, 0, reinterpret_cast<LPARAM>(&tool));
+    tips_.push_back(std::move(tips));
   }
 
   /// A label that is higher than the screen becomes a text that can be scrolled.
@@ -424,14 +402,14 @@ class FormWindow final : public FormView {
 
   [[nodiscard]] SIZE outer_size() const {
     RECT outer{};
-    GetWindowRect(window_, &outer);
+    GetWindowRect(window_.get(), &outer);
     return {outer.right - outer.left, outer.bottom - outer.top};
   }
 
   void size_to_inside() const {
     RECT outer{0, 0, inner_.cx, inner_.cy};
     AdjustWindowRectEx(&outer, style_, FALSE, WS_EX_CONTROLPARENT);
-    SetWindowPos(window_, nullptr, 0, 0, static_cast<int>(outer.right - outer.left),
+    SetWindowPos(window_.get(), nullptr, 0, 0, static_cast<int>(outer.right - outer.left),
                  static_cast<int>(outer.bottom - outer.top),
                  SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE | SWP_FRAMECHANGED);
   }
@@ -447,7 +425,7 @@ class FormWindow final : public FormView {
     const auto middle = [](LONG start, LONG end, LONG length) {
       return static_cast<int>(std::max(start, start + (end - start - length) / 2));
     };
-    SetWindowPos(window_, nullptr, middle(work.left, work.right, size.cx), middle(work.top, work.bottom, size.cy),
+    SetWindowPos(window_.get(), nullptr, middle(work.left, work.right, size.cx), middle(work.top, work.bottom, size.cy),
                  static_cast<int>(size.cx), static_cast<int>(size.cy), SWP_NOZORDER | SWP_NOACTIVATE);
   }
 
@@ -465,16 +443,12 @@ class FormWindow final : public FormView {
   }
 
   void lay_out() const {
-    if (!description_.is_resizable || IsIconic(window_) != FALSE) return;
+    if (!description_.is_resizable || IsIconic(window_.get()) != FALSE) return;
     RECT inside{};
-    GetClientRect(window_, &inside);
+    GetClientRect(window_.get(), &inside);
     for (const Control& control : controls_) {
       move(control, static_cast<int>(inside.right - inner_.cx), static_cast<int>(inside.bottom - inner_.cy));
     }
-  }
-
-  void unhook() noexcept {
-    if (hook_ != nullptr) UnhookWindowsHookEx(std::exchange(hook_, nullptr));
   }
 
   static LRESULT CALLBACK take_message(int code, WPARAM what, LPARAM value) noexcept {
@@ -495,9 +469,9 @@ class FormWindow final : public FormView {
 
   /// Handles the keys that move about a window. False for other messages.
   bool take(MSG& message) {
-    if (window_ == nullptr || (message.hwnd != window_ && IsChild(window_, message.hwnd) == FALSE)) return false;
+    if (!window_ || (message.hwnd != window_.get() && IsChild(window_.get(), message.hwnd) == FALSE)) return false;
     if (message.message == WM_KEYDOWN && take_key(message.wParam)) return true;
-    return IsDialogMessageW(window_, &message) != FALSE;
+    return IsDialogMessageW(window_.get(), &message) != FALSE;
   }
 
   bool take_key(WPARAM key) {
@@ -511,7 +485,7 @@ class FormWindow final : public FormView {
     if (key == VK_TAB) {
       if (is_control) return turn_tab(is_down(VK_SHIFT));
       // Rich texts would take the key for themselves.
-      focus(GetNextDlgTabItem(window_, GetFocus(), is_down(VK_SHIFT) ? TRUE : FALSE));
+      focus(GetNextDlgTabItem(window_.get(), GetFocus(), is_down(VK_SHIFT) ? TRUE : FALSE));
       return true;
     }
     if (is_control && key == 'C' && table != nullptr) {
@@ -598,14 +572,13 @@ class FormWindow final : public FormView {
     bar.right = bar.left + std::lround(static_cast<double>(place.right - place.left) *
                                        std::min(leading_number(text), whole) / whole);
     const auto draw_text = [&](const RECT& part, int colour) {
-      const int saved = SaveDC(device);
+      const Owned<kind::SavedState> saved = save_state(device);
       IntersectClipRect(device, static_cast<int>(part.left), static_cast<int>(part.top), static_cast<int>(part.right),
                         static_cast<int>(part.bottom));
       SetBkMode(device, TRANSPARENT);
       SetTextColor(device, GetSysColor(colour));
       RECT whole_place = place;
       DrawTextW(device, wide(text), -1, &whole_place, DT_CENTER | DT_VCENTER | DT_SINGLELINE | DT_NOPREFIX);
-      RestoreDC(device, saved);
     };
     FillRect(device, &bar, GetSysColorBrush(COLOR_HIGHLIGHT));
     draw_text(bar, COLOR_HIGHLIGHTTEXT);
@@ -659,20 +632,21 @@ class FormWindow final : public FormView {
       }
       case WM_NEXTDLGCTL:
         // A label that was reached by its letter has the focus for a moment, then passes it on.
-        focus(LOWORD(value) != 0 ? reinterpret_cast<HWND>(what) : GetNextDlgTabItem(window_, GetFocus(), what != 0));
+        focus(LOWORD(value) != 0 ? reinterpret_cast<HWND>(what)
+                                 : GetNextDlgTabItem(window_.get(), GetFocus(), what != 0));
         return 0;
       case WM_CTLCOLORSTATIC:
       case WM_CTLCOLORBTN:
-        if (brush_ == nullptr) return std::nullopt;
+        if (!brush_) return std::nullopt;
         SetBkMode(reinterpret_cast<HDC>(what), TRANSPARENT);
         SetTextColor(reinterpret_cast<HDC>(what), readable_on(colour_));
         SetBkColor(reinterpret_cast<HDC>(what), colour_);
-        return reinterpret_cast<LRESULT>(brush_);
+        return reinterpret_cast<LRESULT>(brush_.get());
       case WM_ERASEBKGND: {
-        if (brush_ == nullptr) return std::nullopt;
+        if (!brush_) return std::nullopt;
         RECT inside{};
-        GetClientRect(window_, &inside);
-        FillRect(reinterpret_cast<HDC>(what), &inside, brush_);
+        GetClientRect(window_.get(), &inside);
+        FillRect(reinterpret_cast<HDC>(what), &inside, brush_.get());
         return 1;
       }
       case WM_SIZE:
@@ -686,7 +660,7 @@ class FormWindow final : public FormView {
         if (LOWORD(what) == WA_INACTIVE) focused_ = GetFocus();
         return std::nullopt;
       case WM_SETFOCUS:
-        focus(focused_ != nullptr && IsChild(window_, focused_) != FALSE ? focused_ : first_control());
+        focus(focused_ != nullptr && IsChild(window_.get(), focused_) != FALSE ? focused_ : first_control());
         return 0;
       case WM_CLOSE:
         close(CloseMode::control_menu);
@@ -704,22 +678,23 @@ class FormWindow final : public FormView {
     const bool was_modal = std::exchange(is_modal_, true);
     close(CloseMode::code);
     is_modal_ = was_modal;
-    window_ = nullptr;
+    static_cast<void>(window_.release());
   }
 
   FormEvents& events_;
   const FormDescription& description_;
-  WindowClass window_class_{form_class, &FormWindow::handle_message, COLOR_BTNFACE};
+  // In this order: the window ends before what it draws with, and its tips and hook before it.
+  Owned<kind::WindowClass> window_class_ = register_class(form_class, &FormWindow::handle_message, COLOR_BTNFACE);
   SystemFont font_;
-  HWND window_ = nullptr;
+  Owned<kind::Brush> brush_;
+  Owned<kind::Window> window_;
+  std::vector<Owned<kind::Window>> tips_;
+  Owned<kind::Hook> hook_;
   std::vector<Control> controls_;
-  std::vector<HWND> tips_;
   DWORD style_ = 0;
   SIZE inner_{};
   SIZE smallest_{};
-  HBRUSH brush_ = nullptr;
   COLORREF colour_ = 0;
-  HHOOK hook_ = nullptr;
   HWND focused_ = nullptr;
   bool is_shown_ = false;
   bool is_modal_ = false;

@@ -3,8 +3,8 @@
 #include <array>
 
 #include "automation/run_time_error.hpp"
+#include "platform/win32/handle.hpp"
 #include "platform/win32/module_path.hpp"
-#include "platform/win32/windows.hpp"
 
 namespace talutil::win32 {
 
@@ -20,40 +20,36 @@ Text host_title() {
 constexpr float twips_per_inch = 1440;
 
 float twips_per_pixel(int capability) {
-  const HDC screen = GetDC(nullptr);
-  if (screen == nullptr) raise(ErrorNumber::internal_error);
-  const int dots_per_inch = GetDeviceCaps(screen, capability);
-  ReleaseDC(nullptr, screen);
-  return twips_per_inch / static_cast<float>(dots_per_inch);
+  const Owned<kind::WindowDevice> screen = device_of(nullptr);
+  if (!screen) raise(ErrorNumber::internal_error);
+  return twips_per_inch / static_cast<float>(GetDeviceCaps(screen.get(), capability));
 }
 
 /// The owner of dialogs. It is made when the first dialog wants it: until then a script that never looks for messages
 /// has no window that broadcasts would wait for. Windows end with their thread, after which it is made again.
-class Window final : public HiddenWindow {
+class DialogOwner final : public HiddenWindow {
  public:
-  explicit Window(TextView caption) : caption_(caption) {}
-  Window(const Window&) = delete;
-  Window& operator=(const Window&) = delete;
-  ~Window() override {
-    if (handle_ != nullptr) DestroyWindow(handle_);
-  }
+  explicit DialogOwner(TextView caption) : caption_(caption) {}
 
   [[nodiscard]] std::intptr_t handle() override {
-    if (handle_ == nullptr || IsWindow(handle_) == FALSE) handle_ = make();
-    return reinterpret_cast<std::intptr_t>(handle_);
+    if (IsWindow(window_.get()) == FALSE) {
+      static_cast<void>(window_.release());
+      window_ = make();
+    }
+    return reinterpret_cast<std::intptr_t>(window_.get());
   }
 
  private:
   /// Of a class of the system's own, whose window procedure is there as long as the window is.
-  [[nodiscard]] HWND make() const {
-    HWND window =
-        CreateWindowExW(0, L"Static", wide(caption_), WS_POPUP, 0, 0, 0, 0, nullptr, nullptr, nullptr, nullptr);
-    if (window == nullptr) raise(ErrorNumber::internal_error);
+  [[nodiscard]] Owned<kind::Window> make() const {
+    Owned<kind::Window> window(
+        CreateWindowExW(0, L"Static", wide(caption_), WS_POPUP, 0, 0, 0, 0, nullptr, nullptr, nullptr, nullptr));
+    if (!window) raise(ErrorNumber::internal_error);
     return window;
   }
 
   Text caption_;
-  HWND handle_ = nullptr;
+  Owned<kind::Window> window_;
 };
 
 /// A setting of the user's locale; empty where there is none.
@@ -115,7 +111,7 @@ Date Win32Clock::now() {
 }
 
 std::unique_ptr<HiddenWindow> Win32FormWindows::make_hidden(TextView caption) {
-  return std::make_unique<Window>(caption);
+  return std::make_unique<DialogOwner>(caption);
 }
 
 bool Win32MessagePump::handle_waiting() {

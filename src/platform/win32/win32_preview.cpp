@@ -190,24 +190,20 @@ class PagesWindow {
   /// By way of a bitmap, so that nothing flickers.
   void paint() const {
     PAINTSTRUCT painting;
-    const HDC screen = BeginPaint(window_, &painting);
+    const Owned<kind::Painting> screen(BeginPaint(window_, &painting), {window_, &painting});
     RECT room;
     GetClientRect(window_, &room);
     const RECT& part = painting.rcPaint;
     const int width = static_cast<int>(part.right - part.left);
     const int height = static_cast<int>(part.bottom - part.top);
-    const HDC memory = CreateCompatibleDC(screen);
-    const HBITMAP bitmap = CreateCompatibleBitmap(screen, std::max(width, 1), std::max(height, 1));
-    const HGDIOBJ before = SelectObject(memory, bitmap);
-    SetWindowOrgEx(memory, static_cast<int>(part.left), static_cast<int>(part.top), nullptr);
-    draw(memory, room);
-    SelectClipRgn(memory, nullptr);
-    BitBlt(screen, static_cast<int>(part.left), static_cast<int>(part.top), width, height, memory,
+    const Owned<kind::MadeDevice> memory(CreateCompatibleDC(screen.get()));
+    const Owned<kind::Bitmap> bitmap(CreateCompatibleBitmap(screen.get(), std::max(width, 1), std::max(height, 1)));
+    const Owned<kind::Selection> selected = select(memory.get(), bitmap.get());
+    SetWindowOrgEx(memory.get(), static_cast<int>(part.left), static_cast<int>(part.top), nullptr);
+    draw(memory.get(), room);
+    SelectClipRgn(memory.get(), nullptr);
+    BitBlt(screen.get(), static_cast<int>(part.left), static_cast<int>(part.top), width, height, memory.get(),
            static_cast<int>(part.left), static_cast<int>(part.top), SRCCOPY);
-    SelectObject(memory, before);
-    DeleteObject(bitmap);
-    DeleteDC(memory);
-    EndPaint(window_, &painting);
   }
 
   LRESULT answer(HWND window, UINT message, WPARAM what, LPARAM value) {
@@ -260,39 +256,42 @@ class PreviewWindow final : public PreviewView {
     constexpr int usual_width = 800;
     constexpr int usual_height = 600;
     const auto make = [](HWND parent) {
-      return CreateWindowExW(0, frame_class, L"", WS_OVERLAPPEDWINDOW | WS_CLIPCHILDREN, CW_USEDEFAULT, CW_USEDEFAULT,
-                             usual_width, usual_height, parent, make_menu(), own_module(), nullptr);
+      Owned<kind::Menu> menu = make_menu();
+      Owned<kind::Window> window(CreateWindowExW(0, frame_class, L"", WS_OVERLAPPEDWINDOW | WS_CLIPCHILDREN,
+                                                 CW_USEDEFAULT, CW_USEDEFAULT, usual_width, usual_height, parent,
+                                                 menu.get(), own_module(), nullptr));
+      // A window ends its menu itself.
+      if (window) static_cast<void>(menu.release());
+      return window;
     };
     window_ = make(nullptr);
     // Unattended runs may have no desktop to put windows on. They show none.
-    if (window_ == nullptr) {
+    if (!window_) {
       window_ = make(HWND_MESSAGE);
       has_desktop_ = false;
     }
-    if (window_ == nullptr) raise(ErrorNumber::internal_error);
-    pages_ = std::make_unique<PagesWindow>(window_, events, print);
-    SetWindowLongPtrW(window_, GWLP_USERDATA, reinterpret_cast<LONG_PTR>(this));
+    if (!window_) raise(ErrorNumber::internal_error);
+    pages_ = std::make_unique<PagesWindow>(window_.get(), events, print);
+    SetWindowLongPtrW(window_.get(), GWLP_USERDATA, reinterpret_cast<LONG_PTR>(this));
   }
   PreviewWindow(const PreviewWindow&) = delete;
   PreviewWindow& operator=(const PreviewWindow&) = delete;
   ~PreviewWindow() override {
-    if (window_ == nullptr) return;
-    SetWindowLongPtrW(window_, GWLP_USERDATA, 0);
-    DestroyWindow(window_);
+    if (window_) SetWindowLongPtrW(window_.get(), GWLP_USERDATA, 0);
   }
 
-  void set_caption(TextView caption) override { SetWindowTextW(window_, wide(Text(caption))); }
+  void set_caption(TextView caption) override { SetWindowTextW(window_.get(), wide(Text(caption))); }
 
   [[nodiscard]] std::int32_t window_state() const override {
     // A window that is not shown yet has the state that it will be shown in.
     if (!is_shown_) return state_;
-    if (IsIconic(window_) != FALSE) return 1;
-    return IsZoomed(window_) != FALSE ? 2 : 0;
+    if (IsIconic(window_.get()) != FALSE) return 1;
+    return IsZoomed(window_.get()) != FALSE ? 2 : 0;
   }
 
   void set_window_state(std::int32_t state) override {
     state_ = state >= 0 && state <= 2 ? state : 0;
-    if (is_shown_) ShowWindow(window_, command());
+    if (is_shown_) ShowWindow(window_.get(), command());
   }
 
   [[nodiscard]] float width() const override { return twips(outer().right - outer().left); }
@@ -308,7 +307,7 @@ class PreviewWindow final : public PreviewView {
   }
 
   void check(PreviewMenu item, bool is_checked) override {
-    CheckMenuItem(GetMenu(window_), command_of(item), is_checked ? MF_CHECKED : MF_UNCHECKED);
+    CheckMenuItem(GetMenu(window_.get()), command_of(item), is_checked ? MF_CHECKED : MF_UNCHECKED);
   }
 
   void show_page() override { pages_->show(); }
@@ -317,16 +316,16 @@ class PreviewWindow final : public PreviewView {
     if (!has_desktop_) {
       throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::action_not_supported), Text(no_screen));
     }
-    const WaitingWindows others(window_);
+    const WaitingWindows others(window_.get());
     is_shown_ = true;
-    ShowWindow(window_, command());
-    SetForegroundWindow(window_);
+    ShowWindow(window_.get(), command());
+    SetForegroundWindow(window_.get());
     events_.resized();
     events_.activated();
     pages_->show();
     handle_until(
         is_closed_, [](const MSG&) { return false; }, [this] { close(); });
-    ShowWindow(window_, SW_HIDE);
+    ShowWindow(window_.get(), SW_HIDE);
   }
 
   void close() override {
@@ -334,7 +333,7 @@ class PreviewWindow final : public PreviewView {
     events_.closing();
     is_closed_ = true;
     // Wakes the loop.
-    PostMessageW(window_, WM_NULL, 0, 0);
+    PostMessageW(window_.get(), WM_NULL, 0, 0);
   }
 
   static LRESULT CALLBACK handle_message(HWND window, UINT message, WPARAM what, LPARAM value) noexcept {
@@ -346,20 +345,22 @@ class PreviewWindow final : public PreviewView {
  private:
   static UINT command_of(PreviewMenu item) noexcept { return first_command + static_cast<UINT>(item); }
 
-  static HMENU make_menu() {
-    HMENU levels[3] = {CreateMenu(), nullptr, nullptr};
+  static Owned<kind::Menu> make_menu() {
+    Owned<kind::Menu> menu(CreateMenu());
+    HMENU levels[3] = {menu.get(), nullptr, nullptr};
     for (std::size_t i = 0; i < std::size(preview_menu); ++i) {
       const PreviewMenuItem& item = preview_menu[i];
       const bool opens = i + 1 < std::size(preview_menu) && preview_menu[i + 1].level > item.level;
       if (opens) {
-        levels[item.level + 1] = CreatePopupMenu();
-        AppendMenuW(levels[item.level], MF_POPUP, reinterpret_cast<UINT_PTR>(levels[item.level + 1]),
-                    wide(Text(item.caption)));
+        Owned<kind::Menu> popup(CreatePopupMenu());
+        const BOOL is_added = AppendMenuW(levels[item.level], MF_POPUP, reinterpret_cast<UINT_PTR>(popup.get()),
+                                          wide(Text(item.caption)));
+        levels[item.level + 1] = is_added != FALSE ? popup.release() : nullptr;
       } else {
         AppendMenuW(levels[item.level], MF_STRING, command_of(item.item), wide(Text(item.caption)));
       }
     }
-    return levels[0];
+    return menu;
   }
 
   [[nodiscard]] int command() const noexcept {
@@ -369,23 +370,23 @@ class PreviewWindow final : public PreviewView {
 
   [[nodiscard]] RECT outer() const {
     RECT place{};
-    GetWindowRect(window_, &place);
+    GetWindowRect(window_.get(), &place);
     return place;
   }
   [[nodiscard]] RECT inner() const {
     RECT place{};
-    GetClientRect(window_, &place);
+    GetClientRect(window_.get(), &place);
     return place;
   }
   [[nodiscard]] float twips(LONG length) const {
-    return static_cast<float>(length * twips_per_inch / dots_per_inch(window_));
+    return static_cast<float>(length * twips_per_inch / dots_per_inch(window_.get()));
   }
   [[nodiscard]] int pixels(float length) const {
-    return static_cast<int>(std::lround(double{length} * dots_per_inch(window_) / twips_per_inch));
+    return static_cast<int>(std::lround(double{length} * dots_per_inch(window_.get()) / twips_per_inch));
   }
   void resize(LONG width, LONG height) const {
     constexpr LONG most = 32000;
-    SetWindowPos(window_, nullptr, 0, 0, static_cast<int>(std::clamp<LONG>(width, 0, most)),
+    SetWindowPos(window_.get(), nullptr, 0, 0, static_cast<int>(std::clamp<LONG>(width, 0, most)),
                  static_cast<int>(std::clamp<LONG>(height, 0, most)), SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE);
   }
 
@@ -412,19 +413,22 @@ class PreviewWindow final : public PreviewView {
       case WM_DESTROY:
         // Somebody else has destroyed the window.
         close();
-        window_ = nullptr;
+        static_cast<void>(window_.release());
         return 0;
       default:
         break;
     }
-    return DefWindowProcW(window_, message, what, value);
+    return DefWindowProcW(window_.get(), message, what, value);
   }
 
   PreviewEvents& events_;
-  WindowClass frame_window_class_{frame_class, &PreviewWindow::handle_message, COLOR_APPWORKSPACE};
-  WindowClass pages_window_class_{pages_class, &PagesWindow::handle_message, COLOR_APPWORKSPACE};
-  HWND window_ = nullptr;
+  Owned<kind::WindowClass> frame_window_class_ =
+      register_class(frame_class, &PreviewWindow::handle_message, COLOR_APPWORKSPACE);
+  Owned<kind::WindowClass> pages_window_class_ =
+      register_class(pages_class, &PagesWindow::handle_message, COLOR_APPWORKSPACE);
+  // The window ends first, and the one of the pages with it, which still gets messages then.
   std::unique_ptr<PagesWindow> pages_;
+  Owned<kind::Window> window_;
   std::int32_t state_ = 0;
   bool has_desktop_ = true;
   bool is_shown_ = false;

@@ -12,7 +12,7 @@ HICON host_icon() {
 
 }  // namespace
 
-WindowClass::WindowClass(const wchar_t* name, WNDPROC procedure, int background) : name_(name) {
+Owned<kind::WindowClass> register_class(const wchar_t* name, WNDPROC procedure, int background) {
   WNDCLASSW description{};
   description.lpfnWndProc = procedure;
   description.hInstance = own_module();
@@ -21,13 +21,12 @@ WindowClass::WindowClass(const wchar_t* name, WNDPROC procedure, int background)
   description.hIcon = host_icon();
   description.hbrBackground = reinterpret_cast<HBRUSH>(static_cast<INT_PTR>(background + 1));
   RegisterClassW(&description);
+  return Owned<kind::WindowClass>(name);
 }
 
 int dots_per_inch(HWND window) {
-  const HDC context = GetDC(window);
-  const int dots = GetDeviceCaps(context, LOGPIXELSX);
-  ReleaseDC(window, context);
-  return dots;
+  const Owned<kind::WindowDevice> device = device_of(window);
+  return GetDeviceCaps(device.get(), LOGPIXELSX);
 }
 
 namespace {

@@ -9,18 +9,19 @@ namespace talutil::win32 {
 
 constexpr double twips_per_inch = 1440;
 
-/// A window class for as long as a window needs it: its procedure must not outlive the library.
-class WindowClass {
- public:
-  /// @param background a system colour
-  WindowClass(const wchar_t* name, WNDPROC procedure, int background);
-  WindowClass(const WindowClass&) = delete;
-  WindowClass& operator=(const WindowClass&) = delete;
-  ~WindowClass() { UnregisterClassW(name_, own_module()); }
+namespace kind {
 
- private:
-  const wchar_t* name_;
+/// A window class, by its name, for as long as a window needs it: its procedure must not outlive the library.
+struct WindowClass {
+  using Handle = const wchar_t*;
+  static void close(const wchar_t* name) noexcept { UnregisterClassW(name, own_module()); }
 };
+
+}  // namespace kind
+
+/// Several windows may share a class: the last one to go ends it.
+/// @param background a system colour
+[[nodiscard]] Owned<kind::WindowClass> register_class(const wchar_t* name, WNDPROC procedure, int background);
 
 [[nodiscard]] int dots_per_inch(HWND window);
 
