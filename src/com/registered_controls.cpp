@@ -5,7 +5,7 @@
 #include "automation/run_time_error.hpp"
 #include "com/dispatch_object.hpp"
 #include "com/pointer.hpp"
-#include "platform/win32/windows.hpp"
+#include "platform/win32/handle.hpp"
 
 namespace talutil::com {
 
@@ -25,12 +25,11 @@ Text registered_class(HKEY root, const Text& class_name) {
 /// Whether the process has rights that other programs of its user lack. Those can write to the user's part of the
 /// registry, and must not choose the code that runs here.
 bool is_elevated() noexcept {
-  HANDLE token = nullptr;
-  if (OpenProcessToken(GetCurrentProcess(), TOKEN_QUERY, &token) == FALSE) return false;
+  win32::Owned<win32::kind::KernelObject> token;
+  if (OpenProcessToken(GetCurrentProcess(), TOKEN_QUERY, token.receive()) == FALSE) return false;
   TOKEN_ELEVATION_TYPE type = TokenElevationTypeDefault;
   DWORD size = sizeof type;
-  GetTokenInformation(token, TokenElevationType, &type, sizeof type, &size);
-  CloseHandle(token);
+  GetTokenInformation(token.get(), TokenElevationType, &type, sizeof type, &size);
   return type == TokenElevationTypeFull;
 }
 

@@ -7,6 +7,7 @@
 #include "com/module.hpp"
 #include "com/pointer.hpp"
 #include "library/identity.hpp"
+#include "platform/win32/handle.hpp"
 #include "platform/win32/module_path.hpp"
 
 // In the platform's library, but not in the headers of the tool chain.
@@ -25,24 +26,19 @@ constexpr REGSAM view_of_others = is_64_bit ? KEY_WOW64_32KEY : KEY_WOW64_64KEY;
 /// A registry key, open for writing.
 class Key {
  public:
-  explicit Key(HKEY handle) noexcept : handle_(handle) {}
-  Key(const Key&) = delete;
-  Key& operator=(const Key&) = delete;
-  ~Key() { RegCloseKey(handle_); }
-
   static Key create(HKEY parent, const std::wstring& path) {
-    HKEY handle = nullptr;
-    check(RegCreateKeyExW(parent, path.c_str(), 0, nullptr, 0, KEY_WRITE, nullptr, &handle, nullptr));
-    return Key(handle);
+    Key key;
+    check(RegCreateKeyExW(parent, path.c_str(), 0, nullptr, 0, KEY_WRITE, nullptr, key.handle_.receive(), nullptr));
+    return key;
   }
 
   void set(const wchar_t* name, const std::wstring& value) const {
-    check(RegSetValueExW(handle_, name, 0, REG_SZ, reinterpret_cast<const BYTE*>(value.c_str()),
+    check(RegSetValueExW(handle_.get(), name, 0, REG_SZ, reinterpret_cast<const BYTE*>(value.c_str()),
                          static_cast<DWORD>(value.size() + 1) * sizeof(wchar_t)));
   }
 
   void remove(const wchar_t* name) const {
-    const LSTATUS status = RegDeleteValueW(handle_, name);
+    const LSTATUS status = RegDeleteValueW(handle_.get(), name);
     if (status != ERROR_FILE_NOT_FOUND) check(status);
   }
 
@@ -51,7 +47,9 @@ class Key {
   }
 
  private:
-  HKEY handle_;
+  Key() = default;
+
+  win32::Owned<win32::kind::RegistryKey> handle_;
 };
 
 std::wstring text_of(const GUID& identifier) {
@@ -92,11 +90,9 @@ void register_class(HKEY root, const identity::Class& entry, const std::wstring&
 
 /// True while the library for the other kind of programs is registered.
 bool others_have(HKEY root, const identity::Class& entry) {
-  HKEY key = nullptr;
+  win32::Owned<win32::kind::RegistryKey> key;
   const std::wstring path = class_key(L"CLSID\\" + identifier_of(entry));
-  const LSTATUS status = RegOpenKeyExW(root, path.c_str(), 0, KEY_QUERY_VALUE | view_of_others, &key);
-  if (status == ERROR_SUCCESS) RegCloseKey(key);
-  return status == ERROR_SUCCESS;
+  return RegOpenKeyExW(root, path.c_str(), 0, KEY_QUERY_VALUE | view_of_others, key.receive()) == ERROR_SUCCESS;
 }
 
 void register_type_library(RegistrationScope scope, const std::wstring& path) {
