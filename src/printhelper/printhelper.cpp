@@ -6,14 +6,20 @@
 #include <utility>
 #include <vector>
 
-#define WIN32_LEAN_AND_MEAN
-#include <windows.h>
+#include "platform/win32/exception_frames.hpp"
+#include "platform/win32/handle.hpp"
 // After windows.h.
 #include <winspool.h>
 
-#include "platform/win32/exception_frames.hpp"
-
 namespace {
+
+using talutil::win32::Owned;
+namespace kind = talutil::win32::kind;
+
+struct Printer {
+  using Handle = HANDLE;
+  static void close(HANDLE printer) noexcept { ClosePrinter(printer); }
+};
 
 /// The printer's settings for one window, kept from ConfigurePrinter to SendToPrinter.
 struct Setup {
@@ -49,21 +55,20 @@ bool prepare(HWND window, Setup& setup) {
   setup.printer.resize(length);
   if (GetDefaultPrinterW(setup.printer.data(), &length) == FALSE) return false;
 
-  HANDLE printer = nullptr;
-  if (OpenPrinterW(setup.printer.data(), &printer, nullptr) == FALSE) return false;
-  const LONG bytes = DocumentPropertiesW(nullptr, printer, setup.printer.data(), nullptr, nullptr, 0);
+  Owned<Printer> printer;
+  if (OpenPrinterW(setup.printer.data(), printer.receive(), nullptr) == FALSE) return false;
+  const LONG bytes = DocumentPropertiesW(nullptr, printer.get(), setup.printer.data(), nullptr, nullptr, 0);
   bool is_ready = false;
   if (bytes > 0) {
     setup.settings.resize(static_cast<std::size_t>(bytes));
     DEVMODEW* const mode = setup.device_mode();
-    is_ready = DocumentPropertiesW(nullptr, printer, setup.printer.data(), mode, nullptr, DM_OUT_BUFFER) == IDOK;
+    is_ready = DocumentPropertiesW(nullptr, printer.get(), setup.printer.data(), mode, nullptr, DM_OUT_BUFFER) == IDOK;
     mode->dmFields |= DM_ORIENTATION;
     mode->dmOrientation = size.width > size.height ? DMORIENT_LANDSCAPE : DMORIENT_PORTRAIT;
     // The driver brings the rest of its settings in line.
-    is_ready = is_ready && DocumentPropertiesW(nullptr, printer, setup.printer.data(), mode, mode,
+    is_ready = is_ready && DocumentPropertiesW(nullptr, printer.get(), setup.printer.data(), mode, mode,
                                                DM_IN_BUFFER | DM_OUT_BUFFER) == IDOK;
   }
-  ClosePrinter(printer);
   setup.window = window;
   return is_ready;
 }
@@ -72,33 +77,24 @@ bool prepare(HWND window, Setup& setup) {
 class Picture {
  public:
   Picture(HWND window, Size size) : size_(size) {
-    const HDC screen = GetDC(nullptr);
+    const Owned<kind::WindowDevice> screen = talutil::win32::device_of(nullptr);
     BITMAPINFO information{};
     information.bmiHeader = {sizeof(BITMAPINFOHEADER), size.width, size.height, 1, 32, BI_RGB, 0, 0, 0, 0, 0};
-    bitmap_ = CreateDIBSection(screen, &information, DIB_RGB_COLORS, &bits_, nullptr, 0);
-    context_ = CreateCompatibleDC(screen);
-    if (bitmap_ != nullptr && context_ != nullptr) {
-      before_ = SelectObject(context_, bitmap_);
+    bitmap_.reset(CreateDIBSection(screen.get(), &information, DIB_RGB_COLORS, &bits_, nullptr, 0));
+    context_.reset(CreateCompatibleDC(screen.get()));
+    if (bitmap_ && context_) {
+      selected_ = talutil::win32::select(context_.get(), bitmap_.get());
       // What a window does not draw of itself stays paper.
-      PatBlt(context_, 0, 0, size.width, size.height, WHITENESS);
-      const HDC source = GetWindowDC(window);
-      if (PrintWindow(window, context_, 0) == FALSE)
-        BitBlt(context_, 0, 0, size.width, size.height, source, 0, 0, SRCCOPY);
-      ReleaseDC(window, source);
+      PatBlt(context_.get(), 0, 0, size.width, size.height, WHITENESS);
+      const Owned<kind::WindowDevice> source(GetWindowDC(window), {window});
+      if (PrintWindow(window, context_.get(), 0) == FALSE)
+        BitBlt(context_.get(), 0, 0, size.width, size.height, source.get(), 0, 0, SRCCOPY);
     }
-    ReleaseDC(nullptr, screen);
-  }
-  Picture(const Picture&) = delete;
-  Picture& operator=(const Picture&) = delete;
-  ~Picture() {
-    if (before_ != nullptr) SelectObject(context_, before_);
-    DeleteDC(context_);
-    DeleteObject(bitmap_);
   }
 
   /// As large as the page allows without changing its shape, in the middle.
   bool draw(HDC page) const {
-    if (before_ == nullptr) return false;
+    if (!selected_) return false;
     const int page_width = GetDeviceCaps(page, HORZRES);
     const int page_height = GetDeviceCaps(page, VERTRES);
     const auto dots_x = static_cast<double>(GetDeviceCaps(page, LOGPIXELSX));
@@ -116,10 +112,10 @@ class Picture {
 
  private:
   Size size_;
-  HBITMAP bitmap_ = nullptr;
   void* bits_ = nullptr;
-  HDC context_ = nullptr;
-  HGDIOBJ before_ = nullptr;
+  Owned<kind::Bitmap> bitmap_;
+  Owned<kind::MadeDevice> context_;
+  Owned<kind::Selection> selected_;
 };
 
 bool print(HWND window, Setup& setup) {
@@ -127,20 +123,19 @@ bool print(HWND window, Setup& setup) {
   if (!size_of(window, size)) return false;
   // Before the printer is started: what comes in front of the window meanwhile is not part of it.
   const Picture picture(window, size);
-  const HDC page = CreateDCW(nullptr, setup.printer.data(), nullptr, setup.device_mode());
-  if (page == nullptr) return false;
+  const Owned<kind::MadeDevice> page(CreateDCW(nullptr, setup.printer.data(), nullptr, setup.device_mode()));
+  if (!page) return false;
   wchar_t title[256] = L"";
   GetWindowTextW(window, title, static_cast<int>(std::size(title)));
   DOCINFOW document{sizeof document, title, nullptr, nullptr, 0};
   bool is_printed = false;
-  if (StartDocW(page, &document) > 0) {
-    is_printed = StartPage(page) > 0 && picture.draw(page) && EndPage(page) > 0;
+  if (StartDocW(page.get(), &document) > 0) {
+    is_printed = StartPage(page.get()) > 0 && picture.draw(page.get()) && EndPage(page.get()) > 0;
     if (is_printed)
-      is_printed = EndDoc(page) > 0;
+      is_printed = EndDoc(page.get()) > 0;
     else
-      AbortDoc(page);
+      AbortDoc(page.get());
   }
-  DeleteDC(page);
   return is_printed;
 }
 
