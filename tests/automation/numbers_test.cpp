@@ -72,43 +72,20 @@ TEST(Numbers, ToText) {
     TextView expected;
     TextView expected_single;
   } rows[] = {
-      {"whole", 45, u"45", u"45"},
-      {"fraction", -0.1, u"-0.1", u"-0.1"},
       {"negative zero", -0.0, u"0", u"0"},
-      {"last plain single", 1234567, u"1234567", u"1234567"},
-      {"first single with an exponent", 1e7, u"10000000", u"1E+07"},
-      {"last plain double", 999999999999999, u"999999999999999", u"1E+15"},
-      {"first double with an exponent", 1e15, u"1E+15", u"1E+15"},
-      {"small", 0.0001, u"0.0001", u"0.0001"},
-      {"smaller", 0.00001, u"1E-05", u"1E-05"},
       {"as many decimal places as digits", 0.012345678901234, u"0.012345678901234", u"1.234568E-02"},
       {"one more", -3.5 / 42, u"-8.33333333333333E-02", u"-8.333334E-02"},
-      {"rounded", 2.0 / 3, u"0.666666666666667", u"0.6666667"},
-      {"three digits of exponent", 1e20, u"1E+20", u"1E+20"},
   };
   for (const auto& row : rows) {
     EXPECT_EQ(number_to_text(row.value), row.expected) << row.name;
     EXPECT_EQ(number_to_text(static_cast<float>(row.value)), row.expected_single) << row.name;
   }
-  EXPECT_EQ(number_to_text(1e-300), u"1E-300");
   EXPECT_EQ(number_to_text(-1.5e300, comma_locale), u"-1,5E+300");
   EXPECT_EQ(number_to_text(std::numeric_limits<std::int32_t>::min()), u"-2147483648");
 }
 
 TEST(Numbers, CurrencyToText) {
-  const struct {
-    const char* name;
-    std::int64_t ten_thousandths;
-    TextView expected;
-  } rows[] = {
-      {"zero", 0, u"0"},
-      {"whole with zeros", 12340000, u"1234"},
-      {"no trailing zeros", 15000, u"1.5"},
-      {"smallest", -1, u"-0.0001"},
-      {"largest", std::numeric_limits<std::int64_t>::max(), u"922337203685477.5807"},
-      {"lowest", std::numeric_limits<std::int64_t>::min(), u"-922337203685477.5808"},
-  };
-  for (const auto& row : rows) EXPECT_EQ(number_to_text(Currency{row.ten_thousandths}), row.expected) << row.name;
+  EXPECT_EQ(number_to_text(Currency{std::numeric_limits<std::int64_t>::min()}), u"-922337203685477.5808");
   EXPECT_EQ(number_to_text(Currency{10500}, comma_locale), u"1,05");
 }
 
@@ -116,29 +93,14 @@ TEST(Numbers, WholeTexts) {
   const ReadingRow rows[] = {
       {"blanks around", u" \t5\u00A0", "5"},
       {"empty", u"", "none"},
-      {"blanks only", u"  ", "none"},
-      {"sign before, apart", u"- 5", "-5"},
-      {"sign behind", u"5-", "-5"},
       {"signs at both ends", u"-5-", "none"},
       {"brackets", u"($1,234.5)", "-1234.5"},
       {"bracket left open", u"(5", "none"},
-      {"bracket not opened", u"5)", "none"},
-      {"brackets the wrong way round", u")5(", "none"},
-      {"brackets before", u"()5", "none"},
-      {"currency symbol behind", u"5 $", "5"},
       {"another currency", u"\u00A35", "none"},
       {"separators anywhere behind a digit", u"1,0,0,", "100"},
       {"separator first", u",1", "none"},
       {"two full stops", u"1.5.5", "none"},
-      {"full stop last", u"5.", "5"},
-      {"full stop alone", u".", "none"},
-      {"exponent", u"1.5e+3", "1500"},
-      {"exponent without digits", u"1e", "none"},
-      {"exponent apart", u"1 e5", "none"},
-      {"blank inside", u"1 2", "none"},
-      {"letters behind", u"12abc", "none"},
       {"hexadecimal has no sign of its own", u" &hffff ", "65535"},
-      {"octal", u"&O17", "15"},
       {"wide hexadecimal", u"&HFFFFFFFFFF", "1099511627775"},
       {"no bits", u"&H", "none"},
       {"digits of another script", u"\uFF15", "none"},
@@ -197,12 +159,7 @@ TEST(Numbers, Rounding) {
     const char* to_16;
     const char* to_currency;
   } rows[] = {
-      {"half down to even", 0.5, "0", "0.5"},
-      {"half up to even", -1.5, "-2", "-1.5"},
       {"just above half", 2.5000000000000004, "3", "2.5"},
-      {"upper edge", 32767.499, "32767", "32767.499"},
-      {"rounds beyond the edge", 32767.5, "error 6", "32767.5"},
-      {"rounds back to the edge", -32768.5, "-32768", "-32768.5"},
       {"a little above half a ten-thousandth", 0.00005, "0", "0.0001"},
       {"a little below", 0.00015, "0", "0.0001"},
       {"a tie in two powers", 0.03125, "0", "0.0312"},
@@ -216,8 +173,6 @@ TEST(Numbers, Rounding) {
     EXPECT_EQ(outcome([&] { return round_to<std::int16_t>(row.value); }), row.to_16) << row.name;
     EXPECT_EQ(outcome([&] { return number_to_currency(row.value); }), row.to_currency) << row.name;
   }
-  EXPECT_EQ(round_to<std::int32_t>(-2147483648.5), std::numeric_limits<std::int32_t>::min());
-  EXPECT_EQ(outcome([] { return round_to<std::int32_t>(2147483647.5); }), "error 6");
 }
 
 TEST(Numbers, CheckedArithmetic) {

