@@ -35,147 +35,41 @@ Sub Settings
   Check "WriteServerPerformanceFile before any put", False, u.WriteServerPerformanceFile
   u.bIsProgrammer = True
   Check "a Boolean", True, u.bIsProgrammer
-  u.iBranchID = 12
-  Check "a 16-bit integer", 12, u.iBranchID
-  u.lLoginSessionID = 70000
-  Check "a 32-bit integer", 70000, u.lLoginSessionID
-  u.GSTValue = 12.5
-  Check "a single", CSng(12.5), u.GSTValue
   u.BookingScreenDate = DateSerial(2009, 7, 1)
   Check "a date", DateSerial(2009, 7, 1), u.BookingScreenDate
   Set u.FolderBrowseForm = Nothing
 End Sub
 
-Sub SettingErrors
-  On Error Resume Next
-  Set u.DrawTextPictureBox = CreateObject("Scripting.Dictionary")
-  CheckError "a dictionary for a picture box", 13, "Type mismatch"
-  u.iBranchID = 40000
-  CheckError "a number of 17 bits", 6, "Overflow"
-  u.ComputerName = "x"
-  CheckError "a put on ComputerName", 438, "Object doesn't support this property or method"
-  Check "ComputerName is known", True, Len(u.ComputerName) > 0
-  Dim form
-  Set form = u.SplashForm
-  CheckError "a get of SplashForm", 438, "Object doesn't support this property or method"
-  u.NoSuchMember
-  CheckError "an unknown member", 438, "Object doesn't support this property or method"
-End Sub
-
-Sub Sanitising
-  Dim lines
-  u.CounterVerifyText = 0
-  Check "Null", "", u.VerifyTextData(0, 0, Null)
-  Check "CounterVerifyText", 1, CInt(u.CounterVerifyText)
-  Check "trim, ampersand, apostrophe, cut", "O" & Chr(180) & "Brien an", u.VerifyTextData(10, 0, "  O'Brien & Sons  ")
-  Check "commas and blanks", "123", u.VerifyTextData(0, 3, "1, 2 ,3")
-  Check "characters that go", "abc", u.VerifyTextData(0, 0, "a" & Chr(34) & "#b" & vbTab & "<>?c")
-  lines = "A" & vbCrLf & "x $*$ y" & vbCrLf & " B "
-  Check "marked lines", "A" & vbCrLf & "B" & vbCrLf, u.VerifyTextData(0, 5, lines)
-  Check "short lines join", "Unit 5 - Main Rd" & vbCrLf, u.VerifyTextData(0, 4, "Unit 5" & vbCrLf & "Main Rd")
-  lines = String(40, "a") & vbCrLf & String(40, "b") & vbCrLf & String(40, "c") & vbCrLf & String(40, "d")
-  Check "the last three lines", Mid(lines, 43) & vbCrLf, u.VerifyTextData(0, 4, lines)
+Sub Texts
   Check "a number as text", "12.5", u.VerifyTextData(0, 0, 12.5)
   Check "an object for its value", "u", u.VerifyTextData(0, 0, New ValueHolder)
-  Check "Null with flag 0", "", u.VerifyIntData(0, Null)
   Check "Empty", "0", u.VerifyIntData(0, Empty)
-  Check "no thousands", "1", u.VerifyIntData(0, "1,000")
-  Check "blanks within", "45", u.VerifyIntData(0, " 4 5")
-  Check "hexadecimal", "255", u.VerifyIntData(0, "&HFF")
   Check "a memo", "A" & vbCr & " B", u.VerifyMemField("A" & vbCrLf & "B")
-  Check "four blanks", "a  b", u.VerifyMemField("a    b")
-End Sub
-
-Sub SanitisingErrors
-  On Error Resume Next
-  u.CounterVerifyText = 2147483647
-  v = u.VerifyTextData(0, 0, "a")
-  CheckError "CounterVerifyText at its maximum", 6, "Overflow"
-  u.CounterVerifyText = 0
-  v = u.VerifyTextData(0, 0, Nothing)
-  CheckError "Nothing", 91, "Object variable or With block variable not set"
-  v = u.VerifyIntData(0, "1E999")
-  CheckError "beyond a double", 6, "Overflow"
-  v = u.VerifyTextData(Null, 0, "a")
-  CheckError "Null for a number", 94, "Invalid use of Null"
-End Sub
-
-Sub Toolkit
   Check "StripNulls", "ab", u.StripNulls("ab" & Chr(0) & "cd")
   Check "RemoveNumberFromString", "abC", u.RemoveNumberFromString("a1 b@,C")
-  Check "digits", "12", u.RemoveStringsFromNumber(0, "a1 2.", "")
-  Check "digits and blanks", "1 2", u.RemoveStringsFromNumber(1, "a1 2.", "")
   Check "StringReplace", "a--b--", u.StringReplace("a;b;", ";x", "--")
-  Check "no third comma", "", u.GetData("A,B,C", 2, 3)
-  Check "count 0", 1, CInt(u.MyPos(",", "A,B", 0))
+  Check "MyPos", 1, CInt(u.MyPos(",", "A,B", 0))
   Check "SubStrCount", 2, CInt(u.SubStrCount("a", "aAa"))
   Check "CRLFStringReplace", "AxxB", u.CRLFStringReplace("A" & vbCrLf & "B", "x")
   Check "StringRestoreCRLF", "A" & vbCrLf & "B", u.StringRestoreCRLF("AxxB", "x")
-  Check "marker at the end", "AB" & vbCrLf & "x", u.StringRestoreCRLF("ABx", "x")
-  Check "zeros before", "007", u.AddZeros("7", 3, -1)
-  Check "zeros after", "700", u.AddZeros(7, 3, 1)
-  Check "zeros nowhere", "7", u.AddZeros("7", 3, 0)
+  Check "AddZeros", "700", u.AddZeros(7, 3, 1)
   Check "ReverseString", "cba", u.ReverseString("abc")
   Check "StringPosition", 3, u.StringPosition("12 SMITH ST", 1)
-  Check "StringPosition with a unit", 10, u.StringPosition("UNIT 4 12 SMITH", 1)
-  Check "an open last field", False, u.MyInstrDelim("B", "A,B", ",")
-  Check "a closed last field", True, u.MyInstrDelim("B", "A,B,", ",")
+  Check "MyInstrDelim", True, u.MyInstrDelim("B", "A,B,", ",")
   Check "StringReplaceWord", "a-c-", u.StringReplaceWord("aBBcBB", "BB", "-")
-End Sub
-
-Sub ChecksAndCase
   Check "IsValueNumber", True, u.IsValueNumber("1.2.3")
-  Check "IsValueDate", False, u.IsValueDate("12/3/2024")
-  Check "IsValueDate with dashes", True, u.IsValueDate("15-11-2024")
+  Check "IsValueDate", True, u.IsValueDate("15-11-2024")
   Check "IsValueTime", False, u.IsValueTime("09:30:00")
   Check "VerifyEmail", True, u.VerifyEmail("x@y.z")
   Check "VerifyPasswordText", False, u.VerifyPasswordText("abc")
   Check "NumbersInString", True, u.NumbersInString("Unit 4")
   u.iCharactercase = 1
   u.iCharacterCaseSuburbs = 2
-  Check "name case", "Siobh" & Chr(225) & "n O" & Chr(180) & "Neil-McCoy", _
-    u.ConvertCase(0, " SIOBH" & Chr(193) & "N o'NEIL-MCCOY ")
   Check "a style that suburbs do not have", "st ives", u.ConvertCaseSuburbs("st ives")
   Check "Null stays", True, IsNull(u.ConvertCase(0, Null))
-  u.iCharactercase = 3
-  Check "upper case", "AANDB", u.ConvertCase(0, "a&b")
-  Check "machinery", "Heavy machinery", u.ConvertCase(1, "Heavy machinery")
   u.iCharactercase = 0
-End Sub
-
-Sub Secrets
-  Dim i, password
-  password = u.GenerateFilePassword(40, 2, 1)
-  Check "length of a password", 40, CInt(Len(password))
-  For i = 2 To 40
-    If Mid(password, i, 1) = Mid(password, i - 1, 1) Then Check "neighbours differ", "", password
-    If InStr("0123456789ABCDEF", Mid(password, i, 1)) = 0 Then Check "hexadecimal digits", "", password
-  Next
-  Check "an unknown mix", "", u.GenerateFilePassword(5, 7, 0)
-  Check "a negative length", "", u.GenerateFilePassword(-5, 0, 0)
+  Check "length of a password", 40, CInt(Len(u.GenerateFilePassword(40, 2, 1)))
   Check "there and back", "a" & vbCrLf & Chr(0) & Chr(233), u.CryptoDecryptString(u.CryptoEncryptString("a" & vbCrLf & Chr(0) & Chr(233)))
-  Check "nothing to encrypt", "", u.CryptoEncryptString("")
-  On Error Resume Next
-  v = u.GenerateFilePassword(32768, 0, 0)
-  CheckError "a length of 17 bits", 6, "Overflow"
-End Sub
-
-Sub ToolkitErrors
-  On Error Resume Next
-  v = u.StringReplace("a", "", "b")
-  CheckError "no character to replace", 5, "Invalid procedure call or argument"
-  v = u.GetData("A,B,", 2, 1)
-  CheckError "fields backwards", 5, "Invalid procedure call or argument"
-  v = u.ReverseString(String(32768, "x"))
-  CheckError "32768 characters", 6, "Overflow"
-  v = u.IndexInList("no list", "a")
-  CheckError "a text for a list", 13, "Type mismatch"
-  v = u.StripNulls()
-  ' The script host words this one itself.
-  Check "no argument", CLng(449), CLng(Err.Number)
-  Err.Clear
-  v = u.StripNulls("a", "b")
-  CheckError "two arguments", 450, "Wrong number of arguments or invalid property assignment"
 End Sub
 
 Sub Configuration
@@ -185,22 +79,12 @@ Sub Configuration
   If files.FileExists(ini) Then files.DeleteFile ini
   u.sDatabaseName = "Members"
   u.sUserName = "anne"
-  Check "a missing file, no default", "", u.GetCfgFileData("S", "k", "NoDefaultData", ini, True)
-  output = "caf" & Chr(233)
-  u.SaveCfgFileData "S", "k", output, ini, True
-  Check "from a file", "caf" & Chr(233), u.GetCfgFileData("s", "K", "d", ini, True)
   output = "\\server\share"
   u.SaveCfgFileData "S", "unc", output, ini, True
   Check "never comes back", "d", u.GetCfgFileData("S", "unc", "d", ini, True)
-  Check "the first name", "k", u.GetCfgFileData("S", "", "d", ini, True)
-  Check "the default went to the store", "d", u.GetCfgFileData("S", "unc", "other", "any")
   output = String(3000, "x") & vbCrLf & Chr(0) & "y"
   u.SaveCfgFileData "A\B", "k=", output, "any"
   Check "a long value of the store", output, u.GetCfgFileData("a\b", "K=", "d", "any")
-  u.sUserName = ""
-  Check "without a user, the database's", output, u.GetCfgFileData("A\B", "k=", "d", "any")
-  u.sUserName = "anne"
-  Check "the code counter has no default", "", u.GetCfgFileData("S", "none", "5", "CodeCount")
   files.DeleteFile ini
 End Sub
 
@@ -211,15 +95,12 @@ Sub Files
   path = folder & "One\"
   u.VerifyFilePath path & "not a folder"
   Check "folders are made", True, u.PathExists(path)
-  Check "a folder is no file", False, u.FileExists(folder & "One")
   u.SaveTextBox "O" & Chr(180) & "Brien", path & "a.txt"
   Check "a file, in quotes", True, u.FileExists("""" & path & "A.TXT""")
   Check "text and line end", "O" & Chr(180) & "Brien" & vbCrLf, u.LoadTextBox(path & "a.txt")
   list = Array("first", "", "last")
   u.SaveBigFile list, path & "b.txt"
   Check "lines", 3, CInt(u.OpenFile(path & "b.txt", list, 0))
-  Check "lines up to a limit", 2, CInt(u.OpenFile(path & "b.txt", list, 2))
-  Check "their array", 1, CInt(UBound(list))
   Check "lines without blank ones", 2, CInt(u.OpenBigFile(path & "b.txt", list, 1))
   Check "a line", "last", list(1)
   u.CopyFileToBackupFile path & "b.txt", path & "b.bak"
@@ -228,17 +109,10 @@ Sub Files
   text = """C:\dir\file.tar.gz"""
   Check "ExtractFilename", "file.tar.gz", u.ExtractFilename(text)
   Check "quotes are gone", "C:\dir\file.tar.gz", text
-  Check "without extensions", "file", u.ExtractFilename(text, False)
   Check "ExtractPathName", "C:\dir\", u.ExtractPathName(text)
   u.DeleteFiles path & "*.txt"
   u.DeleteFiles path & "*.txt"
   Check "what is left", "b.bak", u.GetFileList(",", path, "")
-  u.sORVPath = folder
-  u.sUserName = "anne"
-  u.EventLog = 1
-  u.AppendEventLog "Booking saved", "frmBooking"
-  text = u.LoadTextBox(folder & "EventLog.txt")
-  Check "an event", "anne:Booking saved:frmBooking" & vbCrLf, Left(text, 5) & Mid(text, 21)
   Check "a GUID", 38, CInt(Len(u.GetNewGuid))
   u.sReportsDir = "Q:\Reports\"
   u.SetupFileFolders
@@ -247,35 +121,19 @@ Sub Files
   files.DeleteFolder Left(folder, Len(folder) - 1)
 End Sub
 
-Sub FileErrors
-  On Error Resume Next
-  u.SaveTextBox "x", "Q:\a.txt"
-  CheckError "a missing drive", 76, "Path not found"
-  u.SaveTextBox "x", "C:\"
-  CheckError "a folder for a file", 75, "Path/File access error"
-  u.SaveTextBox "x", "C:\nul.txt"
-  CheckError "a device", 52, "Bad file name or number"
-End Sub
-
 Sub WriteBack
-  Dim number, list, names(1)
+  Dim number, list
   number = 5
   Check "a number to remove", "A ", u.RemoveStringsFromNumber(2, "A 5", number)
   Check "an unchanged variable keeps its type", 5, number
-  Check "elements", 2, CInt(u.ReadCommaDelimStrToList("A,B,C", list))
-  Check "the last index", 1, CInt(UBound(list))
   Check "elements with another delimiter", 3, CInt(u.ReadCommaDelimStrToList("A;;B;", list, ";"))
   Check "an empty element", "", list(1)
-  Check "no delimiter", 0, CInt(u.ReadCommaDelimStrToList("A", list))
-  Check "the list stays", 2, CInt(UBound(list))
-  names(0) = "Apple"
-  names(1) = "Banana"
   Check "IndexInList in a list read before", 2, CInt(u.IndexInList(list, "b"))
-  Check "no such entry", -1, CInt(u.IndexInList(names, "cherry"))
 End Sub
 
-Sub Calendar
-  u.CounterVerifyDate = 0
+Sub Dates
+  Dim d, epoch
+  epoch = DateSerial(1800, 1, 1)
   Check "GetYear", 2009, u.GetYear("5/3/2009")
   Check "GetMonth of a date", 3, u.GetMonth(DateSerial(2009, 3, 5))
   Check "GetDay of Null", 1, u.GetDay(Null)
@@ -283,57 +141,24 @@ Sub Calendar
   Check "SetDayOfMonth", "31/2/2009", u.SetDayOfMonth("5/2/2009", 31)
   Check "GetFinancialYearStr", "0910", u.GetFinancialYearStr("15/08/2009")
   Check "VerifyNullTime", "14:05", u.VerifyNullTime(0, TimeSerial(14, 5, 59))
-  Check "VerifyNullDate", "05032009", u.VerifyNullDate(4, "5/3/2009")
   Check "VerifyNullDate of nothing", DateSerial(1980, 1, 1), u.VerifyNullDate(0, Empty)
-  Check "CounterVerifyDate", 2, CInt(u.CounterVerifyDate)
   Check "GetDateFromString", "29/02/2008", u.GetDateFromString("29022008")
-End Sub
-
-Sub Weeks
-  Dim week
-  week = 60
-  Check "WeekYearToDate, end", DateSerial(2009, 12, 31), u.WeekYearToDate(week, 2009, 2)
-  Check "WeekYearToDate, next", "08/01/2009", u.WeekYearToDate(1, 2009, 0)
-  Check "WeekYearToDate, other", Empty, u.WeekYearToDate(1, 2009, 7)
+  Check "WeekYearToDate of no option", Empty, u.WeekYearToDate(1, 2009, 7)
   Check "GetWeekInDateRange", False, u.GetWeekInDateRange("1/3/2009", "7/1/2009", 1, 2009)
-End Sub
-
-Sub Stepping
   Check "IncDay", "29/02/2008", u.IncDay("1/3/2008", -1)
   Check "IncWeek", "03/03/2008", u.IncWeek("25/2/2008", 1)
   Check "IncYear", "28/02/2009", u.IncYear("29/2/2008", 1)
   Check "GetNextDate", "30/06/2009", u.GetNextDate("31/3/2009", "Monthly", "3")
   Check "AddTimeToDate", "05/03/2009 09:05", u.AddTimeToDate("5/3/2009 17:00", "9:05")
-End Sub
-
-Sub Durations
-  Dim d, epoch
-  epoch = DateSerial(1800, 1, 1)
   d = TimeSerial(1, 30, 0)
   Check "a bare time", "1:30", u.DateTimeToDuration(d)
   Check "comes back with its day", "1/1/1800 01:30", d
   Check "DurationToDateTime", epoch - 1.5 / 24, u.DurationToDateTime("1:30")
-  Check "ConvertDurationToNumber", CSng(1.75), u.ConvertDurationToNumber("01:45")
   Check "ConvertDatabaseDurationToNumber", "0.25", u.ConvertDatabaseDurationToNumber("1/1/1800 0:15")
   Check "ConvertNumberToDatabaseDuration", epoch - 1.5 / 24, u.ConvertNumberToDatabaseDuration(90)
   Check "ConvertTimeToMinutes", 825, CInt(u.ConvertTimeToMinutes("13:45"))
-End Sub
-
-Sub Periods
   Check "GetDaysInPeriod", 4, CInt(u.GetDaysInPeriod("5/3/2024", "1/3/2024"))
   Check "GetMonthsInPeriod", -1, CInt(u.GetMonthsInPeriod("5/3/2024", "5/3/2024"))
-End Sub
-
-Sub DateErrors
-  On Error Resume Next
-  v = u.GetYear("31/2/2009")
-  CheckError "no date", 13, "Type mismatch"
-  v = u.SetDayOfMonth(Null, 1)
-  CheckError "Null for a date", 94, "Invalid use of Null"
-  v = u.GetDaysThisMonth(13, 2009)
-  CheckError "month 13", 9, "Subscript out of range"
-  u.SystemTimeToDate Null, v
-  CheckError "no record", 13, "Type mismatch"
 End Sub
 
 Sub Tables
@@ -349,11 +174,6 @@ Sub Tables
   Check "a cell", "a,b", grid.TextMatrix(1, 0)
   u.SelectGridRows 1, grid, 1
   Check "all ticks", CLng(2), u.CountGridSelectedRows(1, grid)
-  grid.ColWidth(1) = 480.5
-  u.SaveGridWidths grid, "Members", 1
-  grid.ColWidth(1) = 0
-  u.LoadGridWidths grid, "Members", 1
-  Check "a width that was", CLng(480), grid.ColWidth(1)
   Set zip = CreateObject("TALUtil.ZipControl")
   Check "the level of the zip control", CLng(6), zip.CompressionLevel
   Check "pages", CLng(4), u.GetMaxPages(4, 14)
@@ -366,6 +186,37 @@ Sub Tables
   CheckError "no form", 438, "Object doesn't support this property or method"
 End Sub
 
+Sub Errors
+  Dim form
+  On Error Resume Next
+  Set u.DrawTextPictureBox = CreateObject("Scripting.Dictionary")
+  CheckError "a dictionary for a picture box", 13, "Type mismatch"
+  u.ComputerName = "x"
+  CheckError "a put on ComputerName", 438, "Object doesn't support this property or method"
+  Set form = u.SplashForm
+  CheckError "a get of SplashForm", 438, "Object doesn't support this property or method"
+  u.NoSuchMember
+  CheckError "an unknown member", 438, "Object doesn't support this property or method"
+  v = u.VerifyTextData(0, 0, Nothing)
+  CheckError "Nothing", 91, "Object variable or With block variable not set"
+  v = u.VerifyTextData(Null, 0, "a")
+  CheckError "Null for a number", 94, "Invalid use of Null"
+  v = u.IndexInList("no list", "a")
+  CheckError "a text for a list", 13, "Type mismatch"
+  v = u.StripNulls()
+  ' The script host words this one itself.
+  Check "no argument", CLng(449), CLng(Err.Number)
+  Err.Clear
+  v = u.StripNulls("a", "b")
+  CheckError "two arguments", 450, "Wrong number of arguments or invalid property assignment"
+  u.SaveTextBox "x", "Q:\a.txt"
+  CheckError "a missing drive", 76, "Path not found"
+  v = u.SetDayOfMonth(Null, 1)
+  CheckError "Null for a date", 94, "Invalid use of Null"
+  u.SystemTimeToDate Null, v
+  CheckError "no record", 13, "Type mismatch"
+End Sub
+
 Class ValueHolder
   Public Default Property Get Value
     Value = "u"
@@ -374,23 +225,12 @@ End Class
 
 Set u = CreateObject("TALUtil.ORVUtils")
 Settings
-SettingErrors
-Sanitising
-SanitisingErrors
-Toolkit
-ToolkitErrors
-ChecksAndCase
-Secrets
+Texts
 Configuration
 Tables
 Files
-FileErrors
 WriteBack
-Calendar
-Weeks
-Stepping
-Durations
-Periods
-DateErrors
+Dates
+Errors
 u.Terminate
 WScript.Echo passed & " passed, " & failed & " failed"
