@@ -12,32 +12,14 @@ using namespace talutil::hosts;
 
 namespace {
 
-// Members that wait for a user, answer by chance, or show a box for a setting that a random put has made.
-constexpr std::wstring_view left_out[] = {L"BrowseForFolder",
-                                          L"CallZIPFiles",
-                                          L"CallUnZIPFiles",
-                                          L"CheckDeleteRecord",
-                                          L"CheckModifyDatabase",
-                                          L"CountGridSelectedRows",
-                                          L"ExportGridData",
-                                          L"SelectGridRows",
-                                          L"GridPrintPreview",
-                                          L"TextBoxPrintPreview",
-                                          L"ListBoxPrintPreview",
-                                          L"DrawShellExecuteError",
-                                          L"MyInputBox",
-                                          L"ShowShortCutKeys",
-                                          L"ShowCmdLineHelp",
-                                          L"ShowSysInfo",
-                                          L"GenerateFilePassword",
-                                          L"GetNewGuid",
-                                          L"CryptoEncryptString",
-                                          L"ConvertNumberToDatabaseDuration",
-                                          L"VerifyFilePath",
-                                          L"SetupFileFolders",
-                                          L"Terminate",
-                                          L"DebugMode",
-                                          L"bIsProgrammer"};
+/// Members that answer by chance, wait for a user, or show a box for a setting that a random put has made.
+bool is_left_out(std::wstring_view member) {
+  constexpr std::wstring_view others[] = {
+      L"GenerateFilePassword", L"GetNewGuid",       L"CryptoEncryptString", L"ConvertNumberToDatabaseDuration",
+      L"VerifyFilePath",       L"SetupFileFolders", L"Terminate",           L"DebugMode",
+      L"bIsProgrammer"};
+  return waits_for_a_user(member) || std::ranges::find(others, member) != std::end(others);
+}
 
 /// Objects of a host's, each of whose members answers only as what it is.
 class HostWindows {
@@ -285,9 +267,9 @@ class Calls {
  public:
   Calls(IDispatch* object, HostWindows& windows) : object_(object), slots_(slots_of(object)) {
     std::erase_if(slots_, [](const Slot& slot) {
-      return std::ranges::find(left_out, slot.name) != std::end(left_out) ||
-             std::ranges::any_of(slot.parameters,
-                                 [](const SlotParameter& p) { return p.referenced == VT_USERDEFINED; });
+      return is_left_out(slot.name) || std::ranges::any_of(slot.parameters, [](const SlotParameter& p) {
+               return p.referenced == VT_USERDEFINED;
+             });
     });
     for (Hostile& value : hostile_values()) {
       // An argument that is left out can only be so in a late call.

@@ -106,49 +106,27 @@ inline Value with_bits(VARTYPE type, LONGLONG bits) {
   return result;
 }
 
+/// Members that wait for a user would wait for ever.
+inline bool waits_for_a_user(std::wstring_view member) {
+  constexpr std::wstring_view waiting[] = {L"BrowseForFolder",   L"CallZIPFiles",        L"CallUnZIPFiles",
+                                           L"CheckDeleteRecord", L"CheckModifyDatabase", L"CountGridSelectedRows",
+                                           L"ExportGridData",    L"SelectGridRows",      L"DrawShellExecuteError",
+                                           L"GridPrintPreview",  L"TextBoxPrintPreview", L"ListBoxPrintPreview",
+                                           L"MyInputBox",        L"ShowShortCutKeys",    L"ShowCmdLineHelp",
+                                           L"ShowSysInfo"};
+  return std::ranges::find(waiting, member) != std::end(waiting);
+}
+
 inline std::vector<Hostile> hostile_values() {
   std::vector<Hostile> list;
   // Every kind of variant there is and some there are not, all of them zero; texts, objects and arrays are null.
-  for (const int type : std::initializer_list<int>{0,
-                                                   1,
-                                                   2,
-                                                   3,
-                                                   4,
-                                                   5,
-                                                   6,
-                                                   7,
-                                                   8,
-                                                   9,
-                                                   10,
-                                                   11,
-                                                   13,
-                                                   14,
-                                                   15,
-                                                   16,
-                                                   17,
-                                                   18,
-                                                   19,
-                                                   20,
-                                                   21,
-                                                   22,
-                                                   23,
-                                                   24,
-                                                   25,
-                                                   26,
-                                                   27,
-                                                   28,
-                                                   29,
-                                                   30,
-                                                   31,
-                                                   36,
-                                                   64,
-                                                   72,
-                                                   VT_ARRAY | VT_BSTR,
-                                                   VT_ARRAY | VT_VARIANT,
-                                                   VT_ARRAY,
-                                                   VT_ARRAY | VT_I4,
-                                                   VT_VECTOR | VT_BSTR,
-                                                   VT_RESERVED | VT_I4}) {
+  std::vector<int> types = {VT_RECORD,        VT_FILETIME,         VT_CLSID,
+                            VT_ARRAY,         VT_ARRAY | VT_BSTR,  VT_ARRAY | VT_VARIANT,
+                            VT_ARRAY | VT_I4, VT_VECTOR | VT_BSTR, VT_RESERVED | VT_I4};
+  for (int type = VT_EMPTY; type < 32; ++type) {
+    if (type != VT_VARIANT) types.push_back(type);
+  }
+  for (const int type : types) {
     add_all_ways(list, "zero of type " + std::to_string(type),
                  [type] { return Value::of_type(static_cast<VARTYPE>(type)); });
     list.push_back({"null reference of type " + std::to_string(type), [type](Places& places) {

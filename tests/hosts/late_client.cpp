@@ -332,15 +332,7 @@ Value suitable(const SlotParameter& parameter) {
 class Walk {
  public:
   explicit Walk(IDispatch* object) : object_(object), slots_(slots_of(object)), values_(hostile_values()) {
-    // Members that wait for a user would wait for ever.
-    static constexpr std::wstring_view waiting[] = {
-        L"BrowseForFolder",   L"CallZIPFiles",        L"CallUnZIPFiles",
-        L"CheckDeleteRecord", L"CheckModifyDatabase", L"CountGridSelectedRows",
-        L"ExportGridData",    L"SelectGridRows",      L"DrawShellExecuteError",
-        L"GridPrintPreview",  L"TextBoxPrintPreview", L"ListBoxPrintPreview",
-        L"MyInputBox",        L"ShowShortCutKeys",    L"ShowCmdLineHelp",
-        L"ShowSysInfo"};
-    std::erase_if(slots_, [](const Slot& slot) { return std::ranges::find(waiting, slot.name) != std::end(waiting); });
+    std::erase_if(slots_, [](const Slot& slot) { return waits_for_a_user(slot.name); });
     for (Slot& slot : slots_) {
       std::erase_if(slot.parameters, [](const SlotParameter& p) { return (p.flags & PARAMFLAG_FRETVAL) != 0; });
     }
