@@ -42,12 +42,7 @@ void properties(IDispatch* u) {
   check_equal(L"anne", use(u, L"sUserName").result.text(), "sUserName");
   check_equal(S_OK, put(u, L"iBranchID", Value(L"12")).error(), "a text for a number");
   check_equal(VT_I2, use(u, L"iBranchID").result.type(), "iBranchID, its type");
-  check_equal(run_time_error(13), put(u, L"iBranchID", Value(L"twelve")).error(), "a text that is no number");
   check_equal(run_time_error(6), put(u, L"iBranchID", Value(40000L)).error(), "too large a number");
-  check_equal(run_time_error(94), put(u, L"sUserName", Value::null()).error(), "Null for a text");
-  check_equal(L"anne", use(u, L"sUserName").result.text(), "sUserName after a refused put");
-  check_equal(DISP_E_MEMBERNOTFOUND, put(u, L"ComputerName", Value(L"x")).error(), "a put on ComputerName");
-  check_equal(DISP_E_MEMBERNOTFOUND, use(u, L"SplashForm").error(), "a get of SplashForm");
   check_equal(DISP_E_MEMBERNOTFOUND, put(u, L"GetData", Value(L"x")).error(), "a put on a method");
   HostObject form(HostObject::Kind::form);
   check_equal(S_OK, put(u, L"SplashForm", Value(&form), DISPATCH_PROPERTYPUTREF).error(), "a reference");
@@ -71,9 +66,6 @@ void write_back_of_text(IDispatch* u) {
   variable = Value(short{5});
   check_equal(L"A B", filter(in(variable)).result.text(), "a number in a variable");
   check_equal(VT_I2, variable.type(), "an unchanged variable keeps its type");
-  Text text;
-  filter(Value::reference(VT_BSTR, text));
-  check_equal(L" ", text.view(), "a text by reference");
   Text inner;
   variable = Value::reference(VT_BSTR, inner);
   filter(in(variable));
@@ -82,9 +74,6 @@ void write_back_of_text(IDispatch* u) {
   short number = 7;
   check_equal(L"A B", filter(Value::reference(VT_I2, &number)).result.text(), "a number by reference");
   check_equal(7, number, "which stays");
-  check_equal(L"AB", filter(Value(L"")).result.text(), "a text by value");
-  check_equal(run_time_error(94), filter(Value::null()).error(), "Null for a text");
-  check_equal(L"Invalid use of Null", filter(Value::null()).description, "its text");
 }
 
 struct ListRow {
@@ -120,10 +109,6 @@ void write_back_of_arrays(IDispatch* u) {
   VARTYPE element = VT_EMPTY;
   SafeArrayGetVartype(texts.get(), &element);
   check_equal(VT_BSTR, element, "texts by reference stay texts");
-  Array fixed(VT_BSTR, 0, {L"x"});
-  fixed.get()->fFeatures |= FADF_FIXEDSIZE;
-  check_equal(run_time_error(10), split(Value::reference(VT_ARRAY | VT_BSTR, fixed)).error(), "an array of fixed size");
-  fixed.get()->fFeatures &= static_cast<USHORT>(~FADF_FIXEDSIZE);
 }
 
 void other_arrays_come_back(IDispatch* u) {
@@ -142,9 +127,6 @@ void write_back_of_numbers(IDispatch* u) {
   const auto clamp = [u](const Value& week) {
     return use(u, L"WeekYearToDate", week, Value(short{2009}), Value(short{1}));
   };
-  short narrow_week = 60;
-  check_equal(VT_DATE, clamp(Value::reference(VT_I2, &narrow_week)).result.type(), "a date of a week");
-  check_equal(52, narrow_week, "a 16-bit number by reference");
   LONG week = -7;
   clamp(Value::reference(VT_I4, &week));
   check_equal(1, week, "a 32-bit number by reference");
@@ -154,7 +136,6 @@ void write_back_of_numbers(IDispatch* u) {
   Value variable(60L);
   clamp(in(variable));
   check_equal(VT_I2, variable.type(), "a variable gets the member's type");
-  check_equal(S_OK, clamp(Value(short{60})).error(), "a number by value");
 }
 
 /// A variant that the client clears by itself, if at all.
@@ -246,7 +227,6 @@ void objects_as_records(IDispatch* u) {
   check(object.fields == std::array<short, 8>{2010, 4, 77, 5, 13, 45, 30, 88}, "its fields");
   check_equal(2, object.puts, "only what changed is put");
   check_equal(run_time_error(438), use(u, L"SystemTimeToDate", Value(&with_value), in(date)).error(), "no fields");
-  check_equal(run_time_error(13), use(u, L"SystemTimeToDate", Value(L"x"), in(date)).error(), "no object");
 }
 
 void optional_and_named_arguments(IDispatch* u) {
