@@ -103,31 +103,21 @@ void confirmations_ask_twice(_ORVUtils* u, const Desktop& desktop, const std::ws
   check_equal(VARIANT_TRUE, answer, "YES confirms");
   if (check_equal(std::size_t{1}, seen.size(), "boxes")) check_equal(question, seen[0], "the input box");
 
+  // Yes asks again, and so does a cancelled box; No ends it.
   seen = boxes_of(desktop, {{L"yes", IDOK}, {L"", IDYES}, {L"", IDCANCEL}, {L"", IDNO}},
                   [&] { u->CheckModifyDatabase(Text(L"Rename"), &answer); });
   check_equal(VARIANT_FALSE, answer, "no confirmation");
   if (!check_equal(std::size_t{4}, seen.size(), "boxes until No")) return;
-  check_equal(L"Rename|Type YES in uppercase characters to confirm|OK|Cancel", seen[0], "the input box");
-  for (const wchar_t* part :
-       {L"Warning", L"You must type YES in uppercase characters.  Do you wish to try again?", L"|Yes", L"|No"}) {
+  for (const wchar_t* part : {L"Warning", L"|Yes", L"|No"})
     check(seen[1].find(part) != std::wstring::npos, "the warning has " + narrow(part) + " and is " + narrow(seen[1]));
-  }
 }
 
 void failures_are_told(_ORVUtils* u, const Desktop& desktop) {
-  const auto text_of = [&](const std::function<void()>& call) {
-    const auto seen = boxes_of(desktop, {{L"", IDOK}}, call);
-    return seen.empty() ? std::wstring() : seen[0];
-  };
-  check_equal(L"forms_client|OK|File was not found.", text_of([&] { u->DrawShellExecuteError(Long{2}); }), "code 2");
-  check_equal(L"", text_of([&] { u->DrawShellExecuteError(Long{33}); }), "code 33");
-  Value nothing;
-  check_equal(L"forms_client|OK|ORVUtils SelectGridRows Object required", text_of([&] { tick(u, nothing, 1); }),
-              "an error while ticking");
   UndrivenObject object;
   Value undriven = object.value();
-  check_equal(L"forms_client|OK|ORVUtils SelectGridRows Type mismatch", text_of([&] { tick(u, undriven, 1); }),
-              "an object without automation");
+  const auto seen = boxes_of(desktop, {{L"", IDOK}}, [&] { tick(u, undriven, 1); });
+  if (check_equal(std::size_t{1}, seen.size(), "boxes"))
+    check_equal(L"forms_client|OK|ORVUtils SelectGridRows Type mismatch", seen[0], "an object without automation");
 }
 
 /// Exports a table, the user saving to what the dialog proposes.
@@ -159,9 +149,6 @@ void grids_are_exported(_ORVUtils* u, const Desktop& desktop, const std::wstring
   Value grid(&table);
   check_equal(std::string("\"a,b\",\r\n,\x80\r\n"), exported(u, desktop, folder, grid, IDOK), "the file");
   check_equal(std::string("(no file)"), exported(u, desktop, folder, grid, IDCANCEL), "after Cancel");
-  UndrivenObject object;
-  Value undriven = object.value();
-  check_equal(std::string("(no file)"), exported(u, desktop, folder, undriven, IDOK), "an object without automation");
 }
 
 /// A form as PrintScreen wants it.
