@@ -6,9 +6,10 @@
 namespace talutil::hosts {
 
 struct SlotParameter {
-  VARTYPE type;        ///< VT_PTR for one passed by reference.
-  VARTYPE referenced;  ///< What a pointer points to; VT_EMPTY otherwise.
-  WORD flags;          ///< PARAMFLAG_...
+  VARTYPE type;                ///< VT_PTR for one passed by reference.
+  VARTYPE referenced;          ///< What a pointer points to; VT_EMPTY otherwise.
+  WORD flags;                  ///< PARAMFLAG_...
+  std::wstring default_value;  ///< Its type and, as a text, the value of one that can be left out.
 };
 
 struct Slot {
@@ -20,6 +21,13 @@ struct Slot {
   std::vector<std::wstring> names;
   std::vector<SlotParameter> parameters;  ///< The result is the last, flagged PARAMFLAG_FRETVAL.
 };
+
+/// "3: 7" of a 32-bit 7.
+inline std::wstring typed_text(const VARIANT& value) {
+  Value text;
+  require(VariantChangeType(text, const_cast<VARIANT*>(&value), 0, VT_BSTR), "VariantChangeType");
+  return std::to_wstring(V_VT(&value)) + L": " + std::wstring(text.text());
+}
 
 inline Slot slot_of(ITypeInfo* information, UINT index) {
   FUNCDESC* function = nullptr;
@@ -41,8 +49,11 @@ inline Slot slot_of(ITypeInfo* information, UINT index) {
   for (short i = 0; i < function->cParams; ++i) {
     const ELEMDESC& element = function->lprgelemdescParam[i];
     const bool by_reference = element.tdesc.vt == VT_PTR;
-    slot.parameters.push_back({element.tdesc.vt, by_reference ? element.tdesc.lptdesc->vt : VARTYPE{VT_EMPTY},
-                               element.paramdesc.wParamFlags});
+    const PARAMDESC& described = element.paramdesc;
+    slot.parameters.push_back(
+        {element.tdesc.vt, by_reference ? element.tdesc.lptdesc->vt : VARTYPE{VT_EMPTY}, described.wParamFlags, {}});
+    if ((described.wParamFlags & PARAMFLAG_FHASDEFAULT) == 0) continue;
+    slot.parameters.back().default_value = typed_text(described.pparamdescex->varDefaultValue);
   }
   information->ReleaseFuncDesc(function);
   return slot;
