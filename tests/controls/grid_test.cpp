@@ -82,43 +82,34 @@ TEST_F(Grids, AreDrivenLateBound) {
   control.call(u"Clear");
   EXPECT_EQ(cells(), (std::vector<std::vector<Text>>{{u"", u""}, {u"", u""}}));
 
-  const std::pair<std::function<void()>, int> bad[] = {{[&] {
-                                                          return control.get(u"TextMatrix", {2, 0});
-                                                        },
-                                                        9},
-                                                       {[&] {
-                                                          return control.get(u"TextMatrix", {0, -1});
-                                                        },
-                                                        9},
-                                                       {[&] { control.put(u"ColWidth", {2}, 1); }, 9},
-                                                       {[&] { control.put(u"Row", 2); }, 9},
-                                                       {[&] { control.put(u"Rows", -1); }, 5},
-                                                       {[&] { control.put(u"Rows", 2147483647); }, 7},
-                                                       {[&] { control.put(u"Cols", 32768); }, 7},
-                                                       {[&] { control.put(u"FixedRows", 3); }, 5},
-                                                       {[&] {
-                                                          return control.get(u"Cell", {1, 0, 0});
-                                                        },
-                                                        5},
-                                                       {[&] {
-                                                          control.put(u"Cell", {5, 0, 0}, 3);
-                                                        },
-                                                        5},
-                                                       {[&] {
-                                                          control.put(u"TextMatrix", {0, 0}, Null{});
-                                                        },
-                                                        94},
-                                                       {[&] {
-                                                          control.call(u"AddItem", {u"", 3});
-                                                        },
-                                                        9},
-                                                       {[&] { control.call(u"RemoveItem", {2}); }, 9},
-                                                       {[&] { return control.get(u"Nothing"); }, 438},
-                                                       {[&] {
-                                                          control.call(u"SaveGrid", {u"C:\\x.txt", 6});
-                                                        },
-                                                        5}};
-  for (const auto& [use, error] : bad) EXPECT_EQ(error_of(use), error) << &use - &bad[0].first;
+  using enum Access;
+  const struct {
+    const char* name;
+    TextView member;
+    Access access;
+    std::vector<Variant> arguments;
+    std::int32_t error;
+  } bad[] = {
+      {"a row that is not there", u"TextMatrix", get, {2, 0}, 9},
+      {"a column before the first", u"TextMatrix", get, {0, -1}, 9},
+      {"the width of no column", u"ColWidth", put, {2, 1}, 9},
+      {"a current row outside", u"Row", put, {2}, 9},
+      {"fewer rows than none", u"Rows", put, {-1}, 5},
+      {"more rows than memory", u"Rows", put, {2147483647}, 7},
+      {"more columns than there can be", u"Cols", put, {32768}, 7},
+      {"more fixed rows than rows", u"FixedRows", put, {3}, 5},
+      {"an unknown property of a cell", u"Cell", get, {1, 0, 0}, 5},
+      {"an unknown state of a tick", u"Cell", put, {5, 0, 0, 3}, 5},
+      {"Null for a text", u"TextMatrix", put, {0, 0, Null{}}, 94},
+      {"a new row behind the end", u"AddItem", call, {u"", 3}, 9},
+      {"no row to remove", u"RemoveItem", call, {2}, 9},
+      {"an unknown member", u"Nothing", get, {}, 438},
+      {"an unknown format", u"SaveGrid", call, {u"C:\\x.txt", 6}, 5},
+  };
+  for (const auto& row : bad) {
+    const auto use = [&] { (void)grid->invoke(grid->member_id(row.member), row.access, row.arguments); };
+    EXPECT_EQ(error_of(use), row.error) << row.name;
+  }
 }
 
 TEST_F(Grids, AreWrittenAndReadBack) {
