@@ -5,11 +5,8 @@
 
 #include "controls/delimited_text.hpp"
 #include "infoforms/frm_components.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/error_of.hpp"
-#include "tests/fakes/fake_platform.hpp"
 #include "tests/fakes/recording_control.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil {
 
@@ -18,10 +15,7 @@ namespace {
 using testing::error_of;
 using testing::RecordingControl;
 
-struct Grids : ::testing::Test {
-  testing::FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
+struct Grids : testing::UtilsTest {
   std::shared_ptr<Grid> grid = std::make_shared<Grid>(library.platform());
   Control control{grid, library.locale()};
 

@@ -7,15 +7,14 @@
 
 #include "automation/late_call.hpp"
 #include "library/interface_table.hpp"
-#include "library/library.hpp"
-#include "tests/fakes/fake_platform.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil::testing {
 
 /// Calls members as a table row writes them: arguments parted by "|", where "@null" and "@empty" are those
 /// values, "#5/3/2009#" a date, "=1.5" a number and everything else a text. The answer shows the result the same
 /// way, then each argument that was written back.
-class LateMembers : public ::testing::Test {
+class LateMembers : public UtilsTest {
  protected:
   std::string call(TextView member, TextView written) {
     std::vector<Argument> arguments;
@@ -38,9 +37,6 @@ class LateMembers : public ::testing::Test {
     return answer;
   }
 
-  FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
 
  private:
   static Variant read(TextView written) {

@@ -1,11 +1,8 @@
 #include <gmock/gmock.h>
 
 #include "forms/c_control_position.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/error_of.hpp"
-#include "tests/fakes/fake_platform.hpp"
 #include "tests/fakes/recording_control.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil {
 
@@ -17,10 +14,7 @@ using ::testing::IsEmpty;
 using testing::RecordingControl;
 using Uses = std::vector<std::string>;
 
-struct Forms : ::testing::Test {
-  testing::FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
+struct Forms : testing::UtilsTest {
   std::shared_ptr<RecordingControl> control = std::make_shared<RecordingControl>();
   Variant holder{ObjectRef(control)};
 

@@ -7,11 +7,8 @@
 #include "infoforms/frm_sh_keys.hpp"
 #include "infoforms/frm_sys_info.hpp"
 #include "infoforms/shortcut_keys.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/error_of.hpp"
-#include "tests/fakes/fake_platform.hpp"
 #include "tests/fakes/recording_control.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil {
 
@@ -21,10 +18,7 @@ using ::testing::ElementsAre;
 using testing::error_of;
 using testing::RecordingControl;
 
-struct Windows : ::testing::Test {
-  testing::FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
+struct Windows : testing::UtilsTest {
   testing::FakeFormState& form = platform.form;
 
   static constexpr std::int32_t colour = 12640511;

@@ -1,13 +1,10 @@
 #include <gmock/gmock.h>
 
 #include "controls/grid.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
 #include "preview/frm_print_preview.hpp"
 #include "preview/print_control.hpp"
-#include "tests/fakes/error_of.hpp"
-#include "tests/fakes/fake_platform.hpp"
 #include "tests/fakes/recording_control.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil {
 
@@ -30,11 +27,7 @@ std::string runs_of(const Page& page) {
   return lines;
 }
 
-struct Preview : ::testing::Test {
-  testing::FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
-};
+struct Preview : testing::UtilsTest {};
 
 /// A print control that notes how builders drive it.
 struct Builders : Preview {

@@ -1,22 +1,14 @@
 #include <gtest/gtest.h>
 
 #include "automation/variant.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/error_of.hpp"
-#include "tests/fakes/fake_platform.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil {
 namespace {
 
-using testing::FakePlatform;
 using testing::FakeRegistry;
 
-struct RegistryTest : ::testing::Test {
-  FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
-};
+struct RegistryTest : testing::UtilsTest {};
 
 TEST_F(RegistryTest, ReadsTextsAndNumbersOfTheUser) {
   platform.registry.keys[u"Key"] = {
