@@ -1,5 +1,6 @@
 #include "tests/dates/late_members.hpp"
 #include "tests/fakes/error_of.hpp"
+#include "tests/fakes/recording_control.hpp"
 #include "tests/text/recording_utils.hpp"
 
 namespace talutil::testing {
@@ -211,30 +212,12 @@ TEST_F(DateMembers, DurationsUseTheObjectsTextMembers) {
 
 TEST_F(DateMembers, ADateWithoutAYearIsOfTheCurrentOne) { EXPECT_EQ(call(u"IncDay", u"5/3|0"), "05/03/2009"); }
 
-/// A host's object with some of the fields of a record.
-class FieldsObject final : public Object {
- public:
-  std::map<Text, std::int16_t> fields;
-  std::vector<Text> puts;
-
-  std::int32_t member_id(TextView name) override {
-    const auto found = fields.find(Text(name));
-    if (found == fields.end()) raise(ErrorNumber::member_not_supported);
-    return static_cast<std::int32_t>(std::distance(fields.begin(), found)) + 1;
-  }
-  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
-    auto& [name, value] = *std::next(fields.begin(), member - 1);
-    if (access == Access::get) return value;
-    value = arguments[0].to_int16(plain_numbers);
-    puts.push_back(name);
-    return {};
-  }
-};
-
 TEST_F(DateMembers, ObjectsStandForRecords) {
-  const auto object = std::make_shared<FieldsObject>();
-  object->fields = {{u"wYear", 2009}, {u"wMonth", 3},  {u"wDay", 31},   {u"wDayOfWeek", 77},
-                    {u"wHour", 9},    {u"wMinute", 0}, {u"wSecond", 0}, {u"wMilliseconds", 88}};
+  const auto object = std::make_shared<RecordingControl>();
+  for (const auto& [name, value] : std::initializer_list<std::pair<const char*, std::int16_t>>{
+           {"wYear", 2009}, {"wMonth", 3}, {"wDay", 31}, {"wDayOfWeek", 77}, {"wHour", 9}, {"wMilliseconds", 88}})
+    object->values[name] = value;
+  object->values["wMinute"] = object->values["wSecond"] = std::int16_t{0};
   const LateInterface& members = late_interface<ORVUtils>();
   const auto use = [&](TextView member, std::vector<Argument> arguments) {
     members.call(&utils, members.slot_of(members.identifier_of(member), Access::call), arguments, plain_numbers);
@@ -243,10 +226,10 @@ TEST_F(DateMembers, ObjectsStandForRecords) {
   const Variant holder = ObjectRef(object);
   EXPECT_EQ(use(u"SystemTimeToDate", {holder, Variant()})[1].value.to_text(plain_numbers), u"31/03/2009 09:00");
   const auto after = use(u"DateToSystemTime", {Variant(u"5/3/2009 13:00"), holder});
-  EXPECT_EQ(object->puts, (std::vector<Text>{u"wDay", u"wHour"}));
-  EXPECT_EQ(object->fields[u"wHour"], 13);
+  std::erase_if(object->uses, [](const std::string& entry) { return !entry.starts_with("put"); });
+  EXPECT_EQ(object->uses, (std::vector<std::string>{"put wDay = 5%", "put wHour = 13%"}));
   EXPECT_EQ(after[1].value, holder);
-  object->fields.erase(u"wSecond");
+  object->values.erase("wSecond");
   EXPECT_EQ(error_of([&] { use(u"DateToSystemTime", {Variant(u"6/4/2010"), holder}); }), 438);
   EXPECT_EQ(error_of([&] { use(u"DateToSystemTime", {Variant(u"6/4/2010"), Variant()}); }), 13);
 }

@@ -85,6 +85,16 @@ inline constexpr HostMember host_members[] = {
     {"EndDoc", function},
     {"PrintDoc", function},
     {"TextBox", function},
+    // Objects that stand for records, and converters of names.
+    {"wYear", property},
+    {"wMonth", property},
+    {"wDayOfWeek", property},
+    {"wDay", property},
+    {"wHour", property},
+    {"wMinute", property},
+    {"wSecond", property},
+    {"wMilliseconds", property},
+    {"NameCase", function},
 };
 
 /// What a member is; 0 for a name that no control has.

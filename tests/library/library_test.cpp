@@ -7,10 +7,8 @@
 #include "controls/control_factory.hpp"
 #include "infoforms/frm_components.hpp"
 #include "library/interface_table.hpp"
-#include "library/library.hpp"
-#include "tests/fakes/error_of.hpp"
-#include "tests/fakes/fake_platform.hpp"
 #include "tests/fakes/recording_control.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil {
 namespace {
@@ -18,27 +16,12 @@ namespace {
 using talutil::testing::error_of;
 using talutil::testing::FakePlatform;
 
-/// Another maker's system information control: it knows its identifiers and nothing else.
-class ForeignSystemInformation final : public Object {
- public:
-  std::int32_t member_id(TextView) override { raise(ErrorNumber::member_not_supported); }
-
-  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
-    if (member != 0x68030010 || access != Access::get || !arguments.empty()) raise(ErrorNumber::member_not_supported);
-    return u"THEIRS";
-  }
-};
-
-class LibraryTest : public ::testing::Test {
+class LibraryTest : public testing::UtilsTest {
  protected:
   Variant late(TextView name, Access access, std::vector<Argument> arguments = {}) {
     const LateInterface& members = late_interface<ORVUtils>();
     return members.call(&utils, members.slot_of(members.identifier_of(name), access), arguments, library.locale());
   }
-
-  FakePlatform platform;
-  Library library{platform.platform()};
-  ORVUtils utils{library};
 };
 
 TEST_F(LibraryTest, StartUpLoadsTheComponentsWindowAndReadsTheScreen) {
@@ -115,7 +98,9 @@ TEST_F(LibraryTest, ObjectPropertiesKeepObjectsOfTheirKindUntilTheNextPut) {
 }
 
 TEST_F(LibraryTest, AnotherMakersControlTakesItsPlace) {
-  platform.controls[u"SystemInfoControl.MSysInfo"] = std::make_shared<ForeignSystemInformation>();
+  const auto theirs = std::make_shared<testing::RecordingControl>();
+  theirs->values = {{"#1745027088", u"THEIRS"}};  // It knows its identifiers and nothing else.
+  platform.controls[u"SystemInfoControl.MSysInfo"] = theirs;
   library.start();
   EXPECT_EQ(library.settings().ComputerName, u"THEIRS");
 }

@@ -2,6 +2,7 @@
 
 #include "controls/control_factory.hpp"
 #include "controls/name_case_converter.hpp"
+#include "tests/fakes/recording_control.hpp"
 #include "tests/text/recording_utils.hpp"
 
 namespace talutil::testing {
@@ -118,25 +119,14 @@ TEST_F(ChecksAndCase, StylesOfNamesAndSuburbs) {
   EXPECT_EQ(error_of([&] { (void)utils.ConvertCase(0, ObjectRef()); }), 91);
 }
 
-/// Another maker's converter: it counts its objects, and fails when it is told to.
-class ForeignConverter final : public Object {
- public:
-  std::int32_t member_id(TextView name) override { return name == u"NameCase" ? 1 : 0; }
-  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
-    EXPECT_TRUE(member == 1 && access == Access::call && arguments.size() == 1);
-    if (fails) throw RunTimeError(1234, u"theirs");
-    return Variant(u"<" + arguments[0].to_text(plain_numbers) + u">");
-  }
-  bool fails = false;
-};
-
 TEST_F(ChecksAndCase, AnotherMakersConverterIsUsedAndReleased) {
-  const auto theirs = std::make_shared<ForeignConverter>();
+  const auto theirs = std::make_shared<RecordingControl>();
+  theirs->values = {{"NameCase(\"aandb\")", u"<aandb>"}, {"NameCase(\"c\")", u"<c>"}};
   platform.controls[Text(NameCaseConverter::class_name)] = theirs;
   library.settings().iCharactercase = library.settings().iCharacterCaseSuburbs = 1;
   EXPECT_EQ(utils.ConvertCase(0, u"a&b"), Variant(u"<aandb>"));
   EXPECT_EQ(utils.ConvertCaseSuburbs(u"c"), Variant(u"<c>"));
-  theirs->fails = true;
+  theirs->before = [](const std::string&) { throw RunTimeError(1234, u"theirs"); };
   EXPECT_EQ(error_of([&] { (void)utils.ConvertCase(1, u"x"); }), 1234);
   EXPECT_EQ(theirs.use_count(), 2);
 }
