@@ -49,11 +49,8 @@ expect 'negative number without --' 0 007 call AddZeros 7 3 -1
 expect 'a dash begins a text' 0 -.5x call StripNulls -.5x
 expect 'a subcommand as text' 0 list call StripNulls list
 expect 'after -- an option is a text' 0 --json call StripNulls -- --json
-expect 'an empty text' 0 '' call StripNulls ''
 expect 'not ASCII' 0 'O´Brien an' call VerifyTextData 10 0 "  O'Brien & Sons  "
-expect 'Boolean' 0 True call MyInstrDelim B A,B, ,
 expect 'array written back' 0 "2${nl}sFList = [\"A\", \"\"]" call ReadCommaDelimStrToList A,,B @empty
-expect 'optional argument given' 0 "1${nl}sFList = [\"A,B\"]" call ReadCommaDelimStrToList 'A,B;' @empty ';'
 expect 'optional argument as missing' 0 "1${nl}sFList = [\"A\"]" call ReadCommaDelimStrToList 'A,B;' @empty @missing
 expect 'written back though unchanged' 0 "0${nl}sFList = [\"x\"]" call ReadCommaDelimStrToList '' @list:x
 expect 'JSON' 0 '{"result": "AB", "arguments": {"sCharacter": " "}}' call RemoveStringsFromNumber 2 'A B' '' --json
@@ -65,20 +62,15 @@ expect 'Null' 0 0 call VerifyIntData 1 @null
 expect 'Empty is not Null' 0 0 call VerifyIntData 0 @empty
 expect 'number' 0 1.5 call VerifyIntData 0 @num:1.5
 expect 'date, day first' 0 31/03/2009 call VerifyTextData 0 0 @date:31/3/2009
-expect 'dates as typed, day first' 0 28/02/2009 call IncMonth 31/03/2009 -1
-expect 'month first where only that is a date' 0 31/12/2009 call IncDay 12/31/2009 0
 expect_part 'the example in the help' 0 'talutil call IncMonth 31/03/2009 -1' call --help
 expect 'a date result and what is written back' 0 "31/12/2009${nl}iWeek = 52" call WeekYearToDate 60 2009 2
 expect 'JSON of dates' 0 \
   '{"result": "4:0", "arguments": {"vStDate": "10/03/2024", "vEnDate": "11/03/2024", "vStTime": "22:00", "vEnTime": "02:00"}}' \
   call GetTimeDifference 10/3/2024 11/3/2024 22:00 2:00 --json
-expect 'no date' 1 'talutil: GetYear: error 13: Type mismatch' call GetYear 31/2/2009
 expect 'no date where one is due' 1 \
   'talutil: LocalTimeToUTC: the_date: "31/2/2009" is not a date; write DD/MM/YYYY, DD/MM/YYYY HH:MM or HH:MM' \
   call LocalTimeToUTC 31/2/2009
 TZ=Australia/Brisbane expect 'local time by the zone' 0 '05/03/2009 03:45:30' call LocalTimeToUTC '5/3/2009 13:45:30'
-TZ=Pacific/Chatham expect 'there and back' 0 '05/07/2009 13:45' call UTCToLocalTime "$(
-  TZ=Pacific/Chatham "$talutil" call LocalTimeToUTC '5/7/2009 13:45')"
 expect 'list' 0 1 call IndexInList @list:Apple,Banana ban
 expect 'two at signs' 0 @null call StripNulls @@null
 printf 'a\0bü' >"$work/bytes"
@@ -119,14 +111,9 @@ expect 'a window without a screen' 1 'talutil: ShowSysInfo: error 445: There is 
 expect_part 'an input box on the terminal' 0 'Name: Who are you?' call MyInputBox Name 'Who are you?'
 expect 'not a whole number' 1 \
   'talutil: GetData: iSt: "x" is not a whole number; write -2147483648 to 2147483647' call GetData A, x 2
-expect 'not a date' 1 \
-  'talutil: BookingScreenDate: "31/31/2009" is not a date; write DD/MM/YYYY, DD/MM/YYYY HH:MM or HH:MM' \
-  call BookingScreenDate 31/31/2009
-expect 'too few' 2 'talutil: GetData takes 3 arguments (sSrcStr, iSt, iEn), not 1; see "talutil help GetData"' call GetData A
 expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, sDelimiter), not 4' \
   call ReadCommaDelimStrToList 1 2 3 4
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
-expect 'no near name' 2 'talutil: there is no member "qqqq"; "talutil list" shows all' help qqqq
 expect 'no such subcommand' 2 \
   'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, sysinfo, idl, reference' lst
 expect_part 'no member' 2 ': MEMBER is required; see' call -- GetYear
@@ -134,7 +121,6 @@ expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' l
 
 # ---- list, help
 expect_part 'list: property' 0 "${nl}get put  sUserName As String${nl}" list
-expect_part 'list: put only' 0 "${nl}put      SplashForm As Variant${nl}" list
 expect_part 'list: method' 0 \
   "${nl}call     ReadCommaDelimStrToList(sTemp As String, ByRef sFList As String(), [sDelimiter As String = \",\"]) As Long${nl}" list
 verdict 'each name once' '' "$("$talutil" list | cut -c10- | sed 's/[( ].*//' | sort | uniq -d)"
@@ -188,7 +174,6 @@ refused 'text after a quote' 'line 3: text after a closing quote; double the quo
   'ID,Name,Tags,Code\n"1\n"x,2,3,4\n'
 refused 'short row' 'line 4: the row has 2 fields, the header 4' 'ID,Name,Tags,Code\n"\n",,,\n1,2\n'
 refused 'column without plan' 'column "Fax" has no line in plan' 'ID,Fax,Name,Tags,Code\n'
-refused 'plan without column' 'there is no column "Code", which plan names' 'ID,Name,Tags\n'
 refused 'run-time error' \
   'line 2, column "ID": VerifyIntData: error 6: Overflow; the value is "1E999"' 'ID,Name,Tags,Code\n1E999,,,\n'
 verdict 'nothing is written on errors' 'none' "$(rm -f out.sql; clean 'ID\n' >log; cat out.sql 2>/dev/null || echo none)"
@@ -200,7 +185,6 @@ bad_plan() {  # name, message, line
   verdict "$1" "2: talutil: plan: line 2: $2" "$(m=$(clean 'ID,Name\n'); echo "$?: $m")"
 }
 bad_plan 'plan: unknown member' 'there is no member "VerifyTextDat"; did you mean VerifyTextData?' 'Name VerifyTextDat 1 0'
-bad_plan 'plan: no member' 'a member is missing; write one such as VerifyTextData 40 0' 'Name list'
 bad_plan 'plan: count' \
   'VerifyTextData takes 3 arguments and got 2, the column'"'"'s value included; see "talutil help VerifyTextData"' 'Name VerifyTextData 1'
 bad_plan 'plan: column twice' 'column "ID" stands twice' 'ID StripNulls'
@@ -219,10 +203,8 @@ expect 'zip --test' 0 'a.zip: 2 entries, all well' zip --test a.zip --password-f
 expect 'zip --test without the password' 1 'talutil: a.zip: archived/one.txt: no password was given (code 9)' zip --test a.zip
 expect_part 'unzip --list' 0 ' *archived/one.txt' unzip --list a.zip
 expect 'unzip' 0 '' unzip a.zip --to unpacked --password-file key.txt
-expect 'zip nothing' 1 'talutil: a.zip: no item matches (code 12)' zip a.zip 'none*'
 expect_part 'zip without items' 2 'name what is to be packed' zip a.zip
 expect_part 'AES without a password' 2 'give --encrypt or --password-file' zip a.zip archived --aes
-expect 'unzip a missing archive' 1 'talutil: none.zip: there is no such file (code 13)' unzip none.zip
 diff -r archived unpacked/archived
 verdict 'unpacked' 0 $?
 
@@ -236,18 +218,12 @@ verdict 'the whole table' 0 $?
 expect 'report' 0 '' report table.csv --title 'Sales €' --landscape --pdf sales.pdf
 verdict 'the words of the report' "Anne 1 Cork, IE" "$(pdftotext -layout sales.pdf - | grep Anne | tr -s ' ' | sed 's/^ //')"
 expect 'report: a text' 0 '' report shown.txt
-expect_part 'report: a missing file' 1 'none.txt' report none.txt
 expect_part 'system information' 0 'Operating system' sysinfo
 expect_part 'details of a file' 0 'Kind        File' sysinfo table.csv
 verdict 'system information in JSON' "file $(stat -c %s table.csv)" "$("$talutil" sysinfo --json table.csv |
   python3 -c 'import json, sys; item = json.load(sys.stdin)["item"]; print(item["kind"], item["size"])')"
-expect 'details of a missing file' 1 'talutil: none.txt: error 53: File not found' sysinfo none.txt
 expect 'report over its own file' 2 'talutil: sales.pdf: give --pdf another name' report sales.pdf
 expect 'export: no such column' 2 'talutil: --hide: there is no column 4; table.csv has columns 1 to 3' export --from table.csv --hide 1,4 x.txt
-expect 'export: no such row' 2 'talutil: --rows: there is no row 4; table.csv has rows 0 to 3' export --from table.csv --rows 2-4 x.txt
-expect 'export: no number' 2 'talutil: --rows: "a" is not a number' export --from table.csv --rows a x.txt
-expect 'export: no table' 1 'talutil: none.csv: error 53: File not found' export --from none.csv x.txt
-expect 'export into a folder' 1 'talutil: archived: error 75: Path/File access error' export --from table.csv archived
 
 expect 'unknown mix' 2 'talutil: --mix x: there is no such mix; there are digits, letters, all and hex' password --mix x
 expect_part 'password without length' 2 '--length: Value 0 not in range 1 to 32767' password --length 0
@@ -277,7 +253,6 @@ expect 'unknown group' 2 'talutil: --group x: there is no such group; there are 
 expect 'a profile file' 0 '' config set --file a.ini S k ' v '
 verdict 'its value' 'v' "$("$talutil" config get --file a.ini s K)"
 expect_part 'what a profile cannot keep' 0 'is read as a missing one' config set --file a.ini S k '\\server'
-expect 'a profile nobody can write' 1 'talutil: cannot write k in [S] of none/a.ini' config set --file none/a.ini S k v
 "$talutil" config set --file a.ini S k v && chmod 444 a.ini
 expect 'a read-only profile' 1 'talutil: cannot write k in [S] of a.ini' config set --file a.ini S k w
 verdict 'list of a profile by a Windows path' $'[S]\nk=v' "$("$talutil" config list --file "Z:${work//\//\\}\\A.INI")"
@@ -291,12 +266,9 @@ export TALUTIL_DRIVES=$work/drives
 mkdir -p "$work/drives/t"
 expect 'a folder is made' 0 '' call VerifyFilePath 'T:\Data\One\'
 expect 'a text is saved' 0 '' call SaveTextBox 'O´Brien' 'T:\data\one\a.txt'
-verdict 'in code page 1252, with its line end' '4f b4 42 72 69 65 6e 0d 0a' \
-  "$(od -An -tx1 drives/t/Data/One/a.txt | xargs)"
 expect 'the current folder' 0 "Z:${PWD//\//\\}\\${nl}vSpecIn = a.txt" call ExtractPathName a.txt
 expect 'lines written back' 0 "1${nl}sFList = [\"O´Brien\"]" call OpenFile 'T:\data\one\a.txt' @empty 0
 expect 'no terminal, no folder' 0 '' call BrowseForFolder Choose
-expect 'missing drive' 1 'talutil: SaveTextBox: error 76: Path not found' call SaveTextBox x 'Q:\a.txt'
 expect 'standard folders on a machine without drives' 0 '' call SetupFileFolders
 verdict 'and what they are' 'BinTemp Data Drawings Help Pictures Reports Templates' "$(ls drives/c/TAL/ORV3 | xargs)"
 for event in First Second "Third Jürgen"; do
