@@ -33,7 +33,13 @@ TEST(Owned, GivesEachHandleBackOnceAndKeepsTheLastError) {
       {"moved from", [](Item& item, Closed&) { const Item other(std::move(item)); }, {1}, {}},
       // A handle goes back to where it came from.
       {"moved to", [](Item& item, Closed& others) { item = Item(2, {&others}); }, {1}, {2}},
-      {"moved to itself", [](Item& item, Closed&) { item = static_cast<Item&&>(item); }, {1}, {}},
+      {"moved to itself",
+       [](Item& item, Closed&) {
+         item = static_cast<Item&&>(item);
+         EXPECT_EQ(item.get(), 1);
+       },
+       {1},
+       {}},
   };
   for (const auto& row : rows) {
     Closed closed, others;
