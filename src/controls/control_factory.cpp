@@ -27,7 +27,7 @@ constexpr struct {
 } makers[] = {
     {u"PolarCryptoLibCtl.Crypto", &make<Crypto>},
     {u"MSComDlg.CommonDialog", &make<CommonDialog>},
-    {Grid::class_name, &make<Grid>},
+    {u"VSFlex8Ctl.VSFlexGrid", &make<Grid>},
     {u"SystemInfoControl.MSysInfo", &make<SystemInformation>},
     {NameCaseConverter::class_name, &make<NameCaseConverter>},
     {u"DUZACTXLibCtl.duzactxctrl", &make<UnzipControl>},

@@ -37,8 +37,6 @@ class RowText {
 /// are counted from 0; an index outside the table raises 9 everywhere.
 class Grid final : public TableObject<Grid> {
  public:
-  static constexpr TextView class_name = u"VSFlex8Ctl.VSFlexGrid";
-
   static constexpr std::int16_t text_setting = 0;
   static constexpr std::int16_t check_box_setting = 5;
   static constexpr std::int16_t boolean_type = 11;

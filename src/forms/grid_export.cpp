@@ -19,6 +19,10 @@ GridExport::GridExport(const Control& grid, const Control& table)
   }
 }
 
+GridExport::~GridExport() {
+  if (own_table_ != nullptr) own_table_->put_Rows(0);
+}
+
 void GridExport::copy_all_rows(std::int32_t first) {
   copy_rows(first, checked_subtract(grid_.get<std::int32_t>(u"Rows"), 1));
 }

@@ -12,6 +12,11 @@ class GridExport {
  public:
   /// Empties the table and gives it a column for each that the grid shows.
   GridExport(const Control& grid, const Control& table);
+  GridExport(const GridExport&) = delete;
+  GridExport& operator=(const GridExport&) = delete;
+
+  /// Empties our own table again: it lives on, and an export can be large.
+  ~GridExport();
 
   /// From a row, counted from 0, to the last one.
   void copy_all_rows(std::int32_t first);

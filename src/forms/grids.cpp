@@ -1,7 +1,5 @@
 #include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
-#include "controls/control_factory.hpp"
-#include "controls/grid.hpp"
 #include "forms/grid_export.hpp"
 #include "infoforms/frm_components.hpp"
 #include "library/library.hpp"
@@ -96,8 +94,7 @@ void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontS
     if (file.empty()) return;
 
     const Control grid(m_Grid1, locale());
-    // A table of this call's own: a host that is asked for a cell may export another grid before it answers.
-    const Control scratch(library_.controls().create(Grid::class_name), locale());
+    const Control scratch(library_.components().borrow_scratch_grid(), locale());
     GridExport grid_export(grid, scratch);
     // The sense is as hosts know it: True is every row, from the one that iDontSaveHeader gives.
     if (bSelection.is_exactly_true())

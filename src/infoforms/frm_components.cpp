@@ -63,6 +63,15 @@ ObjectRef FrmComponents::control(TextView name) {
   return controls_[place_of(name)];
 }
 
+ObjectRef FrmComponents::borrow_scratch_grid() {
+  const std::size_t place = place_of(u"Grid1");
+  if (is_scratch_grid_lent_) return factory_.create(places[place].class_name);
+  ObjectRef grid = control(places[place].name);
+  is_scratch_grid_lent_ = true;
+  // Keeps the control also where the window closes meanwhile.
+  return {grid.get(), [this, grid](Object* /*lent*/) { is_scratch_grid_lent_ = false; }};
+}
+
 std::intptr_t FrmComponents::owner_handle() {
   load();
   return window_->handle();

@@ -47,6 +47,10 @@ class FrmComponents {
   /// A control by name, on a window that is loaded if need be. Raises 438 for a name that is not on it.
   [[nodiscard]] ObjectRef control(TextView name);
 
+  /// The table that exports fill, `Grid1`, the caller's until the reference ends. A host that is asked for a cell may
+  /// export another grid before it answers: that export gets another control of the same class.
+  [[nodiscard]] ObjectRef borrow_scratch_grid();
+
   /// The handle for dialogs to be owned by; loads the window if need be.
   [[nodiscard]] std::intptr_t owner_handle();
 
@@ -66,6 +70,7 @@ class FrmComponents {
   std::unique_ptr<HiddenWindow> window_;
   Controls controls_;
   std::int32_t last_database_error_ = 0;
+  bool is_scratch_grid_lent_ = false;
 };
 
 }  // namespace talutil

@@ -1,8 +1,8 @@
 #include "controls/grid.hpp"
-#include "automation/control.hpp"
 
 #include <gmock/gmock.h>
 
+#include "automation/control.hpp"
 #include "controls/delimited_text.hpp"
 #include "infoforms/frm_components.hpp"
 #include "tests/fakes/recording_control.hpp"
@@ -215,14 +215,17 @@ TEST_F(Grids, ExportsReadTheGridInOrder) {
   // While a cell is asked for, the host exports this grid; then it has no memory left for the cell.
   fill(3, 1);
   platform.chosen_files = {u"C:\\outer.txt", u"C:\\inner.txt", u"C:\\none.txt"};
+  const Control scratch(library.components().control(u"Grid1"), plain_numbers);
   source->before = [&](const std::string& use) {
     if (!use.starts_with("TextMatrix")) return;
+    EXPECT_EQ(scratch.get<std::int32_t>(u"Rows"), 1) << "the outer export fills the window's grid";
     if (platform.chosen_files.size() == 2) utils.ExportGridData(ObjectRef(grid), 0, Boolean(true), u"Sales");
     if (platform.chosen_files.empty()) throw std::bad_alloc();
   };
   utils.ExportGridData(ObjectRef(source), 1, Boolean(true), u"Sales");
   EXPECT_EQ(file(u"C:\\inner.txt"), "0/0\r\n1/0\r\n2/0\r\n");
   EXPECT_EQ(file(u"C:\\outer.txt"), "7\r\n");
+  EXPECT_EQ(scratch.get<std::int32_t>(u"Rows"), 0) << "and leaves it empty";
   utils.ExportGridData(ObjectRef(source), 1, Boolean(true), u"Sales");
   EXPECT_FALSE(platform.files.files.contains(u"C:\\none.txt")) << "and fails silently";
 }
