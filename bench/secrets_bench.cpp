@@ -1,7 +1,7 @@
 #include <benchmark/benchmark.h>
 
 #include "bench/toolkit.hpp"
-#include "text/name_case.hpp"
+#include "controls/name_case.hpp"
 
 namespace talutil {
 namespace {

@@ -1,8 +1,8 @@
 # The Windows side: the platform, the type library made from the interface table, and TALUtil.dll.
 add_compile_definitions(UNICODE _UNICODE WINVER=0x0601 _WIN32_WINNT=0x0601)
 
-file(GLOB win32_sources CONFIGURE_DEPENDS src/platform/win32/*.cpp)
-add_library(talutil_platform STATIC ${win32_sources})
+talutil_layer(win32 FOLDER platform/win32 BELOW platform)
+add_library(talutil_platform STATIC)
 # The system's cryptography is loaded at its first use: most hosts never need it, and it is slow to load.
 if(CMAKE_SIZEOF_VOID_P EQUAL 8)
   set(idl_flags -m64 --win64)
@@ -25,7 +25,7 @@ add_custom_command(OUTPUT ${delayed_bcrypt}
   DEPENDS ${bcrypt_definition})
 add_custom_target(delayed_imports DEPENDS ${delayed_bcrypt})
 add_dependencies(talutil_platform delayed_imports)
-target_link_libraries(talutil_platform PUBLIC talutil_core PRIVATE ${delayed_bcrypt} delayimp)
+target_link_libraries(talutil_platform PUBLIC talutil_core layer_win32 PRIVATE ${delayed_bcrypt} delayimp)
 
 # The type library: the table is printed as IDL by a program of the building machine, compiled, and mended.
 # It refers to the platform's stdole2.tlb, which the compiler looks for in the folder below.
@@ -38,7 +38,7 @@ find_program(host_compiler NAMES c++ g++ REQUIRED NO_CMAKE_FIND_ROOT_PATH)
 find_program(idl_compiler ${talutil_tool_prefix}-widl REQUIRED NO_CMAKE_FIND_ROOT_PATH)
 set(generated ${CMAKE_BINARY_DIR}/generated)
 file(MAKE_DIRECTORY ${generated})
-file(GLOB table_headers CONFIGURE_DEPENDS src/automation/*.hpp src/library/*.hpp src/forms/c_control_position.hpp)
+file(GLOB table_headers CONFIGURE_DEPENDS src/automation/*.hpp src/library/*.hpp)
 set(host_compile ${host_compiler} -std=c++20 -O0 -I${CMAKE_SOURCE_DIR}/src)
 
 add_custom_command(
@@ -68,17 +68,24 @@ add_custom_command(
 enable_language(RC)
 configure_file(src/com/talutil.rc.in ${generated}/talutil.rc)
 set_source_files_properties(${generated}/talutil.rc PROPERTIES OBJECT_DEPENDS ${generated}/TALUtil.tlb)
-file(GLOB com_sources CONFIGURE_DEPENDS src/com/*.cpp)
-add_library(TALUtil SHARED ${com_sources} src/com/talutil.def ${generated}/talutil.rc ${generated}/TALUtil.h)
+talutil_layer(com BELOW startup win32)
+add_library(TALUtil SHARED src/com/talutil.def ${generated}/talutil.rc ${generated}/TALUtil.h)
 set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
-target_include_directories(TALUtil PRIVATE ${generated})
-target_link_libraries(TALUtil PRIVATE talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)
+target_link_libraries(TALUtil PRIVATE layer_com talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)
 # Sections on page boundaries are mapped; others are read and copied, which is most of the time that loading takes.
 target_link_options(TALUtil PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup -Wl,--file-alignment=4096)
+
+# For our own clients of the DLL: headers alone, none of its code.
+add_library(client_headers INTERFACE)
+foreach(layer com win32 automation platform library)
+  target_include_directories(client_headers INTERFACE $<TARGET_PROPERTY:layer_${layer},INTERFACE_INCLUDE_DIRECTORIES>)
+endforeach()
+target_link_libraries(client_headers INTERFACE talutil_options)
 
 # In a folder of its own: the library finds it where a package puts it, beside the program or beside TALUtil.dll.
 add_library(printhelper SHARED src/printhelper/printhelper.cpp src/printhelper/printhelper.def
             src/platform/win32/exception_frames.cpp)
+target_include_directories(printhelper PRIVATE src)
 set_target_properties(printhelper PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/printhelper)
 target_link_libraries(printhelper PRIVATE talutil_options gdi32 user32 winspool)
 target_link_options(printhelper PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup)

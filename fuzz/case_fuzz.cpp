@@ -1,11 +1,11 @@
 // What must hold for any name that is brought into another case: case_fuzz -max_len=512 -runs=1000000
 #include <algorithm>
 
+#include "controls/name_case.hpp"
 #include "fuzz/input.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "tests/fakes/fake_platform.hpp"
-#include "text/name_case.hpp"
 
 namespace talutil {
 namespace {

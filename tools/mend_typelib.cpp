@@ -16,7 +16,7 @@
 #include <string>
 #include <string_view>
 
-#include "forms/c_control_position.hpp"
+#include "library/c_control_position.hpp"
 #include "library/interface_definition.hpp"
 #include "library/interface_table.hpp"
 

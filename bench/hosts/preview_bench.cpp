@@ -1,9 +1,9 @@
 // Times the preview window: opening it over few and over many pages, drawing a page again, and what is left of it.
 #include <cstdio>
 
+#include "controls/print_control.hpp"
+#include "platform/preview_view.hpp"
 #include "platform/win32/win32_platform.hpp"
-#include "preview/preview_view.hpp"
-#include "preview/print_control.hpp"
 #include "tests/fakes/fake_platform.hpp"
 #include "timing.hpp"
 

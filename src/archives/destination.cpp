@@ -16,7 +16,7 @@ Answer unless_refused(Answer refused, Work&& work) {
     try {
       return work();
     } catch (const RunTimeError& error) {
-      if (error.number() != static_cast<std::int32_t>(ErrorNumber::bad_file_name_or_number)) throw;
+      if (!error.is(ErrorNumber::bad_file_name_or_number)) throw;
       return refused;
     }
   });

@@ -46,6 +46,7 @@ std::string_view standard_description(std::int32_t number) noexcept {
     case ErrorNumber::not_a_collection: return "Property let procedure not defined and property get procedure did not return an object";  // 451
     case ErrorNumber::missing_entry_point: return "Can't find DLL entry point";  // 453
     case ErrorNumber::printer_error: return "Printer error";  // 482
+    case ErrorNumber::cancelled: return "Cancel was selected.";  // 32755
   }
   // clang-format on
   return "Application-defined or object-defined error";

@@ -6,6 +6,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "automation/text.hpp"
 
@@ -51,6 +52,7 @@ enum class ErrorNumber : std::int32_t {
   not_a_collection = 451,
   missing_entry_point = 453,
   printer_error = 482,
+  cancelled = 32755,
 };
 
 /// The standard text of a number; the text of an unknown number is "Application-defined or object-defined error".
@@ -72,10 +74,17 @@ class RunTimeError : public std::exception {
  public:
   explicit RunTimeError(ErrorNumber number);
 
+  /// With a description that says more than the standard one.
+  RunTimeError(ErrorNumber number, Text description)
+      : RunTimeError(static_cast<std::int32_t>(number), std::move(description)) {}
+
   /// Without an origin the error is the library's own.
   RunTimeError(std::int32_t number, Text description, std::optional<ErrorOrigin> origin = {});
 
   [[nodiscard]] std::int32_t number() const noexcept { return contents_->number; }
+  [[nodiscard]] bool is(ErrorNumber number) const noexcept {
+    return contents_->number == static_cast<std::int32_t>(number);
+  }
   [[nodiscard]] const Text& description() const noexcept { return contents_->description; }
   [[nodiscard]] const std::optional<ErrorOrigin>& origin() const noexcept { return contents_->origin; }
   [[nodiscard]] const char* what() const noexcept override { return contents_->narrow.c_str(); }

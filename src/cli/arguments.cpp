@@ -105,9 +105,7 @@ Variant converted(ValueType type, const Variant& value, const Locale& locale) {
   }
 }
 
-bool is_overflow(const RunTimeError& error) {
-  return error.number() == static_cast<std::int32_t>(ErrorNumber::overflow);
-}
+bool is_overflow(const RunTimeError& error) { return error.is(ErrorNumber::overflow); }
 
 }  // namespace
 

@@ -3,7 +3,7 @@
 #include "cli/commands.hpp"
 #include "cli/entries.hpp"
 #include "cli/session.hpp"
-#include "forms/c_control_position.hpp"
+#include "library/c_control_position.hpp"
 
 namespace talutil::cli {
 

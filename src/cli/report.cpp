@@ -5,8 +5,8 @@
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
 #include "controls/grid.hpp"
+#include "controls/print_control.hpp"
 #include "platform/posix/posix_platform.hpp"
-#include "preview/print_control.hpp"
 
 namespace talutil::cli {
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "com/com_object.hpp"
-#include "forms/c_control_position.hpp"
+#include "library/c_control_position.hpp"
 #include "library/identity.hpp"
 #include "library/interface_table.hpp"
 

@@ -125,7 +125,7 @@ Library& module_library() {
   const std::lock_guard lock(module_state.starting);
   if (module_state.loaded != nullptr) return module_state.loaded->library;
   if (module_state.is_starting) {
-    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::cannot_create_object),
+    throw RunTimeError(ErrorNumber::cannot_create_object,
                        u"ActiveX component can't create object: TALUtil is just starting; a control that is registered "
                        u"to stand for one of its own creates TALUtil in its turn");
   }

@@ -49,7 +49,7 @@ ObjectRef RegisteredControls::create(TextView class_name) {
     const Text description = u"ActiveX component can't create object: " + replacement + u" is registered in " +
                              Text(u"Software\\TALUtil\\Controls") + u" to stand for " + name +
                              u"; install it or remove the value";
-    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::cannot_create_object), description);
+    throw RunTimeError(ErrorNumber::cannot_create_object, description);
   }
   return object_from(object.get());
 }

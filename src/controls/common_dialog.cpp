@@ -17,7 +17,7 @@ void CommonDialog::show(FileDialog::Purpose purpose) {
     FileName = chosen->path;
     FilterIndex = chosen->filter_index;
   } else if (CancelError) {
-    throw RunTimeError(cancelled, Text(cancelled_description));
+    raise(ErrorNumber::cancelled);
   }
 }
 

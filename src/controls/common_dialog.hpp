@@ -1,6 +1,6 @@
 #pragma once
 
-#include "controls/control.hpp"
+#include "controls/table_object.hpp"
 #include "platform/file_dialogs.hpp"
 
 namespace talutil {
@@ -8,10 +8,6 @@ namespace talutil {
 /// The file dialog control, over the platform's dialogs.
 class CommonDialog final : public TableObject<CommonDialog> {
  public:
-  /// The number and the text of a cancelled dialog, for hosts that ask for it with CancelError.
-  static constexpr std::int32_t cancelled = 32755;
-  static constexpr TextView cancelled_description = u"Cancel was selected.";
-
   explicit CommonDialog(const Platform& platform) : TableObject(platform), dialogs_(platform.file_dialogs) {}
 
   Text DialogTitle;

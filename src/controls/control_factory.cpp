@@ -4,13 +4,13 @@
 
 #include "automation/run_time_error.hpp"
 #include "controls/common_dialog.hpp"
-#include "controls/control.hpp"
 #include "controls/crypto.hpp"
 #include "controls/grid.hpp"
 #include "controls/name_case_converter.hpp"
+#include "controls/print_control.hpp"
 #include "controls/system_information.hpp"
+#include "controls/table_object.hpp"
 #include "controls/zip_controls.hpp"
-#include "preview/print_control.hpp"
 
 namespace talutil {
 

@@ -14,7 +14,7 @@ void require(bool is_known) {
 template <class T>
 T opened(std::optional<T> result) {
   if (!result) {
-    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::invalid_procedure_call),
+    throw RunTimeError(ErrorNumber::invalid_procedure_call,
                        u"This is not a cipher text of this library, or it was changed");
   }
   return std::move(*result);

@@ -3,7 +3,8 @@
 #include <memory>
 #include <vector>
 
-#include "controls/control.hpp"
+#include "controls/table_object.hpp"
+#include "platform/table_source.hpp"
 
 namespace talutil {
 
@@ -35,7 +36,7 @@ class RowText {
 
 /// The grid control: a table of texts with what a grid that is shown knows about its rows and columns. Rows and columns
 /// are counted from 0; an index outside the table raises 9 everywhere.
-class Grid final : public TableObject<Grid> {
+class Grid final : public TableObject<Grid>, public TableSource {
  public:
   static constexpr std::int16_t text_setting = 0;
   static constexpr std::int16_t check_box_setting = 5;
@@ -115,7 +116,18 @@ class Grid final : public TableObject<Grid> {
 
   /// The window of the grid, which builders of reports ask for: 0 for a table that is not shown.
   [[nodiscard]] std::int32_t hwnd() const noexcept { return window_; }
-  void set_window(std::int32_t window) noexcept { window_ = window; }
+
+  // As a table on a window: the first row is the heading where it is fixed, the others lie below.
+  [[nodiscard]] std::int32_t row_count() const override { return Rows() - FixedRows(); }
+  [[nodiscard]] std::int32_t column_count() const override { return Cols(); }
+  [[nodiscard]] Text heading(std::int32_t column) const override {
+    return FixedRows() > 0 ? TextMatrix(0, column) : Text();
+  }
+  [[nodiscard]] std::int32_t column_width(std::int32_t column) const override { return ColWidth(column); }
+  [[nodiscard]] Text cell_text(std::int32_t row, std::int32_t column) const override {
+    return TextMatrix(row + FixedRows(), column);
+  }
+  void set_window(std::int32_t window) override { window_ = window; }
 
   /// Empties every cell.
   void Clear();

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "controls/control.hpp"
-#include "text/name_case.hpp"
+#include "controls/name_case.hpp"
+#include "controls/table_object.hpp"
 
 namespace talutil {
 

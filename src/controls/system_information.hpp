@@ -1,6 +1,6 @@
 #pragma once
 
-#include "controls/control.hpp"
+#include "controls/table_object.hpp"
 
 namespace talutil {
 

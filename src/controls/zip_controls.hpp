@@ -7,7 +7,7 @@
 #include "archives/packing.hpp"
 #include "archives/progress.hpp"
 #include "archives/unpacking.hpp"
-#include "controls/control.hpp"
+#include "controls/table_object.hpp"
 
 namespace talutil {
 

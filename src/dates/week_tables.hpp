@@ -5,13 +5,14 @@
 #include <cstdint>
 
 #include "automation/text.hpp"
+#include "library/library.hpp"
 
 namespace talutil {
 
 /// The first and last days of the weeks of one year, as texts "DD/MM/YYYY". Weeks count from 1 January in steps
 /// of seven days; the last one ends with the year. Both tables hold the year that WeekYearToDate was last asked
 /// for.
-class WeekTables {
+class WeekTables final : public LibraryPart {
  public:
   static constexpr std::int32_t last_week = 52;
 

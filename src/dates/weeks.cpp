@@ -52,7 +52,7 @@ std::int16_t ORVUtils::GetWeekNumber(const Variant& vDate) {
 
 Variant ORVUtils::WeekYearToDate(std::int16_t& iWeek, const std::int16_t& iYear, const std::int16_t& iDay) {
   iWeek = std::clamp<std::int16_t>(iWeek, 1, WeekTables::last_week);
-  WeekTables& tables = library().week_tables();
+  WeekTables& tables = library().part<WeekTables>();
   const bool is_leap = is_leap_calendar(library());
   tables.fill_starts(iYear, is_leap);
   tables.fill_ends(iYear, is_leap);

@@ -1,4 +1,4 @@
-#include "forms/c_control_position.hpp"
+#include "library/c_control_position.hpp"
 
 #include "automation/checked.hpp"
 #include "automation/control.hpp"

@@ -1,7 +1,6 @@
 #include "forms/form.hpp"
 
 #include "automation/run_time_error.hpp"
-#include "controls/common_dialog.hpp"
 #include "library/library.hpp"
 
 namespace talutil {
@@ -45,7 +44,7 @@ void Form::report_errors(Work work) noexcept {
     } catch (...) {
       const RunTimeError error = current_error();
       // The user who has cancelled a dialog knows.
-      if (error.number() == CommonDialog::cancelled) return;
+      if (error.is(ErrorNumber::cancelled)) return;
       library_.platform().message_boxes.show(error.description(), MessageButtons::ok, {});
     }
   } catch (...) {

@@ -2,17 +2,14 @@
 
 #include <memory>
 
-#include "forms/form_view.hpp"
+#include "library/library.hpp"
+#include "platform/form_view.hpp"
 
 namespace talutil {
 
-class Library;
-
 /// A window of the library: loaded when something first needs it, one of its kind at a time.
-class Form : public FormEvents {
+class Form : public FormEvents, public LibraryPart {
  public:
-  Form(const Form&) = delete;
-  Form& operator=(const Form&) = delete;
   ~Form() override;
 
   [[nodiscard]] bool is_loaded() const noexcept { return view_ != nullptr && view_->is_open(); }

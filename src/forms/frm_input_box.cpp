@@ -81,7 +81,8 @@ void FrmInputBox::on_closing(CloseMode mode) {
 Text ORVUtils::MyInputBox(const Text& sCaption, const Text& sPrompt, const Boolean& bPassword,
                           const Boolean& bShowUserInput, const Boolean& bNoFrame, const Boolean& bNonCloseable,
                           const std::int32_t& lBackColor) {
-  return library_.input_box().ask({sCaption, sPrompt, bPassword, bShowUserInput, bNoFrame, bNonCloseable, lBackColor});
+  return library_.part<FrmInputBox>().ask(
+      {sCaption, sPrompt, bPassword, bShowUserInput, bNoFrame, bNonCloseable, lBackColor});
 }
 
 }  // namespace talutil

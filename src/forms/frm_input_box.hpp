@@ -30,6 +30,10 @@ class FrmInputBox final : public Form {
   /// 400 when the box is on the screen already, unless both are notices: the first one then shows the second's text.
   [[nodiscard]] Text ask(const Question& question);
 
+  void close_notice() override {
+    if (!is_shown_modal()) unload();
+  }
+
  protected:
   void fill(FormView& view) override;
   void on_click(std::uint8_t part) override;

@@ -1,7 +1,6 @@
 #include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
 #include "forms/grid_export.hpp"
-#include "infoforms/frm_components.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 

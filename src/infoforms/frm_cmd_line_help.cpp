@@ -75,6 +75,6 @@ void FrmCmdLineHelp::fill(FormView& view) {
   view.set_text(rtbExamples, examples);
 }
 
-void ORVUtils::ShowCmdLineHelp() { library_.command_line_help().show(); }
+void ORVUtils::ShowCmdLineHelp() { library_.part<FrmCmdLineHelp>().show(); }
 
 }  // namespace talutil

@@ -4,6 +4,7 @@
 #include <memory>
 
 #include "automation/object.hpp"
+#include "library/components.hpp"
 #include "library/shared_settings.hpp"
 #include "platform/platform.hpp"
 
@@ -13,7 +14,7 @@ class ControlFactory;
 
 /// The window that is never shown: it holds the non-visual controls that members drive, and owns the
 /// library's dialogs. It is made when something first asks for it and closed by Terminate.
-class FrmComponents {
+class FrmComponents final : public Components {
  public:
   static constexpr TextView caption = u"Form1";
 
@@ -37,22 +38,11 @@ class FrmComponents {
 
   [[nodiscard]] bool is_loaded() const noexcept { return window_ != nullptr; }
 
-  /// Makes the window and its controls if there are none, and reads ComputerName from MSysInfo1. Raises what a control
-  /// raises, after which there is no window.
-  void load();
-
-  /// Closes the window with its controls. One that is not loaded is loaded first, as hosts observe.
-  void unload();
-
-  /// A control by name, on a window that is loaded if need be. Raises 438 for a name that is not on it.
-  [[nodiscard]] ObjectRef control(TextView name);
-
-  /// The table that exports fill, `Grid1`, the caller's until the reference ends. A host that is asked for a cell may
-  /// export another grid before it answers: that export gets another control of the same class.
-  [[nodiscard]] ObjectRef borrow_scratch_grid();
-
-  /// The handle for dialogs to be owned by; loads the window if need be.
-  [[nodiscard]] std::intptr_t owner_handle();
+  void load() override;
+  void unload() override;
+  [[nodiscard]] ObjectRef control(TextView name) override;
+  [[nodiscard]] ObjectRef borrow_scratch_grid() override;
+  [[nodiscard]] std::intptr_t owner_handle() override;
 
   /// What the host's data connection calls when it reports an error: shows it and keeps its number.
   void report_database_error(std::int32_t number, const Text& description, std::int32_t code, const Text& source,

@@ -1,8 +1,8 @@
 #include "infoforms/frm_sh_keys.hpp"
 
 #include "automation/control.hpp"
-#include "controls/control.hpp"
 #include "controls/control_factory.hpp"
+#include "controls/table_object.hpp"
 #include "infoforms/shortcut_keys.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
@@ -66,6 +66,6 @@ void FrmShKeys::on_closing(CloseMode mode) {
   if (mode == CloseMode::control_menu) result_ = crossed;
 }
 
-void ORVUtils::ShowShortCutKeys() { library_.shortcut_keys().show(); }
+void ORVUtils::ShowShortCutKeys() { library_.part<FrmShKeys>().show(); }
 
 }  // namespace talutil

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 
-#include "infoforms/frm_components.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 
@@ -183,6 +182,6 @@ void FrmSysInfo::on_click(std::uint8_t part) {
   }
 }
 
-void ORVUtils::ShowSysInfo() { library_.system_information().show_window(); }
+void ORVUtils::ShowSysInfo() { library_.part<FrmSysInfo>().show_window(); }
 
 }  // namespace talutil

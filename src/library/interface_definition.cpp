@@ -2,7 +2,7 @@
 
 #include <charconv>
 
-#include "forms/c_control_position.hpp"
+#include "library/c_control_position.hpp"
 #include "library/identity.hpp"
 #include "library/interface_table.hpp"
 

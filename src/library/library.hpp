@@ -1,24 +1,31 @@
 #pragma once
 
 #include <memory>
+#include <type_traits>
+#include <vector>
 
 #include "automation/locale.hpp"
-#include "dates/week_tables.hpp"
+#include "controls/control_factory.hpp"
+#include "library/components.hpp"
 #include "library/shared_settings.hpp"
 #include "platform/platform.hpp"
-#include "services/mod_zip_files.hpp"
 
 namespace talutil {
 
-class ControlFactory;
-class FrmCmdLineHelp;
-class FrmComponents;
-class FrmInputBox;
-class FrmPrintPreview;
-class FrmShKeys;
-class FrmSysInfo;
+/// What a library keeps beside its settings: a window, or what a member remembers from call to call.
+class LibraryPart {
+ public:
+  LibraryPart() = default;
+  LibraryPart(const LibraryPart&) = delete;
+  LibraryPart& operator=(const LibraryPart&) = delete;
+  virtual ~LibraryPart() = default;
 
-/// One loaded library: the shared settings, the platform and the components window. The DLL has exactly one.
+  /// Takes a window off the screen that no call waits for.
+  virtual void close_notice() {}
+};
+
+/// One loaded library: the shared settings, the platform, the components window and the parts that members add. The DLL
+/// has exactly one.
 class Library {
  public:
   explicit Library(const Platform& platform);
@@ -31,23 +38,27 @@ class Library {
   void start();
 
   [[nodiscard]] SharedSettings& settings() noexcept { return settings_; }
-  [[nodiscard]] WeekTables& week_tables() noexcept { return week_tables_; }
-  [[nodiscard]] ModZipFiles& zip_files() noexcept { return zip_files_; }
   [[nodiscard]] const Platform& platform() const noexcept { return platform_; }
-  [[nodiscard]] FrmComponents& components() noexcept { return *components_; }
-  [[nodiscard]] const ControlFactory& controls() const noexcept { return *controls_; }
+  [[nodiscard]] Components& components() noexcept { return *components_; }
+  [[nodiscard]] const ControlFactory& controls() const noexcept { return controls_; }
 
-  // Windows, made when they are first asked for.
-  [[nodiscard]] FrmPrintPreview& preview();
-  [[nodiscard]] FrmInputBox& input_box();
-  [[nodiscard]] FrmShKeys& shortcut_keys();
-  [[nodiscard]] FrmCmdLineHelp& command_line_help();
-  [[nodiscard]] FrmSysInfo& system_information();
+  /// The part of a class, of which there is one: made, of the library or of nothing, when it is first asked for.
+  template <class Part>
+  [[nodiscard]] Part& part() {
+    for (const auto& held : parts_) {
+      if (auto* const found = dynamic_cast<Part*>(held.get())) return *found;
+    }
+    std::unique_ptr<Part> made;
+    if constexpr (std::is_constructible_v<Part, Library&>)
+      made = std::make_unique<Part>(*this);
+    else
+      made = std::make_unique<Part>();
+    Part& result = *made;
+    parts_.push_back(std::move(made));
+    return result;
+  }
 
-  /// Whether one of them is on the screen.
-  [[nodiscard]] bool has_open_windows() const noexcept;
-
-  /// Takes those off the screen that nobody waits for.
+  /// Takes the windows off the screen that no call waits for.
   void close_notices();
 
   /// The user's separators, with the current year of the clock.
@@ -56,15 +67,9 @@ class Library {
  private:
   Platform platform_;
   SharedSettings settings_;
-  WeekTables week_tables_;
-  ModZipFiles zip_files_;
-  std::unique_ptr<ControlFactory> controls_;
-  std::unique_ptr<FrmComponents> components_;
-  std::unique_ptr<FrmPrintPreview> preview_;
-  std::unique_ptr<FrmInputBox> input_box_;
-  std::unique_ptr<FrmShKeys> shortcut_keys_;
-  std::unique_ptr<FrmCmdLineHelp> command_line_help_;
-  std::unique_ptr<FrmSysInfo> system_information_;
+  ControlFactory controls_;
+  std::unique_ptr<Components> components_;
+  std::vector<std::unique_ptr<LibraryPart>> parts_;
 };
 
 }  // namespace talutil

@@ -83,8 +83,8 @@ class FormEvents;
 class FormView;
 struct FormDescription;
 class PreviewEvents;
+class PreviewPages;
 class PreviewView;
-class PrintControl;
 
 class FormWindows {
  public:
@@ -94,9 +94,9 @@ class FormWindows {
   /// A window with controls. The description and the presenter outlive it. Raises 445 where there is no screen.
   [[nodiscard]] virtual std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) = 0;
 
-  /// The preview window, which shows the pages of a print control; null for a third-party one, which shows them itself.
-  /// Both outlive the view.
-  [[nodiscard]] virtual std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) = 0;
+  /// The preview window, which shows pages; null for those of a third-party control, which shows them itself. Both
+  /// outlive the view.
+  [[nodiscard]] virtual std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) = 0;
 };
 
 /// The messages that wait for the host's windows.

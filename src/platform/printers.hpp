@@ -3,10 +3,9 @@
 #include <cstdint>
 
 #include "automation/text.hpp"
+#include "platform/page_model.hpp"
 
 namespace talutil {
-
-struct Document;
 
 /// How a document is to be printed, by the codes of the platform's printing functions.
 struct PrintSettings {

@@ -6,9 +6,9 @@
 #include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
 #include "controls/control_factory.hpp"
+#include "controls/print_control.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
-#include "preview/print_control.hpp"
 
 namespace talutil {
 
@@ -86,7 +86,8 @@ void FrmPrintPreview::load() {
   dialog->put(u"DialogTitle", u"Save Data to PDF File");
   dialog->put(u"Filter", u"Adobe PDF Format *.pdf|*.pdf");
   pdf->put(u"Subject", u"ORV PDF Data");
-  view_ = library_.platform().form_windows.make_preview(*this, dynamic_cast<PrintControl*>(print->object().get()));
+  view_ =
+      library_.platform().form_windows.make_preview(*this, dynamic_cast<const PreviewPages*>(print->object().get()));
   print_ = std::move(print);
   save_dialog_ = std::move(dialog);
   pdf_export_ = std::move(pdf);

@@ -4,25 +4,23 @@
 #include <memory>
 
 #include "automation/control.hpp"
-#include "controls/control.hpp"
-#include "preview/preview_view.hpp"
+#include "controls/table_object.hpp"
+#include "library/library.hpp"
+#include "platform/preview_view.hpp"
 
 namespace talutil {
 
-class Library;
 class ORVUtils;
 
 /// The print preview window: its state and what it does, over a view. There is one for each library, loaded when
 /// something first touches its controls. For the members that remember windows it is a form of its own: an object with
 /// WindowState, Width and Height.
-class FrmPrintPreview final : public PreviewEvents {
+class FrmPrintPreview final : public PreviewEvents, public LibraryPart {
  public:
   static constexpr TextView form_name = u"frmPrintPreview";
   static constexpr TextView settings_section = u"PrintPreview";
 
   explicit FrmPrintPreview(Library& library);
-  FrmPrintPreview(const FrmPrintPreview&) = delete;
-  FrmPrintPreview& operator=(const FrmPrintPreview&) = delete;
   ~FrmPrintPreview() override;
 
   void set_caption_text(Text text) { caption_text_ = std::move(text); }

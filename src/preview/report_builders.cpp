@@ -1,9 +1,9 @@
 #include "automation/checked.hpp"
 #include "automation/control.hpp"
+#include "controls/print_control.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "preview/frm_print_preview.hpp"
-#include "preview/print_control.hpp"
 
 namespace talutil {
 
@@ -71,7 +71,7 @@ const Control& begin_plain_report(FrmPrintPreview& form, std::int16_t zoom, cons
 void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16_t& iPrintDirection,
                                 const Text& sReportName, const Text& sCsvName, const Variant& ctlGrid,
                                 const Variant& vStDate, const Variant& vEnDate, const Text& fWindowCaption) {
-  FrmPrintPreview& form = library_.preview();
+  FrmPrintPreview& form = library_.part<FrmPrintPreview>();
   form.set_caption_text(fWindowCaption);
   const Control& print = form.print_control();
   print.put(u"HeaderFontName", u"Courier New");
@@ -102,7 +102,7 @@ void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16
 
 void ORVUtils::TextBoxPrintPreview(const std::int16_t& iZoomLevel, const std::int16_t& iPrintDirection,
                                    const Text& sReportName, const Text& sCsvName, const Variant& ctlTextBox) {
-  FrmPrintPreview& form = library_.preview();
+  FrmPrintPreview& form = library_.part<FrmPrintPreview>();
   const Control& print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
   print.put(u"Text", Control(ctlTextBox, locale()).get<Text>(u"Text"));
   print.call(u"EndDoc");
@@ -113,7 +113,7 @@ void ORVUtils::ListBoxPrintPreview(const std::int16_t& iZoomLevel, const std::in
                                    const Text& sReportName, const Text& sCsvName, const Variant& ctlListBox) {
   constexpr std::int32_t height = 567;  // 1 cm.
   constexpr double pitch = 680.4;       // Of which the fraction is lost at every line.
-  FrmPrintPreview& form = library_.preview();
+  FrmPrintPreview& form = library_.part<FrmPrintPreview>();
   const Control& print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
   const Control list(ctlListBox, locale());
   const auto count = list.get<std::int32_t>(u"ListCount");

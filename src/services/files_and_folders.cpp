@@ -1,6 +1,5 @@
 #include "automation/checked.hpp"
 #include "automation/run_time_error.hpp"
-#include "infoforms/frm_components.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 

@@ -5,7 +5,6 @@
 #include "automation/control.hpp"
 #include "automation/run_time_error.hpp"
 #include "controls/zip_controls.hpp"
-#include "infoforms/frm_components.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 
@@ -151,14 +150,15 @@ void ModZipFiles::unzip(const Control& control, MessageBoxes& boxes, const Text&
 void ORVUtils::CallZIPFiles(const Text& sZipName, const Text& sItems, const std::int16_t& iMultiVolume,
                             const Text& sEncryptionPassword, const Boolean& /*bUseFilePath*/) {
   const Control control(library_.components().control(u"ZipCtrl"), locale());
-  library_.zip_files().zip(control, library_.platform().message_boxes, sZipName, sItems, iMultiVolume,
-                           sEncryptionPassword);
+  library_.part<ModZipFiles>().zip(control, library_.platform().message_boxes, sZipName, sItems, iMultiVolume,
+                                   sEncryptionPassword);
 }
 
 void ORVUtils::CallUnZIPFiles(const Text& sUnZipName, const Text& sDestPath, const Text& sItems,
                               const Boolean& bOverWrite) {
   const Control control(library_.components().control(u"UnZipCtrl"), locale());
-  library_.zip_files().unzip(control, library_.platform().message_boxes, sUnZipName, sDestPath, sItems, bOverWrite);
+  library_.part<ModZipFiles>().unzip(control, library_.platform().message_boxes, sUnZipName, sDestPath, sItems,
+                                     bOverWrite);
 }
 
 }  // namespace talutil

@@ -2,15 +2,15 @@
 
 #include "automation/boolean.hpp"
 #include "automation/text.hpp"
+#include "library/library.hpp"
 
 namespace talutil {
 
 class Control;
-class MessageBoxes;
 
 /// Drives the zip and unzip controls of the components window and explains how it went. The password of the last zip
 /// action is kept for the unzip actions that follow.
-class ModZipFiles {
+class ModZipFiles final : public LibraryPart {
  public:
   /// Empties the control's settings, hands it the password, packs, and shows its result.
   void zip(const Control& control, MessageBoxes& boxes, const Text& archive, const Text& items,

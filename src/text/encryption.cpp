@@ -1,5 +1,4 @@
 #include "automation/control.hpp"
-#include "infoforms/frm_components.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 

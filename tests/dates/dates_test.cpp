@@ -1,3 +1,4 @@
+#include "dates/week_tables.hpp"
 #include "tests/dates/late_members.hpp"
 #include "tests/fakes/error_of.hpp"
 #include "tests/fakes/recording_control.hpp"
@@ -189,9 +190,9 @@ TEST_F(DateMembers, WeekTablesHaveTheCalendarOfTheCurrentYear) {
   EXPECT_EQ(call(u"WeekYearToDate", u"10|2009|1"), "#04/03/2009#");
   EXPECT_EQ(call(u"WeekYearToDate", u"9|2009|2"), "#03/03/2009#");
   EXPECT_EQ(call(u"WeekYearToDate", u"52|2009|1"), "#23/12/2009#");
-  EXPECT_EQ(library.week_tables().start(2), u"08/01/2009");
-  EXPECT_EQ(library.week_tables().end(52), u"31/12/2009");
-  EXPECT_EQ(library.week_tables().start(53) + library.week_tables().end(53), u"");
+  EXPECT_EQ(library.part<WeekTables>().start(2), u"08/01/2009");
+  EXPECT_EQ(library.part<WeekTables>().end(52), u"31/12/2009");
+  EXPECT_EQ(library.part<WeekTables>().start(53) + library.part<WeekTables>().end(53), u"");
 }
 
 TEST_F(DateMembers, MinutesThatHaveNoTextAreReportedInABox) {

@@ -5,8 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "controls/grid.hpp"
-#include "forms/form_view.hpp"
+#include "platform/form_view.hpp"
 
 namespace talutil::testing {
 
@@ -19,7 +18,7 @@ struct FakeFormState {
   std::map<int, bool> masked;
   std::int32_t colour = 0;
   bool has_frame = true;
-  Grid* table = nullptr;
+  TableSource* table = nullptr;
   std::int32_t bar_column = -1;
   Text copied;
   std::int32_t windows = 0;
@@ -55,7 +54,7 @@ class FakeForm final : public FormView {
   void set_tabs(std::uint8_t /*part*/, std::span<const TextView> captions) override {
     state_.uses.push_back("tabs " + std::to_string(captions.size()));
   }
-  void set_table(std::uint8_t /*part*/, Grid& table, std::int32_t bar_column) override {
+  void set_table(std::uint8_t /*part*/, TableSource& table, std::int32_t bar_column) override {
     state_.table = &table;
     state_.bar_column = bar_column;
   }

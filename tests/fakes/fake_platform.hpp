@@ -11,8 +11,8 @@
 
 #include "automation/run_time_error.hpp"
 #include "library/library.hpp"
+#include "platform/page_model.hpp"
 #include "platform/platform.hpp"
-#include "preview/page_model.hpp"
 #include "tests/fakes/fake_files.hpp"
 #include "tests/fakes/fake_form.hpp"
 #include "tests/fakes/fake_preview.hpp"
@@ -206,7 +206,7 @@ struct FakePlatform : MessageBoxes,
     return std::make_unique<FakeForm>(form, events);
   }
 
-  std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) override {
+  std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) override {
     return std::make_unique<FakePreview>(preview, events, pages);
   }
 

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "preview/preview_view.hpp"
+#include "platform/preview_view.hpp"
 
 namespace talutil::testing {
 
@@ -26,7 +26,7 @@ struct FakePreviewState {
 
 class FakePreview final : public PreviewView {
  public:
-  FakePreview(FakePreviewState& state, PreviewEvents& events, PrintControl* /*pages*/)
+  FakePreview(FakePreviewState& state, PreviewEvents& events, const PreviewPages* /*pages*/)
       : state_(state), events_(events) {
     ++state_.windows;
   }

@@ -1,6 +1,6 @@
 #include <gmock/gmock.h>
 
-#include "forms/c_control_position.hpp"
+#include "library/c_control_position.hpp"
 #include "tests/fakes/recording_control.hpp"
 #include "tests/fakes/utils_test.hpp"
 

@@ -1,5 +1,5 @@
 // A client that is bound early: through the vtable, by the header that the interface compiler made.
-#include "forms/c_control_position.hpp"
+#include "library/c_control_position.hpp"
 #include "library/interface_table.hpp"
 #include "slots.hpp"
 

@@ -1,5 +1,5 @@
 // A client that reads the type library out of the DLL, as development tools do, and compares it with the table.
-#include "forms/c_control_position.hpp"
+#include "library/c_control_position.hpp"
 #include "library/interface_table.hpp"
 #include "slots.hpp"
 

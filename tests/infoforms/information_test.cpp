@@ -65,20 +65,20 @@ TEST_F(Windows, NoticesStayUntilTheLibraryEnds) {
   EXPECT_EQ(ask(), u"before");
   EXPECT_EQ(ask(false, false, true, true), u"before") << "nobody waits for a notice";
   EXPECT_TRUE(form.hidden[FrmInputBox::txtUserInput] && form.hidden[FrmInputBox::cmdOK]);
-  EXPECT_TRUE(library.has_open_windows());
+  EXPECT_TRUE(library.part<FrmInputBox>().is_loaded());
   form.events->escaped();
-  EXPECT_TRUE(library.has_open_windows()) << "Esc is no way to close it";
+  EXPECT_TRUE(library.part<FrmInputBox>().is_loaded()) << "Esc is no way to close it";
   EXPECT_EQ(error_of([&] { ask(); }), 400);
   EXPECT_EQ(utils.MyInputBox(u"C", u"Nearly done", Boolean(), Boolean(), Boolean(true), Boolean(true), 0), u"before");
   EXPECT_EQ(form.texts[FrmInputBox::lblPrompt], u"Nearly done");
   EXPECT_EQ(form.windows, 1);
   utils.Terminate();
-  EXPECT_FALSE(library.has_open_windows());
+  EXPECT_FALSE(library.part<FrmInputBox>().is_loaded());
 
   form.user = [&](FormEvents& events) {
     EXPECT_EQ(error_of([&] { ask(false, false, true, true); }), 400) << "within a box that is waited for";
     utils.Terminate();
-    EXPECT_TRUE(library.has_open_windows()) << "which stays";
+    EXPECT_TRUE(library.part<FrmInputBox>().is_loaded()) << "which stays";
     form.texts[FrmInputBox::txtUserInput] = u"after";
     events.clicked(FrmInputBox::cmdOK);
   };
@@ -95,7 +95,7 @@ TEST_F(Windows, ShortcutKeysArePrintedAndClosed) {
   EXPECT_THAT(form.uses, ElementsAre("show", "on top", "show", "on top"));
   EXPECT_EQ(form.windows, 1);
   EXPECT_EQ(form.caption, u"  Shortcut keys List");
-  FrmShKeys& keys = library.shortcut_keys();
+  FrmShKeys& keys = library.part<FrmShKeys>();
   form.texts[FrmShKeys::Text1] = u"the keys";
   form.events->clicked(FrmShKeys::cmdPrint);
   EXPECT_THAT(print->uses,
@@ -152,42 +152,42 @@ TEST(ShortcutKeys, AreToldOnceAScreen) {
 
 TEST_F(Windows, SwitchesStandInAGrid) {
   form.user = [&](FormEvents& events) {
-    const Grid& grid = *form.table;
-    EXPECT_EQ(grid.Rows(), 10);
-    EXPECT_EQ(grid.Cols(), 2);
-    EXPECT_EQ(grid.TextMatrix(0, 1), u"Description");
-    EXPECT_EQ(grid.TextMatrix(8, 0), u"");
-    EXPECT_EQ(grid.TextMatrix(8, 1), u"  Preload the requested time out time if specified");
+    const TableSource& table = *form.table;
+    EXPECT_EQ(table.row_count(), 9);
+    EXPECT_EQ(table.column_count(), 2);
+    EXPECT_EQ(table.heading(1), u"Description");
+    EXPECT_EQ(table.cell_text(7, 0), u"");
+    EXPECT_EQ(table.cell_text(7, 1), u"  Preload the requested time out time if specified");
     EXPECT_TRUE(form.texts[FrmCmdLineHelp::rtbExamples].ends_with(u"ORV.EXE\" SINEMP 120000002:1"));
     if (form.windows++ < 3) utils.ShowCmdLineHelp();
     events.escaped();
   };
   utils.ShowCmdLineHelp();
-  EXPECT_FALSE(library.has_open_windows());
+  EXPECT_FALSE(library.part<FrmCmdLineHelp>().is_loaded());
 }
 
 TEST_F(Windows, TheSystemIsDescribed) {
   platform.items[u"C:\\a.txt"] = {false, 1536, 3, std::nullopt, Date{40000.5}, std::nullopt};
   form.user = [&](FormEvents& events) {
-    EXPECT_EQ(form.table->TextMatrix(1, 6), u"75%");
+    EXPECT_EQ(form.table->cell_text(0, 6), u"75%");
     EXPECT_EQ(form.bar_column, 6);
-    EXPECT_EQ(form.table->TextMatrix(2, 3), u"not ready");
+    EXPECT_EQ(form.table->cell_text(1, 3), u"not ready");
     events.tab_chosen(FrmSysInfo::tabs, 1);
-    EXPECT_EQ(form.table->TextMatrix(1, 1), u"8.0 GB (8,589,934,592 bytes)");
+    EXPECT_EQ(form.table->cell_text(0, 1), u"8.0 GB (8,589,934,592 bytes)");
     EXPECT_EQ(form.bar_column, -1);
     EXPECT_TRUE(form.hidden[FrmSysInfo::details]);
     events.tab_chosen(FrmSysInfo::tabs, 4);
     EXPECT_TRUE(form.hidden[FrmSysInfo::facts]);
     form.texts[FrmSysInfo::path] = u"C:\\a.txt";
     events.clicked(FrmSysInfo::show);
-    EXPECT_EQ(form.table->TextMatrix(3, 1), u"1.5 KB (1,536 bytes)");
-    EXPECT_EQ(form.table->TextMatrix(5, 1), u"06/07/2009 12:00");
-    EXPECT_EQ(form.table->TextMatrix(7, 1), u"read-only, hidden");
+    EXPECT_EQ(form.table->cell_text(2, 1), u"1.5 KB (1,536 bytes)");
+    EXPECT_EQ(form.table->cell_text(4, 1), u"06/07/2009 12:00");
+    EXPECT_EQ(form.table->cell_text(6, 1), u"read-only, hidden");
     events.clicked(FrmSysInfo::copy);
     platform.items.clear();
     events.clicked(FrmSysInfo::refresh);
     EXPECT_EQ(platform.messages.size(), 1U) << "the file has gone";
-    EXPECT_EQ(form.table->Rows(), 1);
+    EXPECT_EQ(form.table->row_count(), 0);
     events.clicked(FrmSysInfo::close);
   };
   utils.ShowSysInfo();

@@ -119,7 +119,7 @@ TEST_F(LibraryTest, AControlThatFailsLeavesNoHalfWindow) {
 }
 
 TEST_F(LibraryTest, ControlsOfTheComponentsWindow) {
-  FrmComponents& form = library.components();
+  auto& form = dynamic_cast<FrmComponents&>(library.components());
   EXPECT_EQ(Control(form.control(u"dlgSave2"), plain_numbers).get<Text>(u"dialogtitle"), u"Save Data to File");
   EXPECT_EQ(Control(form.control(u"dlgSave2"), plain_numbers).get<Text>(u"Filter"),
             u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");
@@ -133,7 +133,7 @@ TEST_F(LibraryTest, ControlsOfTheComponentsWindow) {
 }
 
 TEST_F(LibraryTest, DatabaseErrorReport) {
-  FrmComponents& form = library.components();
+  auto& form = dynamic_cast<FrmComponents&>(library.components());
   form.report_database_error(17142, u"gone", 1, u"source", u"help", u"");
   EXPECT_EQ(form.last_database_error(), 17142);
   form.report_database_error(-5, u"what", 0, u"where", u"help.hlp", u"third");

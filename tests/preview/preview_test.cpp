@@ -1,8 +1,8 @@
 #include <gmock/gmock.h>
 
 #include "controls/grid.hpp"
+#include "controls/print_control.hpp"
 #include "preview/frm_print_preview.hpp"
-#include "preview/print_control.hpp"
 #include "tests/fakes/recording_control.hpp"
 #include "tests/fakes/utils_test.hpp"
 
@@ -146,7 +146,7 @@ TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
   for (int page = 0; page < 3; ++page) text += u"page\f";
   source->values["Text"] = text + u"end";
   auto& view = platform.preview;
-  FrmPrintPreview& form = library.preview();
+  FrmPrintPreview& form = library.part<FrmPrintPreview>();
   view.width = 100;
   view.user = [&](PreviewEvents& events) {
     EXPECT_EQ(view.captions.back(), u"Notes           Page 1 of 4      Press F9 to Print.");
@@ -223,7 +223,7 @@ TEST_F(Builders, ErrorsOfPagingReachTheCallerOthersNobody) {
   library.settings().sORVPath = u"C:";
   platform.files.failures = {{u"append", ErrorNumber::permission_denied}};
   EXPECT_EQ(error_of([&] { utils.TextBoxPrintPreview(50, 1, u"Notes", u"C:\\x", holder); }), 70);
-  EXPECT_FALSE(library.preview().is_loaded()) << "a log that cannot be written leaves no half window";
+  EXPECT_FALSE(library.part<FrmPrintPreview>().is_loaded()) << "a log that cannot be written leaves no half window";
 }
 
 struct Pages : Preview {
@@ -279,7 +279,8 @@ TEST_F(Preview, EndlessListsStayOnOnePage) {
   std::size_t entries = 0;
   std::size_t pages = 0;
   platform.preview.user = [&](PreviewEvents& /*events*/) {
-    const auto& document = dynamic_cast<PrintControl&>(*library.preview().print_control().object()).document();
+    const auto& document =
+        dynamic_cast<PrintControl&>(*library.part<FrmPrintPreview>().print_control().object()).document();
     pages = document.pages.size();
     entries = document.pages[0].items.size();
   };

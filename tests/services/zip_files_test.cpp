@@ -2,6 +2,7 @@
 
 #include "automation/control.hpp"
 #include "controls/zip_controls.hpp"
+#include "services/mod_zip_files.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "tests/archives/tree.hpp"

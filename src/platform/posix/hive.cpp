@@ -43,7 +43,7 @@ std::string Hive::default_path() {
 
 void Hive::fail() const {
   const char* const reason = database_ ? sqlite3_errmsg(database_.get()) : "there is no memory";
-  throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::device_io_error),
+  throw RunTimeError(ErrorNumber::device_io_error,
                      u"Cannot use the settings in " + from_utf8(path_) + u": " + from_utf8(reason));
 }
 

@@ -174,7 +174,7 @@ void PosixFiles::search(const Text& pattern, std::uint32_t mask, const std::func
       return;
     }
   } catch (const RunTimeError& error) {
-    if (error.number() != static_cast<std::int32_t>(ErrorNumber::path_not_found)) throw;
+    if (!error.is(ErrorNumber::path_not_found)) throw;
     return;
   }
   const std::unique_ptr<DIR, int (*)(DIR*)> listing(opendir(native_folder.c_str()), &closedir);

@@ -4,7 +4,7 @@
 #include <map>
 
 #include "automation/run_time_error.hpp"
-#include "forms/form_view.hpp"
+#include "platform/form_view.hpp"
 #include "platform/posix/posix_platform.hpp"
 #include "platform/posix/terminal.hpp"
 
@@ -29,7 +29,7 @@ class TerminalForm final : public FormView {
   void keep_on_top() override {}
   void fit() override {}
   void set_tabs(std::uint8_t /*part*/, std::span<const TextView> /*captions*/) override {}
-  void set_table(std::uint8_t /*part*/, Grid& /*table*/, std::int32_t /*bar_column*/) override {}
+  void set_table(std::uint8_t /*part*/, TableSource& /*table*/, std::int32_t /*bar_column*/) override {}
   void copy(TextView /*text*/) override {}
 
   void show() override {
@@ -92,7 +92,7 @@ std::unique_ptr<FormView> PosixFormWindows::make_form(FormEvents& events, const 
     return part.kind == PartKind::label || part.kind == PartKind::entry || part.kind == PartKind::button;
   });
   if (!is_box) {
-    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::action_not_supported), Text(no_screen_for_windows));
+    throw RunTimeError(ErrorNumber::action_not_supported, Text(no_screen_for_windows));
   }
   return std::make_unique<TerminalForm>(events, description);
 }

@@ -110,7 +110,7 @@ void PosixDrawing::draw_text(std::intptr_t /*device_context*/, const PixelRectan
 }
 
 void PosixWindowPrinting::configure_printer(std::int32_t /*window*/) {
-  throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::file_not_found), Text(missing_print_helper));
+  throw RunTimeError(ErrorNumber::file_not_found, Text(missing_print_helper));
 }
 
 void PosixWindowPrinting::send_to_printer(std::int32_t window) { configure_printer(window); }

@@ -60,7 +60,7 @@ class PosixFormWindows final : public FormWindows {
 
   /// A window that has a size and a state but cannot be shown.
   std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) override;
-  std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) override;
+  std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) override;
 };
 
 /// Third-party controls exist on Windows only.

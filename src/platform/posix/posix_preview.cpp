@@ -3,7 +3,7 @@
 
 #include "automation/run_time_error.hpp"
 #include "platform/posix/posix_platform.hpp"
-#include "preview/preview_view.hpp"
+#include "platform/preview_view.hpp"
 
 namespace talutil::posix {
 
@@ -24,9 +24,7 @@ class PreviewWindow final : public PreviewView {
   void size_pages(float /*width*/, float /*height*/) override {}
   void check(PreviewMenu /*item*/, bool /*is_checked*/) override {}
   void show_page() override {}
-  void show_modal() override {
-    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::action_not_supported), Text(no_screen));
-  }
+  void show_modal() override { throw RunTimeError(ErrorNumber::action_not_supported, Text(no_screen)); }
   void close() override {}
 
  private:
@@ -37,7 +35,7 @@ class PreviewWindow final : public PreviewView {
 
 }  // namespace
 
-std::unique_ptr<PreviewView> PosixFormWindows::make_preview(PreviewEvents& /*events*/, PrintControl* /*pages*/) {
+std::unique_ptr<PreviewView> PosixFormWindows::make_preview(PreviewEvents& /*events*/, const PreviewPages* /*pages*/) {
   return std::make_unique<PreviewWindow>();
 }
 

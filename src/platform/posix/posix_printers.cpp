@@ -9,8 +9,8 @@
 #include <string>
 
 #include "automation/run_time_error.hpp"
+#include "documents/pdf_writer.hpp"
 #include "platform/posix/posix_files.hpp"
-#include "preview/pdf_writer.hpp"
 
 extern char** environ;
 
@@ -68,7 +68,7 @@ bool PosixPrinters::print(const Document& document, const PrintSettings& setting
   int status = 0;
   const bool is_started = posix_spawnp(&child, "lp", nullptr, nullptr, arguments.data(), environ) == 0;
   if (!is_started || waitpid(child, &status, 0) != child || status != 0) {
-    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::printer_error),
+    throw RunTimeError(ErrorNumber::printer_error,
                        is_started ? u"Printer error: \"lp\" did not take the document; see \"lpstat -p -d\""
                                   : u"Printer error: there is no \"lp\" to print with; export the document instead");
   }

@@ -4,7 +4,6 @@
 #include <map>
 
 #include "platform/win32/handle.hpp"
-#include "preview/font_metrics.hpp"
 
 namespace talutil::win32 {
 

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "platform/page_model.hpp"
 #include "platform/win32/windows.hpp"
-#include "preview/page_model.hpp"
 
 namespace talutil::win32 {
 

@@ -22,12 +22,12 @@ void call_helper(const char* function, std::int32_t window) {
   HMODULE helper = helper_beside(nullptr);
   if (helper == nullptr) helper = helper_beside(own_module());
   if (helper == nullptr) {
-    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::file_not_found), Text(missing_print_helper));
+    throw RunTimeError(ErrorNumber::file_not_found, Text(missing_print_helper));
   }
   using Print = std::int32_t(WINAPI*)(std::int32_t);
   const auto print = reinterpret_cast<Print>(reinterpret_cast<void*>(GetProcAddress(helper, function)));
   if (print == nullptr) {
-    throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::missing_entry_point),
+    throw RunTimeError(ErrorNumber::missing_entry_point,
                        u"Can't find DLL entry point " + from_utf8(function) + u" in printhelper.dll");
   }
   // What it answers says nothing. It stays loaded, with what it keeps between the two calls.

@@ -51,7 +51,7 @@ class Win32FormWindows final : public FormWindows {
   /// Its handle raises 51 where the platform makes no window.
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
   std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) override;
-  std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, PrintControl* pages) override;
+  std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) override;
 };
 
 class Win32MessagePump final : public MessagePump {

@@ -16,7 +16,7 @@ namespace {
 constexpr double twips_per_inch = 1440;
 
 [[noreturn]] void raise_printer_error(const Text& what) {
-  throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::printer_error), u"Printer error: " + what);
+  throw RunTimeError(ErrorNumber::printer_error, u"Printer error: " + what);
 }
 
 /// The dialog's answer, with the memory and the device that it hands over.

@@ -30,9 +30,9 @@ DWORD bytes_of(std::size_t units) { return static_cast<DWORD>(units) * DWORD{siz
 
 void require(LSTATUS status, const Text& path) {
   if (status == ERROR_SUCCESS) return;
-  throw RunTimeError(static_cast<std::int32_t>(ErrorNumber::device_io_error),
-                     u"Cannot use the settings in HKEY_CURRENT_USER\\" + path + u": system error " +
-                         number_to_text(static_cast<std::int32_t>(status)));
+  throw RunTimeError(ErrorNumber::device_io_error, u"Cannot use the settings in HKEY_CURRENT_USER\\" + path +
+                                                       u": system error " +
+                                                       number_to_text(static_cast<std::int32_t>(status)));
 }
 
 /// Anything but success and a missing key or value is the host's to know.

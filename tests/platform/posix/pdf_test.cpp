@@ -8,9 +8,9 @@
 #include <sstream>
 
 #include "automation/run_time_error.hpp"
+#include "documents/pdf_writer.hpp"
+#include "documents/report_composer.hpp"
 #include "platform/posix/posix_platform.hpp"
-#include "preview/pdf_writer.hpp"
-#include "preview/report_composer.hpp"
 
 namespace talutil {
 

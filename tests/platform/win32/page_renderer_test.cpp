@@ -6,7 +6,7 @@
 #include <cmath>
 #include <map>
 
-#include "preview/report_composer.hpp"
+#include "documents/report_composer.hpp"
 
 namespace talutil {
 

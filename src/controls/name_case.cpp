@@ -1,10 +1,10 @@
-#include "text/name_case.hpp"
+#include "controls/name_case.hpp"
 
 #include <algorithm>
 #include <array>
 #include <vector>
 
-#include "text/name_case_table.hpp"
+#include "controls/name_case_table.hpp"
 
 namespace talutil {
 
@@ -90,7 +90,8 @@ class Line {
       while (at < text.size() && is_in_word(text[at])) ++at;
       parts_.push_back({begin, at});
     }
-    const auto first = std::ranges::find_if(parts_, [&](const Part& part) { return !is_decimal_digit(text[part.begin]); });
+    const auto first =
+        std::ranges::find_if(parts_, [&](const Part& part) { return !is_decimal_digit(text[part.begin]); });
     first_ = static_cast<std::size_t>(first - parts_.begin());
   }
 

@@ -5,7 +5,7 @@
 #include <array>
 
 #include "platform/font_files.hpp"
-#include "preview/page_model.hpp"
+#include "platform/page_model.hpp"
 
 namespace talutil {
 

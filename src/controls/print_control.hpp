@@ -3,15 +3,16 @@
 #include <memory>
 #include <optional>
 
-#include "controls/control.hpp"
-#include "preview/report_composer.hpp"
+#include "controls/table_object.hpp"
+#include "documents/report_composer.hpp"
+#include "platform/preview_view.hpp"
 
 namespace talutil {
 
 /// The print control: reports are laid out on its pages, looked at, printed and exported. Lengths are twips.
 ///
 /// Settings that are put while a document is being made, or after, count for the next one.
-class PrintControl final : public TableObject<PrintControl> {
+class PrintControl final : public TableObject<PrintControl>, public PreviewPages {
  public:
   // The identifiers by which hosts' builders put the fixed settings.
   static constexpr std::int32_t show_guides_id = 34;
@@ -87,6 +88,10 @@ class PrintControl final : public TableObject<PrintControl> {
   void PrintDoc(Boolean dialog);
 
   [[nodiscard]] const Document& document() const noexcept { return document_; }
+
+  [[nodiscard]] const Page* shown_page() const override;
+  [[nodiscard]] float zoom_percent() const override { return zoom_; }
+  [[nodiscard]] std::optional<Rectangle> guides() const override;
 
  private:
   [[nodiscard]] ReportComposer& composer();

@@ -4,11 +4,10 @@
 #include <span>
 
 #include "automation/text.hpp"
+#include "platform/table_source.hpp"
 
 /// Windows with controls: what stands on them as data, the presenter's view of one, and what it hears of its user.
 namespace talutil {
-
-class Grid;
 
 enum class PartKind : std::uint8_t { label, entry, button, rich_text, table, tabs };
 
@@ -99,9 +98,9 @@ class FormView {
   virtual void fit() = 0;
   virtual void set_tabs(std::uint8_t part, std::span<const TextView> captions) = 0;
 
-  /// Shows a grid: its first row as the heading, all others below. It outlives the view, or gives way to another.
+  /// Shows a table, which outlives the view or gives way to another.
   /// @param bar_column a column of percentages to be drawn as bars; -1 for none
-  virtual void set_table(std::uint8_t part, Grid& table, std::int32_t bar_column) = 0;
+  virtual void set_table(std::uint8_t part, TableSource& table, std::int32_t bar_column) = 0;
 
   /// Puts a text on the clipboard.
   virtual void copy(TextView text) = 0;

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "automation/control.hpp"
-#include "preview/font_metrics.hpp"
-#include "preview/page_model.hpp"
+#include "documents/font_metrics.hpp"
+#include "platform/page_model.hpp"
 
 namespace talutil {
 

@@ -1,4 +1,4 @@
-#include "preview/report_composer.hpp"
+#include "documents/report_composer.hpp"
 
 #include <algorithm>
 #include <cmath>

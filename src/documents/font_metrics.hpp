@@ -5,7 +5,7 @@
 #include <unordered_map>
 
 #include "platform/font_files.hpp"
-#include "preview/page_model.hpp"
+#include "platform/page_model.hpp"
 
 namespace talutil {
 
@@ -35,22 +35,6 @@ class FontMetrics {
   std::array<std::array<std::uint16_t, 256>, 6> widths_{};  ///< By code of the code page, for family and weight.
   std::unordered_map<char16_t, std::int32_t> wide_widths_[2];
 };
-
-/// Twips of a width in thousandths of a font's size.
-[[nodiscard]] constexpr double to_twips(double thousandths, const FontStyle& font) noexcept {
-  constexpr double twips_per_point = 20;
-  return thousandths * font.points * twips_per_point / 1000;
-}
-
-/// From a line's top to the next one's.
-[[nodiscard]] constexpr std::int32_t line_height(const FontStyle& font) noexcept {
-  return static_cast<std::int32_t>(to_twips(1200, font));
-}
-
-/// From a line's top to the foot of its letters.
-[[nodiscard]] constexpr std::int32_t baseline(const FontStyle& font) noexcept {
-  return static_cast<std::int32_t>(to_twips(900, font));
-}
 
 /// The family that stands for a font's name: Courier for fixed widths, Times for those with serifs, else Helvetica.
 [[nodiscard]] FontFamily family_of(TextView font_name);

@@ -1,10 +1,10 @@
-#include "preview/pdf_writer.hpp"
+#include "documents/pdf_writer.hpp"
 
 #include <array>
 
 #include "automation/run_time_error.hpp"
-#include "preview/font_metrics.hpp"
-#include "preview/pdf_fonts.hpp"
+#include "documents/font_metrics.hpp"
+#include "documents/pdf_fonts.hpp"
 
 namespace talutil {
 

@@ -1,12 +1,11 @@
-#include "preview/print_control.hpp"
+#include "controls/print_control.hpp"
 
 #include <algorithm>
 #include <cmath>
 
 #include "automation/checked.hpp"
 #include "automation/control.hpp"
-#include "controls/common_dialog.hpp"
-#include "preview/pdf_writer.hpp"
+#include "documents/pdf_writer.hpp"
 
 namespace talutil {
 
@@ -51,6 +50,17 @@ std::int32_t PrintControl::PageCount() const noexcept { return static_cast<std::
 
 void PrintControl::put_CurrentPage(std::int32_t page) {
   current_page_ = std::clamp(page, std::min(1, PageCount()), PageCount());
+}
+
+const Page* PrintControl::shown_page() const {
+  return current_page_ < 1 ? nullptr : &document_.pages[static_cast<std::size_t>(current_page_) - 1];
+}
+
+std::optional<Rectangle> PrintControl::guides() const {
+  const Page* const page = shown_page();
+  if (page == nullptr || !ShowGuides) return std::nullopt;
+  return Rectangle{MarginLeft, MarginTop, page->width - MarginLeft - MarginRight,
+                   page->height - MarginTop - MarginBottom};
 }
 
 FontStyle PrintControl::text_font() const {
@@ -130,7 +140,7 @@ void PrintControl::PrintDoc(Boolean dialog) {
   const PrintSettings settings{DocName.empty() ? document_.title : DocName, paper_size_, orientation_, duplex_,
                                bool(dialog)};
   if (!platform_.printers.print(document_, settings)) {
-    throw RunTimeError(CommonDialog::cancelled, Text(CommonDialog::cancelled_description));
+    raise(ErrorNumber::cancelled);
   }
 }
 

@@ -3,7 +3,7 @@
 #include <cmath>
 
 #include "automation/control.hpp"
-#include "preview/report_composer.hpp"
+#include "documents/report_composer.hpp"
 
 namespace talutil {
 

@@ -30,6 +30,22 @@ struct FontStyle {
   friend bool operator==(const FontStyle&, const FontStyle&) = default;
 };
 
+/// Twips of a width in thousandths of a font's size.
+[[nodiscard]] constexpr double to_twips(double thousandths, const FontStyle& font) noexcept {
+  constexpr double twips_per_point = 20;
+  return thousandths * font.points * twips_per_point / 1000;
+}
+
+/// From a line's top to the next one's.
+[[nodiscard]] constexpr std::int32_t line_height(const FontStyle& font) noexcept {
+  return static_cast<std::int32_t>(to_twips(1200, font));
+}
+
+/// From a line's top to the foot of its letters.
+[[nodiscard]] constexpr std::int32_t baseline(const FontStyle& font) noexcept {
+  return static_cast<std::int32_t>(to_twips(900, font));
+}
+
 /// Characters of one line that are drawn in one go.
 struct TextRun {
   std::int32_t left = 0;

@@ -2,7 +2,7 @@
 
 #include "platform/files.hpp"
 #include "platform/font_files.hpp"
-#include "preview/page_model.hpp"
+#include "platform/page_model.hpp"
 
 namespace talutil {
 

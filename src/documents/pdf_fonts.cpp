@@ -1,4 +1,4 @@
-#include "preview/pdf_fonts.hpp"
+#include "documents/pdf_fonts.hpp"
 
 #include "automation/run_time_error.hpp"
 

@@ -1,8 +1,8 @@
-#include "preview/font_metrics.hpp"
+#include "documents/font_metrics.hpp"
 
 #include <algorithm>
 
-#include "preview/pdf_fonts.hpp"
+#include "documents/pdf_fonts.hpp"
 
 namespace talutil {
 

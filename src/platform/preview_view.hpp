@@ -1,13 +1,12 @@
 #pragma once
 
 #include <cstdint>
-#include <memory>
+#include <optional>
 
 #include "automation/text.hpp"
+#include "platform/page_model.hpp"
 
 namespace talutil {
-
-class PrintControl;
 
 /// The entries of the preview window's menus, by name; those with entries below them only open these.
 enum class PreviewMenu : std::uint8_t {
@@ -67,6 +66,21 @@ inline constexpr PreviewMenuItem preview_menu[] = {
     {u"Vertcial", PreviewMenu::mnuVertical, 2},
     {u"Horizontal", PreviewMenu::mnuHorizontal, 2},
     {u"Simplex", PreviewMenu::mnuSimplex, 2},
+};
+
+/// The document that a preview window shows.
+class PreviewPages {
+ public:
+  virtual ~PreviewPages() = default;
+
+  /// The page that is shown; null for none.
+  [[nodiscard]] virtual const Page* shown_page() const = 0;
+
+  /// How large it is shown, percent.
+  [[nodiscard]] virtual float zoom_percent() const = 0;
+
+  /// The room between the margins of the page, where it is to be seen.
+  [[nodiscard]] virtual std::optional<Rectangle> guides() const = 0;
 };
 
 /// What a preview window reports to its presenter. None of these throws.

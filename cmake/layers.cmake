@@ -1,0 +1,46 @@
+# The layers of the code. Each is a folder of src with a target of its own, which sees the headers of the layers below it
+# and no others: an include root holds one folder alone, so that an include against the arrows does not compile.
+#
+#   talutil_layer(NAME [FOLDER folder] BELOW layer... [LIBRARIES library...])
+#
+# The folder has the layer's name unless it says otherwise; libraries are seen by this layer alone.
+function(talutil_layer name)
+  cmake_parse_arguments(PARSE_ARGV 1 layer "" "FOLDER" "BELOW;LIBRARIES")
+  if(NOT layer_FOLDER)
+    set(layer_FOLDER ${name})
+  endif()
+  file(GLOB headers CONFIGURE_DEPENDS src/${layer_FOLDER}/*.hpp)
+  file(GLOB sources CONFIGURE_DEPENDS src/${layer_FOLDER}/*.cpp)
+  set(root ${CMAKE_BINARY_DIR}/layers/${name})
+  file(REMOVE_RECURSE ${root})
+  file(MAKE_DIRECTORY ${root}/${layer_FOLDER})
+  foreach(header ${headers})
+    get_filename_component(file ${header} NAME)
+    file(CREATE_LINK ${header} ${root}/${layer_FOLDER}/${file} SYMBOLIC)
+  endforeach()
+  add_library(layer_${name} OBJECT ${sources})
+  target_include_directories(layer_${name} PUBLIC ${root})
+  list(TRANSFORM layer_BELOW PREPEND layer_)
+  target_link_libraries(layer_${name} PUBLIC talutil_options ${layer_BELOW} PRIVATE ${layer_LIBRARIES})
+endfunction()
+
+# From the bottom to the top: values, the seam to the platform, what stands on it, and the families of members.
+# Where a layer stands on two, neither of these knows the other.
+talutil_layer(automation)
+talutil_layer(platform BELOW automation)
+talutil_layer(documents BELOW platform LIBRARIES documents::pdf)
+talutil_layer(archives BELOW platform LIBRARIES archives::zip archives::deflate)
+talutil_layer(controls BELOW documents archives)
+talutil_layer(library BELOW controls)
+set(families text dates services forms preview)
+foreach(family ${families})
+  talutil_layer(${family} BELOW library)
+endforeach()
+talutil_layer(infoforms BELOW forms)
+talutil_layer(startup BELOW ${families} infoforms)
+
+add_library(talutil_core STATIC)
+target_link_libraries(talutil_core
+  PUBLIC layer_automation layer_platform layer_documents layer_archives layer_controls layer_library layer_text
+         layer_dates layer_services layer_forms layer_preview layer_infoforms layer_startup
+  PRIVATE archives::zip archives::deflate documents::pdf)

@@ -1,0 +1,114 @@
+#include "platform/win32/form_layout.hpp"
+
+#include <algorithm>
+
+namespace talutil::win32 {
+
+namespace {
+
+/// What the task bar leaves of the first screen.
+RECT work_area() {
+  RECT work{};
+  SystemParametersInfoW(SPI_GETWORKAREA, 0, &work, 0);
+  return work;
+}
+
+/// Puts a part where it belongs in a window that has grown by so much.
+void move(const PlacedPart& placed, int across, int down) {
+  RECT place = placed.place;
+  const std::uint8_t follows = placed.part->follows;
+  if ((follows & part_follows::right) != 0) OffsetRect(&place, across, 0);
+  if ((follows & part_follows::bottom) != 0) OffsetRect(&place, 0, down);
+  if ((follows & part_follows::width) != 0) place.right += across;
+  if ((follows & part_follows::height) != 0) place.bottom += down;
+  SetWindowPos(placed.window, nullptr, static_cast<int>(place.left), static_cast<int>(place.top),
+               static_cast<int>(place.right - place.left), static_cast<int>(place.bottom - place.top),
+               SWP_NOZORDER | SWP_NOACTIVATE);
+}
+
+}  // namespace
+
+FormLayout::FormLayout(HWND window, FormParts& parts, const FormDescription& description, DWORD style)
+    : window_(window),
+      parts_(parts),
+      description_(description),
+      style_(style),
+      inner_{parts.font().across(description.width), parts.font().down(description.height)} {
+  size_to_inside();
+  const SIZE size = outer_size();
+  if (description.is_resizable) smallest_ = {size.cx / 2, size.cy / 2};
+}
+
+void FormLayout::fit() {
+  const SystemFont& font = parts_.font();
+  const RECT work = work_area();
+  const int most_height = static_cast<int>(work.bottom - work.top) * 2 / 3;
+  int shift = 0;
+  int bottom_before = 0;
+  for (PlacedPart& placed : parts_) {
+    const FormPart& part = *placed.part;
+    const int top = font.down(part.place.top);
+    const int height = font.down(part.place.height);
+    if (!placed.is_visible) {
+      shift -= height + top - bottom_before;
+    } else {
+      placed.place.top = top + shift;
+      placed.place.bottom = top + shift + height;
+      if (part.is_growing) {
+        const int needed = font.height_of(parts_.text(part.id), font.across(part.place.width));
+        if (needed > most_height) parts_.make_scrollable(placed);
+        placed.place.bottom = placed.place.top + std::clamp(needed, height, most_height);
+        shift += static_cast<int>(placed.place.bottom - placed.place.top) - height;
+      }
+      move(placed, 0, 0);
+    }
+    bottom_before = top + height;
+  }
+  inner_.cy = font.down(description_.height) + shift;
+  size_to_inside();
+}
+
+void FormLayout::follow() const {
+  if (!description_.is_resizable || IsIconic(window_) != FALSE) return;
+  RECT inside{};
+  GetClientRect(window_, &inside);
+  for (const PlacedPart& placed : parts_) {
+    move(placed, static_cast<int>(inside.right - inner_.cx), static_cast<int>(inside.bottom - inner_.cy));
+  }
+}
+
+void FormLayout::centre() const {
+  const RECT work = work_area();
+  SIZE size = outer_size();
+  // One that can be resized need not be larger than the screen.
+  if (description_.is_resizable) {
+    size = {std::min(size.cx, work.right - work.left), std::min(size.cy, work.bottom - work.top)};
+  }
+  const auto middle = [](LONG start, LONG end, LONG length) {
+    return static_cast<int>(std::max(start, start + (end - start - length) / 2));
+  };
+  SetWindowPos(window_, nullptr, middle(work.left, work.right, size.cx), middle(work.top, work.bottom, size.cy),
+               static_cast<int>(size.cx), static_cast<int>(size.cy), SWP_NOZORDER | SWP_NOACTIVATE);
+}
+
+void FormLayout::set_style(DWORD style) {
+  style_ = style;
+  SetWindowLongPtrW(window_, GWL_STYLE, static_cast<LONG>(style | WS_CLIPCHILDREN));
+  size_to_inside();
+}
+
+void FormLayout::size_to_inside() const {
+  RECT outer{0, 0, inner_.cx, inner_.cy};
+  AdjustWindowRectEx(&outer, style_, FALSE, WS_EX_CONTROLPARENT);
+  SetWindowPos(window_, nullptr, 0, 0, static_cast<int>(outer.right - outer.left),
+               static_cast<int>(outer.bottom - outer.top),
+               SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE | SWP_FRAMECHANGED);
+}
+
+SIZE FormLayout::outer_size() const {
+  RECT outer{};
+  GetWindowRect(window_, &outer);
+  return {outer.right - outer.left, outer.bottom - outer.top};
+}
+
+}  // namespace talutil::win32

@@ -1,0 +1,67 @@
+#pragma once
+
+#include <optional>
+#include <vector>
+
+#include "platform/form_view.hpp"
+#include "platform/win32/handle.hpp"
+#include "platform/win32/list_view.hpp"
+#include "platform/win32/system_font.hpp"
+
+namespace talutil::win32 {
+
+/// A part of a form and the control of the system that it is made of.
+struct PlacedPart {
+  const FormPart* part;
+  HWND window;
+  RECT place;  ///< In a window of its first size.
+  bool is_visible = true;
+  std::optional<ListView> table;  ///< Of a part that is one.
+
+  [[nodiscard]] bool is(PartKind kind) const noexcept { return part->kind == kind; }
+};
+
+/// The parts of a window in their order, made of the system's controls in the system's font.
+class FormParts {
+ public:
+  /// Makes them. Raises 51 where the system refuses one.
+  FormParts(HWND window, std::span<const FormPart> parts);
+
+  [[nodiscard]] auto begin() noexcept { return parts_.begin(); }
+  [[nodiscard]] auto end() noexcept { return parts_.end(); }
+
+  /// A part by its number. Raises 51 for a number that no part has.
+  [[nodiscard]] const PlacedPart& of(std::uint8_t id) const;
+  [[nodiscard]] PlacedPart& of(std::uint8_t id);
+
+  /// The part of a control; null for windows that are none.
+  [[nodiscard]] PlacedPart* find(HWND control) noexcept;
+
+  /// The part of a command that the system reports; null for others.
+  [[nodiscard]] const PlacedPart* find_command(WORD command) noexcept;
+
+  /// The button that Enter presses; null where there is none to be seen.
+  [[nodiscard]] const PlacedPart* default_button() noexcept;
+  [[nodiscard]] static WORD command_of(const PlacedPart& part) noexcept;
+
+  [[nodiscard]] const SystemFont& font() const noexcept { return font_; }
+
+  void set_text(std::uint8_t id, TextView text);
+  [[nodiscard]] Text text(std::uint8_t id) const;
+
+  /// A label that is higher than the screen becomes a text that can be scrolled.
+  void make_scrollable(PlacedPart& part);
+
+ private:
+  [[nodiscard]] HWND make(const FormPart& part, const wchar_t* class_name, DWORD style, DWORD extended_style,
+                          const RECT& place) const;
+  void add(const FormPart& part);
+  void add_tip(HWND control, TextView tip);
+
+  HWND window_;
+  SystemFont font_;
+  std::vector<PlacedPart> parts_;
+  std::vector<Owned<kind::Window>> tips_;
+};
+
+}  // namespace talutil::win32
