@@ -167,9 +167,9 @@ class DispatchUse final : public RepeatedUse {
 };
 
 /// The host's object.
-class DispatchObject final : public Object {
+class HostObject final : public Object {
  public:
-  explicit DispatchObject(Pointer<IDispatch> dispatch) noexcept : dispatch_(std::move(dispatch)) {}
+  explicit HostObject(Pointer<IDispatch> dispatch) noexcept : dispatch_(std::move(dispatch)) {}
 
   std::int32_t member_id(TextView name) override {
     DISPID id = DISPID_UNKNOWN;
@@ -215,11 +215,11 @@ class UndrivenObject final : public Object {
 };
 
 /// One of our objects, for a host.
-class ObjectDispatch final : public IDispatch {
+class OwnDispatch final : public IDispatch {
  public:
-  explicit ObjectDispatch(ObjectRef object) noexcept : object_(std::move(object)) {}
-  ObjectDispatch(const ObjectDispatch&) = delete;
-  ObjectDispatch& operator=(const ObjectDispatch&) = delete;
+  explicit OwnDispatch(ObjectRef object) noexcept : object_(std::move(object)) {}
+  OwnDispatch(const OwnDispatch&) = delete;
+  OwnDispatch& operator=(const OwnDispatch&) = delete;
 
   HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override {
     if (out == nullptr) return E_POINTER;
@@ -263,7 +263,7 @@ class ObjectDispatch final : public IDispatch {
                                    EXCEPINFO* exception, UINT*) override {
     if (parameters == nullptr || (parameters->cArgs != 0 && parameters->rgvarg == nullptr)) return E_POINTER;
     // A host may let go of the control while it handles one of its events.
-    const auto keeper = Pointer<ObjectDispatch>::shared(this);
+    const auto keeper = Pointer<OwnDispatch>::shared(this);
     const FloatingPointSettings settings;
     try {
       std::vector<Variant> arguments;
@@ -285,7 +285,7 @@ class ObjectDispatch final : public IDispatch {
   [[nodiscard]] const ObjectRef& object() const noexcept { return object_; }
 
  private:
-  ~ObjectDispatch() = default;
+  ~OwnDispatch() = default;
 
   ObjectRef object_;
   std::atomic<ULONG> references_ = 1;
@@ -297,18 +297,18 @@ ObjectRef object_from(IUnknown* object) {
   if (object == nullptr) return {};
   Pointer<IDispatch> dispatch;
   if (SUCCEEDED(object->QueryInterface(IID_IDispatch, dispatch.receive_untyped()))) {
-    return std::make_shared<DispatchObject>(std::move(dispatch));
+    return std::make_shared<HostObject>(std::move(dispatch));
   }
   return std::make_shared<UndrivenObject>();
 }
 
 IDispatch* dispatch_from(const ObjectRef& object) {
   if (object == nullptr) return nullptr;
-  if (const auto* const theirs = dynamic_cast<DispatchObject*>(object.get())) {
+  if (const auto* const theirs = dynamic_cast<HostObject*>(object.get())) {
     return Pointer<IDispatch>(theirs->dispatch()).release();
   }
   if (dynamic_cast<UndrivenObject*>(object.get()) != nullptr) raise(ErrorNumber::type_mismatch);
-  return new ObjectDispatch(object);
+  return new OwnDispatch(object);
 }
 
 }  // namespace talutil::com

@@ -16,9 +16,9 @@ namespace talutil {
 
 namespace {
 
-template <class Made>
+template <class OwnControl>
 ObjectRef make(const Platform& platform) {
-  return std::make_shared<Made>(platform);
+  return std::make_shared<OwnControl>(platform);
 }
 
 constexpr struct {

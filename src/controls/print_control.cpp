@@ -56,11 +56,11 @@ const Page* PrintControl::shown_page() const {
   return current_page_ < 1 ? nullptr : &document_.pages[static_cast<std::size_t>(current_page_) - 1];
 }
 
-std::optional<Rectangle> PrintControl::guides() const {
+std::optional<TwipsRectangle> PrintControl::guides() const {
   const Page* const page = shown_page();
   if (page == nullptr || !ShowGuides) return std::nullopt;
-  return Rectangle{MarginLeft, MarginTop, page->width - MarginLeft - MarginRight,
-                   page->height - MarginTop - MarginBottom};
+  return TwipsRectangle{MarginLeft, MarginTop, page->width - MarginLeft - MarginRight,
+                        page->height - MarginTop - MarginBottom};
 }
 
 FontStyle PrintControl::text_font() const {

@@ -91,7 +91,7 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
 
   [[nodiscard]] const Page* shown_page() const override;
   [[nodiscard]] float zoom_percent() const override { return zoom_; }
-  [[nodiscard]] std::optional<Rectangle> guides() const override;
+  [[nodiscard]] std::optional<TwipsRectangle> guides() const override;
 
  private:
   [[nodiscard]] ReportComposer& composer();

@@ -113,13 +113,13 @@ ReportComposer::GridLayout::GridLayout(const Control& grid, const FontStyle& usu
 }
 
 void ReportComposer::add_cell(const GridLayout& layout, std::size_t row, std::size_t column_index,
-                              const Rectangle& place) {
+                              const TwipsRectangle& place) {
   const GridLayout::Column& column = layout.columns[column_index];
   const GridLayout::Cell& cell = layout.cell(row, column_index);
   const bool is_heading = row < layout.heading_rows;
   if (column.is_boolean && !is_heading) {
     const std::int32_t size = line_height(layout.font) * 3 / 5;
-    const Rectangle box{place.left + (place.width - size) / 2, place.top + (place.height - size) / 2, size, size};
+    const TwipsRectangle box{place.left + (place.width - size) / 2, place.top + (place.height - size) / 2, size, size};
     page().items.emplace_back(Box{.place = box, .fill = {}, .line_width = hair_line, .line_colour = 0});
     if (cell.is_ticked) {
       const std::int32_t inset = size / 4;
@@ -156,7 +156,7 @@ void ReportComposer::add_row(const GridLayout& layout, std::size_t row, std::int
   const bool is_heading = row < layout.heading_rows;
   std::int32_t left = setup_.margin_left;
   for (std::size_t c = first; c < end; ++c) {
-    const Rectangle place{left, y_, layout.columns[c].width, height};
+    const TwipsRectangle place{left, y_, layout.columns[c].width, height};
     if (is_heading || layout.has_lines) {
       page().items.emplace_back(Box{.place = place,
                                     .fill = is_heading ? std::optional(layout.heading_colour) : std::nullopt,

@@ -59,7 +59,7 @@ class PageWriter {
   }
 
   void draw(const Box& box) {
-    const Rectangle& place = box.place;
+    const TwipsRectangle& place = box.place;
     if (is_outside(place.left, place.top)) return;
     const auto outline = [&] {
       HPDF_Page_Rectangle(target_, points(place.left), y_of(place.top + place.height), points(place.width),
@@ -86,7 +86,7 @@ class PageWriter {
         HPDF_LoadRawImageFromMem(pdf_.get(), picture.pixels->data(), static_cast<HPDF_UINT>(picture.width),
                                  static_cast<HPDF_UINT>(picture.height), HPDF_CS_DEVICE_RGB, 8);
     if (image == nullptr) return pdf_.check();
-    const Rectangle& place = picture.place;
+    const TwipsRectangle& place = picture.place;
     HPDF_Page_DrawImage(target_, image, points(place.left), y_of(place.top + place.height), points(place.width),
                         points(place.height));
   }

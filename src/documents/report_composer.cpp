@@ -175,7 +175,7 @@ TextView ReportComposer::take_line(TextView& text, double room, const FontStyle&
   return line.substr(0, shown);
 }
 
-void ReportComposer::add_text_box(TextView text, const Rectangle& place, const FontStyle& font) {
+void ReportComposer::add_text_box(TextView text, const TwipsRectangle& place, const FontStyle& font) {
   const std::int32_t height = line_height(font);
   const Text shown = with_visible_controls(text);
   TextView rest = shown;

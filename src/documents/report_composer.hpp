@@ -43,7 +43,7 @@ class ReportComposer {
   void add_text(TextView text, const FontStyle& font);
 
   /// A text in a box, cut off at its edges, wherever the box lies: no page is begun for it.
-  void add_text_box(TextView text, const Rectangle& place, const FontStyle& font);
+  void add_text_box(TextView text, const TwipsRectangle& place, const FontStyle& font);
 
   /// A grid as it looks: the rows and columns that it shows, widths, heights, alignments, fonts and colours where it
   /// answers for them; long texts in more lines where it wraps them, else cut off. Its fixed rows stand on top of every
@@ -69,7 +69,7 @@ class ReportComposer {
   [[nodiscard]] double after_tab(double x, const FontStyle& font);
   [[nodiscard]] TextView fitting(TextView text, double room, const FontStyle& font);
   [[nodiscard]] TextView take_line(TextView& text, double room, const FontStyle& font);
-  void add_cell(const GridLayout& layout, std::size_t row, std::size_t column, const Rectangle& place);
+  void add_cell(const GridLayout& layout, std::size_t row, std::size_t column, const TwipsRectangle& place);
   [[nodiscard]] std::vector<std::int32_t> row_heights(const GridLayout& layout);
   void add_row(const GridLayout& layout, std::size_t row, std::int32_t height, std::size_t first, std::size_t end);
 

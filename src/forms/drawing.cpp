@@ -9,12 +9,13 @@ namespace talutil {
 namespace {
 
 /// Puts a property of a picture box back at the end of a drawing, however that ends.
-class Restored {
+class RestoredProperty {
  public:
-  Restored(const Control& box, TextView property) : box_(box), property_(property), before_(box.get(property)) {}
-  Restored(const Restored&) = delete;
-  Restored& operator=(const Restored&) = delete;
-  ~Restored() {
+  RestoredProperty(const Control& box, TextView property)
+      : box_(box), property_(property), before_(box.get(property)) {}
+  RestoredProperty(const RestoredProperty&) = delete;
+  RestoredProperty& operator=(const RestoredProperty&) = delete;
+  ~RestoredProperty() {
     try {
       box_.put(property_, before_);
     } catch (...) {
@@ -65,8 +66,8 @@ void ORVUtils::MyDrawText(const std::int16_t& iDestX1, const std::int16_t& iDest
   const Text text = sText.to_text(locale());
   if (text.empty()) return;
   const Control box(settings().DrawTextPictureBox, locale());
-  const Restored bold(box, u"FontBold");
-  const Restored colour(box, u"ForeColor");
+  const RestoredProperty bold(box, u"FontBold");
+  const RestoredProperty colour(box, u"ForeColor");
   box.put(u"FontBold", bBold);
   box.put(u"ForeColor", lColor);
 

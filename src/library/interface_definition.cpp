@@ -99,7 +99,7 @@ void write_member(std::string& out, const Member& member, Dialect dialect) {
   out += ");\n";
 }
 
-struct Class {
+struct DescribedClass {
   std::string_view name;
   std::string_view help;
   std::string_view class_identifier;
@@ -107,7 +107,7 @@ struct Class {
   std::span<const Member> members;
 };
 
-void write_class(std::string& out, const Class& described_class, Dialect dialect) {
+void write_class(std::string& out, const DescribedClass& described_class, Dialect dialect) {
   out += "\n  [odl, uuid(";
   out += described_class.interface_identifier;
   out += "), dual, oleautomation, hidden, nonextensible]\n  interface _";

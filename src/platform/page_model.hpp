@@ -13,12 +13,12 @@
 /// 0x00BBGGRR.
 namespace talutil {
 
-struct Rectangle {
+struct TwipsRectangle {
   std::int32_t left = 0;
   std::int32_t top = 0;
   std::int32_t width = 0;
   std::int32_t height = 0;
-  friend bool operator==(const Rectangle&, const Rectangle&) = default;
+  friend bool operator==(const TwipsRectangle&, const TwipsRectangle&) = default;
 };
 
 enum class FontFamily : std::uint8_t { courier, helvetica, times };
@@ -59,14 +59,14 @@ struct TextRun {
 
 /// A filled area, a frame, or both; without height or width a rule.
 struct Box {
-  Rectangle place;
+  TwipsRectangle place;
   std::optional<std::uint32_t> fill;
   std::int32_t line_width = 0;  ///< 0 for no frame.
   std::uint32_t line_colour = 0;
 };
 
 struct Picture {
-  Rectangle place;
+  TwipsRectangle place;
   std::int32_t width = 0;  ///< In pixels, as the height.
   std::int32_t height = 0;
   std::shared_ptr<const std::vector<std::uint8_t>> pixels;  ///< Red, green, blue, row by row from the top.

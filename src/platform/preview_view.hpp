@@ -80,7 +80,7 @@ class PreviewPages {
   [[nodiscard]] virtual float zoom_percent() const = 0;
 
   /// The room between the margins of the page, where it is to be seen.
-  [[nodiscard]] virtual std::optional<Rectangle> guides() const = 0;
+  [[nodiscard]] virtual std::optional<TwipsRectangle> guides() const = 0;
 };
 
 /// What a preview window reports to its presenter. None of these throws.

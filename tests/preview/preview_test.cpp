@@ -361,7 +361,7 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   EXPECT_THAT(platform.drawn, ElementsAre("image of 42"));
   const auto* const picture = std::get_if<Picture>(&print->document().pages[0].items[0]);
   ASSERT_NE(picture, nullptr);
-  EXPECT_EQ(picture->place, (Rectangle{1134, 1134, 30, 15}));
+  EXPECT_EQ(picture->place, (TwipsRectangle{1134, 1134, 30, 15}));
 }
 
 }  // namespace

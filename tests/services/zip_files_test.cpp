@@ -2,9 +2,9 @@
 
 #include "automation/control.hpp"
 #include "controls/zip_controls.hpp"
-#include "services/mod_zip_files.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
+#include "services/mod_zip_files.hpp"
 #include "tests/archives/tree.hpp"
 #include "tests/fakes/fake_platform.hpp"
 

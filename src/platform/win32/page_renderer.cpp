@@ -117,12 +117,12 @@ class Drawer {
  private:
   [[nodiscard]] int x_of(std::int32_t twips) const { return placement_.left + rounded(twips * placement_.scale_x); }
   [[nodiscard]] int y_of(std::int32_t twips) const { return placement_.top + rounded(twips * placement_.scale_y); }
-  [[nodiscard]] RECT rectangle_of(const Rectangle& place) const {
+  [[nodiscard]] RECT rectangle_of(const TwipsRectangle& place) const {
     return {x_of(place.left), y_of(place.top), x_of(place.left + place.width), y_of(place.top + place.height)};
   }
 
   /// Whether a place lies where nothing is drawn. Letters and lines may reach a little beyond theirs.
-  [[nodiscard]] bool is_unseen(const Rectangle& place) const {
+  [[nodiscard]] bool is_unseen(const TwipsRectangle& place) const {
     if (!has_edges_) return false;
     constexpr LONG beyond = 8;
     const RECT here = rectangle_of(place);
