@@ -48,6 +48,9 @@ fetch() {
   tar -xf "$work/$file" -C "$work/$1" --strip-components=1
 }
 
+# What a licence asks to be handed on with the library.
+keep_licence() { cp "$work/$1/$2" "$made/licences/$1"; }
+
 apply() { patch --quiet --directory "$work/$1" --strip=1 --input "$talutil_top/cmake/patches/$2" >&2; }
 
 build_libzip() {
@@ -98,7 +101,7 @@ if [ -z "$is_asked_only" ] && [ ! -d "$prefix" ]; then
   } >&2
   work=$(mktemp -d)
   made=$work/made
-  mkdir -p "$made/lib" "$made/include" "$work/lists/partial" "$(dirname "$prefix")"
+  mkdir -p "$made/lib" "$made/include" "$made/licences" "$work/lists/partial" "$(dirname "$prefix")"
   echo "deb-src [signed-by=/usr/share/keyrings/debian-archive-keyring.gpg] $(debian_mirror $suite) $suite main" \
     >"$work/sources"
   options=(-qq -o "Dir::Etc::sourcelist=$work/sources" -o Dir::Etc::sourceparts=/dev/null
@@ -106,9 +109,13 @@ if [ -z "$is_asked_only" ] && [ ! -d "$prefix" ]; then
     -o APT::Sandbox::User=root)
   apt-get "${options[@]}" update >&2
   for package in libzip libdeflate libharu; do
-    fetch $package
+    fetch "$package"
     "build_$package" >"$work/$package.log" 2>&1 || { tail -30 "$work/$package.log" >&2; fail "could not build $package"; }
   done
+  keep_licence libzip LICENSE
+  keep_licence libdeflate COPYING
+  # It has no file of its own for it.
+  sed -n '/^The license of Haru/,/^[*]/p' "$work/libharu/README" | sed '$d' >"$made/licences/libharu"
   # Another run may have finished first; both made the same thing.
   mv -T "$made" "$prefix" 2>/dev/null || [ -d "$prefix" ] || fail "could not put the libraries into $prefix"
 fi
