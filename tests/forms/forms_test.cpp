@@ -339,14 +339,14 @@ TEST_F(MovableControl, DistancesAreScaled) {
   const auto container = std::make_shared<RecordingControl>();
   control->values["ScaleMode"] = std::int16_t{3};
   control->values["ScaleX(50!, 3%, 1%)"] = 750.0F;
-  control->values["ScaleY(0!, 3%, 1%)"] = 0.0F;
+  control->values["ScaleY(10!, 3%, 1%)"] = 150.0F;
   control->values["Container"] = ObjectRef(container);
-  EXPECT_EQ(drag(60, 20), (Uses{"ScaleMode", "ScaleX(50!, 3%, 1%)", "ScaleY(0!, 3%, 1%)", "Container", "left", "Top",
-                                "Width", "Height", "call Move(700!, 100!)", "left", "Top"}));
+  EXPECT_EQ(drag(60, 30), (Uses{"ScaleMode", "ScaleX(50!, 3%, 1%)", "ScaleY(10!, 3%, 1%)", "Container", "left", "Top",
+                                "Width", "Height", "call Move(700!, 250!)", "left", "Top"}));
   // A container with a scale starts again from the mouse's own distances.
-  container->values = {{"ScaleMode", std::int16_t{7}}, {"ScaleX(50!, 1%, 7%)", 2.5F}, {"ScaleY(0!, 1%, 7%)", 0.0F}};
-  EXPECT_EQ(drag(60, 20).at(8), "call Move(102.5!, 100!)");
-  EXPECT_EQ(container->uses, (Uses{"ScaleMode", "ScaleX(50!, 1%, 7%)", "ScaleY(0!, 1%, 7%)"}));
+  container->values = {{"ScaleMode", std::int16_t{7}}, {"ScaleX(50!, 1%, 7%)", 2.5F}, {"ScaleY(10!, 1%, 7%)", 4.5F}};
+  EXPECT_EQ(drag(60, 30).at(8), "call Move(102.5!, 104.5!)");
+  EXPECT_EQ(container->uses, (Uses{"ScaleMode", "ScaleX(50!, 1%, 7%)", "ScaleY(10!, 1%, 7%)"}));
   control->values.erase("Container");
   EXPECT_NE(error_of([&] { drag(60, 20); }), 0);
   EXPECT_EQ(error_of([&] { position.DragControl(Null{}, holder, 1, 1); }), 424);

@@ -1,5 +1,7 @@
 #include <gmock/gmock.h>
 
+#include <random>
+
 #include "controls/grid.hpp"
 #include "controls/print_control.hpp"
 #include "preview/frm_print_preview.hpp"
@@ -148,6 +150,17 @@ TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
   auto& view = platform.preview;
   FrmPrintPreview& form = library.part<FrmPrintPreview>();
   view.width = 100;
+  view.height = 1000;
+  platform.twips_y = 12;
+  const auto all_keys_pass = [&] {
+    for (std::int32_t code = 0; code < 256; ++code) {
+      if (form.key_down(code) != code) return false;
+    }
+    return true;
+  };
+  EXPECT_TRUE(all_keys_pass()) << "not loaded";
+  static_cast<void>(form.print_control());
+  EXPECT_TRUE(all_keys_pass()) << "not shown";
   view.user = [&](PreviewEvents& events) {
     EXPECT_EQ(view.captions.back(), u"Notes           Page 1 of 4      Press F9 to Print.");
     EXPECT_EQ(events.key_down(114), 115) << "passed on as F4";
@@ -178,7 +191,9 @@ TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
 
     events.resized();
     EXPECT_EQ(view.width, 9000) << "600 pixels at least";
+    EXPECT_EQ(view.height, 4800) << "400 pixels";
     EXPECT_EQ(view.pages_width, 9000 - 300 - 150);
+    EXPECT_EQ(view.pages_height, 4800 - 300 - 120);
     view.state = 1;
     events.resized();
     EXPECT_EQ(view.state, 0);
@@ -195,6 +210,7 @@ TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
   };
   utils.TextBoxPrintPreview(100, 1, u"Notes", u"C:\\exports\\", ObjectRef(source));
   EXPECT_FALSE(form.is_loaded());
+  EXPECT_TRUE(all_keys_pass()) << "closed";
   EXPECT_EQ(view.windows, 0);
   EXPECT_EQ(utils.GetCfgFileData(u"PrintPreview", u"WindowWidth", u"", u"", Boolean(false)), u"12000");
 }
@@ -257,6 +273,80 @@ TEST_F(Pages, TextFlowsAndBreaks) {
   EXPECT_EQ(error_of([&] { print->put_PaperSize(999); }), 5);
   print->put_Zoom(-3);
   EXPECT_EQ(print->Zoom(), 10);
+}
+
+TEST_F(Pages, WordsBreakWhereANaiveBreakerBreaksThem) {
+  std::mt19937 random(7);
+  const auto from_to = [&](int least, int most) { return std::uniform_int_distribution<int>(least, most)(random); };
+  for (int run = 0; run < 200; ++run) {
+    const auto room = static_cast<std::size_t>(from_to(10, 30));
+    // Letters of Courier in 10 points are 120 twips wide.
+    print->MarginRight = print->PageWidth() - print->MarginLeft - static_cast<std::int32_t>(room) * 120;
+    Text text;
+    std::vector<Text> expected(1);
+    for (int words = from_to(5, 40); words > 0; --words) {
+      Text word(static_cast<std::size_t>(from_to(1, 12)), static_cast<char16_t>(u'a' + from_to(0, 25)));
+      text += (text.empty() ? u"" : u" ") + word;
+      if (!expected.back().empty() && expected.back().size() + 1 + word.size() > room) expected.emplace_back();
+      for (; word.size() > room; word.erase(0, room)) expected.insert(expected.end() - 1, word.substr(0, room));
+      expected.back() += (expected.back().empty() ? u"" : u" ") + word;
+    }
+    const Page& page = document_of(text).pages[0];
+    for (std::size_t line = 0; line < expected.size(); ++line) {
+      const auto* const shown = std::get_if<TextRun>(&page.items[line]);
+      ASSERT_NE(shown, nullptr);
+      EXPECT_EQ(to_utf8(trim_blanks(shown->text)), to_utf8(expected[line])) << to_utf8(text) << ", " << room;
+    }
+  }
+}
+
+TEST_F(Pages, RowsFillEveryPageToItsEnd) {
+  std::mt19937 random(7);
+  print->MarginBottom = print->PageHeight() - print->MarginTop - 14400;
+  for (int run = 0; run < 50; ++run) {
+    const auto grid = std::make_shared<Grid>(library.platform());
+    grid->put_Cols(1);
+    std::vector<std::string> expected(1);
+    std::int32_t used = 0;
+    for (std::int32_t row = 0; row < 60; ++row) {
+      const std::int32_t height = 240 * std::uniform_int_distribution<std::int32_t>(1, 10)(random);
+      grid->AddItem(u"r" + number_to_text(row), -1);
+      grid->put_RowHeight(row, height);
+      if (used + height > 14400) {
+        expected.emplace_back();
+        used = 0;
+      }
+      used += height;
+      expected.back() += "r" + std::to_string(row) + ' ';
+    }
+    print->StartDoc();
+    print->RenderObject = ObjectRef(grid);
+    print->put_RenderControl(1);
+    print->EndDoc();
+    std::vector<std::string> shown;
+    for (const Page& page : print->document().pages) {
+      shown.emplace_back();
+      for (const PageItem& item : page.items) {
+        const auto* const text = std::get_if<TextRun>(&item);
+        if (text != nullptr && text->left == 1134 + 60) shown.back() += to_utf8(text->text) + ' ';
+      }
+    }
+    EXPECT_EQ(shown, expected);
+  }
+}
+
+TEST_F(Pages, PositionsCountFromThePaperOrTheMargins) {
+  print->MarginLeft = 1000;
+  print->MarginTop = 2000;
+  print->MarginRight = 3000;
+  print->MarginBottom = 4000;
+  for (const bool from_paper : {true, false}) {
+    print->StartDoc();
+    print->PhysicalPage = Boolean(from_paper);
+    print->TextBox(u"x", 100, 200, 1300, 567);
+    print->EndDoc();
+    EXPECT_THAT(runs_of(print->document().pages[0]), ::testing::StartsWith(from_paper ? "100,200 x" : "1100,2200 x"));
+  }
 }
 
 TEST_F(Pages, ListsRunOffThePage) {

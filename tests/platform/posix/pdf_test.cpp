@@ -92,6 +92,17 @@ TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
   EXPECT_GT(compared, 18U);
 }
 
+TEST_F(PdfTest, BoxesHaveTheirColours) {
+  Document document;
+  Page& page = document.pages.emplace_back(Page{1440, 480, {}});
+  constexpr std::uint32_t colours[] = {0x000000FF, 0x0000FF00, 0x00FF0000};
+  for (std::int32_t i = 0; i < 3; ++i)
+    page.items.emplace_back(Box{.place = {480 * i, 0, 480, 480}, .fill = colours[i]});
+  write(document);
+  // One pixel a box: the three bytes of each, red first.
+  EXPECT_EQ(output_of("pdftoppm -r 3 " + path + " | tail -c 9 | od -An -tx1"), " ff 00 00 00 ff 00 00 00 ff\n");
+}
+
 TEST_F(PdfTest, AFailedExportLeavesTheOldFile) {
   std::FILE* const file = fopen(path.c_str(), "w");
   fputs("old", file);
