@@ -27,7 +27,7 @@ void Collection::add(const Text& item, bool recurse, bool keep_folders) {
   const Text path = without_separators_at_end(item);
   TextView pattern = last_part(path);
   const Text folder_path = path.substr(0, path.size() - pattern.size());
-  // "C:\", "." and ".." name a folder by no name of its own: what is in it is meant.
+  // "C:\", "." and ".." do not name a folder to pack; its contents are meant.
   const bool is_nameless = pattern.empty() || pattern == u"." || pattern == u"..";
   places_.push_back({0, is_nameless ? path : folder_path, true});
   const std::size_t place = places_.size() - 1;
@@ -47,7 +47,7 @@ void Collection::add(const Text& item, bool recurse, bool keep_folders) {
       opened_->list(found);
     }
   } catch (const RunTimeError& error) {
-    // What is not there matches nothing.
+    // A missing path simply matches nothing.
     if (!is_missing(error)) throw Error(Code::cannot_read, error.what());
     return;
   }
@@ -93,7 +93,7 @@ void Collection::drop_repeated() {
     const bool is_same = with_code(Code::cannot_read, [&] {
       if (first.name != item.name) return false;
       if (first.folder == item.folder) return true;
-      // One after the other: only the last folder stays open.
+      // Not in one expression: only the most recent folder stays open.
       const Text first_path = folder_of(first).path();
       return first_path == folder_of(item).path();
     });

@@ -9,17 +9,17 @@ namespace talutil::archives {
 
 /// A file or folder to be packed.
 struct Item {
-  std::size_t folder = 0;  ///< Where it lies: a place in Collection's folders.
-  Text name;               ///< In that folder.
-  std::string entry;       ///< Its name in the archive: UTF-8, parts joined by "/", a folder's with one at its end.
+  std::size_t folder = 0;  ///< The folder it is in: an index into Collection's places.
+  Text name;               ///< Its name in that folder.
+  std::string entry;       ///< Its name in the archive: UTF-8, "/" between the parts and at the end of a folder's name.
   FileFacts facts;
 };
 
-/// What the items of a list lead to. The folders are walked once and opened again when their files are packed, so
-/// that a deep or wide tree does not hold more than a few of them open.
+/// The files and folders that a list of items refers to. Folders are walked once and opened again when their files
+/// are packed, so that a deep or wide tree never keeps more than a few of them open.
 class Collection {
  public:
-  /// Where the archive itself lies: it is never packed into itself.
+  /// The archive being written, which is never packed into itself.
   struct Archive {
     Text folder;
     Text name;
@@ -27,22 +27,23 @@ class Collection {
 
   Collection(Folders& folders, Archive archive) : folders_(folders), archive_(std::move(archive)) {}
 
-  /// Adds what an item means: a file, a folder with its tree under the folder's own name, or by wildcards in its last
-  /// part several files, and folders with `recurse`, named relative to the folder before the wildcards. With
-  /// `keep_folders` false the names of all have their last part only, and folders are no entries.
+  /// Adds what an item refers to: a file; a folder with its tree, stored under the folder's own name; or, with
+  /// wildcards in its last part, the matching files (and folders if `recurse` is set), stored relative to the folder
+  /// before the wildcards. With `keep_folders` false, entries have no folder part in their names and folders get no
+  /// entries.
   void add(const Text& item, bool recurse, bool keep_folders);
 
   [[nodiscard]] const std::vector<Item>& items() const noexcept { return items_; }
 
-  /// Keeps one of each file that several items of the list led to. Fails with bad_parameters for two files that would
-  /// have one name in the archive: leaving one out would lose it.
+  /// Removes the duplicates of files that several items referred to. Fails with bad_parameters if two different files
+  /// would have the same name in the archive, since leaving one out would lose it.
   void drop_repeated();
 
-  /// The folder of an item. The last one stays open for the next call.
+  /// The folder that an item is in. It stays open until the next call.
   [[nodiscard]] Folder& folder_of(const Item& item);
 
  private:
-  /// A folder by its parent and its name there; one without a parent by its path.
+  /// A folder: its name and its parent, or its path if it has no parent.
   struct Place {
     std::size_t parent = 0;
     Text name;

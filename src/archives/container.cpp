@@ -56,7 +56,7 @@ Container::Container(StoredFile& archive, Fault& fault) : reading_(&archive), fa
 
 Container::Container(NewFile& archive, Fault& fault, Progress& progress)
     : reading_(archive.replaced()), writing_(&archive), fault_(fault), progress_(&progress) {
-  // An empty file has no directory, and is as good as none.
+  // An empty file has no directory; treat it like a missing one.
   if (reading_ != nullptr && reading_->size() == 0) reading_ = nullptr;
   open(ZIP_CREATE);
 }
@@ -128,7 +128,7 @@ zip_int64_t Container::read_or_write(void* data, zip_uint64_t length, zip_source
         writing_->write_at(write_place_, {static_cast<const char*>(data), static_cast<std::size_t>(length)});
       });
       write_place_ += length;
-      // Also while old entries are copied, which nothing else reports.
+      // Report progress here as well: nothing else does while old entries are copied.
       progress_->advance(0, {});
       return static_cast<zip_int64_t>(length);
     case ZIP_SOURCE_SEEK_WRITE:

@@ -8,17 +8,18 @@
 #include "archives/progress.hpp"
 #include "platform/folders.hpp"
 
-/// The container library over our files. Only the sources of this folder include this header: it brings the library's
-/// own names with it.
+/// The container library on top of the platform's files. Only source files of this folder include this header, because
+/// it brings the library's own names with it.
 namespace talutil::archives {
 
-/// What a callback of the container library has thrown. Exceptions do not pass through C.
+/// Keeps an exception that was thrown in a callback of the container library, since exceptions must not pass through C.
 class Fault {
  public:
-  /// `other` stands for what the library has no clear word for: damage while reading, our own fault while writing.
+  /// `other` is used for errors that the library does not report precisely: damage while reading, our own fault while
+  /// writing.
   explicit Fault(Code other) noexcept : other_(other) {}
 
-  /// Does something inside a callback; what it throws is kept and answered by the library's word for failure.
+  /// Runs the body of a callback; if it throws, keeps the exception and returns the library's failure value.
   template <class Work>
   [[nodiscard]] zip_int64_t keep(zip_error_t& error, Work&& work) noexcept {
     try {
@@ -30,7 +31,7 @@ class Fault {
     }
   }
 
-  /// Throws what was kept, or else what the library says.
+  /// Throws the kept exception or, if there is none, the library's error.
   [[noreturn]] void fail(zip_error_t* error) const;
   [[noreturn]] void fail(int library_code) const;
 
@@ -39,13 +40,13 @@ class Fault {
   std::exception_ptr reason_;
 };
 
-/// An archive open in the container library. The files, the fault and what else it is given must outlive it.
+/// An archive that is open in the container library. The files, the fault and the progress must outlive it.
 class Container {
  public:
-  /// For reading.
+  /// Opens an archive for reading.
   Container(StoredFile& archive, Fault& fault);
 
-  /// For changing: reads the file that the new one replaces, if there is one, and writes to the new one.
+  /// Opens an archive for changes: reads the file that is being replaced, if any, and writes the new one.
   Container(NewFile& archive, Fault& fault, Progress& progress);
 
   Container(const Container&) = delete;
@@ -53,10 +54,10 @@ class Container {
   ~Container();
 
   [[nodiscard]] zip_t* get() const noexcept { return archive_; }
-  /// Throws for the last failure of the library.
+  /// Throws the library's most recent error.
   [[noreturn]] void fail() const { fault_.fail(zip_get_error(archive_)); }
 
-  /// Writes what was added. Throws what the progress callback threw, and then nothing counts as written.
+  /// Writes what was added. If the progress callback throws, rethrows that, and nothing counts as written.
   void write();
 
  private:

@@ -8,8 +8,8 @@ namespace talutil::archives {
 
 namespace {
 
-/// Does something about an entry; a name that this platform's files cannot have gives the answer for refused ones, so
-/// that the entries after it are not lost with it.
+/// Runs the work on one entry. If the platform cannot have a file of that name, returns `refused`, so that the entries
+/// after it are not lost as well.
 template <class Answer, class Work>
 Answer unless_refused(Answer refused, Work&& work) {
   return with_code(Code::cannot_create, [&] {
@@ -22,7 +22,7 @@ Answer unless_refused(Answer refused, Work&& work) {
   });
 }
 
-/// A path by which places are found; no part has a separator in it.
+/// The key under which a folder is cached; no part contains a separator.
 Text key_of(std::span<const Text> parts) {
   Text key;
   for (const Text& part : parts) key += upper_case(part) + u"\\";
@@ -98,7 +98,7 @@ bool Destination::make_folder(const std::vector<Text>& parts, const FileFacts& f
 
 void Destination::finish_folders() {
   with_code(Code::cannot_create, [&] {
-    // Those within others come after them in an archive.
+    // In an archive, inner folders come after the outer ones.
     for (auto folder = finished_later_.rbegin(); folder != finished_later_.rend(); ++folder) {
       const auto& [parts, facts] = *folder;
       const Place* const above = place_of(std::span(parts).first(parts.size() - 1));

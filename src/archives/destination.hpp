@@ -8,32 +8,32 @@
 
 namespace talutil::archives {
 
-/// The folder that an archive is unpacked below. It knows what is in each folder that it was asked for, by names
-/// without regard to case, so that a name is looked for once however many entries there are.
+/// The folder that an archive is unpacked into. Caches the contents of each folder it has visited, ignoring case, so
+/// that each is listed only once, however many entries there are.
 class Destination {
  public:
   Destination(Folders& folders, Files& files, const Text& path);
 
   enum class Answer : std::uint8_t { made, kept, refused };
 
-  /// Begins a file. `kept` when there is one that is not to be overwritten; `refused` where a folder or a link stands
-  /// in the way, or a file that this run has written.
+  /// Creates a file. Returns `kept` if it exists and must not be overwritten, `refused` if a folder or a link is in the
+  /// way, or a file that this run has already written.
   [[nodiscard]] Answer create(const std::vector<Text>& parts, bool overwrite, std::unique_ptr<NewFile>& file);
 
-  /// Makes a folder with those above it. False where a file or a link stands in the way.
+  /// Creates a folder and its parents. Returns false if a file or a link is in the way.
   bool make_folder(const std::vector<Text>& parts, const FileFacts& facts);
 
-  /// Gives the folders that were asked for their times and rights: what was written into them has changed both.
+  /// Sets the times and rights of the folders that were made; writing files into them has changed both.
   void finish_folders();
 
  private:
   struct Known {
-    Text name;  ///< As it is spelled there.
+    Text name;  ///< As spelled on disk.
     FileKind kind = FileKind::file;
     bool is_written = false;
   };
   struct Place {
-    std::vector<Text> parts;  ///< As they are spelled.
+    std::vector<Text> parts;  ///< As spelled on disk.
     std::unordered_map<Text, Known> entries;
   };
 

@@ -18,7 +18,7 @@ constexpr std::uint32_t full32 = 0xFFFFFFFF;
 constexpr std::uint16_t full16 = 0xFFFF;
 constexpr std::uint16_t descriptor_flag = 8;
 
-/// What the end record and its zip64 form say.
+/// The contents of the end record and its zip64 form.
 struct End {
   std::uint64_t position = 0;
   std::uint32_t volume = 0;
@@ -32,7 +32,7 @@ struct End {
   std::uint64_t zip64_offset = 0;
 };
 
-/// An archive whose end is missing, or no archive at all.
+/// Fails for a file without an end record: an archive that is cut off, or not an archive at all.
 [[noreturn]] void fail_without_end(StoredFile& file) {
   std::string head = read_exactly(file, 0, std::min<std::uint64_t>(file.size(), 4));
   head.resize(4);
@@ -73,13 +73,13 @@ End read_end(StoredFile& file) {
 }
 
 std::uint64_t start_of(std::span<const std::uint64_t> volume_starts, std::uint32_t volume) {
-  // Archives that are whole may say anything about their one volume.
+  // A complete archive may claim any volume number; there is only one volume.
   if (volume_starts.size() == 1) return 0;
   if (volume >= volume_starts.size()) throw Error(Code::bad_media, "an entry lies on a volume that is missing");
   return volume_starts[volume];
 }
 
-/// A sum of places that damage cannot wrap around.
+/// Adds two positions without letting damaged values wrap around.
 std::uint64_t placed(std::uint64_t start, std::uint64_t offset) {
   if (offset > std::numeric_limits<std::uint64_t>::max() - start)
     throw Error(Code::bad_structure, "a place is too far");
@@ -99,7 +99,7 @@ void read_zip64_end(StoredFile& archive, std::span<const std::uint64_t> volume_s
   end.offset = number_at<std::uint64_t>(record, 48);
 }
 
-/// Reads on through the directory, some entries ahead.
+/// Reads through the directory, some entries ahead.
 class HeaderReader {
  public:
   HeaderReader(StoredFile& archive, std::uint64_t place) : archive_(archive), place_(place) {}
@@ -130,7 +130,7 @@ class HeaderReader {
   std::size_t used_ = 0;
 };
 
-/// The zip64 extra field of a header, without its own head; empty where there is none.
+/// The data of a header's zip64 extra field; empty if there is none.
 std::string_view zip64_field(std::string_view header, std::size_t name_length, std::size_t extra_length) {
   std::string_view extra = header.substr(central_header_size + name_length, extra_length);
   while (extra.size() >= 4) {
@@ -142,7 +142,7 @@ std::string_view zip64_field(std::string_view header, std::size_t name_length, s
   return {};
 }
 
-/// Takes the next number of a zip64 field in the place of one that was full.
+/// Takes the next number from a zip64 field if the header's own field was at its maximum.
 template <class Number, class Stored>
 void take_wide(std::string_view& field, Number& value, Stored full) {
   if (value != full) return;

@@ -12,7 +12,7 @@ namespace {
 constexpr std::size_t longest_part = 255;
 constexpr std::size_t longest_path = 32'000;
 
-/// A part with nothing in it that Windows understands otherwise.
+/// Replaces whatever has a special meaning to Windows in a part of a path.
 Text made_safe(Text part) {
   for (char16_t& unit : part) {
     if (unit < u' ' || TextView(u"<>:\"|?*").find(unit) != TextView::npos) unit = u'_';

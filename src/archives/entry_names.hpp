@@ -7,12 +7,12 @@
 
 namespace talutil::archives {
 
-/// Where an entry may be written below the destination folder, part by part; nothing for a name that is refused.
+/// The path of an entry below the destination folder, part by part; nothing if the name is refused.
 ///
-/// Made safe: a leading drive or separator goes ("C:\x", "/x" and "\\server\x" lie below the destination), what no
-/// file of Windows may have in its name becomes "_" (`<>:"|?*`, control characters, blanks and dots at the end of a
-/// part), and device names get a "_" before them ("CON.txt" is "_CON.txt"). Refused: ".." anywhere, an empty name, one
-/// with a NUL, a part above 255 and a path above 32,000 code units.
+/// Made safe: a leading drive or separator is removed ("C:\x", "/x" and "\\server\x" end up below the destination);
+/// characters that Windows does not allow in file names become "_" (`<>:"|?*`, control characters, and blanks and dots
+/// at the end of a part); device names get a leading "_" ("CON.txt" becomes "_CON.txt"). Refused: ".." anywhere, an
+/// empty name, a name with a NUL, a part longer than 255 and a path longer than 32,000 code units.
 [[nodiscard]] std::optional<std::vector<Text>> safe_parts(TextView name);
 
 }  // namespace talutil::archives

@@ -7,8 +7,8 @@
 
 namespace talutil::archives {
 
-/// Does something with files; what the platform refuses becomes the given code, a full disk cannot_write and a lack of
-/// memory out_of_memory.
+/// Runs file operations. Errors of the platform become the given code, except that a full disk becomes cannot_write and
+/// a lack of memory out_of_memory.
 template <class Work>
 decltype(auto) with_code(Code code, Work&& work) {
   try {

@@ -4,16 +4,17 @@
 
 #include "automation/text.hpp"
 
-/// Lists of items: names separated by blanks, those with blanks in double quotes, wildcards in the last part.
+/// Lists of items: names separated by blanks. Names that contain blanks are in double quotes; the last part may have
+/// wildcards.
 namespace talutil::archives {
 
 [[nodiscard]] std::vector<Text> read_item_list(TextView list);
 
-/// The parts between separators; empty ones and "." are left out.
+/// The parts between separators; empty parts and "." are left out.
 [[nodiscard]] std::vector<Text> parts_of(TextView path);
 
-/// Which entries of an archive are asked for. An item of one part is compared with an entry's last part; any item with
-/// the first parts of an entry as well, so that a folder stands for its tree. An empty list and "*.*" mean all.
+/// Selects entries of an archive. An item with a single part is compared with the last part of an entry's name. Any
+/// item is also compared with the first parts, so that a folder selects its tree. An empty list and "*.*" select all.
 class EntryFilter {
  public:
   explicit EntryFilter(TextView list);

@@ -5,7 +5,7 @@
 #include <string>
 #include <string_view>
 
-/// Numbers as archives hold them, low byte first.
+/// Numbers as archives store them, low byte first.
 namespace talutil::archives {
 
 template <class Number>

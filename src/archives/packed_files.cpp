@@ -62,7 +62,7 @@ void PackedFiles::open(Source& source) {
   entry_ = from_utf8(source.item->entry);
   file_ = collection_.folder_of(*source.item).open(source.item->name);
   if (!fits(*source.item)) return;
-  // A file that grows meanwhile is packed as far as it went when it was found.
+  // A file that is growing is packed up to the size it had when it was found.
   bytes_.resize(static_cast<std::size_t>(source.item->facts.size));
   bytes_.resize(file_->read_at(0, bytes_));
   file_.reset();
@@ -72,7 +72,7 @@ void PackedFiles::open(Source& source) {
   packed_.resize(bytes_.size());
   const std::size_t length =
       libdeflate_deflate_compress(compressor_.get(), bytes_.data(), bytes_.size(), packed_.data(), packed_.size());
-  // What does not become smaller is stored.
+  // Data that does not get smaller is stored.
   source.is_packed = length > 0 && length < bytes_.size();
   if (source.is_packed)
     packed_.resize(length);
@@ -93,7 +93,7 @@ zip_int64_t PackedFiles::read(Source& source, std::span<char> buffer) {
     if (count == 0) progress_.advance(source.size, entry_);
     return static_cast<zip_int64_t>(count);
   }
-  // As above: no further than it went, so that its size in the archive's headers holds.
+  // As above: not beyond the size found, so that the size in the archive's headers stays right.
   const std::uint64_t rest = source.item->facts.size - place_;
   const std::size_t count =
       file_->read_at(place_, buffer.first(static_cast<std::size_t>(std::min<std::uint64_t>(rest, buffer.size()))));
@@ -106,7 +106,7 @@ void PackedFiles::tell(const Source& source, zip_stat_t& status) const {
   zip_stat_init(&status);
   status.size = source.was_read ? source.size : source.item->facts.size;
   status.mtime = static_cast<time_t>(source.item->facts.modified);
-  // The traditional encryption takes its check byte from the time, so there is always one.
+  // The traditional encryption derives its check byte from the time, so the time is always given.
   status.valid = ZIP_STAT_SIZE | ZIP_STAT_MTIME;
   if (!fits(*source.item)) return;
   status.comp_method = source.was_read && !source.is_packed ? ZIP_CM_STORE : ZIP_CM_DEFLATE;

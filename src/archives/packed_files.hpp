@@ -9,17 +9,17 @@
 
 namespace talutil::archives {
 
-/// The files of a collection as sources of the container library, which reads them one at a time. Files up to a size
-/// are compressed in one piece and handed over so; longer ones are handed over as they are, and the library compresses
-/// them as they come. Must outlive the container.
+/// The files of a collection as sources for the container library, which reads them one at a time. Files up to
+/// `longest_in_memory` are compressed in one piece here; longer ones are passed on as they are, and the library
+/// compresses them as it reads. Must outlive the container.
 class PackedFiles {
  public:
   PackedFiles(Collection& collection, std::int32_t level, Fault& fault, Progress& progress);
 
-  /// A source for an item; null when the library has no memory.
+  /// A source for an item; null if the library is out of memory.
   [[nodiscard]] zip_source_t* source_of(const Item& item, zip_t* archive);
 
-  /// In memory at once are a file of this size and its packed form.
+  /// A file of this size and its compressed form are in memory at the same time.
   static constexpr std::uint64_t longest_in_memory = 16U << 20U;
 
  private:
@@ -50,7 +50,7 @@ class PackedFiles {
   std::unique_ptr<libdeflate_compressor, FreeCompressor> compressor_;
   std::deque<Source> sources_;
 
-  // Of the file that is read now.
+  // Of the file that is currently being read.
   std::unique_ptr<StoredFile> file_;
   std::string bytes_;
   std::string packed_;

@@ -32,7 +32,7 @@ Target open_target(const Text& archive, Folders& folders) {
   return target;
 }
 
-/// The new archive, which holds on to the old one of its name.
+/// Creates the new archive; it locks the existing one of that name.
 std::unique_ptr<NewFile> create(Target& target) {
   const bool replaces = target.folder->facts(target.name).has_value();
   try {
@@ -117,11 +117,11 @@ class Packer {
     const zip_uint8_t system = facts.mode != 0 ? ZIP_OPSYS_UNIX : ZIP_OPSYS_DOS;
     const zip_uint32_t attributes = facts.mode << 16U | facts.attributes;
     require(zip_file_set_external_attributes(archive, index, 0, system, attributes) == 0);
-    // The time of a file goes with its source.
+    // The time of a file comes from its source.
     if (facts.kind == FileKind::folder) {
       require(zip_file_set_mtime(archive, index, static_cast<time_t>(facts.modified), 0) == 0);
     }
-    // The directory's own time counts in two seconds of the local zone; this one is exact.
+    // The time in the directory has a resolution of two seconds and is local; this one is exact.
     if (facts.modified < 0 || facts.modified > std::numeric_limits<std::int32_t>::max()) return;
     constexpr zip_uint16_t extended_time = 0x5455;
     std::string field(1, '\1');

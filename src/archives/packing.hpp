@@ -8,19 +8,19 @@
 namespace talutil::archives {
 
 struct PackingOptions {
-  bool recurse = true;                         ///< Folders are packed with their trees; false packs files alone.
-  bool keep_folders = true;                    ///< False drops the folders from the names of entries.
-  bool aes = false;                            ///< With a password: AES-256 in the place of the traditional encryption.
-  std::int32_t level = 6;                      ///< 0 stores, 1 is fast, 9 small.
-  Text password{};                             ///< Empty for none. Programs are given its UTF-8 bytes.
-  Text comment{};                              ///< Of the archive; UTF-8.
+  bool recurse = true;                         ///< Packs folders with their trees; false packs only files.
+  bool keep_folders = true;                    ///< False removes the folders from the names of entries.
+  bool aes = false;                            ///< With a password: AES-256, not the traditional encryption.
+  std::int32_t level = 6;                      ///< 0 stores, 1 is fastest, 9 smallest.
+  Text password{};                             ///< Empty for none. Its UTF-8 bytes are what other programs need.
+  Text comment{};                              ///< The archive's comment, as UTF-8.
   std::optional<std::uint64_t> volume_size{};  ///< Makes a split set.
 };
 
-/// Packs the items of a list into an archive, which is made or added to: entries of the same name (without regard to
-/// case) are replaced, others kept. Until the new archive is complete the old one stays as it is.
+/// Packs the items of a list into an archive, creating it or adding to it: entries of the same name (ignoring case) are
+/// replaced, others kept. The old archive stays as it is until the new one is complete.
 ///
-/// Throws Error; see Code for what leads to which.
+/// Throws Error; Code lists the causes.
 void pack(const Text& archive, TextView items, const PackingOptions& options, Folders& folders, Progress& progress);
 
 }  // namespace talutil::archives

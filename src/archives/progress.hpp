@@ -8,7 +8,7 @@
 
 namespace talutil::archives {
 
-/// How far a run is, reported to whoever watches it; the watcher ends the run by answering false.
+/// Reports the progress of an operation to a watcher, which can cancel it by returning false.
 class Progress {
  public:
   using Watcher = std::function<bool(std::uint64_t done, std::uint64_t total, TextView name)>;
@@ -20,7 +20,7 @@ class Progress {
     done_ = 0;
   }
 
-  /// Fails with cancelled when the watcher ends the run.
+  /// Fails with cancelled if the watcher cancels the operation.
   void advance(std::uint64_t bytes, TextView name) {
     done_ += bytes;
     if (watcher_ && !watcher_(done_, total_, name)) throw Error(Code::cancelled, "cancelled");

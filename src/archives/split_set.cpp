@@ -24,7 +24,7 @@ Text number_text(std::uint32_t number, std::size_t digits) {
 
 TextView stem_of(TextView name) { return name.substr(0, name.find_last_of(u'.')); }
 
-/// Several files, one after the other.
+/// Several files, read as one.
 class JoinedFiles : public StoredFile {
  public:
   explicit JoinedFiles(std::vector<std::unique_ptr<StoredFile>> files) : files_(std::move(files)) {
@@ -56,7 +56,7 @@ class JoinedFiles : public StoredFile {
   std::vector<std::uint64_t> starts_{0};
 };
 
-/// A directory header for an entry at another place; the zip64 field is made anew as needed.
+/// The directory header of an entry that has moved; its zip64 field is rebuilt as needed.
 std::string placed_header(const DirectoryEntry& entry, std::uint64_t offset, std::uint32_t volume) {
   std::string header = entry.header.substr(0, central_header_size + entry.name_length());
   std::string_view extra = std::string_view(entry.header).substr(header.size(), entry.extra_length());
@@ -88,13 +88,13 @@ std::string placed_header(const DirectoryEntry& entry, std::uint64_t offset, std
   return header.append(kept).append(comment);
 }
 
-/// What the records at the end of a directory are made of.
+/// The contents of the records at the end of a directory.
 struct DirectoryPlace {
   std::uint64_t entries = 0;
-  std::uint64_t entries_here = 0;  ///< Those in the last volume.
+  std::uint64_t entries_here = 0;  ///< In the last volume only.
   std::uint64_t size = 0;
   std::uint64_t offset = 0;
-  std::uint64_t end = 0;  ///< Where the records go, in the last volume.
+  std::uint64_t end = 0;  ///< The position of the records in the last volume.
   std::uint32_t volume = 0;
   std::uint32_t last_volume = 0;
   bool is_zip64 = false;
@@ -135,7 +135,8 @@ std::string end_records(const DirectoryPlace& place, std::string_view comment) {
   return bytes.append(comment);
 }
 
-/// A set up to its directory, and then the directory as it stands in an archive that is whole.
+/// A set presented as a single archive: the volumes up to the directory, then the directory as an archive in one piece
+/// would have it.
 class WholeSet final : public StoredFile {
  public:
   explicit WholeSet(std::vector<std::unique_ptr<StoredFile>> volumes) : volumes_(std::move(volumes)) {
@@ -179,7 +180,6 @@ std::vector<std::unique_ptr<StoredFile>> open_pieces(Folder& folder, const Text&
   }
 }
 
-/// Writes the volumes of a set.
 class VolumeWriter {
  public:
   VolumeWriter(Folder& folder, TextView name, std::uint64_t limit) : folder_(folder), name_(name), limit_(limit) {
@@ -192,7 +192,7 @@ class VolumeWriter {
   [[nodiscard]] std::uint32_t volume() const noexcept { return static_cast<std::uint32_t>(volumes_.size()) - 1; }
   [[nodiscard]] std::uint64_t offset() const noexcept { return volumes_.back()->size(); }
 
-  /// In one piece: the next volume is begun where this one has no room.
+  /// Writes bytes that must not be cut: begins the next volume if this one has no room for them.
   void write_whole(std::string_view bytes) {
     if (bytes.size() > limit_ - mark_size) {
       throw Error(Code::bad_volume_size, "a header is larger than a volume; give volumes more room");
@@ -218,7 +218,7 @@ class VolumeWriter {
     with_code(Code::cannot_write, [&] { volumes_.back()->finish(nullptr); });
   }
 
-  /// Gives every volume its name, the last one that of the archive: none is known to be the last when it begins.
+  /// Names all volumes. The last one gets the archive's name, which is why this waits until all are written.
   void take_names() {
     with_code(Code::cannot_create, [&] {
       for (std::size_t i = 0; i + 1 < volumes_.size(); ++i) volumes_[i]->take_name();
@@ -246,7 +246,7 @@ class VolumeWriter {
   std::vector<std::unique_ptr<NewFile>> volumes_;
 };
 
-/// Copies an archive into volumes, entry by entry in the order in which they lie.
+/// Copies an archive into volumes, entry by entry, in the order of their positions.
 class Splitter {
  public:
   Splitter(StoredFile& archive, VolumeWriter& writer, Progress& progress)
@@ -279,7 +279,7 @@ class Splitter {
     flow(at, directory_.start);
   }
 
-  /// Copies what lies before an entry and the entry itself; answers where it ends.
+  /// Copies what precedes an entry and the entry itself; returns the position where it ends.
   std::uint64_t copy_entry(const DirectoryEntry& entry, std::uint64_t at, std::uint64_t next, Place& place) {
     flow(at, entry.offset);
     const std::string fixed = read_exactly(archive_, entry.offset, local_header_size);
@@ -312,7 +312,7 @@ class Splitter {
       ++place.entries_here;
       place.size += header.size();
     }
-    // The records are of the same length whatever they say of their place.
+    // The length of the records does not depend on the positions in them.
     const std::size_t length = end_records(place, directory_.comment).size();
     writer_.make_room(length);
     if (writer_.volume() != place.last_volume) place.entries_here = 0;
@@ -378,7 +378,7 @@ void split_archive(std::unique_ptr<NewFile> archive, Folder& folder, TextView na
   VolumeWriter writer(folder, name, volume_size);
   Splitter(*archive, writer, progress).copy();
   writer.finish();
-  // The archive in one piece goes, and with it what holds on to the file of its name.
+  // Discards the archive in one piece and with it the lock on the file that has its name.
   archive.reset();
   writer.take_names();
 }

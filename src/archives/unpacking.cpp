@@ -46,8 +46,7 @@ struct FreeDecompressor {
   void operator()(libdeflate_decompressor* decompressor) const noexcept { libdeflate_free_decompressor(decompressor); }
 };
 
-/// The password was wrong, or the bytes of an entry that it opens are damaged: the traditional encryption does not
-/// tell.
+/// Either the password was wrong or the entry is damaged: the traditional encryption cannot distinguish the two.
 struct WrongPassword {};
 
 }  // namespace
@@ -65,7 +64,7 @@ class Archive::Reader {
     Entry entry;
     const char* const name = zip_get_name(get(), index, 0);
     if (name != nullptr) entry.name = from_utf8(name);
-    // The container library ends a name there.
+    // The container library ends names at a NUL.
     if (name_has_nul_[static_cast<std::size_t>(index)]) entry.name += u'\0';
     entry.packed_size = status.comp_size;
     entry.is_encrypted = status.encryption_method != ZIP_EM_NONE;
@@ -75,10 +74,10 @@ class Archive::Reader {
     return entry;
   }
 
-  /// Hands the bytes of an entry to a sink, and throws if they are not those that were packed.
+  /// Passes the bytes of an entry to a sink; throws if they are not the ones that were packed.
   void unpack(std::uint64_t index, const std::string& password, const Sink& sink) {
     const zip_stat_t status = status_of(index);
-    // Asked first: the container library loses memory over an encryption that it does not know.
+    // Check this first: the container library leaks memory over an encryption that it does not know.
     if (zip_encryption_method_supported(status.encryption_method, 0) == 0 ||
         zip_compression_method_supported(status.comp_method, 0) == 0) {
       throw Error(Code::incomplete, "its method of compression or encryption is not supported");
@@ -197,12 +196,12 @@ class Archive::Reader {
 
 namespace {
 
-/// The password of the entries, asked for as long as it is wrong.
+/// The password of the entries; asks again while it is wrong.
 class Password {
  public:
   Password(const Text& given, const PasswordQuestion& ask) : bytes_(to_utf8(given)), ask_(ask) {}
 
-  /// Does something with the password of an entry until it is the right one.
+  /// Repeats an attempt on an entry until the password is right.
   template <class Attempt>
   void with(const Archive::Entry& entry, Attempt&& attempt) {
     if (!entry.is_encrypted) return attempt(std::string());
@@ -236,7 +235,7 @@ class Password {
   bool is_proved_ = false;
 };
 
-/// Entries that were not unpacked, to be reported at the end.
+/// Collects entries that were not unpacked, to report them at the end.
 class PassedOver {
  public:
   void add(const Text& entry) {
@@ -260,7 +259,7 @@ void require_modest_size(std::uint64_t total, std::uint64_t archive_size, const 
   if (is_too_large || is_bomb) throw Error(Code::incomplete, "the archive would unpack to more than is allowed");
 }
 
-/// Goes through the entries that are asked for, once their sizes are known to be modest.
+/// Visits the selected entries, after checking that their total size is acceptable.
 template <class Visit>
 void for_each_entry(const Archive& archive, std::uint64_t archive_size, const UnpackingOptions& options,
                     Progress& progress, Visit&& visit) {
@@ -325,7 +324,7 @@ void Archive::extract(const Text& destination, const UnpackingOptions& options, 
         });
       });
     } catch (const Error& error) {
-      // A method that we do not read is no reason to leave the others.
+      // An unsupported method is no reason to skip the other entries.
       if (error.code() != Code::incomplete) throw;
       return passed_over.add(entry.name);
     }

@@ -8,21 +8,22 @@
 
 namespace talutil::archives {
 
-/// Asks for the password of an entry: the first time, or after one that was wrong. Nothing means the user gave up.
+/// Asks for the password of an entry, either for the first time or because the last one was wrong. Returns nothing if
+/// the user cancelled.
 using PasswordQuestion = std::function<std::optional<Text>(const Text& entry, bool was_wrong)>;
 
 struct UnpackingOptions {
-  Text items{};  ///< Which entries; see EntryFilter.
+  Text items{};  ///< Selects entries; see EntryFilter.
   Text password{};
-  bool overwrite = false;    ///< False keeps the files that are there.
-  bool keep_folders = true;  ///< False drops the folders from the names of entries.
-  /// What an archive may unpack to: so many bytes in all (0: no limit), and, once it is more than a gibibyte, so many
-  /// times its own size.
+  bool overwrite = false;    ///< False keeps existing files.
+  bool keep_folders = true;  ///< False removes the folders from the names of entries.
+  /// Limits on the unpacked size: a total in bytes (0 for no limit) and, above one gibibyte, a multiple of the
+  /// archive's own size.
   std::uint64_t largest_total = 0;
   std::uint32_t largest_ratio = 200;
 };
 
-/// An archive, or a split set by its last volume, open for reading. Throws Error.
+/// An archive, or a split set (given by its last volume), open for reading. Throws Error.
 class Archive {
  public:
   Archive(const Text& path, Folders& folders);
@@ -32,7 +33,7 @@ class Archive {
   ~Archive();
 
   struct Entry {
-    Text name;  ///< As it stands in the archive, "/" between the parts, at the end for a folder.
+    Text name;  ///< As stored in the archive: "/" between the parts and at the end of a folder's name.
     FileFacts facts;
     std::uint64_t packed_size = 0;
     bool is_encrypted = false;
@@ -42,13 +43,13 @@ class Archive {
   [[nodiscard]] Entry entry(std::uint64_t index) const;
   [[nodiscard]] Text comment() const;
 
-  /// Writes the entries asked for below a folder, which is made if it is missing. A file takes its name when its
-  /// checksum is right. Entries whose names are refused (see entry_names.hpp), links, entries of a name that was
-  /// written already but for its case, and methods we do not read are passed over; the end is then `incomplete`.
+  /// Unpacks the selected entries into a folder, which is created if it is missing. A file gets its name only once its
+  /// checksum has proved right. Skips entries with refused names (see entry_names.hpp), links, entries whose name was
+  /// already written (ignoring case), and unsupported methods; the outcome is then `incomplete`.
   void extract(const Text& destination, const UnpackingOptions& options, Folders& folders, Files& files,
                const PasswordQuestion& ask, Progress& progress);
 
-  /// Reads the entries asked for and checks them; writes nothing. Damage is bad_test.
+  /// Reads and checks the selected entries without writing anything. Damage is reported as bad_test.
   void test(const UnpackingOptions& options, const PasswordQuestion& ask, Progress& progress);
 
  private:
