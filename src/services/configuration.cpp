@@ -6,18 +6,19 @@ namespace talutil {
 
 namespace {
 
-/// The default that a read of a file does not invent a value from.
+/// With this default, reading a missing item of a file returns an empty value and saves nothing.
 constexpr TextView no_default = u"NoDefaultData";
 
-// Selectors of groups in the place of a file name; all others are settings of the host.
+// Selectors given in the file name's place that stand for groups; all others are settings of the host.
 constexpr TextView previous_database_selector = u"PreviousDatabaseSettings";
 constexpr TextView code_count_selector = u"CodeCount";
 
-// In a file a backslash stands for an empty value, and is put before a value that begins with one.
+// In a file a single backslash means an empty value, and a value that begins with a backslash gets another one in
+// front.
 constexpr TextView backslash = u"\\";
 constexpr TextView two_backslashes = u"\\\\";
 
-/// The value of an item in a file, or of an empty item the first name of its section; empty where there is none.
+/// The value of an item in a file, or the first name in its section if the item is empty; empty if there is none.
 Text read_profile(ORVUtils& utils, const Text& file, const Text& section, const Text& item) {
   Profiles& profiles = utils.library().platform().profiles;
   Text buffer =
@@ -32,13 +33,13 @@ Text read_file(ORVUtils& utils, const Text& section, const Text& item, const Tex
     if (!value.empty()) return value;
   }
   if (default_data == no_default) return {};
-  // Into the user's store and not into the file, which stays without the item.
+  // Saved to the user's store, not to the file, which remains without the item.
   Text output = default_data;
   utils.SaveCfgFileData(section, item, output, file, Boolean(false));
   return default_data;
 }
 
-/// The group that a selector is read from. Without a user it is the database's, which every write reaches.
+/// The group that a selector is read from. Without a user it is the database's, which every write updates.
 Text group_of(const SharedSettings& settings, const Text& selector) {
   if (settings.sUserName.empty() && selector != previous_database_selector) return settings_groups::database(settings);
   if (!selector.empty() && selector == settings.sNatNameD) return settings_groups::user(settings);
@@ -69,7 +70,7 @@ void save_store(const ORVUtils& utils, const Text& section, const Text& item, co
   } else if (!is_host_selector && selector == code_count_selector) {
     store.put(Text(settings_groups::code_count), section, item, output);
   } else {
-    // The database's group holds the last value of any user.
+    // The database's group holds the last value that any user saved.
     store.put(settings_groups::user(settings), section, item, output);
     store.put(settings_groups::database(settings), section, item, output);
   }
@@ -81,7 +82,7 @@ Text ORVUtils::GetCfgFileData(const Text& sSection, const Text& sItem, const Tex
                               const Boolean& bLoadFromFile) {
   if (!bLoadFromFile) return read_store(*this, sSection, sItem, sDefaultData, sFilename);
   Text result = read_file(*this, sSection, sItem, sDefaultData, sFilename);
-  // A path of the network never comes back from a file.
+  // A network path is never returned from a file.
   if (result.starts_with(two_backslashes) || result == backslash) return {};
   return result;
 }

@@ -8,7 +8,7 @@ void ORVUtils::AppendEventLog(const Text& sEventName, const Text& sEventForm) {
   if (settings().EventLog == 0) return;
   const Text stamp = format_date(library_.platform().clock.now(), u"DDMMYYYYHHMMSS");
   const Text line = settings().sUserName + u':' + stamp + u':' + sEventName + u':' + sEventForm;
-  // The folder's own last separator is doubled, which the file system accepts.
+  // This doubles the separator if the folder ends in one, which the file system accepts.
   library_.platform().files.append(settings().sORVPath + u"\\EventLog.txt", file_line(line));
 }
 

@@ -9,7 +9,7 @@ namespace {
 
 constexpr std::uint32_t normal_files = 0;
 
-/// Does one statement of a member that carries on after errors. Answers whether there was none.
+/// Runs one statement of a member that carries on after errors. Returns whether it succeeded.
 template <class Statement>
 bool without_error(Statement&& statement) {
   try {
@@ -20,8 +20,8 @@ bool without_error(Statement&& statement) {
   return true;
 }
 
-/// Takes the first and the last character off a path that begins with a quote, whatever the last one is. A quote
-/// alone stays: there is nothing between its ends.
+/// Removes the first and the last character of a path that begins with a quote, whatever the last one is. A lone quote
+/// stays.
 void remove_quotes(Text& path) {
   if (path.size() > 1 && path.front() == u'"') path = path.substr(1, path.size() - 2);
 }
@@ -35,7 +35,7 @@ bool is_any_found(Files& files, const Text& pattern, std::uint32_t mask) {
   return found;
 }
 
-/// Calls `found` with each normal file of a folder that matches.
+/// Calls `found` for each matching normal file in a folder.
 template <class Found>
 void for_each_file(Files& files, const Text& path, const Text& pattern, Found found) {
   files.search(path + (pattern.empty() ? u"*.*" : pattern), normal_files, [&](TextView name) {
@@ -46,18 +46,18 @@ void for_each_file(Files& files, const Text& path, const Text& pattern, Found fo
 
 bool is_drive_path(TextView path) { return path.find(u':') == 1; }
 
-/// What the platform's ANSI functions see of a text.
+/// A text as the platform's ANSI functions see it.
 Text as_ansi(const Text& text) { return from_ansi(to_ansi(text)); }
 
-/// The program's own folder, where the fixed folders are.
+/// The application's own folder, which contains the fallback folders.
 constexpr TextView program_folder = u"C:\\TAL\\ORV3";
 
-/// A step of the set-up: a folder below a configured one is made, and where that fails the configured one becomes
-/// the fixed one.
+/// A step of the set-up: creates a folder below a configured one. If that fails, the fallback replaces the configured
+/// folder.
 struct FolderStep {
   Text SharedSettings::*setting;
   TextView fall_back;
-  TextView below;  ///< Without the separator at its end.
+  TextView below;  ///< Without a trailing separator.
 };
 
 constexpr FolderStep pictures{&SharedSettings::sPicturesDir, u"\\Pictures\\", u""};
@@ -96,7 +96,7 @@ Boolean ORVUtils::FileExists(Text sFilename) {
   Files& files = library_.platform().files;
   const bool searched = without_error([&] { found = is_any_found(files, sFilename, normal_files); });
   if (sFilename.empty() || !searched || !found) return Boolean(false);
-  // What the name is compared with then; every outcome is True.
+  // The file's name is extracted as well, but the result is True whatever comes of it.
   without_error([&] { ExtractFilename(sFilename, Boolean(true)); });
   return Boolean(true);
 }
@@ -161,8 +161,8 @@ std::int32_t ORVUtils::GetFileCount(const Text& sPath, const Text& sFiles) {
 Text ORVUtils::GetFileList(const Text& sDelimiter, const Text& sPath, const Text& sFiles) {
   Text list;
   for_each_file(library_.platform().files, sPath, sFiles, [&](TextView name) { list.append(name).append(sDelimiter); });
-  // Only a delimiter of one character equals the last one. An empty one equals that of an empty list, of which
-  // nothing can be removed.
+  // Only a one-character delimiter can equal the last character. An empty delimiter equals the "last character" of an
+  // empty list, and removing from that fails.
   const TextView last_character = TextView(list).substr(list.empty() ? 0 : list.size() - 1);
   if (last_character != sDelimiter) return list;
   if (list.empty()) raise(ErrorNumber::invalid_procedure_call);

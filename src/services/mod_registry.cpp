@@ -11,8 +11,8 @@ namespace {
 
 constexpr std::int32_t other_type = -1;
 
-/// A key below the current user's hive, closed at the end. One that could not be opened is used all the same: what is
-/// asked of it fails, and that status is the one that hosts see.
+/// A key below the current user's hive; closes itself. A key that could not be opened is used all the same: the calls
+/// on it fail, and their status is the one that hosts see.
 class OpenKey {
  public:
   OpenKey(Registry& registry, const Text& path, std::uint32_t access) : registry_(registry) {
@@ -29,7 +29,8 @@ class OpenKey {
   Registry::Handle handle_ = 0;
 };
 
-/// Reads a value of type 1 or 4. The value is left alone when there is none to read, and Empty when it cannot be read.
+/// Reads a value of type 1 or 4. Leaves `value` unchanged if there is no such value; sets it to Empty if it cannot be
+/// read.
 std::int32_t read_value(Registry& registry, Registry::Handle key, const Text& name, Variant& value) {
   std::uint32_t type = 0;
   std::uint32_t size = 0;
@@ -38,7 +39,7 @@ std::int32_t read_value(Registry& registry, Registry::Handle key, const Text& na
   if (type == Registry::text) {
     std::string bytes(size, '\0');
     if (size > 0) status = registry.query(key, name, type, size, bytes);
-    // The stored NUL is no part of the text.
+    // The stored NUL is not part of the text.
     value = status == Registry::ok ? Variant(from_ansi(std::string_view(bytes).substr(0, size > 0 ? size - 1 : 0)))
                                    : Variant();
     return status;
@@ -95,7 +96,7 @@ void ORVUtils::REGISTRY_SetKeyValue(const Text& sKeyName, const Text& sValueName
 void ORVUtils::REGISTRY_CreateNewKey(const Text& sNewKeyName, const std::int32_t& lPredefinedKey) {
   Registry& registry = library_.platform().registry;
   Registry::Handle key = 0;
-  // Any root, unlike the other three members, which keep to the current user.
+  // Accepts any root, unlike the other three members, which are limited to the current user.
   registry.create(static_cast<std::uint32_t>(lPredefinedKey), sNewKeyName, key);
   registry.close(key);
 }

@@ -12,7 +12,7 @@ namespace talutil {
 
 namespace {
 
-/// By result code. The wording, its misspellings and its spacing are those that users and their support know.
+/// Indexed by result code. Users and their support know this wording, including its misspellings and spacing.
 constexpr std::array<TextView, 22> explanations = {
     u"ZE_OK    Successful operation",
     u"ZE_BUSY  Busy, can 't enter now - You tried to initiate another zip action within the same thread of "
@@ -62,8 +62,8 @@ constexpr std::array<TextView, 22> explanations = {
     u"ZE_MVUSAGE   Improper use of a multi-volume ZIP file - You tried to use a Multi-Volume ZIP file like a "
     u"non-multi-volume ZIP file. For example, you can not grow an existing multi-volume ZIP file."};
 
-// What a third-party control in the place of ours is given under these identifiers is given to ours too: its settings
-// are emptied one by one, since a control keeps those of the last action.
+// Our own control receives the same identifiers as a third-party control in its place would. All settings are cleared,
+// one by one, because a control keeps those of its last action.
 using Identifiers = std::initializer_list<std::int32_t>;
 
 void put_all(const Control& control, Identifiers members, const Variant& value) {
@@ -101,7 +101,7 @@ void reset_unzip(const Control& control, const Text& password) {
   put_all(control, {37, 42}, 0);
 }
 
-/// Reads the result twice, as hosts observe.
+/// Reads the result twice, as hosts expect.
 void show_result_of(const Control& control, std::int32_t member, MessageBoxes& boxes) {
   static_cast<void>(control.get<std::int16_t>(member));
   ModZipFiles::show_result(control.get<std::int16_t>(member), boxes);

@@ -10,7 +10,7 @@ namespace talutil {
 Boolean ORVUtils::PingSite(const Text& /*sAddress*/) { return Boolean(true); }
 
 Variant ORVUtils::GetIpAddrTable() {
-  // The room for 21 rows, no more: a machine with more addresses has none as far as hosts see.
+  // Room for 21 rows and no more: for hosts, a machine with more addresses has none.
   std::array<std::uint8_t, 512> table{};
   constexpr std::size_t first_row = 4;
   constexpr std::size_t row_size = 24;

@@ -40,7 +40,7 @@ void SequentialInput::read_line(Text& line) {
       continue;
     }
     begin_ += length + 1;
-    // The line feed can be the first byte of the next buffer.
+    // The line feed may be the first byte of the next buffer.
     if (!at_end() && pending().front() == '\n') ++begin_;
     return;
   }

@@ -8,24 +8,24 @@
 
 namespace talutil {
 
-/// A text file read from its beginning, in ANSI, as the hosts' sequential input reads it: a line ends at a carriage
-/// return, with or without a line feed after it; a lone line feed is a character like others. The first character
-/// 26 ends the file. Nothing is lost at the end: the last line counts also without a line end.
+/// Reads an ANSI text file as the hosts' sequential input does: a line ends at a carriage return, with or without a
+/// line feed after it; a lone line feed is an ordinary character. The first character 26 ends the file. The last line
+/// counts even without a line end.
 class SequentialInput {
  public:
-  /// Raises what opening raises.
+  /// Raises the same errors as Files::open_input.
   SequentialInput(Files& files, const Text& path);
 
   [[nodiscard]] bool at_end();
 
-  /// The next line, without its end; raises 62 at the end of the file.
+  /// Reads the next line, without its line end; raises 62 at the end of the file.
   void read_line(Text& line);
 
-  /// All that is left, line ends included.
+  /// The rest of the file, including line ends.
   [[nodiscard]] Text read_rest();
 
  private:
-  /// What is read but not yet taken.
+  /// Bytes that were read from the file but not consumed yet.
   [[nodiscard]] std::string_view pending() const noexcept { return {buffer_.data() + begin_, end_ - begin_}; }
   void fill();
 
@@ -36,13 +36,13 @@ class SequentialInput {
   bool is_over_ = false;
 };
 
-/// A text file written in ANSI. It takes its name with `close`; before that nothing has changed.
+/// Writes an ANSI text file. Nothing changes on disk until `close` puts the file in place.
 class SequentialOutput {
  public:
-  /// Raises what opening raises.
+  /// Raises the same errors as Files::open_output.
   SequentialOutput(Files& files, const Text& path) : file_(files.open_output(path)) {}
 
-  /// Writes a line with its end (carriage return, line feed).
+  /// Writes a line and its line end (carriage return, line feed).
   void write_line(TextView line);
   void close();
 
@@ -51,7 +51,7 @@ class SequentialOutput {
   std::string buffer_;
 };
 
-/// A line as it stands in a file: in ANSI, with its end.
+/// A line as stored in a file: ANSI, with its line end.
 [[nodiscard]] std::string file_line(TextView line);
 
 }  // namespace talutil

@@ -8,16 +8,16 @@ namespace talutil {
 
 namespace {
 
-/// The element at index n of an array that is resized to the indexes 0 to n, keeping what it holds.
+/// Resizes an array to the indexes 0 to n, preserving its contents, and returns the element at n.
 Text& resize_to(TextArray& list, std::size_t n) {
-  // A resize that keeps the contents cannot move the lower bound.
+  // A resize that preserves the contents cannot change the lower bound.
   if (list.allocated && list.lower_bound != 0) raise(ErrorNumber::subscript_out_of_range);
   list.allocated = true;
   list.items.resize(n + 1);
   return list.items.back();
 }
 
-/// Elements from index 0 to the upper bound, a line each.
+/// Writes the elements from index 0 to the upper bound, one per line.
 void write_lines(const TextArray& list, SequentialOutput& file) {
   const std::int32_t last = list.upper_bound();
   for (std::int32_t i = 0; i <= last; ++i) file.write_line(list.at(i));
@@ -34,7 +34,7 @@ std::int32_t ORVUtils::OpenBigFile(const Text& sFilename, TextArray& sFList, con
     if (iEraseBlanks == 1) {
       Text line;
       file.read_line(line);
-      // Skipped lines leave the element that was made for them: the upper bound can be n.
+      // A skipped line leaves behind the element made for it, so the upper bound can be n.
       if (VerifyTextData(0, 0, line).empty()) continue;
       element = std::move(line);
     } else {
@@ -49,7 +49,7 @@ std::int32_t ORVUtils::OpenFile(const Text& sFilename, TextArray& sFList, const 
   if (!FileExists(sFilename).is_exactly_true()) return 0;
   SequentialInput file(library_.platform().files, sFilename);
   std::int32_t n = 0;
-  // Compared after each line, so that a limit of 0 or less is none.
+  // The limit is checked after each line, so 0 or less means no limit.
   while (!file.at_end()) {
     file.read_line(resize_to(sFList, static_cast<std::size_t>(n)));
     n = checked_add(n, 1);
@@ -69,7 +69,7 @@ void ORVUtils::CopyFileToBackupFile(const Text& sSrcFileName, const Text& sDestF
   TextArray lines;
   OpenFile(sSrcFileName, lines, row_limit);
   SequentialOutput file(library_.platform().files, sDestFileName);
-  // A source without lines leaves an array without bounds: error 9, and the backup that was there stays.
+  // A source without lines leaves the array without bounds: this raises 9, and the existing backup stays.
   write_lines(lines, file);
   file.close();
 }
