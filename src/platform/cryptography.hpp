@@ -16,12 +16,12 @@ class RandomSource {
  public:
   virtual ~RandomSource() = default;
 
-  /// Fills with bytes that nobody can predict. Raises 51 where the platform has none to give.
+  /// Fills the buffer with unpredictable bytes. Raises 51 if the platform cannot supply any.
   virtual void fill(std::span<std::uint8_t> bytes) = 0;
 };
 
-/// The platform's own AES-256 in Galois/counter mode (NIST SP 800-38D) and PBKDF2 with HMAC-SHA256 (RFC 8018). Both
-/// builds give the same bytes. Failures that are not the data's fault raise 51.
+/// AES-256 in Galois/counter mode (NIST SP 800-38D) and PBKDF2 with HMAC-SHA256 (RFC 8018), as implemented by the
+/// platform. Both builds produce the same bytes. Failures not caused by the data raise 51.
 class Cryptography {
  public:
   using Key = std::array<std::uint8_t, 32>;
@@ -33,14 +33,14 @@ class Cryptography {
   Cryptography& operator=(const Cryptography&) = delete;
   virtual ~Cryptography() = default;
 
-  /// The key of a pass phrase. The last one is kept, since each costs its rounds: tens of milliseconds.
+  /// Derives the key of a pass phrase. Keeps the last one, because deriving a key takes tens of milliseconds.
   [[nodiscard]] const Key& key_for(ByteView pass_phrase, ByteView salt, std::uint32_t rounds);
 
-  /// Encrypts the data in place. A nonce serves one message of a key only.
+  /// Encrypts the data in place. Never use a nonce for two messages with the same key.
   [[nodiscard]] virtual Tag seal(const Key& key, const Nonce& nonce, ByteView associated,
                                  std::span<std::uint8_t> data) = 0;
 
-  /// Decrypts the data in place. False when the tag does not fit; the data are then of no use.
+  /// Decrypts the data in place. Returns false if the tag does not match; the data are then useless.
   [[nodiscard]] virtual bool open(const Key& key, const Nonce& nonce, ByteView associated, std::span<std::uint8_t> data,
                                   const Tag& tag) = 0;
 
@@ -57,7 +57,7 @@ class Cryptography {
   std::optional<Derived> last_;
 };
 
-/// The platform's own, for programs that have no library around them.
+/// The platform's implementations, for programs that run without a library.
 [[nodiscard]] std::unique_ptr<RandomSource> make_random_source();
 [[nodiscard]] std::unique_ptr<Cryptography> make_cryptography();
 

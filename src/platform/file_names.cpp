@@ -10,7 +10,7 @@ namespace talutil {
 
 namespace {
 
-/// How the file system reads a pattern: the wildcards beside dots have meanings of their own.
+/// The elements of a pattern as the file system reads it: wildcards next to dots have special meanings.
 enum class Kind : std::uint8_t {
   unit,
   any_one,
@@ -45,7 +45,8 @@ std::vector<Step> steps_of(TextView pattern) {
   return steps;
 }
 
-/// The places of a pattern that a name can have come to, all at once: time grows with name times pattern at worst.
+/// Tracks all positions in the pattern that a name can have reached, so that the time is at worst proportional to the
+/// length of the name times that of the pattern.
 class Matcher {
  public:
   explicit Matcher(const std::vector<Step>& steps) : steps_(steps), places_(steps.size() + 1, false) {

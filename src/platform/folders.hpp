@@ -10,71 +10,72 @@
 #include "automation/text.hpp"
 #include "platform/files.hpp"
 
-/// Folders as archives need them: held open, their entries used by exact name, links recognised.
+/// Folders as archives need them: kept open, with exact entry names, and links recognised.
 namespace talutil {
 
 enum class FileKind : std::uint8_t { file, folder, link, other };
 
-/// What an archive keeps of a file beside its bytes.
+/// What an archive records about a file besides its contents.
 struct FileFacts {
-  FileKind kind = FileKind::file;  ///< A link to a file is that file; one to a folder, or to nothing, is a link.
+  FileKind kind = FileKind::file;  ///< Links to files count as files; links to folders or to nothing, as links.
   std::uint64_t size = 0;
   std::int64_t modified = 0;     ///< Seconds since 1 January 1970, UTC.
   std::uint32_t attributes = 0;  ///< The bits of file_attribute.
-  std::uint32_t mode = 0;        ///< Kind and rights as POSIX counts them; 0 where the platform has none.
+  std::uint32_t mode = 0;        ///< Type and permission bits as in POSIX; 0 if the platform has none.
 };
 
-/// A file open for reading at any place. Reading raises as InputFile does.
+/// A file open for reading at any position. Reading raises the same errors as InputFile.
 class StoredFile {
  public:
   virtual ~StoredFile() = default;
 
-  /// Bytes of the file when it was opened.
+  /// The size in bytes when the file was opened.
   [[nodiscard]] virtual std::uint64_t size() const noexcept = 0;
 
-  /// Fills the buffer as far as the file goes; 0 at its end.
+  /// Reads until the buffer is full or the file ends; returns 0 at the end.
   [[nodiscard]] virtual std::size_t read_at(std::uint64_t offset, std::span<char> buffer) = 0;
 };
 
-/// A file in the making, readable meanwhile. Until it takes its name, whatever had the name stays; without that the
-/// new one is gone with the object. Raises 61 when the disk is full, 57 for other failures.
+/// A file being written, which can be read meanwhile. An existing file of its name stays until `take_name`; without
+/// that call, the destructor discards the new file. Raises 61 if the disk is full, 57 for other failures.
 class NewFile : public StoredFile {
  public:
-  /// The file whose name is to be taken, open and kept from other writers; null where there is none.
+  /// The existing file to be replaced, open and locked against other writers; null if there is none.
   [[nodiscard]] virtual StoredFile* replaced() noexcept = 0;
 
   virtual void write_at(std::uint64_t offset, std::string_view bytes) = 0;
 
-  /// Ends writing and reading, and gives the file time, attributes and rights where facts are given.
+  /// Ends writing and reading. Sets the file's time, attributes and rights if facts are given.
   virtual void finish(const FileFacts* facts) = 0;
 
-  /// After finish; another name of the same folder may be given in the place of the first. Raises 70 or 75 when what
-  /// has the name cannot be replaced.
+  /// Call after finish. Another name in the same folder may be given instead of the original one. Raises 70 or 75 if
+  /// the existing file of that name cannot be replaced.
   virtual void take_name(TextView other_name) = 0;
   void take_name() { take_name({}); }
 };
 
-/// An open folder. Names are exact and name entries of this folder alone. Opening raises as Files does.
+/// An open folder. Names are exact and refer to direct entries of this folder only. Opening raises the same errors as
+/// Files.
 class Folder {
  public:
   virtual ~Folder() = default;
 
-  /// The full path, without a separator at its end but for a root.
+  /// The full path; only a root ends in a separator.
   [[nodiscard]] virtual Text path() const = 0;
 
-  /// Every entry but the folder itself and the one above, in the order of the system.
+  /// Lists every entry except the folder itself and its parent, in the system's order.
   virtual void list(const std::function<void(TextView name, const FileFacts& facts)>& found) = 0;
 
   [[nodiscard]] virtual std::optional<FileFacts> facts(TextView name) = 0;
   [[nodiscard]] virtual std::unique_ptr<StoredFile> open(TextView name) = 0;
 
-  /// Raises 75 for a name that a read-only file or a folder has, 70 for one that another process has locked.
+  /// Raises 75 if the name belongs to a read-only file or a folder, 70 if another process has locked the file.
   [[nodiscard]] virtual std::unique_ptr<NewFile> create(TextView name) = 0;
 
-  /// A folder in this one; made first where it is missing and is to be. Raises 75 for a link.
+  /// Opens a subfolder; creates it if it is missing and `make_missing` is set. Raises 75 for a link.
   [[nodiscard]] virtual std::unique_ptr<Folder> folder(TextView name, bool make_missing) = 0;
 
-  /// Gives an entry its time, attributes and rights, as far as the platform lets it.
+  /// Sets the time, attributes and rights of an entry as far as the platform allows.
   virtual void set_facts(TextView name, const FileFacts& facts) = 0;
 
   virtual void remove(TextView name) = 0;
@@ -84,7 +85,8 @@ class Folders {
  public:
   virtual ~Folders() = default;
 
-  /// The folder of a path as Files understands it; an empty one is the current folder. Raises 76 when it is missing.
+  /// Opens the folder of a path as Files interprets it; an empty path is the current folder. Raises 76 if it is
+  /// missing.
   [[nodiscard]] virtual std::unique_ptr<Folder> open(const Text& path) = 0;
 };
 

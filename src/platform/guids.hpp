@@ -8,7 +8,7 @@ class Guids {
  public:
   virtual ~Guids() = default;
 
-  /// A new GUID in its registry form: 38 characters, upper-case hexadecimal digits in braces.
+  /// A new GUID in registry format: 38 characters, upper-case hexadecimal digits in braces.
   [[nodiscard]] virtual Text make() = 0;
 };
 

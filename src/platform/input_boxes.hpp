@@ -14,7 +14,7 @@ class InputBoxes {
  public:
   virtual ~InputBoxes() = default;
 
-  /// Asks for a text. Nothing when the box is cancelled, or where there is nobody to ask.
+  /// Asks for a text. Returns nothing if the box is cancelled or there is nobody to ask.
   [[nodiscard]] virtual std::optional<Text> ask(TextView prompt, TextView title, Entry entry) = 0;
 };
 

@@ -7,14 +7,15 @@
 #include "automation/date.hpp"
 #include "automation/text.hpp"
 
-/// What the system information shows of the machine. Sizes are bytes; what the platform does not report is 0 or empty.
+/// What the system information shows about the machine. Sizes are in bytes; anything that the platform does not report
+/// is 0 or empty.
 namespace talutil {
 
 struct DriveFacts {
-  Text name;  ///< "C:"; the folder that it is mounted on where there are no letters.
+  Text name;  ///< "C:"; the mount point where there are no drive letters.
   Text kind;  ///< "Fixed", "Removable", "Network", "CD-ROM", "RAM disk" or "Unknown".
   Text label;
-  Text file_system;  ///< Empty for a drive that is not ready.
+  Text file_system;  ///< Empty if the drive is not ready.
   std::uint64_t total = 0;
   std::uint64_t free = 0;
 };
@@ -22,7 +23,7 @@ struct DriveFacts {
 struct MemoryFacts {
   std::uint64_t total = 0;
   std::uint64_t available = 0;
-  std::uint64_t page_file_total = 0;  ///< Without the memory itself.
+  std::uint64_t page_file_total = 0;  ///< Not including physical memory.
   std::uint64_t page_file_available = 0;
 };
 
@@ -38,7 +39,7 @@ struct OperatingSystemFacts {
   Text version;
   Text computer;
   Text user;
-  Text folder;               ///< Of the system.
+  Text folder;               ///< The system folder.
   std::uint64_t uptime = 0;  ///< Seconds.
 };
 
@@ -46,7 +47,7 @@ struct ItemFacts {
   bool is_folder = false;
   std::uint64_t size = 0;        ///< 0 for a folder.
   std::uint32_t attributes = 0;  ///< The bits of file_attribute.
-  std::optional<Date> created;   ///< Local time, as the others.
+  std::optional<Date> created;   ///< All three in local time.
   std::optional<Date> modified;
   std::optional<Date> accessed;
 };
@@ -59,7 +60,7 @@ class Machine {
   [[nodiscard]] virtual ProcessorFacts processor() = 0;
   [[nodiscard]] virtual OperatingSystemFacts operating_system() = 0;
 
-  /// A file or folder by a path as Files understands it. Raises 53 or 76 for what does not exist.
+  /// A file or folder, by a path as Files interprets it. Raises 53 or 76 if it does not exist.
   [[nodiscard]] virtual ItemFacts item(const Text& path) = 0;
 };
 

@@ -8,8 +8,8 @@
 
 #include "automation/text.hpp"
 
-/// Documents as pages: laid out once, then drawn on the screen, on a printer and into PDF by renderers that share
-/// nothing but this model. All lengths are twips (1/1440 inch) from the top left corner of the paper; colours are
+/// Documents as pages: laid out once, then drawn on the screen, on a printer and into PDF by renderers that have only
+/// this model in common. All lengths are in twips (1/1440 inch) from the top left corner of the paper; colours are
 /// 0x00BBGGRR.
 namespace talutil {
 
@@ -30,34 +30,34 @@ struct FontStyle {
   friend bool operator==(const FontStyle&, const FontStyle&) = default;
 };
 
-/// Twips of a width in thousandths of a font's size.
+/// Converts a width in thousandths of the font's size to twips.
 [[nodiscard]] constexpr double to_twips(double thousandths, const FontStyle& font) noexcept {
   constexpr double twips_per_point = 20;
   return thousandths * font.points * twips_per_point / 1000;
 }
 
-/// From a line's top to the next one's.
+/// From the top of a line to the top of the next.
 [[nodiscard]] constexpr std::int32_t line_height(const FontStyle& font) noexcept {
   return static_cast<std::int32_t>(to_twips(1200, font));
 }
 
-/// From a line's top to the foot of its letters.
+/// From the top of a line to its baseline.
 [[nodiscard]] constexpr std::int32_t baseline(const FontStyle& font) noexcept {
   return static_cast<std::int32_t>(to_twips(900, font));
 }
 
-/// Characters of one line that are drawn in one go.
+/// Characters on one line that are drawn together.
 struct TextRun {
   std::int32_t left = 0;
-  std::int32_t top = 0;  ///< Of the line, not of its letters.
+  std::int32_t top = 0;  ///< Top of the line, not of its letters.
   std::int32_t width = 0;
   FontStyle font;
-  bool is_wide = false;  ///< Characters beyond code page 1252, drawn in another font.
+  bool is_wide = false;  ///< Has characters that code page 1252 lacks, drawn in another font.
   std::uint32_t colour = 0;
   Text text;
 };
 
-/// A filled area, a frame, or both; without height or width a rule.
+/// A filled area, a frame, or both; with zero height or width, a rule.
 struct Box {
   TwipsRectangle place;
   std::optional<std::uint32_t> fill;
@@ -67,7 +67,7 @@ struct Box {
 
 struct Picture {
   TwipsRectangle place;
-  std::int32_t width = 0;  ///< In pixels, as the height.
+  std::int32_t width = 0;  ///< Both in pixels.
   std::int32_t height = 0;
   std::shared_ptr<const std::vector<std::uint8_t>> pixels;  ///< Red, green, blue, row by row from the top.
 };
@@ -77,10 +77,10 @@ using PageItem = std::variant<TextRun, Box, Picture>;
 struct Page {
   std::int32_t width = 0;
   std::int32_t height = 0;
-  std::vector<PageItem> items;  ///< Later ones lie over earlier ones.
+  std::vector<PageItem> items;  ///< Later items are drawn over earlier ones.
 };
 
-/// Where a section of a report begins.
+/// The start of a section of a report.
 struct Bookmark {
   Text title;
   std::size_t page = 0;

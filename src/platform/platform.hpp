@@ -24,7 +24,7 @@
 #include "platform/settings.hpp"
 #include "platform/time_conversions.hpp"
 
-/// The seam between the core and the platform: one small interface a concern, so that a fake fits on a page.
+/// The seam between the core and the platform: one small interface per concern, so that each fake fits on a page.
 namespace talutil {
 
 enum class MessageButtons : std::uint8_t { ok, yes_no };
@@ -34,8 +34,8 @@ class MessageBoxes {
  public:
   virtual ~MessageBoxes() = default;
 
-  /// Shows a modal message and waits for its answer. An empty title stands for the host application's own.
-  /// Where there is nobody to ask, the answer is the one of a box that was closed (cancel, or no).
+  /// Shows a modal message and waits for the answer. With an empty title, the box has the host application's title.
+  /// Where there is nobody to ask, the answer is that of a closed box (cancel, or no).
   virtual MessageAnswer show(TextView text, MessageButtons buttons, TextView title) = 0;
 };
 
@@ -43,11 +43,11 @@ class Screen {
  public:
   virtual ~Screen() = default;
 
-  /// Twips (1/1440 inch) per pixel, across and down; 15 at 96 dots an inch.
+  /// Twips (1/1440 inch) per pixel, horizontally and vertically; 15 at 96 dpi.
   [[nodiscard]] virtual float twips_per_pixel_x() = 0;
   [[nodiscard]] virtual float twips_per_pixel_y() = 0;
 
-  /// Gives the mouse pointer its usual shape back.
+  /// Restores the mouse pointer's normal shape.
   virtual void reset_pointer() = 0;
 };
 
@@ -55,10 +55,10 @@ class Computer {
  public:
   virtual ~Computer() = default;
 
-  /// The machine's own name; empty where it has none.
+  /// The machine's name; empty if it has none.
   [[nodiscard]] virtual Text name() = 0;
 
-  /// The user's separators, as they were when first asked for. The year in it is not the platform's to fill.
+  /// The user's separators as of the first call. The platform does not fill in the year.
   [[nodiscard]] virtual Locale locale() = 0;
 };
 
@@ -70,12 +70,12 @@ class Clock {
   [[nodiscard]] virtual Date now() = 0;
 };
 
-/// A window that is never shown. It closes when the object ends.
+/// A window that is never shown. The destructor closes it.
 class HiddenWindow {
  public:
   virtual ~HiddenWindow() = default;
 
-  /// The platform's window handle, for dialogs that want an owner; 0 where there are no windows.
+  /// The platform's window handle, for dialogs that need an owner; 0 where there are no windows.
   [[nodiscard]] virtual std::intptr_t handle() = 0;
 };
 
@@ -91,23 +91,24 @@ class FormWindows {
   virtual ~FormWindows() = default;
   [[nodiscard]] virtual std::unique_ptr<HiddenWindow> make_hidden(TextView caption) = 0;
 
-  /// A window with controls. The description and the presenter outlive it. Raises 445 where there is no screen.
+  /// Creates a window with controls. The description and the presenter must outlive it. Raises 445 where there is no
+  /// screen.
   [[nodiscard]] virtual std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) = 0;
 
-  /// The preview window, which shows pages; null for those of a third-party control, which shows them itself. Both
-  /// outlive the view.
+  /// Creates the preview window, which shows `pages`, or null if a third-party control displays its own pages. Both
+  /// arguments must outlive the view.
   [[nodiscard]] virtual std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) = 0;
 };
 
-/// The messages that wait for the host's windows.
+/// The messages waiting for the host's windows.
 class MessagePump {
  public:
   virtual ~MessagePump() = default;
 
-  /// Handles every message that waits. False when the thread is asked to quit, which its own loop still hears of.
+  /// Handles every waiting message. Returns false on a request to quit, which the thread's own loop still receives.
   virtual bool handle_waiting() = 0;
 
-  /// Sleeps until there is a message, then handles all. False as above.
+  /// Waits for a message, then handles all. Returns false as above.
   virtual bool wait_and_handle() = 0;
 };
 
@@ -115,12 +116,12 @@ class ControlMakers {
  public:
   virtual ~ControlMakers() = default;
 
-  /// A third-party control that the user has registered to stand for a class name; nothing where none is.
-  /// Raises 429 when one is registered but cannot be created.
+  /// Creates the third-party control that the user has registered for a class name; null if there is none. Raises 429
+  /// if one is registered but cannot be created.
   [[nodiscard]] virtual ObjectRef create(TextView class_name) = 0;
 };
 
-/// What the library needs of the platform. The parts are the caller's and outlive the library.
+/// What the library needs from the platform. The caller owns the parts, which must outlive the library.
 struct Platform {
   MessageBoxes& message_boxes;
   Screen& screen;

@@ -8,7 +8,7 @@
 
 namespace talutil {
 
-/// The entries of the preview window's menus, by name; those with entries below them only open these.
+/// The entries of the preview window's menus, by name; entries with a submenu only open it.
 enum class PreviewMenu : std::uint8_t {
   mnuFile,
   mnuPrinter,
@@ -38,10 +38,10 @@ enum class PreviewMenu : std::uint8_t {
 struct PreviewMenuItem {
   TextView caption;
   PreviewMenu item;
-  std::uint8_t level;  ///< 0 stands in the bar, 1 below it, 2 below that.
+  std::uint8_t level;  ///< 0 is in the menu bar, 1 below it, 2 below that.
 };
 
-/// In their order. "Vertcial" is what users know.
+/// In menu order. Users know the spelling "Vertcial".
 inline constexpr PreviewMenuItem preview_menu[] = {
     {u"File", PreviewMenu::mnuFile, 0},
     {u"Send Document to Printer", PreviewMenu::mnuPrinter, 1},
@@ -73,13 +73,13 @@ class PreviewPages {
  public:
   virtual ~PreviewPages() = default;
 
-  /// The page that is shown; null for none.
+  /// The current page; null if there is none.
   [[nodiscard]] virtual const Page* shown_page() const = 0;
 
-  /// How large it is shown, percent.
+  /// The zoom in percent.
   [[nodiscard]] virtual float zoom_percent() const = 0;
 
-  /// The room between the margins of the page, where it is to be seen.
+  /// The area between the page's margins, if it is to be marked.
   [[nodiscard]] virtual std::optional<TwipsRectangle> guides() const = 0;
 };
 
@@ -88,27 +88,27 @@ class PreviewEvents {
  public:
   virtual ~PreviewEvents() = default;
 
-  /// The window is shown. Coming back from another program does not count.
+  /// The window was shown. Not reported on returning from another program.
   virtual void activated() noexcept = 0;
 
-  /// The window has another size; not reported while it is being made.
+  /// The window was resized; not reported during its creation.
   virtual void resized() noexcept = 0;
   virtual void chosen(PreviewMenu item) noexcept = 0;
 
-  /// A key by the platform's code. Answers the code that it is to be passed on as.
+  /// A key was pressed, as the platform's key code. Returns the code to process instead.
   virtual std::int32_t key_down(std::int32_t code) noexcept = 0;
 
-  /// The window is about to go, whoever has closed it.
+  /// The window is about to close, whatever the reason.
   virtual void closing() noexcept = 0;
 
-  /// The next zoom of the menu, larger or smaller: what Ctrl and the mouse wheel do.
+  /// The user asked for the next larger or smaller zoom of the menu (Ctrl and mouse wheel).
   virtual void zoom_step(bool larger) noexcept = 0;
 };
 
-/// What is raised where a preview cannot be shown.
+/// The description of the error raised where a preview cannot be shown.
 inline constexpr TextView no_screen = u"There is no screen to show the preview on; export the report to PDF instead";
 
-/// The preview window, hidden until it is shown. Sizes are twips.
+/// The preview window, hidden until it is shown. Sizes are in twips.
 class PreviewView {
  public:
   virtual ~PreviewView() = default;
@@ -125,14 +125,14 @@ class PreviewView {
   [[nodiscard]] virtual float inner_width() const = 0;
   [[nodiscard]] virtual float inner_height() const = 0;
 
-  /// The size of the pages' part of the window.
+  /// Sets the size of the area that shows the pages.
   virtual void size_pages(float width, float height) = 0;
   virtual void check(PreviewMenu item, bool is_checked) = 0;
 
-  /// The document, the page or the zoom is another one.
+  /// Call when the document, the page or the zoom has changed.
   virtual void show_page() = 0;
 
-  /// Shows the window and returns when it was closed. Raises 445 where there are no windows.
+  /// Shows the window and returns when it is closed. Raises 445 where there are no windows.
   virtual void show_modal() = 0;
   virtual void close() = 0;
 };

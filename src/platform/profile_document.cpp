@@ -29,7 +29,7 @@ TextView trim(TextView text) noexcept {
 
 bool is_name(TextView a, TextView b) noexcept { return equals_without_case(trim(a), trim(b)); }
 
-/// The name between the brackets; empty where the line is no header.
+/// The name between the brackets; empty if the line is not a header.
 std::optional<TextView> header_name(TextView line) {
   line = trim(line);
   const std::size_t close = line.rfind(u']');
@@ -54,7 +54,7 @@ TextView without_quotes(TextView value) {
   return is_quoted ? value.substr(1, value.size() - 2) : value;
 }
 
-/// Goes through the lines of a part of a text. Empty lines between a CR and an LF do no harm.
+/// Iterates over the lines in a range of a text. The empty lines that CR LF produces do no harm.
 class Lines {
  public:
   Lines(TextView text, std::size_t begin, std::size_t end) : text_(text.substr(0, end)), next_(begin) {}
@@ -122,7 +122,7 @@ std::optional<Text> ProfileDocument::value(TextView section, TextView item) cons
   for (Lines lines(text_, found->begin, found->end); lines.advance();) {
     const TextView line = trim(lines.line());
     if (!line.empty() && is_name(line, up_to_nul(item)))
-      return std::nullopt;  // the first of the name counts, value or not
+      return std::nullopt;  // the first line with the name decides, with or without a value
     const auto candidate = item_of(line);
     if (candidate && is_name(candidate->name, up_to_nul(item))) return Text(without_quotes(candidate->value));
   }
@@ -163,7 +163,7 @@ void ProfileDocument::put(TextView section, TextView item, TextView value) {
     text_.append(u"[").append(section).append(u"]\r\n").append(line).append(u"\r\n");
     return;
   }
-  std::size_t last_end = found->begin;  // of the last line that is not blank
+  std::size_t last_end = found->begin;  // end of the last line that is not blank
   for (Lines lines(text_, found->begin, found->end); lines.advance();) {
     if (trim(lines.line()).empty()) continue;
     last_end = lines.end();
@@ -178,7 +178,7 @@ void ProfileDocument::put(TextView section, TextView item, TextView value) {
     text_.replace(lines.end() - old_value.size(), old_value.size(), line_value);
     return;
   }
-  // The section without a name has no line to follow where the text begins with another section.
+  // The section without a name may be empty, at the very start of the text.
   text_.insert(last_end, last_end == 0 ? line + u"\r\n" : u"\r\n" + line);
 }
 

@@ -9,20 +9,18 @@
 
 namespace talutil {
 
-/// The text of a profile file, read and changed as the Windows platform does it, for platforms that have no profile
-/// files of their own. Where the platform writes a file anew, this changes one line: comments, blank lines and the
-/// spelling of what stays are kept.
+/// The text of a profile file, read and changed by the rules of Windows, for platforms without profile files of their
+/// own. Unlike Windows, which rewrites the file, this changes a single line: comments, blank lines and the spelling of
+/// everything else are kept.
 ///
-/// - Lines end with CR, LF or both. White space and the end-of-file mark 26 around lines, names and values do not
-/// count.
-/// - A line that begins with "[" and has a "]" starts a section, up to the last "]". Lines before the first section
-/// belong
-///   to the section without a name. Of two sections (or items) of one name the first counts.
-/// - A line that begins with ";" is a comment, and one without "=" no item.
-/// - A value in a pair of equal quotes, single or double, loses them.
+/// - Lines end with CR, LF or both. White space and the end-of-file mark 26 are ignored around lines, names and values.
+/// - A line that begins with "[" and contains "]" starts a section; its name extends to the last "]". Lines before the
+///   first section belong to the section without a name. The first of several sections (or items) of one name counts.
+/// - A line that begins with ";" is a comment; a line without "=" is not an item.
+/// - A value in a pair of matching quotes, single or double, is returned without them.
 class ProfileDocument {
  public:
-  /// The bytes of a file: in code page 1252, or in UTF-8 or UTF-16 (low byte first) with the mark that says so.
+  /// Takes the bytes of a file: code page 1252, or UTF-8 or UTF-16 (little-endian) with a byte order mark.
   explicit ProfileDocument(std::string_view bytes);
 
   [[nodiscard]] std::string bytes() const;
@@ -38,11 +36,11 @@ class ProfileDocument {
     friend bool operator==(const Entry&, const Entry&) = default;
   };
 
-  /// All items in the order of their lines, those that others of their name hide among them.
+  /// All items in file order, including those hidden by an earlier item of the same name.
   [[nodiscard]] std::vector<Entry> entries() const;
 
-  /// Puts an item's value, at the end of its section where it is new, and the section at the end of the text where that
-  /// is new. Blanks before the value are left out. Line breaks in the arguments are written as they are.
+  /// Sets an item's value. Adds a new item at the end of its section and a new section at the end of the text. Blanks
+  /// before the value are removed. Line breaks in the arguments are written as they are.
   void put(TextView section, TextView item, TextView value);
 
  private:

@@ -8,8 +8,8 @@
 
 namespace talutil {
 
-/// The registry by the platform's own calls in their ANSI forms: names and texts go through the code page, and every
-/// call answers a status of the platform.
+/// The registry through the platform's ANSI functions: names and texts are converted by the code page, and every call
+/// returns a status code of the platform.
 class Registry {
  public:
   using Handle = std::uintptr_t;
@@ -21,24 +21,24 @@ class Registry {
 
   static constexpr Handle current_user = 0x80000001;
 
-  // What a key is opened for.
+  // Access rights for opening a key.
   static constexpr std::uint32_t query_value = 1;
   static constexpr std::uint32_t set_value = 2;
   static constexpr std::uint32_t all_but_links = 63;
 
   // Types of values.
-  static constexpr std::uint32_t text = 1;  ///< ANSI, its NUL counted.
+  static constexpr std::uint32_t text = 1;  ///< ANSI; the size includes the NUL.
   static constexpr std::uint32_t binary = 3;
   static constexpr std::uint32_t number = 4;  ///< 32 bits, low byte first.
 
   virtual ~Registry() = default;
 
-  /// Opens or creates a key; the handle is left alone when that fails.
+  /// Opens or creates a key; leaves the handle unchanged on failure.
   virtual std::int32_t open(Handle root, const Text& path, std::uint32_t access, Handle& key) = 0;
   virtual std::int32_t create(Handle root, const Text& path, Handle& key) = 0;
   virtual void close(Handle key) = 0;
 
-  /// The type and size of a value and, with a buffer, its bytes.
+  /// Reads the type and size of a value and, if there is a buffer, its bytes.
   virtual std::int32_t query(Handle key, const Text& name, std::uint32_t& type, std::uint32_t& size,
                              std::span<char> buffer) = 0;
   virtual std::int32_t set(Handle key, const Text& name, std::uint32_t type, std::string_view data) = 0;

@@ -6,36 +6,36 @@
 
 namespace talutil {
 
-/// The platform's profile files: sections in brackets, lines of item=value, texts in code page 1252.
+/// The platform's profile files: sections in brackets, lines of the form item=value, text in code page 1252.
 class Profiles {
  public:
-  /// What one read gives at most: its buffer of 1024 characters ends with a NUL.
+  /// The longest value that a read returns: its buffer holds 1024 characters including the NUL.
   static constexpr std::size_t longest_value = 1023;
 
   virtual ~Profiles() = default;
 
-  /// The value of an item; empty when there is none, or no such file. Section and item are found without case, blanks
-  /// around them do not count. Quotes around a value are dropped.
+  /// The value of an item; empty if there is no such item or file. Section and item match regardless of case and
+  /// surrounding blanks. Quotes around the value are removed.
   [[nodiscard]] virtual Text value(const Text& file, const Text& section, const Text& item) = 0;
 
-  /// The names of a section's items in their order, each followed by a NUL.
+  /// The names of a section's items in file order, each followed by a NUL.
   [[nodiscard]] virtual Text item_names(const Text& file, const Text& section) = 0;
 
-  /// Puts a value in the place of the item's, or adds the item at the end of its section, or both at the end of the
-  /// file. A failure is not reported.
+  /// Replaces an item's value, or adds the item at the end of its section, or both at the end of the file. Failures are
+  /// not reported.
   virtual void put(const Text& file, const Text& section, const Text& item, const Text& value) = 0;
 };
 
-/// The user's own settings: texts by application, section and key, found without case. A backslash in an application or
-/// section parts nested keys.
+/// The user's settings: texts by application, section and key, ignoring case. A backslash in an application or section
+/// separates nested keys.
 class SettingsStore {
  public:
   virtual ~SettingsStore() = default;
 
-  /// Empty when there is none. Raises an error that says what is wrong with the store when it cannot be read.
+  /// Empty if there is no such setting. If the store cannot be read, raises an error that says why.
   [[nodiscard]] virtual std::optional<Text> value(const Text& application, const Text& section, const Text& key) = 0;
 
-  /// Raises an error that says what is wrong with the store when it cannot be written.
+  /// If the store cannot be written, raises an error that says why.
   virtual void put(const Text& application, const Text& section, const Text& key, const Text& value) = 0;
 };
 

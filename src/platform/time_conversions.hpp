@@ -4,8 +4,8 @@
 
 namespace talutil {
 
-/// The platform's conversions of broken-down times and of local time, which goes by the offset of today whatever
-/// date is converted. Each leaves its output as it was where the platform refuses, and reports nothing.
+/// The platform's conversions between time formats and to local time, which always use today's UTC offset, whatever
+/// date is converted. Each leaves its output unchanged if the platform rejects the input, and reports nothing.
 class TimeConversions {
  public:
   virtual ~TimeConversions() = default;
@@ -16,7 +16,7 @@ class TimeConversions {
   virtual void utc_to_local(FileTime utc, FileTime& local) = 0;
 };
 
-/// The same where a platform has no more to say than its offset.
+/// The conversions for a platform that only supplies its UTC offset.
 class CalendarTimeConversions : public TimeConversions {
  public:
   void system_to_file(const SystemTime& time, FileTime& result) final {
@@ -27,7 +27,7 @@ class CalendarTimeConversions : public TimeConversions {
   void utc_to_local(FileTime utc, FileTime& local) final { local = utc + utc_offset_seconds() * file_time_second; }
 
  protected:
-  /// What local time is ahead of UTC today, daylight saving included.
+  /// Seconds by which local time is ahead of UTC today, including daylight saving time.
   [[nodiscard]] virtual std::int64_t utc_offset_seconds() = 0;
 };
 

@@ -59,14 +59,14 @@ void raise_for(int code, const std::string& path) {
 }
 
 Descriptor open_file(const std::string& path, int flags) {
-  // Without waiting: a pipe would have to be opened at its other end first.
+  // Non-blocking, because opening a pipe would otherwise wait for its other end.
   Descriptor file(open(path.c_str(), flags | O_CLOEXEC | O_NONBLOCK, file_rights));
   if (file.get() < 0) raise_for(errno, path);
   struct stat status {};
   if (fstat(file.get(), &status) != 0) raise_for(errno, path);
   if (S_ISDIR(status.st_mode)) raise(ErrorNumber::path_file_access);
   if (!S_ISREG(status.st_mode)) raise(ErrorNumber::bad_file_name_or_number);
-  // Read-only is an attribute of the file here, whatever the user may do.
+  // Read-only is an attribute of the file here, regardless of the user's own rights.
   const bool may_write = (status.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)) != 0;
   if ((flags & O_ACCMODE) != O_RDONLY && !may_write) raise(ErrorNumber::path_file_access);
   return file;
@@ -74,10 +74,10 @@ Descriptor open_file(const std::string& path, int flags) {
 
 void lock(const Descriptor& file, int operation) {
   using namespace std::chrono_literals;
-  // Appending holds a lock for microseconds; what holds one for longer does not mean to let go.
+  // Appending holds its lock for microseconds; a lock that is held for longer will not be released soon.
   const auto end = std::chrono::steady_clock::now() + 2s;
   while (flock(file.get(), operation | LOCK_NB) != 0) {
-    if (errno != EINTR && errno != EWOULDBLOCK) return;  // A file system without locks.
+    if (errno != EINTR && errno != EWOULDBLOCK) return;  // The file system has no locks.
     if (std::chrono::steady_clock::now() > end) raise(ErrorNumber::permission_denied);
     std::this_thread::sleep_for(100us);
   }

@@ -8,7 +8,7 @@
 
 namespace talutil::posix {
 
-/// An open file of the system, closed at its end.
+/// An open file descriptor; the destructor closes it.
 class Descriptor {
  public:
   explicit Descriptor(int number = -1) noexcept : number_(number) {}
@@ -25,16 +25,16 @@ class Descriptor {
   int number_;
 };
 
-/// Opens a regular file. Raises as Files says; a folder is 75, a device or a pipe 52.
+/// Opens a regular file. Raises the same errors as Files; a folder is 75, a device or a pipe 52.
 [[nodiscard]] Descriptor open_file(const std::string& path, int flags);
 
-/// Waits a moment for a lock (LOCK_SH, LOCK_EX) that another holds; raises 70 when it stays.
+/// Takes a lock (LOCK_SH, LOCK_EX), waiting briefly for another holder; raises 70 if it is not released.
 void lock(const Descriptor& file, int operation);
 
-/// Writes all of it. Raises 61 or 57.
+/// Writes all bytes. Raises 61 or 57.
 void write_all(const Descriptor& file, std::string_view bytes);
 
-/// The run-time error for an error code of the system about a path.
+/// Raises the run-time error for a system error code concerning a path.
 [[noreturn]] void raise_for(int code, const std::string& path);
 
 }  // namespace talutil::posix

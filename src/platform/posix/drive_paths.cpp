@@ -48,7 +48,7 @@ bool has_drive(TextView path) {
 
 bool is_separator(char16_t unit) { return separators.find(unit) != TextView::npos; }
 
-/// The spelling of a name in a folder; nothing when it is not there in any.
+/// The actual spelling of a name in a folder; nothing if the folder has no such entry.
 std::optional<std::string> find_entry(const std::string& folder, TextView name) {
   std::string spelled = to_utf8(name);
   if (exists(folder + "/" + spelled)) return spelled;
@@ -63,7 +63,7 @@ std::optional<std::string> find_entry(const std::string& folder, TextView name) 
 
 TextView without_trailing_dots(TextView name) { return name.substr(0, name.find_last_not_of(u". ") + 1); }
 
-/// A folder's path with one more part.
+/// The path of an entry in a folder.
 std::string below(const std::string& folder, TextView part) {
   if (const auto entry = find_entry(folder, part)) return folder + "/" + *entry;
   const TextView trimmed = without_trailing_dots(part);
@@ -96,7 +96,7 @@ DrivePaths::Place DrivePaths::place_of(TextView path) const {
   const std::string drive = folder_of(letter);
   if (!drive.empty() && !is_folder(drive)) raise(ErrorNumber::path_not_found);
   const bool is_relative = path.empty() || !is_separator(path.front());
-  // A drive that is not the current one is at its root: nothing here moves it from there.
+  // A drive other than the current one is always at its root: nothing here changes its folder.
   return {is_relative && letter == current_drive() ? process_folder() : drive, path};
 }
 
@@ -136,7 +136,7 @@ Text DrivePaths::current_folder(TextView drive) const {
 
 void DrivePaths::provide_drive_of(TextView path) const {
   if (!has_drive(path) || lower_case(path[0]) != u'c') return;
-  std::error_code ignored;  // What could not be made is missing afterwards.
+  std::error_code ignored;  // If this fails, the drive is simply missing.
   std::filesystem::create_directories(folder_of(u'c'), ignored);
 }
 

@@ -6,26 +6,26 @@
 
 namespace talutil::posix {
 
-/// Where Windows paths lie here. Drive X: is the folder "x" below the drives root, Z: is "/"; the root is named by
-/// TALUTIL_DRIVES, else it is "talutil/drives" in the user's data folder. Paths without a drive work as they are.
-/// Names are found without regard to case, an exact one first, and without their trailing dots and blanks.
+/// Maps Windows paths to native ones. Drive X: is the folder "x" in the drives root, Z: is "/". The root is
+/// TALUTIL_DRIVES or, if that is not set, "talutil/drives" in the user's data folder. Paths without a drive work as
+/// they are. Names are found regardless of case (an exact match wins) and of trailing dots and blanks.
 class DrivePaths {
  public:
   DrivePaths();
 
-  /// The native path. What does not exist yet keeps its spelling; ".." never leaves a drive. Raises 76 for a drive
-  /// that is missing, and for a network path.
+  /// The native path. Parts that do not exist keep their spelling; ".." never leaves a drive. Raises 76 for a missing
+  /// drive and for a network path.
   [[nodiscard]] std::string native(TextView path) const;
 
-  /// As Files::current_folder.
+  /// See Files::current_folder.
   [[nodiscard]] Text current_folder(TextView drive) const;
 
-  /// Makes the folder of drive C:, which every machine has, when a path lies on it.
+  /// Creates the folder of drive C:, which every machine has, if the path is on that drive.
   void provide_drive_of(TextView path) const;
 
  private:
   struct Place {
-    std::string base;  ///< Without a separator at its end: "" for "/".
+    std::string base;  ///< Without a trailing separator: "" for "/".
     TextView rest;
   };
 

@@ -13,7 +13,7 @@ namespace {
 
 constexpr int longest_wait_in_milliseconds = 10'000;
 
-/// What keys and names are found by.
+/// The form of a key or name that is used for look-up.
 std::string folded(TextView name) { return to_utf8(upper_case(name)); }
 
 std::string column_bytes(sqlite3_stmt* statement, int column) {
@@ -64,14 +64,14 @@ void Hive::bind(const Statement& statement, int place, std::string_view text) co
 void Hive::bind_tree(const Statement& statement, TextView key) const {
   const std::string whole = folded(key);
   bind(statement, 1, whole);
-  // "]" is what follows "\".
+  // "]" is the character after "\".
   bind(statement, 2, whole + '\\');
   bind(statement, 3, whole + ']');
 }
 
 void Hive::open() {
   if (database_) return;
-  std::error_code ignored;  // SQLite reports below that it cannot open the file.
+  std::error_code ignored;  // If this fails, SQLite reports below that it cannot open the file.
   std::filesystem::create_directories(std::filesystem::path(path_).parent_path(), ignored);
   sqlite3* handle = nullptr;
   const int status = sqlite3_open(path_.c_str(), &handle);
@@ -79,7 +79,8 @@ void Hive::open() {
   try {
     require(status, SQLITE_OK);
     sqlite3_busy_timeout(handle, longest_wait_in_milliseconds);
-    // With the log a reader never waits for a writer; what was written survives the process, if not a power cut.
+    // With a write-ahead log readers never wait for writers; changes survive a crash of the process, if not a power
+    // cut.
     constexpr const char* preparation = R"(
         PRAGMA journal_mode = WAL;
         PRAGMA synchronous = NORMAL;
@@ -127,7 +128,7 @@ void Hive::put(TextView key, TextView name, const Value& value) {
   require(sqlite3_bind_int64(row, 5, value.type), SQLITE_OK);
   bind(insert_, 6, value.data);
   const int status = sqlite3_step(row);
-  // The reason goes with the reset, so it is read first.
+  // The reset discards the error message, so check first.
   require(status, SQLITE_DONE);
   sqlite3_reset(row);
 }

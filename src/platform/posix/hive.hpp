@@ -13,11 +13,11 @@ struct sqlite3_stmt;
 
 namespace talutil::posix {
 
-/// The registry hive of the user where the platform has no registry: keys with named values, in one SQLite file that
-/// every process of the user shares. Keys and names are found without case and keep the spelling they were first given.
+/// The user's registry hive where the platform has no registry: keys with named values, in one SQLite file that all
+/// processes of the user share. Keys and names are found regardless of case and keep their original spelling.
 ///
-/// The file is opened at the first use. Writes wait for those of others (at most ten seconds) and are complete when the
-/// call returns. Whatever SQLite refuses raises 57 with a description that names the file and the reason.
+/// The file is opened on first use. Writes wait up to ten seconds for other writers and are complete when the call
+/// returns. SQLite errors raise 57 with a description that names the file and the reason.
 class Hive {
  public:
   struct Value {
@@ -39,18 +39,18 @@ class Hive {
   [[nodiscard]] std::optional<Value> value(TextView key, TextView name);
   void put(TextView key, TextView name, const Value& value);
 
-  /// All values of a key and of the keys below it, by key and name.
+  /// All values of a key and of the keys below it, sorted by key and name.
   [[nodiscard]] std::vector<NamedValue> values_below(TextView key);
 
-  /// Whether a key was added, or it or one below it has a value.
+  /// Whether a key was added, or a value exists in it or below it.
   [[nodiscard]] bool has_key(TextView key);
 
-  /// Makes a key that exists without values; one that exists stays as it is.
+  /// Adds a key without values; does nothing if it exists.
   void add_key(TextView key);
 
   [[nodiscard]] const std::string& path() const noexcept { return path_; }
 
-  /// The user's own: TALUTIL_HIVE, or talutil/hive.db in the user's data folder.
+  /// The user's hive: TALUTIL_HIVE, or talutil/hive.db in the user's data folder.
   [[nodiscard]] static std::string default_path();
 
  private:
@@ -67,7 +67,7 @@ class Hive {
   void require(int status, int expected) const;
   [[nodiscard]] Statement prepare(const char* sql) const;
   void bind(const Statement& statement, int place, std::string_view text) const;
-  /// A key as ?1, and the bounds of the keys below it as ?2 and ?3.
+  /// Binds the key as ?1, and the bounds of the keys below it as ?2 and ?3.
   void bind_tree(const Statement& statement, TextView key) const;
   [[nodiscard]] sqlite3_stmt* start(Statement& statement, const char* sql);
 

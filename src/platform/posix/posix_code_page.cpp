@@ -16,7 +16,7 @@ namespace {
 
 struct PageRow {
   std::uint32_t number;
-  const char* name;  ///< The C library's.
+  const char* name;  ///< The C library's name for it.
   std::size_t longest_character;
 };
 
@@ -39,12 +39,12 @@ struct CloseConverter {
   void operator()(void* converter) const noexcept { iconv_close(converter); }
 };
 
-/// A conversion of one character at a time between two encodings.
+/// Converts one character at a time from one encoding to another.
 class Converter {
  public:
   Converter(const char* to, const char* from) {
     const iconv_t opened = iconv_open(to, from);
-    // NOLINTNEXTLINE(performance-no-int-to-ptr,cppcoreguidelines-pro-type-cstyle-cast): how the C library says no.
+    // NOLINTNEXTLINE(performance-no-int-to-ptr,cppcoreguidelines-pro-type-cstyle-cast): how iconv reports failure.
     if (opened == (iconv_t)-1) {
       throw std::runtime_error(std::string("the C library has no conversion from ") + from + " to " + to +
                                "; install its character sets (gconv modules)");
@@ -52,17 +52,17 @@ class Converter {
     handle_.reset(opened);
   }
 
-  /// Nothing where the bytes are not whole characters of the one encoding that the other holds.
+  /// Returns nothing if the bytes are not whole characters, or the target encoding lacks them.
   [[nodiscard]] std::optional<std::string> convert(std::string character) const {
     std::array<char, 16> converted{};
     char* from = character.data();
     std::size_t left = character.size();
     char* end = converted.data();
     std::size_t room = converted.size();
-    // Each character begins afresh, whatever became of the one before.
+    // Each character starts from the initial state, whatever the one before left behind.
     iconv(handle_.get(), nullptr, nullptr, nullptr, nullptr);
     if (iconv(handle_.get(), &from, &left, &end, &room) == failed) return std::nullopt;
-    // Pages 1255 and 1258 hold a letter back in case that a mark for it follows.
+    // Pages 1255 and 1258 hold back a letter in case a combining mark follows.
     if (iconv(handle_.get(), nullptr, nullptr, &end, &room) == failed) return std::nullopt;
     return std::string(converted.data(), end);
   }
@@ -107,7 +107,7 @@ class LibraryCodePage final : public CodePage {
 
   void append(std::string& bytes, TextView character) const {
     const auto converted = to_page_.convert(to_utf16_bytes(character));
-    // A letter that the page spells as a letter and a mark is none of its own.
+    // A letter that the page can only spell as letter plus mark does not count as one of its characters.
     if (converted && converted->size() <= longest_character_) {
       bytes += *converted;
     } else {
@@ -115,7 +115,7 @@ class LibraryCodePage final : public CodePage {
     }
   }
 
-  /// Appends the first character of the bytes; gives its length, 1 for a byte that begins none.
+  /// Appends the first character of the bytes; returns its length, 1 for a byte that does not begin a character.
   [[nodiscard]] std::size_t append_character(Text& text, std::string_view bytes) const {
     for (std::size_t length = 1; length <= std::min(longest_character_, bytes.size()); ++length) {
       if (const auto converted = from_page_.convert(std::string(bytes.substr(0, length)))) {

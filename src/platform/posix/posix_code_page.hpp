@@ -8,16 +8,15 @@
 
 namespace talutil::posix {
 
-/// The numbers of the code pages there are.
+/// The numbers of the supported code pages.
 [[nodiscard]] std::vector<std::uint32_t> code_page_numbers();
 
-/// The number in TALUTIL_CODE_PAGE; 1252 where that is not set. Throws std::runtime_error for one that there is no page
-/// of.
+/// The number in TALUTIL_CODE_PAGE; 1252 if that is not set. Throws std::runtime_error if there is no such page.
 [[nodiscard]] std::uint32_t chosen_code_page();
 
-/// 1252 is the table of our own. The others are the C library's: it knows no best fit, so what a page does not hold is
-/// "?" (U+FFFD in UTF-8), and so are bytes that are no character U+FFFD. Throws std::runtime_error for an unknown page,
-/// and where the machine lacks the C library's table of it.
+/// Creates a code page: 1252 from our own table, others from the C library. The latter has no best fit, so a character
+/// that the page lacks becomes "?" (U+FFFD in UTF-8), and bytes that are not a character become U+FFFD. Throws
+/// std::runtime_error for an unknown page, and if the C library's table of it is not installed.
 [[nodiscard]] std::unique_ptr<CodePage> make_code_page(std::uint32_t number);
 
 }  // namespace talutil::posix

@@ -29,12 +29,12 @@ enum Direction : int { decrypting, encrypting };
 Context start(Direction direction, const Cryptography::Key& key, const Cryptography::Nonce& nonce) {
   Context context(EVP_CIPHER_CTX_new());
   require(context != nullptr);
-  // The mode's own length of a nonce is the one that is used here.
+  // The nonce has the mode's default length.
   require(EVP_CipherInit_ex(context.get(), EVP_aes_256_gcm(), nullptr, key.data(), nonce.data(), direction) == 1);
   return context;
 }
 
-/// Feeds bytes of any number; where there is no room for the result, they are only authenticated.
+/// Processes any number of bytes; if `result` is null, they are only authenticated.
 void feed(EVP_CIPHER_CTX* context, ByteView bytes, std::uint8_t* result) {
   constexpr std::size_t most_at_once = std::size_t{1} << 30U;
   for (std::size_t at = 0; at < bytes.size(); at += most_at_once) {
@@ -46,7 +46,7 @@ void feed(EVP_CIPHER_CTX* context, ByteView bytes, std::uint8_t* result) {
 }
 
 bool finish(EVP_CIPHER_CTX* context) {
-  // The mode leaves nothing over; the buffer is asked for all the same.
+  // The mode leaves no remainder, but the function requires a buffer.
   std::array<std::uint8_t, EVP_MAX_BLOCK_LENGTH> rest{};
   int written = 0;
   return EVP_CipherFinal_ex(context, rest.data(), &written) == 1;

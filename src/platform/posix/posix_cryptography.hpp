@@ -4,13 +4,13 @@
 
 namespace talutil::posix {
 
-/// The kernel's random bytes.
+/// Random bytes from the kernel.
 class PosixRandomSource final : public RandomSource {
  public:
   void fill(std::span<std::uint8_t> bytes) override;
 };
 
-/// OpenSSL's.
+/// Implemented by OpenSSL.
 class PosixCryptography final : public Cryptography {
  public:
   Tag seal(const Key& key, const Nonce& nonce, ByteView associated, std::span<std::uint8_t> data) override;

@@ -19,7 +19,7 @@ bool exists(const Text& path) {
   }
 }
 
-/// A path from what was typed: a name alone lies in the folder of the dialog.
+/// The path for what was typed: a bare name is in the dialog's folder.
 Text path_of(const FileDialog& dialog, const Text& name) {
   Text path = name;
   const std::size_t name_start = path.find_last_of(u"\\/:") + 1;
@@ -32,7 +32,7 @@ Text path_of(const FileDialog& dialog, const Text& name) {
   return path;
 }
 
-/// Whether the file may be the answer, by the flags of the dialog.
+/// Whether the dialog's flags allow this file.
 bool is_accepted(const FileDialog& dialog, const Text& path) {
   if (dialog.purpose == FileDialog::Purpose::open) {
     if ((dialog.flags & file_dialog_flag::file_must_exist) == 0 || exists(path)) return true;

@@ -23,7 +23,7 @@ namespace {
 
 constexpr mode_t all_write_bits = S_IWUSR | S_IWGRP | S_IWOTH;
 
-/// The attribute that other programs that bring Windows files here store too.
+/// The attributes that other programs store here for files from Windows.
 std::uint32_t stored_attributes(const std::string& path) {
   std::array<char, 32> text{};
   if (lgetxattr(path.c_str(), "user.DOSATTRIB", text.data(), text.size() - 1) <= 0) return 0;
@@ -36,7 +36,7 @@ std::uint32_t attributes_of(const std::string& path, const struct stat& status) 
   return stored_attributes(path) | attributes_by_status(name, status);
 }
 
-/// Whether a search with the mask gives an entry. Neither files nor folders (devices, dead links) are given.
+/// Whether a search with the mask finds an entry. Devices, dead links and the like never are.
 bool is_searched_for(const std::string& path, std::uint32_t mask) {
   constexpr std::uint32_t passed_over = file_attribute::hidden | file_attribute::system | file_attribute::folder;
   struct stat status {};
@@ -44,7 +44,7 @@ bool is_searched_for(const std::string& path, std::uint32_t mask) {
   return (attributes_of(path, status) & passed_over & ~mask) == 0;
 }
 
-/// A path cut into the folder, as it was written, and the name or pattern in it.
+/// A path split into the folder, as written, and the name or pattern in it.
 struct FolderAndName {
   Text folder;
   Text name;
@@ -88,16 +88,16 @@ class PosixInputFile final : public InputFile {
   std::uint64_t done_ = 0;
 };
 
-/// Writes beside the file and takes its place at the end. Where the folder takes no new file, the old one is
-/// overwritten as it lies.
+/// Writes a temporary file that replaces the target when it is closed. If the folder does not allow new files,
+/// overwrites the target in place.
 class PosixOutputFile final : public OutputFile {
  public:
   explicit PosixOutputFile(std::string path) : path_(std::move(path)) {
-    // Whatever is wrong with the target shows now and not when everything is written.
+    // Problems with the target are reported now, not after everything has been written.
     if (access(path_.c_str(), F_OK) == 0) {
       target_ = open_file(path_, O_WRONLY);
       lock(target_, LOCK_EX);
-      // The file that a link leads to is replaced, not the link.
+      // Replaces the file that a link points to, not the link.
       path_ = std::filesystem::canonical(path_).string();
     } else if (errno != ENOENT) {
       raise_for(errno, path_);
@@ -133,12 +133,12 @@ class PosixOutputFile final : public OutputFile {
     if (ftruncate(file_.get(), 0) != 0) raise_for(errno, path_);
   }
 
-  /// Those of the file that is replaced, or of any new one.
+  /// Sets the rights of the file being replaced, or the default ones.
   void set_rights() const {
     struct stat status {};
     if (target_.get() >= 0 && fstat(target_.get(), &status) == 0) {
       fchmod(file_.get(), status.st_mode & 07777);
-      if (fchown(file_.get(), status.st_uid, status.st_gid) != 0) return;  // Only an administrator gives files away.
+      if (fchown(file_.get(), status.st_uid, status.st_gid) != 0) return;  // Only an administrator can give files away.
     } else {
       const mode_t mask = umask(0);
       umask(mask);
@@ -248,7 +248,7 @@ void PosixFiles::append(const Text& path, std::string_view bytes) {
   try {
     write_all(file, bytes);
   } catch (const RunTimeError&) {
-    // A part of the line is worse than none: the next one would be glued to it.
+    // A partial line is worse than none, because the next one would be joined to it.
     if (ftruncate(file.get(), before.st_size) != 0) raise(ErrorNumber::device_io_error);
     throw;
   }

@@ -7,14 +7,14 @@
 
 namespace talutil::posix {
 
-/// The attributes that the name and the status of a file tell: hidden, folder, read-only.
+/// The attributes that follow from the name and status of a file: hidden, folder, read-only.
 [[nodiscard]] std::uint32_t attributes_by_status(std::string_view name, const struct stat& status);
 
-/// Files and folders as DrivePaths places them. Hidden are names with a leading dot and files whose stored attribute
-/// says so (the extended attribute user.DOSATTRIB, "0x2"); read-only are files that nobody may write.
+/// Files and folders, mapped by DrivePaths. Names with a leading dot are hidden, as are files whose stored attribute
+/// says so (the extended attribute user.DOSATTRIB, "0x2"); files that nobody may write are read-only.
 class PosixFiles final : public Files {
  public:
-  /// Called while a file is read: how far, and how much there is, in bytes.
+  /// Called while a file is being read, with the bytes read so far and the total.
   using Progress = std::function<void(std::uint64_t done, std::uint64_t total)>;
   void set_progress(Progress progress) { progress_ = std::move(progress); }
 

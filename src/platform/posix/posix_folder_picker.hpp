@@ -4,7 +4,7 @@
 
 namespace talutil::posix {
 
-/// Asks at the terminal; without one, the answer is that of a closed dialog.
+/// Asks at the terminal; without one, behaves like a dialog that was cancelled.
 class PosixFolderPicker final : public FolderPicker {
  public:
   std::optional<Text> choose(TextView title, std::intptr_t owner) override;

@@ -33,7 +33,7 @@ FileFacts facts_of(const struct stat& status, const char* name) {
   return facts;
 }
 
-/// Reads at a place until the buffer is full or the file ends.
+/// Reads from an offset until the buffer is full or the file ends.
 std::size_t read_file(const Descriptor& file, std::uint64_t offset, std::span<char> buffer) {
   std::size_t done = 0;
   while (done < buffer.size()) {
@@ -67,7 +67,7 @@ class PosixStoredFile final : public StoredFile {
   std::uint64_t size_ = 0;
 };
 
-/// A name that no other file in the making has.
+/// A name that no other temporary file has.
 std::string temporary_name() {
   static std::atomic<unsigned> next{0};
   return ".talutil-" + std::to_string(getpid()) + "-" + std::to_string(next++);
@@ -132,7 +132,7 @@ class PosixNewFile final : public NewFile {
   void open_replaced() {
     struct stat status {};
     if (fstatat(folder_.get(), name_.c_str(), &status, AT_SYMLINK_NOFOLLOW) != 0) return;
-    if (S_ISLNK(status.st_mode)) return;  // The link is replaced, not what it leads to.
+    if (S_ISLNK(status.st_mode)) return;  // Replaces the link, not what it points to.
     if ((attributes_by_status(name_, status) & (file_attribute::read_only | file_attribute::folder)) != 0) {
       raise(ErrorNumber::path_file_access);
     }
@@ -157,7 +157,7 @@ class PosixFolder final : public Folder {
   explicit PosixFolder(Descriptor folder) : folder_(std::move(folder)) {}
 
   [[nodiscard]] Text path() const override {
-    std::error_code ignored;  // A folder that was deleted has an empty path.
+    std::error_code ignored;  // The path of a deleted folder is empty.
     return from_utf8(std::filesystem::read_symlink("/proc/self/fd/" + std::to_string(folder_.get()), ignored).string());
   }
 
@@ -168,7 +168,7 @@ class PosixFolder final : public Folder {
     while (const dirent* const entry = readdir(listing.get())) {
       const std::string_view name = entry->d_name;
       if (name == "." || name == "..") continue;
-      // What vanished meanwhile is no entry.
+      // An entry that has vanished in the meantime is skipped.
       if (const auto known = native_facts(entry->d_name)) found(from_utf8(name), *known);
     }
   }
@@ -178,7 +178,7 @@ class PosixFolder final : public Folder {
   [[nodiscard]] std::unique_ptr<StoredFile> open(TextView name) override {
     Descriptor file(openat(folder_.get(), to_utf8(name).c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     if (file.get() < 0) raise_for(errno, {});
-    // What another writes just now is not to be read; from here on its locks do not concern us.
+    // Do not read a file that is being written; from here on, others' locks do not matter.
     lock(file, LOCK_SH);
     flock(file.get(), LOCK_UN);
     return std::make_unique<PosixStoredFile>(std::move(file));

@@ -1,4 +1,4 @@
-// Boxes on the terminal; windows with more than a box has cannot be shown there.
+// Forms that are simple boxes are shown on the terminal; others cannot be shown.
 #include <algorithm>
 #include <iostream>
 #include <map>

@@ -4,10 +4,10 @@
 
 namespace talutil::posix {
 
-/// GUIDs of random bits, marked as such (version 4), as the Windows platform makes them.
+/// Random GUIDs (version 4), like those of the Windows platform.
 class PosixGuids final : public Guids {
  public:
-  /// Raises 51 where the system has no random bits to give.
+  /// Raises 51 if the system cannot supply random bits.
   Text make() override;
 };
 

@@ -11,7 +11,7 @@ namespace talutil::posix {
 
 namespace {
 
-/// Keeps the terminal from showing what is typed.
+/// Turns off the terminal's echo.
 class Silence {
  public:
   Silence() {

@@ -4,7 +4,7 @@
 
 namespace talutil::posix {
 
-/// Asks at the terminal, which shows nothing of what is typed into a masked entry.
+/// Asks at the terminal, without echo for masked entries.
 class PosixInputBoxes final : public InputBoxes {
  public:
   [[nodiscard]] std::optional<Text> ask(TextView prompt, TextView title, Entry entry) override;

@@ -26,7 +26,7 @@ namespace talutil::posix {
 
 namespace {
 
-/// The value of the first "KEY: VALUE" or "KEY=VALUE" line of a file of the system.
+/// The value of the first "KEY: VALUE" or "KEY=VALUE" line with that key in a system file.
 std::string value_in(const char* path, std::string_view key) {
   std::ifstream file(path);
   for (std::string line; std::getline(file, line);) {
@@ -73,7 +73,7 @@ std::vector<DriveFacts> PosixMachine::drives() {
   std::array<char, 4096> buffer{};
   while (getmntent_r(table.get(), &entry, buffer.data(), static_cast<int>(buffer.size())) != nullptr) {
     struct statvfs status {};
-    // What has no blocks is the system's view of itself; a place that is mounted twice counts once.
+    // File systems without blocks are virtual; one that is mounted twice is listed once.
     if (statvfs(entry.mnt_dir, &status) != 0 || status.f_blocks == 0) continue;
     if (status.f_fsid != 0 && !seen.insert(status.f_fsid).second) continue;
     drives.push_back({from_utf8(entry.mnt_dir), kind_of(entry.mnt_type, entry.mnt_fsname), from_utf8(entry.mnt_fsname),

@@ -5,7 +5,7 @@
 
 namespace talutil::posix {
 
-/// By way of /proc, and what the system's calls tell.
+/// Reads /proc and uses system calls.
 class PosixMachine final : public Machine {
  public:
   [[nodiscard]] std::vector<DriveFacts> drives() override;

@@ -17,7 +17,7 @@ constexpr std::size_t count_size = 4;
 constexpr std::size_t row_size = 24;
 
 struct Row {
-  in_addr_t address;  ///< Network order, as the mask.
+  in_addr_t address;  ///< Both in network order.
   in_addr_t mask;
 };
 

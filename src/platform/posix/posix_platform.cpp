@@ -35,7 +35,7 @@ struct FreeLocale {
 };
 using LocaleHandle = std::unique_ptr<std::remove_pointer_t<locale_t>, FreeLocale>;
 
-/// The first character of a text of the locale; the given one where it is empty or not UTF-8.
+/// The first character of a text of the locale; `otherwise` if the text is empty or not UTF-8.
 char16_t first_character(std::string_view text, char16_t otherwise) {
   const Text decoded = from_utf8(text);
   return decoded.empty() || decoded.front() == u'\uFFFD' ? otherwise : decoded.front();
@@ -49,7 +49,7 @@ class Window final : public HiddenWindow {
 Locale environment_locale() {
   Locale result;
   const LocaleHandle environment(newlocale(LC_CTYPE_MASK | LC_NUMERIC_MASK | LC_MONETARY_MASK, "", nullptr));
-  // An environment that names a locale the machine does not have.
+  // The environment names a locale that is not installed.
   if (!environment) return result;
   const auto item = [&](nl_item wanted) { return std::string_view(nl_langinfo_l(wanted, environment.get())); };
 
@@ -59,7 +59,7 @@ Locale environment_locale() {
   if (result.thousands_separator == result.decimal_separator) {
     result.thousands_separator = result.decimal_separator == u',' ? u'.' : u',';
   }
-  // The first character stands for the symbol's place.
+  // The first character gives the symbol's position.
   if (const auto currency = item(CRNCYSTR); !currency.empty()) {
     result.set_currency(from_utf8(currency.substr(1)));
   }
@@ -70,7 +70,7 @@ Locale environment_locale() {
 
 MessageAnswer PosixMessageBoxes::show(TextView text, MessageButtons buttons, TextView title) {
   const std::string caption = title.empty() ? program_invocation_short_name : to_utf8(title);
-  // What the program has printed so far belongs before the box.
+  // Flush what the program has printed so far, so that it precedes the box.
   std::cout.flush();
   std::cerr << caption << ": " << to_utf8(text) << '\n';
   return buttons == MessageButtons::ok ? ask_ok() : ask_yes_no();

@@ -25,7 +25,7 @@ class PosixMessageBoxes final : public MessageBoxes {
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override;
 };
 
-/// There is no screen to ask: 96 dots an inch, which documents and forms are laid out for.
+/// There is no screen to ask; 96 dpi is what documents and forms are designed for.
 class PosixScreen final : public Screen {
  public:
   float twips_per_pixel_x() override { return standard_twips_per_pixel; }
@@ -38,10 +38,10 @@ class PosixScreen final : public Screen {
 
 class PosixComputer final : public Computer {
  public:
-  /// The host's name without its domain, in upper case, as hosts of the library know computers.
+  /// The host name without its domain, in upper case, as hosts of the library know computers.
   Text name() override;
 
-  /// From the environment (LC_ALL, LC_NUMERIC and so on); what it leaves open is as in the standard locale.
+  /// From the environment (LC_ALL, LC_NUMERIC and so on), with defaults for whatever it leaves open.
   Locale locale() override;
 
  private:
@@ -69,14 +69,14 @@ class PosixControlMakers final : public ControlMakers {
   ObjectRef create(TextView /*class_name*/) override { return nullptr; }
 };
 
-/// There are no messages; a signal that the program handles counts as being asked to quit.
+/// There are no messages; a signal that the program handles counts as a request to quit.
 class PosixMessagePump final : public MessagePump {
  public:
   bool handle_waiting() override { return true; }
   bool wait_and_handle() override;
 };
 
-/// Nothing can be drawn on where there are no windows.
+/// Without windows there is nothing to draw on.
 class PosixDrawing final : public Drawing {
  public:
   void draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text, std::int32_t colour,
@@ -84,7 +84,7 @@ class PosixDrawing final : public Drawing {
   [[nodiscard]] WindowImage image_of(std::intptr_t window) override;
 };
 
-/// TrueType fonts of the system's folder.
+/// TrueType fonts from the system's font folders.
 class PosixFontFiles final : public FontFiles {
  public:
   [[nodiscard]] std::vector<std::uint8_t> wide_font(bool is_fixed_width) override;
@@ -97,10 +97,9 @@ class PosixWindowPrinting final : public WindowPrinting {
   void send_to_printer(std::int32_t window) override;
 };
 
-/// One of each, for a library to use. Must outlive it.
+/// One instance of each implementation, for a library to use. Must outlive the library.
 struct PosixPlatform {
-  /// With the code page that the environment chooses, or the one of a number. Throws std::runtime_error for an unknown
-  /// one.
+  /// Uses the code page chosen by the environment, or the given one. Throws std::runtime_error if it is unknown.
   PosixPlatform() : PosixPlatform(chosen_code_page()) {}
   explicit PosixPlatform(std::uint32_t code_page_number) : code_page(make_code_page(code_page_number)) {}
 

@@ -9,7 +9,7 @@ namespace talutil::posix {
 
 namespace {
 
-/// Sizes are kept, nothing is shown.
+/// Keeps sizes but shows nothing.
 class PreviewWindow final : public PreviewView {
  public:
   void set_caption(TextView /*caption*/) override {}
@@ -42,7 +42,7 @@ std::unique_ptr<PreviewView> PosixFormWindows::make_preview(PreviewEvents& /*eve
 WindowImage PosixDrawing::image_of(std::intptr_t /*window*/) { raise(ErrorNumber::action_not_supported); }
 
 std::vector<std::uint8_t> PosixFontFiles::wide_font(bool is_fixed_width) {
-  // Where the distributions put the two families that have most scripts.
+  // Where distributions install the two font families that cover most scripts.
   static constexpr std::array folders{"/usr/share/fonts/truetype/dejavu/", "/usr/share/fonts/dejavu/",
                                       "/usr/share/fonts/TTF/"};
   const std::string name = is_fixed_width ? "DejaVuSansMono.ttf" : "DejaVuSans.ttf";

@@ -18,7 +18,7 @@ namespace talutil::posix {
 
 namespace {
 
-/// A file that goes with the object.
+/// A file that the destructor deletes.
 class TemporaryFile {
  public:
   TemporaryFile() {

@@ -5,7 +5,7 @@
 
 namespace talutil::posix {
 
-/// Hands documents, as PDF, to the system's "lp". There is no dialog: the system's default printer takes them.
+/// Passes documents to the system's "lp" as PDF. There is no dialog: they go to the default printer.
 class PosixPrinters final : public Printers {
  public:
   explicit PosixPrinters(FontFiles& fonts) noexcept : fonts_(fonts) {}

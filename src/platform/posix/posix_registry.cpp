@@ -19,7 +19,7 @@ constexpr std::array<Root, 4> roots = {{
     {0x80000003, u"HKEY_USERS"},
 }};
 
-/// The full name of a key, without separators at its ends; empty for a root that there is not.
+/// The full name of a key, without separators at either end; empty for an unknown root.
 Text full_name(Registry::Handle root, TextView path) {
   const auto* const found = std::ranges::find(roots, root, &Root::handle);
   if (found == roots.end()) return {};
@@ -29,7 +29,7 @@ Text full_name(Registry::Handle root, TextView path) {
   return path.empty() ? name : name + u"\\" + Text(path);
 }
 
-/// A stored value as it is handed out.
+/// A stored value as it is returned to callers.
 std::string handed_out(const Hive::Value& value) {
   if (value.type != Registry::text) return value.data;
   std::string bytes = to_ansi(from_utf16_bytes(value.data));

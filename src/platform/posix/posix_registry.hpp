@@ -8,8 +8,8 @@
 
 namespace talutil::posix {
 
-/// The registry in the user's hive file. Texts are kept as the settings store keeps them, so that each reads what the
-/// other wrote, and handed out in code page 1252 with a NUL at their end.
+/// The registry in the user's hive file. Texts are stored in the same form as by the settings store, so that each can
+/// read what the other wrote, and returned in code page 1252 with a terminating NUL.
 class PosixRegistry final : public Registry {
  public:
   explicit PosixRegistry(Hive& hive) noexcept : hive_(hive) {}
@@ -29,7 +29,7 @@ class PosixRegistry final : public Registry {
   Handle next_ = 1;
 };
 
-/// The addresses of the kernel's interfaces.
+/// The addresses of the machine's network interfaces, from the kernel.
 class PosixNetwork final : public Network {
  public:
   void read_address_table(std::span<std::uint8_t> buffer) override;

@@ -16,7 +16,7 @@ namespace {
 constexpr TextView settings_key = u"HKEY_CURRENT_USER\\Software\\TALUtil\\Settings\\";
 constexpr std::uint32_t text_type = 1;
 
-/// The whole of a file; nothing where there is none that can be read.
+/// The contents of a file; nothing if it cannot be read.
 std::optional<std::string> read_file(PosixFiles& files, const Text& path) {
   try {
     const auto file = files.open_input(path);
@@ -34,10 +34,10 @@ std::optional<std::string> read_file(PosixFiles& files, const Text& path) {
   }
 }
 
-/// What the platform's buffer would hold: bytes of the code page, and no more than fit.
+/// A text as it comes out of the platform's buffer: in the code page, and no longer than fits.
 Text as_read(TextView text) { return from_ansi(to_ansi(text.substr(0, Profiles::longest_value))); }
 
-/// A key of the hive; the application and the section end at a NUL, as the platform's names do.
+/// The hive key of an application and a section, both cut off at a NUL as the platform does.
 Text key_of(const Text& application, const Text& section) {
   const Text key = Text(settings_key).append(up_to_nul(application));
   return section.empty() ? key : (key + u'\\').append(up_to_nul(section));
@@ -60,7 +60,7 @@ Text PosixProfiles::item_names(const Text& file, const Text& section) {
 
 void PosixProfiles::put(const Text& file, const Text& section, const Text& item, const Text& value) {
   try {
-    // The file itself is replaced, so its folder is what everyone can lock.
+    // The file itself gets replaced, so the folder is locked instead.
     const std::string folder = std::filesystem::path(files_.native(file)).parent_path();
     const Descriptor folder_lock(open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     if (folder_lock.get() < 0 || flock(folder_lock.get(), LOCK_EX) != 0) return;
@@ -73,7 +73,7 @@ void PosixProfiles::put(const Text& file, const Text& section, const Text& item,
     output->write(after);
     output->close();
   } catch (const RunTimeError&) {
-    // As on the other platform, this is not reported.
+    // As on Windows, this is not reported.
     return;
   }
 }

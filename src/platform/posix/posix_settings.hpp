@@ -8,8 +8,8 @@
 
 namespace talutil::posix {
 
-/// Profile files read and written by ProfileDocument. A write takes effect whole, under a lock of the folder, so that
-/// those of several processes do not undo one another.
+/// Profile files, read and written by ProfileDocument. A write is atomic and locks the folder, so that processes do not
+/// undo each other's changes.
 class PosixProfiles final : public Profiles {
  public:
   explicit PosixProfiles(PosixFiles& files) : files_(files) {}
@@ -22,7 +22,7 @@ class PosixProfiles final : public Profiles {
   PosixFiles& files_;
 };
 
-/// The settings in the hive, where the platform with a registry has them too.
+/// The settings, kept in the hive under the same key as in a real registry.
 class PosixSettingsStore final : public SettingsStore {
  public:
   struct Setting {

@@ -4,7 +4,7 @@
 
 namespace talutil::posix {
 
-/// Asks the environment (TZ) anew for each conversion.
+/// Reads the environment (TZ) again for each conversion.
 class PosixTimeConversions final : public CalendarTimeConversions {
  protected:
   std::int64_t utc_offset_seconds() override;

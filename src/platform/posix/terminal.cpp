@@ -10,7 +10,7 @@ std::optional<std::string> ask_terminal(std::string_view prompt) {
   if (isatty(STDIN_FILENO) == 0) return std::nullopt;
   std::cerr << prompt << std::flush;
   std::string line;
-  // An end of input closes this box, not the next one.
+  // End of input closes this box, not the next one.
   if (!std::getline(std::cin, line)) {
     std::cin.clear();
     return std::nullopt;

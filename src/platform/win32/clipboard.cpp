@@ -9,7 +9,7 @@ namespace talutil::win32 {
 
 void put_on_clipboard(HWND owner, TextView text) {
   const std::size_t size = (text.size() + 1) * sizeof(char16_t);
-  // Another program may have it open for a moment.
+  // Another program may have the clipboard open briefly.
   Owned<kind::Clipboard> clipboard(OpenClipboard(owner));
   for (int tries = 0; !clipboard; ++tries) {
     constexpr std::int32_t cannot_open_clipboard = 521;
@@ -24,7 +24,7 @@ void put_on_clipboard(HWND owner, TextView text) {
     const Owned<kind::LockedMemory> locked = lock(block.get());
     *std::ranges::copy(text, static_cast<char16_t*>(locked.get())).out = u'\0';
   }
-  // The system has it from then on.
+  // The system now owns the memory.
   if (SetClipboardData(CF_UNICODETEXT, block.get()) != nullptr) static_cast<void>(block.release());
 }
 

@@ -4,8 +4,7 @@
 
 namespace talutil::win32 {
 
-/// Puts a text on the clipboard. Raises 521 where another program keeps it open.
-/// @param owner the window that puts it there
+/// Puts a text on the clipboard. Raises 521 if another program keeps it open. `owner` is the window that copies.
 void put_on_clipboard(HWND owner, TextView text);
 
 }  // namespace talutil::win32

@@ -6,8 +6,8 @@
 
 namespace talutil::win32 {
 
-/// A colour as hosts give it: system colours by their number with the highest bit set, the buttons' one for a number
-/// that there is none for.
+/// Converts a colour as hosts specify it: RGB, or a system colour's number with the highest bit set. An unknown number
+/// becomes the colour of buttons.
 inline COLORREF colour_of(std::int32_t colour) noexcept {
   const auto bits = static_cast<std::uint32_t>(colour);
   constexpr std::uint32_t system_colour = 0x80000000;

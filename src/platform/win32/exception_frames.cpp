@@ -11,11 +11,11 @@ extern "C" void* __deregister_frame_info(const void* frames);
 
 namespace {
 
-// The unwinder's own record of the tables: six words in this version of the compiler, with some to spare.
+// The unwinder's record of the tables: six words in this version of the compiler, plus some spare ones.
 long object_of_frames[16];
 const void* registered_frames = nullptr;
 
-/// The section ".eh_frame", whose name is cut to eight characters in the module's header.
+/// The section ".eh_frame"; the module's header truncates its name to eight characters.
 const void* frames_of(HMODULE module) noexcept {
   const auto* const base = reinterpret_cast<const BYTE*>(module);
   const auto* const header =

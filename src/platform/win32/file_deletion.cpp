@@ -8,7 +8,7 @@ namespace talutil::win32 {
 
 namespace {
 
-/// Run-time errors of automation objects are this facility's codes.
+/// The HRESULTs of run-time errors from automation objects.
 constexpr HRESULT run_time_facility = static_cast<HRESULT>(0x800A0000);
 
 struct Reference {
@@ -43,7 +43,7 @@ Owned<Reference> create_file_system_object() {
 
 void Win32Files::delete_files(const Text& pattern) {
   const Owned<Reference> object = create_file_system_object();
-  // Some versions of that object take wildcards in a folder's name for any folder, and call no match a success.
+  // In some versions of that object, wildcards in a folder's name match any folder, and no match counts as success.
   require_pattern(pattern);
   bool matches = false;
   search(pattern, file_attribute::hidden | file_attribute::system, [&](TextView /*name*/) {
@@ -59,7 +59,7 @@ void Win32Files::delete_files(const Text& pattern) {
     raise(ErrorNumber::member_not_supported);
   }
   const Owned<AutomationText> text(SysAllocStringLen(wide(pattern), static_cast<UINT>(pattern.size())));
-  VARIANT arguments[2];  // The last one first.
+  VARIANT arguments[2];  // In reverse order.
   V_VT(&arguments[0]) = VT_BOOL;
   V_BOOL(&arguments[0]) = VARIANT_FALSE;
   V_VT(&arguments[1]) = VT_BSTR;

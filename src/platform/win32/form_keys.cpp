@@ -26,7 +26,7 @@ bool FormKeys::take(const MSG& message) {
   }
   if (key == VK_TAB) {
     if (is_control) return turn_tab(is_down(VK_SHIFT));
-    // Rich texts would take the key for themselves.
+    // Rich texts would consume the key.
     focus(GetNextDlgTabItem(window_, GetFocus(), is_down(VK_SHIFT) ? TRUE : FALSE));
     return true;
   }
@@ -53,7 +53,7 @@ bool FormKeys::turn_tab(bool is_back) {
   const int next = (now + (is_back ? count - 1 : 1)) % count;
   SendMessageW(tabs->window, TCM_SETCURSEL, static_cast<WPARAM>(next), 0);
   events_.tab_chosen(tabs->part->id, next);
-  // What had the focus may be gone from sight.
+  // The control with the focus may be hidden now.
   if (IsWindowVisible(GetFocus()) == FALSE) focus(tabs->window);
   return true;
 }
@@ -66,7 +66,7 @@ void FormKeys::focus(HWND control) {
 
 void FormKeys::return_focus() {
   if (focused_ != nullptr && IsChild(window_, focused_) != FALSE) return focus(focused_);
-  // Never a prompt that is there to be scrolled.
+  // Never a prompt, even if it can be scrolled.
   const auto first = std::ranges::find_if(
       parts_, [](const PlacedPart& placed) { return placed.is_visible && !placed.is(PartKind::label); });
   focus(first == parts_.end() ? nullptr : first->window);

@@ -4,18 +4,19 @@
 
 namespace talutil::win32 {
 
-/// The keyboard on a form: what has the focus, and the keys that move about the window.
+/// The keyboard on a form: which control has the focus, and the keys for navigation.
 class FormKeys {
  public:
   FormKeys(HWND window, FormParts& parts, FormEvents& events) : window_(window), parts_(parts), events_(events) {}
 
-  /// Handles such a key. False for other messages, which the system may still know what to do with.
+  /// Handles navigation keys. Returns false for other messages, which the system may still handle.
   bool take(const MSG& message);
 
-  /// Gives a control the focus; the text of an entry is selected.
+  /// Moves the focus to a control; selects the text of an entry.
   void focus(HWND control);
 
-  /// The window loses the focus, or has it: to the control that had it before, else to the first.
+  /// When the window loses the focus, and when it gets it back: the focus returns to the same control, or else the
+  /// first.
   void remember_focus() noexcept { focused_ = GetFocus(); }
   void return_focus();
 

@@ -6,14 +6,14 @@ namespace talutil::win32 {
 
 namespace {
 
-/// What the task bar leaves of the first screen.
+/// The primary screen without the task bar.
 RECT work_area() {
   RECT work{};
   SystemParametersInfoW(SPI_GETWORKAREA, 0, &work, 0);
   return work;
 }
 
-/// Puts a part where it belongs in a window that has grown by so much.
+/// Moves a part to its position in a window that has grown by `across` and `down`.
 void move(const PlacedPart& placed, int across, int down) {
   RECT place = placed.place;
   const std::uint8_t follows = placed.part->follows;
@@ -80,7 +80,7 @@ void FormLayout::follow() const {
 void FormLayout::centre() const {
   const RECT work = work_area();
   SIZE size = outer_size();
-  // One that can be resized need not be larger than the screen.
+  // A resizable window need not be larger than the screen.
   if (description_.is_resizable) {
     size = {std::min(size.cx, work.right - work.left), std::min(size.cy, work.bottom - work.top)};
   }

@@ -4,25 +4,25 @@
 
 namespace talutil::win32 {
 
-/// Where a form and its parts lie.
+/// The positions and sizes of a form and its parts.
 class FormLayout {
  public:
-  /// Gives the window its first size.
+  /// Sets the window's initial size.
   FormLayout(HWND window, FormParts& parts, const FormDescription& description, DWORD style);
 
-  /// Makes growing labels as high as their texts, takes the room of hidden parts away, and the window follows.
+  /// Makes growing labels as high as their texts, closes the gaps of hidden parts, and resizes the window to match.
   void fit();
 
-  /// The window has another size: parts follow its edges.
+  /// After the window was resized: parts follow its edges.
   void follow() const;
 
-  /// Into the middle of the screen's work area.
+  /// Moves the window to the middle of the screen's work area.
   void centre() const;
 
-  /// The window has another frame.
+  /// Changes the window's frame.
   void set_style(DWORD style);
 
-  /// The smallest size that its user can give the window; zero where it cannot be resized.
+  /// The minimum size when the user resizes the window; zero if it is not resizable.
   [[nodiscard]] SIZE smallest() const noexcept { return smallest_; }
 
  private:

@@ -13,7 +13,7 @@ namespace {
 
 constexpr WORD first_command = 100;
 
-/// What the system's own controls need before the first of them is made.
+/// Prepares the system's controls; call before creating any.
 void load_controls() {
   static_cast<void>(system_library(L"riched20.dll"));
   const auto start = late_function<BOOL(WINAPI*)(const INITCOMMONCONTROLSEX*)>(L"comctl32.dll", "InitCommonControlsEx");
@@ -58,7 +58,7 @@ DWORD CALLBACK read_rich_text(DWORD_PTR cookie, BYTE* buffer, LONG size, LONG* r
 FormParts::FormParts(HWND window, std::span<const FormPart> parts) : window_(window) {
   load_controls();
   for (const FormPart& part : parts) add(part);
-  // Tabs lie behind what stands on their pages.
+  // Tabs are behind the parts on their pages.
   for (const PlacedPart& placed : parts_) {
     constexpr UINT order_alone = SWP_NOMOVE | SWP_NOSIZE | SWP_NOACTIVATE;
     if (placed.is(PartKind::tabs)) SetWindowPos(placed.window, HWND_BOTTOM, 0, 0, 0, 0, order_alone);
@@ -94,7 +94,7 @@ void FormParts::add(const FormPart& part) {
 }
 
 void FormParts::add_tip(HWND control, TextView tip) {
-  // Without an owner: some systems put a window below its own tips, which keeps it from the top.
+  // Without an owner, because on some systems a window is placed below its own tooltips and cannot stay on top.
   Owned<kind::Window> tips(CreateWindowExW(WS_EX_TOPMOST, L"tooltips_class32", nullptr, WS_POPUP | TTS_ALWAYSTIP, 0, 0,
                                            0, 0, nullptr, nullptr, own_module(), nullptr));
   Text text(tip);
@@ -137,7 +137,7 @@ WORD FormParts::command_of(const PlacedPart& part) noexcept { return static_cast
 
 void FormParts::set_text(std::uint8_t id, TextView text) {
   const PlacedPart& placed = of(id);
-  // Elsewhere a text that looks like rich text is what the host has written.
+  // In other parts, text that looks like RTF is just text that the host has written.
   if (!placed.is(PartKind::rich_text) || !text.starts_with(u"{\\rtf")) {
     SetWindowTextW(placed.window, wide(Text(up_to_nul(text))));
     return;

@@ -10,37 +10,37 @@
 
 namespace talutil::win32 {
 
-/// A part of a form and the control of the system that it is made of.
+/// A part of a form and the system's control that implements it.
 struct PlacedPart {
   const FormPart* part;
   HWND window;
-  RECT place;  ///< In a window of its first size.
+  RECT place;  ///< At the window's initial size.
   bool is_visible = true;
-  std::optional<ListView> table;  ///< Of a part that is one.
+  std::optional<ListView> table;  ///< If the part is a table.
 
   [[nodiscard]] bool is(PartKind kind) const noexcept { return part->kind == kind; }
 };
 
-/// The parts of a window in their order, made of the system's controls in the system's font.
+/// The parts of a window in order, implemented by the system's controls in the system's font.
 class FormParts {
  public:
-  /// Makes them. Raises 51 where the system refuses one.
+  /// Creates the controls. Raises 51 if the system fails to.
   FormParts(HWND window, std::span<const FormPart> parts);
 
   [[nodiscard]] auto begin() noexcept { return parts_.begin(); }
   [[nodiscard]] auto end() noexcept { return parts_.end(); }
 
-  /// A part by its number. Raises 51 for a number that no part has.
+  /// A part by its number. Raises 51 if there is no such part.
   [[nodiscard]] const PlacedPart& of(std::uint8_t id) const;
   [[nodiscard]] PlacedPart& of(std::uint8_t id);
 
-  /// The part of a control; null for windows that are none.
+  /// The part that a control implements; null for other windows.
   [[nodiscard]] PlacedPart* find(HWND control) noexcept;
 
-  /// The part of a command that the system reports; null for others.
+  /// The part that a command from the system refers to; null if none.
   [[nodiscard]] const PlacedPart* find_command(WORD command) noexcept;
 
-  /// The button that Enter presses; null where there is none to be seen.
+  /// The button that Enter presses; null if it is not visible or there is none.
   [[nodiscard]] const PlacedPart* default_button() noexcept;
   [[nodiscard]] static WORD command_of(const PlacedPart& part) noexcept;
 
@@ -49,7 +49,7 @@ class FormParts {
   void set_text(std::uint8_t id, TextView text);
   [[nodiscard]] Text text(std::uint8_t id) const;
 
-  /// A label that is higher than the screen becomes a text that can be scrolled.
+  /// Replaces a label that is higher than the screen by a text that can be scrolled.
   void make_scrollable(PlacedPart& part);
 
  private:

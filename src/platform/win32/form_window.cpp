@@ -1,4 +1,4 @@
-// Windows with controls, made from their description.
+// Windows with controls, created from their descriptions.
 #include "automation/run_time_error.hpp"
 #include "platform/win32/clipboard.hpp"
 #include "platform/win32/colours.hpp"
@@ -17,7 +17,7 @@ constexpr DWORD window_style(const FormDescription& description) {
   return description.is_resizable ? WS_OVERLAPPEDWINDOW : WS_POPUP | WS_CAPTION | WS_SYSMENU;
 }
 
-/// Black or white, whichever stands out more from a colour by its brightness.
+/// Black or white, whichever contrasts more with a colour.
 COLORREF readable_on(COLORREF colour) noexcept {
   constexpr int middle = 128'000;
   const int brightness = GetRValue(colour) * 299 + GetGValue(colour) * 587 + GetBValue(colour) * 114;
@@ -88,7 +88,7 @@ class FormWindow final : public TopWindow, public FormView {
     ShowWindow(handle(), SW_SHOWNORMAL);
     SetForegroundWindow(handle());
     RedrawWindow(handle(), nullptr, nullptr, RDW_ERASE | RDW_INVALIDATE | RDW_UPDATENOW | RDW_ALLCHILDREN);
-    // The keys of a window that nobody waits for come by way of the host's loop.
+    // The host's message loop receives the keys of a modeless window.
     if (!hook_) hook_.reset(SetWindowsHookExW(WH_GETMESSAGE, &take_from_host, nullptr, GetCurrentThreadId()));
   }
 
@@ -112,7 +112,7 @@ class FormWindow final : public TopWindow, public FormView {
   void close(CloseMode mode) override {
     if (is_closed()) return;
     end_showing(mode);
-    // One that a call waits for is hidden by that.
+    // A modal window is hidden by `show_modal`.
     if (!is_modal_) destroy();
   }
 
@@ -136,7 +136,7 @@ class FormWindow final : public TopWindow, public FormView {
         return button == nullptr ? 0 : MAKELRESULT(FormParts::command_of(*button), DC_HASDEFID);
       }
       case WM_NEXTDLGCTL:
-        // A label that was reached by its letter has the focus for a moment, then passes it on.
+        // A label reached by its mnemonic gets the focus for a moment, then passes it on.
         keys_->focus(LOWORD(value) != 0 ? reinterpret_cast<HWND>(what)
                                         : GetNextDlgTabItem(handle(), GetFocus(), what != 0));
         return 0;
@@ -166,7 +166,7 @@ class FormWindow final : public TopWindow, public FormView {
         close(CloseMode::control_menu);
         return 0;
       case WM_DESTROY:
-        // Somebody else destroys it, with its owner most likely.
+        // Destroyed from outside, most likely along with its owner.
         if (!is_closed()) end_showing(CloseMode::code);
         forget();
         return 0;
@@ -176,7 +176,7 @@ class FormWindow final : public TopWindow, public FormView {
   }
 
  private:
-  /// The keys of the messages that the host takes from the queue, for windows that no call waits for.
+  /// Handles the keys of modeless windows in messages that the host takes from the queue.
   static LRESULT CALLBACK take_from_host(int code, WPARAM what, LPARAM value) noexcept {
     if (code == HC_ACTION && what == PM_REMOVE) {
       auto& message = *reinterpret_cast<MSG*>(value);
@@ -222,7 +222,7 @@ class FormWindow final : public TopWindow, public FormView {
 
   FormEvents& events_;
   const FormDescription& description_;
-  // Made as soon as there is a window.
+  // Set as soon as the window exists.
   std::optional<FormParts> parts_;
   std::optional<FormLayout> layout_;
   std::optional<FormKeys> keys_;

@@ -7,8 +7,8 @@
 
 namespace talutil::win32 {
 
-/// A handle that is given back at its end. A policy says of a kind of handle what its type is and how it is given back;
-/// none is a null handle, unless the policy has another. A policy with data says also where it came from.
+/// A handle that the destructor releases. The policy defines a kind of handle: its type, how to release it, and the
+/// empty value unless that is null. A policy with data also knows where the handle came from.
 template <class Policy>
 class Owned {
  public:
@@ -29,13 +29,13 @@ class Owned {
   [[nodiscard]] explicit operator bool() const noexcept { return handle_ != none(); }
   [[nodiscard]] Handle release() noexcept { return std::exchange(handle_, none()); }
 
-  /// For functions that give a handle through an argument.
+  /// For functions that return a handle through an argument.
   [[nodiscard]] Handle* receive() noexcept {
     reset();
     return &handle_;
   }
 
-  /// The system's last error stays: what went wrong is often asked for when handles have ended already.
+  /// Preserves the system's last error, which is often read only after handles have been released.
   void reset(Handle handle = none()) noexcept {
     const Handle before = std::exchange(handle_, handle);
     if (before == none()) return;
@@ -56,7 +56,7 @@ class Owned {
   [[no_unique_address]] Policy policy_;
 };
 
-/// The kinds of handles. Those that need a header of their own stand where they are used.
+/// The kinds of handles. Those that need an extra header are defined where they are used.
 namespace kind {
 
 struct KernelObject {
@@ -105,7 +105,7 @@ struct Hook {
   static void close(HHOOK hook) noexcept { UnhookWindowsHookEx(hook); }
 };
 
-/// The clipboard, open: TRUE.
+/// The open clipboard; the handle is TRUE.
 struct Clipboard {
   using Handle = BOOL;
   static void close(BOOL /*is_open*/) noexcept { CloseClipboard(); }
@@ -121,20 +121,20 @@ using Brush = GdiObject<HBRUSH>;
 using Font = GdiObject<HFONT>;
 using Pen = GdiObject<HPEN>;
 
-/// A device context of our own making.
+/// A device context that we created.
 struct MadeDevice {
   using Handle = HDC;
   static void close(HDC device) noexcept { DeleteDC(device); }
 };
 
-/// The device context of a window, or of the screen for a null one.
+/// The device context of a window, or of the screen if the window is null.
 struct WindowDevice {
   using Handle = HDC;
   HWND window;
   void close(HDC device) const noexcept { ReleaseDC(window, device); }
 };
 
-/// The device context of a window that is being drawn.
+/// The device context of a window during painting.
 struct Painting {
   using Handle = HDC;
   HWND window;
@@ -142,14 +142,15 @@ struct Painting {
   void close(HDC /*device*/) const noexcept { EndPaint(window, painting); }
 };
 
-/// What was selected into a device context before, and is again at the end: an object may not end while it is selected.
+/// The object that a device context had selected before; it is selected again at the end, because an object must not be
+/// deleted while it is selected.
 struct Selection {
   using Handle = HGDIOBJ;
   HDC device;
   void close(HGDIOBJ before) const noexcept { SelectObject(device, before); }
 };
 
-/// The state of a device context, to come back to.
+/// The saved state of a device context, to be restored.
 struct SavedState {
   using Handle = int;
   HDC device;
@@ -174,20 +175,20 @@ struct SavedState {
   return Owned<kind::LockedMemory>(block == nullptr ? nullptr : GlobalLock(block), {block});
 }
 
-/// A library of the system's own folder; null when it is missing. By its bare name alone a library of the same name in
-/// the program's or the current folder would be taken.
+/// Loads a library from the system folder; null if it is missing. A bare name would also find a library of that name in
+/// the program's or the current folder.
 [[nodiscard]] inline HMODULE system_library(const wchar_t* name) {
-  // Searched and not named by its path, so that the manifest of a program still chooses the version of the controls.
+  // A search rather than a full path, so that a program's manifest still selects the version of the controls.
   const HMODULE module = LoadLibraryExW(name, nullptr, LOAD_LIBRARY_SEARCH_SYSTEM32);
   if (module != nullptr || GetLastError() != ERROR_INVALID_PARAMETER) return module;
-  // Windows 7 without the update of 2011 that brought the flag (KB2533623).
+  // Windows 7 without the update of 2011 that introduced the flag (KB2533623).
   std::array<wchar_t, MAX_PATH> folder{};
   const UINT length = GetSystemDirectoryW(folder.data(), static_cast<UINT>(folder.size()));
   return LoadLibraryW(wide(Text(view(folder.data(), length)) + u'\\' + Text(view(name, lstrlenW(name)))));
 }
 
-/// A function of a system library that few callers need: loaded at its first use, so that others do not wait for it.
-/// Null when the library or the function is missing.
+/// A rarely used function of a system library, loaded on demand so that others do not pay for it. Null if the library
+/// or the function is missing.
 template <class Function>
 [[nodiscard]] Function late_function(const wchar_t* library, const char* name) {
   const HMODULE module = system_library(library);
@@ -195,7 +196,7 @@ template <class Function>
   return reinterpret_cast<Function>(reinterpret_cast<void*>(GetProcAddress(module, name)));
 }
 
-/// The module that this code is part of: the library's DLL, or a test.
+/// The module that contains this code: the library's DLL, or a test.
 [[nodiscard]] inline HMODULE own_module() noexcept {
   HMODULE module = nullptr;
   GetModuleHandleExW(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_UNCHANGED_REFCOUNT,

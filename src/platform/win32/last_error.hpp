@@ -4,7 +4,7 @@
 
 namespace talutil::win32 {
 
-/// Raises the run-time error that stands for an error code of the system about a file.
+/// Raises the run-time error for a system error code concerning a file.
 [[noreturn]] void raise_for(DWORD code);
 [[noreturn]] inline void raise_last_error() { raise_for(GetLastError()); }
 

@@ -36,7 +36,7 @@ void ListView::show(TableSource& table, std::int32_t bar_column) {
     column.mask = LVCF_TEXT | LVCF_WIDTH | LVCF_SUBITEM;
     column.cx = static_cast<int>(std::lround(table.column_width(c) * dots / twips_per_inch));
     rest -= column.cx;
-    // The last one takes what room is left.
+    // The last column takes the remaining width.
     if (c + 1 == columns && rest > 0) column.cx += rest;
     column.pszText = reinterpret_cast<wchar_t*>(heading.data());
     column.iSubItem = c;
@@ -70,7 +70,7 @@ Text ListView::selected_rows() const {
   return text;
 }
 
-/// Draws a percentage as a bar with its text on it.
+/// Draws a percentage as a bar with its text on top.
 void ListView::draw_bar(HDC device, std::int32_t row) const {
   const Text text = table_->cell_text(row, bar_column_);
   RECT place{LVIR_BOUNDS, bar_column_, 0, 0};
@@ -102,7 +102,7 @@ std::optional<LRESULT> ListView::answer(NMHDR& notice) const {
   if (table_ == nullptr) return std::nullopt;
   if (notice.code == LVN_GETDISPINFOW) {
     LVITEMW& item = reinterpret_cast<NMLVDISPINFOW&>(notice).item;
-    // The list view may still ask for rows that the table has lost.
+    // The list view may still ask for rows that the table no longer has.
     if ((item.mask & LVIF_TEXT) != 0 && item.iItem < table_->row_count() && item.iSubItem < table_->column_count()) {
       const Text text = table_->cell_text(item.iItem, item.iSubItem);
       lstrcpynW(item.pszText, wide(text), item.cchTextMax);

@@ -7,24 +7,24 @@
 
 namespace talutil::win32 {
 
-/// A table of a window: the system's list view over a table source, which is asked for what comes into sight.
+/// A table on a window: the system's list view, which asks a table source for the visible cells.
 class ListView {
  public:
   explicit ListView(HWND window) noexcept : window_(window) {}
 
-  /// Shows a table, in place of the one before.
+  /// Shows a table instead of the previous one.
   /// @param bar_column a column of percentages to be drawn as bars; -1 for none
   void show(TableSource& table, std::int32_t bar_column);
 
-  /// The window is about to go: the table hears that it has none.
+  /// The window is about to close; notifies the table.
   void close();
 
   void select_all() const;
 
-  /// The selected rows as text, with tabs between the cells and a line end behind each row.
+  /// The selected rows as text, with tabs between cells and a line end after each row.
   [[nodiscard]] Text selected_rows() const;
 
-  /// Answers a notice of the list view; nothing leaves it to the system.
+  /// Handles a notification of the list view; returns nothing to leave it to the system.
   [[nodiscard]] std::optional<LRESULT> answer(NMHDR& notice) const;
 
  private:

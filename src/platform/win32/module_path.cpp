@@ -5,7 +5,7 @@
 namespace talutil::win32 {
 
 Text module_path(HMODULE module) {
-  // The system cuts what does not fit, and reports the whole size as filled.
+  // The system truncates a path that does not fit, and then returns the buffer's full size.
   constexpr std::size_t longest_path = 32768;
   for (Text path(MAX_PATH, u'\0'); path.size() <= longest_path; path.resize(2 * path.size())) {
     const DWORD length =

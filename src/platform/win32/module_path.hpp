@@ -4,7 +4,7 @@
 
 namespace talutil::win32 {
 
-/// The full path of a module, the program's for null, however long it is. Raises 51 where the system has none.
+/// The full path of a module (null: the program), of any length. Raises 51 if the system does not know it.
 [[nodiscard]] Text module_path(HMODULE module);
 
 }  // namespace talutil::win32

@@ -19,7 +19,7 @@ class Fonts {
 
   void select(const FontStyle& style) {
     static constexpr const wchar_t* names[] = {L"Courier New", L"Arial", L"Times New Roman"};
-    // Where a font is missing, the platform takes another of its kind.
+    // If a font is missing, the platform substitutes a similar one.
     static constexpr DWORD kinds[] = {FIXED_PITCH | FF_MODERN, VARIABLE_PITCH | FF_SWISS, VARIABLE_PITCH | FF_ROMAN};
     const Key key{style.family, style.is_bold, style.points};
     Owned<kind::Font>& font = fonts_[key];
@@ -58,7 +58,7 @@ class Drawer {
     fonts_.select(run.font);
     SetTextColor(device_, run.colour);
     const auto length = static_cast<int>(run.text.size());
-    // How far each character reaches by the device's font, brought to the width of the layout.
+    // The end of each character in the device's font, scaled to the width that was laid out.
     std::vector<int> ends(run.text.size());
     SIZE natural{};
     GetTextExtentExPointW(device_, wide(run.text), length, 0, nullptr, ends.data(), &natural);
@@ -94,7 +94,7 @@ class Drawer {
 
   void draw(const Picture& picture) {
     if (!picture.pixels || is_unseen(picture.place)) return;
-    // The device wants blue first and rows of a multiple of four bytes.
+    // The device expects blue first, and rows padded to a multiple of four bytes.
     const std::size_t row_bytes = (static_cast<std::size_t>(picture.width) * 3 + 3) / 4 * 4;
     std::vector<std::uint8_t> rows(row_bytes * static_cast<std::size_t>(picture.height));
     const std::uint8_t* source = picture.pixels->data();
@@ -121,7 +121,7 @@ class Drawer {
     return {x_of(place.left), y_of(place.top), x_of(place.left + place.width), y_of(place.top + place.height)};
   }
 
-  /// Whether a place lies where nothing is drawn. Letters and lines may reach a little beyond theirs.
+  /// Whether an area is outside the part being drawn. Letters and lines may extend slightly beyond their area.
   [[nodiscard]] bool is_unseen(const TwipsRectangle& place) const {
     if (!has_edges_) return false;
     constexpr LONG beyond = 8;

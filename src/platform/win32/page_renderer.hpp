@@ -5,7 +5,7 @@
 
 namespace talutil::win32 {
 
-/// Where a page lies on a device, and how large: pixels for each twip, across and down.
+/// The position of a page on a device and its scale: pixels per twip, horizontally and vertically.
 struct PagePlacement {
   int left = 0;
   int top = 0;
@@ -13,8 +13,8 @@ struct PagePlacement {
   double scale_y = 0;
 };
 
-/// Draws the items of a page on the screen or a printer: what lies outside the device is left to it to leave out. Texts
-/// get the widths that they were laid out with, whatever the device's own fonts say.
+/// Draws the items of a page on the screen or a printer; the device clips them. Texts keep the widths they were laid
+/// out with, whatever the device's fonts are.
 void draw_page(HDC device, const Page& page, const PagePlacement& placement);
 
 }  // namespace talutil::win32

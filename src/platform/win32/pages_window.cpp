@@ -90,7 +90,7 @@ void PagesWindow::scroll_to(Bar& bar, int position) {
   if (position == bar.position) return;
   const int distance = std::exchange(bar.position, position) - position;
   SetScrollPos(handle(), bar.direction, position, TRUE);
-  // What stays in sight is moved, the rest drawn.
+  // Scrolls what remains visible and repaints the rest.
   const bool is_down = bar.direction == SB_VERT;
   ScrollWindowEx(handle(), is_down ? 0 : distance, is_down ? distance : 0, nullptr, nullptr, nullptr, nullptr,
                  SW_INVALIDATE);
@@ -146,7 +146,7 @@ void PagesWindow::draw(HDC device, const RECT& room) const {
   }
 }
 
-/// By way of a bitmap, so that nothing flickers.
+/// Paints into a bitmap first to avoid flicker.
 void PagesWindow::paint() const {
   PAINTSTRUCT painting;
   const Owned<kind::Painting> screen(BeginPaint(handle(), &painting), {handle(), &painting});
@@ -194,7 +194,7 @@ std::optional<LRESULT> PagesWindow::answer(UINT message, WPARAM what, LPARAM val
       ReleaseCapture();
       return 0;
     case WM_DESTROY:
-      // With its frame.
+      // Destroyed along with its frame.
       forget();
       return 0;
     default:

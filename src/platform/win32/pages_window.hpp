@@ -5,21 +5,21 @@
 
 namespace talutil::win32 {
 
-/// The pages in a preview: one is shown, with a shadow, in the middle of what room there is; scrolled by bars, wheel,
-/// keys and by dragging.
+/// The pages area of a preview: shows one page, with a shadow, centred. Scrolls by scroll bars, wheel, keys and
+/// dragging.
 class PagesWindow final : public OwnWindow {
  public:
-  /// @param pages null where a third-party control shows its pages itself
+  /// @param pages null if a third-party control displays its own pages
   PagesWindow(HWND frame, PreviewEvents& events, const PreviewPages* pages);
   ~PagesWindow() override { destroy(); }
 
-  /// Another page, document or zoom: from its top.
+  /// Shows another page, document or zoom from the top of the page.
   void show();
 
-  /// Keys that the pages have themselves. False for others.
+  /// Handles the keys of the pages area. Returns false for other keys.
   bool take_key(WPARAM key);
 
-  /// The mouse wheel scrolls, with Ctrl it zooms.
+  /// The mouse wheel scrolls, or zooms together with Ctrl.
   void wheel(WPARAM what);
 
  protected:
@@ -28,7 +28,7 @@ class PagesWindow final : public OwnWindow {
  private:
   struct Bar {
     int direction;
-    int position = 0;  ///< In pixels, as all here.
+    int position = 0;  ///< In pixels, like the other members.
     int last = 0;
   };
 

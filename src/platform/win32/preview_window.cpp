@@ -40,7 +40,7 @@ class PreviewWindow final : public TopWindow, public PreviewView {
     constexpr int usual_width = 800;
     constexpr int usual_height = 600;
     make(style, 0, nullptr, L"", make_menu());
-    // Unattended runs may have no desktop to put windows on. They show none.
+    // An unattended run may have no desktop for windows; nothing is shown then.
     if (handle() == nullptr) {
       make(style, 0, HWND_MESSAGE, L"", make_menu());
       has_desktop_ = false;
@@ -55,7 +55,7 @@ class PreviewWindow final : public TopWindow, public PreviewView {
   void set_caption(TextView caption) override { SetWindowTextW(handle(), wide(Text(caption))); }
 
   [[nodiscard]] std::int32_t window_state() const override {
-    // A window that is not shown yet has the state that it will be shown in.
+    // Before the window is shown, this is the state in which it will be shown.
     if (!is_shown_) return state_;
     if (IsIconic(handle()) != FALSE) return 1;
     return IsZoomed(handle()) != FALSE ? 2 : 0;
@@ -126,7 +126,7 @@ class PreviewWindow final : public TopWindow, public PreviewView {
         close();
         return 0;
       case WM_DESTROY:
-        // Somebody else has destroyed the window.
+        // The window was destroyed from outside.
         close();
         forget();
         return 0;

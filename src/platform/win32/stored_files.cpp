@@ -11,7 +11,7 @@ namespace talutil::win32 {
 
 namespace {
 
-// 1 January 1970 in the platform's count of 100 nanoseconds from 1601.
+// 1 January 1970, in units of 100 nanoseconds since 1601.
 constexpr std::int64_t epoch = 116'444'736'000'000'000;
 constexpr std::int64_t ticks_a_second = 10'000'000;
 
@@ -118,7 +118,7 @@ class Win32NewFile final : public NewFile {
     const Text path = other_name.empty() ? path_ : folder_ + Text(other_name);
     if (MoveFileExW(wide(temporary_), wide(path), MOVEFILE_REPLACE_EXISTING) == 0) {
       const DWORD reason = GetLastError();
-      // It could be written to a moment ago: what keeps it from being replaced is another who has it open.
+      // The file was writable a moment ago, so what prevents replacing it is that someone has it open.
       raise_for(reason == ERROR_ACCESS_DENIED ? ERROR_SHARING_VIOLATION : reason);
     }
     temporary_.clear();

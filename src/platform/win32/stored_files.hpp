@@ -5,10 +5,10 @@
 #include "platform/folders.hpp"
 #include "platform/win32/windows.hpp"
 
-/// The files of open folders, and what is kept of each beside its bytes.
+/// The files in open folders, and what is recorded about them besides their contents.
 namespace talutil::win32 {
 
-/// The attributes that archives keep.
+/// The attributes that archives record.
 constexpr DWORD kept_attributes =
     FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM | FILE_ATTRIBUTE_ARCHIVE;
 
@@ -16,17 +16,16 @@ constexpr DWORD kept_attributes =
   return static_cast<std::uint64_t>(high) << 32U | low;
 }
 
-/// Times as seconds from 1970 on.
+/// Conversion to and from seconds since 1970.
 [[nodiscard]] std::int64_t seconds_of(const FILETIME& time) noexcept;
 [[nodiscard]] FILETIME file_time(std::int64_t seconds) noexcept;
 
-/// @param path in the extended form
-/// @param sharing what others may do with it meanwhile
-/// Raises what opening raises.
+/// Opens a file for reading. `path` is in the extended form (\\?\), `sharing` is what others may do with the file
+/// meanwhile. Raises the same errors as opening.
 [[nodiscard]] std::unique_ptr<StoredFile> open_stored_file(const Text& path, DWORD sharing);
 
-/// @param folder in the extended form, with a separator at its end
-/// Raises as Folder::create.
+/// Creates a file. `folder` is in the extended form (\\?\), with a trailing separator. Raises the same errors as
+/// Folder::create.
 [[nodiscard]] std::unique_ptr<NewFile> create_new_file(const Text& folder, TextView name);
 
 }  // namespace talutil::win32

@@ -13,7 +13,7 @@ SystemFont::SystemFont() {
   constexpr wchar_t letters[] = L"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz";
   SIZE size{};
   GetTextExtentPoint32W(context.get(), letters, 52, &size);
-  // The average letter, rounded as the system's dialogs round it.
+  // The average letter width, rounded as the system's dialogs do.
   width_ = (static_cast<int>(size.cx) / 26 + 1) / 2;
   height_ = static_cast<int>(size.cy);
 }

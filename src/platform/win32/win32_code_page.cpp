@@ -8,7 +8,7 @@ namespace talutil::win32 {
 static_assert(CP_ACP == 0);
 
 std::string Win32CodePage::bytes_of(TextView text) {
-  // The platform takes an empty text for a mistake.
+  // The platform rejects an empty text.
   if (text.empty()) return {};
   const auto* const units = reinterpret_cast<const wchar_t*>(text.data());
   const auto length = checked_cast<std::int32_t>(text.size());

@@ -4,13 +4,13 @@
 
 namespace talutil::win32 {
 
-/// A code page of the system, with its best fit for characters that the page does not hold.
+/// A code page of the system, with its best fit for characters that the page lacks.
 class Win32CodePage final : public CodePage {
  public:
-  /// The ANSI page of the process, which is the system's unless the program's manifest says UTF-8.
+  /// The ANSI page of the process: the system's, unless the program's manifest asks for UTF-8.
   Win32CodePage() noexcept = default;
 
-  /// The page of a number, whatever the system's is.
+  /// The page with a given number, regardless of the system's.
   explicit Win32CodePage(std::uint32_t number) noexcept : number_(number) {}
 
   [[nodiscard]] std::string bytes_of(TextView text) override;

@@ -13,7 +13,7 @@ namespace win32 {
 
 namespace {
 
-/// The import is delayed until the first call, which would then look for the library by its bare name.
+/// Loads the library safely before the first call, where the delayed import would search for it by its bare name.
 void load_cryptography() {
   if (GetModuleHandleW(L"bcrypt.dll") == nullptr) static_cast<void>(system_library(L"bcrypt.dll"));
 }
@@ -22,7 +22,7 @@ void require(NTSTATUS status) {
   if (status < 0) raise(ErrorNumber::internal_error);
 }
 
-// The calls take writable pointers also for what they only read, and none may be null.
+// The functions take non-const pointers even for their input, and none may be null.
 UCHAR* pointer(ByteView bytes) noexcept {
   static constexpr UCHAR nothing = 0;
   return const_cast<UCHAR*>(bytes.empty() ? &nothing : bytes.data());

@@ -16,7 +16,7 @@ struct CipherProvider {
   static void close(void* provider) noexcept;
 };
 
-/// Cryptography Next Generation (bcrypt.dll). The cipher is opened at its first use and kept.
+/// Cryptography Next Generation (bcrypt.dll). The cipher is opened on first use and kept.
 class Win32Cryptography final : public Cryptography {
  public:
   Tag seal(const Key& key, const Nonce& nonce, ByteView associated, std::span<std::uint8_t> data) override;

@@ -10,11 +10,11 @@ namespace talutil::win32 {
 
 namespace {
 
-/// The print helper in the folder of a module: the program's for null. Null where there is none.
+/// The print helper in the folder of a module (null: the program); null if there is none.
 HMODULE helper_beside(HMODULE module) {
   const Text program = module_path(module);
   const Text helper = program.substr(0, program.find_last_of(u'\\') + 1) + u"printhelper.dll";
-  // By its full path: a library of that name in another folder of the search order is not ours to run.
+  // By its full path, so that no library of that name elsewhere in the search order is run.
   return LoadLibraryExW(wide(helper), nullptr, LOAD_WITH_ALTERED_SEARCH_PATH);
 }
 
@@ -30,7 +30,7 @@ void call_helper(const char* function, std::int32_t window) {
     throw RunTimeError(ErrorNumber::missing_entry_point,
                        u"Can't find DLL entry point " + from_utf8(function) + u" in printhelper.dll");
   }
-  // What it answers says nothing. It stays loaded, with what it keeps between the two calls.
+  // The return value carries no information. The helper stays loaded, because it keeps state between the two calls.
   print(window);
 }
 
@@ -44,8 +44,8 @@ void Win32Drawing::draw_text(std::intptr_t device_context, const PixelRectangle&
   if (before == CLR_INVALID) raise(ErrorNumber::invalid_procedure_call);
   const int background_before = SetBkMode(context, TRANSPARENT);
   RECT rectangle{place.left, place.top, place.right, place.bottom};
-  // Not by DrawTextA: characters beyond the ANSI code page would become question marks, and drawing does not follow a
-  // program that has UTF-8 for its own page.
+  // Not DrawTextA: it would turn characters beyond the ANSI code page into question marks, and it ignores a program's
+  // choice of UTF-8 as its page.
   DrawTextW(context, wide(text.data()), length, &rectangle, breaks_words ? DT_WORDBREAK : 0);
   SetBkMode(context, background_before);
   SetTextColor(context, before);
@@ -65,7 +65,7 @@ WindowImage Win32Drawing::image_of(std::intptr_t window) {
   const Owned<kind::Bitmap> bitmap(CreateDIBSection(context.get(), &information, DIB_RGB_COLORS, &bits, nullptr, 0));
   if (bitmap) {
     const Owned<kind::Selection> selected = select(context.get(), bitmap.get());
-    // What a window does not draw of itself stays white.
+    // Parts that a window does not draw stay white.
     PatBlt(context.get(), 0, 0, image.width, image.height, WHITENESS);
     PrintWindow(handle, context.get(), 0);
     GdiFlush();

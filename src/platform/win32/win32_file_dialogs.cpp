@@ -12,12 +12,12 @@ namespace talutil::win32 {
 
 namespace {
 
-// Those that name code of the caller's, answer with several files or need a help button's handler are not hosts' to
-// set.
+// Flags that hosts cannot use: they refer to code of the caller, return several files, or need a handler for the help
+// button.
 constexpr std::uint32_t unusable_flags = OFN_ENABLEHOOK | OFN_ENABLETEMPLATE | OFN_ENABLETEMPLATEHANDLE |
                                          OFN_ALLOWMULTISELECT | OFN_SHOWHELP | OFN_ENABLEINCLUDENOTIFY;
 
-/// The platform wants the names and patterns of a filter each closed with a NUL.
+/// The platform expects each name and pattern of a filter to be terminated by a NUL.
 Text closed_with_nuls(Text filter) {
   if (filter.empty()) return filter;
   std::ranges::replace(filter, u'|', u'\0');

@@ -4,7 +4,7 @@
 
 namespace talutil::win32 {
 
-/// The platform's common dialogs. The current folder stays what it was.
+/// The platform's common dialogs. They do not change the current folder.
 class Win32FileDialogs final : public FileDialogs {
  public:
   [[nodiscard]] std::optional<ChosenFile> choose(const FileDialog& dialog) override;

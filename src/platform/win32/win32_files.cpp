@@ -11,7 +11,7 @@ namespace talutil::win32 {
 
 namespace {
 
-// As sequential files are opened: others may read and write meanwhile.
+// The sharing mode of sequential files: others may read and write meanwhile.
 constexpr DWORD shared = FILE_SHARE_READ | FILE_SHARE_WRITE;
 
 /// Some systems report a missing drive as a missing file.
@@ -21,8 +21,8 @@ constexpr DWORD shared = FILE_SHARE_READ | FILE_SHARE_WRITE;
   raise_for(drive_is_missing ? ERROR_PATH_NOT_FOUND : code);
 }
 
-/// Raises what is wrong with the name, and 75 for a read-only file that is to be written: some systems let an
-/// administrator do so.
+/// Raises the error of an invalid name, and 75 if a read-only file is to be written, because some systems let an
+/// administrator do that.
 void require_usable(const Text& path, bool is_to_be_written) {
   require_file_name(path);
   if (path.size() >= MAX_PATH) raise(ErrorNumber::bad_file_name_or_number);
@@ -76,13 +76,13 @@ class Win32InputFile final : public InputFile {
   std::uint64_t size_ = 0;
 };
 
-/// Writes beside the file and takes its place at the end. Where the folder takes no new file, the old one is
-/// overwritten as it lies.
+/// Writes a temporary file that replaces the target when it is closed. If the folder does not allow new files,
+/// overwrites the target in place.
 class Win32OutputFile final : public OutputFile {
  public:
   explicit Win32OutputFile(const Text& path) : path_(path) {
     require_usable(path, true);
-    // Whatever is wrong with the target shows now and not when everything is written.
+    // Problems with the target are reported now, not after everything has been written.
     Owned<kind::File> target(CreateFileW(wide(path_), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
     const DWORD reason = GetLastError();
     if (!target && reason != ERROR_FILE_NOT_FOUND) raise_for_path(reason, path_);
@@ -105,7 +105,7 @@ class Win32OutputFile final : public OutputFile {
     if (FlushFileBuffers(file_.get()) == 0) raise_last_error();
     file_.reset();
     if (temporary_.empty()) return;
-    // Keeps the attributes and rights of the file that is replaced.
+    // Keeps the attributes and rights of the replaced file.
     const BOOL is_done = replaces_ ? ReplaceFileW(wide(path_), wide(temporary_), nullptr, 0, nullptr, nullptr)
                                    : MoveFileExW(wide(temporary_), wide(path_), MOVEFILE_REPLACE_EXISTING);
     if (is_done == 0) raise_replacing(GetLastError());
@@ -126,7 +126,7 @@ class Win32OutputFile final : public OutputFile {
     file_ = open_file(path_, GENERIC_WRITE, shared, TRUNCATE_EXISTING);
   }
 
-  /// The target could be written to a moment ago: what keeps it from being replaced is another who has it open.
+  /// The target was writable a moment ago, so what prevents replacing it is that someone has it open.
   [[noreturn]] static void raise_replacing(DWORD code) {
     raise_for(code == ERROR_ACCESS_DENIED ? ERROR_SHARING_VIOLATION : code);
   }
@@ -200,7 +200,7 @@ std::unique_ptr<OutputFile> Win32Files::open_output(const Text& path) {
 
 void Win32Files::append(const Text& path, std::string_view bytes) {
   const Owned<kind::File> file = open_file(path, FILE_APPEND_DATA | GENERIC_READ, shared, OPEN_ALWAYS);
-  // A byte beyond every file: those who append wait for one another, and nobody else notices.
+  // Locks a byte beyond the end of any file: appending processes wait for each other, others are unaffected.
   OVERLAPPED far_byte{};
   far_byte.Offset = 0xFFFFFFFE;
   far_byte.OffsetHigh = 0x7FFFFFFF;
@@ -210,7 +210,7 @@ void Win32Files::append(const Text& path, std::string_view bytes) {
   try {
     write_all(file, bytes);
   } catch (const RunTimeError&) {
-    // A part of the line is worse than none: the next one would be glued to it.
+    // A partial line is worse than none, because the next one would be joined to it.
     const Owned<kind::File> whole = open_file(path, GENERIC_WRITE, shared, OPEN_EXISTING);
     if (SetFilePointerEx(whole.get(), before, nullptr, FILE_BEGIN) == 0 || SetEndOfFile(whole.get()) == 0) {
       raise(ErrorNumber::device_io_error);

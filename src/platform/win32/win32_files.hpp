@@ -8,17 +8,17 @@ class Win32Files final : public Files {
  public:
   void search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) override;
   std::uint32_t attributes(const Text& path) override;
-  /// MakeSureDirectoryPathExists. Raises 53 where the system lacks the library that has it.
+  /// Calls MakeSureDirectoryPathExists. Raises 53 if the system lacks the library that contains it.
   bool make_path(const Text& path) override;
   Text current_folder(TextView drive) override;
-  /// DeleteFile of "Scripting.FileSystemObject". Raises what that object answers, and 429 where it cannot be created.
+  /// Calls DeleteFile of "Scripting.FileSystemObject". Raises that object's errors, and 429 if it cannot be created.
   void delete_files(const Text& pattern) override;
   std::unique_ptr<InputFile> open_input(const Text& path) override;
   std::unique_ptr<OutputFile> open_output(const Text& path) override;
   void append(const Text& path, std::string_view bytes) override;
 };
 
-/// A text in the code page of the platform's ANSI functions.
+/// Converts a text to the code page of the platform's ANSI functions.
 [[nodiscard]] std::string to_platform_ansi(TextView text);
 
 }  // namespace talutil::win32

@@ -15,7 +15,7 @@ struct ItemList {
   static void close(PIDLIST_ABSOLUTE items) noexcept { CoTaskMemFree(items); }
 };
 
-/// Text in the code page of the platform's ANSI functions.
+/// Converts a text from the code page of the platform's ANSI functions.
 Text from_platform_ansi(const char* bytes) {
   const int length = MultiByteToWideChar(CP_ACP, 0, bytes, -1, nullptr, 0);
   Text text(static_cast<std::size_t>(length), u'\0');
@@ -39,7 +39,7 @@ std::optional<Text> Win32FolderPicker::choose(TextView title, std::intptr_t owne
   dialog.lpszTitle = caption.c_str();
   const Owned<ItemList> items(browse(&dialog));
   if (!items) return std::nullopt;
-  // Blanks, which stay where the chosen thing is no folder of the file system.
+  // Blanks, which remain if the chosen item is not a folder of the file system.
   std::string path(MAX_PATH, ' ');
   get_path(items.get(), path.data());
   return from_platform_ansi(path.c_str());

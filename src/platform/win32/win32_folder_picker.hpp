@@ -4,7 +4,7 @@
 
 namespace talutil::win32 {
 
-/// The shell's own dialog. Raises 53 where the system lacks it.
+/// The shell's dialog. Raises 53 if the system lacks it.
 class Win32FolderPicker final : public FolderPicker {
  public:
   std::optional<Text> choose(TextView title, std::intptr_t owner) override;

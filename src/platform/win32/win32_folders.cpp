@@ -9,7 +9,7 @@ namespace talutil::win32 {
 
 namespace {
 
-/// Of WIN32_FIND_DATAW and of WIN32_FILE_ATTRIBUTE_DATA.
+/// For WIN32_FIND_DATAW and WIN32_FILE_ATTRIBUTE_DATA.
 template <class Data>
 FileFacts facts_of(const Data& data) {
   FileFacts facts;
@@ -24,7 +24,8 @@ FileFacts facts_of(const Data& data) {
 
 class Win32Folder final : public Folder {
  public:
-  /// A path in the form that is taken as it is, however long, with a separator at its end.
+  /// Takes a path in the extended form (\\?\), which is used literally and has no length limit, with a trailing
+  /// separator.
   explicit Win32Folder(Text path) : path_(std::move(path)) {}
 
   [[nodiscard]] Text path() const override {
@@ -88,7 +89,7 @@ class Win32Folder final : public Folder {
   Text path_;
 };
 
-/// The full path with nothing left to be understood by the platform.
+/// The full path, with nothing left for the platform to interpret.
 Text full_path(const Text& path) {
   const wchar_t* const given = path.empty() ? L"." : wide(path);
   const DWORD size = GetFullPathNameW(given, 0, nullptr, nullptr);

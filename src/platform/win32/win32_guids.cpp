@@ -11,7 +11,7 @@ Text Win32Guids::make() {
   GUID guid;
   std::array<wchar_t, 40> text{};
   if (FAILED(CoCreateGuid(&guid))) raise(ErrorNumber::internal_error);
-  // The count has the closing NUL in it.
+  // The count includes the terminating NUL.
   const int count = StringFromGUID2(guid, text.data(), static_cast<int>(text.size()));
   if (count == 0) raise(ErrorNumber::internal_error);
   return Text(view(text.data(), static_cast<std::size_t>(count - 1)));

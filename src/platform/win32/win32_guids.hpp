@@ -6,7 +6,7 @@ namespace talutil::win32 {
 
 class Win32Guids final : public Guids {
  public:
-  /// Raises 51 when the system makes none.
+  /// Raises 51 if the system fails to create one.
   Text make() override;
 };
 

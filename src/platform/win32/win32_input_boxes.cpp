@@ -16,14 +16,14 @@ constexpr WORD button_class = 0x80;
 constexpr WORD edit_class = 0x81;
 constexpr WORD static_class = 0x82;
 
-/// A dialog in the form that the platform wants it in memory: 16-bit words, each item on a multiple of two.
+/// A dialog template in memory: 16-bit words, items aligned to two words.
 class DialogTemplate {
  public:
   DialogTemplate(short width, short height, WORD items, TextView title) {
     constexpr DWORD style =
         DS_MODALFRAME | DS_SETFONT | DS_CENTER | DS_SETFOREGROUND | WS_POPUP | WS_CAPTION | WS_SYSMENU;
     add(DLGTEMPLATE{style, 0, items, 0, 0, width, height});
-    words_.insert(words_.end(), {0, 0});  // No menu, the class of dialogs.
+    words_.insert(words_.end(), {0, 0});  // No menu, the standard dialog class.
     add_text(title);
     constexpr WORD points = 8;
     words_.push_back(points);
@@ -58,15 +58,15 @@ class DialogTemplate {
   std::vector<WORD> words_;
 };
 
-/// About how many lines a prompt takes in its label.
+/// An estimate of the number of lines that a prompt takes in its label.
 LONG lines_of(TextView prompt) {
   constexpr LONG characters_a_line = 40;
-  constexpr LONG most_lines = 30;  // Higher than that, the box would leave small screens.
+  constexpr LONG most_lines = 30;  // A higher box would not fit on small screens.
   const auto breaks = static_cast<LONG>(std::ranges::count(prompt, u'\n'));
   return std::min(most_lines, breaks + 1 + static_cast<LONG>(prompt.size()) / characters_a_line);
 }
 
-/// What was typed stands in the text that the dialog was started with.
+/// The typed text goes into the Text whose address the dialog was started with.
 INT_PTR CALLBACK handle(HWND dialog, UINT message, WPARAM what, LPARAM value) noexcept {
   if (message == WM_INITDIALOG) {
     SetWindowLongPtrW(dialog, DWLP_USER, value);
@@ -88,8 +88,8 @@ INT_PTR CALLBACK handle(HWND dialog, UINT message, WPARAM what, LPARAM value) no
 }  // namespace
 
 std::optional<Text> Win32InputBoxes::ask(TextView prompt, TextView title, Entry entry) {
-  // In dialog units: a quarter of a character's width, an eighth of its height. The prompt stands beside the buttons
-  // and has the room of four lines, more where it is longer.
+  // In dialog units: a quarter of a character's width, an eighth of its height. The prompt is beside the buttons and
+  // has room for four lines, or more if it is longer.
   constexpr LONG margin = 7;
   constexpr LONG prompt_width = 186;
   constexpr LONG button_width = 50;

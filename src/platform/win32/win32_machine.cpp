@@ -74,7 +74,7 @@ std::optional<Date> local_date(const FILETIME& time) {
 
 std::vector<DriveFacts> Win32Machine::drives() {
   std::vector<DriveFacts> drives;
-  // No box that asks for a disk to be put in.
+  // Suppresses the box that asks for a disk to be inserted.
   const UINT before = SetErrorMode(SEM_FAILCRITICALERRORS);
   const DWORD present = GetLogicalDrives();
   for (int letter = 0; letter < 26; ++letter) {
@@ -105,7 +105,7 @@ MemoryFacts Win32Machine::memory() {
   MEMORYSTATUSEX status{};
   status.dwLength = sizeof status;
   GlobalMemoryStatusEx(&status);
-  // The platform counts the memory itself as part of what it pages.
+  // The platform includes physical memory in its page file figures.
   const auto beyond = [](DWORDLONG pages, DWORDLONG memory) { return pages - std::min(pages, memory); };
   return {status.ullTotalPhys, status.ullAvailPhys, beyond(status.ullTotalPageFile, status.ullTotalPhys),
           beyond(status.ullAvailPageFile, status.ullAvailPhys)};

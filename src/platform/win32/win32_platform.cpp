@@ -10,7 +10,7 @@ namespace talutil::win32 {
 
 namespace {
 
-/// The host application's title: the name of its program, without folder and extension.
+/// The host application's title: the name of its program, without folder or extension.
 Text host_title() {
   const Text path = module_path(nullptr);
   const Text name = path.substr(path.find_last_of(u'\\') + 1);
@@ -25,8 +25,8 @@ float twips_per_pixel(int capability) {
   return twips_per_inch / static_cast<float>(GetDeviceCaps(screen.get(), capability));
 }
 
-/// The owner of dialogs. It is made when the first dialog wants it: until then a script that never looks for messages
-/// has no window that broadcasts would wait for. Windows end with their thread, after which it is made again.
+/// The owner of dialogs. It is created for the first dialog: until then, a script that never processes messages has no
+/// window that could block broadcasts. Windows end with their thread; if this one has, it is created again.
 class DialogOwner final : public HiddenWindow {
  public:
   explicit DialogOwner(TextView caption) : caption_(caption) {}
@@ -40,7 +40,7 @@ class DialogOwner final : public HiddenWindow {
   }
 
  private:
-  /// Of a class of the system's own, whose window procedure is there as long as the window is.
+  /// Uses one of the system's window classes, so that its window procedure exists as long as the window does.
   [[nodiscard]] Owned<kind::Window> make() const {
     Owned<kind::Window> window(
         CreateWindowExW(0, L"Static", wide(caption_), WS_POPUP, 0, 0, 0, 0, nullptr, nullptr, nullptr, nullptr));
@@ -52,14 +52,14 @@ class DialogOwner final : public HiddenWindow {
   Owned<kind::Window> window_;
 };
 
-/// A setting of the user's locale; empty where there is none.
+/// A setting of the user's locale; empty if there is none.
 Text user_setting(LCTYPE setting) {
   std::array<wchar_t, 16> text{};
   const int length = GetLocaleInfoW(LOCALE_USER_DEFAULT, setting, text.data(), static_cast<int>(text.size()));
   return length > 1 ? Text(view(text.data(), static_cast<std::size_t>(length) - 1)) : Text();
 }
 
-/// The first character of such a setting; the given one where it is empty.
+/// The first character of such a setting; `otherwise` if it is empty.
 char16_t user_character(LCTYPE setting, char16_t otherwise) {
   const Text text = user_setting(setting);
   return text.empty() ? otherwise : text.front();
@@ -118,7 +118,7 @@ bool Win32MessagePump::handle_waiting() {
   MSG message;
   while (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE) != 0) {
     if (message.message == WM_QUIT) {
-      // It was for the loop of the host.
+      // The message was meant for the host's loop.
       PostQuitMessage(static_cast<int>(message.wParam));
       return false;
     }

@@ -48,7 +48,7 @@ class Win32Clock final : public Clock {
 
 class Win32FormWindows final : public FormWindows {
  public:
-  /// Its handle raises 51 where the platform makes no window.
+  /// The window's `handle` raises 51 if the platform cannot create it.
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
   std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) override;
   std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) override;
@@ -60,9 +60,9 @@ class Win32MessagePump final : public MessagePump {
   bool wait_and_handle() override;
 };
 
-/// One of each, for a library to use. Must outlive it.
+/// One instance of each implementation, for a library to use. Must outlive the library.
 struct Win32Platform {
-  /// The makers of third-party controls are the COM face's.
+  /// The COM layer supplies the makers of third-party controls.
   explicit Win32Platform(ControlMakers& makers) noexcept : control_makers(makers) {}
 
   ControlMakers& control_makers;

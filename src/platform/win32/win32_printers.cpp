@@ -19,7 +19,7 @@ constexpr double twips_per_inch = 1440;
   throw RunTimeError(ErrorNumber::printer_error, u"Printer error: " + what);
 }
 
-/// The dialog's answer, with the memory and the device that it hands over.
+/// The printer dialog and its results, including the memory and the device context that it returns.
 class PrintDialog {
  public:
   PrintDialog() {
@@ -28,7 +28,7 @@ class PrintDialog {
     if (show_ == nullptr || last_error_ == nullptr) raise_printer_error(u"comdlg32.dll is missing");
   }
 
-  /// Takes the default printer, set up as the document is. Raises 482 where there is none.
+  /// Selects the default printer and applies the document's settings. Raises 482 if there is no printer.
   void prepare(const PrintSettings& settings) {
     native_.Flags = PD_RETURNDEFAULT;
     if (!show()) raise_printer_error(u"no printer is installed");
@@ -44,7 +44,7 @@ class PrintDialog {
     }
   }
 
-  /// Lets the user choose among the pages. False when the dialog is cancelled.
+  /// Lets the user choose the pages. Returns false if the dialog is cancelled.
   bool ask(std::size_t pages) {
     native_.Flags = PD_ALLPAGES | PD_NOSELECTION | PD_RETURNDC | PD_USEDEVMODECOPIESANDCOLLATE;
     native_.nMinPage = native_.nFromPage = 1;
@@ -55,7 +55,7 @@ class PrintDialog {
     return false;
   }
 
-  /// The device for printing without asking.
+  /// Opens the device context for printing without a dialog.
   void open() {
     const Owned<kind::LockedMemory> locked = lock(names_.get());
     const Owned<kind::LockedMemory> mode = lock(mode_.get());
@@ -68,7 +68,7 @@ class PrintDialog {
 
   [[nodiscard]] HDC device() const noexcept { return device_.get(); }
 
-  /// The pages that were chosen, counted from 0, behind the last one.
+  /// The chosen pages as a half-open range, counted from 0.
   [[nodiscard]] std::pair<std::size_t, std::size_t> range(std::size_t pages) const noexcept {
     if ((native_.Flags & PD_PAGENUMS) == 0) return {0, pages};
     const std::size_t first = std::max<std::size_t>(native_.nFromPage, 1) - 1;
@@ -79,7 +79,7 @@ class PrintDialog {
   using Show = BOOL(WINAPI*)(PRINTDLGW*);
   using LastError = DWORD(WINAPI*)();
 
-  /// The dialog takes the memory that it has handed over before, and may hand over other.
+  /// The dialog takes the memory that it returned before, and may return different memory.
   [[nodiscard]] bool show() noexcept {
     native_.hDevMode = mode_.release();
     native_.hDevNames = names_.release();
@@ -98,7 +98,7 @@ class PrintDialog {
   LastError last_error_ = late_function<LastError>(L"comdlg32.dll", "CommDlgExtendedError");
 };
 
-/// One job of the spooler; taken back unless it is complete.
+/// A print job; cancelled unless it is complete.
 class PrintJob {
  public:
   PrintJob(HDC device, const Text& title) : device_(device) {

@@ -11,7 +11,7 @@ class Win32Printers final : public Printers {
   bool print(const Document& document, const PrintSettings& settings) override;
 };
 
-/// The platform's own Courier New and Arial.
+/// Courier New and Arial as installed on the platform.
 class Win32FontFiles final : public FontFiles {
  public:
   [[nodiscard]] std::vector<std::uint8_t> wide_font(bool is_fixed_width) override;

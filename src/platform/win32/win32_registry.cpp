@@ -46,7 +46,7 @@ std::int32_t Win32Registry::set(Handle key, const Text& name, std::uint32_t type
 }
 
 void Win32Network::read_address_table(std::span<std::uint8_t> buffer) {
-  // Few hosts ask, and the library is slow to load.
+  // Few hosts need this, and the library is slow to load.
   using Function = DWORD(WINAPI*)(void*, ULONG*, BOOL);
   const auto get = late_function<Function>(L"iphlpapi.dll", "GetIpAddrTable");
   auto size = static_cast<ULONG>(buffer.size());

@@ -12,7 +12,7 @@ namespace {
 
 constexpr TextView settings_key = u"Software\\TALUtil\\Settings\\";
 
-/// What the profile functions put into the buffer; a null item lists the names.
+/// The result of the profile functions; a null item lists the names.
 Text read_profile(const Text& file, const Text& section, const char* item) {
   std::array<char, Profiles::longest_value + 1> buffer{};
   const DWORD count = GetPrivateProfileStringA(to_ansi(section).c_str(), item, "", buffer.data(),
@@ -20,7 +20,7 @@ Text read_profile(const Text& file, const Text& section, const char* item) {
   return from_ansi({buffer.data(), count});
 }
 
-/// Names end at a NUL, as the system's do.
+/// Names end at a NUL, as they do for the system.
 Text path_of(const Text& application, const Text& section) {
   const Text path = Text(settings_key).append(up_to_nul(application));
   return section.empty() ? path : (path + u'\\').append(up_to_nul(section));
@@ -35,7 +35,7 @@ void require(LSTATUS status, const Text& path) {
                                                        number_to_text(static_cast<std::int32_t>(status)));
 }
 
-/// Anything but success and a missing key or value is the host's to know.
+/// Returns false for a missing key or value; raises other failures.
 bool is_there(LSTATUS status, const Text& path) {
   if (status == ERROR_FILE_NOT_FOUND || status == ERROR_PATH_NOT_FOUND) return false;
   require(status, path);
@@ -65,7 +65,7 @@ std::optional<Text> Win32SettingsStore::value(const Text& application, const Tex
   DWORD type = 0;
   DWORD bytes = 0;
   LSTATUS status = RegQueryValueExW(opened.get(), wide(key), nullptr, &type, nullptr, &bytes);
-  // Another process can make it longer between the two questions.
+  // Another process may lengthen the value between the two calls.
   while (status == ERROR_SUCCESS || status == ERROR_MORE_DATA) {
     text.resize((bytes + 1) / sizeof(char16_t));
     bytes = bytes_of(text.size());

@@ -4,7 +4,7 @@
 
 namespace talutil::win32 {
 
-/// The system's own profile functions, in their ANSI forms.
+/// The system's profile functions, in their ANSI form.
 class Win32Profiles final : public Profiles {
  public:
   Text value(const Text& file, const Text& section, const Text& item) override;
@@ -12,7 +12,8 @@ class Win32Profiles final : public Profiles {
   void put(const Text& file, const Text& section, const Text& item, const Text& value) override;
 };
 
-/// The user's hive below Software\TALUtil\Settings, a key for the application and one in it for the section.
+/// The settings below Software\TALUtil\Settings in the user's hive, with one key per application and one subkey per
+/// section.
 class Win32SettingsStore final : public SettingsStore {
  public:
   std::optional<Text> value(const Text& application, const Text& section, const Text& key) override;

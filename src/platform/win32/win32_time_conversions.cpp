@@ -8,7 +8,7 @@ namespace talutil::win32 {
 
 namespace {
 
-// The records are the platform's own, field for field, but for the signs.
+// The layouts equal those of the platform's structures, except for signedness.
 FILETIME native(FileTime time) noexcept { return std::bit_cast<FILETIME>(time); }
 FileTime ours(FILETIME time) noexcept { return std::bit_cast<FileTime>(time); }
 

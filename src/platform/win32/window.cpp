@@ -4,7 +4,7 @@ namespace talutil::win32 {
 
 namespace {
 
-/// The icon of the host's program, where it has one under the number that its tools give it.
+/// The first icon of the host's program, or the system's default.
 HICON host_icon() {
   const HICON icon = LoadIconW(GetModuleHandleW(nullptr), MAKEINTRESOURCEW(1));
   return icon != nullptr ? icon : LoadIconW(nullptr, IDI_APPLICATION);
@@ -38,7 +38,7 @@ OwnWindow::OwnWindow(const wchar_t* class_name, int background) : class_name_(cl
 OwnWindow::~OwnWindow() { destroy(); }
 
 OwnWindow* OwnWindow::of(HWND window) noexcept {
-  // By the procedure of the class: that of the window may be another's who has put his own in front of it.
+  // Compares the procedure of the class: someone may have subclassed the window.
   if (window == nullptr || GetClassLongPtrW(window, GCLP_WNDPROC) != reinterpret_cast<ULONG_PTR>(&handle_message)) {
     return nullptr;
   }
@@ -48,7 +48,7 @@ OwnWindow* OwnWindow::of(HWND window) noexcept {
 void OwnWindow::make(DWORD style, DWORD extended_style, HWND parent, const wchar_t* caption, Owned<kind::Menu> menu) {
   window_.reset(CreateWindowExW(extended_style, class_name_, caption, style, CW_USEDEFAULT, CW_USEDEFAULT, 0, 0, parent,
                                 menu.get(), own_module(), nullptr));
-  // A window ends its menu itself.
+  // A window destroys its menu itself.
   if (window_) static_cast<void>(menu.release());
 }
 
@@ -78,7 +78,7 @@ LRESULT CALLBACK OwnWindow::handle_message(HWND window, UINT message, WPARAM wha
     try {
       if (const auto answer = self->answer(message, what, value)) return *answer;
     } catch (...) {
-      // Nothing may leave a window procedure.
+      // Exceptions must not leave a window procedure.
     }
   }
   return DefWindowProcW(window, message, what, value);

@@ -5,14 +5,14 @@
 
 #include "platform/win32/handle.hpp"
 
-/// What our windows have in common: a class, a procedure, and at the top the waiting of a call until one is closed.
+/// What our windows share: a class, a procedure, and, for top-level windows, waiting until one is closed.
 namespace talutil::win32 {
 
 constexpr double twips_per_inch = 1440;
 
 namespace kind {
 
-/// A window class, by its name, for as long as a window needs it: its procedure must not outlive the library.
+/// A window class, by its name, registered while a window needs it: its procedure must not outlive the library.
 struct WindowClass {
   using Handle = const wchar_t*;
   static void close(const wchar_t* name) noexcept { UnregisterClassW(name, own_module()); }
@@ -22,8 +22,8 @@ struct WindowClass {
 
 [[nodiscard]] int dots_per_inch(HWND window);
 
-/// A window whose messages an object answers for as long as both are there. Several may share a class: the last one to
-/// go ends it.
+/// A window whose messages are handled by this object while both exist. Several windows may share a class; the last one
+/// unregisters it.
 class OwnWindow {
  public:
   OwnWindow(const OwnWindow&) = delete;
@@ -31,11 +31,11 @@ class OwnWindow {
 
   [[nodiscard]] HWND handle() const noexcept { return window_.get(); }
 
-  /// The object of a window; null where it is not ours.
+  /// The object of a window; null if the window is not ours.
   [[nodiscard]] static OwnWindow* of(HWND window) noexcept;
 
-  /// Handles a message of the keyboard that moves about the window, before the system makes characters of it. False for
-  /// other messages.
+  /// Handles a keyboard message for navigation, before the system translates it to characters. Returns false for other
+  /// messages.
   virtual bool take(MSG& /*message*/) { return false; }
 
  protected:
@@ -43,24 +43,24 @@ class OwnWindow {
   OwnWindow(const wchar_t* class_name, int background);
   virtual ~OwnWindow();
 
-  /// Makes the window, which answers from `attach` on: until then messages are the system's. Leaves none where the
-  /// system makes none.
-  /// @param menu goes over to the window
+  /// Creates the window. Its messages go to the system until `attach` is called, then to `answer`. If creation fails,
+  /// there is no window. The window takes ownership of the menu.
   void make(DWORD style, DWORD extended_style, HWND parent, const wchar_t* caption = L"",
             Owned<kind::Menu> menu = Owned<kind::Menu>());
   void attach() noexcept;
 
-  /// Ends the window, which answers no more. Destructors of classes that answer begin with it.
+  /// Destroys the window without any further call of `answer`. Destructors of classes that override `answer` start with
+  /// this.
   void destroy() noexcept;
 
-  /// The window has ended by somebody else's doing.
+  /// The window was destroyed from outside.
   void forget() noexcept { static_cast<void>(window_.release()); }
 
-  /// Answers a message; nothing leaves it to the system.
+  /// Handles a message; returns nothing to leave it to the system.
   virtual std::optional<LRESULT> answer(UINT message, WPARAM what, LPARAM value) = 0;
 
-  [[nodiscard]] RECT outer() const noexcept;  ///< The window with its frame, on the screen.
-  [[nodiscard]] RECT inner() const noexcept;  ///< The inside, from its own corner.
+  [[nodiscard]] RECT outer() const noexcept;  ///< Including the frame, in screen coordinates.
+  [[nodiscard]] RECT inner() const noexcept;  ///< The client area, in its own coordinates.
 
  private:
   static LRESULT CALLBACK handle_message(HWND window, UINT message, WPARAM what, LPARAM value) noexcept;
@@ -70,21 +70,21 @@ class OwnWindow {
   Owned<kind::Window> window_;
 };
 
-/// A window at the top, which a call can wait for.
+/// A top-level window that a call can wait for.
 class TopWindow : public OwnWindow {
  protected:
   using OwnWindow::OwnWindow;
 
-  /// Handles messages until the window is closed. When the thread is asked to quit, the window is closed first:
-  /// quitting is for the loop of the host, which hears of it afterwards.
+  /// Processes messages until the window is closed. A request to quit closes the window first and is then passed on to
+  /// the host's loop.
   void wait_until_closed();
 
-  /// Closes the window, as code does, when the thread is asked to quit.
+  /// Closes the window by code, on a request to quit.
   virtual void close_by_code() = 0;
 
   [[nodiscard]] bool is_closed() const noexcept { return is_closed_; }
 
-  /// Ends the waiting; the loop, which may be asleep, hears of it by `wake`.
+  /// Ends the waiting; `wake` wakes up the loop, which may be asleep.
   void set_closed() noexcept { is_closed_ = true; }
   static void wake() noexcept;
 
@@ -92,7 +92,7 @@ class TopWindow : public OwnWindow {
   bool is_closed_ = false;
 };
 
-/// The other windows of this thread, which take no input while one is shown that they wait for.
+/// Disables the other windows of this thread while a modal window is shown.
 class WaitingWindows {
  public:
   explicit WaitingWindows(HWND window);
@@ -100,7 +100,7 @@ class WaitingWindows {
   WaitingWindows& operator=(const WaitingWindows&) = delete;
   ~WaitingWindows();
 
-  /// The one that was active before; null where none was.
+  /// The window that was active before; null if none was.
   [[nodiscard]] HWND owner() const noexcept { return owner_; }
 
  private:

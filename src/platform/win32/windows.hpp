@@ -1,6 +1,6 @@
 #pragma once
 
-// The one way to the platform's headers.
+// The only place that includes the platform's headers.
 #define WIN32_LEAN_AND_MEAN
 #ifndef NOMINMAX
 #define NOMINMAX
@@ -17,7 +17,7 @@
 
 namespace talutil::win32 {
 
-// The platform's wide characters and our code units are the same 16 bits.
+// The platform's wide characters and our code units are both 16 bits wide.
 inline const wchar_t* wide(const char16_t* text) noexcept { return reinterpret_cast<const wchar_t*>(text); }
 inline const wchar_t* wide(const Text& text) noexcept { return wide(text.c_str()); }
 inline TextView view(const wchar_t* text, std::size_t length) noexcept {
