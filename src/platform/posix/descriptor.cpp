@@ -62,14 +62,18 @@ Descriptor open_file(const std::string& path, int flags) {
   // Non-blocking, because opening a pipe would otherwise wait for its other end.
   Descriptor file(open(path.c_str(), flags | O_CLOEXEC | O_NONBLOCK, file_rights));
   if (file.get() < 0) raise_for(errno, path);
+  require_regular(file, flags);
+  return file;
+}
+
+void require_regular(const Descriptor& file, int flags) {
   struct stat status {};
-  if (fstat(file.get(), &status) != 0) raise_for(errno, path);
+  if (fstat(file.get(), &status) != 0) raise_for(errno, {});
   if (S_ISDIR(status.st_mode)) raise(ErrorNumber::path_file_access);
   if (!S_ISREG(status.st_mode)) raise(ErrorNumber::bad_file_name_or_number);
   // Read-only is an attribute of the file here, regardless of the user's own rights.
   const bool may_write = (status.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)) != 0;
   if ((flags & O_ACCMODE) != O_RDONLY && !may_write) raise(ErrorNumber::path_file_access);
-  return file;
 }
 
 void lock(const Descriptor& file, int operation) {

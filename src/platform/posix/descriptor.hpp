@@ -28,6 +28,12 @@ class Descriptor {
 /// Opens a regular file. Raises the same errors as Files; a folder is 75, a device or a pipe 52.
 [[nodiscard]] Descriptor open_file(const std::string& path, int flags);
 
+/// The extended attribute in which other programs store the attributes of files from Windows.
+constexpr const char* dos_attributes = "user.DOSATTRIB";
+
+/// Raises 75 for a folder, 52 for a device or a pipe, and 75 for a read-only file that is opened for writing.
+void require_regular(const Descriptor& file, int flags);
+
 /// Takes a lock (LOCK_SH, LOCK_EX), waiting briefly for another holder; raises 70 if it is not released.
 void lock(const Descriptor& file, int operation);
 

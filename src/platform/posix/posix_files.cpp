@@ -16,6 +16,7 @@
 
 #include "platform/file_names.hpp"
 #include "platform/posix/descriptor.hpp"
+#include "platform/posix/replacement.hpp"
 
 namespace talutil::posix {
 
@@ -26,7 +27,7 @@ constexpr mode_t all_write_bits = S_IWUSR | S_IWGRP | S_IWOTH;
 /// The attributes that other programs store here for files from Windows.
 std::uint32_t stored_attributes(const std::string& path) {
   std::array<char, 32> text{};
-  if (lgetxattr(path.c_str(), "user.DOSATTRIB", text.data(), text.size() - 1) <= 0) return 0;
+  if (lgetxattr(path.c_str(), dos_attributes, text.data(), text.size() - 1) <= 0) return 0;
   return static_cast<std::uint32_t>(strtoul(text.data(), nullptr, 0)) &
          (file_attribute::hidden | file_attribute::system);
 }
@@ -88,68 +89,34 @@ class PosixInputFile final : public InputFile {
   std::uint64_t done_ = 0;
 };
 
-/// Writes a temporary file that replaces the target when it is closed. If the folder does not allow new files,
-/// overwrites the target in place.
+/// The file that a path refers to, through links, whether it exists or not.
+std::filesystem::path target_of(std::filesystem::path path) {
+  constexpr int most_links = 40;
+  std::error_code error;
+  for (int links = 0; std::filesystem::is_symlink(path, error); ++links) {
+    if (links == most_links) raise(ErrorNumber::path_file_access);
+    path = path.parent_path() / std::filesystem::read_symlink(path, error);
+  }
+  return path;
+}
+
+Replacement replacement_of(const std::string& given) {
+  const std::filesystem::path path = target_of(given);
+  const std::string parent = path.has_parent_path() ? path.parent_path().string() : ".";
+  Descriptor folder(open(parent.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
+  if (folder.get() < 0) raise_for(errno == ENOENT ? ENOTDIR : errno, path);
+  return {std::move(folder), path.filename(), O_WRONLY};
+}
+
 class PosixOutputFile final : public OutputFile {
  public:
-  explicit PosixOutputFile(std::string path) : path_(std::move(path)) {
-    // Problems with the target are reported now, not after everything has been written.
-    if (access(path_.c_str(), F_OK) == 0) {
-      target_ = open_file(path_, O_WRONLY);
-      lock(target_, LOCK_EX);
-      // Replaces the file that a link points to, not the link.
-      path_ = std::filesystem::canonical(path_).string();
-    } else if (errno != ENOENT) {
-      raise_for(errno, path_);
-    }
-    make_file();
-  }
+  explicit PosixOutputFile(const std::string& path) : replacement_(replacement_of(path)) { replacement_.keep_rights(); }
 
-  ~PosixOutputFile() override {
-    if (!temporary_.empty()) unlink(temporary_.c_str());
-  }
-
-  void write(std::string_view bytes) override { write_all(file_, bytes); }
-
-  void close() override {
-    if (fdatasync(file_.get()) != 0) raise_for(errno, path_);
-    if (temporary_.empty()) return;
-    if (rename(temporary_.c_str(), path_.c_str()) != 0) raise_for(errno, path_);
-    temporary_.clear();
-  }
+  void write(std::string_view bytes) override { write_all(replacement_.file(), bytes); }
+  void close() override { replacement_.take_name(); }
 
  private:
-  void make_file() {
-    const std::size_t end = path_.find_last_of('/');
-    std::string name = (end == std::string::npos ? std::string() : path_.substr(0, end + 1)) + ".talutil-XXXXXX";
-    file_ = Descriptor(mkostemp(name.data(), O_CLOEXEC));
-    if (file_.get() >= 0) {
-      temporary_ = name;
-      set_rights();
-      return;
-    }
-    if (target_.get() < 0 || (errno != EACCES && errno != EROFS)) raise_for(errno, path_);
-    file_ = std::move(target_);
-    if (ftruncate(file_.get(), 0) != 0) raise_for(errno, path_);
-  }
-
-  /// Sets the rights of the file being replaced, or the default ones.
-  void set_rights() const {
-    struct stat status {};
-    if (target_.get() >= 0 && fstat(target_.get(), &status) == 0) {
-      fchmod(file_.get(), status.st_mode & 07777);
-      if (fchown(file_.get(), status.st_uid, status.st_gid) != 0) return;  // Only an administrator can give files away.
-    } else {
-      const mode_t mask = umask(0);
-      umask(mask);
-      fchmod(file_.get(), 0666 & ~mask);
-    }
-  }
-
-  std::string path_;
-  std::string temporary_;
-  Descriptor target_;
-  Descriptor file_;
+  Replacement replacement_;
 };
 
 }  // namespace
@@ -215,7 +182,8 @@ void PosixFiles::delete_files(const Text& pattern) {
   const auto [folder, name] = split(pattern);
   if (name.empty()) raise(ErrorNumber::file_not_found);
   const std::string native_folder = folder_or_current(paths_, folder);
-  if (!std::filesystem::is_directory(native_folder)) raise(ErrorNumber::path_not_found);
+  std::error_code error;
+  if (!std::filesystem::is_directory(native_folder, error)) raise(ErrorNumber::path_not_found);
   std::vector<std::string> matches;
   search(pattern, file_attribute::hidden | file_attribute::system,
          [&](TextView match) { return matches.push_back(native_folder + "/" + to_utf8(match)), true; });

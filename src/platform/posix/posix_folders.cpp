@@ -8,11 +8,12 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include <atomic>
+#include <array>
 #include <filesystem>
 
 #include "platform/posix/descriptor.hpp"
 #include "platform/posix/posix_files.hpp"
+#include "platform/posix/replacement.hpp"
 
 namespace talutil::posix {
 
@@ -67,40 +68,26 @@ class PosixStoredFile final : public StoredFile {
   std::uint64_t size_ = 0;
 };
 
-/// A name that no other temporary file has.
-std::string temporary_name() {
-  static std::atomic<unsigned> next{0};
-  return ".talutil-" + std::to_string(getpid()) + "-" + std::to_string(next++);
-}
-
 class PosixNewFile final : public NewFile {
  public:
-  PosixNewFile(int folder, std::string name) : folder_(fcntl(folder, F_DUPFD_CLOEXEC, 0)), name_(std::move(name)) {
-    if (folder_.get() < 0) raise_for(errno, {});
-    open_replaced();
-    do {
-      temporary_ = temporary_name();
-      file_ = Descriptor(openat(folder_.get(), temporary_.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0666));
-    } while (file_.get() < 0 && errno == EEXIST);
-    if (file_.get() >= 0) return;
-    temporary_.clear();
-    raise_for(errno, {});
-  }
-
-  ~PosixNewFile() override {
-    if (!temporary_.empty()) unlinkat(folder_.get(), temporary_.c_str(), 0);
+  PosixNewFile(Descriptor folder, std::string name) : replacement_(std::move(folder), std::move(name), O_RDWR) {
+    if (replacement_.target().get() < 0) return;
+    // A second descriptor of the same open file, so that the lock stays.
+    Descriptor old(fcntl(replacement_.target().get(), F_DUPFD_CLOEXEC, 0));
+    if (old.get() < 0) raise_for(errno, {});
+    replaced_ = std::make_unique<PosixStoredFile>(std::move(old));
   }
 
   [[nodiscard]] StoredFile* replaced() noexcept override { return replaced_.get(); }
   [[nodiscard]] std::uint64_t size() const noexcept override { return size_; }
   std::size_t read_at(std::uint64_t offset, std::span<char> buffer) override {
-    return read_file(file_, offset, buffer);
+    return read_file(replacement_.file(), offset, buffer);
   }
 
   void write_at(std::uint64_t offset, std::string_view bytes) override {
     size_ = std::max(size_, offset + bytes.size());
     while (!bytes.empty()) {
-      const ssize_t written = pwrite(file_.get(), bytes.data(), bytes.size(), static_cast<off_t>(offset));
+      const ssize_t written = pwrite(replacement_.file().get(), bytes.data(), bytes.size(), static_cast<off_t>(offset));
       if (written < 0 && errno == EINTR) continue;
       if (written < 0) raise_for(errno, {});
       bytes.remove_prefix(static_cast<std::size_t>(written));
@@ -109,46 +96,27 @@ class PosixNewFile final : public NewFile {
   }
 
   void finish(const FileFacts* facts) override {
-    if (facts != nullptr) {
-      const std::array<timespec, 2> times{{{0, UTIME_OMIT}, {facts->modified, 0}}};
-      if (futimens(file_.get(), times.data()) != 0) raise_for(errno, {});
-      const mode_t mode = facts->mode & rights;
-      const bool is_locked = (facts->attributes & file_attribute::read_only) != 0;
-      if (mode != 0 || is_locked) fchmod(file_.get(), mode != 0 ? mode : S_IRUSR | S_IRGRP | S_IROTH);
-    } else if (replaced_mode_ != 0) {
-      fchmod(file_.get(), replaced_mode_ & rights);
-    }
-    file_ = Descriptor();
+    const int file = replacement_.file().get();
+    if (facts == nullptr || facts->mode == 0) replacement_.keep_rights();
+    if (facts == nullptr) return;
+    const std::array<timespec, 2> times{{{0, UTIME_OMIT}, {facts->modified, 0}}};
+    if (futimens(file, times.data()) != 0) raise_for(errno, {});
+    const mode_t mode = facts->mode & rights;
+    if (mode != 0) fchmod(file, mode);
+    if (mode == 0 && (facts->attributes & file_attribute::read_only) != 0) fchmod(file, S_IRUSR | S_IRGRP | S_IROTH);
   }
 
   using NewFile::take_name;
   void take_name(TextView other_name) override {
-    const std::string name = other_name.empty() ? name_ : to_utf8(other_name);
-    if (renameat(folder_.get(), temporary_.c_str(), folder_.get(), name.c_str()) != 0) raise_for(errno, {});
-    temporary_.clear();
+    if (other_name.empty())
+      replacement_.take_name();
+    else
+      replacement_.take_name(to_utf8(other_name));
   }
 
  private:
-  void open_replaced() {
-    struct stat status {};
-    if (fstatat(folder_.get(), name_.c_str(), &status, AT_SYMLINK_NOFOLLOW) != 0) return;
-    if (S_ISLNK(status.st_mode)) return;  // Replaces the link, not what it points to.
-    if ((attributes_by_status(name_, status) & (file_attribute::read_only | file_attribute::folder)) != 0) {
-      raise(ErrorNumber::path_file_access);
-    }
-    replaced_mode_ = status.st_mode;
-    Descriptor old(openat(folder_.get(), name_.c_str(), O_RDWR | O_CLOEXEC | O_NONBLOCK | O_NOFOLLOW));
-    if (old.get() < 0) raise_for(errno, {});
-    lock(old, LOCK_EX);
-    replaced_ = std::make_unique<PosixStoredFile>(std::move(old));
-  }
-
-  Descriptor folder_;
-  std::string name_;
-  std::string temporary_;
-  mode_t replaced_mode_ = 0;
+  Replacement replacement_;
   std::unique_ptr<PosixStoredFile> replaced_;
-  Descriptor file_;
   std::uint64_t size_ = 0;
 };
 
@@ -185,7 +153,9 @@ class PosixFolder final : public Folder {
   }
 
   [[nodiscard]] std::unique_ptr<NewFile> create(TextView name) override {
-    return std::make_unique<PosixNewFile>(folder_.get(), to_utf8(name));
+    Descriptor folder(fcntl(folder_.get(), F_DUPFD_CLOEXEC, 0));
+    if (folder.get() < 0) raise_for(errno, {});
+    return std::make_unique<PosixNewFile>(std::move(folder), to_utf8(name));
   }
 
   [[nodiscard]] std::unique_ptr<Folder> folder(TextView name, bool make_missing) override {

@@ -16,26 +16,43 @@ namespace {
 constexpr TextView settings_key = u"HKEY_CURRENT_USER\\Software\\TALUtil\\Settings\\";
 constexpr std::uint32_t text_type = 1;
 
-/// The contents of a file; nothing if it cannot be read.
-std::optional<std::string> read_file(PosixFiles& files, const Text& path) {
+/// The contents of a file. Raises what opening and reading raise.
+std::string read_file(PosixFiles& files, const Text& path) {
+  const auto file = files.open_input(path);
+  std::string bytes(static_cast<std::size_t>(file->size()), '\0');
+  std::size_t filled = 0;
+  while (filled < bytes.size()) {
+    const std::size_t count = file->read(std::span(bytes).subspan(filled));
+    if (count == 0) break;
+    filled += count;
+  }
+  bytes.resize(filled);
+  return bytes;
+}
+
+/// The contents of a file that is to be changed; only a missing one counts as empty, since all that is read here is
+/// what remains of the file afterwards.
+std::string read_for_change(PosixFiles& files, const Text& path) {
   try {
-    const auto file = files.open_input(path);
-    std::string bytes(static_cast<std::size_t>(file->size()), '\0');
-    std::size_t filled = 0;
-    while (filled < bytes.size()) {
-      const std::size_t count = file->read(std::span(bytes).subspan(filled));
-      if (count == 0) break;
-      filled += count;
-    }
-    bytes.resize(filled);
-    return bytes;
-  } catch (const RunTimeError&) {
-    return std::nullopt;
+    return read_file(files, path);
+  } catch (const RunTimeError& error) {
+    if (!error.is(ErrorNumber::file_not_found)) throw;
+    return {};
   }
 }
 
 /// A text as it comes out of the platform's buffer: in the code page, and no longer than fits.
 Text as_read(TextView text) { return from_ansi(to_ansi(text.substr(0, Profiles::longest_value))); }
+
+/// What a file says; empty if it cannot be read.
+template <class Look>
+Text look_up(PosixFiles& files, const Text& path, Look look) {
+  try {
+    return as_read(look(ProfileDocument(read_file(files, path))));
+  } catch (const RunTimeError&) {
+    return {};
+  }
+}
 
 /// The hive key of an application and a section, both cut off at a NUL as the platform does.
 Text key_of(const Text& application, const Text& section) {
@@ -46,16 +63,16 @@ Text key_of(const Text& application, const Text& section) {
 }  // namespace
 
 Text PosixProfiles::value(const Text& file, const Text& section, const Text& item) {
-  const auto bytes = read_file(files_, file);
-  return bytes ? as_read(ProfileDocument(*bytes).value(section, item).value_or(Text())) : Text();
+  return look_up(files_, file,
+                 [&](const ProfileDocument& document) { return document.value(section, item).value_or(Text()); });
 }
 
 Text PosixProfiles::item_names(const Text& file, const Text& section) {
-  Text names;
-  if (const auto bytes = read_file(files_, file)) {
-    for (const Text& name : ProfileDocument(*bytes).item_names(section)) names.append(name).append(1, u'\0');
-  }
-  return as_read(names);
+  return look_up(files_, file, [&](const ProfileDocument& document) {
+    Text names;
+    for (const Text& name : document.item_names(section)) names.append(name).append(1, u'\0');
+    return names;
+  });
 }
 
 void PosixProfiles::put(const Text& file, const Text& section, const Text& item, const Text& value) {
@@ -63,8 +80,9 @@ void PosixProfiles::put(const Text& file, const Text& section, const Text& item,
     // The file itself gets replaced, so the folder is locked instead.
     const std::string folder = std::filesystem::path(files_.native(file)).parent_path();
     const Descriptor folder_lock(open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    if (folder_lock.get() < 0 || flock(folder_lock.get(), LOCK_EX) != 0) return;
-    const std::string before = read_file(files_, file).value_or("");
+    if (folder_lock.get() < 0) return;
+    lock(folder_lock, LOCK_EX);
+    const std::string before = read_for_change(files_, file);
     ProfileDocument document(before);
     document.put(section, item, value);
     const std::string after = document.bytes();
