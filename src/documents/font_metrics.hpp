@@ -9,8 +9,8 @@
 
 namespace talutil {
 
-/// The widths of characters, the same for every renderer: those of the standard fonts of PDF for code page 1252
-/// (source: the PDF library's own tables), those of an embedded font for all others.
+/// The widths of characters, the same for every renderer: those of PDF's standard fonts for code page 1252 (from the
+/// PDF library's tables), and those of an embedded font for all other characters.
 class FontMetrics {
  public:
   explicit FontMetrics(FontFiles& files);
@@ -24,7 +24,7 @@ class FontMetrics {
   /// The width of a text on one line, in twips.
   [[nodiscard]] double width(TextView text, const FontStyle& font);
 
-  /// Whether a character is drawn in the other font.
+  /// Whether a character needs the embedded font.
   [[nodiscard]] static bool is_wide(char16_t unit) noexcept;
 
  private:
@@ -32,11 +32,11 @@ class FontMetrics {
 
   FontFiles& files_;
   std::unique_ptr<Library> library_;
-  std::array<std::array<std::uint16_t, 256>, 6> widths_{};  ///< By code of the code page, for family and weight.
+  std::array<std::array<std::uint16_t, 256>, 6> widths_{};  ///< By code, per family and weight.
   std::unordered_map<char16_t, std::int32_t> wide_widths_[2];
 };
 
-/// The family that stands for a font's name: Courier for fixed widths, Times for those with serifs, else Helvetica.
+/// The substitute for a named font: Courier for fixed width, Times for serifs, otherwise Helvetica.
 [[nodiscard]] FontFamily family_of(TextView font_name);
 
 }  // namespace talutil

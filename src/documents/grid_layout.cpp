@@ -1,4 +1,4 @@
-// Grids on pages.
+// Lays grids out on pages.
 #include <algorithm>
 #include <cmath>
 
@@ -16,7 +16,7 @@ constexpr std::int16_t check_box_setting = 5;
 constexpr std::uint32_t usual_heading_colour = 0x00E8E8E8;
 constexpr std::uint32_t usual_line_colour = 0x00C0C0C0;
 
-/// A property that a grid may lack.
+/// Reads a property that the grid may not have.
 template <class T>
 T answer_or(const Control& grid, TextView member, T otherwise) {
   return grid.answers(member) ? grid.get<T>(member) : otherwise;
@@ -25,20 +25,20 @@ T answer_or(const Control& grid, TextView member, T otherwise) {
 std::uint32_t colour_or(const Control& grid, TextView member, std::uint32_t otherwise) {
   const auto colour = static_cast<std::uint32_t>(answer_or(grid, member, static_cast<std::int32_t>(otherwise)));
   constexpr std::uint32_t system_colour = 0x80000000;
-  // What a system colour is on somebody's screen is none of a report's.
+  // A system colour depends on the user's screen, which has no place in a report.
   return (colour & system_colour) != 0 ? otherwise : colour & 0xFFFFFF;
 }
 
 enum class Alignment : std::uint8_t { left, centre, right, general };
 
-/// Grids count alignments by threes (top, middle, bottom): left, centred, right, and 9 for numbers right, texts left.
+/// Grid alignments come in threes (top, middle, bottom): left, centred, right. 9 is right for numbers, left for texts.
 Alignment alignment_of(std::int32_t code) noexcept {
   return code < 0 || code > 8 ? Alignment::general : static_cast<Alignment>(code / 3);
 }
 
 }  // namespace
 
-/// What a grid shows: read once, and complete before the first cell is laid out.
+/// The contents of a grid: read once, completely, before the first cell is laid out.
 struct ReportComposer::GridLayout {
   struct Column {
     std::int32_t index = 0;
@@ -57,8 +57,8 @@ struct ReportComposer::GridLayout {
   bool has_lines = true;
   bool wraps = false;
   std::vector<Column> columns;
-  std::size_t heading_rows = 0;       ///< Of those shown.
-  std::vector<std::int32_t> heights;  ///< Of the rows that are shown; 0 where a row is as high as its text.
+  std::size_t heading_rows = 0;       ///< Among the rows that are shown.
+  std::vector<std::int32_t> heights;  ///< Of the rows that are shown; 0 for a row as high as its text.
   std::vector<Cell> cells;            ///< Row by row.
 
   GridLayout(const Control& grid, const FontStyle& usual_font, std::int32_t room);
@@ -138,7 +138,7 @@ void ReportComposer::add_cell(const GridLayout& layout, std::size_t row, std::si
   std::int32_t top = place.top + cell_padding / 2;
   TextView rest = cell.text;
   while (!rest.empty() && (top + height <= place.top + place.height || rest.size() == cell.text.size())) {
-    // Without wrapping there is the first line alone, as much of it as there is room for.
+    // Without wrapping only the first line is shown, cut off where the room ends.
     const TextView line = layout.wraps ? take_line(rest, room, layout.font)
                                        : fitting(rest.substr(0, rest.find_first_of(u"\r\n")), room, layout.font);
     if (!layout.wraps) rest = {};
@@ -169,9 +169,9 @@ void ReportComposer::add_row(const GridLayout& layout, std::size_t row, std::int
   y_ += height;
 }
 
-/// How high the rows are on every page that they are on: as the grid says, else as their longest text needs.
+/// The height of each row, the same on every page: as the grid specifies, or as its longest text needs.
 std::vector<std::int32_t> ReportComposer::row_heights(const GridLayout& layout) {
-  // A row that is higher than a page is cut off.
+  // A row higher than a page is cut off.
   const std::int32_t most = setup_.bottom() - setup_.margin_top;
   std::vector<std::int32_t> heights(layout.rows());
   for (std::size_t row = 0; row < heights.size(); ++row) {

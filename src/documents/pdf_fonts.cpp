@@ -28,7 +28,7 @@ HPDF_Font PdfDocument::wide_font(bool is_fixed_width) {
   const char* const name =
       HPDF_LoadTTFontFromMem(document_, bytes.data(), static_cast<HPDF_UINT>(bytes.size()), HPDF_TRUE);
   if (name != nullptr) wide.font = HPDF_GetFont(document_, name, "UTF-8");
-  // A font that cannot be used, or loaded twice under one name, is none.
+  // Treat a font that is unusable, or already loaded under that name, as missing.
   if (wide.font == nullptr) HPDF_ResetError(document_);
   return wide.font;
 }

@@ -9,10 +9,10 @@
 
 namespace talutil {
 
-/// A document of the PDF library with the fonts that are used in it.
+/// A document of the PDF library and the fonts used in it.
 class PdfDocument {
  public:
-  /// Raises 7 without memory.
+  /// Raises 7 if out of memory.
   explicit PdfDocument(FontFiles& files);
   PdfDocument(const PdfDocument&) = delete;
   PdfDocument& operator=(const PdfDocument&) = delete;
@@ -23,10 +23,10 @@ class PdfDocument {
   /// A standard font, for text in code page 1252.
   [[nodiscard]] HPDF_Font standard_font(FontFamily family, bool is_bold);
 
-  /// An embedded font for all other characters, for text in UTF-8; null where the platform has none.
+  /// An embedded font for all other characters, for text in UTF-8; null if the platform has none.
   [[nodiscard]] HPDF_Font wide_font(bool is_fixed_width);
 
-  /// Raises 7 or 51 when the library has failed since.
+  /// Raises 7 or 51 if the library has failed in the meantime.
   void check() const;
 
  private:
@@ -41,7 +41,7 @@ class PdfDocument {
   std::array<WideFont, 2> wide_;
 };
 
-/// The place of a family and weight among the six standard fonts.
+/// The index of a family and weight among the six standard fonts.
 [[nodiscard]] constexpr std::size_t font_index(FontFamily family, bool is_bold) noexcept {
   return static_cast<std::size_t>(family) * 2 + (is_bold ? 1 : 0);
 }

@@ -23,7 +23,7 @@ constexpr Rgb rgb_of(std::uint32_t colour) noexcept {
   return {part(0), part(8), part(16)};
 }
 
-/// Draws the items of one page. What lies wholly outside of it is left out.
+/// Draws the items of one page, skipping those entirely outside it.
 class PageWriter {
  public:
   PageWriter(PdfDocument& pdf, const Page& page) : pdf_(pdf), page_(page), target_(HPDF_AddPage(pdf.get())) {
@@ -115,7 +115,7 @@ void save(PdfDocument& pdf, OutputFile& file) {
 
 void write_pdf(const Document& document, const PdfInformation& information, FontFiles& fonts, Files& files,
                const Text& path) {
-  // Whatever is wrong with the file shows before the work is done.
+  // Problems with the file are reported now, not after the work is done.
   const auto file = files.open_output(path);
   PdfDocument pdf(fonts);
   const auto inform = [&](HPDF_InfoType type, const Text& text) {

@@ -13,8 +13,8 @@ struct PdfInformation {
   Text creator;
 };
 
-/// Writes a document as PDF: compressed, its text searchable, a bookmark for each section. Nothing has the file's name
-/// before all is written. A document without pages gets an empty one. Raises what the file raises, and 7.
+/// Writes a document as PDF: compressed, with searchable text and a bookmark per section. The file gets its name only
+/// once it is complete. A document without pages gets an empty one. Raises the errors of writing a file, and 7.
 void write_pdf(const Document& document, const PdfInformation& information, FontFiles& fonts, Files& files,
                const Text& path);
 

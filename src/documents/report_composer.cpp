@@ -20,7 +20,7 @@ bool is_control(char16_t unit) noexcept {
   return (unit < u' ' && unit != u'\t' && unit != u'\r' && unit != u'\n') || unit == 0x7F;
 }
 
-/// Control characters by the letter that is typed with them; those that end lines stay.
+/// Shows control characters in caret notation; those that end lines are kept.
 Text with_visible_controls(TextView text) {
   Text result;
   for (const char16_t unit : text) {
@@ -37,7 +37,7 @@ Text with_visible_controls(TextView text) {
 }  // namespace
 
 const PaperSize& paper_size(std::int32_t code) noexcept {
-  // The codes of the platform's printing functions. ISO sizes in millimetres, the others in inches, to the twip.
+  // The platform's printing codes. ISO sizes are in millimetres, others in inches, converted to the nearest twip.
   static constexpr PaperSize sizes[] = {
       {1, 12240, 15840},   // Letter, 8.5 x 11
       {5, 12240, 20160},   // Legal, 8.5 x 14
@@ -105,13 +105,13 @@ void ReportComposer::add_line(TextView line, const FontStyle& font) {
 void ReportComposer::add_paragraph(TextView text, const FontStyle& font) {
   const double room = setup_.room();
   std::size_t line_start = 0;
-  std::size_t word_start = 0;  // After the last place where the line may end.
+  std::size_t word_start = 0;  // After the last position at which the line may be broken.
   double x = 0;
   double word_width = 0;
   for (std::size_t i = 0; i < text.size(); ++i) {
     const bool is_blank = text[i] == u' ' || text[i] == u'\t';
     const double width = text[i] == u'\t' ? after_tab(x, font) - x : to_twips(metrics_.width(text[i], font), font);
-    // Blanks at the end of a line hang over its edge.
+    // Blanks at the end of a line may extend beyond its edge.
     if (!is_blank && x + width > room && i > line_start) {
       const bool breaks_word = word_start == line_start || !setup_.wraps_words;
       const std::size_t end = breaks_word ? i : word_start;
@@ -136,7 +136,7 @@ void ReportComposer::add_text(TextView text, const FontStyle& font) {
     const std::size_t end = std::min(text.find_first_of(u"\r\n\f", at), text.size());
     const TextView paragraph = text.substr(at, end - at);
     const bool ends_page = end < text.size() && text[end] == u'\f';
-    // A form feed on a line of its own ends no line.
+    // A form feed on a line of its own adds no empty line.
     if (!paragraph.empty() || !ends_page) {
       if (std::ranges::any_of(paragraph, is_control))
         add_paragraph(with_visible_controls(paragraph), font);
@@ -157,8 +157,8 @@ TextView ReportComposer::fitting(TextView text, double room, const FontStyle& fo
   return text;
 }
 
-/// The next line of a text that is broken into a room's width: between words where there are any, after a character
-/// otherwise. What is left of the text begins behind the break.
+/// Takes the next line of a text that is wrapped at a width: broken between words if possible, otherwise after a
+/// character. `text` becomes the rest after the break.
 TextView ReportComposer::take_line(TextView& text, double room, const FontStyle& font) {
   const std::size_t line_end = std::min(text.find_first_of(u"\r\n"), text.size());
   const TextView line = text.substr(0, line_end);
@@ -169,7 +169,7 @@ TextView ReportComposer::take_line(TextView& text, double room, const FontStyle&
   }
   const std::size_t blank = line.find_last_of(u' ', shown);
   if (blank != Text::npos && blank > 0) shown = blank;
-  // A room that is too narrow for any character has one all the same, so that there is an end.
+  // Always take at least one character, even if it does not fit, so that the loop ends.
   shown = std::max<std::size_t>(shown, 1);
   text.remove_prefix(std::min(text.find_first_not_of(u' ', shown), text.size()));
   return line.substr(0, shown);
@@ -204,7 +204,7 @@ Document ReportComposer::finish() {
   const Text title(trim_blanks(setup_.header));
   for (std::size_t i = 0; i < count; ++i) {
     Page& target = document_.pages[i];
-    // By way of the page that is being written: the last one.
+    // Swapped with the last page, because that is the one being written to.
     std::swap(target, document_.pages.back());
     const std::int32_t header_top = setup_.margin_top - 2 * line_height(font);
     add_runs(fitting(setup_.header, setup_.room(), font), setup_.margin_left, header_top, font);

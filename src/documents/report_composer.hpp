@@ -6,7 +6,7 @@
 
 namespace talutil {
 
-/// The paper and what stands on every page. Lengths are twips.
+/// The paper, and what appears on every page. Lengths are in twips.
 struct PageSetup {
   std::int32_t width = 0;
   std::int32_t height = 0;
@@ -17,14 +17,14 @@ struct PageSetup {
   Text header;  ///< Above the top margin, on every page.
   FontStyle header_font;
   bool has_rule = true;  ///< A rule below the header.
-  Text footer;           ///< Left, below the bottom margin; the page's number stands right.
+  Text footer;           ///< On the left, below the bottom margin; the page number is on the right.
   bool wraps_words = true;
 
   [[nodiscard]] std::int32_t room() const noexcept { return width - margin_left - margin_right; }
   [[nodiscard]] std::int32_t bottom() const noexcept { return height - margin_bottom; }
 };
 
-/// A size of paper by the platform's code, upright, in twips; A4 for a code that is not known.
+/// A paper size by the platform's code, in portrait orientation, in twips; A4 for an unknown code.
 struct PaperSize {
   std::int32_t code;
   std::int32_t width;
@@ -32,30 +32,30 @@ struct PaperSize {
 };
 [[nodiscard]] const PaperSize& paper_size(std::int32_t code) noexcept;
 
-/// Lays a report out on pages, from the top of the first one on.
+/// Lays out a report on pages, starting at the top of the first.
 class ReportComposer {
  public:
   ReportComposer(FontMetrics& metrics, PageSetup setup);
 
-  /// Flowing text, in paragraphs. Lines break between words (or within one that is longer than a line), at tabs of
-  /// eight characters; a form feed begins a new page, other control characters are shown as "^A". A text that does not
-  /// end a line is followed by the next one on a line of its own.
+  /// Adds flowing text, in paragraphs. Lines are broken between words (or within a word that is longer than a line).
+  /// Tab stops are eight characters apart; a form feed begins a new page; other control characters are shown as "^A".
+  /// If the text does not end with a line end, the next text still starts on a new line.
   void add_text(TextView text, const FontStyle& font);
 
-  /// A text in a box, cut off at its edges, wherever the box lies: no page is begun for it.
+  /// Adds a text in a box, clipped at its edges. The box may be anywhere and never begins a new page.
   void add_text_box(TextView text, const TwipsRectangle& place, const FontStyle& font);
 
-  /// A grid as it looks: the rows and columns that it shows, widths, heights, alignments, fonts and colours where it
-  /// answers for them; long texts in more lines where it wraps them, else cut off. Its fixed rows stand on top of every
-  /// page; columns that do not fit follow on pages of their own.
+  /// Adds a grid as it appears: visible rows and columns, widths and heights, and alignments, fonts and colours as far
+  /// as it supports those properties; long texts are wrapped if the grid wraps them, otherwise cut off. Fixed rows are
+  /// repeated on every page; columns that do not fit continue on separate pages.
   void add_grid(const Control& grid, const FontStyle& font);
 
-  /// A picture, made smaller where it is larger than the page's room.
+  /// Adds a picture, reduced to fit on the page.
   void add_picture(Picture picture);
 
   void begin_section(Text title);
 
-  /// Puts headers and footers on every page and gives the document.
+  /// Adds headers and footers to every page and returns the document.
   [[nodiscard]] Document finish();
 
  private:
