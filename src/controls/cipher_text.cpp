@@ -108,7 +108,7 @@ std::optional<Bytes> decode(TextView text) {
     *next++ = static_cast<std::uint8_t>(bits >> bit_count);
     bits &= (1U << bit_count) - 1;
   }
-  // What the padding leaves of the last digit is zero in every text that we write.
+  // The unused bits of the last digit are zero in every text that we write.
   if (bits != 0) return std::nullopt;
   return bytes;
 }

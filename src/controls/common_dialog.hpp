@@ -5,7 +5,7 @@
 
 namespace talutil {
 
-/// The file dialog control, over the platform's dialogs.
+/// The file dialog control, implemented by the platform's dialogs.
 class CommonDialog final : public TableObject<CommonDialog> {
  public:
   explicit CommonDialog(const Platform& platform) : TableObject(platform), dialogs_(platform.file_dialogs) {}
@@ -22,8 +22,8 @@ class CommonDialog final : public TableObject<CommonDialog> {
   /// FileName without its folder.
   [[nodiscard]] Text FileTitle() const;
 
-  /// Show the dialog and put the file chosen into FileName, the filter into FilterIndex. A dialog that is cancelled
-  /// changes nothing, and raises 32755 with CancelError. Raise 52 for a FileName that no file can have.
+  /// Show the dialog and store the chosen file in FileName and the filter in FilterIndex. If the dialog is cancelled,
+  /// nothing changes, and with CancelError 32755 is raised. Raise 52 if FileName is not a valid file name.
   void ShowOpen() { show(FileDialog::Purpose::open); }
   void ShowSave() { show(FileDialog::Purpose::save); }
 

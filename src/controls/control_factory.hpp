@@ -4,13 +4,13 @@
 
 namespace talutil {
 
-/// Makes the controls that forms hold, keyed by the class names that hosts know. Ours are built in; another
-/// maker's takes the place of one when the user has registered it under that name.
+/// Creates the controls that forms contain, by the class names that hosts know. Ours are built in; a third-party
+/// control replaces one of them if the user has registered it under that name.
 class ControlFactory {
  public:
   explicit ControlFactory(const Platform& platform) : platform_(platform) {}
 
-  /// A new control. Raises 429 for a class name nobody makes.
+  /// Creates a control. Raises 429 for an unknown class name.
   [[nodiscard]] ObjectRef create(TextView class_name) const;
 
  private:

@@ -10,7 +10,7 @@ void require(bool is_known) {
   if (!is_known) raise(ErrorNumber::invalid_procedure_call);
 }
 
-/// One error for all that can be wrong with a cipher text: which check failed is nobody's business.
+/// The same error whatever is wrong with a cipher text, so as not to reveal which check failed.
 template <class T>
 T opened(std::optional<T> result) {
   if (!result) {

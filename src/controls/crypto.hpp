@@ -4,16 +4,16 @@
 
 namespace talutil {
 
-/// Bytes on their way into the encryption control or out of it.
+/// Data passed to or returned by the encryption control.
 class CryptoData final : public TableObject<CryptoData> {
  public:
-  /// The codes of the forms that data are given and read in.
+  /// The formats in which data can be passed and read.
   static constexpr std::int32_t encoded = 1;  ///< Base64
   static constexpr std::int32_t plain = 3;    ///< The code units of a text
 
   CryptoData(Bytes bytes, const Locale& locale) : TableObject(locale), bytes_(std::move(bytes)) {}
 
-  /// The data in one of the forms. Raises 5 for another code and for bytes that have no such form.
+  /// The data in one of the formats. Raises 5 for an unknown format, and for bytes that cannot be shown in it.
   [[nodiscard]] Text Read(const std::int32_t& Format) const;
 
   [[nodiscard]] const Bytes& bytes() const noexcept { return bytes_; }
@@ -22,13 +22,13 @@ class CryptoData final : public TableObject<CryptoData> {
   Bytes bytes_;
 };
 
-/// The key of a pass phrase, with the options that say how it is used. There is one way that is safe, so each
-/// option has one value; they stand for those that the messages of this key are marked with.
+/// The key of a pass phrase, with options for its use. Only one way is safe, so each option has a single value, which
+/// describes how this key's messages are encrypted.
 class CryptoKey final : public TableObject<CryptoKey> {
  public:
   static constexpr std::int32_t counter_mode = 1;  ///< Galois/counter mode
-  static constexpr std::int32_t no_padding = 2;    ///< The mode needs none
-  static constexpr std::int32_t aes = 9;           ///< AES with the key's 256 bits
+  static constexpr std::int32_t no_padding = 2;    ///< Not needed by the mode
+  static constexpr std::int32_t aes = 9;           ///< AES with a key of 256 bits
 
   CryptoKey(const Platform& platform, const Cryptography::Key& key)
       : TableObject(platform), platform_(platform), key_(key) {}
@@ -36,12 +36,12 @@ class CryptoKey final : public TableObject<CryptoKey> {
   std::int32_t Mode = 0;
   std::int32_t Padding = 0;
 
-  /// Encrypts data under a fresh nonce and gives new data. Raises 5 for options or an algorithm that are not those
-  /// above and for a Final of False (a message is given whole), 13 for data of another kind.
+  /// Encrypts data with a fresh nonce and returns the result as new data. Raises 5 for an algorithm or options other
+  /// than the above and if Final is False (a message must be passed whole), 13 if Data is another kind of object.
   [[nodiscard]] Variant Encrypt(const std::int32_t& Algorithm, const Variant& Data, const Boolean& Final) const;
 
-  /// Undoes Encrypt. Data that were not encrypted by this key, or were changed, raise 5 with one description whatever
-  /// is wrong with them.
+  /// Reverses Encrypt. Data that were changed, or not encrypted with this key, raise 5, always with the same
+  /// description.
   [[nodiscard]] Variant Decrypt(const std::int32_t& Algorithm, const Variant& Data, const Boolean& Final) const;
 
  private:
@@ -51,7 +51,7 @@ class CryptoKey final : public TableObject<CryptoKey> {
   Cryptography::Key key_;
 };
 
-/// The encryption control: strings to printable cipher text and back. See cipher_text.hpp for the bytes.
+/// The encryption control: converts strings to printable cipher text and back. See cipher_text.hpp for the format.
 class Crypto final : public TableObject<Crypto> {
  public:
   static constexpr std::int32_t key_bits = 256;
@@ -59,12 +59,12 @@ class Crypto final : public TableObject<Crypto> {
 
   explicit Crypto(const Platform& platform) : TableObject(platform), platform_(platform) {}
 
-  /// A key object. Raises 5 for any KeyBits but 256 and any Derivation but 1, a pass phrase.
+  /// Creates a key. Raises 5 for any KeyBits but 256 and any Derivation but 1 (a pass phrase).
   [[nodiscard]] Variant CreateKey(const Text& PassPhrase, const std::int32_t& KeyBits,
                                   const std::int32_t& Derivation) const;
 
-  /// A data object from a text in one of the forms. Raises 5 for another code, and as Decrypt does for a text
-  /// that is not Base64.
+  /// Creates data from a text in one of the formats. Raises 5 for an unknown format, and for a text that is not Base64
+  /// (with the description that Decrypt uses).
   [[nodiscard]] Variant CreateData(const Text& Source, const std::int32_t& Format) const;
 
  private:

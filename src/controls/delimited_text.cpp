@@ -12,7 +12,7 @@ constexpr std::string_view byte_order_mark = "\xEF\xBB\xBF";
 
 bool is_line_break(char16_t unit) noexcept { return unit == u'\r' || unit == u'\n'; }
 
-/// Steps over one line end.
+/// The position after a line end.
 std::size_t after_line_end(TextView text, std::size_t at) noexcept {
   return text.substr(at).starts_with(u"\r\n") ? at + 2 : at + 1;
 }
@@ -27,7 +27,7 @@ std::vector<TextView> lines_of(TextView text) {
   return lines;
 }
 
-/// Reads the cell at a place and leaves the place behind it.
+/// Reads the cell at a position and moves the position past it.
 Text delimited_cell(TextView text, std::size_t& at, char16_t separator) {
   Text cell;
   if (at < text.size() && text[at] == u'"') {
@@ -49,7 +49,7 @@ Text delimited_cell(TextView text, std::size_t& at, char16_t separator) {
 }  // namespace
 
 bool TableFile::fits_code_page(TextView text) noexcept {
-  // The code page gives what has no place in it the nearest character, or a question mark.
+  // For a character that the code page lacks, conversion yields the nearest one or a question mark.
   return is_ascii(text) ||
          std::ranges::all_of(text, [](char16_t unit) { return chr(ansi_code(unit)).front() == unit; });
 }
@@ -75,7 +75,7 @@ void TableFile::flush() {
 
 Text read_table_file(Files& files, const Text& path) {
   const auto file = files.open_input(path);
-  constexpr std::uint64_t largest = 1U << 30;  // A table of that size has no room in a program of 32 bits.
+  constexpr std::uint64_t largest = 1U << 30;  // A larger table would not fit into a 32-bit process.
   if (file->size() > largest) raise(ErrorNumber::out_of_memory);
   std::string bytes(static_cast<std::size_t>(file->size()), '\0');
   std::size_t size = 0;
@@ -116,7 +116,7 @@ std::vector<std::vector<Text>> read_delimited(TextView text, char16_t separator)
 
 std::vector<std::vector<Text>> read_fixed(TextView text) {
   const std::vector<TextView> lines = lines_of(text);
-  // Where some line has a character.
+  // The columns in which any line has a character.
   std::vector<bool> is_taken;
   for (const TextView line : lines) {
     is_taken.resize(std::max(is_taken.size(), line.size()));

@@ -7,15 +7,16 @@
 
 #include "platform/files.hpp"
 
-/// Tables as text: a row is a line that ends with carriage return and line feed.
+/// Tables as text: each row is a line that ends with carriage return and line feed.
 namespace talutil {
 
-/// Writes a file in code page 1252, or in UTF-8 with a byte-order mark where the file is to hold a character that has
-/// no place in the code page. It takes its name with `close`.
+/// Writes a file in code page 1252, or in UTF-8 with a byte order mark if it is to contain characters that the code
+/// page lacks. `close` gives the file its name.
 class TableFile {
  public:
-  /// @param is_wide whether a text of the file fails `fits_code_page`
-  /// Raises what opening raises.
+  /// @param is_wide true if any text of the file fails `fits_code_page`
+  ///
+  /// Raises the same errors as opening a file.
   TableFile(Files& files, const Text& path, bool is_wide);
 
   void write(TextView text);
@@ -31,19 +32,18 @@ class TableFile {
   bool is_wide_;
 };
 
-/// The text of such a file. Raises what opening and reading raise.
+/// The text of such a file. Raises the same errors as opening and reading it.
 [[nodiscard]] Text read_table_file(Files& files, const Text& path);
 
-/// A cell between separators: in quotes, with its quotes doubled, when it has a separator, a quote or a line break in
-/// it.
+/// Appends a cell. It is quoted, with its quotes doubled, if it contains a separator, a quote or a line break.
 void append_delimited(Text& line, TextView cell, char16_t separator);
 
-/// The rows of a text with separators; any line end ends a row. A quoted cell goes to its closing quote, what follows
-/// up to the separator is part of it; a quote that is never closed takes the rest of the text.
+/// The rows of a text with separators; any line end ends a row. A quoted cell extends to its closing quote; text
+/// between that and the separator is part of it. An unclosed quote takes the rest of the text.
 [[nodiscard]] std::vector<std::vector<Text>> read_delimited(TextView text, char16_t separator);
 
-/// The rows of a text in columns of fixed widths: a column begins where every line has two blanks before it, or has
-/// ended. Blanks at the end of a cell are not part of it.
+/// The rows of a text with columns of fixed width: a column begins where every line has two blanks before it, or has
+/// already ended. Trailing blanks are not part of a cell.
 [[nodiscard]] std::vector<std::vector<Text>> read_fixed(TextView text);
 
 }  // namespace talutil

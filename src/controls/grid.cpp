@@ -73,7 +73,7 @@ void RowText::keep(std::size_t columns) {
 }
 
 void RowText::tidy() {
-  // All memory first: when it ends, the places still fit the old text.
+  // Allocate first: if that fails, the positions still match the old text.
   std::size_t used = 0;
   for (const Place& place : cells_) used += place.length;
   Text units;
@@ -224,7 +224,7 @@ void Grid::LoadGrid(const Text& file, std::int16_t format_code, Boolean fixed_ce
   const std::size_t columns = first_column + width;
   if (first_row + rows.size() > most_rows || columns > most_columns) raise(ErrorNumber::out_of_memory);
 
-  // Made aside and exchanged when complete, so that a table without room in memory leaves the old one.
+  // Built separately and then swapped in, so that the old table survives if memory runs out.
   std::vector<Column> new_columns = columns_;
   new_columns.resize(columns);
   std::vector<TableRow> new_rows(rows_.begin(), rows_.begin() + static_cast<std::ptrdiff_t>(first_row));
@@ -240,7 +240,7 @@ void Grid::LoadGrid(const Text& file, std::int16_t format_code, Boolean fixed_ce
   rows_.swap(new_rows);
   fixed_rows_ = std::min(fixed_rows_, Rows());
   fixed_columns_ = std::min(fixed_columns_, Cols());
-  // What was selected is gone but for the rows that stay.
+  // The selection is gone, except for rows that remain.
   row_ = std::min(row_, static_cast<std::int32_t>(first_row) - 1);
   row_end_ = std::min(row_end_, static_cast<std::int32_t>(first_row) - 1);
 }

@@ -8,16 +8,16 @@
 
 namespace talutil {
 
-/// The texts of a row in little room: one after another, each cell knowing where its own lies. Cells beyond the last
-/// one that was ever filled take none.
+/// The texts of a row, stored compactly: one string, in which each cell knows its position. Cells after the last one
+/// ever filled take no memory.
 class RowText {
  public:
   [[nodiscard]] TextView cell(std::size_t column) const noexcept;
 
-  /// @param columns how many cells the row will have, most likely
+  /// @param columns the number of cells that the row will probably have
   void set(std::size_t column, TextView text, std::size_t columns);
 
-  /// Cuts the row off behind some cells.
+  /// Discards the cells from `columns` on.
   void keep(std::size_t columns);
 
  private:
@@ -26,16 +26,16 @@ class RowText {
     std::uint32_t length = 0;
   };
 
-  /// Leaves out what cells have been replaced by others.
+  /// Removes text that no cell refers to any more.
   void tidy();
 
   Text units_;
   std::vector<Place> cells_;
-  std::uint32_t unused_ = 0;  ///< Units that belong to no cell any more.
+  std::uint32_t unused_ = 0;  ///< Code units that no cell refers to any more.
 };
 
-/// The grid control: a table of texts with what a grid that is shown knows about its rows and columns. Rows and columns
-/// are counted from 0; an index outside the table raises 9 everywhere.
+/// The grid control: a table of texts, with the properties of rows and columns that a visible grid has. Rows and
+/// columns are counted from 0; an index outside the table always raises 9.
 class Grid final : public TableObject<Grid>, public TableSource {
  public:
   static constexpr std::int16_t text_setting = 0;
@@ -56,30 +56,30 @@ class Grid final : public TableObject<Grid>, public TableSource {
 
   explicit Grid(const Platform& platform) : TableObject(platform), files_(platform.files) {}
 
-  /// The size of the table. Cells that it loses are gone; new ones are empty. Fewer rows or columns than are fixed take
-  /// the fixed ones with them. Raise 5 for a negative number and 7 beyond the limits above.
+  /// The size of the table. Shrinking discards cells; new cells are empty. If fewer rows or columns remain than were
+  /// fixed, all of them are fixed. Raise 5 for a negative number and 7 beyond the limits above.
   [[nodiscard]] std::int32_t Rows() const noexcept { return static_cast<std::int32_t>(rows_.size()); }
   void put_Rows(std::int32_t rows);
   [[nodiscard]] std::int32_t Cols() const noexcept { return static_cast<std::int32_t>(columns_.size()); }
   void put_Cols(std::int32_t columns);
 
-  /// How many of the first rows and columns are headings. Raise 5 for more than there are.
+  /// The number of leading rows and columns that are headings. Raise 5 for more than there are.
   [[nodiscard]] std::int32_t FixedRows() const noexcept { return fixed_rows_; }
   void put_FixedRows(std::int32_t rows);
   [[nodiscard]] std::int32_t FixedCols() const noexcept { return fixed_columns_; }
   void put_FixedCols(std::int32_t columns);
 
-  /// The text of a cell. A value is kept as its text.
+  /// The text of a cell. Values are stored as text.
   [[nodiscard]] Text TextMatrix(std::int32_t row, std::int32_t column) const;
   void put_TextMatrix(std::int32_t row, std::int32_t column, const Text& value) { put_cell(row, column, value); }
   void put_cell(std::int32_t row, std::int32_t column, TextView text);
 
-  /// A setting of a cell: 0 its text, 5 the state of its check box, which cells of a column of type 11 have: 1 ticked
-  /// (a text "True", or a number that is not 0), 2 not ticked, 0 none. Raises 5 for another setting or state.
+  /// A setting of a cell: 0 is its text, 5 the state of the check box that cells in a column of type 11 have: 1 ticked
+  /// (the text is "True" or a nonzero number), 2 not ticked, 0 no check box. Raises 5 for another setting or state.
   [[nodiscard]] Variant Cell(std::int16_t setting, std::int32_t row, std::int32_t column) const;
   void put_Cell(std::int16_t setting, std::int32_t row, std::int32_t column, const Variant& value);
 
-  /// The width of a column, in twips; a negative one stands for the usual width.
+  /// The width of a column in twips; a negative width means the default.
   [[nodiscard]] std::int32_t ColWidth(std::int32_t column) const { return at(column).width; }
   void put_ColWidth(std::int32_t column, std::int32_t width) { at(column).width = width < 0 ? default_width : width; }
   [[nodiscard]] Boolean ColHidden(std::int32_t column) const { return at(column).is_hidden; }
@@ -87,37 +87,37 @@ class Grid final : public TableObject<Grid>, public TableSource {
   [[nodiscard]] Boolean RowHidden(std::int32_t row) const { return Boolean(rows_[index_in(rows_, row)].is_hidden); }
   void put_RowHidden(std::int32_t row, Boolean hidden) { rows_[index_in(rows_, row)].is_hidden = bool(hidden); }
 
-  /// How a column's texts are aligned, by threes (top, middle, bottom): 0 to 2 left, 3 to 5 centred, 6 to 8 right; 9
-  /// numbers right and texts left.
+  /// The alignment of a column's texts, in threes (top, middle, bottom): 0 to 2 left, 3 to 5 centred, 6 to 8 right; 9
+  /// is right for numbers and left for texts.
   [[nodiscard]] std::int16_t ColAlignment(std::int32_t column) const { return at(column).alignment; }
   void put_ColAlignment(std::int32_t column, std::int16_t alignment) { at(column).alignment = alignment; }
 
-  /// The height of a row, in twips; 0 or less where it is as high as its text.
+  /// The height of a row in twips; 0 or less for a row as high as its text.
   [[nodiscard]] std::int32_t RowHeight(std::int32_t row) const { return rows_[index_in(rows_, row)].height; }
   void put_RowHeight(std::int32_t row, std::int32_t height) { rows_[index_in(rows_, row)].height = height; }
 
-  // How it looks where it is shown or put on pages. Colours are 0x00BBGGRR.
-  Text FontName;               ///< Empty for the usual one of the place, as a size of 0.
+  // The grid's appearance on a window or on pages. Colours are 0x00BBGGRR.
+  Text FontName;               ///< Empty, like a size of 0, for the default.
   float FontSize = 0;          ///< In points.
-  Boolean WordWrap;            ///< Long texts go on in the next line of their cell, else they are cut off.
+  Boolean WordWrap;            ///< Wraps long texts within their cells; otherwise they are cut off.
   std::int16_t GridLines = 1;  ///< 0 for none.
   std::int32_t GridColor = 0xC0C0C0;
   std::int32_t BackColorFixed = 0xE8E8E8;  ///< Behind the fixed rows.
 
-  /// The type of a column's values, as automation numbers them: 11 is Boolean. 0 until it is put.
+  /// The type of a column's values as an automation type: 11 is Boolean. 0 until it is set.
   [[nodiscard]] std::int16_t ColDataType(std::int32_t column) const { return at(column).data_type; }
   void put_ColDataType(std::int32_t column, std::int16_t type) { at(column).data_type = type; }
 
-  /// Where the selection begins and ends. Putting its beginning puts its end there too. -1 stands for no row.
+  /// The first and last row of the selection. Setting the first also sets the last. -1 means no row.
   [[nodiscard]] std::int32_t Row() const noexcept { return row_; }
   void put_Row(std::int32_t row);
   [[nodiscard]] std::int32_t RowSel() const noexcept { return row_end_; }
   void put_RowSel(std::int32_t row);
 
-  /// The window of the grid, which builders of reports ask for: 0 for a table that is not shown.
+  /// The grid's window, which report builders ask for; 0 if the table is not shown.
   [[nodiscard]] std::int32_t hwnd() const noexcept { return window_; }
 
-  // As a table on a window: the first row is the heading where it is fixed, the others lie below.
+  // As a table on a window: if the first row is fixed, it is the heading, and the others follow below.
   [[nodiscard]] std::int32_t row_count() const override { return Rows() - FixedRows(); }
   [[nodiscard]] std::int32_t column_count() const override { return Cols(); }
   [[nodiscard]] Text heading(std::int32_t column) const override {
@@ -129,25 +129,26 @@ class Grid final : public TableObject<Grid>, public TableSource {
   }
   void set_window(std::int32_t window) override { window_ = window; }
 
-  /// Empties every cell.
+  /// Clears every cell.
   void Clear();
 
-  /// Adds a row, before another one or (-1) at the end, with the cells of a text that has tabs between them. Cells
-  /// beyond the last column are dropped. Before a fixed row it is fixed too; the selection stays on its rows.
+  /// Inserts a row before another one, or (-1) at the end, with the tab-separated cells of a text. Cells beyond the
+  /// last column are dropped. A row inserted before a fixed row is fixed too; the selection stays on its rows.
   void AddItem(const Text& item, std::int32_t index);
 
-  /// Takes a row out. The other fixed rows stay fixed, and the selection on its rows; a row of it that is taken out
-  /// gives its place to the one behind it.
+  /// Removes a row. The other fixed rows stay fixed, and the selection stays on its rows; if a selected row is removed,
+  /// the next one takes its place.
   void RemoveItem(std::int32_t index);
 
-  /// Writes the table to a file: comma text 3 and tab text 4, cells with a separator, quote or line break in quotes;
-  /// fixed text 5, columns two blanks apart with line breaks as blanks. Code page 1252, or UTF-8 with a byte-order mark
-  /// where that lacks a character. Raises 5 for another format, and what the file raises, after which it is as it was.
+  /// Writes the table to a file. Formats: 3 comma-separated and 4 tab-separated text, with cells quoted that contain a
+  /// separator, quote or line break; 5 columns of fixed width, two blanks apart, with line breaks as blanks. Code page
+  /// 1252, or UTF-8 with a byte order mark if the page lacks a character. Raises 5 for another format, and the errors
+  /// of writing a file; an existing file then stays as it was.
   void SaveGrid(const Text& file, std::int16_t format, Boolean fixed_cells) const;
 
-  /// Reads such a file into the table, which takes its size; as many rows and columns are fixed as before, if it has so
-  /// many. Without `fixed_cells` their cells stay and the file's follow them. Widths, types and hidden columns stay.
-  /// Raises as SaveGrid, and changes nothing then.
+  /// Reads such a file into the table, which takes the file's size. The numbers of fixed rows and columns stay the same
+  /// if the table is large enough. Without `fixed_cells`, fixed cells stay and the file's cells follow them. Widths,
+  /// types and hidden columns stay. Raises the same errors as SaveGrid, and then changes nothing.
   void LoadGrid(const Text& file, std::int16_t format, Boolean fixed_cells);
 
  private:
@@ -164,7 +165,7 @@ class Grid final : public TableObject<Grid>, public TableSource {
     bool is_hidden = false;
   };
 
-  /// An index that was checked.
+  /// A checked index.
   template <class Item>
   [[nodiscard]] static std::size_t index_in(const std::vector<Item>& list, std::int32_t index) {
     if (index < 0 || static_cast<std::size_t>(index) >= list.size()) raise(ErrorNumber::subscript_out_of_range);

@@ -17,7 +17,7 @@ constexpr char16_t fold(char16_t unit) noexcept {
   return unit >= u'a' && unit <= u'z' ? static_cast<char16_t>(unit - u'a' + u'A') : unit;
 }
 
-/// The order of the words of the table, which are ASCII.
+/// The sort order of the table's words, which are ASCII.
 constexpr bool comes_before(TextView a, TextView b) noexcept {
   return std::ranges::lexicographical_compare(a, b, {}, fold, fold);
 }
@@ -32,12 +32,12 @@ constexpr auto sorted_spellings = [] {
 static_assert(std::ranges::adjacent_find(sorted_spellings, is_same_word, &Spelling::word) == sorted_spellings.end(),
               "a word stands twice in the table");
 
-/// The apostrophe, what texts of the database have in its place, and what word processors make of it.
+/// The apostrophe, the character that database texts use instead, and those that word processors turn it into.
 constexpr bool is_apostrophe(char16_t unit) noexcept {
   return unit == u'\'' || unit == u'\u00B4' || unit == u'`' || unit == u'\u2018' || unit == u'\u2019';
 }
 
-/// Letters of every script, digits and combining marks make words; all else parts them.
+/// Words consist of letters of any script, digits and combining marks; everything else separates them.
 bool is_in_word(char16_t unit) noexcept {
   if (unit < 0x80) return is_decimal_digit(unit) || (fold(unit) >= u'A' && fold(unit) <= u'Z');
   if (is_white_space(unit) || is_apostrophe(unit)) return false;
@@ -46,7 +46,7 @@ bool is_in_word(char16_t unit) noexcept {
   return !is_punctuation && unit != u'\u00D7' && unit != u'\u00F7';
 }
 
-/// A stretch of the text that has its own capital: a word, or what stands between its hyphens and apostrophes.
+/// A part of the text that gets a capital of its own: a word, or a piece between hyphens and apostrophes.
 struct Part {
   std::size_t begin;
   std::size_t end;
@@ -54,7 +54,7 @@ struct Part {
 
 Text capitalised(TextView word) {
   Text result = lower_case(word);
-  // Numbers before the first letter ("12A") do not count.
+  // Digits before the first letter ("12A") do not count.
   const auto letter = std::ranges::find_if_not(result, is_decimal_digit);
   if (letter != result.end()) *letter = upper_case(*letter);
   constexpr char16_t sigma = u'\u03C3';
@@ -63,7 +63,7 @@ Text capitalised(TextView word) {
   return result;
 }
 
-/// "1st", "22nd": digits and an ending that stays small.
+/// "1st", "22nd": digits and an ending that stays in lower case.
 bool is_ordinal(TextView word) noexcept {
   constexpr TextView endings[] = {u"st", u"nd", u"rd", u"th"};
   if (word.size() < 3 || !std::ranges::all_of(word.substr(0, word.size() - 2), is_decimal_digit)) return false;
@@ -80,7 +80,7 @@ Text with_prefixes(TextView word) {
   return capitalised(word);
 }
 
-/// One line of a text, whose words are looked at in turn.
+/// One line of a text, processed word by word.
 class Line {
  public:
   explicit Line(TextView text) : text_(text) {
@@ -109,7 +109,7 @@ class Line {
     return text_.substr(parts_[i].begin, parts_[i].end - parts_[i].begin);
   }
 
-  /// The character before a part; a NUL at the start.
+  /// The character before a part; NUL at the start.
   [[nodiscard]] char16_t before(std::size_t i) const {
     return parts_[i].begin > 0 ? text_[parts_[i].begin - 1] : u'\0';
   }
@@ -128,7 +128,7 @@ class Line {
     return false;
   }
 
-  /// "Smith's", "Don't": what follows an apostrophe stays small, unless an elision stands before it ("O'Neil").
+  /// "Smith's", "Don't": what follows an apostrophe stays in lower case, unless an elision precedes it ("O'Neil").
   [[nodiscard]] bool is_small_after_apostrophe(std::size_t i) const {
     if (!is_apostrophe(before(i))) return false;
     if (is_same_word(word(i), u"s") || is_same_word(word(i), u"t")) return true;

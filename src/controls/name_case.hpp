@@ -4,9 +4,9 @@
 
 namespace talutil {
 
-/// A name, suburb or address line in name case: each word with a capital and then lower case, apart from the spellings,
-/// prefixes and particles of name_case_table.hpp. The rules stand in docs/name-case.md. The case of the input plays no
-/// part, the result is as long as the input, and converting it once more changes nothing.
+/// Converts a name, suburb or address line to name case: each word gets a capital followed by lower case, except for
+/// the spellings, prefixes and particles in name_case_table.hpp. docs/name-case.md has the rules. The case of the input
+/// does not matter, the result has the same length, and converting it again changes nothing.
 [[nodiscard]] Text name_case(TextView text);
 
 }  // namespace talutil

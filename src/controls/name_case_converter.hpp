@@ -5,14 +5,14 @@
 
 namespace talutil {
 
-/// The string component that brings names into name case; members make one for each call that needs it.
+/// The string component that converts names to name case; members create one for each call that needs it.
 class NameCaseConverter final : public TableObject<NameCaseConverter> {
  public:
   static constexpr TextView class_name = u"TALUtil.NameCaseConverter";
 
   explicit NameCaseConverter(const Platform& platform) : TableObject(platform) {}
 
-  /// The text in name case, by the rules of name_case.hpp.
+  /// The text in name case; see name_case.hpp.
   [[nodiscard]] Text NameCase(const Text& Name) const { return name_case(Name); }
 };
 

@@ -5,12 +5,11 @@
 
 #include "automation/text.hpp"
 
-/// What name case knows of single words. Every row may be changed and rows may be added, in any order; words are
-/// ASCII and met in any case. Sources: common English, Scottish and Irish usage, and the postal abbreviations of
-/// Australia.
+/// Special rules for single words. Rows may be changed and added freely, in any order. Words are ASCII and match in any
+/// case. Sources: common English, Scottish and Irish usage, and the postal abbreviations of Australia.
 namespace talutil::name_case_table {
 
-/// Where in a line a spelling holds. Numbers at the start of a line ("12 La Trobe St") are not its first word.
+/// Where in a line a spelling applies. A number at the start of a line ("12 La Trobe St") is not its first word.
 enum class Place : std::uint8_t {
   anywhere,
   after_first,  ///< not in the first word
@@ -22,7 +21,7 @@ struct Spelling {
   Place place = Place::anywhere;
 };
 
-/// A beginning that is followed by a second capital, if at least so many letters are left for that.
+/// A prefix followed by a second capital, if at least `shortest_rest` letters come after it.
 struct Prefix {
   TextView text;
   std::size_t shortest_rest = 0;
@@ -31,7 +30,7 @@ struct Prefix {
 inline constexpr Prefix prefixes[] = {{u"Mac", 3}, {u"Mc", 2}};
 
 inline constexpr Spelling spellings[] = {
-    // Words that only look as if they began with Mac.
+    // Words that only seem to begin with the prefix Mac.
     {u"Macadam"},
     {u"Macaluso"},
     {u"Macaulay"},
@@ -73,8 +72,8 @@ inline constexpr Spelling spellings[] = {
     {u"Macready"},
     {u"Macrossan"},
 
-    // Roman numerals. Never in the first word: Xi and Vi are names too. The other numerals of one letter are capitals
-    // as all words are.
+    // Roman numerals. Not in the first word, because Xi and Vi are also names. Single-letter numerals are capitals
+    // anyway, like all words of one letter.
     {u"II", Place::after_first},
     {u"III", Place::after_first},
     {u"IV", Place::after_first},
@@ -89,7 +88,7 @@ inline constexpr Spelling spellings[] = {
     {u"XV", Place::after_first},
     {u"XVI", Place::after_first},
 
-    // Abbreviations of addresses. States that are also names (Vic, Sa) hold after the first word only.
+    // Abbreviations in addresses. States that are also names (Vic, Sa) apply only after the first word.
     {u"ACT", Place::after_first},
     {u"CBD"},
     {u"CMB"},
@@ -110,7 +109,7 @@ inline constexpr Spelling spellings[] = {
     {u"VIC", Place::after_first},
     {u"WA", Place::after_first},
 
-    // Other abbreviations that stand in names of customers.
+    // Other abbreviations found in customers' names.
     {u"4WD"},
     {u"JP"},
     {u"OAM"},
@@ -120,7 +119,7 @@ inline constexpr Spelling spellings[] = {
     {u"YWCA"},
 };
 
-/// Beginnings that are followed by an apostrophe and a second capital; every single letter (O, D, L) is one besides.
+/// Beginnings that are followed by an apostrophe and a second capital, in addition to every single letter (O, D, L).
 inline constexpr TextView elisions[] = {u"Dall", u"Dell", u"Sant"};
 
 }  // namespace talutil::name_case_table

@@ -9,12 +9,12 @@
 
 namespace talutil {
 
-/// The print control: reports are laid out on its pages, looked at, printed and exported. Lengths are twips.
+/// The print control: lays out reports on pages and shows, prints and exports them. Lengths are in twips.
 ///
-/// Settings that are put while a document is being made, or after, count for the next one.
+/// Settings changed during or after the creation of a document apply to the next one.
 class PrintControl final : public TableObject<PrintControl>, public PreviewPages {
  public:
-  // The identifiers by which hosts' builders put the fixed settings.
+  // The identifiers that hosts' report builders use for the fixed settings.
   static constexpr std::int32_t show_guides_id = 34;
   static constexpr std::int32_t text_scale_id = 57;
   static constexpr std::int32_t header_rule_id = 60;
@@ -31,27 +31,27 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   Text FontName = u"Courier New";
   float FontSize = 10;
   Text Header;                   ///< Above every page of the next document.
-  Text DocName;                  ///< The name of the print job; the header where it is empty.
-  Boolean ShowGuides;            ///< The margins are drawn on the screen.
+  Text DocName;                  ///< The name of the print job; if empty, the header is used.
+  Boolean ShowGuides;            ///< Shows the margins on the screen.
   std::int32_t HeaderRule = 1;   ///< 1 draws a rule below the header.
-  Boolean PhysicalPage{true};    ///< Positions count from the edge of the paper, else from the margins.
-  Boolean WordWrap{true};        ///< Flowing text breaks between words, else anywhere.
-  std::int32_t TextScale = 100;  ///< The size of flowing text, percent.
-  Variant RenderObject;          ///< The grid that the next RenderControl shows, where it can be driven.
+  Boolean PhysicalPage{true};    ///< Positions are relative to the edge of the paper, otherwise to the margins.
+  Boolean WordWrap{true};        ///< Breaks flowing text between words, otherwise anywhere.
+  std::int32_t TextScale = 100;  ///< The size of flowing text, in percent.
+  Variant RenderObject;          ///< The grid that the next RenderControl lays out, if it can be driven.
 
-  /// The page shown, percent of its size; the nearest of 10 and 400 beyond these.
+  /// The zoom of the page shown, in percent; limited to 10 to 400.
   [[nodiscard]] float Zoom() const noexcept { return zoom_; }
   void put_Zoom(float percent);
 
-  /// A code of the platform's printing functions: 8 is A3, 9 A4. Raises 5 for a size that is not known.
+  /// A code of the platform's printing functions: 8 is A3, 9 A4. Raises 5 for an unknown size.
   [[nodiscard]] std::int32_t PaperSize() const noexcept { return paper_size_; }
   void put_PaperSize(std::int32_t code);
 
-  /// 0 portrait, 1 landscape; 5 for others.
+  /// 0 portrait, 1 landscape. Raises 5 for other values.
   [[nodiscard]] std::int32_t Orientation() const noexcept { return orientation_; }
   void put_Orientation(std::int32_t orientation);
 
-  /// 1 simplex, 2 vertical, 3 horizontal, 0 as the printer has it; 5 for others.
+  /// 1 simplex, 2 vertical, 3 horizontal, 0 for the printer's default. Raises 5 for other values.
   [[nodiscard]] std::int32_t Duplex() const noexcept { return duplex_; }
   void put_Duplex(std::int32_t duplex);
 
@@ -62,29 +62,29 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   std::int32_t MarginRight = usual_margin;
   std::int32_t MarginBottom = usual_margin;
 
-  /// The page shown, from 1; the nearest there is for others. 0 before the first document.
+  /// The page shown, counted from 1; an invalid number selects the nearest page. 0 before the first document.
   [[nodiscard]] std::int32_t CurrentPage() const noexcept { return current_page_; }
   void put_CurrentPage(std::int32_t page);
   [[nodiscard]] std::int32_t PageCount() const noexcept;
 
-  /// Begins a document; what was made before is gone. Raises 5 for margins that leave no room.
+  /// Begins a document and discards the previous one. Raises 5 if the margins leave no room.
   void StartDoc();
 
-  /// Flowing text, see ReportComposer.
+  /// Adds flowing text; see ReportComposer.
   void put_Text(const Text& text);
 
-  /// A text in a box.
+  /// Adds a text in a box.
   void TextBox(const Text& text, std::int32_t left, std::int32_t top, std::int32_t width, std::int32_t height);
 
-  /// Puts a control of the host on the pages, by its window: the grid in RenderObject as it looks, else the picture of
-  /// the window. RenderObject is empty afterwards.
+  /// Adds a control of the host, given by its window: if RenderObject holds a grid, that grid as it appears, otherwise
+  /// a picture of the window. Clears RenderObject.
   void put_RenderControl(std::int32_t window);
 
   /// Ends the document and shows its first page.
   void EndDoc();
 
-  /// Prints the document, after the printer dialog where it is asked for. Raises 32755 when that is cancelled, 482 when
-  /// there is no printer or it fails, 5 without a document.
+  /// Prints the document, after showing the printer dialog if requested. Raises 32755 if that is cancelled, 482 if
+  /// there is no printer or printing fails, 5 if there is no document.
   void PrintDoc(Boolean dialog);
 
   [[nodiscard]] const Document& document() const noexcept { return document_; }
@@ -108,18 +108,18 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   std::int32_t current_page_ = 0;
 };
 
-/// The export of a print control's document to PDF.
+/// Exports a print control's document to PDF.
 class PdfExport final : public TableObject<PdfExport> {
  public:
   explicit PdfExport(const Platform& platform) : TableObject(platform), platform_(platform) {}
 
-  Text Title;  ///< The document's own where it is empty.
+  Text Title;  ///< Empty for the document's own title.
   Text Author = u"TALUtil";
   Text Subject = u"ORV PDF Data";
   Text Creator = u"TALUtil print preview";
 
-  /// Writes the document of a print control to a file, which is as it was when that fails. Raises 13 for another object
-  /// and what the file raises.
+  /// Writes the document of a print control to a file. If that fails, an existing file stays as it was. Raises 13 for
+  /// another kind of object, and the errors of writing a file.
   void ConvertDocument(const Variant& control, const Text& file) const;
 
  private:

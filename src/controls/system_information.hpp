@@ -4,12 +4,12 @@
 
 namespace talutil {
 
-/// The system information control, as far as the library needs it: the name of the computer.
+/// The system information control, as far as the library needs it: the computer's name.
 class SystemInformation final : public TableObject<SystemInformation> {
  public:
   explicit SystemInformation(const Platform& platform) : TableObject(platform), computer_(platform.computer) {}
 
-  /// Read each time it is asked for.
+  /// Read on every call.
   [[nodiscard]] Text computer_name() const { return computer_.name(); }
 
  private:
@@ -18,7 +18,7 @@ class SystemInformation final : public TableObject<SystemInformation> {
 
 template <class P>
 constexpr auto members_of(std::type_identity<SystemInformation>) {
-  // Forms read the name by this identifier and not by name.
+  // Forms use this identifier rather than the name.
   return P::rows(P::template get_only<&SystemInformation::computer_name>({"ComputerName", 0x68030010},
                                                                          "The name of the computer."));
 }

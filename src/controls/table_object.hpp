@@ -7,9 +7,9 @@
 #include "automation/run_time_error.hpp"
 #include "platform/platform.hpp"
 
-/// Our own controls. Each is a class with a table of its members (see member_table.hpp) and is driven
-/// late-bound, exactly as a third-party one would be: names are found without case, identifiers may be given
-/// by the table where hosts know them, and what a control does not have raises 438.
+/// Our own controls. Each is a class with a table of its members (see member_table.hpp) and is driven late-bound,
+/// exactly like a third-party control: names are found regardless of case, the table may specify identifiers that hosts
+/// know, and missing members raise 438.
 namespace talutil {
 
 template <class Derived>
@@ -30,10 +30,10 @@ class TableObject : public Object {
   }
 
  protected:
-  /// Values are converted by the locale.
+  /// Values are converted using the locale.
   explicit TableObject(const Locale& locale) : locale_(locale) {}
 
-  /// By the user's separators.
+  /// Values are converted using the user's separators.
   explicit TableObject(const Platform& platform) : TableObject(platform.computer.locale()) {}
 
   [[nodiscard]] const Locale& locale() const noexcept { return locale_; }

@@ -11,7 +11,7 @@ namespace {
 
 using archives::Code;
 
-// Settings that hosts put and that mean nothing here.
+// Settings that hosts use but that have no effect here.
 constexpr std::array<std::int32_t, 30> kept_by_zip = {6,  7,  8,  9,  10, 11, 12, 13, 14, 15, 16, 17, 18, 19, 20,
                                                       21, 22, 23, 24, 26, 27, 28, 29, 30, 31, 32, 33, 41, 42, 44};
 constexpr std::array<std::int32_t, 30> kept_by_unzip = {5,  7,  8,  9,  11, 12, 13, 14, 15, 16, 17, 18, 19, 20, 22,
@@ -52,7 +52,7 @@ bool ArchiveControl::watch(std::uint64_t done, std::uint64_t total, TextView nam
   const auto now = std::chrono::steady_clock::now();
   if (now - last_watched_ < pause && done < total) return true;
   last_watched_ = now;
-  // A thread that is asked to quit has nobody left who waits for the archive.
+  // On a request to quit, nobody is left to wait for the archive.
   if (!platform_.message_pump.handle_waiting()) return false;
   const auto* const handler = OnProgress.get_if<ObjectRef>();
   if (handler == nullptr || *handler == nullptr) return true;
@@ -101,7 +101,7 @@ void ZipControl::act() {
     if (static_cast<bool>(Encrypt)) options.password = Password;
     options.comment = Comment;
     if (MultiVolume == 1) options.volume_size = static_cast<std::uint64_t>(std::max(VolumeSize, 0));
-    // Copies: a host that is let in may put others meanwhile.
+    // Copies, because a host that gets to run meanwhile may change the settings.
     const Text archive = ZIPFile;
     const Text items = ItemList;
     archives::pack(archive, items, options, platform().folders, progress);

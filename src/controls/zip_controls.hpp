@@ -11,22 +11,22 @@
 
 namespace talutil {
 
-/// What the zip and the unzip control have in common: a result, whoever watches the work, and the settings that hosts
-/// put by identifier and that mean nothing here, which are kept and read back.
+/// What the zip and unzip controls share: the result, progress reports, and settings that hosts use by identifier but
+/// that have no effect here; these are stored and can be read back.
 class ArchiveControl {
  public:
-  std::int16_t ErrorCode = 0;  ///< How the last action ended; see archives::Code.
-  Text ErrorText;              ///< What was wrong with it, in words for a developer.
+  std::int16_t ErrorCode = 0;  ///< The outcome of the last action; see archives::Code.
+  Text ErrorText;              ///< What went wrong, for developers.
 
-  /// Called as `handler(bytes done, bytes in all, name)` now and then while an action works; True ends the action with
-  /// code 9, as an error of the handler does.
+  /// Called as `handler(bytes done, total bytes, name)` from time to time during an action. Returning True, or raising
+  /// an error, cancels the action with code 9.
   Variant OnProgress;
 
  protected:
   explicit ArchiveControl(const Platform& platform) : platform_(platform) {}
   ~ArchiveControl() = default;
 
-  /// Does an action's work and keeps how it ended. An action within another one ends with 1 at once.
+  /// Runs an action and stores its outcome. An action started during another one fails with 1 at once.
   void run(const std::function<void(archives::Progress& progress)>& work);
 
   /// Asks the user for the password of an entry.
@@ -34,7 +34,7 @@ class ArchiveControl {
 
   [[nodiscard]] const Platform& platform() const noexcept { return platform_; }
 
-  /// Keeps a setting without a meaning, or reads it back; nothing for a member that is none of them.
+  /// Stores or returns a setting without effect; returns nothing if the member is not one of those.
   std::optional<Variant> use_kept(std::int32_t member, Access access, std::span<const Variant> arguments,
                                   std::span<const std::int32_t> kept);
 
@@ -47,10 +47,10 @@ class ArchiveControl {
   bool is_busy_ = false;
 };
 
-/// The zip control. Action 4 packs ItemList into ZIPFile.
+/// The zip control. Action 4 packs the items of ItemList into ZIPFile.
 class ZipControl final : public TableObject<ZipControl>, public ArchiveControl {
  public:
-  // The identifiers that hosts know.
+  // The identifiers that hosts use.
   static constexpr std::int32_t archive_name = 1;
   static constexpr std::int32_t item_list = 2;
   static constexpr std::int32_t no_folders = 3;
@@ -65,7 +65,7 @@ class ZipControl final : public TableObject<ZipControl>, public ArchiveControl {
   static constexpr std::int32_t result = 39;
   static constexpr std::int32_t action = 40;
 
-  static constexpr std::int32_t add = 4;  ///< The one action there is, beside 0, which does nothing.
+  static constexpr std::int32_t add = 4;  ///< The only action, apart from 0, which does nothing.
   static constexpr std::int32_t default_level = 6;
   static constexpr std::int32_t default_volume_size = 100'000'000;
 
@@ -90,8 +90,8 @@ class ZipControl final : public TableObject<ZipControl>, public ArchiveControl {
   void act();
 };
 
-/// The unzip control. Action 1 looks whether ZIPFile is an archive and counts its entries, 7 tests those of ItemList, 8
-/// extracts them into Destination.
+/// The unzip control. Action 1 checks whether ZIPFile is an archive and counts its entries, 7 tests the entries in
+/// ItemList, 8 extracts them to Destination.
 class UnzipControl final : public TableObject<UnzipControl>, public ArchiveControl {
  public:
   static constexpr std::int32_t archive_name = 1;
