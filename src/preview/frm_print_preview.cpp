@@ -17,7 +17,7 @@ namespace {
 constexpr std::int32_t minimised = 1;
 constexpr std::int32_t normal = 0;
 
-// Keys by the platform's codes.
+// The platform's key codes.
 constexpr std::int32_t key_alt = 18;
 constexpr std::int32_t key_escape = 27;
 constexpr std::int32_t key_f2 = 113;
@@ -34,19 +34,19 @@ constexpr ZoomItem zoom_items[] = {
     {PreviewMenu::mnu125, 125}, {PreviewMenu::mnu150, 150}, {PreviewMenu::mnu200, 200},
 };
 
-/// Does what ends without a word when it fails.
+/// Runs an operation that fails silently.
 template <class Work>
 void silently(Work work) noexcept {
   try {
     work();
   } catch (...) {
-    // Told to nobody: the window stays as it is.
+    // Not reported: the window stays as it is.
   }
 }
 
 }  // namespace
 
-/// The window as the members that remember windows see it.
+/// The window as seen by the members that remember windows.
 class FrmPrintPreview::FormObject final : public TableObject<FormObject> {
  public:
   FormObject(PreviewView& view, const Locale& locale) : TableObject(locale), view_(view) {}
@@ -77,7 +77,7 @@ FrmPrintPreview::~FrmPrintPreview() = default;
 
 void FrmPrintPreview::load() {
   if (is_loaded()) return;
-  // Everything is made before anything is kept, so that a control that cannot be made leaves no half window.
+  // Everything is created before anything is stored, so that a failure does not leave half a window.
   const ControlFactory& controls = library_.controls();
   const Locale locale = library_.locale();
   auto print = std::make_unique<Control>(controls.create(u"VSPrinter8LibCtl.VSPrinter"), locale);
@@ -154,7 +154,8 @@ void FrmPrintPreview::show_modal() {
   if (failure_) std::rethrow_exception(std::exchange(failure_, nullptr));
 }
 
-/// An error of the control closes the window: its user could do nothing about it, the caller of show_modal can.
+/// An error of the control closes the window: its user could not do anything about it, but the caller of show_modal
+/// can.
 template <class Work>
 void FrmPrintPreview::guarded(Work work) noexcept {
   try {
@@ -193,7 +194,7 @@ void FrmPrintPreview::resized() noexcept {
 }
 
 void FrmPrintPreview::keep_size() {
-  constexpr float smallest_width = 600;  // Pixels, as the others.
+  constexpr float smallest_width = 600;  // In pixels, like the next two.
   constexpr float smallest_height = 400;
   constexpr float frame = 10;
   if (twips_x_ == 0) return;
@@ -240,7 +241,7 @@ void FrmPrintPreview::export_to_chosen_file() {
 void FrmPrintPreview::ExportToPDF(const Text& path, Boolean /*flag*/) {
   silently([&] {
     load();
-    // Written for its folder alone; hosts pass the path as they have it.
+    // A copy, because ExtractPathName changes its argument, but the export needs the path as the host passed it.
     Text whole = path;
     library_.platform().files.make_path(utils_->ExtractPathName(whole));
     pdf_export_->call(u"ConvertDocument", {print_->object(), path});
@@ -296,7 +297,7 @@ std::int32_t FrmPrintPreview::key_down(std::int32_t code) noexcept {
   if (code == key_f9) chosen(PreviewMenu::mnuPrinter);
   if (code == key_f2) chosen(PreviewMenu::mnuPrev);
   if (code == key_f3) chosen(PreviewMenu::mnuNext);
-  // As another key, so that the host's forms do not act on it too.
+  // Report a different key, so that the host's forms do not act on this one as well.
   return key_f4;
 }
 

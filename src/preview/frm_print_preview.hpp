@@ -12,9 +12,9 @@ namespace talutil {
 
 class ORVUtils;
 
-/// The print preview window: its state and what it does, over a view. There is one for each library, loaded when
-/// something first touches its controls. For the members that remember windows it is a form of its own: an object with
-/// WindowState, Width and Height.
+/// The print preview window: its state and behaviour, on top of a view. There is one per library, loaded when something
+/// first accesses its controls. For the members that remember windows it is also a form: an object with WindowState,
+/// Width and Height.
 class FrmPrintPreview final : public PreviewEvents, public LibraryPart {
  public:
   static constexpr TextView form_name = u"frmPrintPreview";
@@ -27,14 +27,14 @@ class FrmPrintPreview final : public PreviewEvents, public LibraryPart {
   void set_report_name(Text name) { report_name_ = std::move(name); }
   void set_export_folder(Text folder) { export_folder_ = std::move(folder); }
 
-  /// The print control; loads the window if need be.
+  /// The print control; loads the window if necessary.
   [[nodiscard]] const Control& print_control();
 
-  /// Writes the document to a PDF file, making its folder. The flag has no meaning. Fails without a word.
+  /// Writes the document to a PDF file and creates its folder if necessary. The flag has no effect. Fails silently.
   void ExportToPDF(const Text& path, Boolean flag);
 
-  /// Shows the window until it is closed. Raises 400 when it is on the screen already, and what paging and zooming have
-  /// raised, which closes the window: printing and exporting alone fail without a word.
+  /// Shows the window until it is closed. Raises 400 if it is already on the screen. Errors during paging and zooming
+  /// close the window and are raised here; only printing and exporting fail silently.
   void show_modal();
 
   void unload();
@@ -73,8 +73,8 @@ class FrmPrintPreview final : public PreviewEvents, public LibraryPart {
   std::unique_ptr<Control> save_dialog_;
   std::unique_ptr<Control> pdf_export_;
   ObjectRef form_;
-  std::exception_ptr failure_;  ///< What show_modal raises at its end.
-  bool is_loading_ = false;     ///< From loading until the first activation.
+  std::exception_ptr failure_;  ///< Raised by show_modal when the window has closed.
+  bool is_loading_ = false;     ///< True from loading until the first activation.
   bool is_shown_ = false;
   float twips_x_ = 0;
   float twips_y_ = 0;

@@ -17,14 +17,14 @@ struct MonthEndReport {
   TextView path;
 };
 
-// Where hosts look for them.
+// Where hosts expect the files.
 constexpr MonthEndReport month_end_reports[] = {
     {u"BankSummaryReport", u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\BankSummaryReport.pdf"},
     {u"SalesReport", u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\SalesReport.pdf"},
     {u"BadDebtsReport", u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\BadDebtsReport.pdf"},
 };
 
-/// The settings that every report has, and where they stand among the others.
+/// The settings that all reports share.
 struct CommonSettings {
   std::int16_t direction;
   const Text& report_name;
@@ -45,7 +45,7 @@ void set_up(FrmPrintPreview& form, const Control& print, const CommonSettings& s
 
 bool is_unassigned(const Variant& value) { return value.is(Variant::Kind::empty); }
 
-/// Two blanks stand before each part.
+/// Each part is preceded by two blanks.
 Text grid_header(const Text& report, const Variant& from, const Variant& to, const Locale& locale) {
   const Text name = u"  " + report;
   if (from.equals_text(u"DateTimeOnly", locale))
@@ -55,7 +55,7 @@ Text grid_header(const Text& report, const Variant& from, const Variant& to, con
          format_date(to.to_date(locale), u"DD/MM/YYYY");
 }
 
-/// Sets up a report on A4 with its name for a header.
+/// Begins a report on A4 with its name as the header.
 const Control& begin_plain_report(FrmPrintPreview& form, std::int16_t zoom, const CommonSettings& settings) {
   const Control& print = form.print_control();
   print.put(u"Zoom", static_cast<double>(zoom));
@@ -77,7 +77,7 @@ void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16
   print.put(u"HeaderFontName", u"Courier New");
   print.put(u"FontName", u"Courier New");
   print.put(u"Zoom", static_cast<double>(iZoomLevel));
-  // Texts that are none of these leave the setting of the report before.
+  // Any other text leaves the setting from the previous report.
   if (settings().sGridPaperDuplex == u"Horizontal") print.put(u"Duplex", std::int16_t{3});
   if (settings().sGridPaperDuplex == u"Simplex") print.put(u"Duplex", std::int16_t{1});
   if (settings().sGridPaperDuplex == u"Vertical") print.put(u"Duplex", std::int16_t{2});
@@ -88,7 +88,7 @@ void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16
 
   const Control grid(ctlGrid, locale());
   print.call(u"StartDoc");
-  // Ours lays the grid out by asking it; a third-party one has its window alone.
+  // Our print control lays out the grid by querying it; a third-party one only gets its window.
   if (print.answers(u"RenderObject")) print.put(u"RenderObject", grid.object());
   print.put(u"RenderControl", grid.get<std::int32_t>(u"hwnd"));
   print.call(u"EndDoc");
@@ -112,7 +112,7 @@ void ORVUtils::TextBoxPrintPreview(const std::int16_t& iZoomLevel, const std::in
 void ORVUtils::ListBoxPrintPreview(const std::int16_t& iZoomLevel, const std::int16_t& iPrintDirection,
                                    const Text& sReportName, const Text& sCsvName, const Variant& ctlListBox) {
   constexpr std::int32_t height = 567;  // 1 cm.
-  constexpr double pitch = 680.4;       // Of which the fraction is lost at every line.
+  constexpr double pitch = 680.4;       // Fractions are lost by rounding at every line.
   FrmPrintPreview& form = library_.part<FrmPrintPreview>();
   const Control& print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
   const Control list(ctlListBox, locale());
