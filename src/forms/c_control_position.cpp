@@ -12,11 +12,11 @@ namespace {
 
 constexpr std::int16_t twips = 1;
 
-/// A distance between the mouse and where its drag began.
+/// The distance between the mouse and where the drag began.
 float distance(float mouse, std::int32_t start) { return static_cast<float>(double{mouse} - start); }
 
-/// The nearest place at which a control of a size lies within the form. One that is larger than the form ends at its
-/// far edge, so that its place is negative; it is not moved again.
+/// Limits a control's new position to the inside of the form. A control larger than the form is aligned with the far
+/// edge, so that its position is negative; it is not corrected again.
 float within(const Control& control, const Control& form, float place, TextView size, TextView room) {
   if (place < 0) return 0;
   const auto control_size = control.get<float>(size);
@@ -43,7 +43,7 @@ void cControlPosition::DragControl(const Variant& vForm, const Variant& oCtrl, f
     across = control.get<float>(u"ScaleX", {across, mode, twips});
     down = control.get<float>(u"ScaleY", {down, mode, twips});
   }
-  // From the distances that the mouse reported, whatever the control's own scale has made of them.
+  // From the original mouse distances, not from the result of the control's own scale.
   if (const Control container(control.get(u"Container"), locale); has_scale(container)) {
     const Variant mode = container.get(u"ScaleMode");
     across = container.get<float>(u"ScaleX", {distance(X, DragStartX), twips, mode});
@@ -72,7 +72,7 @@ void cControlPosition::GetControlPosition() {
     Width = field(2);
     Height = field(3);
   }
-  // A place remembered as exactly 0 gives way to the default too.
+  // A saved position of exactly 0 is also replaced by the default.
   if (Top == 0) Top = DefaultTop;
   if (left == 0) left = DefaultLeft;
 }

@@ -6,13 +6,13 @@ namespace talutil {
 
 namespace {
 
-// What hosts pass as msgFlag; anything else is neither.
+// Values of msgFlag; any other is neither.
 constexpr std::int16_t report_failure = 1;
 constexpr std::int16_t select_found = 2;
 
 constexpr std::int32_t not_found = -1;
 
-/// Has the control search its first column. Answers with its SearchIndex.
+/// Makes the control search its first column; returns its SearchIndex.
 Variant search(const Control& combo, const Variant& text, std::int32_t method) {
   constexpr std::int16_t first_column = 0;
   constexpr std::int32_t start = 0;
@@ -23,13 +23,13 @@ Variant search(const Control& combo, const Variant& text, std::int32_t method) {
   return combo.get(u"SearchIndex");
 }
 
-/// Selects an entry and answers with what the control then has selected.
+/// Selects an entry; returns what the control then reports as selected.
 std::int32_t select(const Control& combo, const Variant& index) {
   combo.put(u"ListIndex", index);
   return combo.get<std::int32_t>(u"ListIndex");
 }
 
-/// Two blanks before the bracket, as users know the message. Null joined with a text is that text.
+/// Two blanks before the bracket, as users know the message. A Null text counts as empty.
 void report(const Control& combo, MessageBoxes& boxes) {
   const Variant value = combo.get(u"Text").value();
   const Text text = value.is_null() ? Text() : value.to_text(combo.locale());
@@ -41,7 +41,7 @@ void report(const Control& combo, MessageBoxes& boxes) {
 std::int32_t ORVUtils::GetComboListIndex(const Variant& cboCombo, const std::int32_t& vBranchUniqueID) {
   const Control combo(cboCombo, locale());
   combo.put(u"Text", u"");
-  // Keys are positive; 0 stands for none.
+  // Keys are positive; 0 means none.
   if (vBranchUniqueID <= 0) return not_found;
   const auto count = combo.get<std::int32_t>(u"ListCount");
   for (std::int32_t i = 0; i < count; ++i) {
@@ -51,18 +51,18 @@ std::int32_t ORVUtils::GetComboListIndex(const Variant& cboCombo, const std::int
 }
 
 std::int32_t ORVUtils::SearchCombo(const Variant& cboCombo, const std::int16_t& msgFlag) {
-  // The control's own method for what users type into it.
+  // The control's search method for typed text.
   constexpr std::int32_t typed_text_method = 2;
   constexpr std::int16_t remove_commas = 1;
   const Control combo(cboCombo, locale());
   combo.call(u"Refresh");
   const auto selected = combo.get<std::int16_t>(u"ListIndex");
   const Variant text = combo.get(u"Text");
-  // 0 and not -1: an empty box is no failed search.
+  // 0 rather than -1, because an empty box is not a failed search.
   if (VerifyTextData(0, remove_commas, text).empty()) return 0;
 
   const Variant found = search(combo, text, typed_text_method);
-  // Without the flag the selection stays, and it is the result, not the entry found.
+  // Without the flag the selection stays, and the result is the selection, not the entry found.
   const std::int32_t result = found.equals_number(not_found, combo.locale())
                                   ? not_found
                                   : select(combo, msgFlag == select_found ? found : Variant(selected));

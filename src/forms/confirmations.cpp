@@ -7,8 +7,8 @@ namespace talutil {
 
 namespace {
 
-/// Asks until the user types YES, in upper case and nothing else, or gives up. A box that is cancelled counts as one
-/// that was left empty.
+/// Asks until the user types YES, in upper case and nothing else, or gives up. Cancelling the box counts as an empty
+/// answer.
 Boolean is_confirmed(const Platform& platform, TextView prompt, TextView title, TextView warning) {
   while (platform.input_boxes.ask(prompt, title, Entry::shown).value_or(Text()) != u"YES") {
     if (platform.message_boxes.show(warning, MessageButtons::yes_no, u"Warning") != MessageAnswer::yes) {
@@ -18,7 +18,7 @@ Boolean is_confirmed(const Platform& platform, TextView prompt, TextView title, 
   return Boolean(true);
 }
 
-/// The codes that the platform's functions for starting programs answer with, as users know their texts. All others say
+/// Return codes of the platform's functions for starting programs, with the texts that users know. Other codes show
 /// nothing.
 constexpr struct {
   std::int32_t code;

@@ -8,7 +8,7 @@ namespace talutil {
 
 namespace {
 
-/// Puts a property of a picture box back at the end of a drawing, however that ends.
+/// Restores a property of a picture box after drawing, even after an error.
 class RestoredProperty {
  public:
   RestoredProperty(const Control& box, TextView property)
@@ -19,7 +19,7 @@ class RestoredProperty {
     try {
       box_.put(property_, before_);
     } catch (...) {
-      // The drawing's own error, or its success, is what the caller hears of.
+      // The caller sees the drawing's own error or success instead.
     }
   }
 
@@ -29,14 +29,15 @@ class RestoredProperty {
   Variant before_;
 };
 
-/// The values of iJustify. See docs/drawing.md for a picture of each.
+/// The values of iJustify; see docs/drawing.md for pictures.
 enum class Justify : std::int16_t { left_running_over = -2, left = -1, centre = 0, right = 1 };
 
 }  // namespace
 
 Boolean ORVUtils::GetMousePos(const Variant& lngSrcX, const Variant& lngSrcY, const Variant& lngDestX1,
                               const Variant& lngDestY1, const Variant& lngDestX2, const Variant& lngDestY2) {
-  // All four, so that what cannot be compared is an error wherever it stands. Null is neither greater nor less.
+  // Evaluates all four, so that a value that cannot be compared is an error wherever it is. Null is neither greater nor
+  // less.
   const bool inside[] = {compare(lngSrcX, lngDestX1) > 0, compare(lngSrcX, lngDestX2) < 0,
                          compare(lngSrcY, lngDestY1) > 0, compare(lngSrcY, lngDestY2) < 0};
   return Boolean(inside[0] && inside[1] && inside[2] && inside[3]);
@@ -44,7 +45,7 @@ Boolean ORVUtils::GetMousePos(const Variant& lngSrcX, const Variant& lngSrcY, co
 
 std::int32_t ORVUtils::GetMaxPages(const std::int32_t& iRowsPerPage, const std::int32_t& iRowCount) {
   if (iRowsPerPage == 0) raise(ErrorNumber::division_by_zero);
-  // Pages are counted in single precision, so that the count is off beyond 2^24; hosts have it so.
+  // Pages are counted in single precision, so the count is inexact above 2^24; hosts have always seen it so.
   const double rows_per_page = iRowsPerPage;
   auto pages = static_cast<float>(round_to<std::int32_t>(iRowCount / rows_per_page));
   if (pages * rows_per_page > iRowCount) pages -= 1;

@@ -32,7 +32,7 @@ void Form::show_modal() {
     const Call call(modal_calls_);
     view.show_modal();
   }
-  // A call within another one leaves the window to that.
+  // A nested call leaves the window to the outer one.
   if (modal_calls_ == 0) view_.reset();
 }
 
@@ -43,12 +43,12 @@ void Form::report_errors(Work work) noexcept {
       work();
     } catch (...) {
       const RunTimeError error = current_error();
-      // The user who has cancelled a dialog knows.
+      // The user cancelled the dialog and knows that.
       if (error.is(ErrorNumber::cancelled)) return;
       library_.platform().message_boxes.show(error.description(), MessageButtons::ok, {});
     }
   } catch (...) {
-    // There is nobody left to tell.
+    // Nobody is left to report this to.
   }
 }
 

@@ -7,14 +7,14 @@
 
 namespace talutil {
 
-/// A window of the library: loaded when something first needs it, one of its kind at a time.
+/// A window of the library: loaded on first use, at most one of each kind.
 class Form : public FormEvents, public LibraryPart {
  public:
   ~Form() override;
 
   [[nodiscard]] bool is_loaded() const noexcept { return view_ != nullptr && view_->is_open(); }
 
-  /// Closes the window, as code does.
+  /// Closes the window by code.
   void unload();
 
   [[nodiscard]] bool is_shown_modal() const noexcept { return modal_calls_ > 0; }
@@ -27,15 +27,15 @@ class Form : public FormEvents, public LibraryPart {
  protected:
   Form(Library& library, const FormDescription& description) : library_(library), description_(description) {}
 
-  /// The window, made and filled if need be. Raises 445 where there is no screen.
+  /// Returns the window, creating and filling it if necessary. Raises 445 where there is no screen.
   FormView& load();
 
-  /// Shows the window until it is closed; one that is shown already returns to the front.
+  /// Shows the window until it is closed; a window that is already visible comes to the front.
   void show_modal();
 
   [[nodiscard]] Library& library() const noexcept { return library_; }
 
-  // What the kinds of windows do. Errors of the last four are shown to the user in a box.
+  // What each kind of window does. Errors in the last four are shown to the user in a message box.
   virtual void fill(FormView& view) = 0;
   virtual void on_click(std::uint8_t part) = 0;
   virtual void on_tab(std::int32_t /*tab*/) {}

@@ -46,7 +46,7 @@ Text FrmInputBox::ask(const Question& question) {
   caption_ = question.caption;
   is_masked_ = bool(question.is_masked);
   colour_ = question.colour;
-  // Never taken back: the form is the same one the next time.
+  // Never reset: the same form is used the next time.
   if (question.is_frameless) is_frameless_ = true;
   is_unclosable_ = bool(question.is_unclosable);
 
@@ -70,7 +70,7 @@ void FrmInputBox::on_click(std::uint8_t part) {
 }
 
 void FrmInputBox::on_escape() {
-  // As the close box does, where there is a way to close it.
+  // Like the close box, if the box can be closed.
   if (!is_unclosable_) load().close(CloseMode::control_menu);
 }
 

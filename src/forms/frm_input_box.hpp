@@ -5,8 +5,8 @@
 
 namespace talutil {
 
-/// The library's own input box: a prompt, an entry and an OK button, above all other windows. It keeps its result, and
-/// that it has lost its frame, from one use to the next.
+/// The library's input box: a prompt, an entry and an OK button, above all other windows. Its result, and the loss of
+/// its frame, last from one use to the next.
 class FrmInputBox final : public Form {
  public:
   static constexpr std::uint8_t lblPrompt = 0;
@@ -25,9 +25,10 @@ class FrmInputBox final : public Form {
     std::int32_t colour = 0;
   };
 
-  /// Shows the box and gives its result: the text of the entry, empty when the box was closed by its menu. A question
-  /// without a frame that cannot be closed is a notice, for which nobody waits: the result is the one before. Raises
-  /// 400 when the box is on the screen already, unless both are notices: the first one then shows the second's text.
+  /// Shows the box and returns the result: the text of the entry, or an empty text if the box was closed by its menu. A
+  /// question without a frame that cannot be closed is a notice; the call does not wait for it and returns the previous
+  /// result. Raises 400 if the box is already on the screen, unless both are notices: the first then shows the second's
+  /// text.
   [[nodiscard]] Text ask(const Question& question);
 
   void close_notice() override {

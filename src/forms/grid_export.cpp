@@ -34,7 +34,7 @@ void GridExport::copy_selected_rows() {
 }
 
 void GridExport::copy_rows(std::int32_t first, std::int32_t last) {
-  // Looked up by the first row that is copied, and not before: a grid may lack what an export never reads.
+  // Looked up only when the first row is copied, because a grid may lack members that an export never reads.
   std::unique_ptr<RepeatedUse> row_hidden;
   std::unique_ptr<RepeatedUse> column_hidden;
   std::unique_ptr<RepeatedUse> text;

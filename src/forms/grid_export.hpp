@@ -6,25 +6,25 @@ namespace talutil {
 
 class Grid;
 
-/// Copies what a grid shows into a table and saves that as comma text. Hidden rows and columns are left out. Grids are
-/// driven in a fixed order; the source is only read.
+/// Copies the visible cells of a grid to a table and saves that as comma-separated text. Hidden rows and columns are
+/// left out. Members of the grids are called in a fixed order; the source is only read.
 class GridExport {
  public:
-  /// Empties the table and gives it a column for each that the grid shows.
+  /// Clears the table and gives it one column per visible column of the grid.
   GridExport(const Control& grid, const Control& table);
   GridExport(const GridExport&) = delete;
   GridExport& operator=(const GridExport&) = delete;
 
-  /// Empties our own table again: it lives on, and an export can be large.
+  /// Clears our own table: it lives on, and an export can be large.
   ~GridExport();
 
-  /// From a row, counted from 0, to the last one.
+  /// Copies from a row, counted from 0, to the last one.
   void copy_all_rows(std::int32_t first);
 
-  /// The rows between Row and RowSel, whichever is the smaller.
+  /// Copies the rows from Row to RowSel, in either order.
   void copy_selected_rows();
 
-  /// Raises what the file raises; the file is then as it was.
+  /// Raises the errors of writing a file; an existing file then stays as it was.
   void save(const Text& file, bool with_fixed_cells) const;
 
  private:
@@ -32,7 +32,7 @@ class GridExport {
 
   const Control& grid_;
   const Control& table_;
-  Grid* own_table_;  ///< The table, where it is our own grid: cells go into it without detour. Else null.
+  Grid* own_table_;  ///< The table if it is our own grid, for direct access to cells; otherwise null.
   std::int32_t copied_ = 0;
 };
 

@@ -8,14 +8,14 @@ namespace talutil {
 
 namespace {
 
-// The grid's own codes.
+// Codes of the grid.
 constexpr double boolean_column = 11;
 constexpr std::int16_t check_box_setting = 5;
 constexpr double ticked = 1;
 
 Text width_item(std::int32_t column) { return number_to_text(column) + u"ColWidth"; }
 
-/// Does the work of a member that reports its errors in a message box.
+/// Runs the work of a member that reports its errors in a message box.
 template <class Work>
 void reporting_errors(const Platform& platform, TextView member, Work work) {
   try {
@@ -83,7 +83,7 @@ void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontS
                               const Text& sFilename) {
   try {
     const Control dialog(library_.components().control(u"dlgSave2"), locale());
-    // The reports folder closes with a backslash of its own.
+    // The reports folder itself ends with a backslash.
     dialog.put(u"InitDir", settings().sReportsDir + sFilename + u'\\');
     VerifyFilePath(dialog.get<Text>(u"InitDir"));
     dialog.put(u"CancelError", Boolean(true));
@@ -95,14 +95,14 @@ void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontS
     const Control grid(m_Grid1, locale());
     const Control scratch(library_.components().borrow_scratch_grid(), locale());
     GridExport grid_export(grid, scratch);
-    // The sense is as hosts know it: True is every row, from the one that iDontSaveHeader gives.
+    // Hosts rely on this meaning: True is every row, starting at row iDontSaveHeader.
     if (bSelection.is_exactly_true())
       grid_export.copy_all_rows(iDontSaveHeader);
     else
       grid_export.copy_selected_rows();
     grid_export.save(file, iDontSaveHeader == 0);
   } catch (...) {
-    // A cancelled dialog is an error too, and no export says why it did not come about.
+    // A cancelled dialog is also an error, and a failed export is not reported.
   }
 }
 

@@ -21,7 +21,7 @@ void ORVUtils::LoadWindowState(const Variant& frm, const Text& sCFGStr) {
   };
   form.put(u"WindowState", setting(state_item, u"0"));
   if (!form.get(u"WindowState").equals_number(normal_state, form.locale())) return;
-  // One after the other: the form may change the second when it gets the first.
+  // One after the other, because setting the width may change the form's height.
   form.put(u"Width", setting(width_item, form.get<Text>(u"Width")));
   form.put(u"Height", setting(height_item, form.get<Text>(u"Height")));
 }
@@ -33,7 +33,7 @@ void ORVUtils::SaveWindowState(const Variant& frm, const Text& sCFGStr) {
     SaveCfgFileData(sCFGStr, Text(item), value, settings().sNatNameC, Boolean(false));
   };
   save(state_item, u"WindowState");
-  // The last normal size outlives the window's other states.
+  // The last normal size is kept while the window is in another state.
   if (!form.get(u"WindowState").equals_number(normal_state, form.locale())) return;
   save(width_item, u"Width");
   save(height_item, u"Height");
