@@ -31,7 +31,7 @@ struct Switch {
   TextView description;
 };
 
-// Row 8 goes on with the description above it.
+// Row 8 continues the description above it.
 constexpr Switch rows[] = {
     {u"Command", u"Description"},
     {u"RM", u"Starts ORV with no booking screen"},

@@ -5,7 +5,7 @@
 
 namespace talutil {
 
-/// The switches of the host's command line, in a grid, with examples below it.
+/// The switches of the host's command line in a grid, followed by examples.
 class FrmCmdLineHelp final : public Form {
  public:
   static constexpr std::uint8_t Grid1 = 0;

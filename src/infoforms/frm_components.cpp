@@ -10,14 +10,13 @@ namespace talutil {
 
 namespace {
 
-// The text property of the system information control that holds the machine's name. The control publishes
-// it by this identifier alone.
+// The system information control's property with the machine's name. The control publishes it only by this identifier.
 constexpr std::int32_t computer_name_property = 0x68030010;
 
-// The data connection's number for a connection that is gone for good: restarting is all a user can do.
+// The data connection's error number for a connection that is lost for good; all a user can do is restart.
 constexpr std::int32_t connection_terminated = 17142;
 
-/// Which of the places a name is; raises 438 for none.
+/// The index of a control by name; raises 438 for an unknown name.
 std::size_t place_of(TextView name) {
   constexpr const auto& places = FrmComponents::places;
   const auto* const place = std::ranges::find(places, name, &FrmComponents::Place::name);
@@ -32,7 +31,7 @@ FrmComponents::FrmComponents(const Platform& platform, const ControlFactory& fac
 
 void FrmComponents::load() {
   if (is_loaded()) return;
-  // Everything is made and set before anything is kept, so that a control that fails leaves no half window and the
+  // Everything is created and set up before anything is stored, so that a failure does not leave half a window and the
   // next use tries again.
   auto window = platform_.form_windows.make_hidden(caption);
   Controls controls;
@@ -68,7 +67,7 @@ ObjectRef FrmComponents::borrow_scratch_grid() {
   if (is_scratch_grid_lent_) return factory_.create(places[place].class_name);
   ObjectRef grid = control(places[place].name);
   is_scratch_grid_lent_ = true;
-  // Keeps the control also where the window closes meanwhile.
+  // Also keeps the control alive if the window closes meanwhile.
   return {grid.get(), [this, grid](Object* /*lent*/) { is_scratch_grid_lent_ = false; }};
 }
 
@@ -80,7 +79,7 @@ std::intptr_t FrmComponents::owner_handle() {
 void FrmComponents::report_database_error(std::int32_t number, const Text& description, std::int32_t /*code*/,
                                           const Text& source, const Text& help_file, const Text& /*context*/) {
   load();
-  // "TData Error:" is spelled as hosts' users know it.
+  // Users know the spelling "TData Error:".
   const Text message =
       number == connection_terminated
           ? u"An error has caused the database connection to be terminated. Please restart ORV.  If the problem "

@@ -12,8 +12,8 @@ namespace talutil {
 
 class ControlFactory;
 
-/// The window that is never shown: it holds the non-visual controls that members drive, and owns the
-/// library's dialogs. It is made when something first asks for it and closed by Terminate.
+/// The hidden window: it contains the non-visual controls that members drive, and owns the library's dialogs. It is
+/// created on first use and closed by Terminate.
 class FrmComponents final : public Components {
  public:
   static constexpr TextView caption = u"Form1";
@@ -44,11 +44,11 @@ class FrmComponents final : public Components {
   [[nodiscard]] ObjectRef borrow_scratch_grid() override;
   [[nodiscard]] std::intptr_t owner_handle() override;
 
-  /// What the host's data connection calls when it reports an error: shows it and keeps its number.
+  /// The host's data connection calls this to report an error: shows it and stores its number.
   void report_database_error(std::int32_t number, const Text& description, std::int32_t code, const Text& source,
                              const Text& help_file, const Text& context);
 
-  /// The number of the last error reported on the loaded window; 0 when there was none.
+  /// The number of the last error reported since the window was loaded; 0 if there was none.
   [[nodiscard]] std::int32_t last_database_error() const noexcept { return last_database_error_; }
 
  private:

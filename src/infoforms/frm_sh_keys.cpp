@@ -32,7 +32,7 @@ constexpr FormDescription description{.parts = parts, .width = 320, .height = 23
 FrmShKeys::FrmShKeys(Library& library) : Form(library, description) {}
 
 void FrmShKeys::fill(FormView& view) {
-  // Two blanks, as its users know it.
+  // Two blanks, as users know it.
   view.set_caption(u"  Shortcut keys List");
   view.set_text(Text1, shortcut_keys_rich_text());
 }
@@ -58,7 +58,7 @@ void FrmShKeys::close() {
 
 void FrmShKeys::on_click(std::uint8_t part) {
   if (part == cmdPrint) print();
-  // The window stays: its user closes it by its box.
+  // The window stays open until the user closes it by its close box.
   if (part == cmdCross) result_ = crossed;
 }
 

@@ -5,7 +5,7 @@
 
 namespace talutil {
 
-/// The list of the host's shortcut keys, above all other windows until its user closes it.
+/// The list of the host's shortcut keys. It stays above all other windows until the user closes it.
 class FrmShKeys final : public Form {
  public:
   static constexpr std::uint8_t cmdPrint = 0;
@@ -13,14 +13,14 @@ class FrmShKeys final : public Form {
   static constexpr std::uint8_t keys_label = 2;
   static constexpr std::uint8_t Text1 = 3;
 
-  static constexpr std::int16_t crossed = -99;  ///< The result after the cross button and the close box.
+  static constexpr std::int16_t crossed = -99;  ///< The result after the cross button or the close box.
 
   explicit FrmShKeys(Library& library);
 
-  /// Shows the window, the same one where there is one already, and returns.
+  /// Shows the window, or the existing one, and returns.
   void show();
 
-  /// Prints the list after the printer dialog. Raises what the print control raises.
+  /// Prints the list after showing the printer dialog. Raises the print control's errors.
   void print();
 
   /// Sets the result to 0 and unloads the window.

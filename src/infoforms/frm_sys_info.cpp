@@ -159,7 +159,7 @@ void FrmSysInfo::on_click(std::uint8_t part) {
     }
     case refresh:
       read();
-      // What has gone meanwhile is reported, and shown no longer.
+      // An item that no longer exists is reported and not shown any more.
       if (const Text typed = view.text(path); item_ && !typed.empty()) {
         item_.reset();
         show_tab(view);

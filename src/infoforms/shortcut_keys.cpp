@@ -6,7 +6,7 @@ namespace talutil {
 
 namespace {
 
-// The keys are those that the host application's users know; the blank behind F12 is theirs too.
+// The host application's users know these texts, including the blank after F12.
 constexpr ShortcutSection sections[] = {
     {u"GENERAL", false,
      u"Copy Text CTRL+C\n"
@@ -288,7 +288,7 @@ constexpr ShortcutSection sections[] = {
      u"Telephone Contact = CTRL+T"},
 };
 
-/// Plain text as rich text: all of it is ASCII, of which three characters mean something.
+/// Converts plain ASCII text to rich text, in which three characters must be escaped.
 void append_escaped(Text& rich, TextView text) {
   for (const char16_t unit : text) {
     if (unit == u'\\' || unit == u'{' || unit == u'}') rich += u'\\';
@@ -306,7 +306,7 @@ Text shortcut_keys_rich_text() {
   for (const ShortcutSection& section : sections) {
     if (!is_first) rich += u"\\par\r\n";
     is_first = false;
-    // Sizes are half points.
+    // Sizes are in half points.
     rich += section.is_menu ? u"\\ul\\fs20 " : u"\\ul\\b\\fs24 ";
     append_escaped(rich, section.heading);
     rich += u"\\ulnone\\b0\\fs20\\par\r\n";

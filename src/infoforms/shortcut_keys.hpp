@@ -6,18 +6,18 @@
 
 namespace talutil {
 
-/// A heading of the list of shortcut keys with its entries, one a line: an action, " = " (a few go without) and keys.
+/// A heading of the list of shortcut keys with its entries, one per line: an action, " = " (missing in a few) and keys.
 struct ShortcutSection {
   TextView heading;
-  bool is_menu = false;  ///< A menu of the screen above it, rather than a screen of its own.
+  bool is_menu = false;  ///< A menu of the screen above, rather than a screen.
   TextView entries;
 };
 
 /// The shortcut keys of the host application, screen by screen.
 [[nodiscard]] std::span<const ShortcutSection> shortcut_sections() noexcept;
 
-/// The same as rich text: the headings of screens bold and underlined at 12 points, those of menus at 10, the entries
-/// at 10, all in Courier New.
+/// The same as rich text: headings of screens bold and underlined at 12 points, headings of menus underlined at 10,
+/// entries at 10, all in Courier New.
 [[nodiscard]] Text shortcut_keys_rich_text();
 
 }  // namespace talutil

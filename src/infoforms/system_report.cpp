@@ -43,7 +43,7 @@ Text date_words(const std::optional<Date>& date) {
 }
 
 FactTable fact_list(TextView title, std::vector<std::vector<Text>> rows) {
-  // What the platform does not tell is left out.
+  // Facts that the platform does not report are left out.
   std::erase_if(rows, [](const std::vector<Text>& row) { return row[1].empty(); });
   return {title, {u"Fact", u"Value"}, std::move(rows)};
 }
@@ -67,7 +67,7 @@ void count_into(Folder& folder, FolderCount& count) {
     try {
       count_into(*folder.folder(name, false), count);
     } catch (const RunTimeError&) {
-      // One that may not be read.
+      // A folder that cannot be read.
       count.is_complete = false;
     }
   }

@@ -5,7 +5,7 @@
 
 #include "platform/platform.hpp"
 
-/// The system information as tables of texts, for its window and for the command.
+/// The system information as tables of texts, for the window and for the command.
 namespace talutil {
 
 struct FactTable {
@@ -14,33 +14,33 @@ struct FactTable {
   std::vector<std::vector<Text>> rows;
 };
 
-/// What lies in a folder, with all that is below it.
+/// The contents of a folder, including everything below it.
 struct FolderCount {
   std::uint64_t files = 0;
   std::uint64_t folders = 0;
   std::uint64_t size = 0;   ///< Bytes of all files.
-  bool is_complete = true;  ///< False where some of it cannot be read, or there is too much of it.
+  bool is_complete = true;  ///< False if part of it cannot be read or it has too many entries.
 };
 
-/// The last column of the drives is how full they are, in percent.
+/// The last column shows how full each drive is, in percent.
 [[nodiscard]] FactTable drive_table(Machine& machine);
 [[nodiscard]] FactTable memory_table(Machine& machine);
 [[nodiscard]] FactTable processor_table(Machine& machine);
 [[nodiscard]] FactTable operating_system_table(Machine& machine);
 
-/// A file or folder. Raises as Machine::item does.
+/// A file or folder. Raises the same errors as Machine::item.
 [[nodiscard]] FactTable item_table(const Platform& platform, const Text& path);
 
-/// Links are not followed; counting ends at a hundred thousand entries.
+/// Links are not followed; counting stops at a hundred thousand entries.
 [[nodiscard]] FolderCount count_folder(Folders& folders, const Text& path);
 
-/// "read-only, hidden"; "none".
+/// For example "read-only, hidden", or "none".
 [[nodiscard]] Text attribute_words(std::uint32_t attributes);
 
-/// "465.8 GB"; bytes below 1024 as "12 bytes".
+/// For example "465.8 GB"; below 1024 bytes, "12 bytes".
 [[nodiscard]] Text size_words(std::uint64_t bytes);
 
-/// The tables below one another in columns of equal width, for the clipboard and the terminal.
+/// The tables one below the other, with aligned columns, for the clipboard and the terminal.
 [[nodiscard]] Text as_text(std::span<const FactTable> tables);
 
 }  // namespace talutil
