@@ -1,4 +1,4 @@
-// The life of a library, from its start-up routine to Terminate: the one place that knows every layer.
+// A library's lifetime, from its start-up routine to Terminate: the one place that knows every layer.
 #include "automation/checked.hpp"
 #include "automation/run_time_error.hpp"
 #include "infoforms/frm_components.hpp"
@@ -13,12 +13,12 @@ Library::Library(const Platform& platform)
       components_(std::make_unique<FrmComponents>(platform_, controls_, settings_)) {}
 
 Library::~Library() {
-  // The last one made ends first: windows use what was there before them.
+  // In reverse order of creation, because windows use parts that existed before them.
   while (!parts_.empty()) parts_.pop_back();
 }
 
 void Library::start() {
-  // The error for a failed allocation is made while there is memory for it.
+  // Creates the error for a failed allocation while there is still memory for it.
   static_cast<void>(out_of_memory_error());
   components_->load();
   settings_.ScreenTwipsPerPixelX = round_to<std::int32_t>(platform_.screen.twips_per_pixel_x());
@@ -26,7 +26,7 @@ void Library::start() {
 }
 
 void Library::close_notices() {
-  // By index: a window that closes may lead to a part that was not there before.
+  // By index, because closing a window may create another part.
   for (std::size_t i = 0; i < parts_.size(); ++i) parts_[i]->close_notice();
 }
 
