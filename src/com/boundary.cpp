@@ -16,7 +16,7 @@ struct PlatformResult {
   ErrorNumber number;
 };
 
-// What automation itself answers with, as hosts know it.
+// Automation's own results and the run-time errors that hosts know for them.
 constexpr PlatformResult platform_results[] = {
     {DISP_E_MEMBERNOTFOUND, ErrorNumber::member_not_supported},
     {DISP_E_UNKNOWNNAME, ErrorNumber::member_not_supported},
@@ -50,7 +50,7 @@ std::int32_t number_of(HRESULT result) noexcept {
 
 bool is_run_time_number(std::int32_t number) noexcept { return number > 0 && number <= 0xFFFF; }
 
-/// What the system says of a result, in one line.
+/// The system's message for a result, on one line.
 Text system_text(HRESULT result) {
   std::array<wchar_t, 512> text{};
   constexpr DWORD flags = FORMAT_MESSAGE_FROM_SYSTEM | FORMAT_MESSAGE_IGNORE_INSERTS | FORMAT_MESSAGE_MAX_WIDTH_MASK;
@@ -65,7 +65,7 @@ BSTR description_of(const RunTimeError& error) noexcept {
   return SysAllocStringLen(win32::wide(error.description()), static_cast<UINT>(error.description().size()));
 }
 
-/// An error of the host's control keeps the source that it came with; one that came with none is still not ours.
+/// An error of the host's control keeps its original source, even if that is empty: the error is still not ours.
 const wchar_t* source_of(const RunTimeError& error) noexcept {
   return error.origin() ? win32::wide(error.origin()->source) : source_name;
 }
@@ -79,7 +79,7 @@ HRESULT result_of(std::int32_t number) noexcept {
 
 RunTimeError error_of(HRESULT result, TextView description, const ErrorOrigin& reported) {
   const std::int32_t number = number_of(result);
-  // A run-time error that nobody claims is what a late-bound call of the library's met with.
+  // A run-time error without any origin comes from a late-bound call by the library itself.
   std::optional<ErrorOrigin> origin;
   if (reported != ErrorOrigin{} || !is_run_time_number(number)) origin = reported;
   if (!description.empty()) return {number, Text(description), std::move(origin)};
@@ -116,7 +116,7 @@ HRESULT report_current_exception(EXCEPINFO* information) noexcept {
     information->bstrDescription = description_of(error);
     if (!error.origin()) return DISP_E_EXCEPTION;
     const Text& help_file = error.origin()->help_file;
-    // None rather than an empty one: a caller that shows no help may not free its text.
+    // Null rather than empty: a caller that shows no help might not free the string.
     if (!help_file.empty()) information->bstrHelpFile = SysAllocString(win32::wide(help_file));
     information->dwHelpContext = error.origin()->help_context;
   }

@@ -4,27 +4,28 @@
 #include "com/floating_point.hpp"
 #include "platform/win32/windows.hpp"
 
-/// The edge between exceptions and automation's results. No exception crosses it.
+/// The boundary between exceptions and automation's results. No exception crosses it.
 namespace talutil::com {
 
-/// The HRESULT of a run-time number: 0x800A0000 and the number. What came from another object as an HRESULT
-/// stays what it was.
+/// The HRESULT of a run-time error number: 0x800A0000 plus the number. An HRESULT that came from another object stays
+/// as it is.
 [[nodiscard]] HRESULT result_of(std::int32_t number) noexcept;
 
-/// A run-time error from the failed result of another object, with what it reported. Results that hosts know by a
-/// run-time number become that number; others stay what they are and, where the object gave no text, have the system's.
+/// The run-time error for the failed result of another object, with the details that it reported. Results for which
+/// hosts know a run-time error number become that number. Others are kept and, if the object gave no text, get the
+/// system's.
 [[nodiscard]] RunTimeError error_of(HRESULT result, TextView description, const ErrorOrigin& reported = {});
 
-/// The failed result of a function of the system's, which leaves the library as it came.
+/// The error for a failed result of a system function; the caller gets the same HRESULT.
 [[nodiscard]] RunTimeError system_error(HRESULT result);
 
-/// Hands the exception being handled to the caller's thread as error information, and gives its HRESULT.
+/// Passes the exception being handled to the caller's thread as error information; returns its HRESULT.
 [[nodiscard]] HRESULT report_current_exception() noexcept;
 
-/// The same as a late-bound caller takes it.
+/// The same for a late-bound caller.
 [[nodiscard]] HRESULT report_current_exception(EXCEPINFO* information) noexcept;
 
-/// Runs a function at the boundary, with the floating-point settings that it is compiled for.
+/// Runs a function at the boundary, with the floating-point settings that the library is compiled for.
 template <class Function>
 [[nodiscard]] HRESULT guarded(Function&& function) noexcept {
   const FloatingPointSettings settings;

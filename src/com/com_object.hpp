@@ -9,19 +9,19 @@
 
 namespace talutil::com {
 
-/// A slot of a vtable, whatever its signature.
+/// A slot of a vtable, regardless of its signature.
 using Slot = void (*)();
 
-/// What the classes that hosts create differ in.
+/// The differences between the classes that hosts create.
 template <class C>
 struct ClassTraits;
 
-/// The slots of a class, made in vtables.cpp.
+/// The slots of a class, defined in vtables.cpp.
 template <class C>
 [[nodiscard]] const Slot* vtable_of() noexcept;
 
-/// An object as hosts hold it: a pointer to its slots first, then everything else. It has no virtual functions
-/// of its own, so that its address is the interface pointer.
+/// An object as hosts see it: a pointer to its slots comes first. It has no virtual functions of its own, so that its
+/// address is the interface pointer.
 template <class C>
 class ComObject {
  public:
@@ -52,8 +52,8 @@ class ComObject {
     return left;
   }
 
-  /// Keeps the object for the length of a call: a member shows dialogs and lets messages in, and a host that handles
-  /// one may let go of its last reference.
+  /// Keeps the object alive during a call: a member may show dialogs and let messages through, and a host that handles
+  /// one of those may release its last reference.
   class Keeper {
    public:
     explicit Keeper(ComObject* object) noexcept : object_(object) { add_reference(object); }
@@ -95,7 +95,7 @@ class ComObject {
   }
 
  private:
-  /// A second interface of the object: references and questions go to the first.
+  /// A second interface of the object, which forwards reference counting and queries to the first.
   template <class Interface>
   class Part : public Interface {
    public:

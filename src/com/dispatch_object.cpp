@@ -15,7 +15,7 @@ namespace talutil::com {
 
 namespace {
 
-/// What an object reported of its failure; its texts are freed here.
+/// An object's report of its failure; frees the texts in it.
 class ExceptionInformation {
  public:
   ExceptionInformation() = default;
@@ -48,12 +48,12 @@ bool owns_memory(const VARIANT& value) noexcept {
   return type == VT_BSTR || type == VT_DISPATCH || type == VT_UNKNOWN || type > VT_DECIMAL;
 }
 
-/// The platform is not asked about numbers: it takes its time.
+/// Skips the platform's slow call for numbers.
 void clear(VARIANT& value) noexcept {
   if (owns_memory(value)) VariantClear(&value);
 }
 
-/// Arguments in the order that automation wants: the last one first. The few that members pass need no memory.
+/// Arguments in automation's order, the last one first. The few that members usually pass need no allocation.
 class NativeArguments {
  public:
   explicit NativeArguments(std::span<const Variant> arguments) : NativeArguments(arguments.size()) {
@@ -71,7 +71,7 @@ class NativeArguments {
   [[nodiscard]] UINT size() const noexcept { return size_; }
 
  private:
-  // Complete before the first argument is made, so that those made are freed when a later one cannot be.
+  // A complete object before the first argument is converted, so that these are freed if a later one fails.
   explicit NativeArguments(std::size_t count) : many_(count > std::tuple_size_v<Few> ? count : 0) {}
 
   using Few = std::array<VARIANT, 4>;
@@ -81,7 +81,7 @@ class NativeArguments {
   UINT size_ = 0;
 };
 
-/// A use of a member of the host's object, for one time or for many.
+/// The use of a member of the host's object, once or repeatedly.
 class DispatchUse final : public RepeatedUse {
  public:
   DispatchUse(Pointer<IDispatch> dispatch, std::int32_t member, Access access, std::span<const Variant> arguments)
@@ -129,13 +129,14 @@ class DispatchUse final : public RepeatedUse {
       case Access::call:
         return invoke(DISPATCH_METHOD, exception);
       case Access::get:
-        // An object that goes by its type information answers for a function only to the first flag and for a property
-        // only to the second. Which of them a member is (ScaleX, TextWidth, ItemData) differs from object to object.
+        // Sends both flags, because an object driven by its type information accepts only the first for a function and
+        // only the second for a property. Whether a member (ScaleX, TextWidth, ItemData) is one or the other differs
+        // between objects.
         return read(exception);
       case Access::put:
         break;
     }
-    // A property that keeps an object is one put by reference; only some take it as any other value too.
+    // An object is put by reference into a property that stores one; only some of these also accept it by value.
     if (V_VT(arguments_.data()) == VT_DISPATCH) {
       const HRESULT status = invoke(DISPATCH_PROPERTYPUTREF, exception);
       if (status != DISP_E_MEMBERNOTFOUND) return status;
@@ -145,7 +146,7 @@ class DispatchUse final : public RepeatedUse {
 
   HRESULT read(ExceptionInformation& exception) {
     const HRESULT status = invoke(DISPATCH_METHOD | DISPATCH_PROPERTYGET, exception);
-    // Wine's JScript takes both flags for a call, and has a bare failure for a plain property, which is none.
+    // Wine's JScript takes both flags as a call and fails for a plain property with E_FAIL.
     if (status != E_FAIL || arguments_.size() != 0) return status;
     return invoke(DISPATCH_PROPERTYGET, exception);
   }
@@ -166,7 +167,6 @@ class DispatchUse final : public RepeatedUse {
   Text converted_;
 };
 
-/// The host's object.
 class HostObject final : public Object {
  public:
   explicit HostObject(Pointer<IDispatch> dispatch) noexcept : dispatch_(std::move(dispatch)) {}
@@ -204,7 +204,7 @@ class HostObject final : public Object {
   Pointer<IDispatch> dispatch_;
 };
 
-/// The host's object, of a kind that cannot be driven late-bound.
+/// A host's object that cannot be driven late-bound.
 class UndrivenObject final : public Object {
  public:
   std::int32_t member_id(TextView /*name*/) override { raise(ErrorNumber::type_mismatch); }
@@ -214,7 +214,7 @@ class UndrivenObject final : public Object {
   }
 };
 
-/// One of our objects, for a host.
+/// One of our objects, as passed to a host.
 class OwnDispatch final : public IDispatch {
  public:
   explicit OwnDispatch(ObjectRef object) noexcept : object_(std::move(object)) {}
@@ -262,7 +262,7 @@ class OwnDispatch final : public IDispatch {
   HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS* parameters, VARIANT* result,
                                    EXCEPINFO* exception, UINT*) override {
     if (parameters == nullptr || (parameters->cArgs != 0 && parameters->rgvarg == nullptr)) return E_POINTER;
-    // A host may let go of the control while it handles one of its events.
+    // A host may release the control while handling one of its events.
     const auto keeper = Pointer<OwnDispatch>::shared(this);
     const FloatingPointSettings settings;
     try {

@@ -21,7 +21,7 @@ namespace talutil::com {
 
 namespace {
 
-/// The platform of the DLL and the library on it.
+/// The DLL's platform and the library that uses it.
 struct LoadedLibrary {
   RegisteredControls control_makers;
   win32::Win32Platform platform{control_makers};
@@ -30,20 +30,20 @@ struct LoadedLibrary {
 
 struct Module {
   HINSTANCE handle = nullptr;
-  std::atomic<long> references = 0;  ///< Class objects and locks; made before the library is.
-  // A thread that starts the library may come back here: a control that is registered to stand for ours may lead to one
-  // of our classes.
+  std::atomic<long> references = 0;  ///< Class objects and locks; counted before the library exists.
+  // Recursive, because starting the library may lead back here on the same thread: a control registered in place of
+  // ours may create one of our classes.
   std::recursive_mutex starting;
   bool is_starting = false;
-  // Neither is ever released: what hosts put into the settings is not to be let go of under the loader's lock.
+  // Neither is ever released: objects that hosts have put into the settings must not be released under the loader lock.
   LoadedLibrary* loaded = nullptr;
   ITypeLib* type_library = nullptr;
 };
 
 Module module_state;
 
-/// Keeps the DLL in the process until that ends. Hosts may hold our objects, windows and timers in ways that no
-/// count sees, and each unloading would leave a slot and some memory of the compiler's run-time behind.
+/// Keeps the DLL in the process until that ends. Hosts may hold our objects, windows and timers in ways that no count
+/// reflects, and each unloading would leak a slot and some memory of the compiler's run time.
 void stay_loaded() noexcept {
   HMODULE module = nullptr;
   GetModuleHandleExW(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_PIN,
@@ -53,7 +53,7 @@ void stay_loaded() noexcept {
 template <class C>
 HRESULT create_object(REFIID id, void** out) noexcept {
   return guarded([&] {
-    // NOLINTNEXTLINE(bugprone-unhandled-exception-at-new): the guard around it answers error 7.
+    // NOLINTNEXTLINE(bugprone-unhandled-exception-at-new): the guard around it turns it into error 7.
     auto* const made = new ComObject<C>(module_library());
     const HRESULT result = ComObject<C>::query_interface(made, &id, out);
     ComObject<C>::release(made);
@@ -61,7 +61,7 @@ HRESULT create_object(REFIID id, void** out) noexcept {
   });
 }
 
-/// A control of its own for a host, as those on the components window are: ours, whoever else has registered one.
+/// Creates a control for a host. It is always our own, even if a third-party control is registered in its place.
 template <class C>
 HRESULT create_control(REFIID id, void** out) noexcept {
   return guarded([&] {
@@ -72,7 +72,7 @@ HRESULT create_control(REFIID id, void** out) noexcept {
   });
 }
 
-/// One for each class, for as long as the DLL is loaded.
+/// One per class, for the lifetime of the DLL.
 class ClassObject final : public IClassFactory {
  public:
   using Create = HRESULT (*)(REFIID id, void** out) noexcept;
@@ -161,7 +161,7 @@ using namespace talutil;
 using namespace talutil::com;
 
 extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, void* /*reserved*/) {
-  // Nothing else here: the loader's lock is held.
+  // Nothing else here, because the loader lock is held.
   if (reason == DLL_PROCESS_ATTACH) {
     module_state.handle = instance;
     DisableThreadLibraryCalls(instance);
@@ -181,14 +181,14 @@ STDAPI DllGetClassObject(REFCLSID class_id, REFIID id, void** out) {
   return CLASS_E_CLASSNOTAVAILABLE;
 }
 
-// A library that has been started stays; one that was only asked for a class may go.
+// Once the library has been started, the DLL stays; if only class objects were requested, it may be unloaded.
 STDAPI DllCanUnloadNow() { return module_state.loaded == nullptr && module_state.references == 0 ? S_OK : S_FALSE; }
 
 STDAPI DllRegisterServer() { return register_library(RegistrationScope::machine); }
 
 STDAPI DllUnregisterServer() { return unregister_library(RegistrationScope::machine); }
 
-// "regsvr32 /n /i:user TALUtil.dll" registers for the user alone, without administrator rights.
+// "regsvr32 /n /i:user TALUtil.dll" registers for the current user only, without administrator rights.
 STDAPI DllInstall(BOOL install, LPCWSTR command_line) {
   const bool for_user = command_line != nullptr && lstrcmpiW(command_line, L"user") == 0;
   const auto scope = for_user ? RegistrationScope::user : RegistrationScope::machine;

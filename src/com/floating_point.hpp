@@ -6,10 +6,10 @@
 
 namespace talutil::com {
 
-/// The processor's floating-point settings as this library is compiled for them, for the length of a call: all
-/// exceptions masked, rounding to nearest, 53 bits in the old unit. Hosts of some compilers unmask exceptions, which a
-/// NaN in an argument would end them by; graphics libraries leave 24 bits behind, with which the run-time's conversions
-/// of numbers give other digits. The caller's settings come back at the end.
+/// Sets the processor's floating-point settings to those the library is compiled for, for the duration of a call: all
+/// exceptions masked, rounding to nearest, 53 bits in the x87 unit. Some compilers' hosts unmask exceptions, so that a
+/// NaN in an argument would terminate them; graphics libraries leave the unit at 24 bits, with which the run time's
+/// conversions of numbers produce other digits. The destructor restores the caller's settings.
 class FloatingPointSettings {
  public:
   FloatingPointSettings() noexcept : control_(control()), sse_control_(_mm_getcsr()) {
@@ -20,7 +20,7 @@ class FloatingPointSettings {
   FloatingPointSettings& operator=(const FloatingPointSettings&) = delete;
   ~FloatingPointSettings() {
     if (control_ != standard_control) {
-      // What was raised while masked would be reported by the caller's next instruction.
+      // Otherwise exceptions raised while masked would be reported at the caller's next instruction.
       __asm__ volatile("fnclex");
       set_control(control_);
     }
@@ -28,10 +28,10 @@ class FloatingPointSettings {
   }
 
  private:
-  // The values that the system starts every thread with.
+  // The values with which the system starts every thread.
   static constexpr std::uint16_t standard_control = 0x027F;
   static constexpr std::uint32_t standard_sse_control = 0x1F80;
-  static constexpr std::uint32_t sse_flags = 0x3F;  ///< What was raised so far; no setting.
+  static constexpr std::uint32_t sse_flags = 0x3F;  ///< Status flags rather than settings.
 
   static std::uint16_t control() noexcept {
     std::uint16_t value = 0;

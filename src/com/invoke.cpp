@@ -14,17 +14,17 @@ namespace {
 
 constexpr WORD put_flags = DISPATCH_PROPERTYPUT | DISPATCH_PROPERTYPUTREF;
 
-/// Where each parameter's argument stands in the caller's list; -1 for one that was left out.
+/// The position of each parameter's argument in the caller's list; -1 for one that was left out.
 struct Placement {
   std::array<int, most_parameters> argument{};
-  std::size_t count = 0;  ///< Parameters up to the last one given.
+  std::size_t count = 0;  ///< The number of parameters up to the last one given.
 };
 
 HRESULT place_arguments(const Member& member, const DISPPARAMS& given, UINT* bad_argument, Placement& placement) {
   placement.argument.fill(-1);
   const UINT positional = given.cArgs - given.cNamedArgs;
   if (given.cArgs > member.parameter_count) return DISP_E_BADPARAMCOUNT;
-  // The caller's list starts with the named arguments; the positional ones follow, the last one first.
+  // The caller's list begins with the named arguments; the positional ones follow in reverse order.
   for (UINT i = 0; i < positional; ++i) placement.argument[i] = static_cast<int>(given.cArgs - 1 - i);
   placement.count = positional;
   for (UINT i = 0; i < given.cNamedArgs; ++i) {
@@ -45,7 +45,7 @@ bool is_missing(const VARIANT& value) noexcept {
   return V_VT(&value) == VT_ERROR && V_ERROR(&value) == DISP_E_PARAMNOTFOUND;
 }
 
-/// The argument as the parameter wants it. Arrays need the parameter's word: a script's array holds variants.
+/// The argument as the parameter needs it. For arrays the parameter's type decides: a script's array holds variants.
 Variant argument_value(const Parameter& parameter, const VARIANT& given, const Locale& locale) {
   const VARIANT& source = resolved(given);
   const bool is_array = (V_VT(&source) & VT_ARRAY) != 0;
@@ -55,7 +55,7 @@ Variant argument_value(const Parameter& parameter, const VARIANT& given, const L
   return array_from(by_reference ? *V_ARRAYREF(&source) : V_ARRAY(&source), locale);
 }
 
-/// One call: its arguments, and the way back of what the member wrote.
+/// One call: its arguments, and writing back what the member changed.
 class Call {
  public:
   Call(const Member& member, const Invocation& invocation, const Placement& placement, const Locale& locale)
@@ -88,7 +88,7 @@ class Call {
   }
 
  private:
-  /// The earlier argument that is the same variable, where both may be written to; -1 for none.
+  /// The index of the earlier argument that is the same variable, if both may be written to; otherwise -1.
   [[nodiscard]] std::int8_t earlier_place_of(std::size_t place, const Member& member) const {
     const auto variable_at = [&](std::size_t i) -> const void* {
       const Parameter& parameter = member.parameters()[i];
@@ -119,11 +119,11 @@ HRESULT check_required(const Member& member, const Invocation& invocation, const
   return S_OK;
 }
 
-/// The slot for the way a caller uses a member; -1 when the member has none.
+/// The slot for a member and the way it is used; -1 if there is none.
 std::int32_t slot_for(const LateInterface& table, DISPID member, WORD flags) noexcept {
   if ((flags & put_flags) == 0) return table.slot_of(member, Access::get);
   const std::int32_t slot = table.slot_of(member, Access::put);
-  // A reference is put only where an object is kept.
+  // Putting by reference is allowed only for a property that stores an object.
   const bool by_reference_only = (flags & put_flags) == DISPATCH_PROPERTYPUTREF;
   if (slot < 0 || !by_reference_only) return slot;
   return table.members[static_cast<std::size_t>(slot)].parameters()[0].type == ValueType::variant ? slot : -1;

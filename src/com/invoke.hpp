@@ -3,11 +3,11 @@
 #include "automation/late_call.hpp"
 #include "platform/win32/windows.hpp"
 
-/// Late binding by our own hand: the platform's ITypeInfo::Invoke refuses a script's variables where a typed
-/// reference is due.
+/// Our own implementation of late binding: the platform's ITypeInfo::Invoke rejects a script's variables for typed
+/// reference parameters.
 namespace talutil::com {
 
-/// IDispatch::GetIDsOfNames over a member table; the names after the first are parameters of the member.
+/// Implements IDispatch::GetIDsOfNames for a member table; the names after the first are parameters of the member.
 [[nodiscard]] HRESULT find_identifiers(const LateInterface& table, wchar_t** names, UINT count, DISPID* ids) noexcept;
 
 struct Invocation {
@@ -19,8 +19,8 @@ struct Invocation {
   UINT* bad_argument;
 };
 
-/// IDispatch::Invoke over a member table. Arguments of any type are coerced to the parameter's; what the member wrote
-/// back goes to the caller's variables, also when it failed, and only where it changed.
+/// Implements IDispatch::Invoke for a member table. Arguments of any type are coerced to the parameter's type. What the
+/// member wrote back is stored in the caller's variables, even if it failed, but only if it changed.
 [[nodiscard]] HRESULT invoke(const LateInterface& table, void* target, const Locale& locale,
                              const Invocation& invocation) noexcept;
 

@@ -3,18 +3,17 @@
 #include "library/library.hpp"
 #include "platform/win32/windows.hpp"
 
-/// The loaded DLL: the one place with state that outlives a call.
+/// The loaded DLL: the only state that outlives a call.
 namespace talutil::com {
 
 [[nodiscard]] HINSTANCE module_handle() noexcept;
 
-/// The one library, made and started by the first call, before the first object is handed out; from then on the DLL
-/// stays in the process. Not from DllMain: the start-up creates controls, which the loader's lock forbids. Raises what
-/// the start-up raises, and then tries again at the next call; 429 for a call from within the start-up.
+/// The library. The first call creates and starts it, before the first object is handed out; from then on the DLL stays
+/// in the process. Not callable from DllMain: the start-up creates controls, which the loader lock forbids. Raises the
+/// errors of the start-up, and tries again on the next call; raises 429 if called during the start-up.
 [[nodiscard]] Library& module_library();
 
-/// The type information of one of the type library's interfaces or classes, from the DLL's own resource, which is read
-/// once.
+/// The type information of an interface or class, from the type library in the DLL's resources, which is loaded once.
 [[nodiscard]] HRESULT type_information(const GUID& identifier, ITypeInfo** out) noexcept;
 
 /// A class or interface identifier of library/identity.hpp.

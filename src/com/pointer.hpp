@@ -4,7 +4,7 @@
 
 namespace talutil::com {
 
-/// A counted reference to an interface, owned.
+/// An owned, counted reference to an interface.
 template <class Interface>
 class Pointer {
  public:
@@ -21,7 +21,7 @@ class Pointer {
     if (pointer_ != nullptr) pointer_->Release();
   }
 
-  /// Another reference to what the caller keeps.
+  /// Adds a reference of our own to the caller's pointer.
   static Pointer shared(Interface* pointer) noexcept {
     if (pointer != nullptr) pointer->AddRef();
     Pointer result;
@@ -34,7 +34,7 @@ class Pointer {
   [[nodiscard]] explicit operator bool() const noexcept { return pointer_ != nullptr; }
   [[nodiscard]] Interface* release() noexcept { return std::exchange(pointer_, nullptr); }
 
-  /// For functions that give a reference through an argument.
+  /// For functions that return a reference through an argument.
   [[nodiscard]] Interface** receive() noexcept {
     *this = Pointer();
     return &pointer_;

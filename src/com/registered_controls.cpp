@@ -13,7 +13,7 @@ namespace {
 
 constexpr const wchar_t* key_name = L"Software\\TALUtil\\Controls";
 
-/// The class that stands for a name below one root; an empty text where none does.
+/// The class registered for a name below one root; empty if there is none.
 Text registered_class(HKEY root, const Text& class_name) {
   std::array<wchar_t, 256> value{};
   DWORD size = sizeof value;
@@ -22,8 +22,8 @@ Text registered_class(HKEY root, const Text& class_name) {
   return status == ERROR_SUCCESS ? Text(win32::view(value.data(), size / sizeof(wchar_t) - 1)) : Text();
 }
 
-/// Whether the process has rights that other programs of its user lack. Those can write to the user's part of the
-/// registry, and must not choose the code that runs here.
+/// Whether the process has rights that the user's other programs lack. Those can write to the user's part of the
+/// registry, and must not determine what code runs here.
 bool is_elevated() noexcept {
   win32::Owned<win32::kind::KernelObject> token;
   if (OpenProcessToken(GetCurrentProcess(), TOKEN_QUERY, token.receive()) == FALSE) return false;
@@ -43,7 +43,7 @@ ObjectRef RegisteredControls::create(TextView class_name) {
 
   CLSID class_id;
   Pointer<IUnknown> object;
-  // A registration that does not work is the user's to know of; falling back silently would hide it.
+  // Report a broken registration to the user; a silent fallback would hide it.
   if (FAILED(CLSIDFromString(win32::wide(replacement), &class_id)) ||
       FAILED(CoCreateInstance(class_id, nullptr, CLSCTX_INPROC_SERVER, IID_IUnknown, object.receive_untyped()))) {
     const Text description = u"ActiveX component can't create object: " + replacement + u" is registered in " +

@@ -10,7 +10,7 @@
 #include "platform/win32/handle.hpp"
 #include "platform/win32/module_path.hpp"
 
-// In the platform's library, but not in the headers of the tool chain.
+// In the platform's library, but not in the tool chain's headers.
 extern "C" HRESULT WINAPI RegisterTypeLibForUser(ITypeLib* library, OLECHAR* path, OLECHAR* help_folder);
 extern "C" HRESULT WINAPI UnRegisterTypeLibForUser(REFGUID library, WORD major, WORD minor, LCID locale, SYSKIND kind);
 
@@ -18,12 +18,11 @@ namespace talutil::com {
 
 namespace {
 
-/// 32- and 64-bit programs see classes of their own, but the same program identifiers and type libraries.
+/// 32-bit and 64-bit programs have separate class entries, but share program identifiers and type libraries.
 constexpr bool is_64_bit = sizeof(void*) == 8;
 constexpr SYSKIND system_kind = is_64_bit ? SYS_WIN64 : SYS_WIN32;
 constexpr REGSAM view_of_others = is_64_bit ? KEY_WOW64_32KEY : KEY_WOW64_64KEY;
 
-/// A registry key, open for writing.
 class Key {
  public:
   static Key create(HKEY parent, const std::wstring& path) {
@@ -77,8 +76,8 @@ void register_class(HKEY root, const identity::Class& entry, const std::wstring&
   Key::create(root, key).set(nullptr, program_id);
   const Key server = Key::create(root, key + L"\\InprocServer32");
   server.set(nullptr, path);
-  // None: objects live in the host's first apartment, and calls from others go there. The settings are one block, which
-  // nothing locks. A registration of earlier versions may have left one.
+  // No ThreadingModel: objects live in the host's first apartment, to which calls from others are marshalled, because
+  // nothing locks the shared settings. Earlier versions may have registered one.
   server.remove(L"ThreadingModel");
   Key::create(root, key + L"\\ProgID").set(nullptr, program_id);
   Key::create(root, key + L"\\TypeLib").set(nullptr, text_of(guid_of(identity::type_library)));
@@ -88,7 +87,7 @@ void register_class(HKEY root, const identity::Class& entry, const std::wstring&
   Key::create(root, key + L"\\Programmable").set(nullptr, L"");
 }
 
-/// True while the library for the other kind of programs is registered.
+/// True while the library for programs of the other bitness is registered.
 bool others_have(HKEY root, const identity::Class& entry) {
   win32::Owned<win32::kind::RegistryKey> key;
   const std::wstring path = class_key(L"CLSID\\" + identifier_of(entry));
@@ -126,7 +125,7 @@ HRESULT unregister_library(RegistrationScope scope) noexcept {
       if (status != ERROR_FILE_NOT_FOUND) Key::check(status);
     };
     for (const identity::Class& entry : identity::classes) {
-      // First: where there is one kind of programs alone, the view of the others is the same.
+      // First, because on a system with only one bitness both views are the same.
       remove(class_key(L"CLSID\\" + identifier_of(entry)));
       if (!others_have(root_of(scope), entry)) remove(class_key(program_id_of(entry)));
     }
@@ -134,7 +133,7 @@ HRESULT unregister_library(RegistrationScope scope) noexcept {
     const auto unregister = scope == RegistrationScope::user ? &UnRegisterTypeLibForUser : &UnRegisterTypeLib;
     const HRESULT result =
         unregister(library, identity::type_library_major, identity::type_library_minor, 0, system_kind);
-    // Wine answers E_INVALIDARG for a library that is not registered.
+    // Wine returns E_INVALIDARG for a library that is not registered.
     if (FAILED(result) && result != TYPE_E_REGISTRYACCESS && result != TYPE_E_LIBNOTREGISTERED &&
         result != E_INVALIDARG) {
       throw system_error(result);

@@ -4,13 +4,13 @@
 
 namespace talutil::com {
 
-/// Whose registry the classes go to: the machine's (administrators only) or the user's own.
+/// Where to register: for the machine (administrators only) or for the current user.
 enum class RegistrationScope { machine, user };
 
-/// Writes the entries of both classes and of the type library; a failure takes back what was written.
+/// Writes the entries of all classes and of the type library; on failure removes what it wrote.
 [[nodiscard]] HRESULT register_library(RegistrationScope scope) noexcept;
 
-/// Removes the same entries; those that are not there are no failure.
+/// Removes the same entries; missing ones are not an error.
 [[nodiscard]] HRESULT unregister_library(RegistrationScope scope) noexcept;
 
 }  // namespace talutil::com

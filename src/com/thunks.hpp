@@ -11,11 +11,11 @@
 #include "com/variant_bridge.hpp"
 #include "com/write_back.hpp"
 
-/// The vtable, made from the interface table: for each row a function that takes automation's own types, calls
-/// the member and marshals back. Nothing is written per member.
+/// The vtable, generated from the interface table: for each row, a function that takes automation's types, calls the
+/// member and marshals the results. There is no code per member.
 namespace talutil::com {
 
-/// How a type of the interface stands in a vtable call, and how it is converted.
+/// How a type of the interface is represented in a vtable call, and how it is converted.
 template <class T>
 struct Wire {  // Numbers and records are the same on both sides.
   using Type = T;
@@ -70,18 +70,17 @@ struct Wire<TextArray> {
   }
 };
 
-/// The caller's type of a parameter: by value, or a pointer to it.
+/// The caller's type for a parameter: the value, or a pointer to it.
 template <class A>
 using WireParameter = std::conditional_t<passing<A>() == Passing::by_value, typename Wire<std::remove_cvref_t<A>>::Type,
                                          typename Wire<std::remove_cvref_t<A>>::Type*>;
 
-/// One argument of a vtable call.
 template <class A>
 class WireCell {
  public:
   using T = std::remove_cvref_t<A>;
   static constexpr bool is_written_back = passing<A>() == Passing::written_back;
-  /// A variant by reference may refer to a typed variable in its turn, which is written through and never replaced.
+  /// A variant by reference may itself refer to a typed variable, which is written through and never replaced.
   static constexpr bool is_variable = is_written_back && std::is_same_v<T, Variant>;
 
   WireCell(WireParameter<A> given, const Library& library) {
@@ -102,16 +101,16 @@ class WireCell {
     return value_;
   }
 
-  /// Where the caller's variable lies.
+  /// The address of the caller's variable.
   [[nodiscard]] const void* variable() const noexcept {
     const void* const end = variable_of(*place_);
     return end == nullptr ? place_ : end;
   }
 
-  /// Makes this argument the same variable as an earlier one.
+  /// Marks this argument as the same variable as an earlier one.
   void share(WireCell& first) noexcept { first_ = &first; }
 
-  /// Makes what goes back, if anything does. Nothing is stored before everything is made.
+  /// Converts the value to write back, if it changed. All are converted before the first is stored.
   void prepare(const Library& library) {
     if constexpr (is_written_back) {
       if (value_ == before_) return;
@@ -146,8 +145,8 @@ class WireCell {
   [[no_unique_address]] std::conditional_t<is_variable, WireCell*, Nothing> first_{};
 };
 
-/// Variants that a caller passes twice are one variable: what is written to it through one parameter is seen through
-/// the other.
+/// A variant that a caller passes twice is one variable: what is written through one parameter is visible through the
+/// other.
 template <class... A>
 void find_shared_variables(std::tuple<WireCell<A>...>& cells) {
   constexpr std::size_t count = (0 + ... + (WireCell<A>::is_variable ? 1 : 0));
@@ -179,7 +178,7 @@ void write_back(std::tuple<WireCell<A>...>& cells, const Library& library) {
       cells);
 }
 
-/// Runs a member; what it wrote back by then is stored even if it fails.
+/// Runs a member; whatever it wrote back is stored even if it fails.
 template <class Function, class... A>
 auto run(std::tuple<WireCell<A>...>& cells, const Library& library, Function&& function) {
   if constexpr (!(WireCell<A>::is_written_back || ...)) {
@@ -208,7 +207,7 @@ void initialize(T& place) noexcept {
   place = T{};
 }
 
-/// The answer to a null pointer. The thread may still hold the information on an earlier error, which this is not.
+/// The result for a null pointer. Clears the thread's error information, which may be about an earlier error.
 inline HRESULT null_pointer() noexcept {
   SetErrorInfo(0, nullptr);
   return E_POINTER;
@@ -282,7 +281,7 @@ struct PropertyThunk {
   }
 };
 
-/// A list of slots as a type: the functions have as many signatures as there are members.
+/// A list of slots as a type, because the functions have different signatures.
 template <auto... Functions>
 struct SlotList {};
 

@@ -11,7 +11,7 @@ namespace talutil::com {
 
 namespace {
 
-/// Holds the data of an array for reading or filling.
+/// Gives access to the data of an array for reading or writing.
 class ArrayAccess {
  public:
   explicit ArrayAccess(SAFEARRAY* array) : array_(array) {
@@ -37,7 +37,7 @@ double decimal_to_double(DECIMAL value) {
   return result;
 }
 
-/// A whole number of any size as our smallest kind that holds it.
+/// A whole number of any size as the smallest of our kinds that can hold it.
 template <class T>
 Variant whole_number(T value) {
   if (std::in_range<std::int16_t>(value)) return static_cast<std::int16_t>(value);
@@ -45,7 +45,7 @@ Variant whole_number(T value) {
   return static_cast<double>(value);
 }
 
-/// The data of a simple type, wherever it lies: in the VARIANT itself or behind its reference.
+/// The data of a simple type, whether in the VARIANT itself or referred to by it.
 Variant simple_value(VARTYPE type, const void* data) {
   const auto as = [data]<class T>(std::type_identity<T>) { return *static_cast<const T*>(data); };
   switch (type) {
@@ -138,20 +138,20 @@ void put(VARIANT& out, const ObjectRef& value) {
   V_DISPATCH(&out) = dispatch_from(value);
   V_VT(&out) = VT_DISPATCH;
 }
-// Records go back into the caller's own; a variable that holds none cannot take one.
+// Records are written to the caller's record; a variable without one cannot take one.
 void put(VARIANT&, const SystemTime&) { raise(ErrorNumber::type_mismatch); }
 void put(VARIANT& out, const ForeignArray& value) {
-  // The platform's function takes no constant, and changes none.
+  // The platform's function is not const-correct, but does not change its source.
   auto* const native = const_cast<VARIANT*>(static_cast<const VARIANT*>(value.contents.get()));
   if (FAILED(VariantCopy(&out, native))) throw std::bad_alloc();
 }
 
-/// A copy of an array that members can do nothing with but hand it back.
+/// A copy of an array that members can only return unchanged.
 ForeignArray kept_array(SAFEARRAY* array, VARTYPE element) {
   auto copy = std::make_shared<OwnedVariant>();
   VARIANT& native = copy->get();
   V_VT(&native) = static_cast<VARTYPE>(VT_ARRAY | element);
-  // Elements that cannot be copied are those of a broken array.
+  // Copying fails only if the array is corrupt.
   if (array != nullptr && FAILED(SafeArrayCopy(array, &V_ARRAY(&native)))) raise(ErrorNumber::type_mismatch);
   return {std::shared_ptr<const void>(copy, &native)};
 }
@@ -167,12 +167,12 @@ OwnedText::OwnedText(TextView text) : text_(nullptr) {
 OwnedArray::OwnedArray(const TextArray& array, ArrayStyle style) {
   if (!array.allocated) return;
   const VARTYPE type = style == ArrayStyle::of_texts ? VT_BSTR : VT_VARIANT;
-  // Not SafeArrayCreateVector, whose arrays are documented to be of fixed size (FADF_FIXEDSIZE): a host's next call
-  // with the same variable could not resize one. Wine does not set the flag.
+  // Not SafeArrayCreateVector, whose arrays are documented as fixed-size (FADF_FIXEDSIZE): a host could not resize one
+  // in its next call with the same variable. Wine does not set the flag.
   SAFEARRAYBOUND bound{static_cast<ULONG>(array.items.size()), array.lower_bound};
   array_ = SafeArrayCreate(type, 1, &bound);
   if (array_ == nullptr) throw std::bad_alloc();
-  // The array owns each element as soon as it stands in it, also when a later one cannot be made.
+  // The array owns each element as soon as it is stored, even if a later one fails.
   const ArrayAccess access(array_);
   for (std::size_t i = 0; i < array.items.size(); ++i) {
     OwnedText element(array.items[i]);
@@ -250,7 +250,7 @@ Variant variant_from(const VARIANT& value) {
     return *record;
   }
   if (by_reference) return simple_value(type, V_BYREF(&source));
-  // A decimal takes the whole of the VARIANT, every other type its data field.
+  // A decimal uses the whole VARIANT, every other type its data field.
   return simple_value(type, type == VT_DECIMAL ? static_cast<const void*>(&source) : &V_I8(&source));
 }
 

@@ -5,10 +5,10 @@
 #include "automation/variant.hpp"
 #include "platform/win32/windows.hpp"
 
-/// Values on their way between automation's own types and ours.
+/// Conversion of values between automation's types and ours.
 namespace talutil::com {
 
-/// An automation string that is owned until it is released to the caller.
+/// An automation string, owned until it is passed to the caller.
 class OwnedText {
  public:
   OwnedText() = default;
@@ -27,7 +27,7 @@ class OwnedText {
   BSTR text_ = nullptr;
 };
 
-/// A VARIANT that is cleared at its end.
+/// A VARIANT that the destructor clears.
 class OwnedVariant {
  public:
   OwnedVariant() noexcept { VariantInit(&value_); }
@@ -50,11 +50,11 @@ class OwnedVariant {
   VARIANT value_;
 };
 
-/// How arrays of texts are written: as automation declares them, or as arrays of variants, the only ones that
-/// a script can index.
+/// The type of arrays of texts: as automation declares them, or arrays of variants, the only ones that scripts can
+/// index.
 enum class ArrayStyle { of_texts, of_variants };
 
-/// An array that is destroyed at its end.
+/// An array that the destructor destroys.
 class OwnedArray {
  public:
   OwnedArray() = default;
@@ -77,27 +77,27 @@ class OwnedArray {
 
 [[nodiscard]] Text text_from(BSTR text);
 
-/// An array of texts or of variants (each converted to text). Raises 13 for other elements and 9 for other than
+/// Converts an array of texts or variants (each converted to text). Raises 13 for other elements and 9 unless it has
 /// one dimension. A null pointer is an array that was never allocated.
 [[nodiscard]] TextArray array_from(SAFEARRAY* array, const Locale& locale);
 
-/// Raises 10 for an array that cannot be exchanged for another: one of fixed size, or locked by its owner.
+/// Raises 10 if an array cannot be replaced: if it has a fixed size or is locked by its owner.
 void require_resizable(const SAFEARRAY* array);
 
-/// The value of a VARIANT, references followed. Raises 5 for a reference that points nowhere or in circles,
-/// and 13 for a type that automation has no conversion for.
+/// The value of a VARIANT; follows references. Raises 5 for a null or circular reference, and 13 for a type that
+/// automation cannot convert.
 [[nodiscard]] Variant variant_from(const VARIANT& value);
 
 [[nodiscard]] OwnedVariant native_from(const Variant& value, ArrayStyle style);
 
-/// The library's record of that type in a VARIANT, by value or by reference: the caller's own, which is read and
-/// written where it lies. A null pointer for anything else.
+/// The SystemTime record in a VARIANT, by value or by reference: the caller's own, to be read and written in place.
+/// Null for anything else.
 [[nodiscard]] SystemTime* system_time_of(const VARIANT& value) noexcept;
 
-/// A reference may lead to a variant that is a reference again, but honest callers stop after one or two.
+/// A reference may lead to another reference to a variant, but well-behaved callers stop after one or two.
 constexpr int most_references = 8;
 
-/// The end of a chain of references to variants. Raises 5 for one that leads nowhere or in circles.
+/// The end of a chain of references to variants. Raises 5 if it is null or circular.
 [[nodiscard]] const VARIANT& resolved(const VARIANT& value);
 
 }  // namespace talutil::com

@@ -1,4 +1,4 @@
-// The vtables stand in a file of their own: making the functions of all slots takes the compiler a while.
+// In a separate file, because instantiating the functions of all slots takes the compiler a while.
 #include "com/classes.hpp"
 #include "com/thunks.hpp"
 
@@ -14,7 +14,7 @@ struct Table<C, SlotList<Functions...>> {
   static const Slot slots[];
 };
 
-// Read-only data: every entry is an address that the linker knows.
+// Read-only data: every entry is an address known at link time.
 template <class C, auto... Functions>
 const Slot Table<C, SlotList<Functions...>>::slots[] = {
     reinterpret_cast<Slot>(&ComObject<C>::query_interface),

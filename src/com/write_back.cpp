@@ -7,7 +7,8 @@ namespace talutil::com {
 
 namespace {
 
-/// A value as a number type that the library has no kind for. From a number, so that no locale has a say.
+/// Converts a value to a number type that the library has no kind for. Goes by way of a number, so that the locale does
+/// not matter.
 OwnedVariant other_number(const Variant& value, VARTYPE type, const Locale& locale) {
   OwnedVariant result = native_from(value.to_double(locale), ArrayStyle::of_variants);
   const HRESULT status = VariantChangeType(&result.get(), &result.get(), 0, type);
@@ -15,8 +16,8 @@ OwnedVariant other_number(const Variant& value, VARTYPE type, const Locale& loca
   return result;
 }
 
-/// A value in a variable's own type. By our own conversions: the platform's would read and write dates in the order of
-/// the user's locale, where texts of dates are day first.
+/// Converts a value to a variable's own type. Uses our conversions, because the platform's read and write dates in the
+/// order of the user's locale, but here dates in texts are day first.
 OwnedVariant converted(const Variant& value, VARTYPE type, const Locale& locale) {
   const auto native = [](Variant same) { return native_from(same, ArrayStyle::of_variants); };
   switch (type) {
@@ -146,7 +147,7 @@ void WriteBack::store_typed() noexcept {
       *V_I4REF(variable_) = V_I4(&native);
       break;
     case VT_DECIMAL: {
-      // The first field of a decimal lies under the type of the variant that held it; the caller's own is unused.
+      // In a variant, the first field of a decimal holds the type; in the caller's decimal it is unused, so keep it.
       DECIMAL& place = *V_DECIMALREF(variable_);
       const auto reserved = place.wReserved;
       place = V_DECIMAL(&native);

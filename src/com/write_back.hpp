@@ -4,20 +4,20 @@
 
 namespace talutil::com {
 
-/// Where a variant argument's value lies: what its chain of references ends at. Two arguments with the same place are
-/// one variable of the caller's. A null pointer for a value that is passed as such.
+/// The address of a variant argument's value, at the end of its chain of references. Arguments with the same address
+/// are the same variable of the caller. Null for a value that is not passed by reference.
 [[nodiscard]] const void* variable_of(const VARIANT& argument) noexcept;
 
-/// A value on its way back to the caller's variable. All values are made before the first is stored, so that an error
-/// leaves every variable as it was.
+/// Writes a value back to the caller's variable. All values are converted before the first is stored, so that an error
+/// leaves every variable unchanged.
 class WriteBack {
  public:
-  /// The argument refers to a variable of its own type, which it keeps, or to a variant, which takes the value's type
-  /// unless it refers to a typed variable in its turn. Raises what the conversions of Variant raise, and 10 for an
-  /// array that is fixed or locked.
+  /// The argument refers either to a typed variable, which keeps its type, or to a variant, which takes the value's
+  /// type unless it in turn refers to a typed variable. Raises the errors of the conversions, and 10 for an array that
+  /// is fixed or locked.
   WriteBack(const VARIANT& argument, const Variant& value, const Locale& locale);
 
-  /// The same for a caller's variant by its address, as early-bound callers pass it.
+  /// The same for the address of a caller's variant, as early-bound callers pass it.
   WriteBack(VARIANT* variable, const Variant& value, const Locale& locale);
 
   void store() noexcept;
@@ -29,7 +29,7 @@ class WriteBack {
 
   VARIANT* variable_ = nullptr;
   OwnedVariant native_;
-  SystemTime* record_ = nullptr;  ///< The caller's, where it is a record that was written.
+  SystemTime* record_ = nullptr;  ///< The caller's record, if a record was written.
   SystemTime time_;
 };
 
