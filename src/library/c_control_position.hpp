@@ -10,8 +10,8 @@ namespace talutil {
 class Library;
 class ORVUtils;
 
-/// The second class that hosts create: one object for each control that a user may drag about a form.
-/// Positions and sizes are twips. The published names are kept as they are.
+/// The second class that hosts create: one object per control that a user may drag around a form. Positions and sizes
+/// are in twips. The published names are kept as they are.
 class cControlPosition {
  public:
   explicit cControlPosition(Library& library);
@@ -21,19 +21,19 @@ class cControlPosition {
 
   [[nodiscard]] Library& library() const noexcept { return library_; }
 
-  /// Moves a control after the mouse, no further than the inside of its form, and keeps its new place in left and Top.
-  /// Nothing happens where the mouse has not moved. A control or a container counts as a form or picture box, and
-  /// scales the distance, when it answers ScaleMode and ScaleX. Raises what the controls raise; 91 and 424 for what is
-  /// no object.
-  /// @param X, Y where the mouse is, by value, against DragStartX and DragStartY
+  /// Moves a control along with the mouse, but not beyond the inside of its form, and stores its new position in left
+  /// and Top. Does nothing if the position stays the same. A control or container that has ScaleMode and ScaleX is
+  /// treated as a form or picture box and scales the distance. Raises the controls' errors, and 91 and 424 for
+  /// arguments that are not objects.
+  /// @param X, Y the mouse position, passed by value; compared with DragStartX and DragStartY
   virtual void DragControl(const Variant& vForm, const Variant& oCtrl, float X, float Y);
 
-  /// Reads left, Top, Width and Height as they were saved under ControlName and ControlID; a number that is missing
-  /// is 0. Then, saved or not, a Top of 0 becomes DefaultTop and a left of 0 DefaultLeft. The control is not moved.
+  /// Reads left, Top, Width and Height as saved under ControlName and ControlID; a missing number is 0. Then, whether
+  /// or not anything was saved, a Top of 0 becomes DefaultTop and a left of 0 DefaultLeft. Does not move the control.
   /// Raises 6 for numbers beyond 32 bits.
   virtual void GetControlPosition();
 
-  /// Saves left, Top, Width and Height, each followed by a comma; nothing for an empty ControlName.
+  /// Saves left, Top, Width and Height, each followed by a comma; does nothing if ControlName is empty.
   virtual void SaveControlPosition();
 
   std::int32_t Height = 0;
@@ -53,10 +53,10 @@ class cControlPosition {
   [[nodiscard]] Text settings_item() const;
 
   Library& library_;
-  std::unique_ptr<ORVUtils> utils_;  ///< The settings are reached through a toolkit of the object's own.
+  std::unique_ptr<ORVUtils> utils_;  ///< A toolkit object, through which the settings are accessed.
 };
 
-/// The interface of cControlPosition, slot by slot.
+/// The interface of cControlPosition, in slot order.
 template <class P>
 constexpr auto members_of(std::type_identity<cControlPosition>) {
   using C = cControlPosition;

@@ -6,27 +6,27 @@
 
 namespace talutil {
 
-/// The controls without a window of their own that members drive. The hidden components window (`FrmComponents`) holds
-/// them; it is loaded when something first asks for one.
+/// The non-visual controls that members drive. They are on the hidden components window (`FrmComponents`), which is
+/// loaded on first use.
 class Components {
  public:
   virtual ~Components() = default;
 
-  /// Makes the window and its controls if there are none, and reads ComputerName. Raises what a control raises, after
-  /// which there is no window.
+  /// Creates the window and its controls if necessary, and reads ComputerName. Raises the controls' errors; there is no
+  /// window then.
   virtual void load() = 0;
 
-  /// Closes the window with its controls. One that is not loaded is loaded first, as hosts observe.
+  /// Closes the window and its controls. Loads the window first if necessary, as hosts can observe.
   virtual void unload() = 0;
 
-  /// A control by its name on the window. Raises 438 for a name that is not on it.
+  /// A control by its name on the window. Raises 438 for an unknown name.
   [[nodiscard]] virtual ObjectRef control(TextView name) = 0;
 
-  /// The table that exports fill, `Grid1`, the caller's until the reference ends. A host that is asked for a cell may
-  /// export another grid before it answers: that export gets another control of the same class.
+  /// Lends the table that exports fill (`Grid1`) until the reference is released. A host that is asked for a cell may
+  /// start another export meanwhile; that gets a separate control of the same class.
   [[nodiscard]] virtual ObjectRef borrow_scratch_grid() = 0;
 
-  /// The handle for dialogs to be owned by.
+  /// The window handle that owns dialogs.
   [[nodiscard]] virtual std::intptr_t owner_handle() = 0;
 };
 

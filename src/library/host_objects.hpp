@@ -2,16 +2,15 @@
 
 #include "automation/control.hpp"
 
-/// What kind of a thing a host's object is. Objects tell by the members that they answer for, which are looked up and
-/// not used.
+/// Recognises the kind of a host's object by the members it has, which are looked up but not used.
 namespace talutil {
 
-/// Forms and picture boxes have a scale of their own; other controls do not answer for one.
+/// Forms and picture boxes have a scale; other controls do not.
 [[nodiscard]] inline bool has_scale(const Control& object) {
   return object.answers(u"ScaleMode") && object.answers(u"ScaleX");
 }
 
-/// Forms of every kind have a window, one that holds other forms too, which has no scale.
+/// All forms have a window, including those that contain other forms, which have no scale.
 [[nodiscard]] inline bool has_window(const Control& object) { return object.answers(u"hwnd"); }
 
 }  // namespace talutil

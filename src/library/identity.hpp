@@ -2,8 +2,7 @@
 
 #include <string_view>
 
-/// The identifiers under which hosts know the library. They never change; a host that is bound early has them
-/// in its own program.
+/// The identifiers by which hosts know the library. They must never change: early-bound hosts have them compiled in.
 namespace talutil::identity {
 
 inline constexpr std::string_view library_name = "TALUtil";
@@ -30,7 +29,7 @@ struct Class {
   std::string_view program_id;
 };
 
-/// The classes that hosts create: the two of the type library, then the controls, which are bound late.
+/// The classes that hosts create: the two in the type library, followed by the late-bound controls.
 inline constexpr Class classes[] = {
     {orv_utils_class, "TALUtil.ORVUtils"}, {control_position_class, "TALUtil.cControlPosition"},
     {grid_class, "TALUtil.Grid"},          {common_dialog_class, "TALUtil.CommonDialog"},

@@ -25,7 +25,7 @@ std::string hexadecimal(std::int32_t value) {
   return "0x" + std::string(digits.data(), end.ptr);
 }
 
-/// The platform's own headers have records of these names, so those of the header for C++ clients have a prefix.
+/// The platform's headers define records of the same names, so the header for C++ clients adds a prefix.
 std::string record_name(std::string_view name, Dialect dialect) {
   return (dialect == Dialect::header ? "TALUtil_" : "") + std::string(name);
 }

@@ -6,9 +6,9 @@
 
 namespace talutil {
 
-/// The interface of ORVUtils, slot by slot: its order is the order of the vtable, and hosts that are bound
-/// early rely on it, so rows are never moved. Late binding, the vtable, the type library, the command's list,
-/// help and call, and the reference page all come from here.
+/// The interface of ORVUtils, in slot order. The order of rows is the order of the vtable, on which early-bound hosts
+/// rely, so rows must never be moved. Late binding, the vtable, the type library, the command's list, help and call,
+/// and the reference page are all generated from this table.
 template <class P>
 constexpr auto members_of(std::type_identity<ORVUtils>) {
   using S = SharedSettings;
@@ -309,7 +309,7 @@ constexpr auto members_of(std::type_identity<ORVUtils>) {
       P::template method<&U::StringReplaceWord>("StringReplaceWord", "Replaces every occurrence of a text by another.",
                                                 "sSource", "sChangeFrom", "sChangeTo"),
 
-      // Later additions: their slots follow the methods that hosts were already bound to.
+      // Added later: these slots follow the methods to which hosts were already bound.
       P::template property<&S::WriteServerPerformanceFile>("WriteServerPerformanceFile", "A switch kept for the host."),
       P::template property<&S::bIsAES>("bIsAES", "A switch kept for the host."),
       P::template property<&S::bPGMSMT>("bPGMSMT", "A switch kept for the host."),

@@ -12,7 +12,7 @@
 
 namespace talutil {
 
-/// What a library keeps beside its settings: a window, or what a member remembers from call to call.
+/// State of a library besides its settings: a window, or what a member remembers between calls.
 class LibraryPart {
  public:
   LibraryPart() = default;
@@ -20,11 +20,11 @@ class LibraryPart {
   LibraryPart& operator=(const LibraryPart&) = delete;
   virtual ~LibraryPart() = default;
 
-  /// Takes a window off the screen that no call waits for.
+  /// Closes a window that no call is waiting for.
   virtual void close_notice() {}
 };
 
-/// One loaded library: the shared settings, the platform, the components window and the parts that members add. The DLL
+/// A loaded library: the shared settings, the platform, the components window and the parts that members add. The DLL
 /// has exactly one.
 class Library {
  public:
@@ -33,8 +33,8 @@ class Library {
   Library& operator=(const Library&) = delete;
   ~Library();
 
-  /// The start-up routine, run once and before the first object is handed out: loads the components window,
-  /// which fills ComputerName, then reads the screen's twips per pixel (rounded, halves to even).
+  /// The start-up routine, run once before the first object is handed out: loads the components window, which fills in
+  /// ComputerName, then reads the screen's twips per pixel (rounded, halves to even).
   void start();
 
   [[nodiscard]] SharedSettings& settings() noexcept { return settings_; }
@@ -42,7 +42,7 @@ class Library {
   [[nodiscard]] Components& components() noexcept { return *components_; }
   [[nodiscard]] const ControlFactory& controls() const noexcept { return controls_; }
 
-  /// The part of a class, of which there is one: made, of the library or of nothing, when it is first asked for.
+  /// The only part of its class; created on first use, with the library as its argument if it takes one.
   template <class Part>
   [[nodiscard]] Part& part() {
     for (const auto& held : parts_) {
@@ -58,10 +58,10 @@ class Library {
     return result;
   }
 
-  /// Takes the windows off the screen that no call waits for.
+  /// Closes the windows that no call is waiting for.
   void close_notices();
 
-  /// The user's separators, with the current year of the clock.
+  /// The user's separators and the current year.
   [[nodiscard]] Locale locale() const;
 
  private:

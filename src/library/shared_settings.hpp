@@ -9,9 +9,8 @@
 
 namespace talutil {
 
-/// The settings that hosts push into the library. There is one block for each loaded library, whatever the
-/// number of objects; nothing but the host, and the members named here, ever changes it. The published names
-/// are kept as they are.
+/// The settings that hosts set in the library. There is one block per loaded library, regardless of the number of
+/// objects; only the host, and the members named here, ever change it. The published names are kept as they are.
 struct SharedSettings {
   Boolean AutomatedEndOfMonth;
   std::int32_t CounterGetCFG = 0;
@@ -36,7 +35,7 @@ struct SharedSettings {
   std::int16_t UserLevel = 0;
   Boolean bNewZealand;
   Text sDatabaseName;
-  Text ComputerName;  ///< Filled when the components window loads.
+  Text ComputerName;  ///< Set when the components window is loaded.
   Text sORVPath;
   Text sReportsDir;
   Text sGridPaperSize;
@@ -66,7 +65,7 @@ struct SharedSettings {
   Text sServerName;
   Text ORV3CFGName;
 
-  // Not published: twips per pixel of the screen, set by the start-up routine.
+  // Not published: the screen's twips per pixel, set by the start-up routine.
   std::int32_t ScreenTwipsPerPixelX = 0;
   std::int32_t ScreenTwipsPerPixelY = 0;
 };

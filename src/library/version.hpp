@@ -2,7 +2,7 @@
 
 namespace talutil {
 
-/// The version of the library, of the command and of the DLL's resource.
+/// The version of the library, the command and the DLL's resources.
 inline constexpr const char* version_text = "1.0.0";
 
 }  // namespace talutil
