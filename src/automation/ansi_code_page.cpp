@@ -10,8 +10,8 @@ namespace {
 
 constexpr std::uint8_t no_substitute = '?';
 
-/// The characters of bytes 0x80 to 0x9F. The five bytes that the code page leaves open stand for themselves;
-/// all bytes outside this block are Latin-1.
+/// The characters of bytes 0x80 to 0x9F. The five bytes that the code page leaves undefined map to themselves; all
+/// bytes outside this block are Latin-1.
 constexpr TextView upper_block =
     u"\u20AC\x0081\u201A\u0192\u201E\u2026\u2020\u2021\u02C6\u2030\u0160\u2039\u0152\x008D\u017D\x008F"
     u"\x0090\u2018\u2019\u201C\u201D\u2022\u2013\u2014\u02DC\u2122\u0161\u203A\u0153\x009D\u017E\u0178";
@@ -22,9 +22,9 @@ struct BestFit {
   TextView units;
 };
 
-/// What the platform substitutes for characters that code page 1252 does not hold, read from its own
-/// conversion: accents are dropped, frames become lines, some letters become those they resemble.
-/// The full-width forms U+FF01 to U+FF5E, which are ASCII at a distance, are not listed.
+/// The platform's substitutes for characters that code page 1252 lacks, read from its own conversion: accents are
+/// dropped, frames become lines, some letters become similar ones. The full-width forms U+FF01 to U+FF5E are not
+/// listed, because they map to ASCII at a fixed distance.
 // clang-format off
 constexpr BestFit best_fits[] = {
     {' ', u"\u2000\u2001\u2002\u2003\u2004\u2005\u2006\u3000"},
@@ -146,7 +146,7 @@ constexpr std::size_t substitute_count = [] {
   return count;
 }();
 
-/// Both lists above, by code unit.
+/// Both lists above, sorted by code unit.
 constexpr auto substitutes = [] {
   std::array<Substitute, substitute_count> result{};
   std::size_t next = 0;
@@ -198,8 +198,8 @@ std::string to_ansi(TextView text) {
 }
 
 void append_ansi(Text& text, std::string_view bytes) {
-  // By pieces that stay in the cache. Most have no byte whose character is elsewhere: those are widened at once. Two
-  // plain loops, which compilers turn into vector instructions.
+  // Processes pieces that fit in the cache. Most have no byte in the upper block and are simply widened. Two plain
+  // loops, which compilers can vectorise.
   std::array<char16_t, 4096> units;  // NOLINT(cppcoreguidelines-pro-type-member-init): filled before it is read.
   while (!bytes.empty()) {
     const std::string_view piece = bytes.substr(0, units.size());

@@ -4,8 +4,8 @@
 
 namespace talutil {
 
-/// Automation's Boolean: 16 bits, True is -1 and False 0. Hosts can store other bits, and some members ask
-/// for exactly True, so the bits are kept as they were given.
+/// Automation's Boolean: 16 bits, True is -1 and False 0. Hosts can store other bits, and some members check for
+/// exactly True, so the bits are kept as given.
 class Boolean {
  public:
   constexpr Boolean() noexcept = default;

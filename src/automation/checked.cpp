@@ -2,7 +2,7 @@
 
 namespace talutil {
 
-// Without the mathematics library's rounding functions: those obey a processor mode that hosts change.
+// Avoids the mathematics library's rounding functions, which depend on a processor mode that hosts change.
 template <std::signed_integral To>
 To round_to(double value) {
   using Limits = std::numeric_limits<To>;

@@ -8,7 +8,7 @@
 
 namespace talutil {
 
-/// Arithmetic on interface integers: every overflow is run-time error 6, never a wrapped number.
+/// Arithmetic on interface integers: every overflow raises 6; numbers never wrap.
 template <std::signed_integral T>
 [[nodiscard]] constexpr T checked_add(T a, T b) {
   T result{};
@@ -30,7 +30,7 @@ template <std::signed_integral T>
   return result;
 }
 
-/// A whole number as a 16- or 32-bit one; out of range is error 6.
+/// Converts a whole number to 16 or 32 bits; raises 6 if it is out of range.
 template <std::signed_integral To, std::integral From>
 [[nodiscard]] constexpr To checked_cast(From value) {
   To result{};
@@ -38,14 +38,14 @@ template <std::signed_integral To, std::integral From>
   return result;
 }
 
-/// A number rounded to the nearest whole one, halves to even; out of range, infinite or not a number is error 6.
+/// Rounds to the nearest whole number, halves to even; raises 6 if it is out of range, infinite or not a number.
 template <std::signed_integral To>
 [[nodiscard]] To round_to(double value);
 
 extern template std::int16_t round_to<std::int16_t>(double);
 extern template std::int32_t round_to<std::int32_t>(double);
 
-/// The longest text that members with a 16-bit loop index take; one character more is error 6.
+/// The longest text that members with a 16-bit loop index accept; a longer one raises 6.
 constexpr std::size_t longest_16_bit_length = 32767;
 
 constexpr void require_16_bit_length(std::size_t length) {

@@ -15,7 +15,7 @@ ObjectRef object_in(const Variant& holder) {
   return *object;
 }
 
-/// By way of invoke.
+/// Calls Object::invoke each time.
 class PlainRepeatedUse final : public RepeatedUse {
  public:
   PlainRepeatedUse(Object& object, std::int32_t member, Access access, std::span<const Variant> arguments)
@@ -59,7 +59,7 @@ Control::Control(ObjectRef object, const Locale& locale) : object_(std::move(obj
 }
 
 const Control::Known* Control::find_known(TextView member) const noexcept {
-  // A member uses few names, so that a search costs less than a hash.
+  // A member uses few names, so a linear search costs less than hashing.
   const auto known = std::ranges::find(known_, member, &Known::name);
   return known == known_.end() ? nullptr : &*known;
 }

@@ -10,16 +10,16 @@
 
 namespace talutil {
 
-/// A late-bound object as members use it: `grid.get<std::int32_t>(u"Rows")`, `grid.put(u"ColWidth", {c}, width)`.
-/// One read a statement: the host's control sees the order. Each name is looked up once for as long as the Control
-/// lives, which is that of a member's call; the reference to the object is kept as long.
+/// A late-bound object as members use it: `grid.get<std::int32_t>(u"Rows")`, `grid.put(u"ColWidth", {c}, width)`. Read
+/// one value per statement, because the host's control sees the order. Each name is looked up once in the lifetime of
+/// the Control, usually one call of a member, during which it also keeps a reference to the object.
 class Control {
  public:
-  /// Answers are converted by the locale. Raises 424 for a variant that holds no object, 91 for an empty reference.
+  /// Results are converted using the locale. Raises 424 if the variant holds no object, 91 for an empty reference.
   Control(const Variant& holder, const Locale& locale);
   Control(ObjectRef object, const Locale& locale);
 
-  /// A member that the object lacks raises 438, here and below.
+  /// Raises 438 if the object lacks the member, here and below.
   template <class T = Variant>
   [[nodiscard]] T get(TextView member, std::initializer_list<Variant> indexes = {}) const {
     return get<T>(identifier_of(member), indexes);
@@ -32,14 +32,14 @@ class Control {
   void put(std::int32_t member, Variant value) const;
   Variant call(TextView member, std::initializer_list<Variant> arguments = {}) const;
 
-  /// A get or a put that is made many times, with the numbers of its first indexes changing. The value of a put comes
-  /// last. The Control must outlive it.
+  /// A get or put that is repeated while its first numeric indexes change. The value of a put comes last. The Control
+  /// must outlive it.
   [[nodiscard]] std::unique_ptr<RepeatedUse> repeated_get(TextView member,
                                                           std::initializer_list<Variant> indexes) const;
   [[nodiscard]] std::unique_ptr<RepeatedUse> repeated_put(TextView member,
                                                           std::initializer_list<Variant> arguments) const;
 
-  /// Whether the object has a member; it is looked up, not used.
+  /// Whether the object has a member, which is looked up but not used.
   [[nodiscard]] bool answers(TextView member) const;
 
   [[nodiscard]] const ObjectRef& object() const noexcept { return object_; }

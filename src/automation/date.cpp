@@ -20,9 +20,9 @@ constexpr std::int32_t first_day = (chrono::sys_days(chrono::year{first_year} / 
 constexpr std::int32_t last_day = (chrono::sys_days(chrono::year{last_year} / 12 / 31) - day_zero).count();
 constexpr std::int32_t seconds_in_day = 24 * 60 * 60;
 
-/// A date to the second, in numbers that grow with time.
+/// A date to the second, in numbers that increase with time.
 struct DayAndSecond {
-  std::int32_t day;  ///< From day 0 on.
+  std::int32_t day;  ///< Relative to day 0.
   std::int32_t second;
 
   [[nodiscard]] std::int64_t seconds() const noexcept { return std::int64_t{day} * seconds_in_day + second; }
@@ -41,7 +41,7 @@ Date date_of(const DayAndSecond& count) noexcept {
   return {count.day < 0 ? count.day - time : count.day + time};
 }
 
-/// Raises 5 out of range.
+/// Raises 5 if out of range.
 Date date_of_seconds(std::int64_t seconds) {
   const std::int64_t second = (seconds % seconds_in_day + seconds_in_day) % seconds_in_day;
   const std::int64_t day = (seconds - second) / seconds_in_day;
@@ -51,10 +51,10 @@ Date date_of_seconds(std::int64_t seconds) {
 
 chrono::year_month_day calendar_of(std::int32_t day) noexcept { return day_zero + chrono::days{day}; }
 
-/// Months counted from the year 0 on.
+/// Months since the year 0.
 std::int64_t months_of(std::int64_t year, std::int64_t month) noexcept { return year * 12 + month - 1; }
 
-/// Raises 5 for a month that no date is near. Days and hours of 16 bits reach back a little less than 94 years.
+/// Raises 5 for a month far from any valid date. Days and hours of 16 bits reach back a little less than 94 years.
 chrono::year_month month_of(std::int64_t months) {
   if (months < 0 || months > months_of(last_year + 94, 12)) raise(ErrorNumber::invalid_procedure_call);
   const auto month = static_cast<unsigned>(months % 12);
@@ -85,7 +85,7 @@ constexpr std::int32_t seconds_of(DateInterval interval) noexcept {
   }
 }
 
-/// Which interval of its kind a date lies in, counted from a common start.
+/// The number of the interval that contains a date, from a common origin.
 std::int64_t place_of(DateInterval interval, Date date) {
   const DayAndSecond count = count_of(date);
   const chrono::year_month_day calendar = calendar_of(count.day);
@@ -99,7 +99,7 @@ std::int64_t place_of(DateInterval interval, Date date) {
 }  // namespace
 
 bool is_in_date_range(double days) noexcept {
-  // The last half second would round to the year 10000.
+  // The last half second would round up to the year 10000.
   return days > first_day - 1 && days < last_day + (seconds_in_day - 0.5) / seconds_in_day;
 }
 

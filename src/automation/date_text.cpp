@@ -10,7 +10,7 @@ namespace {
 constexpr TextView month_names[] = {u"January", u"February", u"March",     u"April",   u"May",      u"June",
                                     u"July",    u"August",   u"September", u"October", u"November", u"December"};
 
-/// The number of a month from its name or its first three letters; 0 for any other word.
+/// The number of a month from its name or the first three letters of that; 0 for any other word.
 std::int32_t month_number(TextView word) {
   if (equals_without_case(word, u"Sept")) return 9;
   const auto* const found = std::ranges::find_if(month_names, [word](TextView name) {
@@ -23,7 +23,7 @@ constexpr bool is_letter(char16_t unit) noexcept {
   return (unit >= u'A' && unit <= u'Z') || (unit >= u'a' && unit <= u'z');
 }
 
-/// Takes a text apart from the left. A copy marks a place to come back to.
+/// Consumes a text from the left. A copy saves a position to return to.
 class Reader {
  public:
   explicit Reader(TextView text) noexcept : rest_(text) {}
@@ -38,7 +38,7 @@ class Reader {
     return true;
   }
 
-  /// One of the given characters; 0 when none is next.
+  /// Takes one of the given characters; returns 0 if none is next.
   char16_t take_any(TextView wanted) noexcept {
     if (rest_.empty() || wanted.find(rest_.front()) == TextView::npos) return 0;
     const char16_t unit = rest_.front();
@@ -46,7 +46,7 @@ class Reader {
     return unit;
   }
 
-  /// A number of at most four digits. Longer ones stay where they are: no part of a date has them.
+  /// Takes a number of at most four digits. Longer ones are not taken, because they cannot be part of a date.
   std::optional<std::int32_t> take_number() noexcept {
     const Reader before = *this;
     const TextView digits = take_while(is_decimal_digit);
@@ -84,7 +84,7 @@ HalfOfDay read_half(Reader& reader) {
   return HalfOfDay::not_said;
 }
 
-/// ":" and a number, blanks around the colon allowed.
+/// Reads ":" and a number; blanks around the colon are allowed.
 std::optional<std::int32_t> read_sixtieths(Reader& reader) {
   const Reader before = reader;
   reader.skip_blanks();
@@ -96,8 +96,8 @@ std::optional<std::int32_t> read_sixtieths(Reader& reader) {
   return {};
 }
 
-/// "13:45", "1:45:30 PM" or "1 PM". Leaves the reader where it was when there is no such time; the ranges of
-/// hours, minutes and seconds are checked with the whole date.
+/// Reads "13:45", "1:45:30 PM" or "1 PM". Leaves the reader unchanged if there is no such time. The ranges of hours,
+/// minutes and seconds are checked later, with the whole date.
 bool read_time(Reader& reader, DateParts& parts) {
   const Reader before = reader;
   const auto hour = reader.take_number();
@@ -122,12 +122,12 @@ bool is_time_next(Reader reader) {
   return read_time(reader, ignored);
 }
 
-/// The parts of a date as they stand in the text.
+/// The parts of a date in the order of the text.
 struct Elements {
   std::array<std::int32_t, 3> numbers{};
   std::size_t number_count = 0;
-  std::int32_t month = 0;       ///< From a name; 0 when all parts are numbers.
-  std::size_t month_place = 0;  ///< How many numbers stand before the name.
+  std::int32_t month = 0;       ///< From a name; 0 if all parts are numbers.
+  std::size_t month_place = 0;  ///< The number of numbers before the name.
   bool has_comma = false;
   bool has_point = false;
 
@@ -146,7 +146,7 @@ bool read_element(Reader& reader, Elements& elements) {
   return elements.month != 0;
 }
 
-/// Reads two or three elements. Between them stands one mark, blanks around it allowed, or blanks alone.
+/// Reads two or three elements, separated by one mark (with optional blanks) or by blanks alone.
 bool read_elements(Reader& reader, Elements& elements) {
   if (!read_element(reader, elements)) return false;
   while (elements.count() < 3) {
@@ -172,9 +172,9 @@ struct Day {
 };
 
 constexpr std::int32_t longest_month = 31;
-constexpr std::int32_t first_full_year = 100;  ///< From here on a number is a year without guessing.
+constexpr std::int32_t first_full_year = 100;  ///< From here on, a number can only be a year.
 
-/// The readings of numbers alone, the preferred one first.
+/// The possible readings of a date that has only numbers, the preferred one first.
 std::array<Day, 2> readings_of_numbers(const Elements& elements, std::int32_t current_year) {
   const auto [a, b, c] = elements.numbers;
   if (elements.number_count == 3 && a > longest_month) return {{{c, b, a}, {b, c, a}}};
@@ -197,7 +197,7 @@ bool is_day(const Day& day) {
   return date_from_parts({.year = full_year(day.year), .month = day.month, .day = day.day}).has_value();
 }
 
-/// Leaves the reader behind the date, before any blanks.
+/// Leaves the reader after the date, before any blanks.
 bool read_date(Reader& reader, std::int32_t current_year, DateParts& parts) {
   Elements elements;
   if (!read_elements(reader, elements)) return false;
@@ -206,7 +206,7 @@ bool read_date(Reader& reader, std::int32_t current_year, DateParts& parts) {
     if (elements.month_place == 2) return false;
     chosen = reading_with_month(elements, current_year);
   } else {
-    // "5,3" and "5.3" are numbers; a full stop makes a date only with all three parts.
+    // "5,3" and "5.3" are numbers; full stops make a date only if it has all three parts.
     if (elements.has_comma || (elements.has_point && elements.number_count == 2)) return false;
     const auto readings = readings_of_numbers(elements, current_year);
     chosen = is_day(readings[0]) ? readings[0] : readings[1];
@@ -217,7 +217,7 @@ bool read_date(Reader& reader, std::int32_t current_year, DateParts& parts) {
   return is_day(chosen);
 }
 
-/// The last digits of a number, at least as many as asked for; with 1, all there are of a number below 100.
+/// Appends at least the given number of a number's last digits; with 1, all digits of a number below 100.
 void append_number(Text& text, std::int32_t number, std::size_t digits) {
   std::int32_t place = digits >= 3 ? 1000 : 10;
   if (digits == 1 && number < 10) place = 1;

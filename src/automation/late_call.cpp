@@ -58,7 +58,7 @@ ObjectRef convert(const Variant& value, const Locale& /*locale*/) {
 
 ObjectRef object_of_kind(const Variant& value, ObjectKind is_of_kind) {
   auto object = convert<ObjectRef>(value, {});
-  // Its members are looked up and not used, so that no separators count.
+  // Members are only looked up, so the locale does not matter.
   if (object != nullptr && !is_of_kind(Control(object, Locale{}))) raise(ErrorNumber::type_mismatch);
   return object;
 }
@@ -127,7 +127,7 @@ std::int32_t LateInterface::slot_of(std::int32_t identifier, Access access) cons
   const auto fits = [&](const Member& member) {
     return member.identifier == identifier && (member.access == Access::put) == (access == Access::put);
   };
-  // Identifiers count the slots, so the first guess is nearly always right.
+  // Identifiers are consecutive like the slots, so the first guess is nearly always right.
   const auto guess = static_cast<std::size_t>(static_cast<std::uint32_t>(identifier) -
                                               static_cast<std::uint32_t>(members.front().identifier));
   if (guess < members.size() && fits(members[guess])) return static_cast<std::int32_t>(guess);
@@ -143,8 +143,8 @@ Variant LateInterface::call(void* target, std::int32_t slot, std::span<Argument>
   const std::span<const Parameter> parameters = member.parameters();
   if (arguments.size() > parameters.size()) raise(ErrorNumber::wrong_argument_count);
 
-  // Only what may be left out can be: in the place of another parameter, a variable that stands for an argument of the
-  // caller's own which was left out is an error value like any other.
+  // Only an optional argument can be left out. For other parameters, a caller's variable that represents a left-out
+  // argument of its own is an error value like any other.
   const auto is_left_out = [&](std::size_t i) {
     if (i >= arguments.size()) return true;
     const auto* const error = arguments[i].value.get_if<ErrorValue>();
@@ -158,7 +158,7 @@ Variant LateInterface::call(void* target, std::int32_t slot, std::span<Argument>
   }
   if (is_complete) return function(target, arguments, locale);
 
-  // What is left out gets a place of its own, so that a default that a member writes to goes nowhere.
+  // An argument that was left out gets a variable of its own, so that writing back a default has no effect.
   std::array<Argument, most_parameters> all;
   for (std::size_t i = 0; i < parameters.size(); ++i) {
     if (is_given[i]) continue;

@@ -7,26 +7,26 @@
 
 #include "automation/member_table.hpp"
 
-/// Late binding: members called with variants, whatever the types of their signature.
+/// Late binding: calls members with variants, whatever the types of their signatures.
 namespace talutil {
 
-/// An argument of a late-bound call. A parameter that is written back changes `value` in place, and only if
-/// the member changed it, so that a caller's variable keeps its type otherwise.
+/// An argument of a late-bound call. If the parameter is written back, `value` is changed in place, but only if the
+/// member changed it, so that a caller's variable otherwise keeps its type.
 struct Argument {
   Argument() = default;
   Argument(Variant given) : value(std::move(given)) {}
 
   Variant value;
   bool is_changed = false;
-  /// The earlier argument that is the same variable of the caller's; -1 for none. A member that writes to a variant
-  /// through one parameter sees it through the other, as with any reference.
+  /// The index of an earlier argument that is the same variable of the caller; -1 if none is. A member that writes to a
+  /// variant through one parameter then sees the change through the other, as with any reference.
   std::int8_t same_variable_as = -1;
 };
 
-/// Calls one slot. The arguments are complete: defaults are filled in, the count is right.
+/// Calls one slot. The arguments are complete: their number is right and defaults are filled in.
 using LateCall = Variant (*)(void* target, std::span<Argument> arguments, const Locale& locale);
 
-/// Coerces a variant to a type of the interface. Raises what the conversions of Variant raise.
+/// Coerces a variant to a type of the interface. Raises the errors of Variant's conversions.
 template <class T>
 [[nodiscard]] T convert(const Variant& value, const Locale& locale);
 
@@ -45,28 +45,28 @@ Text convert(const Variant& value, const Locale& locale);
 template <>
 Variant convert(const Variant& value, const Locale& locale);
 
-/// Empty is an array that was never allocated. Raises 13 for anything but an array of texts.
+/// Empty converts to an array that was never allocated. Raises 13 for anything else that is not an array of texts.
 template <>
 TextArray convert(const Variant& value, const Locale& locale);
 
-/// An object, or an empty reference. Raises 13 for anything else; an object is never asked for its value.
+/// An object or an empty reference. Raises 13 for anything else; does not read an object's default value.
 template <>
 ObjectRef convert(const Variant& value, const Locale& locale);
 
-/// The same for a property that keeps objects of one kind only: raises 13 for an object of another.
+/// The same for a property that only stores objects of one kind: raises 13 for other objects.
 [[nodiscard]] ObjectRef object_of_kind(const Variant& value, ObjectKind is_of_kind);
 
-/// A record, or an object with the fields of one, read in their order. Raises 13 for anything else, 91 for an empty
+/// A record, or an object with the fields of one, which are read in order. Raises 13 for anything else, 91 for an empty
 /// reference and 438 for an object that lacks a field.
 template <>
 SystemTime convert(const Variant& value, const Locale& locale);
 
 namespace detail {
 
-/// Puts the fields that differ to an object that stands for a record; nothing for a record itself.
+/// Puts changed fields into an object that represents a record; does nothing for a real record.
 void put_changed_fields(const Variant& holder, const SystemTime& before, const SystemTime& after, const Locale& locale);
 
-/// One parameter during a call: the argument's own value where its type fits, else a converted copy.
+/// One parameter during a call: the argument's own value if its type fits, otherwise a converted copy.
 template <class A>
 class Cell {
  public:
@@ -90,12 +90,12 @@ class Cell {
     if constexpr (is_written_back) before_ = *used_;
   }
 
-  /// An object that stands for a record gets what the member wrote while errors can still be reported.
+  /// Writes changes to an object that represents a record while errors can still be reported.
   void give_back() {
     if constexpr (is_record) put_changed_fields(argument_->value, before_, *used_, *locale_);
   }
 
-  /// What the member wrote is kept however it ended.
+  /// Keeps what the member wrote, whether or not it succeeded.
   ~Cell() {
     if constexpr (is_written_back) {
       if (used_ == nullptr || *used_ == before_) return;
@@ -119,7 +119,7 @@ class Cell {
   [[no_unique_address]] std::conditional_t<is_written_back, T, Nothing> before_{};
 };
 
-/// The object that a member pointer applies to: the target itself, or the settings it shares.
+/// The object to which a member pointer applies: the target itself, or its shared settings.
 template <class Class, class Target>
 Class& part_of(Target& target) {
   if constexpr (std::is_base_of_v<Class, Target>)
@@ -128,7 +128,7 @@ Class& part_of(Target& target) {
     return target.settings();
 }
 
-/// Calls a member; records in objects get what it wrote, also if it fails.
+/// Calls a member; writes records back to objects even if it fails.
 template <class Use, class... A>
 Variant use_cells(const Use& use, Cell<A>&... cell) {
   if constexpr ((Cell<A>::is_record || ...)) {
@@ -194,7 +194,7 @@ Variant late_put(void* target, std::span<Argument> arguments, const Locale& loca
 
 }  // namespace detail
 
-/// The policy that makes the functions behind late binding, slot by slot.
+/// The policy that generates the functions behind late binding, slot by slot.
 template <class Target>
 struct LateCalls {
   template <auto M>
@@ -238,22 +238,22 @@ struct LateCalls {
   }
 };
 
-/// The members of a class for late binding, without the class: what a dispatcher needs.
+/// The late-bound members of a class without the class itself: what a dispatcher needs.
 struct LateInterface {
   std::span<const Member> members;
   std::span<const LateCall> calls;
-  std::int32_t (*find)(TextView name);  ///< The first slot of a name; -1 when there is none.
+  std::int32_t (*find)(TextView name);  ///< The first slot of a name; -1 if there is none.
 
-  /// The identifier of a name; empty for an unknown one, for which the second raises 438.
+  /// The identifier of a name. If it is unknown, the first returns nothing and the second raises 438.
   [[nodiscard]] std::optional<std::int32_t> find_identifier(TextView name) const;
   [[nodiscard]] std::int32_t identifier_of(TextView name) const;
 
-  /// The slot for an access of a member; -1 when the member has none. A call also reaches a property's get, and a get a
-  /// method, as for callers that are bound late.
+  /// The slot for an access of a member; -1 if it has none. A call also finds a property's get, and a get also finds a
+  /// method, because late-bound callers cannot tell them apart.
   [[nodiscard]] std::int32_t slot_of(std::int32_t identifier, Access access) const noexcept;
 
-  /// Calls a slot with the arguments as given: defaults stand in for those left out at the end or marked
-  /// missing. Raises 438 for slot -1, 450 for too many, 449 for a missing one that is not optional.
+  /// Calls a slot with the given arguments; defaults replace those left out at the end or marked as missing. Raises 438
+  /// for slot -1, 450 for too many arguments, 449 for a missing argument that is not optional.
   Variant call(void* target, std::int32_t slot, std::span<Argument> arguments, const Locale& locale) const;
 };
 

@@ -7,7 +7,8 @@ namespace talutil {
 
 namespace {
 
-/// Every `step`-th code unit from `first` to `last`; each is as far from its partner as `first` from `partner`.
+/// Every `step`-th code unit from `first` to `last`; the distance to each one's partner is that of `first` to
+/// `partner`.
 struct CaseRun {
   char16_t first;
   char16_t last;
@@ -15,8 +16,8 @@ struct CaseRun {
   std::uint8_t step;
 };
 
-/// The lower-case letters beyond ASCII and their upper-case partners, read from the platform's own table. It
-/// pairs code units one to one, so the same runs serve both directions.
+/// The lower-case letters beyond ASCII and their upper-case partners, read from the platform's table. It maps code
+/// units one to one, so the same runs serve both directions.
 // clang-format off
 constexpr CaseRun lower_runs[] = {
     {0x00E0, 0x00F6, 0x00C0, 1}, {0x00F8, 0x00FE, 0x00D8, 1}, {0x00FF, 0x00FF, 0x0178, 1},
@@ -87,7 +88,7 @@ constexpr auto upper_runs = [] {
   return result;
 }();
 
-/// The search looks at one run only, so no two may share a stretch, not even in alternating units.
+/// The search looks at a single run, so runs must not overlap, not even in alternating units.
 constexpr bool are_apart(const auto& runs) {
   return std::ranges::adjacent_find(runs, [](const CaseRun& a, const CaseRun& b) { return a.last >= b.first; }) ==
          std::ranges::end(runs);

@@ -20,11 +20,11 @@
 ///                      P::template method<&Thing::Move>("Move", "Moves it.", "X", optional("Y", 0)));
 ///     }
 ///
-/// A policy makes something of every row: Describe the names and types, LateCalls the functions behind late
-/// binding, the COM face its slots. A property is two slots, one for each access.
+/// A policy turns each row into something: Describe into names and types, LateCalls into the functions behind late
+/// binding, the COM layer into slots. A property has two slots, one per access.
 namespace talutil {
 
-/// The types of the interface. None is the result of a member that gives nothing.
+/// The types of the interface. None is the result of a member that returns nothing.
 enum class ValueType : std::uint8_t {
   none,
   boolean,
@@ -67,7 +67,7 @@ consteval ValueType value_type() {
     static_assert(!sizeof(T*), "not a type of the interface");
 }
 
-/// How an argument travels: `T`, `const T&` and `T&` of the C++ signature.
+/// How an argument is passed: `T`, `const T&` and `T&` in the C++ signature.
 enum class Passing : std::uint8_t { by_value, by_reference, written_back };
 
 template <class P>
@@ -78,11 +78,11 @@ consteval Passing passing() {
     return std::is_const_v<std::remove_reference_t<P>> ? Passing::by_reference : Passing::written_back;
 }
 
-/// What a property that keeps an object may ask of one that is put.
+/// The condition that a property may impose on the objects put into it.
 using ObjectKind = bool (*)(const Control& object);
 constexpr bool any_object(const Control& /*object*/) { return true; }
 
-/// What a row says of a parameter: its published name and, for one that callers may leave out, its default.
+/// A row's description of a parameter: its published name and, if it is optional, its default.
 struct ParameterName {
   constexpr ParameterName(const char* parameter) : name(parameter) {}
 
@@ -106,7 +106,7 @@ constexpr ParameterName optional(const char* name, const char* text) {
   return result;
 }
 
-/// The published name of a member and, where it must have a certain one, its dispatch identifier.
+/// The published name of a member and, if it must be a certain one, its dispatch identifier.
 struct MemberName {
   constexpr MemberName(const char* member) : name(member) {}
   constexpr MemberName(const char* member, std::int32_t id) : name(member), identifier(id) {}
@@ -123,13 +123,13 @@ struct Parameter {
   std::int32_t default_number = 0;
   std::string_view default_text;
 
-  /// The value of an optional parameter that a caller left out.
+  /// The value of an optional parameter that the caller left out.
   [[nodiscard]] Variant default_value() const;
 };
 
 constexpr std::size_t most_parameters = 9;
 
-/// One slot of an interface in words.
+/// The description of one slot of an interface.
 struct Member {
   std::string_view name;
   std::string_view help;
@@ -188,7 +188,7 @@ constexpr auto join(const std::array<T, N>&... parts) {
 template <auto M>
 using MemberTraits = detail::MemberPointer<decltype(M)>;
 
-/// The type that a property has in the interface: object references travel as variants.
+/// The type of a property in the interface: object references are passed as variants.
 template <auto M>
 using PropertyType = std::conditional_t<std::is_same_v<typename MemberTraits<M>::Result, ObjectRef>, Variant,
                                         typename MemberTraits<M>::Result>;
@@ -219,8 +219,8 @@ struct Describe {
     return {put_only<M>(name, help)[0], get_only<M>(name, help)[0]};
   }
 
-  /// A property with functions behind it, with or without indexes: G gives the value, S takes the value after the
-  /// indexes. Controls have them; interfaces do not.
+  /// A property implemented by functions, with or without indexes: G returns the value, S takes it after the indexes.
+  /// Used by controls, not by interfaces.
   template <auto G, auto S, class... Names>
   static constexpr std::array<Member, 2> accessors(MemberName name, const char* help, Names... names) {
     std::array<Member, 2> slots{method<G>(name, help, names...)[0], setter<S>(name, help, names...)[0]};
@@ -228,7 +228,7 @@ struct Describe {
     return slots;
   }
 
-  /// A property that can be put and not read, with or without indexes: S takes the value after them.
+  /// A write-only property, with or without indexes: S takes the value after them.
   template <auto S, class... Names>
   static constexpr std::array<Member, 1> setter(MemberName name, const char* help, Names... names) {
     std::array<Member, 1> slot = method<S>(name, help, names..., "value");
@@ -275,10 +275,10 @@ struct Describe {
 
 constexpr char fold_case(char c) noexcept { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; }
 
-/// Names of the interface are ASCII and compared without case.
+/// Compares names of the interface, which are ASCII, ignoring case.
 template <class Char>
 constexpr bool same_name(std::string_view name, std::basic_string_view<Char> other) noexcept {
-  // Lengths first, by hand: the check of a whole table compares every pair while compiling.
+  // Compare lengths first: checking a whole table compares every pair at compile time.
   if (name.size() != other.size()) return false;
   for (std::size_t i = 0; i < name.size(); ++i) {
     if (other[i] >= 0x80 || fold_case(name[i]) != fold_case(static_cast<char>(other[i]))) return false;
@@ -286,8 +286,8 @@ constexpr bool same_name(std::string_view name, std::basic_string_view<Char> oth
   return true;
 }
 
-/// Gives every member without an identifier one of its own, the same for all accesses of a name, and checks
-/// the table while compiling: no access of a name twice, optional parameters last.
+/// Assigns an identifier to every member without one, the same for all accesses of a name. Checks the table at compile
+/// time: no access of a name twice, optional parameters last.
 template <std::size_t N>
 consteval std::array<Member, N> numbered(std::array<Member, N> members, std::int32_t first_identifier) {
   for (std::size_t i = 0; i < N; ++i) {
@@ -310,7 +310,7 @@ consteval std::array<Member, N> numbered(std::array<Member, N> members, std::int
 template <class C>
 inline constexpr auto described = numbered(members_of<Describe>(std::type_identity<C>{}), 0x60030000);
 
-/// Finds members by name with one hash, so that a script's call costs no search through the table.
+/// Finds members by name with a single hash, so that a script's call does not search the table.
 template <std::size_t Slots>
 class NameIndex {
  public:
@@ -324,7 +324,7 @@ class NameIndex {
     }
   }
 
-  /// The index of the first slot of a name; -1 when there is none.
+  /// The index of the first slot of a name; -1 if there is none.
   template <class Char>
   [[nodiscard]] constexpr std::int32_t find(std::span<const Member> members,
                                             std::basic_string_view<Char> name) const noexcept {
@@ -335,7 +335,7 @@ class NameIndex {
   }
 
  private:
-  // FNV-1a over the folded names.
+  // FNV-1a of the case-folded name.
   template <class Char>
   static constexpr std::uint32_t hash(std::basic_string_view<Char> name) noexcept {
     std::uint32_t value = 2166136261U;

@@ -11,10 +11,10 @@ namespace talutil {
 
 namespace {
 
-/// A decimal number as it was written, exact: 0.DIGITS times ten to the power of `point`.
+/// An exact decimal number as written: 0.DIGITS times ten to the power of `point`.
 struct Decimal {
   bool is_negative = false;
-  std::string digits;  ///< Without leading zeros; none for 0.
+  std::string digits;  ///< Without leading zeros; empty for 0.
   std::int64_t point = 0;
 
   void append(char16_t digit, bool is_fraction) {
@@ -30,7 +30,7 @@ struct Decimal {
 constexpr bool is_letter(char16_t unit, char16_t upper) noexcept { return unit == upper || unit == upper + 32; }
 constexpr bool starts_exponent(char16_t unit) noexcept { return is_letter(unit, u'E') || is_letter(unit, u'D'); }
 
-/// No text is long enough to need an exponent of this size, and sums with it cannot overflow.
+/// No text is long enough to need a larger exponent, and sums with this one cannot overflow.
 constexpr std::int64_t largest_exponent = 1'000'000'000'000;
 
 constexpr std::int64_t append_to_exponent(std::int64_t exponent, char16_t digit) noexcept {
@@ -51,7 +51,7 @@ double to_double(const Decimal& decimal) {
   return decimal.is_negative ? -value : value;
 }
 
-/// The number times ten to the power of `places` as a whole one, halves to even.
+/// The number times ten to the power of `places` as a whole number, halves rounded to even.
 std::int64_t to_scaled_integer(const Decimal& decimal, int places) {
   constexpr std::int64_t most_digits = 19;
   const std::string& digits = decimal.digits;
@@ -73,12 +73,12 @@ std::int64_t to_scaled_integer(const Decimal& decimal, int places) {
   return static_cast<std::int64_t>(decimal.is_negative ? 0U - whole : whole);
 }
 
-/// What hosts skip between the characters of a number.
+/// Characters that hosts skip within a number.
 constexpr bool is_skipped_by_val(char16_t unit) noexcept {
   return unit == u' ' || unit == u'\t' || unit == u'\n' || unit == u'\r' || unit == 0x3000;
 }
 
-/// Looks at a text one character at a time, some of them unseen.
+/// Reads a text character by character, skipping some.
 class Reader {
  public:
   explicit Reader(TextView text, bool (*is_skipped)(char16_t) noexcept = nullptr) noexcept
@@ -119,7 +119,7 @@ constexpr int digit_value(char16_t unit) noexcept {
   return 16;
 }
 
-/// What follows "&" in a hexadecimal or octal number, as a number without a sign.
+/// The part of a hexadecimal or octal number after "&", as an unsigned number.
 std::optional<double> read_bits(Reader& reader) {
   int base = 0;
   if (is_letter(reader.peek(), u'H')) base = 16;
@@ -133,7 +133,7 @@ std::optional<double> read_bits(Reader& reader) {
   return value;
 }
 
-/// Reads an exponent, if one is complete. Otherwise the reader stops behind its letter and sign.
+/// Reads a complete exponent. If it is incomplete, the reader stops after its letter and sign.
 bool read_exponent(Reader& reader, Decimal& decimal) {
   reader.take();
   const bool is_negative = reader.take_if(u'-');
@@ -148,7 +148,7 @@ bool read_exponent(Reader& reader, Decimal& decimal) {
 template <class Bits>
 constexpr double highest_bits = static_cast<double>(std::numeric_limits<Bits>::max());
 
-/// The bits of a number without a sign read as a signed one, where they fit its width.
+/// Reinterprets the bits of an unsigned number as a signed one if they fit its width.
 template <std::signed_integral To>
 std::optional<To> as_signed(double bits) noexcept {
   using Bits = std::make_unsigned_t<To>;
@@ -164,8 +164,8 @@ double leading_bits(Reader& reader) {
   return bits;
 }
 
-/// Reads digits with at most one point. Thousands separators may stand anywhere behind a digit, as the
-/// platform has it; 0 for none. False when there is no digit.
+/// Reads digits with at most one decimal point. Thousands separators (0 for none) may be anywhere after the first
+/// digit, as on the platform. Returns false if there is no digit.
 bool read_digits(Reader& reader, char16_t point, char16_t thousands, Decimal& decimal) {
   bool has_digit = false;
   bool is_fraction = false;
@@ -183,7 +183,7 @@ bool read_digits(Reader& reader, char16_t point, char16_t thousands, Decimal& de
   }
 }
 
-/// The marks that may stand around a number, each of them once, on either side.
+/// The marks that may appear around a number, on either side, each at most once.
 class Marks {
  public:
   enum class Side : std::uint8_t { before, behind };
@@ -221,7 +221,7 @@ class Marks {
 
 struct Reading {
   Decimal decimal;
-  std::optional<double> bits;  ///< Of a hexadecimal or octal number, which has no decimal then.
+  std::optional<double> bits;  ///< Set for a hexadecimal or octal number, instead of the decimal.
 };
 
 std::optional<Reading> read_number(TextView text, const Locale& locale) {

@@ -11,7 +11,7 @@ namespace talutil {
 
 namespace {
 
-/// The significant digits of a fraction below 1 that is written without an exponent; 0 for other numbers.
+/// The number of significant digits of a fraction below 1 that is written without an exponent; 0 for other numbers.
 std::size_t digits_of_fraction(std::string_view number) noexcept {
   if (number.starts_with('-')) number.remove_prefix(1);
   return number.starts_with("0.") ? number.size() - number.find_first_of("123456789") : 0;
@@ -19,11 +19,11 @@ std::size_t digits_of_fraction(std::string_view number) noexcept {
 
 template <class Number>
 Text to_significant_digits(Number value, int digits, const Locale& locale) {
-  if (value == 0) return u"0";  // Without the sign of a negative zero.
+  if (value == 0) return u"0";  // Drops the sign of a negative zero.
   std::array<char, 32> buffer;
   char* const end = buffer.data() + buffer.size();
   auto written = std::to_chars(buffer.data(), end, value, std::chars_format::general, digits);
-  // Windows writes no more decimal places than it writes digits: 3.5 / 42 is 8.33333333333333E-02.
+  // Windows never writes more decimal places than digits: 3.5 / 42 is 8.33333333333333E-02.
   const std::string_view plain(buffer.data(), written.ptr);
   const std::size_t fraction_digits = digits_of_fraction(plain);
   if (fraction_digits > 0 && plain.size() - plain.find('.') - 1 > static_cast<std::size_t>(digits)) {
@@ -72,7 +72,7 @@ Text number_to_text(Currency value, const Locale& locale) {
 
 Currency number_to_currency(double value) {
   constexpr int mantissa_bits = 53;
-  constexpr double beyond = 1e15;  // A currency ends a little below it.
+  constexpr double beyond = 1e15;  // Currency ends slightly below this.
   if (!(std::abs(value) < beyond)) raise(ErrorNumber::overflow);
 
   // Exact: the number is mantissa times a power of two, and 10000 is 625 times 2 to the power of 4.

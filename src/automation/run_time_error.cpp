@@ -6,7 +6,7 @@
 namespace talutil {
 
 std::string_view standard_description(std::int32_t number) noexcept {
-  // A switch, so that the compiler asks for the text of every number that is added to the enumeration.
+  // A switch, so that the compiler demands a text for every number added to the enumeration.
   // clang-format off
   switch (static_cast<ErrorNumber>(number)) {
     case ErrorNumber::invalid_procedure_call: return "Invalid procedure call or argument";  // 5

@@ -12,8 +12,8 @@
 
 namespace talutil {
 
-/// The standard run-time errors that hosts know by number. The texts are those that hosts show.
-/// Some are only passed on: a third-party object may raise them by number alone, and the text comes from here.
+/// The standard run-time errors, whose numbers and texts hosts know. Some are never raised here, but third-party
+/// objects may raise them by number alone, and the text then comes from here.
 enum class ErrorNumber : std::int32_t {
   invalid_procedure_call = 5,
   overflow = 6,
@@ -58,8 +58,8 @@ enum class ErrorNumber : std::int32_t {
 /// The standard text of a number; the text of an unknown number is "Application-defined or object-defined error".
 [[nodiscard]] std::string_view standard_description(std::int32_t number) noexcept;
 
-/// Where an error comes from that another object raised, as that object reports it, and where to read about it: what a
-/// host sees as Err.Source, Err.HelpFile and Err.HelpContext. What the object does not say is empty.
+/// The origin of an error raised by another object, as that object reports it, and where to read about it: a host's
+/// Err.Source, Err.HelpFile and Err.HelpContext. Whatever the object does not report is empty.
 struct ErrorOrigin {
   Text source;
   Text help_file;
@@ -68,17 +68,17 @@ struct ErrorOrigin {
   friend bool operator==(const ErrorOrigin&, const ErrorOrigin&) = default;
 };
 
-/// The one exception of the library: what a host sees as Err.Number and Err.Description. Copies share their texts, so
-/// that handing one on needs no memory.
+/// The library's only exception: a host's Err.Number and Err.Description. Copies share their texts, so that copying
+/// needs no memory.
 class RunTimeError : public std::exception {
  public:
   explicit RunTimeError(ErrorNumber number);
 
-  /// With a description that says more than the standard one.
+  /// With a more specific description than the standard one.
   RunTimeError(ErrorNumber number, Text description)
       : RunTimeError(static_cast<std::int32_t>(number), std::move(description)) {}
 
-  /// Without an origin the error is the library's own.
+  /// Without an origin, the error is the library's own.
   RunTimeError(std::int32_t number, Text description, std::optional<ErrorOrigin> origin = {});
 
   [[nodiscard]] std::int32_t number() const noexcept { return contents_->number; }
@@ -102,10 +102,10 @@ class RunTimeError : public std::exception {
 
 [[noreturn]] void raise(ErrorNumber number);
 
-/// Error 7, made ahead: at the first call, which is that of the start-up, for when there is no memory to make it.
+/// Error 7, created by the first call (during start-up), because later there may not be enough memory to create it.
 [[nodiscard]] const RunTimeError& out_of_memory_error();
 
-/// The exception being handled as a run-time error: a failed allocation is 7, an exception of no kind we know 51.
+/// The exception being handled as a run-time error: a failed allocation is 7, an unknown exception 51.
 [[nodiscard]] RunTimeError current_error() noexcept;
 
 }  // namespace talutil

@@ -5,7 +5,7 @@
 
 namespace talutil {
 
-/// The platform's broken-down time, field for field as the type library publishes it.
+/// The platform's broken-down time, with the fields that the type library publishes.
 struct SystemTime {
   std::int16_t wYear = 0;
   std::int16_t wMonth = 0;
@@ -23,10 +23,10 @@ using FileTime = std::int64_t;
 
 constexpr FileTime file_time_second = 10'000'000;
 
-/// Empty for parts that name no time and for years outside 1601 to 30827. `wDayOfWeek` does not count.
+/// Returns nothing for invalid parts and for years outside 1601 to 30827. Ignores `wDayOfWeek`.
 [[nodiscard]] std::optional<FileTime> system_to_file_time(const SystemTime& time) noexcept;
 
-/// Empty for a negative time.
+/// Returns nothing for a negative time.
 [[nodiscard]] std::optional<SystemTime> file_to_system_time(FileTime time) noexcept;
 
 }  // namespace talutil

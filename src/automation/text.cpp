@@ -40,7 +40,7 @@ void append_utf16(Text& out, char32_t code) {
 struct Lead {
   std::size_t continuations;
   char32_t bits;
-  char32_t lowest;  ///< Anything below has a shorter form and is refused.
+  char32_t lowest;  ///< Anything lower has a shorter form and is rejected.
 };
 
 constexpr Lead lead_of(unsigned char byte) noexcept {
@@ -50,7 +50,7 @@ constexpr Lead lead_of(unsigned char byte) noexcept {
   return {0, replacement, 0};
 }
 
-/// Reads one code point at `at` and moves past it; past the bad byte alone where there is none.
+/// Reads one code point at `at` and moves past it, or past a single byte if that is invalid.
 char32_t next_code(std::string_view bytes, std::size_t& at) noexcept {
   const auto first = static_cast<unsigned char>(bytes[at++]);
   if (first < 0x80) return first;

@@ -27,7 +27,7 @@ T required(std::optional<T> value) {
   return *value;
 }
 
-/// Visits a variant, or what an object in it stands for.
+/// Visits a variant, or the default value of an object in it.
 template <class Visitor>
 decltype(auto) visit_value(const Variant& variant, const Visitor& visitor) {
   if (variant.is(Variant::Kind::object)) return variant.value().visit(visitor);
@@ -37,7 +37,7 @@ decltype(auto) visit_value(const Variant& variant, const Visitor& visitor) {
 template <class T>
 constexpr bool is_number = std::is_arithmetic_v<T>;
 
-/// The kinds that are numbers, as a double; the others are refused.
+/// Converts numeric kinds to a double; rejects others.
 struct ToDouble {
   double operator()(std::monostate) const noexcept { return 0; }
   double operator()(Boolean value) const noexcept { return value.bits(); }
@@ -101,7 +101,7 @@ const Text& TextArray::at(std::int32_t index) const {
 }
 
 Variant Variant::value() const {
-  // An object can be its own default member; no honest chain is this long.
+  // An object can be its own default member; no legitimate chain is this long.
   constexpr int deepest = 16;
   Variant current = *this;
   for (int depth = 0; current.is(Kind::object); ++depth) {
@@ -173,7 +173,7 @@ bool Variant::equals_text(TextView text, const Locale& locale) const {
 }
 
 std::partial_ordering compare(const Variant& a, const Variant& b) {
-  constexpr Locale any;  // No text is read as a number, and no number is written.
+  constexpr Locale any;  // Not used: no text is read as a number, and no number is written.
   const Variant left = a.value();
   const Variant right = b.value();
   if (left.is(Variant::Kind::null) || right.is(Variant::Kind::null)) return std::partial_ordering::unordered;
@@ -183,7 +183,7 @@ std::partial_ordering compare(const Variant& a, const Variant& b) {
   };
   if ((is_text[0] || is_text[1]) && empty_or_text(left) && empty_or_text(right))
     return left.to_text(any) <=> right.to_text(any);
-  // Asked for also beside a text, which it comes before: what is no number is refused.
+  // Converted even beside a text, which is always greater, so that an invalid value is rejected.
   const double numbers[] = {is_text[0] ? 1 : left.to_double(any), is_text[1] ? 1 : right.to_double(any)};
   if (is_text[0]) return std::partial_ordering::greater;
   if (is_text[1]) return std::partial_ordering::less;

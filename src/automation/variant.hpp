@@ -17,8 +17,8 @@
 
 namespace talutil {
 
-/// A one-dimensional array of texts with its lower bound. An array that was never allocated has no bounds,
-/// which is not the same as one with no elements.
+/// A one-dimensional array of texts with a lower bound. An array that was never allocated has no bounds, unlike one
+/// without elements.
 struct TextArray {
   std::vector<Text> items;
   std::int32_t lower_bound = 0;
@@ -27,7 +27,7 @@ struct TextArray {
   /// The highest index. Raises 9 for an unallocated array.
   [[nodiscard]] std::int32_t upper_bound() const;
 
-  /// The element at an index. Raises 9 outside the bounds.
+  /// The element at an index. Raises 9 if it is out of bounds.
   [[nodiscard]] const Text& at(std::int32_t index) const;
 
   friend bool operator==(const TextArray&, const TextArray&) = default;
@@ -37,22 +37,21 @@ struct Null {
   friend constexpr bool operator==(Null, Null) noexcept = default;
 };
 
-/// An error value; an argument that a caller left out is one too.
+/// An error value; also used for an argument that the caller left out.
 struct ErrorValue {
   std::int32_t code = 0;
   friend constexpr bool operator==(ErrorValue, ErrorValue) noexcept = default;
 };
 
-/// An array that is not one of texts. It can be carried, but nothing converts it.
+/// An array of other elements than texts. It can be passed on, but not converted.
 struct ForeignArray {
-  /// The platform's own copy, for when it is handed back; the same for copies of this value.
+  /// The platform's copy, to be passed back; shared by copies of this value.
   std::shared_ptr<const void> contents;
   friend bool operator==(const ForeignArray&, const ForeignArray&) noexcept = default;
 };
 
-/// The automation variant as a value. Conversions follow automation's rules: halves round to even, out of
-/// range is error 6, unconvertible 13, Null 94, an empty object reference 91. An object stands for the value
-/// of its default member.
+/// The automation variant as a value. Conversions follow automation's rules: halves round to even, out of range raises
+/// 6, unconvertible 13, Null 94, an empty object reference 91. An object stands for the value of its default member.
 class Variant {
  public:
   enum class Kind : std::uint8_t {
@@ -112,8 +111,8 @@ class Variant {
     return std::visit(std::forward<Visitor>(visitor), storage_);
   }
 
-  /// The value itself, or that of an object's default member (through several objects if need be). Raises 91
-  /// for an empty object reference and 438 for an object without a default member.
+  /// The value itself, or the value of an object's default member (through several objects if necessary). Raises 91 for
+  /// an empty object reference and 438 for an object without a default member.
   [[nodiscard]] Variant value() const;
 
   [[nodiscard]] Text to_text(const Locale& locale) const;
@@ -124,24 +123,24 @@ class Variant {
   [[nodiscard]] Currency to_currency(const Locale& locale) const;
   [[nodiscard]] Boolean to_boolean(const Locale& locale) const;
 
-  /// Text is read day first. Numbers are days.
+  /// Texts are read day first. Numbers are days.
   [[nodiscard]] Date to_date(const Locale& locale) const;
 
-  /// True for a date and for a text that reads as one; never for a number, Null or Empty.
+  /// True for a date and for a text that can be read as one; never for a number, Null or Empty.
   [[nodiscard]] bool is_date(const Locale& locale) const;
 
-  /// True for Null itself (an object answers for its default member).
+  /// True only for Null (for an object, if its default member is Null).
   [[nodiscard]] bool is_null() const;
 
-  /// Compares with a text, code by code, as hosts compare a variant with a text: every kind is converted to
-  /// text first, Empty equals the empty text, Null equals nothing. Raises 13 for an error value or an array.
+  /// Compares with a text, code by code, as hosts do: any other kind is converted to text first, Empty equals the empty
+  /// text, Null equals nothing. Raises 13 for an error value or an array.
   [[nodiscard]] bool equals_text(TextView text, const Locale& locale) const;
 
-  /// Compares with a number, as hosts compare a variant with one: a text counts as the number that it reads as
-  /// (raises 13 for one that reads as none), Empty as 0; Null equals nothing.
+  /// Compares with a number, as hosts do: a text is read as a number (raises 13 if it is not one), Empty is 0, Null
+  /// equals nothing.
   [[nodiscard]] bool equals_number(double number, const Locale& locale) const;
 
-  /// Same kind and same value; objects by identity.
+  /// Same kind and same value; objects are compared by identity.
   friend bool operator==(const Variant&, const Variant&) = default;
 
  private:
@@ -151,11 +150,11 @@ class Variant {
       storage_;
 };
 
-/// The error value that stands for an argument left out.
+/// The error value for an argument that was left out.
 inline constexpr ErrorValue missing_argument{static_cast<std::int32_t>(0x80020004U)};
 
-/// Compares two variants by automation's rules: numbers (dates and Booleans are numbers) by value, texts code by
-/// code, a number before any text; Empty is 0 beside a number and an empty text beside a text. Unordered when one is
+/// Compares two variants by automation's rules: numbers (including dates and Booleans) by value, texts code by code, a
+/// number is less than any text; Empty is 0 beside a number and an empty text beside a text. Unordered if either is
 /// Null. Raises 13 for an error value or an array.
 [[nodiscard]] std::partial_ordering compare(const Variant& a, const Variant& b);
 
