@@ -9,16 +9,16 @@ namespace {
 constexpr std::size_t block_length = 32;
 constexpr std::size_t code_unit_count = 0x10000;
 
-// Enough of them to make up for 64 KB of answers.
+// Enough to justify 64 KB of cached answers.
 constexpr std::uint32_t questions_before_keeping = 1024;
 
-/// ASCII, and as much of Latin-1 as the page has in its places: there the code is the unit itself.
+/// ASCII, and as much of Latin-1 as has the same codes on the page: for these the code is the unit itself.
 constexpr bool is_near(char16_t unit, char16_t latin_count) noexcept {
   return (unit < 0x80) | (static_cast<char16_t>(unit - 0xA0) < latin_count);
 }
 
-/// 1 for a character that may match: the wanted one, and one that is not near. Without a branch, since the
-/// letters around vary too much to be guessed, and for the compiler's vectors.
+/// 1 for a character that may match: the wanted one, and any that is not "near". Branch-free, because branches would be
+/// unpredictable, and so that the compiler can vectorise it.
 constexpr char16_t is_candidate(char16_t unit, char16_t wanted, char16_t latin_count) noexcept {
   return static_cast<char16_t>(int{unit == wanted} | int{!is_near(unit, latin_count)});
 }

@@ -7,11 +7,11 @@
 
 namespace talutil {
 
-/// Finds the characters that have the code of a wanted one in long texts.
+/// Finds the characters in long texts that have a wanted character's code.
 ///
-/// Nearly all text is ASCII, and Latin-1 where the code page has it: there a character can match only by being the
-/// wanted one, so such text is passed over in blocks. For the others the finder asks for their code; once it has asked
-/// often, it keeps the answers.
+/// Nearly all text is ASCII, or Latin-1 if the code page has it. There, only the wanted character itself can match, so
+/// such text is skipped in blocks. For other characters the finder queries the code page; after many queries it starts
+/// to cache the answers.
 class AnsiFinder {
  public:
   AnsiFinder(CodePage& page, char16_t wanted)
@@ -20,10 +20,10 @@ class AnsiFinder {
         near_wanted_(static_cast<char16_t>(code_)),
         latin_count_(page.latin_count()) {}
 
-  /// The index of the first character of the code at or after `from`; the text's size when there is none.
+  /// The index of the first character with the code at or after `from`; the text's size if there is none.
   [[nodiscard]] std::size_t find(TextView text, std::size_t from);
 
-  /// The index of the first character of another code at or after `from`; the text's size when there is none.
+  /// The index of the first character with another code at or after `from`; the text's size if there is none.
   [[nodiscard]] std::size_t find_other(TextView text, std::size_t from);
 
  private:
@@ -36,10 +36,10 @@ class AnsiFinder {
 
   CodePage& page_;
   std::uint32_t code_;
-  char16_t near_wanted_;  ///< The one near character that can match. A longer code is cut, and belongs to none.
+  char16_t near_wanted_;  ///< The one near character that can match. A longer code is truncated and matches none.
   char16_t latin_count_;
   std::uint32_t questions_ = 0;
-  std::vector<Answer> answers_;  ///< One for each code unit; empty at first.
+  std::vector<Answer> answers_;  ///< One per code unit; empty at first.
 };
 
 }  // namespace talutil

@@ -8,13 +8,13 @@ namespace talutil {
 
 namespace {
 
-/// The case styles of iCharactercase and iCharacterCaseSuburbs; all other values leave a text as it is.
+/// The case styles of iCharactercase and iCharacterCaseSuburbs; any other value leaves the text unchanged.
 constexpr std::int16_t style_none = 0;
 constexpr std::int16_t style_name = 1;
 constexpr std::int16_t style_lower = 2;
 constexpr std::int16_t style_upper = 3;
 
-/// By a converter of its own, which is gone when the caller goes on.
+/// Uses a converter of its own, which is released before this returns.
 Text in_name_case(const ORVUtils& utils, const Text& text) {
   const Control converter(utils.library().controls().create(NameCaseConverter::class_name), utils.locale());
   return converter.call(u"NameCase", {text}).to_text(converter.locale());

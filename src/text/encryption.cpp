@@ -6,10 +6,11 @@ namespace talutil {
 
 namespace {
 
-/// The same in every library, so that a cipher text of one installation is read by all others.
+/// The same in every installation, so that each can read the others' cipher texts.
 constexpr TextView pass_phrase = u"w4Tq%Lp2#Zr9!Kb7&Nt8*Hy3@Jm5^Xc1";
 
-// What the encryption control on the components window is given; a third-party one in its place knows these codes.
+// Arguments for the encryption control on the components window; a third-party control in its place uses the same
+// codes.
 constexpr std::int32_t key_bits = 256;
 constexpr std::int32_t key_derivation = 1;
 constexpr std::int32_t key_mode = 1;
@@ -18,7 +19,7 @@ constexpr std::int32_t algorithm = 9;
 constexpr std::int32_t encoded_text = 1;
 constexpr std::int32_t plain_text = 3;
 
-/// Puts a text through an operation of the control's key. All objects made on the way are gone afterwards.
+/// Applies an operation of the control's key to a text. All objects created for this are released before it returns.
 Text transform(const ORVUtils& utils, TextView operation, const Text& source, std::int32_t from, std::int32_t to) {
   const Locale locale = utils.locale();
   const Control crypto(utils.library().components().control(u"Crypto1"), locale);

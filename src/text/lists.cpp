@@ -12,7 +12,7 @@ namespace talutil {
 
 namespace {
 
-/// The characters from position `first` to position `last`, both counted from 1, as far as there are any.
+/// The characters from position `first` to position `last`, counted from 1, as far as they exist.
 TextView between(TextView text, std::int64_t first, std::int64_t last) noexcept {
   first = std::max<std::int64_t>(first, 1);
   last = std::min(last, static_cast<std::int64_t>(text.size()));
@@ -20,8 +20,8 @@ TextView between(TextView text, std::int64_t first, std::int64_t last) noexcept 
   return text.substr(static_cast<std::size_t>(first - 1), static_cast<std::size_t>(last - first + 1));
 }
 
-/// Calls `use` with each field that a delimiter closes, until it answers false; the text after the last
-/// delimiter is no field. A delimiter of other than one character closes nothing.
+/// Calls `use` with each field that ends with a delimiter, until it returns false; the text after the last delimiter is
+/// not a field. Only a delimiter of one character counts.
 template <class Use>
 void for_each_field(TextView list, TextView delimiter, Use use) {
   if (delimiter.size() != 1) return;
@@ -45,7 +45,7 @@ Text ORVUtils::GetData(const Text& sSrcStr, const std::int32_t& iSt, const std::
 
 std::int32_t ORVUtils::IndexInList(const TextArray& sFList, const Text& sText) {
   const std::int32_t last = sFList.upper_bound();
-  // From 0 whatever the lower bound is: an array that starts at 1 has always been an error here.
+  // Starts at 0 whatever the lower bound is: an array that starts at 1 has always been an error here.
   for (std::int32_t index = 0; index <= last; ++index) {
     if (equals_without_case(TextView(sFList.at(index)).substr(0, sText.size()), sText)) return index;
   }
@@ -57,7 +57,7 @@ std::int32_t ORVUtils::MyPos(const Text& s1, const Text& s2, const std::int32_t&
   std::int32_t count = 0;
   for (std::size_t at = 0; at < s2.size(); ++at) {
     if (can_match && s2[at] == s1.front()) ++count;
-    // Compared after every character, matched or not, so a count of 0 is met at the first.
+    // Compared after every character, matching or not, so a count of 0 is met at the first.
     if (count == iCount) return checked_cast<std::int32_t>(at + 1);
   }
   return 0;
@@ -71,7 +71,7 @@ std::int32_t ORVUtils::SubStrCount(const Text& sSubStr, const Text& sSrcStr) {
 std::int32_t ORVUtils::ReadCommaDelimStrToList(const Text& sTemp, TextArray& sFList, const Text& sDelimiter) {
   TextArray fields{.items = {}, .lower_bound = 0, .allocated = true};
   for_each_field(sTemp, sDelimiter, [&](TextView field) {
-    // A resize that keeps the contents cannot move the lower bound.
+    // A resize that preserves the contents cannot change the lower bound.
     if (sFList.allocated && sFList.lower_bound != 0) raise(ErrorNumber::subscript_out_of_range);
     fields.items.emplace_back(field);
     return true;
@@ -89,8 +89,8 @@ std::int16_t ORVUtils::StringPosition(const Text& sSource, const std::int16_t& i
   const std::int32_t blanks = SubStrCount(u" ", s);
   for (std::int32_t k = 1; k <= blanks; ++k) {
     const std::int32_t blank = MyPos(u" ", s, k);
-    // The window ends at the length less the blank's position, not at the length: addresses that hosts have
-    // stored were split that way.
+    // The window ends at the length minus the blank's position, not at the length, because hosts have stored addresses
+    // that were split that way.
     const TextView window = between(s, std::int64_t{blank} + 1, length - blank);
     if (std::ranges::none_of(window, is_digit)) return checked_cast<std::int16_t>(blank);
   }

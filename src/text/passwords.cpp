@@ -8,7 +8,7 @@ namespace talutil {
 
 namespace {
 
-/// The characters that draws stand for: letters, symbols, digits, and the rest of the hexadecimal digits.
+/// The characters to draw: letters, symbols, digits, and the remaining hexadecimal digits.
 constexpr TextView character_table =
     u"ABCDEFGHIJKLMNOPQRSTUVWXYZ"
     u"abcdefghijklmnopqrstuvwxyz"
@@ -19,14 +19,14 @@ constexpr TextView decimal_digits = u"0123456789";
 static_assert(character_table.size() == 99 && character_table[52] == u'`' && character_table[82] == u'\\' &&
               character_table[92] == u'9' && character_table[98] == u'F');
 
-/// A draw is a random number below 1, scaled and rounded with halves to even: both ends come up half as often as
-/// the numbers between them.
+/// A draw is a random number below 1, scaled and rounded with halves to even, so both ends are half as frequent as the
+/// numbers in between.
 struct Mix {
   TextView characters;
   float scale = 0;
   float offset = 0;
-  std::int32_t previous = 36;  ///< What the first draw may not be.
-  bool draws = true;           ///< Else its number stays 0.
+  std::int32_t previous = 36;  ///< The number that the first draw must not be.
+  bool draws = true;           ///< If false, the number stays 0.
 };
 
 /// Mix 2 with an iHex of neither 0 nor 1 draws nothing.
@@ -39,12 +39,12 @@ Mix mix_of(std::int16_t mix, std::int16_t hex) {
   return {};
 }
 
-/// Draws until the number differs from the one before, so that no two neighbours are the same draw.
+/// Draws until the number differs from the previous one.
 std::int32_t draw(const Mix& mix, std::int32_t previous, RandomSingles& random, MessagePump& messages) {
   messages.handle_waiting();
   if (!mix.draws) {
-    // A repeated number stays one for good: the member does not return. It sleeps between the host's messages, and
-    // gives up when the host is asked to.
+    // The number would be repeated forever, so the member does not return. It sleeps between the host's messages and
+    // gives up when the host is asked to quit.
     while (previous == 0) {
       if (!messages.wait_and_handle()) raise(ErrorNumber::user_interrupt);
     }
@@ -66,7 +66,7 @@ Text ORVUtils::GenerateFilePassword(const std::int16_t& iMaxLength, const std::i
   const Platform& platform = library().platform();
   const Mix mix = mix_of(iMix, iHex);
   RandomSingles random(platform.random_source);
-  // A host can change its variable while its messages are handled; the length is the one it called with.
+  // A host may change its variable while messages are handled; use the length that was passed.
   const std::int16_t length = mix.characters.empty() ? std::int16_t{0} : iMaxLength;
 
   Text result;

@@ -7,7 +7,7 @@
 
 namespace talutil {
 
-/// Uniform single-precision numbers x, 0 <= x < 1, in steps of 2^-24: all that a single distinguishes below 1.
+/// Uniform single-precision numbers x, 0 <= x < 1, in steps of 2^-24, the finest that a single resolves just below 1.
 class RandomSingles {
  public:
   /// Takes fresh bytes from the source.

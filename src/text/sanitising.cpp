@@ -11,9 +11,9 @@ namespace talutil {
 
 namespace {
 
-constexpr TextView drop_mark = u"$*$";  ///< Hosts mark lines that are not to be stored with it.
+constexpr TextView drop_mark = u"$*$";  ///< The hosts' mark for lines that are not to be stored.
 
-// How lines are compressed: lengths in characters, all of them exclusive.
+// Limits for compressing lines: lengths in characters, all exclusive.
 constexpr std::size_t most_lines = 3;
 constexpr std::size_t joinable_length = 40;
 constexpr std::size_t joined_length = 73;
@@ -23,20 +23,20 @@ struct Replacement {
   TextView to;
 };
 
-/// What would end a quoted database text, or is a separator of the hosts' own. The order matters: each step
-/// works on what the one before left.
+/// Characters that would end a quoted database text, or that hosts use as separators. The order matters: each step
+/// works on the result of the previous one.
 constexpr Replacement forbidden[] = {
     {u"&", u"and"}, {u"\"", u""}, {u"'", u"\u00B4"}, {u"\t", u""}, {u"#", u""}, {u">", u""}, {u"<", u""}, {u"?", u""},
 };
 
-/// Single passes, not repeated: four blanks leave as two, five as one. The line feeds are gone before these start, so
-/// the two rows with line breaks find nothing; they stand where hosts that override a member know them to be.
+/// Single passes, not repeated: four blanks end up as two, five as one. Line feeds have already been replaced, so the
+/// rows with line breaks find nothing; they are kept because hosts that override a member see these calls.
 constexpr Replacement memo_runs[] = {
     {u"  ", u" "},    {u"   ", u" "},     {u"    ", u" "},      {u"\r\n\r\n", u"\r\n"}, {u"\r\n\r\n\r\n", u"\r\n"},
     {u"\r\r", u"\r"}, {u"\r\r\r", u"\r"}, {u"\r\r\r\r", u"\r"},
 };
 
-/// A text without a line break is one line; a text that ends in one has a last, empty line.
+/// A text without a line break is one line; a text that ends with one has an empty last line.
 std::vector<TextView> split_lines(TextView text) {
   std::vector<TextView> lines;
   std::size_t start = 0;
@@ -58,7 +58,7 @@ Text drop_marked_lines(TextView text) {
   return result;
 }
 
-/// Takes line `last` with the one before it where the two are short enough, and empties that one.
+/// Joins line `last` with the one before it if both are short enough, and empties the latter.
 Text join_short_lines(std::vector<TextView>& lines, std::size_t last) {
   const TextView line = lines[last];
   if (last == 0 || line.size() >= joinable_length) return Text(line);
@@ -69,7 +69,7 @@ Text join_short_lines(std::vector<TextView>& lines, std::size_t last) {
   return joined;
 }
 
-/// Keeps the last three lines that hold anything, after joining short neighbours from the end on.
+/// Keeps the last three non-empty lines, after joining short neighbours, starting at the end.
 Text compress_lines(TextView text) {
   std::vector<TextView> lines = split_lines(text);
   for (TextView& line : lines) line = is_marked(line) ? TextView() : trim_blanks(line);
@@ -86,7 +86,7 @@ Text compress_lines(TextView text) {
   return result;
 }
 
-/// A value as text without the blanks around. A text, which can be long, is not copied once more.
+/// A value as text, trimmed. Avoids another copy of a text, which can be long.
 Text trimmed_text(Variant value, const Locale& locale) {
   Text* const held = value.get_if<Text>();
   Text text = held != nullptr ? std::move(*held) : value.to_text(locale);
@@ -94,7 +94,7 @@ Text trimmed_text(Variant value, const Locale& locale) {
   return trimmed.size() == text.size() ? text : Text(trimmed);
 }
 
-/// The cleaning that a field asks for on top.
+/// The additional cleaning that a field asks for.
 Text clean_extras(ORVUtils& utils, Text s, std::int16_t extras) {
   if (extras == 1 || extras == 3) s = utils.StringReplace(s, u",", u"");
   if (extras == 2 || extras == 3) s = utils.StringReplace(s, u" ", u"");
@@ -115,7 +115,7 @@ Text ORVUtils::VerifyTextData(const std::int16_t& iMaxTextLength, const std::int
   for (const Replacement& step : forbidden) s = StringReplace(s, Text(step.from), Text(step.to));
   s = clean_extras(*this, std::move(s), iExtras);
 
-  // May cut a line break or a join in half; fields have always been cut so.
+  // This may cut a line break or a joined line in half; fields have always been cut this way.
   if (iMaxTextLength > 0 && s.size() > static_cast<std::size_t>(iMaxTextLength)) {
     s.resize(static_cast<std::size_t>(iMaxTextLength));
   }

@@ -21,8 +21,8 @@ Text keep_if(TextView text, Predicate keep) {
   return kept;
 }
 
-/// For each prefix of a word, the length of the longest shorter prefix that it also ends with: how much of
-/// the word is still matched when the next character does not fit.
+/// For each prefix of a word, the length of its longest proper prefix that is also its suffix: how much of the word is
+/// still matched after a mismatch.
 std::vector<std::uint32_t> borders_of(TextView word) {
   std::vector<std::uint32_t> borders(word.size());
   std::uint32_t matched = 0;
@@ -34,7 +34,7 @@ std::vector<std::uint32_t> borders_of(TextView word) {
   return borders;
 }
 
-/// Goes back in the word, never in the text, so that repetitive texts take no longer than others.
+/// Only goes back in the word, never in the text, so that repetitive texts take no longer than others.
 Text replace_word(TextView text, TextView word, TextView replacement) {
   const std::vector<std::uint32_t> borders = borders_of(word);
   Text result;
@@ -42,7 +42,7 @@ Text replace_word(TextView text, TextView word, TextView replacement) {
   std::size_t copied = 0;
   std::size_t matched = 0;
   for (std::size_t at = 0; at < text.size(); ++at) {
-    // Where nothing is matched, on to the next possible start; to the last character where there is none.
+    // If nothing is matched, skips to the next possible start, or to the last character if there is none.
     if (matched == 0) at = std::min(text.find(word.front(), at), text.size() - 1);
     while (matched > 0 && text[at] != word[matched]) matched = borders[matched - 1];
     if (text[at] == word[matched]) ++matched;
@@ -60,7 +60,7 @@ Text replace_word(TextView text, TextView word, TextView replacement) {
 Text ORVUtils::StripNulls(const Text& s) { return Text(up_to_nul(s)); }
 
 Text ORVUtils::RemoveNumberFromString(const Text& sTemp) {
-  // A character that counts as a question mark, because the code page does not hold it, goes too.
+  // This also removes characters that count as question marks because the code page lacks them.
   return keep_if(sTemp, by_code(library_.platform().code_page, [](std::uint32_t code) { return code >= u'A'; }));
 }
 
@@ -74,7 +74,7 @@ Text ORVUtils::RemoveStringsFromNumber(const std::int16_t& iOption, const Text& 
       return keep_if(sTemp, by_code(page, [](std::uint32_t code) { return is_digit_code(code) || code == u' '; }));
     case 2:
       if (sCharacter.empty()) sCharacter.assign(1, u' ');
-      // One character is compared with the whole of sCharacter, so a longer one removes nothing.
+      // Each character is compared with all of sCharacter, so a longer one removes nothing.
       return keep_if(sTemp, [&](char16_t unit) { return TextView(&unit, 1) != sCharacter; });
     case 3:
       return keep_if(sTemp, by_code(page, [](std::uint32_t code) { return is_digit_code(code) || code == u'.'; }));
@@ -88,7 +88,7 @@ Text ORVUtils::StringReplace(const Text& sSrc, const Text& sChr, const Text& sRe
   if (sChr.empty()) raise(ErrorNumber::invalid_procedure_call);
   AnsiFinder finder(library_.platform().code_page, sChr.front());
   Text result;
-  // Room for some longer replacements, so that most texts need not be moved while they grow.
+  // Reserves room for some longer replacements, so that most texts are not moved as they grow.
   result.reserve(sSrc.size() + (sReplace.size() > 1 ? sSrc.size() / 8 : 0));
   for (std::size_t copied = 0; copied < sSrc.size();) {
     const std::size_t found = finder.find(sSrc, copied);
@@ -111,7 +111,7 @@ Text ORVUtils::StringRestoreCRLF(const Text& sSrc, const Text& sSourceCharacter)
     const bool is_last = at + 1 == sSrc.size();
     const bool is_marker = TextView(sSrc).substr(at, 1) == sSourceCharacter;
     if (is_marker) result += line_break;
-    // A marker at the very end has no second one to skip and stays behind the line break: hosts rely on it.
+    // A marker at the very end has no second character to skip and stays after the line break: hosts rely on it.
     if (is_marker && !is_last) {
       ++at;
     } else {

@@ -8,7 +8,7 @@ namespace talutil {
 
 namespace {
 
-/// `count` characters from the position on, counted from 1; fewer where the text ends.
+/// `count` characters from a position, counted from 1; fewer if the text ends.
 Text middle(const Text& text, std::int32_t position, std::size_t count = Text::npos) {
   const auto start = static_cast<std::size_t>(position - 1);
   return start < text.size() ? text.substr(start, count) : Text();
@@ -32,8 +32,8 @@ Boolean ORVUtils::IsValueDate(const Text& sText) {
   const std::int32_t p1 = MyPos(u"/", s, 1);
   const std::int32_t p2 = MyPos(u"/", s, 2);
   if (p1 < 2 || p1 > 3 || p2 < 4 || p2 > 6) return Boolean(false);
-  // Two characters of the month whatever the day's length, unless the second slash is the fourth character:
-  // "12/3/2024" takes "3/" and fails. Hosts have always refused it.
+  // Takes two characters of the month whatever the day's length, unless the second slash is the fourth character:
+  // "12/3/2024" yields "3/" and fails. Hosts have always rejected it.
   const std::size_t month_length = p2 == 4 ? 1 : 2;
   const Text day = middle(s, 1, static_cast<std::size_t>(p1 - 1));
   const Text month = middle(s, p1 + 1, month_length);
