@@ -13,14 +13,14 @@ constexpr TextView missing_date_text = u"01/01/1980";
 constexpr TextView missing_time_text = u"01:30";
 constexpr Date missing_date{29221};  ///< 1 January 1980.
 
-/// The parts of a date; nothing for a missing one.
+/// The parts of a date; nothing if it is missing.
 std::optional<DateParts> parts_if_given(const Variant& argument, const Locale& locale) {
   const Variant value = argument.value();
   if (is_missing_date(value, locale)) return {};
   return parts_of(value.to_date(locale));
 }
 
-/// The value of an argument that is never refused: what has none counts as Null.
+/// The value of an argument that is never rejected: if it has none, Null.
 Variant value_or_null(const Variant& argument) {
   try {
     return argument.value();
@@ -29,7 +29,7 @@ Variant value_or_null(const Variant& argument) {
   }
 }
 
-/// The date of a value; nothing for Null, Empty, numbers and all else that is no date.
+/// The date of a value; nothing for Null, Empty, numbers and anything else that is not a date.
 std::optional<Date> date_if_any(const Variant& value, const Locale& locale) {
   if (!value.is_date(locale)) return {};
   try {
@@ -44,10 +44,10 @@ bool is_text(const Variant& value, TextView text) {
   return held != nullptr && *held == text;
 }
 
-/// The text for a date that is not missing; empty for 1 January 1980 and before. Mode 3 has the current time for
-/// that day.
+/// The text for a date that is not missing; empty for 1 January 1980 and earlier, except that mode 3 returns the
+/// current time for that day.
 Text shown_date(std::int16_t mode, Date date, Clock& clock) {
-  // Compared as it is shown: what lies beyond the day, or beyond the minute in mode 2, does not count.
+  // Compared as displayed: without the time of day, or without seconds in mode 2.
   const bool shows_time = mode == 2;
   const Date first_shown = date_add(shows_time ? DateInterval::minute : DateInterval::day, 1, missing_date);
   if (std::is_gteq(compare_dates(date, first_shown))) {
@@ -88,7 +88,7 @@ Variant ORVUtils::SetDayOfMonth(const Variant& vDate, const std::int16_t& iDayNu
 Text ORVUtils::GetFinancialYearStr(const Variant& vDate) {
   const DateParts parts = parts_of(formatted_date(vDate, locale()));
   const std::int32_t first = parts.year % 100 - (parts.month < 7 ? 1 : 0);
-  // No wrap at the century: 99 is followed by 100, and before 00 comes -1, which has its two characters.
+  // Centuries do not wrap: 99 is followed by 100, and 00 is preceded by -1, which already has two characters.
   const auto two_characters = [](std::int32_t year) {
     const Text text = number_to_text(year);
     return text.size() == 1 ? u"0" + text : text;
@@ -99,7 +99,7 @@ Text ORVUtils::GetFinancialYearStr(const Variant& vDate) {
 Variant ORVUtils::VerifyNullTime(const std::int16_t& /*iFlag*/, const Variant& vTime) {
   settings().CounterVerifyTime = checked_add(settings().CounterVerifyTime, 1);
   const auto time = date_if_any(value_or_null(vTime), locale());
-  // A missing time gets the default in every mode, so the mode makes no difference.
+  // A missing time has the same default in every mode, so the mode makes no difference.
   return time ? format_date(*time, time_pattern) : Text(missing_time_text);
 }
 
@@ -112,7 +112,7 @@ Variant ORVUtils::VerifyNullDate(const std::int16_t& iFlag, Variant& vDate) {
   if (date) shown = shown_date(iFlag, *date, library().platform().clock);
   if (iFlag == 1 && shown.empty()) shown = missing_date_text;
   if (iFlag == 4 && !shown.empty()) shown = reformatted(shown, u"DDMMYYYY", locale());
-  // A date, not a text, for all that is missing, in every mode: hosts tell the two apart.
+  // A date rather than a text for anything missing, in every mode: hosts distinguish the two.
   if (!date || std::is_lteq(compare_dates(*date, missing_date))) return missing_date;
   return shown;
 }

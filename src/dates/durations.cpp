@@ -10,21 +10,21 @@ namespace talutil {
 
 namespace {
 
-// Durations are stored as dates that much later than this one.
+// A duration is stored as the date that is later than this by the duration.
 constexpr TextView epoch_text = u"1/1/1800 00:00";
 constexpr Date epoch{-36522};
 
 constexpr float default_hours = 1.5F;
 
-/// The text of a stored duration in full: of a date, day and time even where one of them is 0, with hours and
-/// minutes at the end.
+/// The full text of a stored duration. For a date it has both day and time, even if one of them is 0, and ends with
+/// hours and minutes.
 Text full_text(const Variant& value, const Locale& locale) {
   if (const auto* const date = value.get_if<Date>()) return format_date(*date, date_and_time_pattern);
   return value.to_text(locale);
 }
 
-/// The minutes of a stored duration. One of day 0 by its test text is a bare time of day, as durations were stored
-/// once: the argument is rewritten first.
+/// The minutes of a stored duration. If its test text is on day 0 it is a bare time of day, as durations used to be
+/// stored; the argument is then rewritten first.
 std::int32_t stored_minutes(Variant& argument, Variant value, TextView test_text, const Locale& locale) {
   constexpr TextView day_zero = u"30/12/1899";
   constexpr std::size_t time_length = 5;
@@ -35,7 +35,7 @@ std::int32_t stored_minutes(Variant& argument, Variant value, TextView test_text
   return date_difference(DateInterval::minute, epoch, value.to_date(locale));
 }
 
-/// Where the value is formatted to be tested, texts without a day are of day 0 too.
+/// For members that format the value before testing it, texts without a day are also on day 0.
 std::int32_t minutes_by_formatted_text(Variant& argument, const Locale& locale) {
   const Variant value = argument.value();
   const Text test_text = format_date(formatted_date(value, locale), date_and_time_pattern);
@@ -47,15 +47,15 @@ bool is_whole_number(TextView text) {
   return !text.empty() && std::ranges::all_of(text, is_decimal_digit);
 }
 
-/// "hours:minutes" as the members put it together: "1:30", "26:0", "0:-5". The minutes are read from the last two
-/// characters, so there are no more: "-1:-30" would lose its second sign.
+/// Whether a text is "hours:minutes" as members put it together: "1:30", "26:0", "0:-5". Only two characters are read
+/// as minutes, so "-1:-30" is not one: it would lose its second sign.
 bool is_hours_and_minutes(TextView text) {
   const std::size_t colon = text.find(u':');
   if (colon == TextView::npos || text.size() - colon > 3) return false;
   return is_whole_number(text.substr(0, colon)) && is_whole_number(text.substr(colon + 1));
 }
 
-/// The time of a duration as "HH:MM". Hours and minutes that are no time of day, from 24:0 on, stay as they are.
+/// The time of a duration as "HH:MM". Hours and minutes beyond a time of day (24:0 and more) are left unchanged.
 Text time_text(const Variant& duration, const Locale& locale) {
   const Variant value = duration.value();
   const auto* const text = value.get_if<Text>();
@@ -63,19 +63,19 @@ Text time_text(const Variant& duration, const Locale& locale) {
   return format_date(formatted_date(value, locale), time_pattern);
 }
 
-/// The number before the first colon; 0 where there is none. Raises 6 beyond 32 bits.
+/// The number before the first colon; 0 if there is none. Raises 6 beyond 32 bits.
 std::int32_t hours_of(ORVUtils& utils, const Text& time) {
   const std::int32_t colon = utils.MyPos(u":", time, 1);
   if (colon < 1) return 0;
   return round_to<std::int32_t>(leading_number(TextView(time).substr(0, static_cast<std::size_t>(colon - 1))));
 }
 
-/// The number that the last two characters are; with the colon among them it is 0.
+/// The number in the last two characters; 0 if they include the colon.
 std::int32_t last_minutes(TextView time) {
   return static_cast<std::int32_t>(leading_number(time.substr(time.size() - std::min<std::size_t>(time.size(), 2))));
 }
 
-/// "hours:minutes" as decimal hours: only quarters of an hour count. None at all is an hour and a half.
+/// Decimal hours of "hours:minutes": only quarters of an hour count. Zero becomes an hour and a half.
 float decimal_hours(ORVUtils& utils, const Text& time) {
   auto hours = static_cast<float>(hours_of(utils, time));
   const std::int32_t minutes = last_minutes(time);
@@ -101,7 +101,7 @@ float ORVUtils::ConvertDurationToNumber(const Variant& vT) {
     const Text text = StringReplace(vT.to_text(locale()), u"-", u"0");
     return decimal_hours(*this, format_date(formatted_date(text, locale()), time_pattern));
   } catch (...) {
-    // What is no time has no hours: 0, without the default.
+    // If it is not a time, the result is 0, not the default.
     return 0;
   }
 }
@@ -113,7 +113,7 @@ Variant ORVUtils::DurToTime(Text& sDuration) {
   Text hours = sDuration.substr(0, static_cast<std::size_t>(point - 1));
   Text minutes = sDuration.substr(static_cast<std::size_t>(point));
   if (trim_blanks(hours).empty()) hours = u"0";
-  // Quarters of an hour, each written one way. Any other fraction has always been taken for minutes.
+  // Quarters of an hour, each in one spelling. Any other fraction has always been taken as minutes.
   constexpr TextView quarters[][2] = {{u"5", u"30"}, {u"25", u"15"}, {u"75", u"45"}};
   for (const auto& [fraction, in_minutes] : quarters) {
     if (minutes == fraction) {
@@ -126,7 +126,7 @@ Variant ORVUtils::DurToTime(Text& sDuration) {
 
 Text ORVUtils::ConvertDatabaseDurationToNumber(Variant& vDuration) {
   float hours = decimal_hours(*this, hours_and_minutes_text(minutes_by_formatted_text(vDuration, locale())));
-  // More than a day has never been a job: it counts as an hour.
+  // No job has ever taken more than a day: it counts as an hour.
   if (hours > 24) hours = 1;
   return number_to_text(hours, locale());
 }

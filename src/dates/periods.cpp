@@ -8,9 +8,9 @@ namespace talutil {
 
 namespace {
 
-/// The boundaries of an interval between the days of two dates, whichever is the earlier; `when_equal` for the same
-/// day and -1 for an empty date. Raises 6 for 31 December 9999 and another day: the numbers are those of a walk up to
-/// the day after the later one.
+/// The number of interval boundaries between the days of two dates, in either order; `when_equal` for the same day and
+/// -1 for an empty date. Raises 6 for 31 December 9999 and a different day, because the count is defined as a walk to
+/// the day after the later date.
 std::int32_t distance(DateInterval interval, const Variant& start, const Variant& end, std::int32_t when_equal,
                       const Locale& locale) {
   const Variant start_value = start.value();
@@ -31,7 +31,7 @@ std::int32_t ORVUtils::GetDaysInPeriod(const Variant& vStartDate, const Variant&
 }
 
 std::int32_t ORVUtils::GetMonthsInPeriod(const Variant& vStartDate, const Variant& vEndDate) {
-  // Equal dates are not walked, so not even their own month is counted.
+  // The walk does not start for equal dates, so not even their own month is counted.
   return distance(DateInterval::month, vStartDate, vEndDate, -1, locale());
 }
 
@@ -48,7 +48,7 @@ Variant ORVUtils::GetTimeDifference(Variant& vStDate, Variant& vEnDate, Variant&
   const Date start = rewrite(vStDate, date_pattern);
   const Date end = rewrite(vEnDate, date_pattern);
   std::int32_t hours = 0;
-  // Compared as texts, day first: 01/02/2024 does not come after 31/01/2024.
+  // Compared as texts, day first: 01/02/2024 does not sort after 31/01/2024.
   if (*vEnDate.get_if<Text>() > *vStDate.get_if<Text>()) {
     hours = date_difference(DateInterval::hour, day_of(start), day_of(end));
   }

@@ -9,7 +9,7 @@ namespace talutil {
 
 namespace {
 
-/// A day on the calendar of the stepping members: any year of 16 bits, months as long as GetDaysThisMonth says.
+/// A day in the calendar of the stepping members: any 16-bit year, with the month lengths of GetDaysThisMonth.
 struct CalendarDay {
   std::int32_t day;
   std::int16_t month;
@@ -21,13 +21,12 @@ CalendarDay calendar_day(const Variant& date, const Locale& locale) {
   return {parts.day, static_cast<std::int16_t>(parts.month), static_cast<std::int16_t>(parts.year)};
 }
 
-/// A year of two digits comes out as the one that the reading of texts takes it for, and a year beyond 9999 with
-/// the text as it was put together.
+/// A two-digit year is expanded as in any text; with a year beyond 9999 the text stays as it was put together.
 Variant date_text(const CalendarDay& date, const Locale& locale) {
   return reformatted(short_date_text(date.day, date.month, date.year), date_pattern, locale);
 }
 
-/// 16-bit counts are negated in 16 bits.
+/// 16-bit counts are negated in 16 bits, which may overflow.
 std::int32_t steps_of(std::int16_t count) { return count < 0 ? checked_subtract<std::int16_t>(0, count) : count; }
 
 void to_next_month(CalendarDay& date) {
@@ -44,8 +43,8 @@ void to_last_month(CalendarDay& date) {
   date.year = checked_subtract<std::int16_t>(date.year, 1);
 }
 
-/// Where a walk of that many days leads, taken a month at a time. Months whose length is never asked for before
-/// day `unasked` are at least that long.
+/// Walks forward by a number of days, a month at a time. Months have at least `unasked` days, as if their length were
+/// queried only after that day.
 void walk_forward(ORVUtils& utils, CalendarDay& date, std::int32_t steps, std::int32_t unasked) {
   while (steps > 0) {
     const std::int32_t last = std::max<std::int32_t>(utils.GetDaysThisMonth(date.month, date.year), unasked);
@@ -103,14 +102,14 @@ Variant ORVUtils::IncDay(const Variant& vSrcDate, const std::int16_t& iNum) {
 }
 
 Variant ORVUtils::IncWeek(const Variant& vSrcDate, const std::int16_t& iNum) {
-  // Going forward, the length of a month is asked for only beyond day 28.
+  // Going forward, a month's length is queried only after day 28.
   return step_days(*this, vSrcDate, checked_multiply<std::int16_t>(iNum, 7), 28);
 }
 
 Variant ORVUtils::IncMonth(const Variant& vSrcDate, const std::int16_t& iNum) {
   CalendarDay date = calendar_day(vSrcDate, locale());
   const std::int32_t steps = iNum < 0 ? -steps_of(iNum) : iNum;
-  // The year 0 is a year like others here; the months before it count on downwards.
+  // The year 0 is a year like any other here, and months before it continue downwards.
   const std::int32_t months = date.year * 12 + date.month - 1 + steps;
   const std::int32_t month = (months % 12 + 12) % 12;
   date.month = static_cast<std::int16_t>(month + 1);
@@ -133,7 +132,7 @@ Variant ORVUtils::GetNextDate(const Variant& vStartDate, const Variant& vStep, c
   for (const auto& [word, step] : step_words) {
     if (wanted.equals_text(word, locale())) date = (this->*step)(vStartDate, count);
   }
-  // Empty, for a word that is none of these, formats as day 0.
+  // Empty, the result for an unknown word, is formatted as day 0.
   if (const auto* const text = date.get_if<Text>()) return reformatted(*text, date_pattern, locale());
   return format_date(formatted_date(date, locale()), date_pattern);
 }

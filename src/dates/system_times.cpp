@@ -5,9 +5,9 @@ namespace talutil {
 
 namespace {
 
-/// Turns a date into a point in time, moves it, and turns it back. A step that the platform refuses leaves what
-/// was there before it, and the next goes on with that: a time before 1601 becomes the start of that year moved, or
-/// stays as it is where that lies before the start.
+/// Converts a date to a point in time, moves it, and converts it back. A step that the platform rejects leaves the
+/// previous value, with which the next step continues: a time before 1601 becomes the start of that year, moved, or
+/// stays as it is if the result is before that start.
 Date moved(ORVUtils& utils, Date date, void (TimeConversions::*move)(FileTime from, FileTime& to)) {
   TimeConversions& conversions = utils.library().platform().time_conversions;
   SystemTime time;

@@ -12,14 +12,14 @@ namespace {
 
 constexpr std::int32_t days_in_week = 7;
 
-/// "DD/MM/" of a day of the year, in a common or a leap year.
+/// "DD/MM/" for a day of the year, in a common or a leap year.
 Text day_and_month(std::int32_t day_of_year, bool is_leap_calendar) {
   const std::int32_t year = is_leap_calendar ? 2000 : 2001;
   return format_date(date_from_serial(year, 1, day_of_year, 0), u"DD/MM/");
 }
 
-/// The layout of the tables comes from today's year, not from the one they are filled for: the calendar object
-/// that hosts used to provide never heard of that year.
+/// The layout of the tables depends on the current year, not on the year they are for: the calendar object that hosts
+/// used to supply did not know the latter.
 bool is_leap_calendar(Library& library) { return is_leap_year(parts_of(library.platform().clock.now()).year); }
 
 }  // namespace
@@ -38,7 +38,7 @@ void WeekTables::fill_ends(std::int16_t year, bool is_leap_calendar) {
   for (std::int32_t week = 1; week < last_week; ++week) {
     ends_[static_cast<std::size_t>(week - 1)] = day_and_month(week * days_in_week, is_leap_calendar) + year_text;
   }
-  // The last week takes what is left of the year: eight or nine days.
+  // The last week takes the rest of the year: eight or nine days.
   ends_[last_week - 1] = u"31/12/" + year_text;
 }
 
@@ -57,7 +57,7 @@ Variant ORVUtils::WeekYearToDate(std::int16_t& iWeek, const std::int16_t& iYear,
   tables.fill_starts(iYear, is_leap);
   tables.fill_ends(iYear, is_leap);
   if (iDay == 0) {
-    // The start of the week after the one asked for, unlike mode 1.
+    // The start of the following week, unlike mode 1.
     const Date new_year = Variant(u"1/1/" + number_to_text(std::int32_t{iYear})).to_date(locale());
     return IncDay(new_year, static_cast<std::int16_t>(iWeek * days_in_week));
   }
@@ -71,7 +71,7 @@ Boolean ORVUtils::GetWeekInDateRange(const Variant& vFromDate, const Variant& vT
   const Date week = WeekYearToDate(iWeek, iYear, 0).to_date(locale());
   const Date from = vFromDate.to_date(locale());
   const Date to = vToDate.to_date(locale());
-  // Joined by "or": the answer is False only when the range runs backwards around the date.
+  // Combined with "or": False only if the range runs backwards around the date.
   return Boolean(std::is_lteq(compare_dates(from, week)) || std::is_gteq(compare_dates(to, week)));
 }
 
