@@ -17,7 +17,7 @@ namespace {
 
 using archives::Progress;
 
-/// A bar on the terminal, gone when the work is done.
+/// A progress bar on the terminal, which disappears when the work is done.
 class ProgressBar {
  public:
   explicit ProgressBar(const char* word) : word_(word), is_shown_(isatty(STDERR_FILENO) != 0) {}
@@ -53,7 +53,7 @@ class ProgressBar {
 
 Text text_of(const std::string& word) { return utf8_text(word, word); }
 
-/// The words of the command line as a list of items: each in quotes, so that blanks in it mean nothing.
+/// Converts command-line words to a list of items; each is quoted so that blanks have no meaning.
 Text item_list(const std::vector<std::string>& words) {
   Text list;
   for (const std::string& word : words) {
@@ -71,7 +71,7 @@ Text read_password(const std::string& file) {
   return utf8_text(bytes, file);
 }
 
-/// A new password, typed twice.
+/// Asks for a new password twice.
 Text ask_new_password(InputBoxes& boxes) {
   const auto first = boxes.ask(u"New password:", {}, Entry::masked);
   const auto second = first ? boxes.ask(u"Once more:", {}, Entry::masked) : std::nullopt;
@@ -87,7 +87,7 @@ archives::PasswordQuestion question(InputBoxes& boxes) {
   };
 }
 
-/// Does the work of a subcommand; a failure is reported with the archive's name and the code that hosts expect.
+/// Does the work of a subcommand; reports a failure with the archive's name and the code that hosts know.
 template <class Work>
 void on_archive(const std::string& archive, Work work) {
   try {

@@ -11,7 +11,7 @@ namespace talutil::cli {
 
 namespace {
 
-/// A written form: "@null" stands alone, "@int:" is followed by a text of its own.
+/// A written form: "@null" is complete, "@int:" is followed by more text.
 struct WrittenForm {
   std::string_view opening;
   std::string_view example;
@@ -83,7 +83,7 @@ TypeWords type_words(ValueType type) noexcept {
   }
 }
 
-/// The value as the parameter's type. Raises what the conversion raises.
+/// Converts a value to the parameter's type. Raises the errors of the conversion.
 Variant converted(ValueType type, const Variant& value, const Locale& locale) {
   switch (type) {
     case ValueType::boolean:

@@ -10,7 +10,7 @@ namespace talutil::cli {
 
 namespace {
 
-/// A value as people read it: texts as they are, arrays with their texts in quotes.
+/// A value for people to read: texts as they are, arrays with their texts in quotes.
 std::string plain(const Variant& value, const Locale& locale) {
   switch (value.kind()) {
     case Variant::Kind::empty:

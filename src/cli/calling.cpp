@@ -66,7 +66,7 @@ Variant call_slot(Session& session, const Member& member, const std::vector<std:
     const Locale locale = session.locale();
     for (std::size_t i = 0; i < typed.size(); ++i) {
       const Parameter& parameter = member.parameters()[i];
-      // A setting has one value, and its name says all.
+      // A setting has only one value, so its name is enough.
       const std::string place = member.access == Access::put ? name : name + ": " + std::string(parameter.name);
       arguments.emplace_back(within(place, [&] { return argument_for(parameter, typed[i], locale); }));
     }

@@ -17,16 +17,16 @@ namespace talutil::cli {
 
 namespace {
 
-/// A column of the file, its steps, and what became of it.
+/// A column of the file, its steps, and statistics.
 struct Column {
   std::string name;
   std::vector<PlanStep> steps;
   std::size_t changed = 0;
-  Text before;  ///< The first field that was changed, and what it became.
+  Text before;  ///< The first field that changed, and the result.
   Text after;
 };
 
-/// The columns in the file's order. Each needs exactly one line in the plan, so that nothing passes uncleaned.
+/// The columns in file order. Each must have exactly one line in the plan, so that none is left uncleaned.
 std::vector<Column> match_columns(const std::vector<std::string>& header, std::vector<PlanColumn> plan,
                                   const std::string& plan_path, CodePage& page) {
   std::vector<Column> columns;
@@ -71,7 +71,7 @@ std::string insert_opening(const std::string& table, const std::vector<Column>& 
   return opening + ") VALUES ";
 }
 
-/// Every value is quoted, numbers too: a number may have the user's decimal comma.
+/// Quotes every value, even numbers, because a number may have the user's decimal comma.
 void append_value(std::string& sql, std::size_t index, const std::string& value) {
   sql += index == 0 ? "(" : ", ";
   sql += in_quotes(value, '\'');
@@ -111,7 +111,7 @@ Totals clean_rows(CsvReader& reader, const std::string& opening, std::vector<Col
   return totals;
 }
 
-/// A text short enough for a line, with its control characters shown.
+/// An excerpt of a text that fits on a line, with control characters made visible.
 std::string sample(TextView text) {
   constexpr std::size_t longest = 34;
   const bool is_cut = text.size() > longest;

@@ -30,7 +30,7 @@ Text Cleaner::run(const PlanStep& step, const Text& value) {
 }
 
 Text Cleaner::run_list(const PlanStep& step, Text value) {
-  // An open list is closed first: the reader drops what stands after the last comma.
+  // Close an open list first, because the reader drops the text after the last comma.
   if (!value.empty() && value.back() != u',') value += u',';
   std::array<Argument, 2> arguments{Variant(std::move(value)), Variant()};
   session_.call(list_reader_, arguments);

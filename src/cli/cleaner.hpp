@@ -5,12 +5,12 @@
 
 namespace talutil::cli {
 
-/// Sends values through the members of a plan.
+/// Passes values through the members of a plan.
 class Cleaner {
  public:
   explicit Cleaner(Session& session);
 
-  /// A value after all steps of its column. A run-time error fails with the member and the value.
+  /// A value after all steps of its column. A run-time error fails with the names of the member and the value.
   [[nodiscard]] Text clean(const std::vector<PlanStep>& steps, Text value);
 
  private:

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-/// The subcommands. Each prints to standard output and ends with Failure when it cannot do its work.
+/// The subcommands. Each prints to standard output and throws Failure if it cannot do its work.
 namespace talutil::cli {
 
 struct ListOptions {
@@ -21,7 +21,7 @@ void reference();
 struct CallOptions {
   std::string member;
   std::vector<std::string> arguments;
-  std::vector<std::string> settings;  ///< NAME=VALUE, put in this order before the call.
+  std::vector<std::string> settings;  ///< NAME=VALUE, put in order before the call.
   std::optional<std::uint32_t> code_page;
   bool json = false;
 };
@@ -30,15 +30,15 @@ void call(const CallOptions& options);
 struct CleanOptions {
   std::string csv;
   std::string plan;
-  std::string output;                      ///< Empty for the CSV file's name with .sql.
-  std::vector<std::string> settings;       ///< NAME=VALUE, put in this order before the first row.
-  std::string table;                       ///< Empty for the CSV file's name without folder and extension.
-  std::optional<std::uint32_t> code_page;  ///< That of the files too.
+  std::string output;                      ///< If empty, the CSV file's name with .sql.
+  std::vector<std::string> settings;       ///< NAME=VALUE, put in order before the first row.
+  std::string table;                       ///< If empty, the CSV file's name without folder and extension.
+  std::optional<std::uint32_t> code_page;  ///< Also used for the files.
 };
 void clean(const CleanOptions& options);
 
 struct SecretOptions {
-  bool exact = false;  ///< The text is taken or printed to the byte, without a line break more or less.
+  bool exact = false;  ///< The text is read or printed exactly, without removing or adding a line break.
 };
 void encrypt(const SecretOptions& options);
 void decrypt(const SecretOptions& options);
@@ -50,7 +50,7 @@ struct PasswordOptions {
 };
 void password(const PasswordOptions& options);
 
-/// Where settings are: a profile file, or a group of the user's store.
+/// The location of settings: a profile file, or a group of the user's store.
 struct ConfigOptions {
   std::string file;
   std::string group = "user";
@@ -59,7 +59,7 @@ struct ConfigOptions {
   std::string section;
   std::string item;
   std::string value;
-  std::string profile;  ///< What export writes and import reads.
+  std::string profile;  ///< The file that export writes and import reads.
   bool force = false;
 };
 void config_get(const ConfigOptions& options);
@@ -71,12 +71,12 @@ void config_import(const ConfigOptions& options);
 struct ZipOptions {
   std::string archive;
   std::vector<std::string> items;
-  std::string password_file;  ///< "-" is standard input; empty for none.
+  std::string password_file;  ///< "-" for standard input; empty for none.
   bool encrypt = false;       ///< Asks for the password at the terminal.
   bool aes = false;
   bool no_folders = false;
   std::int32_t level = 6;
-  std::uint64_t volume_size = 0;  ///< 0 for one archive.
+  std::uint64_t volume_size = 0;  ///< 0 for a single archive.
   std::string comment;
   bool test = false;
 };
@@ -94,7 +94,7 @@ struct UnzipOptions {
 void unzip(const UnzipOptions& options);
 
 struct ExportOptions {
-  std::string table;                ///< A file of comma text; its first line is row 0.
+  std::string table;                ///< A comma-separated file; its first line is row 0.
   std::vector<std::string> hidden;  ///< Columns, counted from 1.
   std::string rows;                 ///< "3-7" or "3"; empty for all.
   std::string output;
@@ -106,18 +106,18 @@ struct ReportOptions {
   std::string title;
   std::string paper = "A4";
   bool landscape = false;
-  std::string pdf;  ///< Empty for the file's name with .pdf.
+  std::string pdf;  ///< If empty, the file's name with .pdf.
 };
 void report(const ReportOptions& options);
 
 struct SystemOptions {
   bool json = false;
-  std::string item;  ///< A file or folder that details are wanted of; empty for none.
+  std::string item;  ///< A file or folder to show details of; empty for none.
 };
 void system_information(const SystemOptions& options);
 
 struct LogTailOptions {
-  std::string path;  ///< The event log, or the folder it is in.
+  std::string path;  ///< The event log, or its folder.
   std::int64_t lines = 10;
   bool follow = false;
 };

@@ -16,7 +16,7 @@ namespace {
 
 using Setting = posix::PosixSettingsStore::Setting;
 
-/// A session with the database and the user that the options name.
+/// A session with the database and user given by the options.
 class ConfigSession {
  public:
   explicit ConfigSession(const ConfigOptions& options) : options_(options) {
@@ -26,7 +26,7 @@ class ConfigSession {
 
   [[nodiscard]] static Text text(const std::string& typed, const std::string& what) { return utf8_text(typed, what); }
 
-  /// The application name of the group that is asked for.
+  /// The application name of the requested group.
   [[nodiscard]] Text group() {
     const SharedSettings& settings = session_.settings();
     if (options_.group == "previous") return Text(settings_groups::previous_database);
@@ -116,7 +116,7 @@ void config_set(const ConfigOptions& options) {
               << ": an empty value, and one that begins with a backslash, is read as a "
               << "missing one\n";
   }
-  // The platform does not report a file that cannot be written: reading it back shows.
+  // The platform does not report a file that cannot be written, so read the value back.
   ProfileDocument expected("");
   expected.put(section, item, from_ansi(to_ansi(written)));
   const Text read = session.platform().profiles.value(file, section, item);
@@ -155,7 +155,7 @@ void config_export(const ConfigOptions& options) {
 void config_import(const ConfigOptions& options) {
   ConfigSession session(options);
   const Text group = session.user_group();
-  // All of the file is understood before anything is written.
+  // Reads the whole file before writing anything.
   std::vector<Setting> settings = within(options.profile, [&] { return settings_in(options.profile); });
   within(options.profile, [&] {
     for (Setting& each : settings) {

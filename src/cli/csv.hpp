@@ -6,18 +6,18 @@
 
 namespace talutil::cli {
 
-/// Reads comma-separated values row by row: a field may stand in double quotes and then hold commas, line
-/// breaks and, doubled, quotes. Rows end with a line feed, with or without a carriage return. Any byte is
-/// data, NUL too. Without copying: the bytes must outlive the reader.
+/// Reads comma-separated values row by row: a field may be in double quotes and then contain commas, line breaks and
+/// doubled quotes. Rows end with a line feed, with or without a carriage return. Any byte is data, even NUL. Does not
+/// copy: the bytes must outlive the reader.
 class CsvReader {
  public:
   explicit CsvReader(std::string_view bytes) noexcept : bytes_(bytes) {}
 
-  /// The next row; false at the end. Fails with the number of the line for a quote that is never closed and
-  /// for text after a closing quote.
+  /// Reads the next row; returns false at the end. Fails with the line number for an unclosed quote and for text after
+  /// a closing quote.
   bool read(std::vector<std::string>& row);
 
-  /// The line of the file, from 1, that the row read last begins on.
+  /// The line of the file, from 1, on which the most recently read row begins.
   [[nodiscard]] std::size_t line() const noexcept { return row_line_; }
 
  private:

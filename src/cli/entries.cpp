@@ -9,7 +9,7 @@ namespace talutil::cli {
 
 namespace {
 
-/// How many letters must be typed, left out or changed to make one name of the other, whatever their case.
+/// The number of letters to insert, remove or change to turn one name into the other, ignoring case.
 std::size_t edit_distance(std::string_view a, std::string_view b) {
   std::vector<std::size_t> row(b.size() + 1);
   std::iota(row.begin(), row.end(), std::size_t{0});
@@ -30,7 +30,7 @@ bool contains_without_case(std::string_view text, std::string_view part) {
   return std::search(text.begin(), text.end(), part.begin(), part.end(), same) != text.end();
 }
 
-/// The names that someone who typed this may have meant, the likeliest first.
+/// The names that were probably meant, the most likely first.
 std::vector<std::string_view> nearest_names(std::span<const Member> members, std::string_view typed) {
   constexpr std::size_t most_names = 4;
   constexpr std::size_t shortest_part = 3;
@@ -39,7 +39,7 @@ std::vector<std::string_view> nearest_names(std::span<const Member> members, std
   for (const Entry& entry : entries_of(members)) {
     const std::string_view name = entry.any().name;
     std::size_t distance = edit_distance(typed, name);
-    // A part of a name counts as near, after every real slip.
+    // Part of a name also counts as near, but after every real typing error.
     const bool is_part = typed.size() >= shortest_part && contains_without_case(name, typed);
     if (distance > most_edits && !is_part) continue;
     if (distance > most_edits) distance += typed.size();

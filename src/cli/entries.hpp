@@ -9,13 +9,13 @@
 
 namespace talutil::cli {
 
-/// A member with all its slots: a property has one for each access.
+/// A member with all its slots: a property has one per access.
 struct Entry {
   const Member* get = nullptr;
   const Member* put = nullptr;
   const Member* call = nullptr;
 
-  /// What name, help and type are taken from.
+  /// The slot that supplies name, help and type.
   [[nodiscard]] const Member& any() const noexcept { return call != nullptr ? *call : get != nullptr ? *get : *put; }
   [[nodiscard]] bool is_method() const noexcept { return call != nullptr; }
 
@@ -28,19 +28,19 @@ struct Entry {
 /// The members in the order of their first slots.
 [[nodiscard]] std::vector<Entry> entries_of(std::span<const Member> members);
 
-/// The member of a name, compared without case. An unknown one fails as wrong usage, with the nearest names.
+/// Finds a member by name, ignoring case. An unknown name is a usage error that lists the nearest names.
 [[nodiscard]] Entry find_entry(std::span<const Member> members, std::string_view name);
 
 /// A type as hosts declare it.
 [[nodiscard]] std::string_view type_name(ValueType type) noexcept;
 
-/// "get put", "get", "put" or "call".
+/// One of "get put", "get", "put" and "call".
 [[nodiscard]] std::string access_words(const Entry& entry);
 
-/// "GetData(sSrcStr As String, iSt As Long, iEn As Long) As String". ByRef marks what is written back.
+/// For example "GetData(sSrcStr As String, iSt As Long, iEn As Long) As String". ByRef marks what is written back.
 [[nodiscard]] std::string signature(const Entry& entry);
 
-/// The default of an optional parameter as one writes it in a program; empty for any other.
+/// The default of an optional parameter as written in a program; otherwise empty.
 [[nodiscard]] std::string default_words(const Parameter& parameter);
 
 }  // namespace talutil::cli

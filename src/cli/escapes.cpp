@@ -10,8 +10,8 @@ constexpr TextView hexadecimal_digits = u"0123456789ABCDEF";
 
 constexpr bool is_surrogate(char16_t unit) noexcept { return unit >= 0xD800 && unit <= 0xDFFF; }
 
-/// What a profile file gives a meaning, or takes away at the ends of names and values. Pairs of surrogates are written
-/// as two: that is longer, and right.
+/// Whether a character survives in a profile file: it must have no special meaning there and not be trimmed at either
+/// end. Surrogate pairs are escaped as two units: longer, but correct.
 bool comes_back(TextView text, std::size_t at) {
   constexpr TextView at_the_ends = u" \"'[;";
   const char16_t unit = text[at];

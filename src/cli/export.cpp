@@ -12,7 +12,7 @@ namespace talutil::cli {
 
 namespace {
 
-/// A whole number that is all of a word.
+/// A word as a whole number.
 std::int32_t number_of(std::string_view word, const std::string& option) {
   std::int32_t number = -1;
   const auto [end, status] = std::from_chars(word.data(), word.data() + word.size(), number);
@@ -33,7 +33,7 @@ void hide_columns(Grid& grid, const ExportOptions& options) {
   }
 }
 
-/// Selects "3-7" or "3".
+/// Selects rows, given as "3-7" or "3".
 void select_rows(Grid& grid, const ExportOptions& options) {
   const std::size_t dash = options.rows.find('-');
   const std::int32_t first = number_of(options.rows.substr(0, dash), "--rows");
@@ -46,7 +46,7 @@ void select_rows(Grid& grid, const ExportOptions& options) {
   grid.put_RowSel(last);
 }
 
-/// Does some work on a file; a run-time error is reported with the file's name.
+/// Does some work on a file; reports a run-time error with the file's name.
 template <class Work>
 void on_file(const std::string& path, Work work) {
   try {

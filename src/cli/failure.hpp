@@ -11,7 +11,7 @@ namespace talutil::cli {
 constexpr int run_time_status = 1;
 constexpr int usage_status = 2;
 
-/// Ends the command with a message (without the program's name in front) and an exit status.
+/// Ends the command with a message (without the program's name) and an exit status.
 class Failure : public std::runtime_error {
  public:
   Failure(int status, const std::string& message) : std::runtime_error(message), status_(status) {}
@@ -24,12 +24,12 @@ class Failure : public std::runtime_error {
 inline Failure usage_failure(const std::string& message) { return {usage_status, message}; }
 inline Failure run_time_failure(const std::string& message) { return {run_time_status, message}; }
 
-/// "error 5: Invalid procedure call or argument".
+/// For example "error 5: Invalid procedure call or argument".
 inline std::string error_words(const RunTimeError& error) {
   return "error " + std::to_string(error.number()) + ": " + error.what();
 }
 
-/// Does some work; where it fails, the message begins with the place: a file, a line, a member.
+/// Does some work; if it fails, the message is prefixed with the place: a file, a line, a member.
 template <class Work>
 auto within(const std::string& place, Work work) {
   try {

@@ -21,7 +21,7 @@ std::string read_bytes(const std::string& path) {
   try {
     return all_of(file);
   } catch (const std::ios_base::failure& error) {
-    // A folder opens but does not read.
+    // A folder can be opened but not read.
     throw failed(error.code().message());
   }
 }

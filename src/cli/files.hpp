@@ -7,14 +7,13 @@
 
 namespace talutil::cli {
 
-/// The bytes of a file, or of standard input for "-". A file that cannot be read fails with what the system
-/// says of it.
+/// The bytes of a file, or of standard input for "-". Fails with the system's message if it cannot be read.
 [[nodiscard]] std::string read_bytes(const std::string& path);
 
-/// Puts a file in the place of what stood there. Fails with what the system says.
+/// Writes a file, replacing an existing one. Fails with the system's message.
 void write_bytes(const std::string& path, std::string_view bytes);
 
-/// A text in UTF-8; anything else fails, `what` telling where it came from.
+/// Converts UTF-8 to a text; anything else fails with `what`, the name of its source.
 [[nodiscard]] Text utf8_text(std::string_view bytes, const std::string& what);
 
 }  // namespace talutil::cli

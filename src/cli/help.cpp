@@ -10,7 +10,7 @@ namespace talutil::cli {
 
 namespace {
 
-/// "Long, -2147483648 to 2147483647; written back".
+/// For example "Long, -2147483648 to 2147483647; written back".
 std::string argument_words(const Parameter& parameter) {
   std::string words(type_name(parameter.type));
   if (const auto how = how_to_write(parameter.type); !how.empty() && parameter.type != ValueType::text) {

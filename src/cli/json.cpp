@@ -35,7 +35,7 @@ std::string escape(char16_t unit) {
 constexpr bool is_high_surrogate(char16_t unit) noexcept { return (unit & 0xFC00) == 0xD800; }
 constexpr bool is_low_surrogate(char16_t unit) noexcept { return (unit & 0xFC00) == 0xDC00; }
 
-/// How many units of the front of a text are written as they are: 0 for one to be escaped.
+/// The number of units at the start of a text that need no escape; 0 if the first one does.
 std::size_t plain_units(TextView text) {
   const char16_t unit = text.front();
   if (is_high_surrogate(unit)) return text.size() > 1 && is_low_surrogate(text[1]) ? 2 : 0;

@@ -15,21 +15,22 @@ namespace talutil::cli {
 
 namespace {
 
-/// The part of a file from one place to another.
+/// Reads part of a file.
 std::string read_part(const posix::Descriptor& file, std::int64_t begin, std::int64_t end) {
   std::string bytes(static_cast<std::size_t>(end - begin), '\0');
   std::size_t done = 0;
   while (done < bytes.size()) {
     const ssize_t count =
         pread(file.get(), bytes.data() + done, bytes.size() - done, begin + static_cast<std::int64_t>(done));
-    if (count <= 0) break;  // Somebody has shortened the file.
+    if (count <= 0) break;  // The file was truncated.
     done += static_cast<std::size_t>(count);
   }
   bytes.resize(done);
   return bytes;
 }
 
-/// Where the last lines of a file begin, looked for from its end, so that long logs cost no more than short ones.
+/// The position of a file's last lines, searched backwards from the end, so that long logs cost no more than short
+/// ones.
 std::int64_t begin_of_last_lines(const posix::Descriptor& file, std::int64_t size, std::int64_t lines) {
   constexpr std::int64_t piece_size = 65536;
   std::int64_t breaks = 0;
@@ -38,7 +39,7 @@ std::int64_t begin_of_last_lines(const posix::Descriptor& file, std::int64_t siz
     const std::string piece = read_part(file, begin, end);
     for (std::size_t i = piece.size(); i-- > 0;) {
       const std::int64_t at = begin + static_cast<std::int64_t>(i);
-      // The line break at the very end closes the last line.
+      // A line break at the very end only ends the last line.
       if (piece[i] == '\n' && at + 1 < size && ++breaks == lines) return at + 1;
     }
   }
@@ -53,12 +54,12 @@ void print_lines(std::string bytes) {
 
 std::int64_t size_of(const posix::Descriptor& file) { return lseek(file.get(), 0, SEEK_END); }
 
-/// Prints what is appended, whole lines at a time, until the program is interrupted.
+/// Prints whatever is appended, in whole lines, until the program is interrupted.
 [[noreturn]] void follow(const posix::Descriptor& file, std::int64_t printed) {
   using namespace std::chrono_literals;
   for (;; std::this_thread::sleep_for(200ms)) {
     const std::int64_t size = size_of(file);
-    if (size < printed) printed = 0;  // The log was begun anew.
+    if (size < printed) printed = 0;  // The log was started afresh.
     const std::string added = read_part(file, printed, size);
     const std::size_t whole = added.rfind('\n') + 1;
     if (whole == 0) continue;

@@ -14,7 +14,7 @@ namespace {
 
 using namespace talutil::cli;
 
-/// What the command line asks for: the options of each subcommand and the one that was chosen.
+/// The parsed command line: the options of each subcommand, and the subcommand chosen.
 struct Request {
   ListOptions list;
   std::string help_member;
@@ -91,7 +91,7 @@ void add_code_page(CLI::App& command, std::optional<std::uint32_t>& number, cons
 
 void add_call(CLI::App& app, Request& request) {
   auto* const command = app.add_subcommand("call", "Call a method, read a setting or put one: MEMBER [ARGUMENT]...");
-  // What is not one of our options is an argument, in its order: "-1" and "-x" need no "--" before them.
+  // Whatever is not one of our options is an argument, in order: "-1" and "-x" need no preceding "--".
   command->allow_extras();
   command->set_help_flag("--help", "Print this help message and exit");
   command->add_option("MEMBER", request.call.member, "The member's name, in any case")->required();
@@ -242,7 +242,7 @@ void add_printers(CLI::App& app, Request& request) {
   });
 }
 
-/// Fails for a first word that is no subcommand, naming those there are.
+/// Fails if the first word is not a subcommand; lists the subcommands.
 void check_subcommand(const CLI::App& app, std::string_view word) {
   std::string names;
   for (const CLI::App* const command : app.get_subcommands({})) {
@@ -252,7 +252,7 @@ void check_subcommand(const CLI::App& app, std::string_view word) {
   throw usage_failure("there is no subcommand \"" + std::string(word) + "\"; there are " + names);
 }
 
-/// Takes what follows "--" off the command line: arguments of a call that nothing else may look at.
+/// Removes what follows "--" from the command line: arguments of a call that must not be interpreted.
 std::vector<std::string> take_verbatim(std::vector<std::string>& words) {
   const auto mark = std::ranges::find(words, "--");
   if (mark == words.end()) return {};
@@ -290,7 +290,7 @@ int run(std::vector<std::string> words) {
     return app.exit(help_or_version);
   } catch (const CLI::ParseError& error) {
     std::string message = error.what();
-    // A name in capitals, as of an argument that is missing, stays as it is.
+    // Keep a name in capitals, such as that of a missing argument.
     const bool is_name = message.size() > 1 && talutil::fold_case(message[1]) != message[1];
     if (!is_name) message.front() = talutil::fold_case(message.front());
     throw usage_failure(message + "; see \"talutil --help\"");

@@ -15,7 +15,7 @@ using Words = std::span<const std::string>;
 
 constexpr std::string_view blanks = " \t\r";
 
-/// The words of a line; a quote inside a quoted word is doubled.
+/// Splits a line into words; quotes in a quoted word are doubled.
 std::vector<std::string> words_of(std::string_view line) {
   std::vector<std::string> words;
   while (true) {

@@ -8,11 +8,11 @@
 
 namespace talutil::cli {
 
-/// One member that a value passes through, with its other arguments.
+/// A member through which a value passes, with the other arguments.
 struct PlanStep {
-  bool is_list = false;  ///< Each element of a comma list passes through, and the list is closed by a comma.
+  bool is_list = false;  ///< Applies to each element of a comma-separated list, which is then closed by a comma.
   const Member* member = nullptr;
-  std::vector<Variant> arguments;  ///< Complete but for the value's place.
+  std::vector<Variant> arguments;  ///< Complete except for the value.
   std::size_t value_place = 0;
 };
 
@@ -21,10 +21,10 @@ struct PlanColumn {
   std::vector<PlanStep> steps;
 };
 
-/// Reads a plan, one line a column: the column's name, then its steps, joined by "|". A step is a member and its
-/// arguments as "talutil call" takes them; the value comes last, or where "*" stands. "list" in front of a
-/// member cleans each element of a comma list. Words with blanks stand in double quotes; lines that begin
-/// with "#" are remarks. A fault fails with its line and what is wrong.
+/// Reads a plan, with one line per column: the column's name, then its steps, separated by "|". A step is a member and
+/// its arguments as for "talutil call"; the value comes last, or in place of "*". "list" before a member cleans each
+/// element of a comma-separated list. Words with blanks are in double quotes; lines that begin with "#" are comments.
+/// Fails with the line number and the error.
 [[nodiscard]] std::vector<PlanColumn> read_plan(std::string_view text, std::span<const Member> members,
                                                 const Locale& locale);
 

@@ -4,7 +4,7 @@
 
 namespace talutil::cli {
 
-/// Reports on standard error how far a file above 50 MB is read, where that is a terminal; silent elsewhere.
+/// Reports the progress of reading a file above 50 MB on standard error, if that is a terminal.
 [[nodiscard]] posix::PosixFiles::Progress reading_progress();
 
 }  // namespace talutil::cli

@@ -14,14 +14,14 @@ namespace {
 
 constexpr std::int16_t comma_text = 3;
 
-/// A text that is UTF-8, or else in code page 1252, as the files of hosts are.
+/// Decodes UTF-8 or, if it is not that, code page 1252, which hosts' files use.
 Text text_of_file(const std::string& path) {
   const std::string bytes = read_bytes(path);
   Text text = from_utf8(bytes);
   return text.find(u'\uFFFD') == Text::npos ? text : from_ansi(bytes);
 }
 
-/// Columns as wide as their longest text, to a limit.
+/// Makes columns as wide as their longest text, up to a limit.
 void fit_columns(Grid& grid) {
   constexpr std::int32_t character = 100;  // Twips of the grid's letters, Courier of 8 points.
   constexpr std::int32_t padding = 130;

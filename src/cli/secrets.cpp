@@ -9,7 +9,7 @@ namespace talutil::cli {
 
 namespace {
 
-/// Standard input without the line break that echo and here-documents put at its end.
+/// Standard input without the final line break that echo and here-documents add.
 std::string read_input(bool is_exact) {
   std::string bytes = read_bytes("-");
   if (!is_exact && bytes.ends_with('\n')) bytes.pop_back();
@@ -24,7 +24,7 @@ void print(const Text& text, bool is_exact) { std::cout << to_utf8(text) << (is_
 void encrypt(const SecretOptions& options) {
   Session session;
   const Text text = utf8_text(read_input(options.exact), "standard input");
-  // A cipher text is ASCII on one line, and always ends as a line.
+  // Cipher text is ASCII on a single line, so always end it with a line break.
   print(session.utils().CryptoEncryptString(text), false);
 }
 

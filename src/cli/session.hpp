@@ -10,10 +10,10 @@
 
 namespace talutil::cli {
 
-/// A started library with one toolkit object, called late-bound as scripts call it.
+/// A started library with one toolkit object, called late-bound like scripts do.
 class Session {
  public:
-  /// With the code page of a number; with that of the environment where there is none.
+  /// Uses the given code page or, without one, that of the environment.
   explicit Session(std::optional<std::uint32_t> code_page = {})
       : platform_(code_page ? *code_page : posix::chosen_code_page()) {
     platform_.files.set_progress(reading_progress());
@@ -26,7 +26,7 @@ class Session {
   [[nodiscard]] Locale locale() const { return library_.locale(); }
   [[nodiscard]] SharedSettings& settings() noexcept { return library_.settings(); }
 
-  /// Raises RunTimeError as the member does.
+  /// Raises the member's errors as RunTimeError.
   Variant call(const Member& member, std::span<Argument> arguments) {
     const auto slot = static_cast<std::int32_t>(&member - members().members.data());
     return members().call(&utils_, slot, arguments, library_.locale());
