@@ -1,5 +1,5 @@
-// printhelper.dll: prints a window as it looks, for the library's PrintScreen and for hosts that call it themselves.
-// Both functions take a window and answer 1, or 0 when there is nothing to print on.
+// printhelper.dll: prints a window as it appears, for the library's PrintScreen and for hosts that call it directly.
+// Both functions take a window and return 1, or 0 if it cannot be printed.
 #include <algorithm>
 #include <cstdint>
 #include <cstring>
@@ -21,16 +21,16 @@ struct Printer {
   static void close(HANDLE printer) noexcept { ClosePrinter(printer); }
 };
 
-/// The printer's settings for one window, kept from ConfigurePrinter to SendToPrinter.
+/// The printer settings for a window, kept from ConfigurePrinter to SendToPrinter.
 struct Setup {
   HWND window = nullptr;
   std::vector<wchar_t> printer;
-  std::vector<std::byte> settings;  ///< A DEVMODE with what the driver adds to it.
+  std::vector<std::byte> settings;  ///< A DEVMODE including the driver's own data.
 
   [[nodiscard]] DEVMODEW* device_mode() { return reinterpret_cast<DEVMODEW*>(settings.data()); }
 };
 
-// Threads print windows of their own.
+// Per thread, because threads print their own windows.
 thread_local Setup prepared;
 
 struct Size {
@@ -45,7 +45,7 @@ bool size_of(HWND window, Size& size) {
   return size.width > 0 && size.height > 0;
 }
 
-/// The default printer, its paper turned to the shape of the window.
+/// Prepares the default printer with the paper oriented like the window.
 bool prepare(HWND window, Setup& setup) {
   Size size;
   DWORD length = 0;
@@ -65,7 +65,7 @@ bool prepare(HWND window, Setup& setup) {
     is_ready = DocumentPropertiesW(nullptr, printer.get(), setup.printer.data(), mode, nullptr, DM_OUT_BUFFER) == IDOK;
     mode->dmFields |= DM_ORIENTATION;
     mode->dmOrientation = size.width > size.height ? DMORIENT_LANDSCAPE : DMORIENT_PORTRAIT;
-    // The driver brings the rest of its settings in line.
+    // Lets the driver adjust the rest of its settings.
     is_ready = is_ready && DocumentPropertiesW(nullptr, printer.get(), setup.printer.data(), mode, mode,
                                                DM_IN_BUFFER | DM_OUT_BUFFER) == IDOK;
   }
@@ -73,7 +73,7 @@ bool prepare(HWND window, Setup& setup) {
   return is_ready;
 }
 
-/// The image of a window, its frame included, as it would look with nothing in front of it.
+/// The image of a window, including its frame, as if nothing were in front of it.
 class Picture {
  public:
   Picture(HWND window, Size size) : size_(size) {
@@ -84,7 +84,7 @@ class Picture {
     context_.reset(CreateCompatibleDC(screen.get()));
     if (bitmap_ && context_) {
       selected_ = talutil::win32::select(context_.get(), bitmap_.get());
-      // What a window does not draw of itself stays paper.
+      // Parts that a window does not draw stay white.
       PatBlt(context_.get(), 0, 0, size.width, size.height, WHITENESS);
       const Owned<kind::WindowDevice> source(GetWindowDC(window), {window});
       if (PrintWindow(window, context_.get(), 0) == FALSE)
@@ -92,7 +92,7 @@ class Picture {
     }
   }
 
-  /// As large as the page allows without changing its shape, in the middle.
+  /// Draws the image centred, as large as the page allows without distortion.
   bool draw(HDC page) const {
     if (!selected_) return false;
     const int page_width = GetDeviceCaps(page, HORZRES);
@@ -121,7 +121,7 @@ class Picture {
 bool print(HWND window, Setup& setup) {
   Size size;
   if (!size_of(window, size)) return false;
-  // Before the printer is started: what comes in front of the window meanwhile is not part of it.
+  // Before starting the printer, so that windows that come to the front meanwhile are not printed.
   const Picture picture(window, size);
   const Owned<kind::MadeDevice> page(CreateDCW(nullptr, setup.printer.data(), nullptr, setup.device_mode()));
   if (!page) return false;
@@ -157,7 +157,7 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, void* /*reserve
   return TRUE;
 }
 
-/// Prepares the default printer for a window: its paper lies as the window does.
+/// Prepares the default printer for a window, with the paper oriented like the window.
 extern "C" std::int32_t WINAPI ConfigurePrinter(std::int32_t window) noexcept {
   return without_exceptions(window, [](HWND handle) {
     Setup setup;
@@ -167,7 +167,7 @@ extern "C" std::int32_t WINAPI ConfigurePrinter(std::int32_t window) noexcept {
   });
 }
 
-/// Prints the image of a window on one page. A window that was not prepared is prepared first.
+/// Prints the image of a window on one page. Prepares a window that was not prepared yet.
 extern "C" std::int32_t WINAPI SendToPrinter(std::int32_t window) noexcept {
   return without_exceptions(window, [](HWND handle) {
     Setup setup = std::exchange(prepared, {});
