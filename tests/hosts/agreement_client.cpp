@@ -1,65 +1,62 @@
-// The two ways into the library agree: agreement_client FOLDER [CALLS [SEED]]. Random members are called early and late
-// with the same arguments, of every kind of variant, by value, by reference and in variables, also one variable for two
-// parameters; error, result and everything that was written back must be the same, and memory must stay flat.
+// Calls every member that the type library describes: agreement_client FOLDER [CALLS [SEED]]. First random calls, early
+// and late with the same arguments, of every kind of variant, by value, by reference and in variables, also one
+// variable for two parameters: error, result and everything that was written back must be the same, and memory must
+// stay flat. Then what nobody should send: null pointers, wrong numbers of arguments, and hostile values in each place.
 #include <random>
 
 #include "examples/host/window_objects.hpp"
 #include "hostile_values.hpp"
 #include "slots.hpp"
-#include "typed_picture_box.hpp"
 
 using namespace talutil::hosts;
 
 namespace {
 
-/// Members that answer by chance, wait for a user, or show a box for a setting that a random put has made.
-bool is_left_out(std::wstring_view member) {
-  constexpr std::wstring_view others[] = {
+/// Members that wait for a user would wait for ever.
+bool waits_for_a_user(const Slot& slot) {
+  constexpr std::wstring_view members[] = {
+      L"BrowseForFolder",     L"CallZIPFiles",        L"CallUnZIPFiles",      L"CheckDeleteRecord",
+      L"CheckModifyDatabase", L"ExportGridData",      L"SelectGridRows",      L"CountGridSelectedRows",
+      L"GridPrintPreview",    L"TextBoxPrintPreview", L"ListBoxPrintPreview", L"DrawShellExecuteError",
+      L"ShowShortCutKeys",    L"ShowCmdLineHelp",     L"ShowSysInfo",         L"MyInputBox"};
+  return std::ranges::find(members, slot.name) != std::end(members);
+}
+
+/// Members that answer by chance, show a box for a setting that a random put has made, or take a record, which cannot
+/// be made for every kind of variant.
+bool is_left_out(const Slot& slot) {
+  constexpr std::wstring_view members[] = {
       L"GenerateFilePassword", L"GetNewGuid",       L"CryptoEncryptString", L"ConvertNumberToDatabaseDuration",
       L"VerifyFilePath",       L"SetupFileFolders", L"Terminate",           L"DebugMode",
       L"bIsProgrammer"};
-  return waits_for_a_user(member) || std::ranges::find(others, member) != std::end(others);
+  return waits_for_a_user(slot) || std::ranges::find(members, slot.name) != std::end(members) ||
+         std::ranges::any_of(slot.parameters, [](const auto& p) { return p.referenced == VT_USERDEFINED; });
 }
 
-/// Objects of a host's, each of whose members answers only as what it is.
-class HostWindows {
- public:
-  HostWindows()
-      : window_(CreateWindowW(L"Static", L"", WS_OVERLAPPEDWINDOW, 0, 0, 400, 300, nullptr, nullptr, nullptr, nullptr)),
-        box_(CreateWindowW(L"ComboBox", L"", CBS_DROPDOWN, 0, 0, 100, 100, nullptr, nullptr, nullptr, nullptr)) {
-    for (const LPARAM key : {2, 12, 70000})
-      SendMessageW(box_, CB_SETITEMDATA, static_cast<WPARAM>(SendMessageW(box_, CB_ADDSTRING, 0, LPARAM(L"entry"))),
-                   key);
-    *form.receive() = form_object(window_);
-    *combo.receive() = combo_object(box_);
+/// The bytes in use on all heaps of the process. Without the platform's cache of texts, what stays there has leaked.
+std::size_t bytes_in_use() {
+  std::array<HANDLE, 32> heaps{};
+  const DWORD count = GetProcessHeaps(static_cast<DWORD>(heaps.size()), heaps.data());
+  std::size_t bytes = 0;
+  for (DWORD i = 0; i < count; ++i) {
+    PROCESS_HEAP_ENTRY entry{};
+    while (HeapWalk(heaps[i], &entry) != FALSE) {
+      if ((entry.wFlags & PROCESS_HEAP_ENTRY_BUSY) != 0) bytes += entry.cbData;
+    }
   }
-  HostWindows(const HostWindows&) = delete;
-  HostWindows& operator=(const HostWindows&) = delete;
-  ~HostWindows() {
-    DestroyWindow(window_);
-    DestroyWindow(box_);
-  }
-
-  Pointer<IDispatch> form;
-  Pointer<IDispatch> combo;
-  TypedPictureBox picture_box;
-
- private:
-  HWND window_;
-  HWND box_;
-};
+  return bytes;
+}
 
 /// A type and a value in a line.
 std::wstring shown_value(const VARIANT& value) {
   const VARTYPE type = V_VT(&value);
-  std::wstring result = std::to_wstring(type) + L" ";
+  const std::wstring result = std::to_wstring(type) + L" ";
   if ((type & VT_BYREF) != 0) return result + L"reference";
   if ((type & VT_ARRAY) != 0) {
-    const VARTYPE element = type & VT_TYPEMASK;
     SAFEARRAY* const array = V_ARRAY(&value);
-    const bool is_list =
-        array != nullptr && SafeArrayGetDim(array) == 1 && (element == VT_BSTR || element == VT_VARIANT);
-    return result + (is_list ? contents(array) : array == nullptr ? L"no array" : L"an array");
+    const bool is_list = type == (VT_ARRAY | VT_BSTR) || type == (VT_ARRAY | VT_VARIANT);
+    if (array == nullptr || (is_list && SafeArrayGetDim(array) == 1)) return result + contents(array);
+    return result + L"an array";
   }
   switch (type) {
     case VT_EMPTY:
@@ -76,15 +73,15 @@ std::wstring shown_value(const VARIANT& value) {
     case VT_UI1:
     case VT_I1:
       return result + std::to_wstring(V_UI1(&value));
-    case VT_I4:
-    case VT_R4:
-    case VT_INT:
-    case VT_UINT:
-    case VT_UI4:
-    case VT_ERROR:
-      return result + std::to_wstring(V_I4(&value));
-    default:
+    case VT_R8:
+    case VT_DATE:
+    case VT_CY:
+    case VT_I8:
+    case VT_UI8:
+    case VT_DECIMAL:
       return result + std::to_wstring(V_I8(&value));
+    default:
+      return result + std::to_wstring(V_I4(&value));
   }
 }
 
@@ -95,90 +92,31 @@ constexpr short shorts[] = {0, 1, 2, 3, 4, 5, -1, 12, 60, 2009, 32767, -32768};
 constexpr LONG longs[] = {0, 1, 2, 3, -1, 70000, 2147483647, -2147483647 - 1};
 constexpr double doubles[] = {45361.25, 0, -1.75, 2958465.99, 2, 0.5, 1e300};
 
-/// The value of one argument, made anew for each way of calling.
-class Passed {
- public:
-  Passed(const SlotParameter& parameter, const Hostile& variant, std::uint32_t draw)
-      : type_(parameter.type == VT_PTR ? parameter.referenced : parameter.type), by_pointer_(parameter.type == VT_PTR) {
-    if (type_ == VT_VARIANT) {
-      variant.make(places_);
-      return;
+Value typed_value(VARTYPE type, std::uint32_t draw) {
+  switch (type) {
+    case VT_BSTR:
+      // A null pointer is an empty text.
+      return draw % 20 == 0 ? Value::of_type(VT_BSTR) : Value(texts[draw % std::size(texts)]);
+    case VT_I2:
+      return Value(shorts[draw % std::size(shorts)]);
+    case VT_BOOL:
+      return Value(VT_BOOL, &VARIANT::boolVal, static_cast<VARIANT_BOOL>(draw % 3 == 0 ? -1 : draw % 3 - 1));
+    case VT_I4:
+      return Value(longs[draw % std::size(longs)]);
+    case VT_R4:
+      return Value(VT_R4, &VARIANT::fltVal, static_cast<float>(doubles[draw % 6]));
+    case VT_DATE:
+      return Value(VT_DATE, &VARIANT::date, doubles[draw % std::size(doubles)]);
+    case VT_SAFEARRAY: {
+      if (draw % 4 == 0) return Value::of_type(VT_ARRAY | VT_BSTR);
+      Value list = Value::array(draw % 4 == 3 ? VT_VARIANT : VT_BSTR, draw % 8 == 1 ? 1 : 0, {L"a", L"Banana"});
+      V_VT(&list.get()) = VT_ARRAY | VT_BSTR;
+      return list;
     }
-    switch (type_) {
-      case VT_BSTR:
-        typed_ = Value(texts[draw % std::size(texts)]);
-        break;
-      case VT_I2:
-        typed_ = Value(shorts[draw % std::size(shorts)]);
-        break;
-      case VT_BOOL:
-        V_BOOL(&typed_.get()) = static_cast<VARIANT_BOOL>(draw % 3 == 0 ? -1 : draw % 3 == 1 ? 0 : 1);
-        break;
-      case VT_I4:
-        typed_ = Value(longs[draw % std::size(longs)]);
-        break;
-      case VT_R4:
-        V_R4(&typed_.get()) = static_cast<float>(doubles[draw % 6]);
-        break;
-      case VT_DATE:
-        V_R8(&typed_.get()) = doubles[draw % std::size(doubles)];
-        break;
-      case VT_SAFEARRAY:
-        if (draw % 4 != 0)
-          V_ARRAY(&typed_.get()) = std::exchange(
-              Array(draw % 4 == 3 ? VT_VARIANT : VT_BSTR, draw % 8 == 1 ? 1 : 0, {L"a", L"Banana"}).get(), nullptr);
-        break;
-      default:
-        break;
-    }
-    V_VT(&typed_.get()) = type_ == VT_SAFEARRAY ? VARTYPE{VT_ARRAY | VT_BSTR} : type_;
+    default:
+      return Value::of_type(type);
   }
-  Passed(const Passed&) = delete;
-  Passed& operator=(const Passed&) = delete;
-
-  /// Shares the variable of an earlier argument.
-  void share(Passed& earlier) noexcept { shared_ = &earlier; }
-  [[nodiscard]] bool is_variable() const noexcept { return (V_VT(&places_.argument.get()) & VT_BYREF) != 0; }
-
-  /// As a cell for DispCallFunc.
-  [[nodiscard]] VARIANT early() {
-    if (shared_ != nullptr) return shared_->early();
-    VARIANT result{};
-    if (!by_pointer_) {
-      if (type_ == VT_VARIANT) return places_.argument.get();
-      return typed_.get();
-    }
-    V_VT(&result) = VT_PTR;
-    V_BYREF(&result) = type_ == VT_VARIANT ? static_cast<void*>(&places_.argument.get()) : &V_I8(&typed_.get());
-    return result;
-  }
-  [[nodiscard]] VARTYPE early_type() const noexcept { return by_pointer_ ? VARTYPE{VT_PTR} : type_; }
-
-  /// As a member of the list that Invoke takes.
-  [[nodiscard]] VARIANT late() {
-    if (shared_ != nullptr) return shared_->late();
-    if (type_ == VT_VARIANT) return places_.argument.get();
-    if (!by_pointer_) return typed_.get();
-    VARIANT result{};
-    V_VT(&result) = static_cast<VARTYPE>(VT_BYREF | V_VT(&typed_.get()));
-    V_BYREF(&result) = &V_I8(&typed_.get());
-    return result;
-  }
-
-  /// What a call has left in the variables. One that was passed by value is the caller's no more in a late call.
-  [[nodiscard]] std::wstring after() const {
-    if (type_ != VT_VARIANT) return shown_value(typed_.get());
-    if (!is_variable()) return {};
-    return shown_value(places_.cell.get()) + L" / " + shown_value(places_.outer);
-  }
-
- private:
-  VARTYPE type_;
-  bool by_pointer_;
-  Places places_;
-  Value typed_;
-  Passed* shared_ = nullptr;
-};
+}
 
 /// One call's choices, from which its arguments can be made as often as they are needed.
 struct Choice {
@@ -188,136 +126,154 @@ struct Choice {
   std::vector<int> shares;  ///< The earlier argument whose variable this is; -1 for none.
 };
 
-std::vector<std::unique_ptr<Passed>> arguments_of(const Choice& choice) {
-  std::vector<std::unique_ptr<Passed>> result;
-  for (std::size_t i = 0; i < choice.values.size(); ++i) {
-    result.push_back(std::make_unique<Passed>(choice.slot->parameters[i], *choice.values[i], choice.draws[i]));
-    const int shared = choice.shares[i];
-    if (shared >= 0 && result[static_cast<std::size_t>(shared)]->is_variable())
-      result.back()->share(*result[static_cast<std::size_t>(shared)]);
+/// The arguments of one way of calling. A variant lies in its place's argument, a typed value in its cell.
+class Arguments {
+ public:
+  explicit Arguments(const Choice& choice) : parameters_(choice.slot->parameters), places_(choice.values.size()) {
+    for (std::size_t i = 0; i < places_.size(); ++i) {
+      if (is_variant(i))
+        choice.values[i]->make(places_[i]);
+      else
+        places_[i].cell = typed_value(parameters_[i].bare(), choice.draws[i]);
+      const auto shared = static_cast<std::size_t>(choice.shares[i]);
+      sources_.push_back(choice.shares[i] >= 0 && is_variable(shared) ? sources_[shared] : i);
+    }
   }
-  return result;
+
+  /// As a cell for DispCallFunc.
+  [[nodiscard]] VARIANT early(std::size_t i) {
+    Places& places = places_[sources_[i]];
+    Value& value = is_variant(i) ? places.argument : places.cell;
+    if (parameters_[i].type != VT_PTR) return value.get();
+    VARIANT result{};
+    V_VT(&result) = VT_PTR;
+    V_BYREF(&result) = is_variant(i) ? static_cast<void*>(value) : &V_I8(&value.get());
+    return result;
+  }
+
+  /// As a member of the list that Invoke takes.
+  [[nodiscard]] VARIANT late(std::size_t i) {
+    Places& places = places_[sources_[i]];
+    if (is_variant(i)) return places.argument.get();
+    if (parameters_[i].type != VT_PTR) return places.cell.get();
+    VARIANT result{};
+    V_VT(&result) = static_cast<VARTYPE>(VT_BYREF | places.cell.type());
+    V_BYREF(&result) = &V_I8(&places.cell.get());
+    return result;
+  }
+
+  /// What a call has left in the variables. One that was passed by value is the caller's no more in a late call.
+  [[nodiscard]] std::wstring states() const {
+    std::wstring result;
+    for (std::size_t i = 0; i < places_.size(); ++i) {
+      result += L"\n    ";
+      if (!is_variant(i) || is_variable(i)) result += shown_value(places_[i].cell.get());
+      if (is_variable(i)) result += L" / " + shown_value(places_[i].outer);
+    }
+    return result;
+  }
+
+ private:
+  [[nodiscard]] bool is_variant(std::size_t i) const { return parameters_[i].bare() == VT_VARIANT; }
+  [[nodiscard]] bool is_variable(std::size_t i) const {
+    return is_variant(i) && (places_[i].argument.type() & VT_BYREF) != 0;
+  }
+
+  const std::vector<SlotParameter>& parameters_;
+  std::vector<Places> places_;
+  std::vector<std::size_t> sources_;  ///< Where the variable of each argument is.
+};
+
+HRESULT call_slot(IUnknown* object, const Slot& slot, std::vector<VARIANT>& cells) {
+  std::vector<VARTYPE> types;
+  std::vector<VARIANTARG*> places;
+  for (std::size_t i = 0; i < cells.size(); ++i) {
+    types.push_back(i < slot.parameters.size() ? slot.parameters[i].type : VARTYPE{VT_PTR});
+    places.push_back(&cells[i]);
+  }
+  VARIANT status{};
+  require(DispCallFunc(object, static_cast<ULONG_PTR>(slot.offset), CC_STDCALL, VT_ERROR,
+                       static_cast<UINT>(cells.size()), types.data(), places.data(), &status),
+          "DispCallFunc");
+  return V_ERROR(&status);
 }
 
-std::wstring states(const std::vector<std::unique_ptr<Passed>>& arguments) {
-  std::wstring result;
-  for (const auto& argument : arguments) result += L"\n    " + argument->after();
-  return result;
-}
-
-std::wstring outcome_text(HRESULT error, const std::wstring& information, const std::wstring& result) {
+std::wstring outcome_text(const Outcome& outcome, const Arguments& arguments) {
   std::array<wchar_t, 16> number{};
-  swprintf(number.data(), number.size(), L"%08lX ", static_cast<unsigned long>(error));
-  return number.data() + (FAILED(error) ? information : result);
+  swprintf(number.data(), number.size(), L"%08lX ", static_cast<unsigned long>(outcome.error));
+  return number.data() + (FAILED(outcome.error) ? outcome.text : shown_value(outcome.result.get())) +
+         arguments.states();
 }
 
 std::wstring call_early(IDispatch* object, const Choice& choice) {
-  const auto arguments = arguments_of(choice);
+  const Slot& slot = *choice.slot;
+  Arguments arguments(choice);
   std::vector<VARIANT> cells;
-  std::vector<VARTYPE> types;
-  for (const auto& argument : arguments) {
-    cells.push_back(argument->early());
-    types.push_back(argument->early_type());
-  }
-  std::array<std::byte, 64> storage{};
-  const bool has_result = choice.slot->parameters.size() > arguments.size();
-  if (has_result) {
-    VARIANT place{};
-    V_VT(&place) = VT_PTR;
-    V_BYREF(&place) = storage.data();
-    cells.push_back(place);
-    types.push_back(VT_PTR);
-  }
-  std::vector<VARIANTARG*> places;
-  for (VARIANT& cell : cells) places.push_back(&cell);
-  VARIANT status{};
+  for (std::size_t i = 0; i < slot.parameters.size(); ++i) cells.push_back(arguments.early(i));
+  // A result is only written: what stood there before is not the member's to free.
+  VARIANT place;
+  std::memset(&place, 0xDD, sizeof place);
+  void* const storage = slot.result == VT_VARIANT ? static_cast<void*>(&place) : &V_I8(&place);
+  if (slot.result != VT_EMPTY) cells.push_back(Value(VT_PTR, &VARIANT::byref, storage).release());
   SetErrorInfo(0, nullptr);
-  require(DispCallFunc(object, static_cast<ULONG_PTR>(choice.slot->offset), CC_STDCALL, VT_ERROR,
-                       static_cast<UINT>(cells.size()), types.data(), places.data(), &status),
-          "DispCallFunc");
-  const std::wstring information = FAILED(V_ERROR(&status)) ? error_text() : L"";
-  Value result;
-  if (has_result) {
-    const VARTYPE type = choice.slot->parameters.back().referenced;
-    if (type == VT_VARIANT) {
-      std::memcpy(&result.get(), storage.data(), sizeof(VARIANT));
-    } else {
-      std::memcpy(&V_I8(&result.get()), storage.data(), sizeof(LONGLONG));
-      V_VT(&result.get()) = type;
-    }
+  Outcome outcome = early_outcome(call_slot(object, slot, cells));
+  if (SUCCEEDED(outcome.error) && slot.result != VT_EMPTY) {
+    if (slot.result != VT_VARIANT) V_VT(&place) = slot.result;
+    outcome.result.get() = place;
   }
-  return outcome_text(V_ERROR(&status), information, shown_value(result.get())) + states(arguments);
+  return outcome_text(outcome, arguments);
+}
+
+Outcome call_member(IDispatch* object, const Slot& slot, std::vector<VARIANT>& list) {
+  std::array<DISPID, 1> named{DISPID_PROPERTYPUT};
+  return invoke(object, slot.identifier, slot.kind, list,
+                slot.kind == INVOKE_PROPERTYPUT ? std::span<DISPID>(named) : std::span<DISPID>());
 }
 
 std::wstring call_late(IDispatch* object, const Choice& choice) {
-  const auto arguments = arguments_of(choice);
+  Arguments arguments(choice);
   std::vector<VARIANT> list;
-  for (const auto& argument : arguments) list.push_back(argument->late());
-  std::ranges::reverse(list);
-  std::array<DISPID, 1> named{DISPID_PROPERTYPUT};
-  const bool is_put = choice.slot->kind == INVOKE_PROPERTYPUT;
-  const Outcome outcome = invoke(object, choice.slot->identifier, static_cast<WORD>(choice.slot->kind), list,
-                                 is_put ? std::span<DISPID>(named) : std::span<DISPID>());
-  return outcome_text(outcome.error(), outcome.source + L": " + outcome.description,
-                      shown_value(outcome.result.get())) +
-         states(arguments);
+  for (std::size_t i = choice.values.size(); i > 0; --i) list.push_back(arguments.late(i - 1));
+  return outcome_text(call_member(object, *choice.slot, list), arguments);
 }
 
 class Calls {
  public:
-  Calls(IDispatch* object, HostWindows& windows) : object_(object), slots_(slots_of(object)) {
-    std::erase_if(slots_, [](const Slot& slot) {
-      return is_left_out(slot.name) || std::ranges::any_of(slot.parameters, [](const SlotParameter& p) {
-               return p.referenced == VT_USERDEFINED;
-             });
-    });
-    for (Hostile& value : hostile_values()) {
-      // An argument that is left out can only be so in a late call.
-      if (value.name != "missing") values_.push_back(std::move(value));
-    }
+  Calls(IDispatch* object, std::initializer_list<IDispatch*> host_objects)
+      : object_(object), slots_(slots_of(object)), values_(hostile_values()) {
+    std::erase_if(slots_, is_left_out);
+    // An argument that is left out can only be so in a late call.
+    std::erase_if(values_, [](const Hostile& value) { return value.name == "missing"; });
     for (const std::wstring_view text : texts)
       add_all_ways(values_, "text " + narrow(text), [text] { return Value(text); });
-    for (IDispatch* const host :
-         {windows.form.get(), windows.combo.get(), static_cast<IDispatch*>(&windows.picture_box)})
+    for (IDispatch* const host : host_objects)
       add_all_ways(values_, "an object of the host's", [host] { return Value(host); });
-    for (const double number : doubles) {
-      add_all_ways(values_, "date", [number] {
-        Value date(number);
-        V_VT(&date.get()) = VT_DATE;
-        return date;
-      });
-    }
+    for (const double number : doubles)
+      add_all_ways(values_, "date", [number] { return Value(VT_DATE, &VARIANT::date, number); });
   }
 
-  /// Begins a series of calls, the same for the same seed.
-  void begin(unsigned seed) { random_.seed(seed); }
-
-  /// One member, both ways. What is written to the disk or the registry by the first call may change the second, so
-  /// that a difference must show twice.
-  void compare() {
-    const Choice choice = chosen();
-    for (int attempt = 0;; ++attempt) {
-      const std::wstring early = call_early(object_, choice);
-      const std::wstring late = call_late(object_, choice);
-      calls_ += 2;
-      if (early == late) return;
-      if (attempt == 0) continue;
-      ++differences_;
-      if (differences_ <= 10)
+  /// The same calls for the same seed. What is written to the disk or the registry by the first call of two may change
+  /// the second, so that a difference must show twice.
+  void compare(unsigned seed, long pairs) {
+    random_.seed(seed);
+    for (; pairs > 0; --pairs) {
+      const Choice choice = chosen();
+      std::wstring early = call_early(object_, choice);
+      std::wstring late = call_late(object_, choice);
+      if (early == late) continue;
+      early = call_early(object_, choice);
+      late = call_late(object_, choice);
+      if (early != late && ++differences <= 10)
         check(false, description_of(choice) + "\n  early " + narrow(early) + "\n  late  " + narrow(late));
-      return;
     }
   }
 
-  [[nodiscard]] long calls() const noexcept { return calls_; }
-  [[nodiscard]] long differences() const noexcept { return differences_; }
+  long differences = 0;
 
  private:
   Choice chosen() {
     Choice choice{&slots_[random_() % slots_.size()], {}, {}, {}};
-    std::size_t count = choice.slot->parameters.size();
-    if (count > 0 && (choice.slot->parameters.back().flags & PARAMFLAG_FRETVAL) != 0) --count;
-    for (std::size_t i = 0; i < count; ++i) {
+    for (std::size_t i = 0; i < choice.slot->parameters.size(); ++i) {
       choice.values.push_back(&values_[random_() % values_.size()]);
       choice.draws.push_back(static_cast<std::uint32_t>(random_()));
       choice.shares.push_back(earlier_variant(*choice.slot, i));
@@ -347,34 +303,125 @@ class Calls {
   std::vector<Slot> slots_;
   std::vector<Hostile> values_;
   std::mt19937 random_;
-  long calls_ = 0;
-  long differences_ = 0;
 };
-
-void empty_object_properties(_ORVUtils* u) {
-  const Value nothing(static_cast<IDispatch*>(nullptr));
-  u->put_FolderBrowseForm(nothing.get());
-  u->put_SplashForm(nothing.get());
-  u->put_DrawTextPictureBox(nothing.get());
-}
 
 /// The same calls twice: what the system loads once and keeps (fonts, libraries) is there after the first time.
 /// Settings of other lengths make some difference; a byte lost with each call would make a larger one.
-void memory_stays_flat(Calls& calls, _ORVUtils* u, unsigned seed, long wanted) {
-  constexpr std::size_t tolerance = 16384;
-  const auto run = [&](long until) {
-    calls.begin(seed);
-    while (calls.calls() < until) calls.compare();
-    empty_object_properties(u);
+void both_ways_agree(IDispatch* u, unsigned seed, long wanted) {
+  const HWND window =
+      CreateWindowW(L"Static", L"", WS_OVERLAPPEDWINDOW, 0, 0, 400, 300, nullptr, nullptr, nullptr, nullptr);
+  const HWND box = CreateWindowW(L"ComboBox", L"", CBS_DROPDOWN, 0, 0, 100, 100, nullptr, nullptr, nullptr, nullptr);
+  for (const LPARAM key : {2, 12, 70000})
+    SendMessageW(box, CB_SETITEMDATA, static_cast<WPARAM>(SendMessageW(box, CB_ADDSTRING, 0, LPARAM(L"entry"))), key);
+  // Their members answer only as what they are.
+  Pointer<IDispatch> form;
+  Pointer<IDispatch> combo;
+  Pointer<IDispatch> picture;
+  *form.receive() = form_object(window);
+  *combo.receive() = combo_object(box);
+  *picture.receive() = picture_object(window, 400, 300);
+  Calls calls(u, {form.get(), combo.get(), picture.get()});
+  const auto run = [&] {
+    calls.compare(seed, wanted / 4);
+    for (const wchar_t* name : {L"FolderBrowseForm", L"SplashForm", L"DrawTextPictureBox"})
+      put(u, name, Value::nothing());
     return bytes_in_use();
   };
-  const std::size_t before = run(wanted / 2);
-  const std::size_t after = run(wanted);
-  check(after < before + tolerance, std::to_string(calls.calls() / 2) + " calls took the heaps from " +
-                                        std::to_string(before) + " to " + std::to_string(after) + " bytes");
-  check_equal(0L, calls.differences(), "differences in " + std::to_string(calls.calls()) + " calls");
-  std::printf("%ld calls, %ld differences, heaps from %zu to %zu bytes in the second half\n", calls.calls(),
-              calls.differences(), before, after);
+  constexpr std::size_t tolerance = 16384;
+  const std::size_t before = run();
+  const std::size_t after = run();
+  std::printf("%ld calls, %ld differences, heaps from %zu to %zu bytes in the second half\n", wanted, calls.differences,
+              before, after);
+  check(after < before + tolerance,
+        "the calls took the heaps from " + std::to_string(before) + " to " + std::to_string(after) + " bytes");
+  check_equal(0L, calls.differences, "differences in " + std::to_string(wanted) + " calls");
+  DestroyWindow(window);
+  DestroyWindow(box);
+}
+
+/// Calls each slot with zeros, once for each of its pointers with that one null.
+void null_pointers_are_refused(IDispatch* object) {
+  for (const Slot& slot : slots_of(object)) {
+    std::vector<std::array<std::byte, 64>> storage(slot.parameters.size() + 1);
+    std::vector<VARIANT> cells;
+    for (const SlotParameter& parameter : slot.parameters)
+      cells.push_back(parameter.type == VT_VARIANT ? VARIANT{} : Value::of_type(parameter.type).release());
+    if (slot.result != VT_EMPTY) cells.push_back(Value::of_type(VT_PTR).release());
+    for (std::size_t i = 0; i < cells.size(); ++i) {
+      if (V_VT(&cells[i]) == VT_PTR) V_BYREF(&cells[i]) = storage[i].data();
+    }
+    for (std::size_t i = 0; i < cells.size(); ++i) {
+      if (V_VT(&cells[i]) != VT_PTR) continue;
+      void* const place = std::exchange(V_BYREF(&cells[i]), nullptr);
+      check_equal(E_POINTER, call_slot(object, slot, cells), narrow(slot.name) + ", a null argument");
+      V_BYREF(&cells[i]) = place;
+    }
+    if (slot.kind == INVOKE_PROPERTYGET) check_equal(S_OK, call_slot(object, slot, cells), narrow(slot.name));
+  }
+}
+
+/// Members in their number beside zero to twelve arguments.
+void wrong_counts_are_refused(IDispatch* u, const Slot& slot) {
+  std::vector<Value> owned;
+  std::vector<VARIANT> list;
+  for (int count = 0; count <= 12; ++count) {
+    // A member that ends the library speaks of it otherwise.
+    put(u, L"DebugMode", Value(short{0}));
+    const Outcome outcome = invoke(u, slot.identifier, slot.kind, list);
+    check(is_documented(outcome),
+          narrow(slot.name) + " with " + std::to_string(count) + " arguments answered " + shown(outcome.error));
+    owned.emplace_back(L"1");
+    list.push_back(owned.back().get());
+  }
+}
+
+/// Sends the value to one place of a member, with what suits beside it. Answers what was wrong.
+std::string send(IDispatch* u, const Slot& slot, std::size_t place, const Hostile& value) {
+  Places places;
+  value.make(places);
+  std::vector<Value> others;
+  std::vector<VARIANT> list;
+  for (std::size_t i = slot.parameters.size(); i > 0; --i) {
+    const VARTYPE type = slot.parameters[i - 1].bare();
+    others.push_back(type == VT_BSTR                    ? Value(L"a,b,")
+                     : type == VT_SAFEARRAY             ? Value::array(VT_BSTR, 0, {L"a"})
+                     : type == VT_I2 || type == VT_BOOL ? Value(short{2})
+                                                        : Value(1L));
+    list.push_back(i - 1 == place ? places.argument.get() : others.back().get());
+  }
+  const std::vector<VARIANT> before = list;
+  const Outcome outcome = call_member(u, slot, list);
+  const std::string what = narrow(slot.name) + ", argument " + std::to_string(place) + ": " + value.name;
+  if (!is_documented(outcome)) return what + ": answered " + shown(outcome.error) + " " + narrow(outcome.text);
+  // The list is the caller's: nothing in it may change, only what its references lead to.
+  if (std::memcmp(before.data(), list.data(), list.size() * sizeof(VARIANT)) != 0)
+    return what + ": the caller's list was changed";
+  return {};
+}
+
+void hostile_values_do_no_harm(IDispatch* u) {
+  const std::vector<Hostile> values = hostile_values();
+  std::vector<Slot> slots = slots_of(u);
+  std::erase_if(slots, waits_for_a_user);
+  // They meet the call that never returns; a thread that is asked to quit gets out of it.
+  PostQuitMessage(0);
+  for (const Slot& slot : slots) wrong_counts_are_refused(u, slot);
+  for (const Slot& slot : slots) {
+    std::string fault;
+    for (std::size_t place = 0; place < slot.parameters.size(); ++place) {
+      for (const Hostile& value : values) {
+        const std::string found = send(u, slot, place, value);
+        if (fault.empty()) fault = found;
+      }
+    }
+    check(fault.empty(), fault);
+  }
+  for (const wchar_t* name : {L"FolderBrowseForm", L"SplashForm", L"DrawTextPictureBox"})
+    put(u, name, Value::nothing());
+  for (const HostObject* object : {&with_value, &without_value, &failing})
+    check_equal(1U, object->references, "references to a host's object after all calls");
+  put(u, L"DebugMode", Value(short{0}));
+  check_equal(S_OK, use(u, L"Terminate").error, "Terminate");
 }
 
 }  // namespace
@@ -383,13 +430,16 @@ int wmain(int count, wchar_t** arguments) {
   const long wanted = count > 2 ? wcstol(arguments[2], nullptr, 10) : 40'000;
   const auto seed = static_cast<unsigned>(count > 3 ? wcstoul(arguments[3], nullptr, 10) : 1);
   return run_checks([wanted, seed] {
+    // What members take for the names of files shall not lie about.
     std::array<wchar_t, MAX_PATH> folder{};
     GetTempPathW(static_cast<DWORD>(folder.size()), folder.data());
     SetCurrentDirectoryW(folder.data());
-    free_texts_at_once();
+    const auto no_cache = GetProcAddress(GetModuleHandleW(L"oleaut32.dll"), "SetOaNoCache");
+    if (check(no_cache != nullptr, "SetOaNoCache")) no_cache();
     const Pointer<_ORVUtils> object = create_object();
-    HostWindows windows;
-    Calls calls(object.get(), windows);
-    memory_stays_flat(calls, object.get(), seed, wanted);
+    both_ways_agree(object.get(), seed, wanted);
+    null_pointers_are_refused(object.get());
+    null_pointers_are_refused(create_object<_cControlPosition>(CLSID_cControlPosition, IID__cControlPosition).get());
+    hostile_values_do_no_harm(object.get());
   });
 }

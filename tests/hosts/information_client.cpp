@@ -11,8 +11,6 @@ using namespace talutil::hosts;
 
 namespace {
 
-using Flag = Number<VARIANT_BOOL>;
-
 constexpr VARIANT_BOOL yes = VARIANT_TRUE;
 constexpr VARIANT_BOOL no = VARIANT_FALSE;
 constexpr LONG usual_colour = 0xC0E0FF;

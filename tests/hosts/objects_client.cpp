@@ -1,229 +1,212 @@
-// A client whose objects answer a use only as what the member is, and what the library makes of objects that fail.
+// A client with objects of its own, of third parties and of the example's windows, which answer a use only as what the
+// member is; and what the library makes of objects that fail.
 #include <cmath>
 
 #include "examples/host/window_objects.hpp"
+#include "hostile_values.hpp"
 #include "table_object.hpp"
-#include "typed_picture_box.hpp"
 
 using namespace talutil::hosts;
 
 namespace {
 
-HRESULT draw(_ORVUtils* u, const wchar_t* text) {
-  return u->MyDrawText(Short{10}, Short{20}, Short{50}, Short{40}, Value(text), Long{255}, Short{0},
-                       Number<VARIANT_BOOL>{VARIANT_TRUE}, Number<VARIANT_BOOL>{});
-}
-
-void typed_picture_boxes_are_drawn_on(_ORVUtils* u) {
-  TypedPictureBox picture;
-  check_equal(S_OK, u->put_DrawTextPictureBox(Value(&picture).get()), "a picture box");
-  UndrivenObject undriven;
-  check_equal(run_time_error(13), u->put_DrawTextPictureBox(undriven.value().get()), "an object without automation");
-  check_equal(S_OK, draw(u, L"abc"), "a text that has room");
-  check_equal(L"abc bold in 255 at 300,350", picture.box.printed, "what the box printed");
-  check_equal(S_OK, draw(u, L"longer than the rectangle"), "a text that has none");
-  check_equal(L"abc bold in 255 at 300,350", picture.box.printed, "which is not printed");
-  check_equal(5, picture.box.colour, "the colour is put back");
-  u->put_DrawTextPictureBox(Value(static_cast<IDispatch*>(nullptr)).get());
+void picture_boxes_are_drawn_on(_ORVUtils* u) {
+  enum Member : DISPID { FontBold = 1, ForeColor, CurrentX, CurrentY, Context, ScaleMode, Scale, Width, Height, Print };
+  const HDC context = CreateCompatibleDC(nullptr);
+  std::array<double, 5> kept{0, 0, 5, 0, 0};
+  std::wstring printed;
+  HostObject picture({L"FontBold", L"ForeColor", L"CurrentX", L"CurrentY", L"hDC", L"ScaleMode", L"ScaleX",
+                      L"TextWidth", L"TextHeight", L"Print"},
+                     [&](const Use& use) {
+                       if (use.is_put()) {
+                         Value number;
+                         const HRESULT status = VariantChangeType(number, &use.argument(), 0, VT_R8);
+                         return kept.at(static_cast<std::size_t>(use.member)) = V_R8(&number.get()), status;
+                       }
+                       switch (use.member) {
+                         case Context:
+                           return use.answer(static_cast<LONG>(reinterpret_cast<LONG_PTR>(context)));
+                         case ScaleMode:
+                           return use.answer(1L);
+                         case Scale:
+                           return VariantCopy(use.result, &use.argument());
+                         case Width:
+                           return use.answer(100.0 * SysStringLen(V_BSTR(&use.argument())));
+                         case Height:
+                           return use.answer(200L);
+                         case Print:
+                           printed = view(V_BSTR(&use.argument()));
+                           for (const double value : kept) printed += L" " + std::to_wstring(std::lround(value));
+                           return S_OK;
+                         default:
+                           return use.answer(kept.at(static_cast<std::size_t>(use.member)));
+                       }
+                     });
+  check_equal(S_OK, put(u, L"DrawTextPictureBox", &picture), "a picture box");
+  for (const wchar_t* const text : {L"abc", L"longer than the rectangle, where it is not printed"}) {
+    const HRESULT status = u->MyDrawText(Short{10}, Short{20}, Short{50}, Short{40}, Value(text), Long{255}, Short{0},
+                                         Flag{VARIANT_TRUE}, Flag{});
+    check_equal(S_OK, status, narrow(text));
+    check_equal(L"abc 0 -1 255 300 350", printed, "what the box printed: its font, colour and place");
+  }
+  check_equal(5.0, kept[ForeColor], "the colour is put back");
+  put(u, L"DrawTextPictureBox", Value::nothing());
   check_equal(1U, picture.references, "references afterwards");
+  DeleteDC(context);
 }
 
 HWND window(const wchar_t* window_class, DWORD style, int x, int y, int width, int height, HWND parent) {
   return CreateWindowW(window_class, L"", style, x, y, width, height, parent, nullptr, nullptr, nullptr);
 }
 
-/// Holds one of the host's own objects, of which nothing must be left at the end.
-class Held {
- public:
-  Held(Scriptable* object, const char* name) : object_(object), name_(name) {}
-  Held(const Held&) = delete;
-  Held& operator=(const Held&) = delete;
-  ~Held() { check_equal(0U, object_->Release(), std::string("references to ") + name_); }
-  [[nodiscard]] Scriptable* get() const { return object_; }
-
- private:
-  Scriptable* object_;
-  const char* name_;
-};
-
-void controls_are_dragged_on_a_form() {
+/// The example host's own objects, of which nothing is left at the end.
+void windows_are_driven(_ORVUtils* u) {
   const HWND outer = window(L"Static", WS_OVERLAPPEDWINDOW, 0, 0, 400, 300, nullptr);
-  const Held form(form_object(outer), "the form");
-  const Held control(control_object(window(L"Static", WS_CHILD, 10, 10, 100, 50, outer), form.get()), "the control");
-  Pointer<_cControlPosition> position;
-  require(CoCreateInstance(CLSID_cControlPosition, nullptr, CLSCTX_INPROC_SERVER, IID__cControlPosition,
-                           position.receive_untyped()),
-          "creating TALUtil.cControlPosition");
+  Scriptable* const form = form_object(outer);
+  Scriptable* const control = control_object(window(L"Static", WS_CHILD, 10, 10, 100, 50, outer), form);
+  const auto position = create_object<_cControlPosition>(CLSID_cControlPosition, IID__cControlPosition);
   const float pixel = twips_per_pixel();
-  check_equal(S_OK, position->DragControl(Value(form.get()), Value(control.get()), 20 * pixel, 30 * pixel), "a drag");
+  check_equal(S_OK, position->DragControl(Value(form), Value(control), 20 * pixel, 30 * pixel), "a drag");
   LONG left = 0;
   LONG top = 0;
   position->get_left(&left);
   position->get_Top(&top);
-  check_equal(std::lround(30 * pixel), left, "its left");
-  check_equal(std::lround(40 * pixel), top, "its top");
+  check(left == std::lround(30 * pixel) && top == std::lround(40 * pixel), "where the control was dragged");
+
+  const HWND box = window(L"ComboBox", CBS_DROPDOWN, 0, 0, 100, 100, nullptr);
+  for (const LPARAM key : {7, 19, 42})
+    SendMessageW(box, CB_SETITEMDATA, static_cast<WPARAM>(SendMessageW(box, CB_ADDSTRING, 0, LPARAM(L"entry"))), key);
+  Scriptable* const combo = combo_object(box);
+  Long index;
+  check_equal(S_OK, u->GetComboListIndex(Value(combo), Long{42}, index), "a search for a key");
+  check_equal(2, index.value, "its index");
+  for (Scriptable* const object : {control, form, combo}) check_equal(0U, object->Release(), "references at the end");
+  DestroyWindow(box);
   DestroyWindow(outer);
 }
 
-void combo_entries_are_found(_ORVUtils* u) {
-  const HWND box = window(L"ComboBox", CBS_DROPDOWN, 0, 0, 100, 100, nullptr);
-  for (const LONG key : {7, 19, 42}) {
-    SendMessageW(box, CB_SETITEMDATA,
-                 static_cast<WPARAM>(SendMessageW(box, CB_ADDSTRING, 0, reinterpret_cast<LPARAM>(L"entry"))), key);
-  }
-  const Held combo(combo_object(box), "the combo");
-  LONG index = 0;
-  check_equal(S_OK, u->GetComboListIndex(Value(combo.get()), Long{42}, &index), "a search for a key");
-  check_equal(2, index, "its index");
-  DestroyWindow(box);
-}
-
-/// A search for what the combo's Text answers, here an object, in a control that takes it in one way or the other.
-std::wstring search_text_is_put(_ORVUtils* u, bool by_reference) {
-  std::wstring how = L"not at all";
-  HostObject text(HostObject::Kind::with_value);
-  const Held combo(new Scriptable, "the combo");
-  const auto take = [&](const wchar_t* way) {
-    return [&how, &text, way](const VARIANT& value) {
-      how = V_VT(&value) == VT_DISPATCH && V_DISPATCH(&value) == &text ? way : L"as another value";
+/// A search for what the combo's Text answers, here an object, in a control that takes it in one way alone.
+void search_texts_are_put(_ORVUtils* u) {
+  for (const bool by_reference : {true, false}) {
+    bool is_put = false;
+    const auto take = [&](const VARIANT& value) {
+      is_put = V_VT(&value) == VT_DISPATCH && V_DISPATCH(&value) == &with_value;
     };
-  };
-  const auto ignore = [](const VARIANT&) {};
-  const auto number = [] { return variant(LONG{0}); };
-  combo.get()->method(L"Refresh", {0, 0}, [](const Scriptable::Arguments&) { return VARIANT{}; });
-  combo.get()->property(L"Text", [&] { return variant(&text); });
-  combo.get()->property(L"SearchText", {}, by_reference ? Scriptable::Setter() : take(L"as a value"),
-                        by_reference ? take(L"by reference") : Scriptable::Setter());
-  for (const wchar_t* name : {L"ListIndex", L"ColumnSearch", L"SearchMethod", L"Action", L"SearchIndex"}) {
-    combo.get()->property(name, number, ignore);
+    auto* const combo = new Scriptable;
+    combo->property(L"Text", [] { return variant(&with_value); });
+    combo->property(L"SearchText", {}, by_reference ? Scriptable::Setter() : take,
+                    by_reference ? Scriptable::Setter(take) : Scriptable::Setter());
+    combo->method(L"Refresh", {0, 0}, [](const Scriptable::Arguments&) { return VARIANT{}; });
+    for (const wchar_t* name : {L"ListIndex", L"ColumnSearch", L"SearchMethod", L"Action", L"SearchIndex"})
+      combo->property(
+          name, [] { return variant(LONG{0}); }, [](const VARIANT&) {});
+    check_equal(S_OK, u->SearchCombo(Value(combo), Short{0}, Long()), "a search for an object");
+    check(is_put, by_reference ? "a property that keeps an object" : "one that takes any value");
+    check(combo->Release() == 0 && with_value.references == 1, "references afterwards");
   }
-  LONG index = 0;
-  check_equal(S_OK, u->SearchCombo(Value(combo.get()), Short{0}, &index), "a search for an object");
-  check_equal(1U, text.references, "references to it");
-  return how;
 }
 
-/// What a caller hears of an error: "source: description", help file and context.
-struct Heard {
-  HRESULT number = S_OK;
-  std::wstring text;
-  std::wstring help;
-};
-
-Heard early(_ORVUtils* u, Value& grid) {
-  Heard heard{u->SaveGridWidths(grid, Text(L"Grid"), Short{0}), {}, {}};
-  Pointer<IErrorInfo> error;
-  GetErrorInfo(0, error.receive());
-  if (!error) return heard;
-  Text help;
-  DWORD context = 0;
-  error->GetHelpFile(help);
-  error->GetHelpContext(&context);
-  heard.help = std::wstring(help.view()) + L"#" + std::to_wstring(context);
-  SetErrorInfo(0, error.get());
-  heard.text = error_text();
-  return heard;
+Outcome save_widths(_ORVUtils* u, Value& grid, bool is_early) {
+  if (!is_early) return use(u, L"SaveGridWidths", grid, L"Grid", short{0});
+  return early_outcome(u->SaveGridWidths(grid, Text(L"Grid"), Short{0}));
 }
 
-Heard late(_ORVUtils* u, Value& grid) {
-  DISPID id = 0;
-  auto* name = const_cast<wchar_t*>(L"SaveGridWidths");
-  require(u->GetIDsOfNames(IID_NULL, &name, 1, LOCALE_USER_DEFAULT, &id), "SaveGridWidths");
-  const Value start(short{0});
-  const Value section(L"Grid");
-  std::array<VARIANT, 3> arguments{start.get(), section.get(), grid.get()};
-  DISPPARAMS parameters{arguments.data(), nullptr, 3, 0};
-  EXCEPINFO exception{};
-  Heard heard{u->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters, nullptr, &exception, nullptr),
-              std::wstring(view(exception.bstrSource)) + L": " + std::wstring(view(exception.bstrDescription)),
-              std::wstring(view(exception.bstrHelpFile)) + L"#" + std::to_wstring(exception.dwHelpContext)};
-  if (heard.number == DISP_E_EXCEPTION) heard.number = exception.scode;
-  for (BSTR text : {exception.bstrSource, exception.bstrDescription, exception.bstrHelpFile}) SysFreeString(text);
-  return heard;
-}
-
-constexpr auto their_error = static_cast<HRESULT>(0x80041234U);
-
-HRESULT raise_with_help(EXCEPINFO* exception) {
-  exception->scode = their_error;
-  exception->bstrSource = SysAllocString(L"OtherGrid");
-  exception->bstrDescription = SysAllocString(L"The grid is busy.");
-  exception->bstrHelpFile = SysAllocString(L"grid.chm");
-  exception->dwHelpContext = 77;
+HRESULT raise_with_help(const Use& use) {
+  use.exception->scode = their_error;
+  use.exception->bstrSource = SysAllocString(L"OtherGrid");
+  use.exception->bstrDescription = SysAllocString(L"The grid is busy.");
+  use.exception->bstrHelpFile = SysAllocString(L"grid.chm");
+  use.exception->dwHelpContext = 77;
   return DISP_E_EXCEPTION;
 }
 
 template <HRESULT Code>
-HRESULT raise_bare(EXCEPINFO* exception) {
-  exception->scode = Code;
+HRESULT raise_bare(const Use& use) {
+  use.exception->scode = Code;
   return DISP_E_EXCEPTION;
 }
 
 template <HRESULT Code>
-HRESULT answer(EXCEPINFO*) {
+HRESULT answer(const Use&) {
   return Code;
 }
 
 void errors_of_objects_reach_the_caller(_ORVUtils* u) {
   constexpr auto unplugged = static_cast<HRESULT>(0x80070002U);  // Known to the system, unknown to hosts.
+  constexpr const wchar_t* of_the_system = nullptr;
   const struct {
-    const char* name;
-    HRESULT (*fails)(EXCEPINFO*);
+    HRESULT (*fails)(const Use&);
     HRESULT number;
-    const wchar_t* text;  ///< None: whatever the system calls it.
-    const wchar_t* help;
+    const wchar_t* text;
   } rows[] = {
-      {"with everything", raise_with_help, their_error, L"OtherGrid: The grid is busy.", L"grid.chm#77"},
-      {"with a number alone", raise_bare<unplugged>, unplugged, nullptr, L"#0"},
-      {"no exception", answer<unplugged>, unplugged, nullptr, L"#0"},
-      {"E_NOTIMPL", answer<E_NOTIMPL>, run_time_error(445), L"TALUtil.ORVUtils: Object doesn't support this action",
-       L"#0"},
-      {"E_ACCESSDENIED", answer<E_ACCESSDENIED>, run_time_error(70), L"TALUtil.ORVUtils: Permission denied", L"#0"},
-      {"E_NOINTERFACE", answer<E_NOINTERFACE>, run_time_error(430),
-       L"TALUtil.ORVUtils: Class does not support Automation or does not support expected interface", L"#0"},
-      {"DISP_E_NONAMEDARGS", answer<DISP_E_NONAMEDARGS>, run_time_error(446),
-       L"TALUtil.ORVUtils: Object doesn't support named arguments", L"#0"},
-      {"DISP_E_NOTACOLLECTION", answer<DISP_E_NOTACOLLECTION>, run_time_error(451),
-       L"TALUtil.ORVUtils: Property let procedure not defined and property get procedure did not return an object",
-       L"#0"},
+      {raise_with_help, their_error, L"OtherGrid: The grid is busy."},
+      {raise_bare<unplugged>, unplugged, of_the_system},
+      {answer<unplugged>, unplugged, of_the_system},
+      {answer<E_NOTIMPL>, run_time_error(445), L"TALUtil.ORVUtils: Object doesn't support this action"},
+      {answer<E_ACCESSDENIED>, run_time_error(70), L"TALUtil.ORVUtils: Permission denied"},
+      {answer<E_NOINTERFACE>, run_time_error(430),
+       L"TALUtil.ORVUtils: Class does not support Automation or does not support expected interface"},
+      {answer<DISP_E_NONAMEDARGS>, run_time_error(446), L"TALUtil.ORVUtils: Object doesn't support named arguments"},
+      {answer<DISP_E_NOTACOLLECTION>, run_time_error(451),
+       L"TALUtil.ORVUtils: Property let procedure not defined and property get procedure did not return an object"},
   };
   TableObject table(3, 1);
   Value grid(&table);
   for (const auto& row : rows) {
-    table.before = [&](DISPID, WORD, EXCEPINFO* exception) { return row.fails(exception); };
-    for (const auto hear : {early, late}) {
-      const Heard heard = hear(u, grid);
-      const std::string name = std::string(row.name) + (hear == early ? ", early" : ", late");
-      check_equal(row.number, heard.number, name);
-      check_equal(row.help, heard.help, name + ": its help");
-      if (row.text != nullptr) {
-        check_equal(row.text, heard.text, name);
-        continue;
-      }
+    table.before = row.fails;
+    for (const bool is_early : {true, false}) {
+      const Outcome heard = save_widths(u, grid, is_early);
+      const std::string name = shown(row.number) + (is_early ? ", early" : ", late");
+      check_equal(row.number, heard.error, name);
+      check_equal(row.number == their_error ? L"grid.chm#77" : L"#0", heard.help, name + ": its help");
       const bool is_general = heard.text.find(L"Application-defined") != std::wstring::npos;
-      check(heard.text.starts_with(L": ") && heard.text.size() > 2 && !is_general, name + ": " + narrow(heard.text));
+      if (row.text != of_the_system)
+        check_equal(row.text, heard.text, name);
+      else
+        check(heard.text.starts_with(L": ") && heard.text.size() > 2 && !is_general, name + ": " + narrow(heard.text));
     }
   }
   check_equal(2U, table.references, "references after errors");
+
+  std::pair<Value, int> others[] = {
+      {Value::undriven(), 13}, {Value(&with_value), 438}, {Value::nothing(), 91}, {Value::null(), 424}};
+  for (auto& [other, number] : others) {
+    for (const bool is_early : {true, false})
+      check_equal(run_time_error(number), save_widths(u, other, is_early).error, "what cannot be driven");
+  }
 }
 
-void what_cannot_be_driven_is_an_error(_ORVUtils* u) {
-  UndrivenObject undriven;
-  HostObject other(HostObject::Kind::with_value);
-  struct {
-    const char* name;
-    Value grid;
-    int error;
-  } rows[] = {
-      {"an object without automation", undriven.value(), 13},
-      {"an object without the members", Value(&other), 438},
-      {"an empty reference", Value(static_cast<IDispatch*>(nullptr)), 91},
-      {"Null", Value::null(), 424},
+void grids_are_driven(_ORVUtils* u) {
+  TableObject table(10000, 1);
+  // A variable of a script within a variable: the object is found behind both.
+  Value inner(&table);
+  Value outer(&inner.get());
+  Value outermost(&outer.get());
+  Long count;
+  u->SelectGridRows(Long{0}, outermost, Short{1});
+  check_equal(L"True", table.text(9999, 0), "the last row is ticked");
+  u->CountGridSelectedRows(Long{0}, outermost, count);
+  check_equal(10000, count.value, "the ticked rows");
+  check_equal(2, std::ranges::max(table.look_ups), "a member is looked up once a call");
+
+  // The host lets go of its variable, and calls the library again, in the middle of a call.
+  Long pages;
+  table.before = [&](const Use& use) {
+    if (use.member != TableObject::TextMatrix) return S_OK;
+    inner = Value();
+    return u->GetMaxPages(Long{4}, Long{14}, pages);
   };
-  for (auto& row : rows) {
-    check_equal(run_time_error(row.error), early(u, row.grid).number, std::string(row.name) + ", early");
-    check_equal(run_time_error(row.error), late(u, row.grid).number, std::string(row.name) + ", late");
-  }
+  u->SelectGridRows(Long{0}, outermost, Short{0});
+  check_equal(L"False", table.text(9999, 0), "the grid is kept for as long as the call");
+  check_equal(4, pages.value, "a call within a call");
+  check_equal(1U, table.references, "references that are left");
+}
+
+void grids_are_created() {
+  CLSID class_id;
+  require(CLSIDFromProgID(L"TALUtil.Grid", &class_id), "the class of TALUtil.Grid");
+  const auto grid = create_object<IDispatch>(class_id, IID_IDispatch);
+  check_equal(run_time_error(5), put(grid.get(), L"Rows", -1L), "a negative number of rows");
 }
 
 }  // namespace
@@ -231,14 +214,10 @@ void what_cannot_be_driven_is_an_error(_ORVUtils* u) {
 int wmain(int, wchar_t**) {
   return run_checks([] {
     const Pointer<_ORVUtils> object = create_object();
-    _ORVUtils* const u = object.get();
-    typed_picture_boxes_are_drawn_on(u);
-    controls_are_dragged_on_a_form();
-    combo_entries_are_found(u);
-    check_equal(L"by reference", search_text_is_put(u, true), "a property that keeps an object");
-    check_equal(L"as a value", search_text_is_put(u, false), "one that takes any value");
-    errors_of_objects_reach_the_caller(u);
-    what_cannot_be_driven_is_an_error(u);
+    for (const auto check_part : {picture_boxes_are_drawn_on, windows_are_driven, search_texts_are_put,
+                                  errors_of_objects_reach_the_caller, grids_are_driven})
+      check_part(object.get());
+    grids_are_created();
     object->Terminate();
   });
 }

@@ -27,8 +27,8 @@ wchar_t* text(const wchar_t* constant) { return const_cast<wchar_t*>(constant); 
 void install_printer(const std::wstring& output) {
   std::array<wchar_t, MAX_PATH> folder{};
   DWORD needed = 0;
-  GetPrinterDriverDirectoryW(nullptr, text(printer_environment), 1, reinterpret_cast<BYTE*>(folder.data()), sizeof folder,
-                             &needed);
+  GetPrinterDriverDirectoryW(nullptr, text(printer_environment), 1, reinterpret_cast<BYTE*>(folder.data()),
+                             sizeof folder, &needed);
   std::wstring description = std::wstring(folder.data()) + L"\\test.ppd";
   EnumResourceNamesW(LoadLibraryW(L"winspool.drv"), L"PPDFILE", &save_description,
                      reinterpret_cast<LONG_PTR>(description.c_str()));

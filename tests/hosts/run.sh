@@ -70,13 +70,11 @@ restart_wine
 client registration
 expect_success "regsvr32, for the machine and for the user" wine regsvr32.exe /s /i:user "$dll"
 client type_library
+client start
 client early
 client late
-client harsh
-client apartment
-client agreement
 client objects
-client control
+client agreement
 rm -f "$pictures"/*.png
 take_pictures &
 pictures_pid=$!

@@ -6,58 +6,19 @@
 namespace talutil::hosts {
 
 struct SlotParameter {
-  VARTYPE type;                ///< VT_PTR for one passed by reference.
-  VARTYPE referenced;          ///< What a pointer points to; VT_EMPTY otherwise.
-  WORD flags;                  ///< PARAMFLAG_...
-  std::wstring default_value;  ///< Its type and, as a text, the value of one that can be left out.
+  VARTYPE type;        ///< VT_PTR for one passed by reference.
+  VARTYPE referenced;  ///< What a pointer points to; VT_EMPTY otherwise.
+  [[nodiscard]] VARTYPE bare() const noexcept { return type == VT_PTR ? referenced : type; }
 };
 
 struct Slot {
   std::wstring name;
-  std::wstring help;
   DISPID identifier;
-  INVOKEKIND kind;
+  WORD kind;
   short offset;  ///< Of the function within the vtable, in bytes.
-  std::vector<std::wstring> names;
-  std::vector<SlotParameter> parameters;  ///< The result is the last, flagged PARAMFLAG_FRETVAL.
+  std::vector<SlotParameter> parameters;
+  VARTYPE result = VT_EMPTY;
 };
-
-/// "3: 7" of a 32-bit 7.
-inline std::wstring typed_text(const VARIANT& value) {
-  Value text;
-  require(VariantChangeType(text, const_cast<VARIANT*>(&value), 0, VT_BSTR), "VariantChangeType");
-  return std::to_wstring(V_VT(&value)) + L": " + std::wstring(text.text());
-}
-
-inline Slot slot_of(ITypeInfo* information, UINT index) {
-  FUNCDESC* function = nullptr;
-  require(information->GetFuncDesc(index, &function), "GetFuncDesc");
-  Slot slot{{}, {}, function->memid, function->invkind, function->oVft, {}, {}};
-  std::array<BSTR, 16> names{};
-  UINT count = 0;
-  require(information->GetNames(function->memid, names.data(), static_cast<UINT>(names.size()), &count), "GetNames");
-  Text help;
-  information->GetDocumentation(function->memid, nullptr, help, nullptr, nullptr);
-  slot.help = help.view();
-  for (UINT i = 0; i < count; ++i) {
-    if (i == 0)
-      slot.name = view(names[i]);
-    else
-      slot.names.emplace_back(view(names[i]));
-    SysFreeString(names[i]);
-  }
-  for (short i = 0; i < function->cParams; ++i) {
-    const ELEMDESC& element = function->lprgelemdescParam[i];
-    const bool by_reference = element.tdesc.vt == VT_PTR;
-    const PARAMDESC& described = element.paramdesc;
-    slot.parameters.push_back(
-        {element.tdesc.vt, by_reference ? element.tdesc.lptdesc->vt : VARTYPE{VT_EMPTY}, described.wParamFlags, {}});
-    if ((described.wParamFlags & PARAMFLAG_FHASDEFAULT) == 0) continue;
-    slot.parameters.back().default_value = typed_text(described.pparamdescex->varDefaultValue);
-  }
-  information->ReleaseFuncDesc(function);
-  return slot;
-}
 
 /// The vtable side of a dual interface.
 inline Pointer<ITypeInfo> vtable_information(ITypeInfo* dual) {
@@ -68,21 +29,39 @@ inline Pointer<ITypeInfo> vtable_information(ITypeInfo* dual) {
   return result;
 }
 
-/// The members of an interface in the order of the type library, without those of IUnknown and IDispatch.
-inline std::vector<Slot> slots_of(ITypeInfo* information) {
+inline TYPEATTR attributes_of(ITypeInfo* information) {
   TYPEATTR* attributes = nullptr;
   require(information->GetTypeAttr(&attributes), "GetTypeAttr");
-  const UINT count = attributes->cFuncs;
+  const TYPEATTR result = *attributes;
   information->ReleaseTypeAttr(attributes);
-  std::vector<Slot> result;
-  for (UINT i = 0; i < count; ++i) result.push_back(slot_of(information, i));
   return result;
 }
 
+/// The members of an object's interface in the order of the type library, without those of IUnknown and IDispatch.
 inline std::vector<Slot> slots_of(IDispatch* object) {
-  Pointer<ITypeInfo> information;
-  require(object->GetTypeInfo(0, LOCALE_USER_DEFAULT, information.receive()), "GetTypeInfo");
-  return slots_of(vtable_information(information.get()).get());
+  Pointer<ITypeInfo> dual;
+  require(object->GetTypeInfo(0, LOCALE_USER_DEFAULT, dual.receive()), "GetTypeInfo");
+  const Pointer<ITypeInfo> information = vtable_information(dual.get());
+  std::vector<Slot> result;
+  for (UINT index = 0; index < attributes_of(information.get()).cFuncs; ++index) {
+    FUNCDESC* function = nullptr;
+    require(information->GetFuncDesc(index, &function), "GetFuncDesc");
+    Text name;
+    information->GetDocumentation(function->memid, name, nullptr, nullptr, nullptr);
+    Slot slot{std::wstring(name.view()), function->memid, static_cast<WORD>(function->invkind), function->oVft, {}};
+    for (short i = 0; i < function->cParams; ++i) {
+      const ELEMDESC& element = function->lprgelemdescParam[i];
+      const bool by_reference = element.tdesc.vt == VT_PTR;
+      const SlotParameter parameter{element.tdesc.vt, by_reference ? element.tdesc.lptdesc->vt : VARTYPE{VT_EMPTY}};
+      if ((element.paramdesc.wParamFlags & PARAMFLAG_FRETVAL) != 0)
+        slot.result = parameter.referenced;
+      else
+        slot.parameters.push_back(parameter);
+    }
+    information->ReleaseFuncDesc(function);
+    result.push_back(std::move(slot));
+  }
+  return result;
 }
 
 }  // namespace talutil::hosts

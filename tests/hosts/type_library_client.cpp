@@ -1,161 +1,169 @@
-// A client that reads the type library out of the DLL, as development tools do, and compares it with the table.
-#include "library/c_control_position.hpp"
-#include "library/interface_table.hpp"
+// A client that reads the type library out of the DLL, as development tools do, and writes down what it finds: the same
+// text as the published definition, which is made from the interface table.
+#include <sstream>
+
+#include "library/interface_definition.hpp"
 #include "slots.hpp"
 
 using namespace talutil::hosts;
 
 namespace {
 
-using talutil::Access;
-using talutil::Member;
-using talutil::Parameter;
-using talutil::Passing;
-using talutil::ValueType;
-
-Pointer<ITypeInfo> type_named(ITypeLib* library, const wchar_t* name) {
-  Pointer<ITypeInfo> found;
-  MEMBERID member = 0;
-  USHORT count = 1;
-  require(library->FindName(const_cast<wchar_t*>(name), 0, found.receive(), &member, &count), "FindName");
-  return count == 0 ? Pointer<ITypeInfo>() : found;
+std::wstring quoted(std::wstring_view text) {
+  std::wstring result = L"\"";
+  for (const wchar_t c : text) result += (c == L'"' || c == L'\\' ? L"\\" : L"") + std::wstring(1, c);
+  return result + L"\"";
 }
 
-TYPEATTR attributes_of(ITypeInfo* information) {
-  TYPEATTR* attributes = nullptr;
-  require(information->GetTypeAttr(&attributes), "GetTypeAttr");
-  const TYPEATTR result = *attributes;
-  information->ReleaseTypeAttr(attributes);
-  return result;
+std::wstring identifier_text(const GUID& id) {
+  std::array<wchar_t, 40> text{};
+  StringFromGUID2(id, text.data(), static_cast<int>(text.size()));
+  return L"uuid(" + std::wstring(&text[1], 36) + L")";
 }
 
-std::wstring name_of(ITypeInfo* information) {
+/// The name and the help string of a type or of one of its members.
+std::pair<std::wstring, std::wstring> documentation(ITypeInfo* information, MEMBERID member = MEMBERID_NIL) {
   Text name;
-  information->GetDocumentation(MEMBERID_NIL, name, nullptr, nullptr, nullptr);
-  return std::wstring(name.view());
+  Text help;
+  require(information->GetDocumentation(member, name, help, nullptr, nullptr), "GetDocumentation");
+  return {std::wstring(name.view()), L"helpstring(" + quoted(help.view()) + L")"};
 }
 
-void class_has_default_interface(ITypeLib* library, const CLSID& class_id, const IID& interface_id) {
-  Pointer<ITypeInfo> information;
-  require(library->GetTypeInfoOfGuid(class_id, information.receive()), "GetTypeInfoOfGuid");
-  const std::string name = narrow(name_of(information.get()));
-  check_equal(static_cast<int>(TKIND_COCLASS), static_cast<int>(attributes_of(information.get()).typekind), name);
-  check((attributes_of(information.get()).wTypeFlags & TYPEFLAG_FCANCREATE) != 0, name + " can be created");
-  int flags = 0;
+std::wstring type_text(ITypeInfo* information, const TYPEDESC& type) {
+  constexpr std::pair<VARTYPE, const wchar_t*> names[] = {
+      {VT_BOOL, L"VARIANT_BOOL"}, {VT_I2, L"short"},        {VT_I4, L"long"},
+      {VT_R4, L"float"},          {VT_DATE, L"DATE"},       {VT_BSTR, L"BSTR"},
+      {VT_UI1, L"unsigned char"}, {VT_VARIANT, L"VARIANT"}, {VT_HRESULT, L"HRESULT"}};
+  if (type.vt == VT_PTR) return type_text(information, *type.lptdesc) + L"*";
+  if (type.vt == VT_SAFEARRAY) return L"SAFEARRAY(" + type_text(information, *type.lptdesc) + L")";
+  if (type.vt == VT_CARRAY) return type_text(information, type.lpadesc->tdescElem);
+  if (type.vt == VT_USERDEFINED) {
+    Pointer<ITypeInfo> other;
+    require(information->GetRefTypeInfo(type.hreftype, other.receive()), "GetRefTypeInfo");
+    return documentation(other.get()).first;
+  }
+  const auto* const found = std::ranges::find(names, type.vt, [](const auto& row) { return row.first; });
+  return found == std::end(names) ? L"type " + std::to_wstring(type.vt) : found->second;
+}
+
+std::wstring parameter_text(ITypeInfo* information, const ELEMDESC& parameter, std::wstring_view name) {
+  constexpr std::pair<USHORT, const wchar_t*> flags[] = {
+      {PARAMFLAG_FIN, L"in"}, {PARAMFLAG_FOUT, L"out"}, {PARAMFLAG_FRETVAL, L"retval"}, {PARAMFLAG_FOPT, L"optional"}};
+  std::wstring result;
+  for (const auto& [flag, word] : flags) {
+    if ((parameter.paramdesc.wParamFlags & flag) != 0) result += (result.empty() ? L"[" : L", ") + std::wstring(word);
+  }
+  if ((parameter.paramdesc.wParamFlags & PARAMFLAG_FHASDEFAULT) != 0) {
+    VARIANT& value = parameter.paramdesc.pparamdescex->varDefaultValue;
+    Value text;
+    require(VariantChangeType(text, &value, 0, VT_BSTR), "VariantChangeType");
+    check_equal(parameter.tdesc.lptdesc->vt, V_VT(&value), narrow(name) + ", the type of its default");
+    result += L", defaultvalue(" + (V_VT(&value) == VT_BSTR ? quoted(text.text()) : std::wstring(text.text())) + L")";
+  }
+  return result + L"] " + type_text(information, parameter.tdesc) + L" " + std::wstring(name);
+}
+
+std::wstring function_text(ITypeInfo* information, UINT index) {
+  FUNCDESC* function = nullptr;
+  require(information->GetFuncDesc(index, &function), "GetFuncDesc");
+  const auto [name, help] = documentation(information, function->memid);
+  check_equal(sizeof(void*) * (7 + index), static_cast<std::size_t>(function->oVft), narrow(name) + ", its offset");
+  std::array<BSTR, 16> names{};
+  UINT count = 0;
+  require(information->GetNames(function->memid, names.data(), static_cast<UINT>(names.size()), &count), "GetNames");
+  std::wostringstream out;
+  out << L"    [id(0x" << std::hex << function->memid << L")"
+      << (function->invkind == INVOKE_PROPERTYGET   ? L", propget, "
+          : function->invkind == INVOKE_PROPERTYPUT ? L", propput, "
+                                                    : L", ")
+      << help << L"]\n    " << type_text(information, function->elemdescFunc.tdesc) << L" " << name << L"(";
+  for (short i = 0; i < function->cParams; ++i) {
+    const ELEMDESC& parameter = function->lprgelemdescParam[i];
+    const bool is_result = (parameter.paramdesc.wParamFlags & PARAMFLAG_FRETVAL) != 0;
+    // Neither the name of a result is published nor that of a put's value.
+    const std::wstring_view parameter_name = is_result                                 ? L"result"
+                                             : function->invkind == INVOKE_PROPERTYPUT ? L"value"
+                                                                                       : view(names[1 + i]);
+    out << (i == 0 ? L"" : L", ") << parameter_text(information, parameter, parameter_name);
+  }
+  for (const BSTR text : names) SysFreeString(text);
+  information->ReleaseFuncDesc(function);
+  return out.str() + L");\n";
+}
+
+std::wstring interface_text(ITypeInfo* dual) {
+  const TYPEATTR attributes = attributes_of(dual);
+  const auto word = [&](WORD flag, const wchar_t* name) { return (attributes.wTypeFlags & flag) != 0 ? name : L""; };
+  // What is dual can only be passed by automation.
+  std::wstring result = L"\n  [odl, " + identifier_text(attributes.guid) +
+                        word(TYPEFLAG_FDUAL, L", dual, oleautomation") + word(TYPEFLAG_FHIDDEN, L", hidden") +
+                        word(TYPEFLAG_FNONEXTENSIBLE, L", nonextensible");
+  result += L"]\n  interface " + documentation(dual).first + L" : IDispatch {\n";
+  const Pointer<ITypeInfo> information = vtable_information(dual);
+  const UINT count = attributes_of(information.get()).cFuncs;
+  for (UINT i = 0; i < count; ++i) result += function_text(information.get(), i);
+  return result + L"  };\n";
+}
+
+std::wstring record_text(ITypeInfo* record) {
+  const TYPEATTR attributes = attributes_of(record);
+  const std::wstring name = documentation(record).first;
+  std::wstring result = L"\n  typedef [" + identifier_text(attributes.guid) + L"] struct " + name + L" {\n";
+  for (UINT i = 0; i < attributes.cVars; ++i) {
+    VARDESC* field = nullptr;
+    require(record->GetVarDesc(i, &field), "GetVarDesc");
+    const TYPEDESC& type = field->elemdescVar.tdesc;
+    result += L"    " + type_text(record, type) + L" " + documentation(record, field->memid).first;
+    if (type.vt == VT_CARRAY) result += L"[" + std::to_wstring(type.lpadesc->rgbounds[0].cElements) + L"]";
+    result += L";\n";
+    record->ReleaseVarDesc(field);
+  }
+  const ULONG size = name == L"FILETIME" ? 8 : 16;
+  check_equal(size, attributes.cbSizeInstance, narrow(name) + ", its size");
+  return result + L"  } " + name + L";\n";
+}
+
+std::wstring class_text(ITypeInfo* information) {
+  const TYPEATTR attributes = attributes_of(information);
+  const auto [name, help] = documentation(information);
   HREFTYPE reference = 0;
-  Pointer<ITypeInfo> interface_information;
+  int flags = 0;
+  Pointer<ITypeInfo> first;
+  require(information->GetRefTypeOfImplType(0, &reference), "GetRefTypeOfImplType");
+  require(information->GetRefTypeInfo(reference, first.receive()), "GetRefTypeInfo");
   information->GetImplTypeFlags(0, &flags);
-  check_equal(IMPLTYPEFLAG_FDEFAULT, flags, name + ", its first interface");
-  information->GetRefTypeOfImplType(0, &reference);
-  require(information->GetRefTypeInfo(reference, interface_information.receive()), "GetRefTypeInfo");
-  const TYPEATTR attributes = attributes_of(interface_information.get());
-  check(attributes.guid == interface_id, name + ", the identifier of its interface");
-  check((attributes.wTypeFlags & TYPEFLAG_FDUAL) != 0, name + ", its interface is dual");
+  check((attributes.wTypeFlags & TYPEFLAG_FCANCREATE) != 0, narrow(name) + " can be created");
+  return L"\n  [" + identifier_text(attributes.guid) + L", " + help + L"]\n  coclass " + name + L" {\n    " +
+         (flags == IMPLTYPEFLAG_FDEFAULT ? L"[default] " : L"") + L"interface " + documentation(first.get()).first +
+         L";\n  };\n";
 }
 
-struct RecordRow {
-  const wchar_t* name;
-  ULONG size;
-  const wchar_t* fields;
-};
-
-void records_have_their_fields(ITypeLib* library) {
-  const RecordRow rows[] = {
-      {L"SYSTEMTIME", 16, L"wYear:2 wMonth:2 wDayOfWeek:2 wDay:2 wHour:2 wMinute:2 wSecond:2 wMilliseconds:2 "},
-      {L"FILETIME", 8, L"dwLowDateTime:3 dwHighDateTime:3 "},
-      {L"GUID", 16, L"Data1:3 Data2:2 Data3:2 Data4:28 "},
-      {L"TRect", 16, L"left:3 Top:3 Right:3 Bottom:3 "},
-  };
-  for (const RecordRow& row : rows) {
-    const Pointer<ITypeInfo> record = type_named(library, row.name);
-    if (!check(record.get() != nullptr, "the record " + narrow(row.name))) continue;
-    const TYPEATTR attributes = attributes_of(record.get());
-    check_equal(static_cast<int>(TKIND_RECORD), static_cast<int>(attributes.typekind), narrow(row.name));
-    check_equal(row.size, attributes.cbSizeInstance, narrow(row.name) + ", its size");
-    std::wstring fields;
-    for (UINT i = 0; i < attributes.cVars; ++i) {
-      VARDESC* field = nullptr;
-      require(record->GetVarDesc(i, &field), "GetVarDesc");
-      Text name;
-      record->GetDocumentation(field->memid, name, nullptr, nullptr, nullptr);
-      fields += std::wstring(name.view()) + L":" + std::to_wstring(field->elemdescVar.tdesc.vt) + L" ";
-      record->ReleaseVarDesc(field);
-    }
-    check_equal(row.fields, fields, narrow(row.name) + ", its fields and their types");
+std::wstring library_text(ITypeLib* library) {
+  TLIBATTR* attributes = nullptr;
+  Text name;
+  Text help;
+  require(library->GetLibAttr(&attributes), "GetLibAttr");
+  library->GetDocumentation(MEMBERID_NIL, name, help, nullptr, nullptr);
+  std::wstring result = L"[" + identifier_text(attributes->guid) + L", version(" +
+                        std::to_wstring(attributes->wMajorVerNum) + L"." + std::to_wstring(attributes->wMinorVerNum) +
+                        L"), helpstring(" + quoted(help.view()) + L")]\nlibrary " + std::wstring(name.view()) +
+                        L" {\n  importlib(\"stdole2.tlb\");\n";
+  library->ReleaseTLibAttr(attributes);
+  for (UINT i = 0; i < library->GetTypeInfoCount(); ++i) {
+    Pointer<ITypeInfo> information;
+    require(library->GetTypeInfo(i, information.receive()), "GetTypeInfo");
+    const TYPEKIND kind = attributes_of(information.get()).typekind;
+    const auto write = kind == TKIND_RECORD ? record_text : kind == TKIND_COCLASS ? class_text : interface_text;
+    result += write(information.get());
+    // Tools look types up by their names.
+    std::wstring type_name = documentation(information.get()).first;
+    Pointer<ITypeInfo> found;
+    MEMBERID member = 0;
+    USHORT count = 1;
+    library->FindName(type_name.data(), 0, found.receive(), &member, &count);
+    check(count == 1 && documentation(found.get()).first == type_name, narrow(type_name) + " is found by its name");
   }
-}
-
-VARTYPE automation_type(ValueType type) {
-  switch (type) {
-    case ValueType::boolean:
-      return VT_BOOL;
-    case ValueType::int16:
-      return VT_I2;
-    case ValueType::int32:
-      return VT_I4;
-    case ValueType::single:
-      return VT_R4;
-    case ValueType::date:
-      return VT_DATE;
-    case ValueType::text:
-      return VT_BSTR;
-    case ValueType::variant:
-      return VT_VARIANT;
-    case ValueType::text_array:
-      return VT_SAFEARRAY;
-    case ValueType::system_time:
-      return VT_USERDEFINED;
-    default:
-      return VT_VOID;
-  }
-}
-
-void parameter_is_as_in_the_table(const std::string& what, const Parameter& expected, const SlotParameter& got) {
-  const bool by_value = expected.passing == Passing::by_value;
-  check_equal(by_value ? automation_type(expected.type) : VARTYPE{VT_PTR}, got.type, what + ", its type");
-  if (!by_value) check_equal(automation_type(expected.type), got.referenced, what + ", what it points to");
-  const int direction = by_value ? PARAMFLAG_FIN : PARAMFLAG_FIN | PARAMFLAG_FOUT;
-  const int optional = expected.is_optional ? PARAMFLAG_FOPT | PARAMFLAG_FHASDEFAULT : 0;
-  check_equal(direction | optional, static_cast<int>(got.flags), what + ", its flags");
-  if (!expected.is_optional) return;
-  const std::wstring text(expected.default_text.begin(), expected.default_text.end());
-  Value value = expected.type == ValueType::text ? Value(text) : Value(LONG{expected.default_number});
-  require(VariantChangeType(value, value, 0, automation_type(expected.type)), "VariantChangeType");
-  check_equal(typed_text(value.get()), got.default_value, what + ", its default");
-}
-
-void slot_is_as_in_the_table(const Member& expected, const Slot& slot, std::size_t index) {
-  const std::string name(expected.name);
-  const INVOKEKIND kinds[] = {INVOKE_FUNC, INVOKE_PROPERTYGET, INVOKE_PROPERTYPUT};
-  check_equal("\"" + name + "\"", narrow(slot.name), "slot " + std::to_string(index));
-  check_equal("\"" + std::string(expected.help) + "\"", narrow(slot.help), name + ", its help string");
-  check(!slot.help.empty(), name + " has a help string");
-  check_equal(static_cast<int>(kinds[static_cast<int>(expected.access)]), static_cast<int>(slot.kind),
-              name + ", how it is used");
-  check_equal(static_cast<short>(sizeof(void*) * (7 + index)), slot.offset, name + ", its offset in the vtable");
-  check_equal(expected.identifier, slot.identifier, name + ", its identifier");
-  const auto parameters = expected.parameters();
-  const bool has_result = expected.result != ValueType::none;
-  if (!check_equal(parameters.size() + (has_result ? 1 : 0), slot.parameters.size(), name + ", its parameters")) return;
-  for (std::size_t i = 0; i < parameters.size(); ++i) {
-    parameter_is_as_in_the_table(name + ", " + std::string(parameters[i].name), parameters[i], slot.parameters[i]);
-    // The name of a put's value is not published.
-    if (expected.access == Access::call && i < slot.names.size())
-      check_equal("\"" + std::string(parameters[i].name) + "\"", narrow(slot.names[i]), name + ", a parameter's name");
-  }
-  if (!has_result) return;
-  check_equal(automation_type(expected.result), slot.parameters.back().referenced, name + ", its result");
-  check_equal(PARAMFLAG_FOUT | PARAMFLAG_FRETVAL, static_cast<int>(slot.parameters.back().flags),
-              name + ", its result");
-}
-
-template <class Table>
-void interface_is_as_in_the_table(ITypeLib* library, const IID& id, const Table& table) {
-  Pointer<ITypeInfo> dual;
-  require(library->GetTypeInfoOfGuid(id, dual.receive()), "GetTypeInfoOfGuid");
-  const std::vector<Slot> slots = slots_of(vtable_information(dual.get()).get());
-  if (!check_equal(table.size(), slots.size(), "slots")) return;
-  for (std::size_t i = 0; i < slots.size(); ++i) slot_is_as_in_the_table(table[i], slots[i], i);
+  return result + L"};\n";
 }
 
 }  // namespace
@@ -165,15 +173,15 @@ int wmain(int, wchar_t** arguments) {
     Pointer<ITypeLib> library;
     const std::wstring path = std::wstring(arguments[1]) + L"\\TALUtil.dll";
     require(LoadTypeLibEx(path.c_str(), REGKIND_NONE, library.receive()), "LoadTypeLibEx");
-    TLIBATTR* attributes = nullptr;
-    require(library->GetLibAttr(&attributes), "GetLibAttr");
-    check(attributes->guid == LIBID_TALUtil && attributes->wMajorVerNum == 1 && attributes->wMinorVerNum == 0,
-          "identifier and version of the library");
-    library->ReleaseTLibAttr(attributes);
-    class_has_default_interface(library.get(), CLSID_ORVUtils, IID__ORVUtils);
-    class_has_default_interface(library.get(), CLSID_cControlPosition, IID__cControlPosition);
-    records_have_their_fields(library.get());
-    interface_is_as_in_the_table(library.get(), IID__ORVUtils, talutil::described<talutil::ORVUtils>);
-    interface_is_as_in_the_table(library.get(), IID__cControlPosition, talutil::described<talutil::cControlPosition>);
+    const std::string expected = talutil::interface_definition();
+    std::wistringstream published(std::wstring(expected.begin(), expected.end()));
+    std::wistringstream found(library_text(library.get()));
+    std::wstring line;
+    std::wstring expected_line;
+    for (int number = 1; std::getline(published, expected_line); ++number) {
+      std::getline(found, line);
+      check_equal(expected_line, line, "line " + std::to_string(number));
+    }
+    check(!std::getline(found, line), "nothing after the last line");
   });
 }

@@ -1,0 +1,220 @@
+// What only a process that begins can show: when the library may be unloaded, a third-party control in the place of
+// ours, which tells the name of the computer, and two threads, each with an object of its own: start_client FOLDER
+// [CALLS].
+#include "client.hpp"
+
+using namespace talutil::hosts;
+
+namespace {
+
+constexpr CLSID control_class = {0x5B1E7A10, 0x7C5D, 0x4E0A, {0x9D, 0x52, 0x11, 0x3A, 0x60, 0x9F, 0x27, 0xC4}};
+constexpr const wchar_t* control_class_text = L"{5B1E7A10-7C5D-4E0A-9D52-113A609F27C4}";
+constexpr const wchar_t* missing_class_text = L"{5B1E7A10-7C5D-4E0A-9D52-113A609F27C5}";
+constexpr const wchar_t* program_id = L"TALUtilTest.SystemInformation";
+constexpr const wchar_t* controls_key = L"Software\\TALUtil\\Controls";
+constexpr const wchar_t* program_key = L"Software\\Classes\\TALUtilTest.SystemInformation";
+constexpr const wchar_t* information_control = L"SystemInfoControl.MSysInfo";
+constexpr const wchar_t* grid_control = L"VSFlex8Ctl.VSFlexGrid";
+
+/// The maker of the control, which is one object that knows one identifier and no names.
+class Factory final : public IClassFactory {
+ public:
+  const wchar_t* answer = L"";
+  HostObject control{{}, [this](const Use& use) {
+                       if (use.member != 0x68030010 || (use.flags & DISPATCH_PROPERTYGET) == 0)
+                         return DISP_E_MEMBERNOTFOUND;
+                       return use.given.cArgs == 0 ? use.answer(answer) : DISP_E_BADPARAMCOUNT;
+                     }};
+
+  Factory() {
+    require(CoRegisterClassObject(control_class, this, CLSCTX_INPROC_SERVER, REGCLS_MULTIPLEUSE, &registration_),
+            "CoRegisterClassObject");
+  }
+  Factory(const Factory&) = delete;
+  Factory& operator=(const Factory&) = delete;
+  ~Factory() { CoRevokeClassObject(registration_); }
+
+  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** out) override {
+    *out = id == IID_IUnknown || id == IID_IClassFactory ? this : nullptr;
+    return *out == nullptr ? E_NOINTERFACE : S_OK;
+  }
+  ULONG STDMETHODCALLTYPE AddRef() override { return 2; }
+  ULONG STDMETHODCALLTYPE Release() override { return 1; }
+  HRESULT STDMETHODCALLTYPE CreateInstance(IUnknown*, REFIID id, void** out) override {
+    return control.QueryInterface(id, out);
+  }
+  HRESULT STDMETHODCALLTYPE LockServer(BOOL) override { return S_OK; }
+
+ private:
+  DWORD registration_ = 0;
+};
+
+/// Values that the client writes to the registry, which go with it.
+struct Registry {
+  Registry() { clean(); }
+  Registry(const Registry&) = delete;
+  Registry& operator=(const Registry&) = delete;
+  ~Registry() { clean(); }
+
+  static void clean() {
+    for (const HKEY root : {HKEY_CURRENT_USER, HKEY_LOCAL_MACHINE}) {
+      for (const wchar_t* const name : {information_control, grid_control})
+        RegDeleteKeyValueW(root, controls_key, name);
+      RegDeleteKeyW(root, controls_key);
+    }
+    RegDeleteTreeW(HKEY_LOCAL_MACHINE, program_key);
+  }
+  static void set(HKEY root, const wchar_t* key, const wchar_t* name, std::wstring_view value) {
+    const auto size = static_cast<DWORD>((value.size() + 1) * sizeof(wchar_t));
+    check_equal(ERROR_SUCCESS, RegSetKeyValueW(root, key, name, REG_SZ, value.data(), size), "writing " + narrow(key));
+  }
+};
+
+template <class Function>
+Function function_of(HMODULE module, const char* name) {
+  return reinterpret_cast<Function>(reinterpret_cast<void*>(GetProcAddress(module, name)));
+}
+
+HRESULT can_unload(HMODULE module) { return function_of<HRESULT(WINAPI*)()>(module, "DllCanUnloadNow")(); }
+
+void class_objects_keep_the_library(HMODULE module) {
+  const auto get_class = function_of<HRESULT(WINAPI*)(REFCLSID, REFIID, void**)>(module, "DllGetClassObject");
+  Pointer<IClassFactory> factory;
+  check_equal(S_OK, can_unload(module), "before any object");
+  check_equal(CLASS_E_CLASSNOTAVAILABLE, get_class(IID_IUnknown, IID_IClassFactory, factory.receive_untyped()),
+              "a class it does not have");
+  require(get_class(CLSID_ORVUtils, IID_IClassFactory, factory.receive_untyped()), "DllGetClassObject");
+  check_equal(S_FALSE, can_unload(module), "while a class object is held");
+  Pointer<IUnknown> object;
+  check_equal(CLASS_E_NOAGGREGATION, factory->CreateInstance(factory.get(), IID_IUnknown, object.receive_untyped()),
+              "aggregation");
+  IClassFactory* const kept = factory.get();
+  kept->LockServer(TRUE);
+  factory = {};
+  check_equal(S_FALSE, can_unload(module), "while the server is locked");
+  kept->LockServer(FALSE);
+  check_equal(S_OK, can_unload(module), "after the last lock");
+}
+
+/// Creates an object, which fails for a control of the components window; the error names the parts.
+void creation_fails(std::initializer_list<const wchar_t*> parts) {
+  Pointer<_ORVUtils> object;
+  const Outcome outcome = early_outcome(
+      CoCreateInstance(CLSID_ORVUtils, nullptr, CLSCTX_INPROC_SERVER, IID__ORVUtils, object.receive_untyped()));
+  check_equal(run_time_error(429), outcome.error, "creating an object without a control of its window");
+  check(outcome.text.starts_with(L"TALUtil.ORVUtils: ActiveX component can't create object"), narrow(outcome.text));
+  for (const wchar_t* const part : parts)
+    check(outcome.text.find(part) != std::wstring::npos, narrow(outcome.text) + " names " + narrow(part));
+}
+
+bool is_elevated() {
+  HANDLE token = nullptr;
+  TOKEN_ELEVATION_TYPE type = TokenElevationTypeDefault;
+  DWORD size = 0;
+  OpenProcessToken(GetCurrentProcess(), TOKEN_QUERY, &token);
+  GetTokenInformation(token, TokenElevationType, &type, sizeof type, &size);
+  CloseHandle(token);
+  return type == TokenElevationTypeFull;
+}
+
+void controls_are_replaced(Factory& factory) {
+  const auto computer_name = [](_ORVUtils* u) {
+    Text name;
+    u->get_ComputerName(name);
+    return std::wstring(name.view());
+  };
+  Registry::set(HKEY_LOCAL_MACHINE, controls_key, information_control, missing_class_text);
+  creation_fails({missing_class_text, controls_key, information_control});
+  // A control that creates the library in its turn, while the library starts.
+  Registry::set(HKEY_LOCAL_MACHINE, controls_key, grid_control, L"TALUtil.Grid");
+  creation_fails({L"TALUtil.Grid"});
+  RegDeleteKeyValueW(HKEY_LOCAL_MACHINE, controls_key, grid_control);
+
+  Registry::set(HKEY_LOCAL_MACHINE, controls_key, information_control, control_class_text);
+  factory.answer = L"FRONT-DESK";
+  const Pointer<_ORVUtils> object = create_object();
+  check_equal(L"FRONT-DESK", computer_name(object.get()), "ComputerName");
+  check_equal(std::size_t{1}, factory.control.uses.size(), "uses of the control");
+  check(factory.control.references > 1, "the control stays on its window");
+  object->Terminate();
+  check_equal(1U, factory.control.references, "references to the control after Terminate");
+  check_equal(L"FRONT-DESK", computer_name(object.get()), "ComputerName after Terminate");
+
+  Registry::set(HKEY_LOCAL_MACHINE, (std::wstring(program_key) + L"\\CLSID").c_str(), nullptr, control_class_text);
+  Registry::set(HKEY_LOCAL_MACHINE, controls_key, information_control, program_id);
+  factory.answer = L"BACK-OFFICE";
+  // A window that is not loaded is loaded and closed again, which reads the name anew.
+  object->Terminate();
+  check_equal(L"BACK-OFFICE", computer_name(object.get()), "ComputerName of a control by its program identifier");
+  check_equal(1U, factory.control.references, "references to the control after that");
+
+  // What every program of the user may write does not choose the code of an elevated one. Wine's programs are elevated.
+  RegDeleteKeyValueW(HKEY_LOCAL_MACHINE, controls_key, information_control);
+  Registry::set(HKEY_CURRENT_USER, controls_key, information_control, missing_class_text);
+  check_equal(is_elevated() ? S_OK : run_time_error(429), object->Terminate(), "a control in the user's part");
+}
+
+/// Puts and gets texts of one letter only, each thread its own; counts the texts with two.
+class User {
+ public:
+  explicit User(wchar_t letter) : text_(std::wstring(200, letter)) {}
+
+  void put_and_get() {
+    object->put_sUserName(text_.get());
+    Text got;
+    object->get_sUserName(got);
+    const std::wstring_view seen = got.view();
+    if (seen.size() != 200 || seen.find_first_not_of(seen.front()) != std::wstring_view::npos) ++torn;
+    calls += 2;
+  }
+
+  const Pointer<_ORVUtils> object = create_object();
+  std::atomic<LONG> calls = 0;
+  std::atomic<int> torn = 0;
+
+ private:
+  Text text_;
+};
+
+/// The settings are one block, so one thread reads what the other puts; no text may ever be a mixture of two.
+void threads_see_whole_texts(COINIT apartment, LONG wanted) {
+  const std::string name = apartment == COINIT_MULTITHREADED ? "a thread without an apartment" : "two apartments";
+  User here(L'a');
+  on_another_thread(
+      apartment,
+      [&] {
+        User there(L'b');
+        while (there.calls + here.calls < wanted || there.calls < 2000) there.put_and_get();
+        check_equal(0, here.torn + there.torn, "torn texts, " + name);
+        check(there.calls >= 2000 && here.calls > 0, "both threads have called, " + name);
+        // An object of this thread's, which the library asks from the other apartment.
+        HostObject value({}, [](const Use& use) { return use.answer(L"12"); });
+        Text asked;
+        check_equal(S_OK, there.object->VerifyTextData(Short{}, Short{}, Value(&value), asked), name);
+        check_equal(L"12", asked.view(), name);
+        // The number of an error comes through; its text does on Windows, not in Wine.
+        check_equal(run_time_error(5), there.object->StringReplace(Text(L"a"), Text(), Text(), Text()), name);
+      },
+      [&] {
+        for (int i = 0; i < 20; ++i) here.put_and_get();
+        handle_messages();
+      });
+}
+
+}  // namespace
+
+int wmain(int count, wchar_t** arguments) {
+  const LONG wanted = count > 2 ? wcstol(arguments[2], nullptr, 10) : 100'000;
+  return run_checks([&] {
+    const HMODULE module = LoadLibraryW((std::wstring(arguments[1]) + L"\\TALUtil.dll").c_str());
+    class_objects_keep_the_library(module);
+    {
+      const Registry registry;
+      Factory factory;
+      controls_are_replaced(factory);
+    }
+    check_equal(S_FALSE, can_unload(module), "after the first object");
+    threads_see_whole_texts(COINIT_APARTMENTTHREADED, wanted);
+    threads_see_whole_texts(COINIT_MULTITHREADED, wanted);
+  });
+}
