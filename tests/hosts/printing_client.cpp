@@ -1,7 +1,7 @@
 // A client that prints: without a printer, then on one that writes PostScript into a file.
 #include <fstream>
 
-#include "boxes.hpp"
+#include "windows.hpp"
 // After windows.h.
 #include <winspool.h>
 
@@ -78,48 +78,42 @@ LONG print_window(const std::wstring& folder, HWND window) {
   return answer;
 }
 
-/// Opens a preview and prints from it, the printer dialog being answered with OK. Answers what stood on its title.
-std::wstring print_preview(_ORVUtils* u, const Desktop& desktop) {
-  TextObject box(L"Text", L"The first page\fThe second page");
-  Value holder(&box);
+/// Does what prints by way of the printer dialog, which is answered with OK.
+void with_dialog(const std::function<void()>& print) {
   std::wstring title;
-  std::thread user([&] {
-    desktop.enter();
-    const HWND window = wait_for_window(L"TALUtilPreview");
-    if (window == nullptr) return;
-    Sleep(300);
-    PostMessageW(window, WM_KEYDOWN, VK_F9, 0);
-    Sleep(500);
-    const std::atomic<bool> is_over = false;
-    const HWND dialog = wait_for_box(is_over);
-    if (dialog != nullptr) {
-      title = describe(dialog).text;
-      SendMessageW(dialog, WM_COMMAND, IDOK, 0);
-    }
-    Sleep(1000);
-    SendMessageW(window, WM_CLOSE, 0, 0);
+  with_user(dialog_class, print, [&](HWND dialog) {
+    title = text_of(dialog);
+    SendMessageW(dialog, WM_COMMAND, IDOK, 0);
   });
-  check_equal(S_OK, u->TextBoxPrintPreview(Short{100}, Short{1}, Text(L"Notes"), Text(L""), holder),
-              "TextBoxPrintPreview");
-  user.join();
-  return title;
+  check_equal(L"Print", title, "the title of the printer dialog");
 }
 
-/// Prints the list of shortcut keys from its window.
-bool print_keys(_ORVUtils* u, const Desktop& desktop) {
+void preview_is_printed(_ORVUtils* u) {
+  HostObject box({L"Text"}, [](const Use& use) { return use.answer(L"The first page\fThe second page"); });
+  Value holder(&box);
+  with_dialog([&] {
+    const auto open = [&] {
+      check_equal(S_OK, u->TextBoxPrintPreview(Short{100}, Short{1}, Text(L"Notes"), Text(L""), holder), "a preview");
+    };
+    // The key returns when everything is printed.
+    with_user(L"TALUtilPreview", open, [](HWND window) {
+      SendMessageW(window, WM_KEYDOWN, VK_F9, 0);
+      close(window);
+    });
+  });
+}
+
+void keys_are_printed(_ORVUtils* u) {
   check_equal(S_OK, u->ShowShortCutKeys(), "ShowShortCutKeys");
-  const HWND window = wait_for_window(L"TALUtilForm");
-  const SeenBox dialog = act_and_watch(
-      desktop, [](HWND box) { PostMessageW(box, WM_COMMAND, IDOK, 0); },
-      [&] { SendMessageW(FindWindowExW(window, nullptr, L"Button", L"Print"), BM_CLICK, 0, 0); });
-  SendMessageW(window, WM_CLOSE, 0, 0);
-  return dialog.title == L"Print";
+  const HWND window = top_windows(L"TALUtilForm").at(0);
+  with_dialog([&] { SendMessageW(button(window, L"Print"), BM_CLICK, 0, 0); });
+  close(window);
 }
 
 }  // namespace
 
 int wmain(int, wchar_t** arguments) {
-  const Desktop desktop;
+  enter_desktop();
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
     const std::wstring folder = arguments[1];
@@ -131,9 +125,9 @@ int wmain(int, wchar_t** arguments) {
     install_printer(output + L"/printed_window.ps");
     check_equal(1, print_window(folder, window), "a window with one");
     install_printer(output + L"/printed_report.ps");
-    check_equal(L"Print", print_preview(object.get(), desktop), "the printer dialog");
+    preview_is_printed(object.get());
     install_printer(output + L"/printed_keys.ps");
-    check(print_keys(object.get(), desktop), "the printer dialog for the keys");
+    keys_are_printed(object.get());
     DestroyWindow(window);
     remove_printer();
   });

@@ -78,15 +78,13 @@ client agreement
 rm -f "$pictures"/*.png
 take_pictures &
 pictures_pid=$!
-client window
+client boxes
 client forms
-client information
 # The same windows on a screen with larger dots, for the looks.
 dots() { wine reg.exe add 'HKCU\Control Panel\Desktop' /v LogPixels /t REG_DWORD /d "$1" /f >/dev/null 2>&1; }
 dots 144
-run information-144 wine "Z:\\build\\$folder\\tests\\hosts\\information_client.exe" "Z:\\build\\$folder" 0 144-
+run forms-144 wine "Z:\\build\\$folder\\tests\\hosts\\forms_client.exe" "Z:\\build\\$folder" 0 144-
 dots 96
-client preview
 rm -f "$talutil_build"/printed_*.ps
 client printing "$(build_below_wine)"
 words_of() { gs -q -sDEVICE=txtwrite -o - "$talutil_build/$1" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' '; }

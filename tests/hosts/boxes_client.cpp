@@ -1,0 +1,217 @@
+// A client whose user answers the boxes of the system: confirmations, dialogs for files and folders, passwords,
+// messages; and what can be seen of the components window and of windows that are printed.
+#include <fstream>
+#include <sstream>
+
+#include "table_object.hpp"
+#include "windows.hpp"
+
+using namespace talutil::hosts;
+
+namespace {
+
+/// How a user answers a box: types into its entry, if it has one, and presses a button.
+struct Answer {
+  const wchar_t* typed;
+  int button;
+};
+
+/// The words of the boxes that a call shows, one after another.
+std::vector<std::wstring> boxes_of(const std::vector<Answer>& answers, const std::function<void()>& call,
+                                   const wchar_t* picture = nullptr) {
+  std::vector<std::wstring> seen;
+  with_user(dialog_class, call, [&](HWND box) {
+    const Answer& answer = answers.at(std::min(seen.size(), answers.size() - 1));
+    seen.push_back(words_of(box));
+    for (const HWND entry : controls(box, L"Edit"))
+      SendMessageW(entry, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(answer.typed));
+    if (picture != nullptr) take_picture(picture);
+    PostMessageW(box, WM_COMMAND, static_cast<WPARAM>(answer.button), 0);
+  });
+  return seen;
+}
+
+void confirmations_ask_twice(_ORVUtils* u) {
+  VARIANT_BOOL answer = 7;
+  auto seen = boxes_of(
+      {{L"YES", IDOK}}, [&] { u->CheckDeleteRecord(&answer); }, L"input_box");
+  check_equal(VARIANT_TRUE, answer, "YES confirms");
+  const std::wstring question =
+      L"Confirm Delete|Type YES in uppercase characters to confirm deletion of this record|OK|Cancel";
+  check(seen == std::vector{question}, "the input box");
+  // Yes asks again, and so does a cancelled box; No ends it.
+  seen = boxes_of({{L"yes", IDOK}, {L"", IDYES}, {L"", IDCANCEL}, {L"", IDNO}},
+                  [&] { u->CheckModifyDatabase(Text(L"Rename"), &answer); });
+  check_equal(VARIANT_FALSE, answer, "no confirmation");
+  if (!check_equal(std::size_t{4}, seen.size(), "boxes until No")) return;
+  for (const wchar_t* part : {L"Warning", L"|Yes", L"|No"})
+    check(seen[1].find(part) != std::wstring::npos, "the warning has " + narrow(part) + " and is " + narrow(seen[1]));
+}
+
+void failures_are_told(_ORVUtils* u) {
+  Value undriven = Value::undriven();
+  const auto seen = boxes_of({{L"", IDOK}}, [&] { u->SelectGridRows(Long{0}, undriven, Short{1}); });
+  check(seen == std::vector<std::wstring>{L"boxes_client|OK|ORVUtils SelectGridRows Type mismatch"},
+        "an object without automation");
+}
+
+std::string bytes_of(const std::wstring& path) {
+  std::ifstream file(path.c_str(), std::ios::binary);
+  std::ostringstream bytes;
+  if (file) bytes << file.rdbuf();
+  return file ? bytes.str() : "(no file)";
+}
+
+/// Exports a table, the user saving to what the dialog proposes, or not.
+void grids_are_exported(_ORVUtils* u, const std::wstring& folder) {
+  TableObject table(2, 2);
+  table.text(0, 0) = L"a,b";
+  table.text(1, 1) = L"\u20AC";
+  Value grid(&table);
+  u->put_sReportsDir(*Text(folder + L"\\"));
+  const std::wstring path = folder + L"\\Sales\\Sales.txt";
+  for (const auto& [button, expected] : {std::pair(IDOK, "\"a,b\",\r\n,\x80\r\n"), {IDCANCEL, "(no file)"}}) {
+    DeleteFileW(path.c_str());
+    std::wstring title;
+    with_user(
+        dialog_class, [&] { u->ExportGridData(grid, Short{0}, Flag{VARIANT_TRUE}, Text(L"Sales")); },
+        [&, pressed = button](HWND dialog) {
+          title = text_of(dialog);
+          // The dialog has its proposal once it is filled.
+          wait_until([&] { return IsWindowEnabled(GetDlgItem(dialog, IDOK)) != FALSE; });
+          PostMessageW(dialog, WM_COMMAND, static_cast<WPARAM>(pressed), 0);
+        });
+    check_equal(L"Save Data to File", title, "the title of the dialog");
+    check_equal(expected, bytes_of(path), "the file");
+  }
+  DeleteFileW(path.c_str());
+}
+
+std::vector<HWND> components_windows() {
+  auto windows = top_windows(L"Static", false);
+  std::erase_if(windows, [](HWND window) { return text_of(window) != L"Form1"; });
+  return windows;
+}
+
+/// Asks for a folder with a title; the user chooses the folder of Windows, or closes the dialog.
+void folders_are_picked(_ORVUtils* u) {
+  constexpr UINT set_selection = WM_USER + 102;
+  std::array<char, MAX_PATH> folder{};
+  GetWindowsDirectoryA(folder.data(), static_cast<UINT>(folder.size()));
+  const std::string name = folder.data();
+  for (const int button : {IDOK, IDCANCEL}) {
+    Text chosen;
+    const int seen = with_user(
+        dialog_class,
+        [&] { check_equal(S_OK, u->BrowseForFolder(Text(L"Where are the reports?"), chosen), "BrowseForFolder"); },
+        [&](HWND dialog) {
+          check(words_of(dialog).find(L"|Where are the reports?") != std::wstring::npos, narrow(words_of(dialog)));
+          check(GetWindow(dialog, GW_OWNER) == components_windows().at(0), "it is owned by the components window");
+          SendMessageW(dialog, set_selection, TRUE, reinterpret_cast<LPARAM>(name.c_str()));
+          if (button == IDOK) take_picture(L"folder_picker");
+          PostMessageW(dialog, WM_COMMAND, static_cast<WPARAM>(button), 0);
+        });
+    check_equal(1, seen, "dialogs");
+    check_equal(button == IDOK ? std::wstring(name.begin(), name.end()) : std::wstring(), chosen.view(), "the folder");
+  }
+}
+
+/// Packs a file with a password, forgets the password, and unpacks: the user is asked for it.
+void passwords_are_asked_for(_ORVUtils* u) {
+  std::array<wchar_t, MAX_PATH> temporary{};
+  const std::wstring folder(temporary.data(), GetTempPathW(MAX_PATH, temporary.data()));
+  const std::wstring archive = folder + L"boxes_client.zip";
+  const std::wstring file = folder + L"boxes_client.txt";
+  const std::wstring target = folder + L"boxes_client_out";
+  std::ofstream(std::string(file.begin(), file.end())) << "content";
+  DeleteFileW(archive.c_str());
+  DeleteFileW((target + L"\\boxes_client.txt").c_str());
+  Flag no;
+  u->CallZIPFiles(Text(archive), Text(file), Short{}, Text(L"key"), no);
+  u->CallZIPFiles(Text(folder + L"other.zip"), Text(file), Short{}, Text(), no);
+  const int seen = with_user(
+      dialog_class, [&] { u->CallUnZIPFiles(Text(archive), Text(target), Text(), no); },
+      [](HWND box) {
+        check(words_of(box).starts_with(L"Encrypted archive|Password of boxes_client.txt:"), narrow(words_of(box)));
+        const HWND entry = controls(box, L"Edit").at(0);
+        check(has_style(entry, GWL_STYLE, ES_PASSWORD), "what is typed is masked");
+        SendMessageW(entry, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(L"key"));
+        take_picture(L"password_box");
+        PostMessageW(box, WM_COMMAND, IDOK, 0);
+      });
+  check_equal(1, seen, "password boxes");
+  check_equal("content", bytes_of(target + L"\\boxes_client.txt"), "what was unpacked");
+}
+
+/// A form as PrintScreen wants it, and the print helper, which the client puts beside the library.
+void forms_are_printed(_ORVUtils* u, const std::wstring& folder) {
+  const HWND window =
+      CreateWindowW(L"Static", L"Form", WS_OVERLAPPEDWINDOW, 0, 0, 300, 200, nullptr, nullptr, nullptr, nullptr);
+  HostObject form({L"hwnd", L"Refresh"}, [&](const Use& use) {
+    if (use.member == 1) return use.answer(static_cast<LONG>(reinterpret_cast<std::intptr_t>(window)));
+    return UpdateWindow(window), S_OK;
+  });
+  Value holder(&form);
+  const auto asked = [&] {
+    std::vector<DISPID> members;
+    for (const auto& [member, flags] : std::exchange(form.uses, {})) members.push_back(member);
+    return members;
+  };
+  const std::wstring beside = folder + L"\\printhelper.dll";
+  DeleteFileW(beside.c_str());
+  const Outcome outcome = early_outcome(u->PrintScreen(holder));
+  check_equal(run_time_error(53), outcome.error, "without the print helper");
+  check_equal(L"TALUtil.ORVUtils: File not found: printhelper.dll", outcome.text, "its text");
+  check(asked() == std::vector<DISPID>{1}, "what the form was asked for");
+  check(CopyFileW((folder + L"\\printhelper\\printhelper.dll").c_str(), beside.c_str(), FALSE) != FALSE,
+        "the print helper beside TALUtil.dll");
+  check_equal(S_OK, u->PrintScreen(holder), "with the print helper");
+  check(asked() == std::vector<DISPID>{1, 2, 1}, "hwnd, Refresh, hwnd");
+  const HMODULE module = GetModuleHandleW(beside.c_str());
+  check(module != nullptr, "it is loaded from beside TALUtil.dll");
+  // What it answers where there is no printer, and for what is no window.
+  for (const char* name : {"ConfigurePrinter", "SendToPrinter"}) {
+    const auto print = reinterpret_cast<LONG(WINAPI*)(LONG)>(reinterpret_cast<void*>(GetProcAddress(module, name)));
+    if (check(print != nullptr, name)) check_equal(0, print(12345), std::string(name) + " of no window");
+  }
+  if (module != nullptr) FreeLibrary(module);
+  DeleteFileW(beside.c_str());
+  DestroyWindow(window);
+}
+
+void components_window_is_hidden(_ORVUtils* u) {
+  const std::vector<HWND> windows = components_windows();
+  if (!check_equal(std::size_t{1}, windows.size(), "windows with the caption Form1")) return;
+  check_equal(GetCurrentThreadId(), GetWindowThreadProcessId(windows[0], nullptr), "the thread of the window");
+  const Pointer<_ORVUtils> second = create_object();
+  check(components_windows() == windows, "the window of a second object");
+  u->put_DebugMode(0);
+  u->Terminate();
+  check(IsWindow(windows[0]) == FALSE && components_windows().empty(), "it is gone after Terminate");
+  for (const short mode : std::initializer_list<short>{1, -1}) {
+    u->put_DebugMode(mode);
+    const auto seen = boxes_of(
+        {{L"", IDOK}}, [&] { check_equal(S_OK, u->Terminate(), "Terminate"); }, L"message_box");
+    const std::vector<std::wstring> expected{L"boxes_client|OK|Closing ORVUtils Components form"};
+    check(seen == (mode == 1 ? expected : std::vector<std::wstring>()), "the box with DebugMode 1 alone");
+  }
+}
+
+}  // namespace
+
+int wmain(int, wchar_t** arguments) {
+  enter_desktop();
+  const std::wstring folder = arguments[1];
+  pictures = folder + L"\\..\\screenshots\\";
+  return run_checks([&] {
+    const Pointer<_ORVUtils> object = create_object();
+    _ORVUtils* const u = object.get();
+    confirmations_ask_twice(u);
+    failures_are_told(u);
+    grids_are_exported(u, folder);
+    folders_are_picked(u);
+    passwords_are_asked_for(u);
+    forms_are_printed(u, folder);
+    components_window_is_hidden(u);
+  });
+}
