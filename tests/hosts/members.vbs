@@ -1,220 +1,32 @@
-' A script as hosts write them: late binding, script variables written back, run-time errors by number and text.
-' The last line is the counts; a script that dies prints none, for it ends without a word and with exit code 0.
+' What hosts do with the members, as scripts write it: bound late, variables written back, run-time errors by number and
+' text. Each line that is printed is NAME=VALUE; what it should be stands behind it. Comments that begin with the name of a
+' client are for that client alone and take the place of the common value; - stands for no line at all.
+'
+'   cscript //nologo members.vbs CLIENT
+'
+' CLIENT keeps the files and settings of one run apart from those of others. A script control runs this file too, and as
+' far as the line of dashes it is run as JScript, into which to_jscript.awk turns it; docs/clients.md says what differs.
 Option Explicit
+On Error Resume Next
 
-Dim u, v, passed, failed
-passed = 0
-failed = 0
+Dim u, v, client, folder, list, names, character, missing, week, first, last, first_time, last_time, hours
+Dim ini, key, output, secret, grid, position, pdf, other, path, text, number, d, epoch, zip
 
-Sub Check(name, expected, got)
-  Dim same
-  same = False
-  If VarType(expected) = VarType(got) Then same = (expected = got)
-  If same Then
-    passed = passed + 1
-  Else
-    failed = failed + 1
-    WScript.Echo "FAILED members.vbs, " & name & ": expected " & TypeName(expected) & " """ & expected & _
-      """, got " & TypeName(got) & " """ & got & """"
-  End If
+Sub Say(name, value)
+  WScript.Echo name & "=" & value
 End Sub
 
-' To be called while On Error Resume Next is in force, right after the statement that should fail.
-Sub CheckError(name, number, description)
-  Check name & ", number", CLng(number), CLng(Err.Number)
-  Check name & ", description", description, Err.Description
+' Where errors come from is said only if it is not the library.
+Sub SayError(name)
+  Say name, (Err.Number And 65535) & " " & Err.Description
+  If Err.Source <> "TALUtil.ORVUtils" Then Say name & ".source", Err.Source
   Err.Clear
 End Sub
 
-Sub Settings
-  Dim other
-  u.sUserName = "anne"
-  Set other = CreateObject("TALUtil.ORVUtils")
-  Check "a setting through another object", "anne", other.sUserName
-  Set other = Nothing
-  Check "WriteServerPerformanceFile before any put", False, u.WriteServerPerformanceFile
-  u.bIsProgrammer = True
-  Check "a Boolean", True, u.bIsProgrammer
-  u.BookingScreenDate = DateSerial(2009, 7, 1)
-  Check "a date", DateSerial(2009, 7, 1), u.BookingScreenDate
-  Set u.FolderBrowseForm = Nothing
-End Sub
-
-Sub Texts
-  Check "a number as text", "12.5", u.VerifyTextData(0, 0, 12.5)
-  Check "an object for its value", "u", u.VerifyTextData(0, 0, New ValueHolder)
-  Check "Empty", "0", u.VerifyIntData(0, Empty)
-  Check "a memo", "A" & vbCr & " B", u.VerifyMemField("A" & vbCrLf & "B")
-  Check "StripNulls", "ab", u.StripNulls("ab" & Chr(0) & "cd")
-  Check "RemoveNumberFromString", "abC", u.RemoveNumberFromString("a1 b@,C")
-  Check "StringReplace", "a--b--", u.StringReplace("a;b;", ";x", "--")
-  Check "MyPos", 1, CInt(u.MyPos(",", "A,B", 0))
-  Check "SubStrCount", 2, CInt(u.SubStrCount("a", "aAa"))
-  Check "CRLFStringReplace", "AxxB", u.CRLFStringReplace("A" & vbCrLf & "B", "x")
-  Check "StringRestoreCRLF", "A" & vbCrLf & "B", u.StringRestoreCRLF("AxxB", "x")
-  Check "AddZeros", "700", u.AddZeros(7, 3, 1)
-  Check "ReverseString", "cba", u.ReverseString("abc")
-  Check "StringPosition", 3, u.StringPosition("12 SMITH ST", 1)
-  Check "MyInstrDelim", True, u.MyInstrDelim("B", "A,B,", ",")
-  Check "StringReplaceWord", "a-c-", u.StringReplaceWord("aBBcBB", "BB", "-")
-  Check "IsValueNumber", True, u.IsValueNumber("1.2.3")
-  Check "IsValueDate", True, u.IsValueDate("15-11-2024")
-  Check "IsValueTime", False, u.IsValueTime("09:30:00")
-  Check "VerifyEmail", True, u.VerifyEmail("x@y.z")
-  Check "VerifyPasswordText", False, u.VerifyPasswordText("abc")
-  Check "NumbersInString", True, u.NumbersInString("Unit 4")
-  u.iCharactercase = 1
-  u.iCharacterCaseSuburbs = 2
-  Check "a style that suburbs do not have", "st ives", u.ConvertCaseSuburbs("st ives")
-  Check "Null stays", True, IsNull(u.ConvertCase(0, Null))
-  u.iCharactercase = 0
-  Check "length of a password", 40, CInt(Len(u.GenerateFilePassword(40, 2, 1)))
-  Check "there and back", "a" & vbCrLf & Chr(0) & Chr(233), u.CryptoDecryptString(u.CryptoEncryptString("a" & vbCrLf & Chr(0) & Chr(233)))
-End Sub
-
-Sub Configuration
-  Dim files, ini, output
-  Set files = CreateObject("Scripting.FileSystemObject")
-  ini = files.GetSpecialFolder(2) & "\talutil-members.ini"
-  If files.FileExists(ini) Then files.DeleteFile ini
-  u.sDatabaseName = "Members"
-  u.sUserName = "anne"
-  output = "\\server\share"
-  u.SaveCfgFileData "S", "unc", output, ini, True
-  Check "never comes back", "d", u.GetCfgFileData("S", "unc", "d", ini, True)
-  output = String(3000, "x") & vbCrLf & Chr(0) & "y"
-  u.SaveCfgFileData "A\B", "k=", output, "any"
-  Check "a long value of the store", output, u.GetCfgFileData("a\b", "K=", "d", "any")
-  files.DeleteFile ini
-End Sub
-
-Sub Files
-  Dim files, folder, list, path, text
-  Set files = CreateObject("Scripting.FileSystemObject")
-  folder = files.GetSpecialFolder(2) & "\talutil-members\"
-  path = folder & "One\"
-  u.VerifyFilePath path & "not a folder"
-  Check "folders are made", True, u.PathExists(path)
-  u.SaveTextBox "O" & Chr(180) & "Brien", path & "a.txt"
-  Check "a file, in quotes", True, u.FileExists("""" & path & "A.TXT""")
-  Check "text and line end", "O" & Chr(180) & "Brien" & vbCrLf, u.LoadTextBox(path & "a.txt")
-  list = Array("first", "", "last")
-  u.SaveBigFile list, path & "b.txt"
-  Check "lines", 3, CInt(u.OpenFile(path & "b.txt", list, 0))
-  Check "lines without blank ones", 2, CInt(u.OpenBigFile(path & "b.txt", list, 1))
-  Check "a line", "last", list(1)
-  u.CopyFileToBackupFile path & "b.txt", path & "b.bak"
-  Check "a copy", u.LoadTextBox(path & "b.txt"), u.LoadTextBox(path & "b.bak")
-  Check "GetFileCount", 3, CInt(u.GetFileCount(path, ""))
-  text = """C:\dir\file.tar.gz"""
-  Check "ExtractFilename", "file.tar.gz", u.ExtractFilename(text)
-  Check "quotes are gone", "C:\dir\file.tar.gz", text
-  Check "ExtractPathName", "C:\dir\", u.ExtractPathName(text)
-  u.DeleteFiles path & "*.txt"
-  u.DeleteFiles path & "*.txt"
-  Check "what is left", "b.bak", u.GetFileList(",", path, "")
-  Check "a GUID", 38, CInt(Len(u.GetNewGuid))
-  u.sReportsDir = "Q:\Reports\"
-  u.SetupFileFolders
-  Check "a fall-back", "C:\TAL\ORV3\Reports\", u.sReportsDir
-  Check "a standard folder", True, u.PathExists("C:\TAL\ORV3\Reports\SummaryJobSheets\Processed")
-  files.DeleteFolder Left(folder, Len(folder) - 1)
-End Sub
-
-Sub WriteBack
-  Dim number, list
-  number = 5
-  Check "a number to remove", "A ", u.RemoveStringsFromNumber(2, "A 5", number)
-  Check "an unchanged variable keeps its type", 5, number
-  Check "elements with another delimiter", 3, CInt(u.ReadCommaDelimStrToList("A;;B;", list, ";"))
-  Check "an empty element", "", list(1)
-  Check "IndexInList in a list read before", 2, CInt(u.IndexInList(list, "b"))
-End Sub
-
-Sub Dates
-  Dim d, epoch
-  epoch = DateSerial(1800, 1, 1)
-  Check "GetYear", 2009, u.GetYear("5/3/2009")
-  Check "GetMonth of a date", 3, u.GetMonth(DateSerial(2009, 3, 5))
-  Check "GetDay of Null", 1, u.GetDay(Null)
-  Check "GetDaysThisMonth", 29, u.GetDaysThisMonth(2, 2008)
-  Check "SetDayOfMonth", "31/2/2009", u.SetDayOfMonth("5/2/2009", 31)
-  Check "GetFinancialYearStr", "0910", u.GetFinancialYearStr("15/08/2009")
-  Check "VerifyNullTime", "14:05", u.VerifyNullTime(0, TimeSerial(14, 5, 59))
-  Check "VerifyNullDate of nothing", DateSerial(1980, 1, 1), u.VerifyNullDate(0, Empty)
-  Check "GetDateFromString", "29/02/2008", u.GetDateFromString("29022008")
-  Check "WeekYearToDate of no option", Empty, u.WeekYearToDate(1, 2009, 7)
-  Check "GetWeekInDateRange", False, u.GetWeekInDateRange("1/3/2009", "7/1/2009", 1, 2009)
-  Check "IncDay", "29/02/2008", u.IncDay("1/3/2008", -1)
-  Check "IncWeek", "03/03/2008", u.IncWeek("25/2/2008", 1)
-  Check "IncYear", "28/02/2009", u.IncYear("29/2/2008", 1)
-  Check "GetNextDate", "30/06/2009", u.GetNextDate("31/3/2009", "Monthly", "3")
-  Check "AddTimeToDate", "05/03/2009 09:05", u.AddTimeToDate("5/3/2009 17:00", "9:05")
-  d = TimeSerial(1, 30, 0)
-  Check "a bare time", "1:30", u.DateTimeToDuration(d)
-  Check "comes back with its day", "1/1/1800 01:30", d
-  Check "DurationToDateTime", epoch - 1.5 / 24, u.DurationToDateTime("1:30")
-  Check "ConvertDatabaseDurationToNumber", "0.25", u.ConvertDatabaseDurationToNumber("1/1/1800 0:15")
-  Check "ConvertNumberToDatabaseDuration", epoch - 1.5 / 24, u.ConvertNumberToDatabaseDuration(90)
-  Check "ConvertTimeToMinutes", 825, CInt(u.ConvertTimeToMinutes("13:45"))
-  Check "GetDaysInPeriod", 4, CInt(u.GetDaysInPeriod("5/3/2024", "1/3/2024"))
-  Check "GetMonthsInPeriod", -1, CInt(u.GetMonthsInPeriod("5/3/2024", "5/3/2024"))
-End Sub
-
-Sub Tables
-  Dim grid, zip
-  Set grid = CreateObject("TALUtil.Grid")
-  grid.Cols = 2
-  grid.AddItem "Job" & vbTab & "Done"
-  grid.FixedRows = 1
-  grid.AddItem "1001"
-  grid.AddItem "1002" & vbTab & "True"
-  grid.ColDataType(1) = 11
-  grid.TextMatrix(1, 0) = "a,b"
-  Check "a cell", "a,b", grid.TextMatrix(1, 0)
-  u.SelectGridRows 1, grid, 1
-  Check "all ticks", CLng(2), u.CountGridSelectedRows(1, grid)
-  Set zip = CreateObject("TALUtil.ZipControl")
-  Check "the level of the zip control", CLng(6), zip.CompressionLevel
-  Check "pages", CLng(4), u.GetMaxPages(4, 14)
-  Check "inside", True, u.GetMousePos(5, 5, 1, 1, 9, 9)
-  On Error Resume Next
-  grid.TextMatrix(9, 0) = "x"
-  Check "no such row", CLng(9), CLng(Err.Number)
+' For errors that the script host words itself.
+Sub SayHostError(name)
+  Say name, Err.Number & " " & Err.Description
   Err.Clear
-  u.LoadWindowState grid, "Members"
-  CheckError "no form", 438, "Object doesn't support this property or method"
-End Sub
-
-Sub Errors
-  Dim form
-  On Error Resume Next
-  Set u.DrawTextPictureBox = CreateObject("Scripting.Dictionary")
-  CheckError "a dictionary for a picture box", 13, "Type mismatch"
-  u.ComputerName = "x"
-  CheckError "a put on ComputerName", 438, "Object doesn't support this property or method"
-  Set form = u.SplashForm
-  CheckError "a get of SplashForm", 438, "Object doesn't support this property or method"
-  u.NoSuchMember
-  CheckError "an unknown member", 438, "Object doesn't support this property or method"
-  v = u.VerifyTextData(0, 0, Nothing)
-  CheckError "Nothing", 91, "Object variable or With block variable not set"
-  v = u.VerifyTextData(Null, 0, "a")
-  CheckError "Null for a number", 94, "Invalid use of Null"
-  v = u.IndexInList("no list", "a")
-  CheckError "a text for a list", 13, "Type mismatch"
-  v = u.StripNulls()
-  ' The script host words this one itself.
-  Check "no argument", CLng(449), CLng(Err.Number)
-  Err.Clear
-  v = u.StripNulls("a", "b")
-  CheckError "two arguments", 450, "Wrong number of arguments or invalid property assignment"
-  u.SaveTextBox "x", "Q:\a.txt"
-  CheckError "a missing drive", 76, "Path not found"
-  v = u.SetDayOfMonth(Null, 1)
-  CheckError "Null for a date", 94, "Invalid use of Null"
-  u.SystemTimeToDate Null, v
-  CheckError "no record", 13, "Type mismatch"
 End Sub
 
 Class ValueHolder
@@ -223,14 +35,224 @@ Class ValueHolder
   End Property
 End Class
 
+client = WScript.Arguments(WScript.Arguments.Count - 1)
+folder = "C:\clients\" & client & "\"
 Set u = CreateObject("TALUtil.ORVUtils")
-Settings
-Texts
-Configuration
-Tables
-Files
-WriteBack
-Dates
-Errors
+Call u.VerifyFilePath(folder & "in\")
+
+Say "text", u.VerifyTextData(20, 1, "  Smith & ""Sons"", Pty #1  ") '= Smith and Sons Pty 1
+Say "text.apostrophe", Asc(Mid(u.VerifyTextData(0, 0, "O'Brien"), 2, 1)) '= 180
+Say "number", u.VerifyIntData(0, "3.50kg") '= 3.5
+Say "number.null", u.VerifyIntData(1, Null) '= 0
+u.iCharactercase = 1
+Say "case", u.ConvertCase(0, "MARY SMITH-JONES") '= Mary Smith-Jones
+list = Empty
+Say "list", u.ReadCommaDelimStrToList("red,green,blue,", list) '= 3
+Say "list.items", list(0) & "/" & list(1) & "/" & list(2) '= red/green/blue
+'jscript: list.items=-
+names = Array("Apple", "Banana")
+Say "list.index", u.IndexInList(names, "ban") '= 1
+'jscript: list.index=-
+Say "field", u.GetData("A,B,C,", 1, 2) '= B
+character = ""
+Say "blanks", u.RemoveStringsFromNumber(2, "A B", character) '= AB
+Say "blanks.back", "[" & character & "]" '= [ ]
+'jscript: blanks.back=[]
+missing = "00:00:00"
+Say "date", Year(u.VerifyNullDate(0, missing)) '= 1980
+Say "date.back", missing '= 01/01/1980
+'jscript: date.back=00:00:00
+'pascal_late: date.typed=01/01/1980
+'pascal_early: date.typed=01/01/1980
+Say "month", u.IncMonth(DateSerial(2009, 1, 31), 1) '= 28/02/2009
+Say "week", u.GetWeekNumber(DateSerial(2009, 12, 31)) '= 52
+week = 60
+Say "week.start", Month(u.WeekYearToDate(week, 2009, 1)) '= 12
+Say "week.back", week '= 52
+'jscript: week.back=60
+first = DateSerial(2024, 3, 10)
+last = DateSerial(2024, 3, 11)
+first_time = TimeSerial(22, 0, 0)
+last_time = TimeSerial(2, 0, 0)
+Say "difference", u.GetTimeDifference(first, last, first_time, last_time) '= 4:0
+Say "difference.back", first & " " & last & " " & first_time & " " & last_time '= 10/03/2024 11/03/2024 22:00 02:00
+'jscript: difference.back=10/3/2024 11/3/2024 22:00 2:00
+'pascal_late: difference.typed=0:0
+'pascal_late: difference.typed.back=11/03/2024 22:00
+'pascal_early: record=3-22 11/03/2024 22:00
+last = DateSerial(2024, 3, 11)
+Say "utc", u.UTCToLocalTime(u.LocalTimeToUTC(last)) = last '= True
+'jscript: utc=-
+Say "duration", u.DateTimeToDuration("2/1/1800 02:00") '= 26:0
+Say "duration.number", u.ConvertDurationToNumber("01:45") '= 1.75
+hours = " 1.5 "
+Say "duration.minutes", u.ConvertDatabaseDurationToMinutes(u.DurToTime(hours)) '= 90
+Say "duration.back", "[" & hours & "]" '= [1.5]
+'jscript: duration.back=[ 1.5 ]
+ini = folder & "client.ini"
+key = "Software\TALUtil Clients\" & client
+u.sDatabaseName = "Clients"
+u.sUserName = client
+output = "north"
+Call u.SaveCfgFileData("Branch", "Name", output, ini, True)
+Say "setting", u.GetCfgFileData("branch", "name", "none", ini, True) '= north
+output = "\\server\share"
+Call u.SaveCfgFileData("Branch", "Path", output, ini, True)
+Say "setting.back", output '= \
+'jscript: setting.back=\\server\share
+output = "stored"
+Call u.SaveCfgFileData(client, "Name", output, "any")
+Say "setting.store", u.GetCfgFileData(client, "Name", "none", "any") '= stored
+Call u.REGISTRY_CreateNewKey(key, -2147483647)
+Call u.REGISTRY_SetKeyValue(key, "Number", 42, 4)
+Say "registry", u.REGISTRY_ReturnValue(key, "Number") '= 42
+Call u.SaveTextBox("a line", folder & "in\a.txt")
+Call u.SaveTextBox(u.CryptoEncryptString("branch 12"), folder & "in\b.txt")
+Say "files", u.GetFileList(",", folder & "in\", "*.txt") '= a.txt,b.txt
+Call u.CallZIPFiles(folder & "a.zip", folder & "in", 0, "")
+Call u.CallUnZIPFiles(folder & "a.zip", folder & "out\", "")
+Say "zip", Left(u.LoadTextBox(folder & "out\in\a.txt"), 6) '= a line
+secret = u.LoadTextBox(folder & "out\in\b.txt")
+Say "secret", u.CryptoDecryptString(Left(secret, Len(secret) - 2)) '= branch 12
+u.sORVPath = folder
+u.EventLog = 1
+Call u.AppendEventLog("Saved", "frmBooking")
+Say "log", InStr(u.LoadTextBox(folder & "EventLog.txt"), ":Saved:frmBooking") > 0 '= True
+Set grid = CreateObject("TALUtil.Grid")
+grid.Cols = 3
+grid.ColWidth(1) = 480
+Call u.SaveGridWidths(grid, client, 1)
+grid.ColWidth(0) = 0
+grid.ColWidth(1) = 0
+Call u.LoadGridWidths(grid, client, 1)
+Say "widths", grid.ColWidth(0) & " " & grid.ColWidth(1) & " " & grid.ColWidth(2) '= 0 480 1000
+Set position = CreateObject("TALUtil.cControlPosition")
+position.ControlName = client
+position.left = 120
+Call position.SaveControlPosition()
+position.left = 0
+Call position.GetControlPosition()
+Say "position", position.left '= 120
+pdf = "C:\TAL\ORV3\DATA\MONTHLYREPORTS\SalesReport.pdf"
+Call u.DeleteFiles(pdf)
+Set grid = CreateObject("TALUtil.Grid")
+grid.Cols = 2
+Call grid.AddItem("Job" & Chr(9) & "Done")
+grid.FixedRows = 1
+Call grid.AddItem("1001" & Chr(9) & "True")
+grid.ColDataType(1) = 11
+Say "ticks", u.CountGridSelectedRows(1, grid) '= 1
+u.AutomatedEndOfMonth = True
+Call u.GridPrintPreview(100, 2, "Sales", "", grid, DateSerial(2009, 3, 1), DateSerial(2009, 3, 31), "SalesReport")
+u.AutomatedEndOfMonth = False
+Say "report", Left(u.LoadTextBox(pdf), 5) '= %PDF-
+v = u.IncWeek("5/3/2009", 4682) : SayError "error.overflow" '= 6 Overflow
+u.DrawTextPictureBox = "a text" : SayError "error.object" '= 13 Type mismatch
+v = u.CryptoDecryptString("QUJD") : SayError "error.own" '= 5 This is not a cipher text of this library, or it was changed
+Say "done", True '= True
+'jscript: combo=1
+'jscript: combo.text=[]
+'jscript: widths.own=0 480 1000
+'jscript: list.variable=undefined
+'jscript: error.list=13 Type mismatch
+'pascal_late: combo=1
+'pascal_late: combo.text=[]
+'pascal_early: combo=1
+'pascal_early: combo.text=[]
+'-----------------------------------------------------------------------------------------------------------------------
+Set other = CreateObject("TALUtil.ORVUtils")
+Say "another object", (other.sUserName = client) & " " & other.WriteServerPerformanceFile '= True False
+Set u.FolderBrowseForm = Nothing
+u.BookingScreenDate = DateSerial(2009, 7, 1)
+Say "BookingScreenDate", u.BookingScreenDate = DateSerial(2009, 7, 1) '= True
+Say "types", TypeName(u.GetYear(0)) & TypeName(u.MyPos("", "", 0)) & TypeName(u.VerifyEmail("")) & _
+  TypeName(u.ConvertDurationToNumber("1")) & TypeName(u.VerifyNullDate(0, Empty)) & TypeName(u.BookingScreenDate) & _
+  TypeName(u.WeekYearToDate(1, 2009, 7)) & TypeName(u.AddZeros(7, 3, 1)) & TypeName(u.ConvertCase(0, Null))
+'vbscript: types=IntegerLongBooleanSingleDateDateEmptyStringNull
+'script_control: types=IntegerLongBooleanSingleDateDateEmptyStringNull
+Say "values", u.VerifyTextData(0, 0, 12.5) & u.VerifyTextData(0, 0, New ValueHolder) & u.VerifyIntData(0, Empty) '= 12.5u0
+
+text = "a" & vbCrLf & Chr(0) & Chr(233)
+Say "line ends", (u.VerifyMemField("A" & vbCrLf & "B") = "A" & vbCr & " B") & " " & _
+  u.CRLFStringReplace("A" & vbCrLf & "B", "x") & " " & (u.StringRestoreCRLF("AxxB", "x") = "A" & vbCrLf & "B") & " " & _
+  (u.CryptoDecryptString(u.CryptoEncryptString(text)) = text)
+'vbscript: line ends=True AxxB True True
+'script_control: line ends=True AxxB True True
+Say "StripNulls", u.StripNulls("ab" & Chr(0) & "cd") & " " & u.RemoveNumberFromString("a1 b@,C") '= ab abC
+Say "StringReplace", u.StringReplace("a;b;", ";x", "--") & " " & u.StringReplaceWord("aBBcBB", "BB", "-") '= a--b-- a-c-
+Say "MyPos", u.MyPos(",", "A,B", 0) & " " & u.SubStrCount("a", "aAa") & " " & u.StringPosition("12 SMITH ST", 1) '= 1 2 3
+Say "AddZeros", u.AddZeros(7, 3, 1) & " " & u.ReverseString("abc") & " " & u.MyInstrDelim("B", "A,B,", ",") '= 700 cba True
+Say "checks", u.IsValueNumber("1.2.3") & u.IsValueDate("15-11-2024") & u.VerifyEmail("x@y.z") & _
+  u.NumbersInString("Unit 4") & u.IsValueTime("09:30:00") & u.VerifyPasswordText("abc")
+'vbscript: checks=TrueTrueTrueTrueFalseFalse
+'script_control: checks=TrueTrueTrueTrueFalseFalse
+u.iCharacterCaseSuburbs = 2
+Say "ConvertCaseSuburbs", u.ConvertCaseSuburbs("st ives") & Len(u.GenerateFilePassword(40, 2, 1)) & Len(u.GetNewGuid) '= st ives4038
+number = 5
+Say "RemoveStringsFromNumber", u.RemoveStringsFromNumber(2, "A 5", number) & TypeName(number) '= A Integer
+Say "ReadCommaDelimStrToList", u.ReadCommaDelimStrToList("A;;B;", list, ";") & "[" & list(1) & "]" '= 3[]
+Say "IndexInList", u.IndexInList(list, "b") '= 2
+
+output = "\\server\share"
+Call u.SaveCfgFileData("S", "unc", output, ini, True)
+Say "a value that never comes back", u.GetCfgFileData("S", "unc", "d", ini, True) '= d
+output = String(3000, "x") & vbCrLf & Chr(0) & "y"
+Call u.SaveCfgFileData("A\B", "k=", output, "any")
+Say "a long value of the store", u.GetCfgFileData("a\b", "K=", "d", "any") = output '= True
+path = folder & "One\"
+Call u.VerifyFilePath(path & "not a folder")
+Call u.SaveTextBox("O" & Chr(180) & "Brien", path & "a.txt")
+Say "paths", u.PathExists(path) & u.FileExists("""" & path & "A.TXT""") & u.GetFileCount(path, "") '= TrueTrue1
+Say "LoadTextBox", u.LoadTextBox(path & "a.txt") = "O" & Chr(180) & "Brien" & vbCrLf '= True
+list = Array("first", "", "last")
+Call u.SaveBigFile(list, path & "b.txt")
+Say "OpenFile", u.OpenFile(path & "b.txt", list, 0) & u.OpenBigFile(path & "b.txt", list, 1) & list(1) '= 32last
+Call u.CopyFileToBackupFile(path & "b.txt", path & "b.bak")
+Say "CopyFileToBackupFile", u.LoadTextBox(path & "b.bak") = u.LoadTextBox(path & "b.txt") '= True
+text = """C:\dir\file.tar.gz"""
+Say "ExtractFilename", u.ExtractFilename(text) & " " & text & " " & u.ExtractPathName(text) '= file.tar.gz C:\dir\file.tar.gz C:\dir\
+Call u.DeleteFiles(path & "*.txt")
+Call u.DeleteFiles(path & "*.txt")
+Say "GetFileList", u.GetFileList(",", path, "") '= b.bak
+u.sReportsDir = "Q:\Reports\"
+Call u.SetupFileFolders()
+Say "SetupFileFolders", u.sReportsDir & u.PathExists("C:\TAL\ORV3\Reports\SummaryJobSheets\Processed") '= C:\TAL\ORV3\Reports\True
+
+epoch = DateSerial(1800, 1, 1)
+Say "GetYear", u.GetYear("5/3/2009") & " " & u.GetMonth(DateSerial(2009, 3, 5)) & " " & u.GetDay(Null) '= 2009 3 1
+Say "GetDaysThisMonth", u.GetDaysThisMonth(2, 2008) & " " & u.SetDayOfMonth("5/2/2009", 31) '= 29 31/2/2009
+Say "GetFinancialYearStr", u.GetFinancialYearStr("15/08/2009") & " " & u.GetDateFromString("29022008") '= 0910 29/02/2008
+Say "VerifyNullTime", u.VerifyNullTime(0, TimeSerial(14, 5, 59)) '= 14:05
+Say "VerifyNullDate", u.VerifyNullDate(0, Empty) = DateSerial(1980, 1, 1) '= True
+Say "GetWeekInDateRange", u.GetWeekInDateRange("1/3/2009", "7/1/2009", 1, 2009) '= False
+Say "IncDay", u.IncDay("1/3/2008", -1) & " " & u.IncWeek("25/2/2008", 1) & " " & u.IncYear("29/2/2008", 1) '= 29/02/2008 03/03/2008 28/02/2009
+Say "GetNextDate", u.GetNextDate("31/3/2009", "Monthly", "3") & " " & u.AddTimeToDate("5/3/2009 17:00", "9:05") '= 30/06/2009 05/03/2009 09:05
+d = TimeSerial(1, 30, 0)
+Say "DateTimeToDuration", u.DateTimeToDuration(d) & " of " & d '= 1:30 of 1/1/1800 01:30
+Say "DurationToDateTime", u.DurationToDateTime("1:30") = epoch - 1.5 / 24 '= True
+Say "ConvertNumberToDatabaseDuration", u.ConvertNumberToDatabaseDuration(90) = epoch - 1.5 / 24 '= True
+Say "numbers of hours", u.ConvertDatabaseDurationToNumber("1/1/1800 0:15") & " " & u.ConvertTimeToMinutes("13:45") '= 0.25 825
+Say "GetDaysInPeriod", u.GetDaysInPeriod("5/3/2024", "1/3/2024") & u.GetMonthsInPeriod("5/3/2024", "5/3/2024") '= 4-1
+
+Call grid.AddItem("1002" & vbTab & "False")
+grid.TextMatrix(1, 0) = "a,b"
+Call u.SelectGridRows(1, grid, 1)
+Set zip = CreateObject("TALUtil.ZipControl")
+Say "tables", grid.TextMatrix(1, 0) & " " & u.CountGridSelectedRows(1, grid) & " " & zip.CompressionLevel '= a,b 2 6
+Say "GetMaxPages", u.GetMaxPages(4, 14) & u.GetMousePos(5, 5, 1, 1, 9, 9) '= 4True
+grid.TextMatrix(9, 0) = "x" : Say "no such row", Err.Number : Err.Clear '= 9
+u.LoadWindowState grid, "Members" : SayError "no form" '= 438 Object doesn't support this property or method
+Set u.DrawTextPictureBox = CreateObject("Scripting.Dictionary") : SayError "a dictionary to draw on" '= 13 Type mismatch
+u.ComputerName = "x" : SayHostError "a put on ComputerName" '= 438 Object doesn't support this property or method
+Set v = u.SplashForm : SayHostError "a get of SplashForm" '= 438 Object doesn't support this property or method
+u.NoSuchMember : SayHostError "an unknown member" '= 438 Object doesn't support this property or method
+v = u.VerifyTextData(0, 0, Nothing) : SayError "Nothing" '= 91 Object variable or With block variable not set
+v = u.VerifyTextData(Null, 0, "a") : SayError "Null for a number" '= 94 Invalid use of Null
+v = u.IndexInList("no list", "a") : SayError "a text for a list" '= 13 Type mismatch
+' The script host words this one itself.
+v = u.StripNulls() : Say "no argument", Err.Number : Err.Clear '= 449
+v = u.StripNulls("a", "b") : SayHostError "two arguments" '= 450 Wrong number of arguments or invalid property assignment
+u.SaveTextBox "x", "Q:\a.txt" : SayError "a missing drive" '= 76 Path not found
+v = u.SetDayOfMonth(Null, 1) : SayError "Null for a date" '= 94 Invalid use of Null
+u.SystemTimeToDate Null, v : SayError "no record" '= 13 Type mismatch
 u.Terminate
-WScript.Echo passed & " passed, " & failed & " failed"

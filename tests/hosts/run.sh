@@ -97,29 +97,34 @@ expect_success "the words of the printed keys, which begin: ${words:0:100}" \
 expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
 restart_wine
-no_screen='445 There is no screen to show the window on'
-answers=$(DISPLAY='' wine cscript.exe //nologo 'Z:\checkout\tests\hosts\no_screen.vbs' 2>/dev/null | tr -d '\r')
-expect_success "windows without a screen, which answered: $answers" test "$answers" = "$no_screen"$'\n'"$no_screen"$'\n'"$no_screen"
+# A script's one line of answers.
+elsewhere() {
+  local expected=$1 answers
+  shift
+  answers=$(wine cscript.exe //nologo 'Z:\checkout\tests\hosts\elsewhere.vbs' "$@" 2>/dev/null | tr -d '\r')
+  expect_success "elsewhere.vbs $1, which answered: $answers" test "$answers" = "$expected"
+}
+no_screen='445 There is no screen to show the window on. '
+DISPLAY='' elsewhere "$no_screen$no_screen$no_screen" no_screen
 restart_wine
-run script wine cscript.exe //nologo 'Z:\checkout\tests\hosts\members.vbs'
 
 # Third-party clients: script hosts, and a compiler with an importer of type libraries of its own. Each does the same
 # work and prints it. TALUTIL_WITHOUT_PASCAL=1 leaves the compiled ones out.
-clients='Z:\checkout\tests\hosts\clients'
+hosts='Z:\checkout\tests\hosts'
+sources=$talutil_top/tests/hosts/clients
 programs=$talutil_build/$folder/tests/hosts/pascal
 
 prints_expected() {
-  local name=$1 output=$talutil_build/$folder-$1.txt tables=$talutil_top/tests/hosts/clients status=0
+  local name=$1 output=$talutil_build/$folder-$1.txt status=0
   shift
   "$@" "$name" >"$output" || status=$?
-  awk -v client="$name" -v status="$status" -f "$tables/compare.awk" "$tables/expected.txt" "$output"
+  awk -v client="$name" -v status="$status" -f "$sources/compare.awk" "$sources/../members.vbs" "$output"
 }
 
 compile() { "$pascal/compiler" -n -ve -T"$(cat "$pascal/target")" -Fu"$pascal/units" -FU"$1" -Fu"$1" -FE"$1" "${@:2}"; }
 
 # The type library's unit is made by the importer, so the early-bound client compiles only if that reads it right.
 compile_clients() {
-  local sources=$talutil_top/tests/hosts/clients
   pascal=$("$talutil_top/tools/pascal.sh" "$folder") || return 1
   rm -rf "$programs"
   mkdir -p "$programs/late" "$programs/early"
@@ -135,9 +140,10 @@ rm -rf "$(wine_prefix)/drive_c/clients"
 for key in 'HKCU\Software\TALUtil\Settings' 'HKCU\Software\TALUtil Clients'; do
   wine reg.exe delete "$key" /f >/dev/null 2>&1 || true
 done
-run vbscript prints_expected vbscript script_host "$clients\\client.vbs"
-run jscript prints_expected jscript script_host "$clients\\client.js"
-run script_control prints_expected script_control script_host "$clients\\script_control.vbs" "$clients\\client.vbs"
+run vbscript prints_expected vbscript script_host "$hosts\\members.vbs"
+{ cat "$sources/client.js" && awk -f "$sources/to_jscript.awk" "$sources/../members.vbs"; } >"$talutil_build/client.js"
+run jscript prints_expected jscript script_host 'Z:\build\client.js'
+run script_control prints_expected script_control script_host "$hosts\\clients\\script_control.vbs" "$hosts\\members.vbs"
 if [ "${TALUTIL_WITHOUT_PASCAL:-}" = 1 ]; then
   echo "left out: the Free Pascal clients, since TALUTIL_WITHOUT_PASCAL is 1"
 elif compile_clients >"$talutil_build/$folder-pascal.log" 2>&1; then
@@ -155,7 +161,7 @@ localedef -i ru_RU -f UTF-8 "$talutil_build/locales/ru_RU.UTF-8"
 export WINE_LANG=ru_RU.UTF-8 WINE_LOCPATH
 WINE_LOCPATH=$(build_below_wine)/locales
 restart_wine
-run code-page wine cscript.exe //nologo 'Z:\checkout\tests\hosts\code_page.vbs'
+elsewhere 206-1-15-1 code_page
 unset WINE_LANG WINE_LOCPATH
 restart_wine
 
@@ -163,7 +169,7 @@ restart_wine
 talutil=$talutil_build/asan/talutil
 secret="O´Neil, 5 €"
 rm -f "$talutil_build/cipher.txt"
-run cipher wine cscript.exe //nologo 'Z:\checkout\tests\hosts\cipher.vbs' "$("$talutil" encrypt <<<"$secret")" 'Z:\build\cipher.txt'
+elsewhere -1 cipher "$("$talutil" encrypt <<<"$secret")" 'Z:\build\cipher.txt'
 expect_success "the command opens what the script host has encrypted" \
   test "$(tr -d '\r' <"$talutil_build/cipher.txt" | "$talutil" decrypt)" = "$secret"
 expect_success "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"

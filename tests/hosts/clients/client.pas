@@ -1,4 +1,4 @@
-{ What client.vbs does, in a compiled host: bound late or, with -dearly, through the unit that the compiler's importer
+{ What members.vbs does, in a compiled host: bound late or, with -dearly, through the unit that the compiler's importer
   makes of the type library. Arguments are variables of their own types, passed by reference.
 
     client.exe CLIENT }
@@ -290,7 +290,7 @@ begin
     on e: EOleException do
     begin
       Say(name, IntToStr(e.ErrorCode and $FFFF) + ' ' + e.Message);
-      Say(name + '.source', e.Source);
+      if e.Source <> 'TALUtil.ORVUtils' then Say(name + '.source', e.Source);
     end;
   end;
 end;

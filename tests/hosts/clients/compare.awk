@@ -1,17 +1,23 @@
-# Compares what a client has printed with expected.txt: awk -v client=NAME -v status=ITS_STATUS -f compare.awk
-# expected.txt OUTPUT. Prints a line for each difference, then the counts.
+# Compares what a client has printed with what stands in members.vbs: awk -v client=NAME -v status=ITS_STATUS -f
+# compare.awk members.vbs OUTPUT. Prints a line for each difference, then the counts. Below the line of dashes stands what
+# VBScript alone does.
 
 function name_of(line) { return substr(line, 1, index(line, "=") - 1) }
 
-FNR == NR && /^[a-z_]+: / {
-  if (index($0, client ": ") != 1) next
-  $0 = substr($0, length(client) + 3)
+FNR == NR && /^'---/ { is_common = client !~ /vbscript|script_control/ }
+FNR == NR && /^'[a-z_]+: / {
+  if (index($0, "'" client ": ") != 1) next
+  $0 = substr($0, length(client) + 4)
   own[name_of($0)] = 1
   expected[name_of($0)] = $0
   next
 }
 FNR == NR {
-  if ($0 != "" && $0 !~ /^#/ && !(name_of($0) in own)) expected[name_of($0)] = $0
+  if (is_common || !match($0, / '= .*/)) next
+  value = substr($0, RSTART + 4)
+  sub(/.*Say[A-Za-z]* "/, "")
+  name = substr($0, 1, index($0, "\"") - 1)
+  if (!(name in own)) expected[name] = name "=" value
   next
 }
 {

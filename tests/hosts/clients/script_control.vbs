@@ -1,4 +1,4 @@
-' A host that embeds scripts: hands its own object to a script control, which runs the script of client.vbs.
+' A host that embeds scripts: hands its own object to a script control, which runs the script of members.vbs.
 '
 '   cscript //nologo script_control.vbs FILE CLIENT
 Option Explicit
