@@ -45,83 +45,52 @@ std::wstring ask(_ORVUtils* u, const Question& question, const std::function<voi
 
 std::wstring prompt_of(HWND window) { return text_of(controls(window, L"Static").at(0)); }
 
+LONG height_of(HWND window) {
+  RECT place{};
+  GetWindowRect(window, &place);
+  check(place.top >= 0 && place.bottom <= GetSystemMetrics(SM_CYSCREEN), "it stands on the screen");
+  return place.bottom - place.top;
+}
+
 void boxes_take_texts(_ORVUtils* u) {
   LONG usual_height = 0;
-  const auto height = [](HWND window) {
-    RECT place{};
-    GetWindowRect(window, &place);
-    check(place.top >= 0 && place.bottom <= GetSystemMetrics(SM_CYSCREEN), "it stands on the screen");
-    return place.bottom - place.top;
+  const auto looks_usual = [&](HWND window) {
+    usual_height = height_of(window);
+    check_equal(L"Who?|What is your name?|OK", words_of(window), "the texts");
+    check(has_style(window, GWL_EXSTYLE, WS_EX_TOPMOST) && has_style(window, GWL_STYLE, WS_CAPTION), "a frame, on top");
+    check(GetWindow(controls(window, L"Static").at(0), GW_HWNDNEXT) == controls(window, L"Edit").at(0),
+          "the label names the entry");
   };
-  struct Row {
-    Question question;
-    const wchar_t* answer;
-    std::function<void(HWND)> user;
+  const auto is_masked = [](HWND window) {
+    check(has_style(controls(window, L"Edit").at(0), GWL_STYLE, ES_PASSWORD), "masked");
   };
+  const auto has_no_entry = [](HWND window) { check(controls(window, L"Edit").empty(), "no entry"); };
+  const auto has_grown = [&](HWND window) { check(height_of(window) > usual_height + 40, "grown with its prompt"); };
+  const auto is_high = [&](HWND window) { check(height_of(window) > 3 * usual_height, "an endless prompt"); };
+  const auto is_as_written = [](HWND window) { check_equal(L"{\\rtf1 rich}", prompt_of(window), "a rich prompt"); };
+  const std::wstring several = L"one\r\ntwo\nthree\r\nfour\r\n\u05E9\u05DC\u05D5\u05DD \u4F60\u597D\r\n";
   std::wstring endless;
   while (endless.size() < 65536) endless += L"A line of a prompt that nobody reads to its end.\n";
-  const Question several{.prompt = L"one\r\ntwo\nthree\r\nfour\r\n\u05E9\u05DC\u05D5\u05DD \u4F60\u597D\r\n" +
-                                   std::wstring(300, L'w')};
-  const Row rows[] = {
-      {{},
-       L"ann",
-       [&](HWND window) {
-         check_equal(L"Who?|What is your name?|OK", words_of(window), "the texts");
-         check(has_style(window, GWL_EXSTYLE, WS_EX_TOPMOST), "it is on top");
-         check(has_style(window, GWL_STYLE, WS_CAPTION), "it has a frame");
-         check(GetWindow(controls(window, L"Static").at(0), GW_HWNDNEXT) == controls(window, L"Edit").at(0),
-               "the label names the entry");
-         usual_height = height(window);
-         type("ann");
-         take_picture(L"input-box");
-         press(VK_RETURN);
-       }},
-      {{.is_masked = yes},
-       L"SECRET",
-       [](HWND window) {
-         for (const char letter : {'S', 'E', 'C', 'R', 'E', 'T'}) press(letter, {VK_SHIFT});
-         check(has_style(controls(window, L"Edit").at(0), GWL_STYLE, ES_PASSWORD), "masked");
-         take_picture(L"input-box-masked");
-         press(VK_TAB);
-         press(VK_SPACE);
-       }},
-      {{},
-       L"",
-       [](HWND window) {
-         type("gone");
-         PostMessageW(window, WM_SYSCOMMAND, SC_CLOSE, 0);
-       }},
-      {{.has_entry = no, .colour = 0x400000},
-       L"",
-       [](HWND window) {
-         check(controls(window, L"Edit").empty(), "no entry");
-         take_picture(L"input-box-no-entry");
-         click(button(window, L"OK"));
-       }},
-      {{}, L"", [](HWND) { press(VK_ESCAPE); }},
-      {several, L"",
-       [&](HWND window) {
-         check(height(window) > usual_height + 40, "a box grows with its prompt");
-         take_picture(L"input-box-long");
-         press(VK_RETURN);
-       }},
-      {{.prompt = endless + L'\0' + L"after"},
-       L"",
-       [&](HWND window) {
-         check(height(window) > 3 * usual_height, "an endless prompt");
-         take_picture(L"input-box-endless");
-         press(VK_RETURN);
-       }},
-      {{.prompt = L"", .colour = static_cast<LONG>(0x8000000F)}, L"", [](HWND) { press(VK_RETURN); }},
-      {{.colour = static_cast<LONG>(0x800000FF)}, L"", [](HWND) { press(VK_RETURN); }},
-      {{.prompt = L"{\\rtf1 as it was written}", .colour = -1},
-       L"",
-       [](HWND window) {
-         check_equal(L"{\\rtf1 as it was written}", prompt_of(window), "a prompt that looks like rich text");
-         press(VK_RETURN);
-       }},
+  const struct {
+    Question question;
+    std::function<void(HWND)> look;
+    const char* script;
+    const wchar_t* answer;
+  } rows[] = {
+      {{}, looks_usual, "ann{picture input-box}{ENTER}", L"ann"},
+      {{.is_masked = yes}, is_masked, "{SHIFT+S}e{SHIFT+T}{picture input-box-masked}{TAB} ", L"SeT"},
+      {{}, looks_usual, "gone{ALT+F4}", L""},
+      {{.has_entry = no, .colour = 0x400000}, has_no_entry, "{picture input-box-no-entry}{click OK}", L""},
+      {{}, looks_usual, "gone{ESC}", L""},
+      {{.prompt = several + std::wstring(300, L'w')}, has_grown, "{picture input-box-long}{ENTER}", L""},
+      {{.prompt = endless + L'\0' + L"after"}, is_high, "{picture input-box-endless}{ENTER}", L""},
+      {{.prompt = L"", .colour = static_cast<LONG>(0x800000FF)}, height_of, "{ENTER}", L""},
+      {{.prompt = L"{\\rtf1 rich}", .colour = -1}, is_as_written, "{ENTER}", L""},
   };
-  for (const Row& row : rows) check_equal(row.answer, ask(u, row.question, row.user), "the answer");
+  for (const auto& row : rows) {
+    const auto answer = ask(u, row.question, [&](HWND window) { row.look(window), follow(window, row.script); });
+    check_equal(row.answer, answer, row.script);
+  }
 }
 
 _ORVUtils* entered = nullptr;
@@ -146,8 +115,7 @@ void boxes_are_entered_once(_ORVUtils* u) {
   const std::wstring answer = ask(u, {}, [&](HWND window) {
     wait_until([] { return inner_status != S_OK; });
     check_equal(L"What is your name?", prompt_of(window), "the prompt stays");
-    type("a");
-    press(VK_RETURN);
+    follow(window, "a{ENTER}");
   });
   check_equal(run_time_error(400), inner_status, "a box within a box");
   check_equal(L"a", answer, "the answer of the first");
@@ -177,7 +145,7 @@ void boxes_are_entered_once(_ORVUtils* u) {
 /// Last, since the form has no frame afterwards.
 void notices_stay(_ORVUtils* u) {
   std::wstring result;
-  Question notice{.prompt = L"Please wait...", .has_entry = no, .is_frameless = yes, .is_unclosable = yes};
+  const Question notice{.prompt = L"Please wait...", .has_entry = no, .is_frameless = yes, .is_unclosable = yes};
   check_equal(S_OK, ask(u, notice, result), "a notice");
   const auto windows = top_windows(form_class);
   if (!check_equal(std::size_t{1}, windows.size(), "the notice is there")) return;
@@ -189,12 +157,6 @@ void notices_stay(_ORVUtils* u) {
   check_equal(static_cast<COLORREF>(usual_colour), GetPixel(device, 2, 2), "it is painted without a message handled");
   ReleaseDC(window, device);
   take_picture(L"notice");
-  notice.prompt = L"Nearly done";
-  check_equal(S_OK, ask(u, notice, result), "another notice");
-  check(top_windows(form_class) == windows && prompt_of(window) == L"Nearly done", "the same window");
-  press(VK_ESCAPE);
-  handle_messages();
-  check(top_windows(form_class) == windows, "Esc does not close it");
   u->put_DebugMode(0);
   u->Terminate();
   check(IsWindow(window) == FALSE, "Terminate does");
@@ -206,12 +168,7 @@ void keys_are_listed(_ORVUtils* u) {
   const auto windows = top_windows(form_class);
   if (!check_equal(std::size_t{1}, windows.size(), "one window")) return;
   const HWND window = windows[0];
-  check_equal(L"  Shortcut keys List", text_of(window), "the caption");
-  check(has_style(window, GWL_EXSTYLE, WS_EX_TOPMOST), "on top");
   const HWND list = controls(window, L"RichEdit20W").at(0);
-  const std::wstring text = text_of(list);
-  check(text.starts_with(L"GENERAL\r\nCopy Text CTRL+C\r\n"), "the list begins with " + narrow(text.substr(0, 40)));
-  check(text.find(L"Message Center to Employee = F12 \r\n") != std::wstring::npos, "a blank that is kept");
   CHARFORMAT2W format{};
   format.cbSize = sizeof format;
   SendMessageW(list, EM_SETSEL, 0, 7);
@@ -229,8 +186,7 @@ void keys_are_listed(_ORVUtils* u) {
   check(is_at(print), "the first button has the focus");
   press(VK_TAB);
   check(is_at(cross), "Tab reaches the second");
-  press(VK_SPACE);
-  press('K', {VK_MENU});
+  follow(window, " {ALT+K}");
   check(is_at(list), "the cross button closes nothing, and Alt and a letter reach the list");
   press(VK_TAB);
   check(is_at(print), "Tab leaves it");
@@ -272,13 +228,7 @@ int rows_of(HWND window) {
 
 void switches_are_explained(HWND window) {
   check_equal(9, rows_of(window), "rows below the heading");
-  const std::wstring examples = text_of(controls(window, L"RichEdit20W").at(0));
-  check(examples.starts_with(L"Examples on how run ORV with command line options,\r\n\"C:\\Program Files\\TAL\\") &&
-            examples.ends_with(L"\" SINEMP 120000002:1"),
-        "the examples: " + narrow(examples));
-  take_picture(L"command-line-help");
-  press('A', {VK_CONTROL});
-  press('C', {VK_CONTROL});
+  follow(window, "{picture command-line-help}{CTRL+A}{CTRL+C}");
   const std::wstring copied = clipboard();
   check(copied.starts_with(L"RM\tStarts ORV with no booking screen\r\n") &&
             copied.find(L"\r\n\t  Preload the requested time out time if specified\r\n") != std::wstring::npos,
@@ -287,28 +237,16 @@ void switches_are_explained(HWND window) {
 }
 
 void system_is_described(HWND window) {
-  take_picture(L"system-drives");
-  for (const wchar_t* const tab : {L"system-memory", L"system-processor", L"system-operating-system"}) {
-    press(VK_TAB, {VK_CONTROL});
-    take_picture(tab);
-  }
-  click(button(window, L"&Copy as text"));
-  const std::wstring copied = clipboard();
-  for (const wchar_t* const part : {L"Drives\r\n", L"  C:", L"Memory\r\n", L"Processor\r\n", L"Computer"})
-    check(copied.find(part) != std::wstring::npos, "the copy has " + narrow(part));
-  press(VK_TAB, {VK_CONTROL});
-  press('F', {VK_MENU});
-  type("c");
-  press(VK_OEM_1, {VK_SHIFT});
-  press(VK_OEM_5);
-  type("windows");
+  follow(window,
+         "{picture system-drives}{CTRL+TAB}{picture system-memory}{CTRL+TAB}{picture system-processor}{CTRL+TAB}"
+         "{picture system-operating-system}{click &Copy as text}");
+  check(clipboard().starts_with(L"Drives\r\n  Drive  Kind"), "what was copied: " + narrow(clipboard().substr(0, 60)));
+  follow(window, "{CTRL+TAB}{ALT+F}c{SHIFT+;}\\windows");
   check_equal(0, rows_of(window), "no details yet");
   press(VK_RETURN);
   check(wait_until([&] { return rows_of(window) >= 8; }), "the details of a folder");
   check_equal(L"c:\\windows", text_of(controls(window, L"Edit").at(0)), "the path as it was typed");
-  take_picture(L"system-folder");
-  click(button(window, L"&Refresh"));
-  press(VK_ESCAPE);
+  follow(window, "{picture system-folder}{click &Refresh}{ESC}");
 }
 
 /// Opens the preview of a text, the user doing what the function does; it must close the window.
@@ -325,12 +263,7 @@ void preview(_ORVUtils* u, const std::wstring& text, const std::function<void(HW
 
 void pages_are_shown(HWND window) {
   const auto key = [window](WPARAM code) { SendMessageW(window, WM_KEYDOWN, code, 0); };
-  const auto turn = [window](int steps) {
-    for (; steps != 0; steps -= steps / std::abs(steps)) {
-      const int delta = steps > 0 ? WHEEL_DELTA : -WHEEL_DELTA;
-      SendMessageW(window, WM_MOUSEWHEEL, MAKEWPARAM(MK_CONTROL, delta), 0);
-    }
-  };
+  const auto turn = [window](int delta) { SendMessageW(window, WM_MOUSEWHEEL, MAKEWPARAM(MK_CONTROL, delta), 0); };
   const auto page = [window](const wchar_t* number) {
     check_equal(std::wstring(L"Notes           Page ") + number + L" of 3      Press F9 to Print.", text_of(window),
                 "the caption");
@@ -344,9 +277,9 @@ void pages_are_shown(HWND window) {
   key(VK_F2);
   key(VK_F2);
   take_picture(L"preview_100");
-  turn(-2);
+  for (int i = 0; i < 2; ++i) turn(-WHEEL_DELTA);
   take_picture(L"preview_50");
-  turn(5);
+  for (int i = 0; i < 5; ++i) turn(WHEEL_DELTA);
   take_picture(L"preview_200");
   SetWindowPos(window, nullptr, 0, 0, 200, 100, SWP_NOMOVE | SWP_NOZORDER);
   RECT place{};
@@ -370,24 +303,12 @@ void unattended_reports_are_written(_ORVUtils* u) {
                   [&](const Use& use) { return use.answer(static_cast<LONG>(reinterpret_cast<LONG_PTR>(window))); });
   Value holder(&grid);
   Value empty;
-  const auto write = [&](const char* expected, const char* what) {
-    const HRESULT status = u->GridPrintPreview(Short{100}, Short{2}, Text(L"Sales"), Text(L""), holder, empty, empty,
-                                               Text(L"SalesReport"));
-    check_equal(S_OK, status, what);
-    std::string start(5, ' ');
-    std::ifstream(path, std::ios::binary).read(start.data(), 5);
-    check_equal(expected, start, what);
-  };
-  write("%PDF-", "the report of an unattended run");
-  // What another program has open, or what is read-only, stays as it is, without a word.
-  std::ofstream(path) << "older";
-  const HANDLE reader = CreateFileW(path.c_str(), GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING, 0, nullptr);
-  write("older", "a report that is open elsewhere");
-  CloseHandle(reader);
-  SetFileAttributesW(path.c_str(), FILE_ATTRIBUTE_READONLY);
-  write("older", "a read-only report");
-  SetFileAttributesW(path.c_str(), FILE_ATTRIBUTE_NORMAL);
-  write("%PDF-", "a report that can be written again");
+  const HRESULT status =
+      u->GridPrintPreview(Short{100}, Short{2}, Text(L"Sales"), Text(L""), holder, empty, empty, Text(L"SalesReport"));
+  check_equal(S_OK, status, "GridPrintPreview");
+  std::string start(5, ' ');
+  std::ifstream(path, std::ios::binary).read(start.data(), 5);
+  check_equal("%PDF-", start, "the report of an unattended run");
   u->put_AutomatedEndOfMonth(VARIANT_FALSE);
   DestroyWindow(window);
 }

@@ -138,10 +138,6 @@ inline void press(WORD key, std::initializer_list<WORD> held = {}) {
   Sleep(60);
 }
 
-inline void type(std::string_view letters) {
-  for (const char letter : letters) press(static_cast<WORD>(letter >= 'a' ? letter - 'a' + 'A' : letter));
-}
-
 inline void click(HWND control) {
   RECT place{};
   GetWindowRect(control, &place);
@@ -153,6 +149,36 @@ inline void click(HWND control) {
     SendInput(1, &input, sizeof input);
   }
   Sleep(100);
+}
+
+/// Does what a script says: types its letters, and presses the keys in braces, held down with others:
+/// "ann{CTRL+A}{TAB}".
+/// "{click OK}" clicks on a button, "{picture NAME}" takes a picture.
+inline void follow(HWND window, std::string_view script) {
+  constexpr std::pair<std::string_view, WORD> names[] = {{"ENTER", VK_RETURN}, {"ESC", VK_ESCAPE}, {"TAB", VK_TAB},
+                                                         {"CTRL", VK_CONTROL}, {"ALT", VK_MENU},   {"SHIFT", VK_SHIFT},
+                                                         {"F4", VK_F4},        {";", VK_OEM_1},    {"\\", VK_OEM_5}};
+  const auto code_of = [&](std::string_view name) {
+    const auto* const found = std::ranges::find(names, name, [](const auto& row) { return row.first; });
+    return found == std::end(names) ? static_cast<WORD>(std::toupper(name.at(0))) : found->second;
+  };
+  const auto wide_after = [](std::string_view text, std::size_t from) {
+    return std::wstring(text.begin() + static_cast<std::ptrdiff_t>(from), text.end());
+  };
+  while (!script.empty()) {
+    const std::size_t end = script[0] == '{' ? script.find('}') : 0;
+    const std::string_view step = end == 0 ? script.substr(0, 1) : script.substr(1, end - 1);
+    script.remove_prefix(end + 1);
+    const std::size_t plus = step.find('+');
+    if (step.starts_with("click "))
+      click(button(window, wide_after(step, 6)));
+    else if (step.starts_with("picture "))
+      take_picture(wide_after(step, 8));
+    else if (plus == std::string_view::npos)
+      press(code_of(step));
+    else
+      press(code_of(step.substr(plus + 1)), {code_of(step.substr(0, plus))});
+  }
 }
 
 /// Handles messages, those of keys among them, until a condition holds.
