@@ -11,7 +11,6 @@ namespace {
 
 constexpr const wchar_t* printer_name = L"TALUtilTest";
 constexpr const wchar_t* printer_environment = sizeof(void*) == 8 ? L"Windows x64" : L"Windows NT x86";
-constexpr const wchar_t* spooler_key = L"Software\\Wine\\Printing\\Spooler";
 
 BOOL CALLBACK save_description(HMODULE module, const wchar_t* type, wchar_t* name, LONG_PTR path) {
   const HRSRC resource = FindResourceW(module, name, type);
@@ -21,61 +20,94 @@ BOOL CALLBACK save_description(HMODULE module, const wchar_t* type, wchar_t* nam
   return FALSE;
 }
 
-wchar_t* text(const wchar_t* constant) { return const_cast<wchar_t*>(constant); }
+wchar_t* fixed(const wchar_t* constant) { return const_cast<wchar_t*>(constant); }
+
+/// Where the printer writes, as the machine below Wine names it.
+void print_into(const std::wstring& file) {
+  RegSetKeyValueW(HKEY_CURRENT_USER, L"Software\\Wine\\Printing\\Spooler", L"LPT1:", REG_SZ, file.c_str(),
+                  static_cast<DWORD>((file.size() + 1) * sizeof(wchar_t)));
+}
 
 /// A PostScript printer whose port is a file.
-void install_printer(const std::wstring& output) {
+void install_printer() {
   std::array<wchar_t, MAX_PATH> folder{};
   DWORD needed = 0;
-  GetPrinterDriverDirectoryW(nullptr, text(printer_environment), 1, reinterpret_cast<BYTE*>(folder.data()),
+  GetPrinterDriverDirectoryW(nullptr, fixed(printer_environment), 1, reinterpret_cast<BYTE*>(folder.data()),
                              sizeof folder, &needed);
   std::wstring description = std::wstring(folder.data()) + L"\\test.ppd";
   EnumResourceNamesW(LoadLibraryW(L"winspool.drv"), L"PPDFILE", &save_description,
                      reinterpret_cast<LONG_PTR>(description.c_str()));
-  RegSetKeyValueW(HKEY_CURRENT_USER, spooler_key, L"LPT1:", REG_SZ, output.c_str(),
-                  static_cast<DWORD>((output.size() + 1) * sizeof(wchar_t)));
-
   DRIVER_INFO_3W driver{};
   driver.cVersion = 3;
-  driver.pName = text(L"Test PostScript");
-  driver.pEnvironment = text(printer_environment);
-  driver.pDriverPath = driver.pConfigFile = text(L"wineps.drv");
+  driver.pName = fixed(L"Test PostScript");
+  driver.pEnvironment = fixed(printer_environment);
+  driver.pDriverPath = driver.pConfigFile = fixed(L"wineps.drv");
   driver.pDataFile = description.data();
-  driver.pDefaultDataType = text(L"RAW");
+  driver.pDefaultDataType = fixed(L"RAW");
   AddPrinterDriverExW(nullptr, 3, reinterpret_cast<BYTE*>(&driver), APD_COPY_NEW_FILES | APD_COPY_FROM_DIRECTORY);
   PRINTER_INFO_2W printer{};
-  printer.pPrinterName = text(printer_name);
-  printer.pPortName = text(L"LPT1:");
+  printer.pPrinterName = fixed(printer_name);
+  printer.pPortName = fixed(L"LPT1:");
   printer.pDriverName = driver.pName;
-  printer.pPrintProcessor = text(L"WinPrint");
-  printer.pDatatype = text(L"RAW");
-  printer.pComment = printer.pLocation = printer.pParameters = printer.pShareName = printer.pSepFile = text(L"");
+  printer.pPrintProcessor = fixed(L"WinPrint");
+  printer.pDatatype = fixed(L"RAW");
+  printer.pComment = printer.pLocation = printer.pParameters = printer.pShareName = printer.pSepFile = fixed(L"");
   const HANDLE added = AddPrinterW(nullptr, 2, reinterpret_cast<BYTE*>(&printer));
-  if (check(added != nullptr || GetLastError() == ERROR_PRINTER_ALREADY_EXISTS, "a printer is added")) {
-    if (added != nullptr) ClosePrinter(added);
-  }
+  check(added != nullptr && ClosePrinter(added) != FALSE, "a printer is added");
   check(SetDefaultPrinterW(printer_name) != FALSE, "it is the default printer");
 }
 
 void remove_printer() {
   HANDLE printer = nullptr;
   PRINTER_DEFAULTSW rights{nullptr, nullptr, PRINTER_ALL_ACCESS};
-  if (OpenPrinterW(text(printer_name), &printer, &rights) != FALSE) {
+  if (OpenPrinterW(fixed(printer_name), &printer, &rights) != FALSE) {
     DeletePrinter(printer);
     ClosePrinter(printer);
   }
 }
 
-/// Prints by the library's helper, as PrintScreen does.
-LONG print_window(const std::wstring& folder, HWND window) {
-  const HMODULE module = LoadLibraryW((folder + L"\\printhelper\\printhelper.dll").c_str());
+/// What the library's helper answers for a window.
+LONG helper_answer(HMODULE helper, LONG window) {
   LONG answer = 1;
   for (const char* name : {"ConfigurePrinter", "SendToPrinter"}) {
-    const auto print = reinterpret_cast<LONG(WINAPI*)(LONG)>(reinterpret_cast<void*>(GetProcAddress(module, name)));
-    answer = answer != 0 && print != nullptr ? print(static_cast<LONG>(reinterpret_cast<LONG_PTR>(window))) : 0;
+    const auto print = reinterpret_cast<LONG(WINAPI*)(LONG)>(reinterpret_cast<void*>(GetProcAddress(helper, name)));
+    answer = answer != 0 && print != nullptr ? print(window) : 0;
   }
-  FreeLibrary(module);
   return answer;
+}
+
+/// A form as PrintScreen wants it, and the print helper, which the client puts beside the library.
+void forms_are_printed(_ORVUtils* u, const std::wstring& folder, const std::wstring& output) {
+  const HWND window = CreateWindowW(L"Static", L"A window to print", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 10, 10, 400, 200,
+                                    nullptr, nullptr, nullptr, nullptr);
+  const auto number = static_cast<LONG>(reinterpret_cast<LONG_PTR>(window));
+  HostObject form({L"hwnd", L"Refresh"}, [&](const Use& use) {
+    return use.member == 1 ? use.answer(number) : UpdateWindow(window) != FALSE ? S_OK : E_FAIL;
+  });
+  Value holder(&form);
+  const auto is_asked = [&](std::vector<DISPID> members) {
+    return std::ranges::equal(std::exchange(form.uses, {}), members, {}, [](const auto& use) { return use.first; });
+  };
+  const std::wstring beside = folder + L"\\printhelper.dll";
+  DeleteFileW(beside.c_str());
+  const Outcome outcome = early_outcome(u->PrintScreen(holder));
+  check_equal(run_time_error(53), outcome.error, "without the print helper");
+  check_equal(L"TALUtil.ORVUtils: File not found: printhelper.dll", outcome.text, "its text");
+  check(is_asked({1}), "what the form was asked for");
+  check(CopyFileW((folder + L"\\printhelper\\printhelper.dll").c_str(), beside.c_str(), FALSE) != FALSE,
+        "the print helper beside TALUtil.dll");
+  check_equal(S_OK, u->PrintScreen(holder), "with the print helper");
+  check(is_asked({1, 2, 1}), "hwnd, Refresh, hwnd");
+  const HMODULE helper = GetModuleHandleW(beside.c_str());
+  check(helper != nullptr, "it is loaded from beside TALUtil.dll");
+  check_equal(0, helper_answer(helper, number), "a window without a printer");
+  install_printer();
+  print_into(output + L"/printed_window.ps");
+  check_equal(0, helper_answer(helper, 12345), "no window");
+  check_equal(1, helper_answer(helper, number), "a window and a printer");
+  FreeLibrary(helper);
+  DeleteFileW(beside.c_str());
+  DestroyWindow(window);
 }
 
 /// Does what prints by way of the printer dialog, which is answered with OK.
@@ -116,19 +148,12 @@ int wmain(int, wchar_t** arguments) {
   enter_desktop();
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
-    const std::wstring folder = arguments[1];
-    const std::wstring output = arguments[2];  // As the machine below Wine names it.
-    const HWND window = CreateWindowW(L"Static", L"A window to print", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 10, 10, 400,
-                                      200, nullptr, nullptr, nullptr, nullptr);
     remove_printer();
-    check_equal(0, print_window(folder, window), "a window without a printer");
-    install_printer(output + L"/printed_window.ps");
-    check_equal(1, print_window(folder, window), "a window with one");
-    install_printer(output + L"/printed_report.ps");
+    forms_are_printed(object.get(), arguments[1], arguments[2]);
+    print_into(arguments[2] + std::wstring(L"/printed_report.ps"));
     preview_is_printed(object.get());
-    install_printer(output + L"/printed_keys.ps");
+    print_into(arguments[2] + std::wstring(L"/printed_keys.ps"));
     keys_are_printed(object.get());
-    DestroyWindow(window);
     remove_printer();
   });
 }

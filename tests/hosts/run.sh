@@ -87,13 +87,13 @@ run forms-144 wine "Z:\\build\\$folder\\tests\\hosts\\forms_client.exe" "Z:\\bui
 dots 96
 rm -f "$talutil_build"/printed_*.ps
 client printing "$(build_below_wine)"
-words_of() { gs -q -sDEVICE=txtwrite -o - "$talutil_build/$1" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' '; }
-words=$(words_of printed_report.ps)
-expect_success "the words of the printed report, which are: $words" \
-  test "${words#*Notes The first page*Page 1 of 2*Notes The second page*Page 2 of 2}" != "$words"
-words=$(words_of printed_keys.ps)
-expect_success "the words of the printed keys, which begin: ${words:0:100}" \
-  test "${words#*GENERAL Copy Text CTRL+C*Page 1 of 6*ORV Help PDF = F1*Telephone Contact = CTRL+T}" != "$words"
+printed() {  # what, the pattern of its words
+  local words
+  words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/printed_$1.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
+  expect_success "the words of the printed $1, which begin: ${words:0:100}" test "${words#$2}" != "$words"
+}
+printed report '*Notes The first page*Page 1 of 2*Notes The second page*Page 2 of 2'
+printed keys '*GENERAL Copy Text CTRL+C*Page 1 of 6*ORV Help PDF = F1*Telephone Contact = CTRL+T'
 expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
 restart_wine
