@@ -55,8 +55,6 @@ std::string shown(const T& value) {
     std::array<char, 16> text{};
     std::snprintf(text.data(), text.size(), value < 0 ? "0x%08lX" : "%ld", value);
     return text.data();
-  } else if constexpr (std::is_pointer_v<T>) {
-    return value == nullptr ? "a null pointer" : "a pointer";
   } else {
     return std::to_string(value);
   }

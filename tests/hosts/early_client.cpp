@@ -22,10 +22,9 @@ void first_error_is_caught(U* u) {
   check_equal(L"(no error information)", early_outcome(S_OK).text, "information on it");
 }
 
-void settings_are_shared_and_survive() {
+void settings_are_shared_and_survive(U* u) {
   Pointer<U> first = create_object();
-  const Pointer<U> second = create_object();
-  check(first.get() != second.get(), "two objects");
+  check(first.get() != u, "two objects");
   VARIANT_BOOL unset = 7;
   first->get_WriteServerPerformanceFile(&unset);
   check_equal(VARIANT_FALSE, unset, "a Boolean never put");
@@ -34,7 +33,7 @@ void settings_are_shared_and_survive() {
   first = {};
   Text user;
   LONG session = 0;
-  second->get_sUserName(user);
+  u->get_sUserName(user);
   create_object()->get_lLoginSessionID(&session);
   check_equal(L"anne", user.view(), "sUserName through another object");
   check_equal(-70000, session, "lLoginSessionID after the release of its object");
@@ -152,32 +151,30 @@ void passwords_let_messages_in(U* u) {
 void interfaces_are_one_object(U* u) {
   const IID* const known[] = {&IID_IDispatch, &IID__ORVUtils, &IID_ISupportErrorInfo, &IID_IProvideClassInfo,
                               &IID_IUnknown};
-  Pointer<IUnknown> identity;
-  u->QueryInterface(IID_IUnknown, identity.receive_untyped());
+  const auto ask = [](IUnknown* object, const IID& id) {
+    Pointer<IUnknown> other;
+    check_equal(S_OK, object->QueryInterface(id, other.receive_untyped()), "from one interface to another");
+    return other;
+  };
   for (const IID* from : known) {
     for (const IID* to : known) {
-      Pointer<IUnknown> part;
-      Pointer<IUnknown> other;
-      Pointer<IUnknown> again;
-      u->QueryInterface(*from, part.receive_untyped());
-      check_equal(S_OK, part->QueryInterface(*to, other.receive_untyped()), "from one interface to another");
-      other->QueryInterface(IID_IUnknown, again.receive_untyped());
-      check(again.get() == identity.get(), "the identity of the object");
+      const Pointer<IUnknown> other = ask(ask(u, *from).get(), *to);
+      check(ask(other.get(), IID_IUnknown).get() == ask(u, IID_IUnknown).get(), "the identity of the object");
     }
   }
   void* none = u;
   check_equal(E_NOINTERFACE, u->QueryInterface(IID_IPersist, &none), "an interface it does not have");
-  check_equal(nullptr, none, "what is given with it");
+  check(none == nullptr, "what is given with it");
   check_equal(E_POINTER, u->QueryInterface(IID_IUnknown, nullptr), "no place for the interface");
 
   Pointer<ISupportErrorInfo> errors;
-  u->QueryInterface(IID_ISupportErrorInfo, errors.receive_untyped());
-  check_equal(S_OK, errors->InterfaceSupportsErrorInfo(IID__ORVUtils), "error information of _ORVUtils");
-  check_equal(S_FALSE, errors->InterfaceSupportsErrorInfo(IID_IPersist), "of an interface it does not have");
   Pointer<IProvideClassInfo> classes;
   Pointer<ITypeInfo> information;
   Text name;
+  u->QueryInterface(IID_ISupportErrorInfo, errors.receive_untyped());
   u->QueryInterface(IID_IProvideClassInfo, classes.receive_untyped());
+  check_equal(S_OK, errors->InterfaceSupportsErrorInfo(IID__ORVUtils), "error information of _ORVUtils");
+  check_equal(S_FALSE, errors->InterfaceSupportsErrorInfo(IID_IPersist), "of an interface it does not have");
   require(classes->GetClassInfo(information.receive()), "GetClassInfo");
   information->GetDocumentation(MEMBERID_NIL, name, nullptr, nullptr, nullptr);
   check_equal(L"ORVUtils", name.view(), "the class information");
@@ -260,7 +257,7 @@ void objects_outlive_their_calls() {
   }
 }
 
-void second_class() {
+void positions_are_their_own() {
   const auto position = second_object();
   LONG height = 0;
   check_equal(S_OK, position->put_Height(-5), "put_Height");
@@ -276,17 +273,13 @@ int wmain(int, wchar_t**) {
   return run_checks([] {
     const Pointer<U> object = create_object();
     U* const u = object.get();
-    first_error_is_caught(u);
-    settings_are_shared_and_survive();
-    properties_keep_what_they_are_given(u);
-    records_are_read_and_written(u);
-    lists_are_written_back(u);
-    passwords_let_messages_in(u);
-    interfaces_are_one_object(u);
-    unmasked_exceptions_do_no_harm(u);
-    short_precision_changes_no_digit(u);
+    for (const auto check_part :
+         {first_error_is_caught, settings_are_shared_and_survive, properties_keep_what_they_are_given,
+          records_are_read_and_written, lists_are_written_back, passwords_let_messages_in, interfaces_are_one_object,
+          unmasked_exceptions_do_no_harm, short_precision_changes_no_digit})
+      check_part(u);
     objects_outlive_their_calls();
-    second_class();
+    positions_are_their_own();
     check_equal(S_OK, u->Terminate(), "Terminate");
     check_equal(S_OK, u->Terminate(), "Terminate again");
   });

@@ -49,7 +49,7 @@ class Factory final : public IClassFactory {
   DWORD registration_ = 0;
 };
 
-/// Values that the client writes to the registry, which go with it.
+/// What the client writes to the registry goes with it.
 struct Registry {
   Registry() { clean(); }
   Registry(const Registry&) = delete;
@@ -57,11 +57,7 @@ struct Registry {
   ~Registry() { clean(); }
 
   static void clean() {
-    for (const HKEY root : {HKEY_CURRENT_USER, HKEY_LOCAL_MACHINE}) {
-      for (const wchar_t* const name : {information_control, grid_control})
-        RegDeleteKeyValueW(root, controls_key, name);
-      RegDeleteKeyW(root, controls_key);
-    }
+    for (const HKEY root : {HKEY_CURRENT_USER, HKEY_LOCAL_MACHINE}) RegDeleteTreeW(root, controls_key);
     RegDeleteTreeW(HKEY_LOCAL_MACHINE, program_key);
   }
   static void set(HKEY root, const wchar_t* key, const wchar_t* name, std::wstring_view value) {
@@ -70,15 +66,11 @@ struct Registry {
   }
 };
 
-template <class Function>
-Function function_of(HMODULE module, const char* name) {
-  return reinterpret_cast<Function>(reinterpret_cast<void*>(GetProcAddress(module, name)));
-}
-
-HRESULT can_unload(HMODULE module) { return function_of<HRESULT(WINAPI*)()>(module, "DllCanUnloadNow")(); }
+HRESULT can_unload(HMODULE module) { return static_cast<HRESULT>(GetProcAddress(module, "DllCanUnloadNow")()); }
 
 void class_objects_keep_the_library(HMODULE module) {
-  const auto get_class = function_of<HRESULT(WINAPI*)(REFCLSID, REFIID, void**)>(module, "DllGetClassObject");
+  const auto get_class = reinterpret_cast<HRESULT(WINAPI*)(REFCLSID, REFIID, void**)>(
+      reinterpret_cast<void*>(GetProcAddress(module, "DllGetClassObject")));
   Pointer<IClassFactory> factory;
   check_equal(S_OK, can_unload(module), "before any object");
   check_equal(CLASS_E_CLASSNOTAVAILABLE, get_class(IID_IUnknown, IID_IClassFactory, factory.receive_untyped()),
