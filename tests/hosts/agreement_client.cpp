@@ -94,6 +94,7 @@ Value typed_value(VARTYPE type, std::uint32_t draw) {
     case VT_SAFEARRAY: {
       if (draw % 4 == 0) return Value::of_type(VT_ARRAY | VT_BSTR);
       Value list = Value::array(draw % 4 == 3 ? VT_VARIANT : VT_BSTR, draw % 8 == 1 ? 1 : 0, {L"a", L"Banana"});
+      if (draw % 8 == 5) V_ARRAY(&list.get())->fFeatures |= FADF_FIXEDSIZE;
       V_VT(&list.get()) = VT_ARRAY | VT_BSTR;
       return list;
     }

@@ -73,12 +73,27 @@ void arrays(IDispatch* u) {
     check_equal(row.after, row.before.type(), std::string("a variable with ") + row.name);
     if (row.error == S_OK) check_equal(L"[A|B|]", contents(V_ARRAY(&row.before.get())), row.name);
   }
-  Value list = Value::array(VT_BSTR, 0, {});
-  const auto reference = [&list] { return Value::reference(VT_ARRAY | VT_BSTR, &V_ARRAY(&list.get())); };
-  check_equal(S_OK, use(u, L"ReadCommaDelimStrToList", L"A,B,", reference()).error, "texts by reference");
-  check_equal(L"[A|B|]", contents(V_ARRAY(&list.get())), "texts by reference");
+  // Texts by reference, as programs pass them.
+  Value list = Value::of_type(VT_ARRAY | VT_BSTR);
+  SAFEARRAY*& array = V_ARRAY(&list.get());
+  const auto read = [&](const wchar_t* text) {
+    return use(u, L"ReadCommaDelimStrToList", text, Value::reference(VT_ARRAY | VT_BSTR, &array)).error;
+  };
+  for (const wchar_t* const text : {L"A,B,", L"A,B,C,D,", L"A,B,"}) check_equal(S_OK, read(text), "texts by reference");
+  check_equal(L"[A|B|]", contents(array), "the texts");
+  // The platform's reference says so of arrays that SafeArrayCreateVector makes; Wine does not set the first flag.
+  constexpr USHORT made_as_vector = 0x2000;
+  check_equal(0, array->fFeatures & (FADF_FIXEDSIZE | made_as_vector), "an array that hosts can resize");
+  array->fFeatures |= FADF_FIXEDSIZE;
+  check_equal(run_time_error(10), read(L"C,"), "an array of fixed size");
+  array->fFeatures &= static_cast<USHORT>(~FADF_FIXEDSIZE);
+  SafeArrayLock(array);
+  check_equal(run_time_error(10), read(L"C,"), "a locked array");
+  SafeArrayUnlock(array);
+  check_equal(L"[A|B|]", contents(array), "an array that could not be changed");
+  check_equal(run_time_error(9), use(u, L"IndexInList", Value::square(VT_BSTR), L"A").error, "two dimensions");
   VARTYPE element = VT_EMPTY;
-  SafeArrayGetVartype(V_ARRAY(&list.get()), &element);
+  SafeArrayGetVartype(array, &element);
   check_equal(VT_BSTR, element, "texts by reference stay texts");
 
   // A style that suburbs do not have gives back what was given.
