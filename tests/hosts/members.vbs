@@ -167,25 +167,19 @@ u.BookingScreenDate = DateSerial(2009, 7, 1)
 Say "BookingScreenDate", u.BookingScreenDate = DateSerial(2009, 7, 1) '= True
 Say "types", TypeName(u.GetYear(0)) & TypeName(u.MyPos("", "", 0)) & TypeName(u.VerifyEmail("")) & _
   TypeName(u.ConvertDurationToNumber("1")) & TypeName(u.VerifyNullDate(0, Empty)) & TypeName(u.BookingScreenDate) & _
-  TypeName(u.WeekYearToDate(1, 2009, 7)) & TypeName(u.AddZeros(7, 3, 1)) & TypeName(u.ConvertCase(0, Null))
-'vbscript: types=IntegerLongBooleanSingleDateDateEmptyStringNull
-'script_control: types=IntegerLongBooleanSingleDateDateEmptyStringNull
+  TypeName(u.WeekYearToDate(1, 2009, 7)) & TypeName(u.AddZeros(7, 3, 1)) & TypeName(u.ConvertCase(0, Null)) '= IntegerLongBooleanSingleDateDateEmptyStringNull
 Say "values", u.VerifyTextData(0, 0, 12.5) & u.VerifyTextData(0, 0, New ValueHolder) & u.VerifyIntData(0, Empty) '= 12.5u0
 
 text = "a" & vbCrLf & Chr(0) & Chr(233)
 Say "line ends", (u.VerifyMemField("A" & vbCrLf & "B") = "A" & vbCr & " B") & " " & _
   u.CRLFStringReplace("A" & vbCrLf & "B", "x") & " " & (u.StringRestoreCRLF("AxxB", "x") = "A" & vbCrLf & "B") & " " & _
-  (u.CryptoDecryptString(u.CryptoEncryptString(text)) = text)
-'vbscript: line ends=True AxxB True True
-'script_control: line ends=True AxxB True True
+  (u.CryptoDecryptString(u.CryptoEncryptString(text)) = text) '= True AxxB True True
 Say "StripNulls", u.StripNulls("ab" & Chr(0) & "cd") & " " & u.RemoveNumberFromString("a1 b@,C") '= ab abC
 Say "StringReplace", u.StringReplace("a;b;", ";x", "--") & " " & u.StringReplaceWord("aBBcBB", "BB", "-") '= a--b-- a-c-
 Say "MyPos", u.MyPos(",", "A,B", 0) & " " & u.SubStrCount("a", "aAa") & " " & u.StringPosition("12 SMITH ST", 1) '= 1 2 3
 Say "AddZeros", u.AddZeros(7, 3, 1) & " " & u.ReverseString("abc") & " " & u.MyInstrDelim("B", "A,B,", ",") '= 700 cba True
 Say "checks", u.IsValueNumber("1.2.3") & u.IsValueDate("15-11-2024") & u.VerifyEmail("x@y.z") & _
-  u.NumbersInString("Unit 4") & u.IsValueTime("09:30:00") & u.VerifyPasswordText("abc")
-'vbscript: checks=TrueTrueTrueTrueFalseFalse
-'script_control: checks=TrueTrueTrueTrueFalseFalse
+  u.NumbersInString("Unit 4") & u.IsValueTime("09:30:00") & u.VerifyPasswordText("abc") '= TrueTrueTrueTrueFalseFalse
 u.iCharacterCaseSuburbs = 2
 Say "ConvertCaseSuburbs", u.ConvertCaseSuburbs("st ives") & Len(u.GenerateFilePassword(40, 2, 1)) & Len(u.GetNewGuid) '= st ives4038
 number = 5

@@ -98,43 +98,34 @@ function L(value: LongInt): PLongInt; begin New(Result); Result^ := value; end;
 function B(value: WordBool): PWordBool; begin New(Result); Result^ := value; end;
 function Day(year, month, day: Word): POleVariant; begin Result := V(TDateTime(EncodeDate(year, month, day))); end;
 
-procedure Say(const name: string; const value: WideString);
+procedure Say(const name: string; const value: OleVariant);
 begin
   WriteLn(name, '=', string(value));
 end;
 
-procedure SayNumber(const name: string; value: Double);
-begin
-  Say(name, FloatToStr(value));
-end;
-
-procedure Texts;
-begin
-  Say('text', u.VerifyTextData(I(20)^, I(1)^, V('  Smith & "Sons", Pty #1  ')^));
-  SayNumber('text.apostrophe', Ord(WideString(u.VerifyTextData(I(0)^, I(0)^, V('O''Brien')^))[2]));
-  Say('number', u.VerifyIntData(I(0)^, V('3.50kg')^));
-  Say('number.null', u.VerifyIntData(I(1)^, V(Null)^));
-  u.iCharactercase := 1;
-  Say('case', u.ConvertCase(I(0)^, V('MARY SMITH-JONES')^));
-end;
-
-procedure Lists;
+procedure TextsAndLists;
 var
   list: TList{$ifdef early} = nil{$endif};
   items, names: OleVariant;
   character: WideString = '';
 begin
-  SayNumber('list', u.ReadCommaDelimStrToList(T('red,green,blue,')^, list, T(',')^));
+  Say('text', u.VerifyTextData(I(20)^, I(1)^, V('  Smith & "Sons", Pty #1  ')^));
+  Say('text.apostrophe', Ord(WideString(u.VerifyTextData(I(0)^, I(0)^, V('O''Brien')^))[2]));
+  Say('number', u.VerifyIntData(I(0)^, V('3.50kg')^));
+  Say('number.null', u.VerifyIntData(I(1)^, V(Null)^));
+  u.iCharactercase := 1;
+  Say('case', u.ConvertCase(I(0)^, V('MARY SMITH-JONES')^));
+  Say('list', u.ReadCommaDelimStrToList(T('red,green,blue,')^, list, T(',')^));
   names := VarArrayCreate([0, 1], varOleStr);
   names[0] := WideString('Apple');
   names[1] := WideString('Banana');
   {$ifdef early}
   TVarData(items).VType := varArray or varOleStr;
   TVarData(items).VArray := PVarArray(list);
-  SayNumber('list.index', u.IndexInList(PSafeArray(TVarData(names).VArray), T('ban')^));
+  Say('list.index', u.IndexInList(PSafeArray(TVarData(names).VArray), T('ban')^));
   {$else}
   items := list;
-  SayNumber('list.index', u.IndexInList(names, T('ban')^));
+  Say('list.index', u.IndexInList(names, T('ban')^));
   {$endif}
   Say('list.items', items[0] + '/' + items[1] + '/' + items[2]);
   Say('field', u.GetData(T('A,B,C,')^, L(1)^, L(2)^));
@@ -142,14 +133,15 @@ begin
   Say('blanks.back', '[' + character + ']');
 end;
 
-procedure Dates;
+procedure DatesAndDurations;
 var
   first, last, first_time, last_time, missing: OleVariant;
   week: SmallInt = 60;
   date, typed_time: TDateTime;
   {$ifdef early}parts: TALUtil_1_0_TLB.SYSTEMTIME;{$endif}
   typed_date: WideString = '00:00:00';
-  reference: OleVariant;
+  hours: WideString = ' 1.5 ';
+  reference, stored: OleVariant;
 begin
   missing := '00:00:00';
   Say('date', FormatDateTime('yyyy', TDateTime(u.VerifyNullDate(I(0)^, missing))));
@@ -159,9 +151,9 @@ begin
   u.VerifyNullDate(I(0)^, reference);
   Say('date.typed', typed_date);
   Say('month', u.IncMonth(Day(2009, 1, 31)^, I(1)^));
-  SayNumber('week', u.GetWeekNumber(Day(2009, 12, 31)^));
+  Say('week', u.GetWeekNumber(Day(2009, 12, 31)^));
   Say('week.start', FormatDateTime('m', TDateTime(u.WeekYearToDate(week, I(2009)^, I(1)^))));
-  SayNumber('week.back', week);
+  Say('week.back', week);
   first := Day(2024, 3, 10)^;
   last := Day(2024, 3, 11)^;
   first_time := EncodeTime(22, 0, 0, 0);
@@ -179,23 +171,16 @@ begin
   Say('difference.typed', u.GetTimeDifference(date, date, typed_time, typed_time));
   Say('difference.typed.back', FormatDateTime('dd/mm/yyyy', date) + FormatDateTime(' hh:nn', typed_time));
   {$endif}
-end;
-
-procedure Durations;
-var
-  hours: WideString = ' 1.5 ';
-  stored: OleVariant;
-begin
   Say('duration', u.DateTimeToDuration(V('2/1/1800 02:00')^));
-  SayNumber('duration.number', u.ConvertDurationToNumber(V('01:45')^));
+  Say('duration.number', u.ConvertDurationToNumber(V('01:45')^));
   stored := u.DurToTime(hours);
-  SayNumber('duration.minutes', u.ConvertDatabaseDurationToMinutes(stored));
+  Say('duration.minutes', u.ConvertDatabaseDurationToMinutes(stored));
   Say('duration.back', '[' + hours + ']');
 end;
 
-procedure Settings;
+procedure SettingsAndFiles;
 var
-  ini, key, output: WideString;
+  ini, key, output, secret: WideString;
 begin
   ini := folder + 'client.ini';
   key := 'Software\TALUtil Clients\' + own_name;
@@ -211,12 +196,6 @@ begin
   u.REGISTRY_CreateNewKey(key, L(LongInt($80000001))^);
   u.REGISTRY_SetKeyValue(key, T('Number')^, V(42)^, L(4)^);
   Say('registry', u.REGISTRY_ReturnValue(key, T('Number')^));
-end;
-
-procedure Files;
-var
-  secret: WideString;
-begin
   u.SaveTextBox(T('a line')^, T(folder + 'in\a.txt')^);
   u.SaveTextBox(T(u.CryptoEncryptString(T('branch 12')^))^, T(folder + 'in\b.txt')^);
   Say('files', u.GetFileList(T(',')^, T(folder + 'in\')^, T('*.txt')^));
@@ -240,7 +219,7 @@ begin
   control := THostControl.Create;
   reference := control as IDispatch;
   control.Text := 'typed';
-  SayNumber('combo', u.GetComboListIndex(reference, L(12)^));
+  Say('combo', u.GetComboListIndex(reference, L(12)^));
   Say('combo.text', '[' + control.Text + ']');
   control.Widths[1] := 480;
   control.Widths[2] := 1000;
@@ -254,7 +233,7 @@ begin
   position.SaveControlPosition;
   position.left := 0;
   position.GetControlPosition;
-  SayNumber('position', position.left);
+  Say('position', position.left);
 end;
 
 procedure Report;
@@ -270,7 +249,7 @@ begin
   grid.FixedRows := 1;
   grid.AddItem('1001'#9'True');
   grid.ColDataType[1] := 11;
-  SayNumber('ticks', u.CountGridSelectedRows(L(1)^, grid));
+  Say('ticks', u.CountGridSelectedRows(L(1)^, grid));
   u.AutomatedEndOfMonth := True;
   u.GridPrintPreview(I(100)^, I(2)^, T('Sales')^, T('')^, grid, Day(2009, 3, 1)^, Day(2009, 3, 31)^, T('SalesReport')^);
   Say('report', Copy(WideString(u.LoadTextBox(T(pdf)^)), 1, 5));
@@ -301,12 +280,9 @@ begin
   folder := 'C:\clients\' + own_name + '\';
   u := {$ifdef early}CoORVUtils.Create{$else}CreateOleObject('TALUtil.ORVUtils'){$endif};
   u.VerifyFilePath(T(folder + 'in\')^);
-  Texts;
-  Lists;
-  Dates;
-  Durations;
-  Settings;
-  Files;
+  TextsAndLists;
+  DatesAndDurations;
+  SettingsAndFiles;
   Controls;
   Report;
   SayError('error.overflow', Overflow);

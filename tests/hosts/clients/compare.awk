@@ -13,11 +13,11 @@ FNR == NR && /^'[a-z_]+: / {
   next
 }
 FNR == NR {
-  if (is_common || !match($0, / '= .*/)) next
-  value = substr($0, RSTART + 4)
-  sub(/.*Say[A-Za-z]* "/, "")
-  name = substr($0, 1, index($0, "\"") - 1)
-  if (!(name in own)) expected[name] = name "=" value
+  if (is_common) next
+  value = match($0, / '= .*/) ? substr($0, RSTART + 4) : ""
+  # What is expected of a statement of several lines stands behind the last of them.
+  if (sub(/.*Say[A-Za-z]* "/, "")) name = substr($0, 1, index($0, "\"") - 1)
+  if (value != "" && !(name in own)) expected[name] = name "=" value
   next
 }
 {
