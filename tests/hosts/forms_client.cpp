@@ -94,7 +94,7 @@ void boxes_take_texts(_ORVUtils* u) {
 }
 
 _ORVUtils* entered = nullptr;
-HRESULT inner_status = S_OK;
+std::atomic<HRESULT> inner_status = S_OK;
 
 void CALLBACK ask_again(HWND, UINT, UINT_PTR timer, DWORD) {
   KillTimer(nullptr, timer);
@@ -117,7 +117,7 @@ void boxes_are_entered_once(_ORVUtils* u) {
     check_equal(L"What is your name?", prompt_of(window), "the prompt stays");
     follow(window, "a{ENTER}");
   });
-  check_equal(run_time_error(400), inner_status, "a box within a box");
+  check_equal(run_time_error(400), inner_status.load(), "a box within a box");
   check_equal(L"a", answer, "the answer of the first");
 
   // A host that quits gets its box back, and hears of it in its own loop.
@@ -191,13 +191,13 @@ void keys_are_listed(_ORVUtils* u) {
   press(VK_TAB);
   check(is_at(print), "Tab leaves it");
   // There is no printer: the user is told, the host is not.
-  bool is_told = false;
+  std::atomic<bool> is_told = false;
   const auto answer = [&](HWND box) {
     PostMessageW(box, WM_COMMAND, IDOK, 0);
     is_told = true;
   };
   with_user(
-      dialog_class, [&] { press(VK_SPACE), messages_until([&] { return is_told; }); }, answer);
+      dialog_class, [&] { press(VK_SPACE), messages_until([&] { return is_told.load(); }); }, answer);
   check(is_told, "a box tells that nothing can be printed");
   SetWindowPos(window, nullptr, 0, 0, 700, 600, SWP_NOMOVE | SWP_NOZORDER);
   RECT inside{};
