@@ -25,7 +25,7 @@ struct Toolkit {
   testing::FakePlatform platform;
   posix::PosixFiles files;
   Library library{[this] {
-    platform.real_files = &files;
+    platform.used_files = &files;
     return platform.platform();
   }()};
   ORVUtils utils{library};

@@ -5,7 +5,7 @@
 
 #include "archives/packing.hpp"
 #include "archives/unpacking.hpp"
-#include "tests/platform/real_files.hpp"
+#include "tests/platform/real_platform.hpp"
 
 /// Trees of files on the real platform, as maps from path ("a\b.txt", folders with "\" at the end) to content.
 namespace talutil::archives::testing {

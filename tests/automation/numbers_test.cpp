@@ -2,13 +2,19 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
+#include <cstdlib>
 #include <limits>
 
 #include "automation/checked.hpp"
-#include "tests/automation/outcome.hpp"
+#include "tests/fakes/error_of.hpp"
+#include "tests/fakes/rows.hpp"
 
 namespace talutil {
 namespace {
+
+using testing::check_rows;
+using testing::outcome;
 
 constexpr double infinity = std::numeric_limits<double>::infinity();
 constexpr Locale comma_locale{.decimal_separator = u',', .thousands_separator = u'.', .currency_symbol = {u'\u20AC'}};
@@ -19,24 +25,32 @@ struct ReadingRow {
   const char* expected;
 };
 
+// Without blanks, other bases and separators a number is what the C library takes for one.
+TEST(Numbers, AreReadAsTheCLibraryReadsThem) {
+  constexpr TextView pieces[] = {u"0", u"1", u"25", u"007", u"9999", u".", u"-", u"+", u"e", u"E+", u"e-", u"y"};
+  testing::Generator generator;
+  for (int i = 0; i < 20'000; ++i) {
+    Text text;
+    for (int left = generator.whole(0, 7); left > 0; --left) text += generator.one_of(pieces);
+    const std::string bytes = to_utf8(text);
+    char* end = nullptr;
+    const double number = std::strtod(bytes.c_str(), &end);
+    const std::string expected = std::isfinite(number) ? outcome([&] { return number; }) : "error 6";
+    EXPECT_EQ(outcome([&] { return leading_number(text); }), expected) << bytes;
+    // Whole texts may have one sign of each kind, behind the number too.
+    if (text.find(u"+-") != Text::npos || text.find(u"-+") != Text::npos || text.find_last_of(u"+-") + 1 == text.size())
+      continue;
+    const bool is_whole = !bytes.empty() && *end == 0;
+    EXPECT_EQ(outcome([&] { return text_to_number(text); }), is_whole ? expected : "none") << bytes;
+  }
+}
+
 TEST(Numbers, LeadingNumber) {
   const ReadingRow rows[] = {
-      {"stops at a letter", u"12abc", "12"},
-      {"no number", u"abc", "0"},
-      {"empty", u"", "0"},
       {"stops at a comma", u"1,000", "1"},
-      {"skips between digits", u" 4 5", "45"},
       {"skips every kind of blank", u"\t-\r1\n2\u3000. 5 e \u30001", "-125"},
       {"stops at a no-break blank", u"1\u00A02", "1"},
-      {"a second full stop ends it", u"1.5.5", "1.5"},
-      {"sign alone", u"-", "0"},
-      {"one sign only", u"--5", "0"},
-      {"full stop first", u".5x", "0.5"},
-      {"full stop alone", u".e5", "0"},
-      {"exponent", u"1e5", "100000"},
       {"exponent after D", u"25D-1", "2.5"},
-      {"exponent without digits", u"1e", "1"},
-      {"exponent with a sign only", u"1e+x", "1"},
       {"hexadecimal of 16 bits is signed", u"&HFFFF", "-1"},
       {"leading zeros do not widen it", u"&h0007fffx", "32767"},
       {"with a mark behind it is not", u"&HFFFF&", "65535"},
@@ -47,11 +61,9 @@ TEST(Numbers, LeadingNumber) {
       {"no base", u"&17", "0"},
       {"no bits", u"&HG", "0"},
       {"largest", u"17976931348623157e292", "1.79769313486232E+308"},
-      {"too large", u"1E400", "error 6"},
       {"just too large", u"1.7976931348623159e308", "error 6"},
       {"too large by far", u"-1E99999999999999999999", "error 6"},
       {"zero with a huge exponent", u"0E99999", "0"},
-      {"too small", u"1E-400", "0"},
       {"leading zeros count against the exponent", u"0.0001E312", "1E+308"},
   };
   for (const auto& row : rows) EXPECT_EQ(outcome([&] { return leading_number(row.text); }), row.expected) << row.name;
@@ -66,25 +78,17 @@ TEST(Numbers, LongTextsTakeLinearTime) {
 }
 
 TEST(Numbers, ToText) {
-  const struct {
-    const char* name;
-    double value;
-    TextView expected;
-    TextView expected_single;
-  } rows[] = {
+  const testing::Rows<double, Text, Text> rows = {
       {"negative zero", -0.0, u"0", u"0"},
       {"as many decimal places as digits", 0.012345678901234, u"0.012345678901234", u"1.234568E-02"},
       {"one more", -3.5 / 42, u"-8.33333333333333E-02", u"-8.333334E-02"},
   };
-  for (const auto& row : rows) {
-    EXPECT_EQ(number_to_text(row.value), row.expected) << row.name;
-    EXPECT_EQ(number_to_text(static_cast<float>(row.value)), row.expected_single) << row.name;
-  }
+  check_rows(rows, [](double value, const Text& text, const Text& text_of_single) {
+    EXPECT_EQ(number_to_text(value), text);
+    EXPECT_EQ(number_to_text(static_cast<float>(value)), text_of_single);
+  });
   EXPECT_EQ(number_to_text(-1.5e300, comma_locale), u"-1,5E+300");
   EXPECT_EQ(number_to_text(std::numeric_limits<std::int32_t>::min()), u"-2147483648");
-}
-
-TEST(Numbers, CurrencyToText) {
   EXPECT_EQ(number_to_text(Currency{std::numeric_limits<std::int64_t>::min()}), u"-922337203685477.5808");
   EXPECT_EQ(number_to_text(Currency{10500}, comma_locale), u"1,05");
 }
@@ -92,24 +96,21 @@ TEST(Numbers, CurrencyToText) {
 TEST(Numbers, WholeTexts) {
   const ReadingRow rows[] = {
       {"blanks around", u" \t5\u00A0", "5"},
-      {"empty", u"", "none"},
       {"signs at both ends", u"-5-", "none"},
       {"brackets", u"($1,234.5)", "-1234.5"},
       {"bracket left open", u"(5", "none"},
       {"another currency", u"\u00A35", "none"},
       {"separators anywhere behind a digit", u"1,0,0,", "100"},
       {"separator first", u",1", "none"},
-      {"two full stops", u"1.5.5", "none"},
       {"hexadecimal has no sign of its own", u" &hffff ", "65535"},
       {"wide hexadecimal", u"&HFFFFFFFFFF", "1099511627775"},
       {"no bits", u"&H", "none"},
       {"digits of another script", u"\uFF15", "none"},
-      {"too large", u"1E400", "error 6"},
-      {"too small", u"-1E-400", "0"},
   };
   for (const auto& row : rows) EXPECT_EQ(outcome([&] { return text_to_number(row.text); }), row.expected) << row.name;
   EXPECT_EQ(text_to_number(u"\u20AC 1.234,5", comma_locale), 1234.5);
   EXPECT_EQ(text_to_number(u"0.1"), 0.1);
+  EXPECT_EQ(text_to_number(u" "), std::nullopt);
 }
 
 TEST(Numbers, TextToCurrencyAndIntegers) {
@@ -129,12 +130,7 @@ TEST(Numbers, TextToCurrencyAndIntegers) {
   for (const auto& row : currency) {
     EXPECT_EQ(outcome([&] { return text_to_currency(row.text); }), row.expected) << row.name;
   }
-  const struct {
-    const char* name;
-    TextView text;
-    const char* expected_16;
-    const char* expected_32;
-  } integers[] = {
+  const testing::Rows<TextView, std::string, std::string> integers = {
       {"half to even", u"2.5", "2", "2"},
       {"above half by little", u"2.5000000000000000001", "3", "3"},
       {"bits of either width", u"&HFFFF", "-1", "65535"},
@@ -146,19 +142,14 @@ TEST(Numbers, TextToCurrencyAndIntegers) {
       {"beyond it", u"2147483647.5", "error 6", "error 6"},
       {"no number", u"1x", "none", "none"},
   };
-  for (const auto& row : integers) {
-    EXPECT_EQ(outcome([&] { return text_to_integer<std::int16_t>(row.text); }), row.expected_16) << row.name;
-    EXPECT_EQ(outcome([&] { return text_to_integer<std::int32_t>(row.text); }), row.expected_32) << row.name;
-  }
+  check_rows(integers, [](TextView text, const std::string& as_16, const std::string& as_32) {
+    EXPECT_EQ(outcome([&] { return text_to_integer<std::int16_t>(text); }), as_16);
+    EXPECT_EQ(outcome([&] { return text_to_integer<std::int32_t>(text); }), as_32);
+  });
 }
 
 TEST(Numbers, Rounding) {
-  const struct {
-    const char* name;
-    double value;
-    const char* to_16;
-    const char* to_currency;
-  } rows[] = {
+  const testing::Rows<double, std::string, std::string> rows = {
       {"just above half", 2.5000000000000004, "3", "2.5"},
       {"a little above half a ten-thousandth", 0.00005, "0", "0.0001"},
       {"a little below", 0.00015, "0", "0.0001"},
@@ -169,10 +160,10 @@ TEST(Numbers, Rounding) {
       {"infinite", infinity, "error 6", "error 6"},
       {"not a number", infinity - infinity, "error 6", "error 6"},
   };
-  for (const auto& row : rows) {
-    EXPECT_EQ(outcome([&] { return round_to<std::int16_t>(row.value); }), row.to_16) << row.name;
-    EXPECT_EQ(outcome([&] { return number_to_currency(row.value); }), row.to_currency) << row.name;
-  }
+  check_rows(rows, [](double value, const std::string& to_16, const std::string& to_currency) {
+    EXPECT_EQ(outcome([&] { return round_to<std::int16_t>(value); }), to_16);
+    EXPECT_EQ(outcome([&] { return number_to_currency(value); }), to_currency);
+  });
 }
 
 TEST(Numbers, CheckedArithmetic) {

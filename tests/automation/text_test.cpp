@@ -2,10 +2,12 @@
 
 #include <gtest/gtest.h>
 
-#include "tests/automation/outcome.hpp"
+#include "tests/fakes/error_of.hpp"
 
 namespace talutil {
 namespace {
+
+using testing::outcome;
 
 TEST(Text, TrimsBlanksOnly) {
   const struct {

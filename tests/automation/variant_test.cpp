@@ -2,77 +2,57 @@
 
 #include <gtest/gtest.h>
 
-#include "tests/automation/outcome.hpp"
+#include "tests/fakes/error_of.hpp"
+#include "tests/fakes/recording_control.hpp"
+#include "tests/fakes/rows.hpp"
 
 namespace talutil {
 namespace {
 
-/// An object with one value, which is its default member (0) and its member "Item" (7).
-class Holder : public Object {
- public:
-  explicit Holder(Variant value) : value_(std::move(value)) {}
+using testing::check_rows;
+using testing::outcome;
 
-  std::int32_t member_id(TextView name) override {
-    if (!equals_without_case(name, u"Item")) raise(ErrorNumber::member_not_supported);
-    return 7;
-  }
-
-  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
-    if (member != default_member && member != 7) raise(ErrorNumber::member_not_supported);
-    last_member = member;
-    last_access = access;
-    last_arguments.assign(arguments.begin(), arguments.end());
-    if (access == Access::put) value_ = arguments.back();
-    return value_;
-  }
-
-  std::int32_t last_member = -1;
-  Access last_access = Access::call;
-  std::vector<Variant> last_arguments;
-
- private:
-  Variant value_;
-};
-
+/// An object of an object ... whose default member has the value.
 Variant nested(Variant value, int depth) {
-  for (int i = 0; i < depth; ++i) value = ObjectRef(std::make_shared<Holder>(std::move(value)));
+  for (int i = 0; i < depth; ++i) {
+    const auto object = std::make_shared<testing::RecordingControl>();
+    object->values["#0"] = std::move(value);
+    value = ObjectRef(object);
+  }
   return value;
 }
 
 TEST(Variant, Conversions) {
-  const struct {
-    const char* name;
-    Variant value;
-    const char* text;
-    const char* number;
-    const char* int16;
-    const char* currency;
-    const char* boolean;
-    const char* date;
-  } rows[] = {
-      {"Null", Null{}, "error 94", "error 94", "error 94", "error 94", "error 94", "error 94"},
+  using Outcome = std::string;
+  // As text, double, 16 bits, currency, Boolean and date.
+  const testing::Rows<Variant, Outcome, Outcome, Outcome, Outcome, Outcome, Outcome> rows = {
       {"odd bits of a Boolean", Boolean::from_bits(5), "True", "5", "5", "5", "True", "04/01/1900"},
       {"double", 2.5, "2.5", "2.5", "2", "2.5", "True", "01/01/1900 12:00"},
       {"date", Date{39877.5}, "05/03/2009 12:00", "39877.5", "error 6", "39877.5", "True", "05/03/2009 12:00"},
       {"number text", u" 1.5 ", " 1.5 ", "1.5", "2", "1.5", "True", "error 13"},
       {"date text", u"5/3/09", "5/3/09", "error 13", "error 13", "error 13", "error 13", "05/03/2009"},
-      {"texts", TextArray{}, "error 13", "error 13", "error 13", "error 13", "error 13", "error 13"},
-      {"other array", ForeignArray{}, "error 13", "error 13", "error 13", "error 13", "error 13", "error 13"},
       {"object", nested(7, 1), "7", "7", "7", "7", "True", "06/01/1900"},
       {"object of a text", nested(u"&HFFFF", 2), "&HFFFF", "65535", "-1", "65535", "True", "error 13"},
       {"deepest object", nested(7, 16), "7", "7", "7", "7", "True", "06/01/1900"},
-      {"deeper", nested(7, 17), "error 438", "error 438", "error 438", "error 438", "error 438", "error 438"},
-      {"no object", ObjectRef(), "error 91", "error 91", "error 91", "error 91", "error 91", "error 91"},
   };
-  for (const auto& row : rows) {
-    const Variant& value = row.value;
-    EXPECT_EQ(outcome([&] { return value.to_text(plain_numbers); }), row.text) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_double(plain_numbers); }), row.number) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_int16(plain_numbers); }), row.int16) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_currency(plain_numbers); }), row.currency) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_boolean(plain_numbers); }), row.boolean) << row.name;
-    EXPECT_EQ(outcome([&] { return value.to_date(plain_numbers); }), row.date) << row.name;
-  }
+  const auto check = [](const Variant& value, const Outcome& text, const Outcome& number, const Outcome& int16,
+                        const Outcome& currency, const Outcome& boolean, const Outcome& date) {
+    EXPECT_EQ(outcome([&] { return value.to_text(plain_numbers); }), text);
+    EXPECT_EQ(outcome([&] { return value.to_double(plain_numbers); }), number);
+    EXPECT_EQ(outcome([&] { return value.to_int16(plain_numbers); }), int16);
+    EXPECT_EQ(outcome([&] { return value.to_currency(plain_numbers); }), currency);
+    EXPECT_EQ(outcome([&] { return value.to_boolean(plain_numbers); }), boolean);
+    EXPECT_EQ(outcome([&] { return value.to_date(plain_numbers); }), date);
+  };
+  check_rows(rows, check);
+  const testing::Rows<Variant, Outcome> refused = {{"Null", Null{}, "error 94"},
+                                                   {"texts", TextArray{}, "error 13"},
+                                                   {"other array", ForeignArray{}, "error 13"},
+                                                   {"deeper than objects go", nested(7, 17), "error 438"},
+                                                   {"no object", ObjectRef(), "error 91"}};
+  check_rows(refused, [&](const Variant& value, const Outcome& error) {
+    check(value, error, error, error, error, error, error);
+  });
 }
 
 TEST(Variant, NarrowConversions) {
@@ -85,13 +65,7 @@ TEST(Variant, NarrowConversions) {
 }
 
 TEST(Variant, Questions) {
-  const struct {
-    const char* name;
-    Variant value;
-    bool is_date;
-    bool is_null;
-    const char* equals_7;
-  } rows[] = {
+  const testing::Rows<Variant, bool, bool, std::string> rows = {
       {"empty", {}, false, false, "False"},
       {"Null", Null{}, false, true, "False"},
       {"number", 7, false, false, "True"},
@@ -104,11 +78,11 @@ TEST(Variant, Questions) {
       {"array", TextArray{}, false, false, "error 13"},
       {"error", missing_argument, false, false, "error 13"},
   };
-  for (const auto& row : rows) {
-    EXPECT_EQ(row.value.is_date(plain_numbers), row.is_date) << row.name;
-    EXPECT_EQ(row.value.is_null(), row.is_null) << row.name;
-    EXPECT_EQ(outcome([&] { return Boolean(row.value.equals_text(u"7", plain_numbers)); }), row.equals_7) << row.name;
-  }
+  check_rows(rows, [](const Variant& value, bool is_date, bool is_null, const std::string& equals_7) {
+    EXPECT_EQ(value.is_date(plain_numbers), is_date);
+    EXPECT_EQ(value.is_null(), is_null);
+    EXPECT_EQ(outcome([&] { return Boolean(value.equals_text(u"7", plain_numbers)); }), equals_7);
+  });
   EXPECT_TRUE(Variant().equals_text(u"", plain_numbers));
   EXPECT_FALSE(Variant(Null{}).equals_text(u"", plain_numbers));
   EXPECT_EQ(outcome([] { return Boolean(Variant(ObjectRef()).is_null()); }), "error 91");
@@ -125,24 +99,19 @@ TEST(Variant, TextArrayBounds) {
 }
 
 TEST(Control, UsesMembersByNameAndIdentifier) {
-  const auto holder = std::make_shared<Holder>(u"2.5");
-  const Control control(Variant(ObjectRef(holder)), plain_numbers);
-  EXPECT_EQ(control.get<std::int32_t>(u"item"), 2);
-  EXPECT_EQ(holder->last_member, 7);
-  EXPECT_EQ(holder->last_access, Access::get);
-  EXPECT_EQ(control.get<std::int16_t>(u"Item"), 2);
+  const auto object = std::make_shared<testing::RecordingControl>();
+  object->values = {{"Text", u"2.5"}, {"#0", u"2.5"}, {"Text(1&, \"x\")", u"9"}};
+  object->methods = {"Move"};
+  const Control control(Variant(ObjectRef(object)), plain_numbers);
+  EXPECT_EQ(control.get<std::int32_t>(u"Text"), 2);
   EXPECT_EQ(control.get<double>(default_member), 2.5);
-  EXPECT_EQ(control.get<Text>(u"Item", {1, u"x"}), u"2.5");
-  EXPECT_EQ(holder->last_arguments, (std::vector<Variant>{1, u"x"}));
-
-  control.put(u"Item", {1}, 9);
-  EXPECT_EQ(holder->last_access, Access::put);
-  EXPECT_EQ(holder->last_arguments, (std::vector<Variant>{1, 9}));
+  EXPECT_EQ(control.get<Text>(u"Text", {1, u"x"}), u"9");
+  control.put(u"Text", {1}, 9);
   control.put(default_member, 8);
-  EXPECT_EQ(control.get(u"Item"), Variant(8));
-  EXPECT_EQ(control.call(u"Item", {3}), Variant(8));
-  EXPECT_EQ(holder->last_access, Access::call);
-
+  EXPECT_EQ(control.get(default_member), Variant(8));
+  control.call(u"Move", {3});
+  EXPECT_EQ(object->uses, (std::vector<std::string>{"Text", "#0", "Text(1&, \"x\")", "put Text(1&) = 9&", "put #0 = 8&",
+                                                    "#0", "call Move(3&)"}));
   EXPECT_EQ(outcome([&] { return control.get(u"Other"); }), "error 438");
   EXPECT_EQ(outcome([] { return Control(Variant(5), plain_numbers).get(0); }), "error 424");
   EXPECT_EQ(outcome([] { return Control(Variant(ObjectRef()), plain_numbers).get(0); }), "error 91");

@@ -5,7 +5,7 @@
 #include "automation/control.hpp"
 #include "controls/cipher_text.hpp"
 #include "infoforms/frm_components.hpp"
-#include "tests/text/recording_utils.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil::testing {
 namespace {
@@ -28,7 +28,7 @@ const Vector vectors[] = {
 const Text lone_surrogate{u'\xD83D', u'A'};
 constexpr TextView lone_surrogate_cipher = u"AQAAAAAAAAAAAAAAAA3eQxzWshiVMcK8SGvKN5rQ4acn";
 
-class Encryption : public TextMembersTest {
+class Encryption : public UtilsTest {
  protected:
   /// The number and the words of the error that decrypting ends with.
   std::pair<std::int32_t, Text> failure(const Text& cipher) {

@@ -1,20 +1,12 @@
 #include "dates/week_tables.hpp"
-#include "tests/dates/late_members.hpp"
-#include "tests/fakes/error_of.hpp"
+#include "tests/fakes/late_members.hpp"
 #include "tests/fakes/recording_control.hpp"
-#include "tests/text/recording_utils.hpp"
 
 namespace talutil::testing {
 namespace {
 
-struct Row {
-  TextView member;
-  TextView arguments;
-  const char* expected;
-};
-
 // clang-format off
-constexpr Row calendar_rows[] = {
+constexpr LateRow calendar_rows[] = {
     {u"GetYear", u"@null", "2000"}, {u"GetYear", u"", "2000"}, {u"GetYear", u"@empty", "2000"},
     {u"GetMonth", u"@null", "1"}, {u"GetDay", u"", "1"}, {u"GetYear", u"5/3/0100", "100"},
     {u"GetYear", u"31/12/9999 23:59", "9999"}, {u"GetMonth", u"5/3/2009", "3"}, {u"GetDay", u"=39877.9", "5"},
@@ -54,7 +46,7 @@ constexpr Row calendar_rows[] = {
 };
 
 // The clock stands in 2009, a common year.
-constexpr Row week_rows[] = {
+constexpr LateRow week_rows[] = {
     {u"GetWeekNumber", u"7/1/2009", "1"}, {u"GetWeekNumber", u"8/1/2009 10:00", "2"},
     {u"GetWeekNumber", u"24/12/2009", "52"}, {u"GetWeekNumber", u"23/12/2009", "51"},
     {u"GetWeekNumber", u"31/12/2008", "52"}, {u"GetWeekNumber", u"@null", "1"}, {u"GetWeekNumber", u"", "1"},
@@ -74,7 +66,7 @@ constexpr Row week_rows[] = {
     {u"GetWeekInDateRange", u"x|07/01/2009|1|2009", "error 13"}, {u"GetWeekInDateRange", u"1/1/2009|@null|1|2009", "error 94"},
 };
 
-constexpr Row stepping_rows[] = {
+constexpr LateRow stepping_rows[] = {
     {u"IncDay", u"31/12/2009|1", "01/01/2010"}, {u"IncDay", u"01/03/2008|-1", "29/02/2008"},
     {u"IncDay", u"5/3/2009 17:00|0", "05/03/2009"}, {u"IncDay", u"5/3/2009|-32768", "error 6"},
     {u"IncDay", u"31/12/9999|1", "1/1/10000"}, {u"IncDay", u"01/01/0100|-1", "31/12/1999"},
@@ -98,7 +90,7 @@ constexpr Row stepping_rows[] = {
     {u"AddTimeToDate", u"05/03/2009|24:00", "error 13"}, {u"AddTimeToDate", u"29/2/2009|9:00", "error 13"},
 };
 
-constexpr Row duration_rows[] = {
+constexpr LateRow duration_rows[] = {
     {u"DateTimeToDuration", u"01/01/1800 01:30", "1:30"}, {u"DateTimeToDuration", u"#01/01/1800 00:05#", "0:5"},
     {u"DateTimeToDuration", u"#02/01/1800 02:00#", "26:0"}, {u"DateTimeToDuration", u"31/12/1799 22:30", "-1:-30"},
     {u"DateTimeToDuration", u"30/12/1899 01:30", "1:30 | 1/1/1800 01:30"},
@@ -130,7 +122,7 @@ constexpr Row duration_rows[] = {
     {u"ConvertTimeToMinutes", u"@empty", "0"}, {u"ConvertTimeToMinutes", u"24:00", "error 13"},
 };
 
-constexpr Row period_rows[] = {
+constexpr LateRow period_rows[] = {
     {u"GetDaysInPeriod", u"01/03/2024|01/03/2024 23:00", "0"}, {u"GetDaysInPeriod", u"01/03/2024|05/03/2024", "4"},
     {u"GetDaysInPeriod", u"05/03/2024|01/03/2024", "4"}, {u"GetDaysInPeriod", u"28/02/2024|#01/03/2024#", "2"},
     {u"GetDaysInPeriod", u"|01/03/2024", "-1"}, {u"GetDaysInPeriod", u"x|@empty", "-1"},
@@ -150,23 +142,14 @@ constexpr Row period_rows[] = {
     {u"GetTimeDifference", u"1/1/2024|@null|9:00|09:05", "error 13 | 01/01/2024"},
 };
 
-constexpr Row utc_rows[] = {  // ten hours ahead
+constexpr LateRow utc_rows[] = {  // ten hours ahead
     {u"LocalTimeToUTC", u"05/03/2009 13:45", "#05/03/2009 03:45#"}, {u"UTCToLocalTime", u"#05/03/2009 03:45:30#", "#05/03/2009 13:45:30#"},
     {u"LocalTimeToUTC", u"01/01/1500 12:00", "#01/01/1500 12:00#"}, {u"UTCToLocalTime", u"01/01/1500 12:00", "#01/01/1601 10:00#"},
     {u"UTCToLocalTime", u"31/12/9999 20:00", "error 5"}, {u"LocalTimeToUTC", u"29/2/2009", "error 13"},
 };
 // clang-format on
 
-class DateMembers : public LateMembers {
- protected:
-  template <std::size_t N>
-  void check(const Row (&rows)[N]) {
-    for (const Row& row : rows) {
-      EXPECT_EQ(call(row.member, row.arguments), row.expected)
-          << to_utf8(row.member) << '(' << to_utf8(row.arguments) << ')';
-    }
-  }
-};
+using DateMembers = LateMembers;
 
 TEST_F(DateMembers, Calendar) { check(calendar_rows); }
 TEST_F(DateMembers, Weeks) { check(week_rows); }
@@ -203,11 +186,10 @@ TEST_F(DateMembers, MinutesThatHaveNoTextAreReportedInABox) {
 }
 
 TEST_F(DateMembers, DurationsUseTheObjectsTextMembers) {
-  RecordingUtils object(library);
-  object.ConvertDurationToNumber(u"-2:30");
+  utils.ConvertDurationToNumber(u"-2:30");
   Text hours = u".5";
-  object.DurToTime(hours);
-  EXPECT_EQ(object.calls,
+  utils.DurToTime(hours);
+  EXPECT_EQ(utils.calls,
             (std::vector<Text>{u"StringReplace|-2:30|-|0", u"MyPos|:|02:30|1", u"MyPos|.|.5|1", u"MyPos|:|00:30|1"}));
 }
 
@@ -215,14 +197,12 @@ TEST_F(DateMembers, ADateWithoutAYearIsOfTheCurrentOne) { EXPECT_EQ(call(u"IncDa
 
 TEST_F(DateMembers, ObjectsStandForRecords) {
   const auto object = std::make_shared<RecordingControl>();
-  for (const auto& [name, value] : std::initializer_list<std::pair<const char*, std::int16_t>>{
-           {"wYear", 2009}, {"wMonth", 3}, {"wDay", 31}, {"wDayOfWeek", 77}, {"wHour", 9}, {"wMilliseconds", 88}})
-    object->values[name] = value;
-  object->values["wMinute"] = object->values["wSecond"] = std::int16_t{0};
-  const LateInterface& members = late_interface<ORVUtils>();
+  constexpr std::pair<const char*, std::int16_t> fields[] = {{"wYear", 2009},    {"wMonth", 3},        {"wDay", 31},
+                                                             {"wHour", 9},       {"wMinute", 0},       {"wSecond", 0},
+                                                             {"wDayOfWeek", 77}, {"wMilliseconds", 88}};
+  for (const auto& [name, value] : fields) object->values[name] = value;
   const auto use = [&](TextView member, std::vector<Argument> arguments) {
-    members.call(&utils, members.slot_of(members.identifier_of(member), Access::call), arguments, plain_numbers);
-    return arguments;
+    return call(member, Access::call, arguments), arguments;
   };
   const Variant holder = ObjectRef(object);
   EXPECT_EQ(use(u"SystemTimeToDate", {holder, Variant()})[1].value.to_text(plain_numbers), u"31/03/2009 09:00");
@@ -244,27 +224,23 @@ TEST_F(DateMembers, SystemTimes) {
   SystemTime time{.wDayOfWeek = 77, .wMilliseconds = 88};
   utils.DateToSystemTime({39877.5732638889}, time);
   EXPECT_EQ(time, (SystemTime{2009, 3, 77, 5, 13, 45, 30, 88}));
-  const struct {
-    const char* name;
-    SystemTime time;
-    const char* expected;
-  } rows[] = {
+  const Rows<SystemTime, std::string> rows = {
       {"parts as they are", time, "05/03/2009 13:45:30"},
-      {"month 13", {2009, 13, 0, 5}, "05/01/2010"},
-      {"month 0", {2009, 0, 0, 5}, "05/12/2008"},
-      {"day 0", {2009, 3, 0, 0}, "28/02/2009"},
-      {"beyond the year 9999 and back", {9999, 25, 0, -5033}, "22/03/9987"},
-      {"hours beyond the day", {2009, 12, 0, 31, 25, -1, 61}, "01/01/2010 01:00:01"},
-      {"before day 0", {1800, 1, 0, 1, 1, 30}, "01/01/1800 01:30"},
-      {"two-digit year", {29, 1, 0, 1}, "01/01/2029"},
-      {"two-digit year of the last century", {30, 1, 0, 1}, "01/01/1930"},
-      {"zeros", {}, "30/11/1999"},
+      {"month 13", SystemTime{2009, 13, 0, 5}, "05/01/2010"},
+      {"month 0", SystemTime{2009, 0, 0, 5}, "05/12/2008"},
+      {"day 0", SystemTime{2009, 3, 0, 0}, "28/02/2009"},
+      {"beyond the year 9999 and back", SystemTime{9999, 25, 0, -5033}, "22/03/9987"},
+      {"hours beyond the day", SystemTime{2009, 12, 0, 31, 25, -1, 61}, "01/01/2010 01:00:01"},
+      {"before day 0", SystemTime{1800, 1, 0, 1, 1, 30}, "01/01/1800 01:30"},
+      {"two-digit year", SystemTime{29, 1, 0, 1}, "01/01/2029"},
+      {"two-digit year of the last century", SystemTime{30, 1, 0, 1}, "01/01/1930"},
+      {"zeros", SystemTime{}, "30/11/1999"},
   };
-  for (const auto& row : rows) {
+  check_rows(rows, [&](const SystemTime& parts, const std::string& expected) {
     Date date;
-    utils.SystemTimeToDate(row.time, date);
-    EXPECT_EQ(to_utf8(date_to_text(date)), row.expected) << row.name;
-  }
+    utils.SystemTimeToDate(parts, date);
+    EXPECT_EQ(to_utf8(date_to_text(date)), expected);
+  });
   for (const SystemTime& bad : {SystemTime{-1, 1, 0, 1}, {9999, 13, 0, 1}, {100, 1, 0, 0}, {32767, 1, 0, 1}}) {
     Date date{7};
     EXPECT_EQ(error_of([&] { utils.SystemTimeToDate(bad, date); }), 5) << bad.wYear;

@@ -1,44 +1,29 @@
 // What the members compute directly, compared with the walks that define it, step for step.
-#include <random>
-
 #include "automation/checked.hpp"
-#include "tests/dates/late_members.hpp"
-#include "tests/fakes/error_of.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil::testing {
 namespace {
 
 constexpr int pairs = 10'000;
 
-class Walks : public LateMembers {
- protected:
-  std::int32_t whole(std::int32_t first, std::int32_t last) {
-    return std::uniform_int_distribution<std::int32_t>(first, last)(random_);
-  }
+struct Walks : UtilsTest {
+  Generator generator;
 
   /// Any day there is; one in eight lies near the first or the last.
   Date any_day() {
     constexpr std::int32_t first = -657434;
     constexpr std::int32_t last = 2958465;
-    switch (whole(0, 15)) {
-      case 0:
-        return {static_cast<double>(whole(first, first + 800))};
-      case 1:
-        return {static_cast<double>(whole(last - 800, last))};
-      default:
-        return {static_cast<double>(whole(first, last))};
-    }
+    const std::int32_t kind = generator.whole(0, 15);
+    return {static_cast<double>(generator.whole(kind == 1 ? last - 800 : first, kind == 0 ? first + 800 : last))};
   }
-
-  std::string text_of(std::int32_t day, std::int32_t month, std::int32_t year) {
-    const Text text = number_to_text(day) + u"/" + number_to_text(month) + u"/" + number_to_text(year);
-    const auto date = text_to_date(text, 2009);
-    return to_utf8(date ? date_to_text(*date) : text);
-  }
-
- private:
-  std::mt19937 random_{20090305};
 };
+
+std::string text_of(std::int32_t day, std::int32_t month, std::int32_t year) {
+  const Text text = number_to_text(day) + u"/" + number_to_text(month) + u"/" + number_to_text(year);
+  const auto date = text_to_date(text, 2009);
+  return to_utf8(date ? date_to_text(*date) : text);
+}
 
 Date normalised(Date date) { return Variant(format_date(date, u"DD/MM/YYYY")).to_date(plain_numbers); }
 
@@ -64,7 +49,7 @@ Counts walk(Date from, Date to) {
 TEST_F(Walks, DaysAndMonthsInAPeriod) {
   for (int i = 0; i < pairs; ++i) {
     const Date a = any_day();
-    const double distance = whole(0, 99) == 0 ? whole(-3000, 3000) : whole(-70, 70);
+    const double distance = generator.whole(0, 99) == 0 ? generator.whole(-3000, 3000) : generator.whole(-70, 70);
     const Date b{a.days + distance};
     if (!is_in_date_range(b.days)) continue;
     Counts counts;
@@ -87,7 +72,8 @@ TEST_F(Walks, DaysAndMonthsInAPeriod) {
 TEST_F(Walks, DaysAndMonthsLater) {
   for (int i = 0; i < pairs; ++i) {
     const Date start = any_day();
-    const auto count = static_cast<std::int16_t>(whole(0, 99) == 0 ? whole(-32767, 32767) : whole(-1200, 1200));
+    const std::int32_t most = generator.whole(0, 99) == 0 ? 32767 : 1200;
+    const auto count = static_cast<std::int16_t>(generator.whole(-most, most));
     const DateParts parts = parts_of(start);
     const auto length = [this](std::int32_t month, std::int32_t year) {
       return utils.GetDaysThisMonth(static_cast<std::int16_t>(month), static_cast<std::int16_t>(year));

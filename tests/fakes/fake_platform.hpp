@@ -64,7 +64,7 @@ struct FakePlatform : MessageBoxes,
   Date current_time{40000.5};  ///< 6 July 2009, 12:00
   std::int64_t utc_offset_minutes = 600;
   std::intptr_t window_handle = 0x1234;
-  std::map<Text, ObjectRef> controls;  ///< Another maker's controls by class name; a null one fails with 429.
+  std::map<Text, ObjectRef> controls;  ///< Third-party controls by class name; a null one fails with 429.
 
   std::int32_t quits_after_waits = 1;  ///< The wait that ends with the thread being asked to quit.
   std::mt19937 random{7};
@@ -84,7 +84,6 @@ struct FakePlatform : MessageBoxes,
   std::vector<DriveFacts> drive_facts{{u"C:", u"Fixed", u"SYSTEM", u"NTFS", 1000ULL << 30, 250ULL << 30},
                                       {u"D:", u"CD-ROM", u"", u"", 0, 0}};
   std::map<Text, ItemFacts> items;  ///< Files and folders that there are details of.
-  FontFiles* font_files = nullptr;  ///< Where wide fonts come from.
   std::vector<PrintSettings> print_jobs;
   bool prints = true;  ///< Whether the printer dialog is answered with OK.
 
@@ -99,37 +98,37 @@ struct FakePlatform : MessageBoxes,
 
   WesternCodePage code_page;
 
-  // Real parts, for tests on a platform that is fake but for one of them.
-  TimeConversions* real_time_conversions = nullptr;
-  Files* real_files = nullptr;
-  Folders* real_folders = nullptr;
-  Registry* real_registry = nullptr;
-  Network* real_network = nullptr;
-  CodePage* real_code_page = nullptr;
+  // What the library gets; a test may put real parts there before it has its library.
+  TimeConversions* used_time_conversions = this;
+  Files* used_files = &files;
+  Folders* used_folders = this;
+  Registry* used_registry = &registry;
+  Network* used_network = &network;
+  CodePage* used_code_page = &code_page;
+  std::vector<std::shared_ptr<void>> kept;
+
+  /// Puts a real part in the place of a fake one, for as long as this platform lives.
+  template <class Part>
+  void use(Part* FakePlatform::*place, std::shared_ptr<std::type_identity_t<Part>> part) {
+    this->*place = part.get();
+    kept.push_back(std::move(part));
+  }
 
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;
   FakePlatform& operator=(const FakePlatform&) = delete;
 
   [[nodiscard]] Platform platform() {
-    TimeConversions& conversions = real_time_conversions == nullptr ? *this : *real_time_conversions;
-    Files& used_files = real_files == nullptr ? files : *real_files;
-    Folders* used_folders = real_folders == nullptr ? this : real_folders;
-    Registry& used_registry = real_registry == nullptr ? registry : *real_registry;
-    Network& used_network = real_network == nullptr ? network : *real_network;
-    CodePage& used_code_page = real_code_page == nullptr ? code_page : *real_code_page;
-    return {*this, *this,         *this,    *this,          *this,         *this,      *this,
-            *this, *cryptography, profiles, settings_store, conversions,   used_files, folder_picker,
-            guids, *used_folders, *this,    used_registry,  used_network,  *this,      *this,
-            *this, *this,         *this,    *this,          used_code_page};
+    return {*this,         *this,          *this,         *this,         *this,          *this,
+            *this,         *this,          *cryptography, profiles,      settings_store, *used_time_conversions,
+            *used_files,   folder_picker,  guids,         *used_folders, *this,          *used_registry,
+            *used_network, *this,          *this,         *this,         *this,          *this,
+            *this,         *used_code_page};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {
     messages.push_back({Text(text), buttons, Text(title)});
-    if (answers.empty()) return buttons == MessageButtons::yes_no ? MessageAnswer::no : MessageAnswer::cancel;
-    const MessageAnswer answer = answers.front();
-    answers.pop_front();
-    return answer;
+    return next_of(answers).value_or(buttons == MessageButtons::yes_no ? MessageAnswer::no : MessageAnswer::cancel);
   }
 
   float twips_per_pixel_x() override { return twips_x; }
@@ -183,13 +182,10 @@ struct FakePlatform : MessageBoxes,
     return {2, 1, {255, 0, 0, 0, 0, 255}};
   }
 
-  std::vector<std::uint8_t> wide_font(bool is_fixed_width) override {
-    return font_files == nullptr ? std::vector<std::uint8_t>() : font_files->wide_font(is_fixed_width);
-  }
+  std::vector<std::uint8_t> wide_font(bool /*is_fixed_width*/) override { return {}; }
   bool print(const Document& document, const PrintSettings& settings) override {
     print_jobs.push_back(settings);
-    if (document.pages.empty()) return false;
-    return prints;
+    return prints && !document.pages.empty();
   }
 
   std::vector<DriveFacts> drives() override { return drive_facts; }
@@ -218,16 +214,16 @@ struct FakePlatform : MessageBoxes,
   ObjectRef create(TextView class_name) override {
     controls_asked_for.emplace_back(class_name);
     const auto found = controls.find(Text(class_name));
-    if (found == controls.end()) return nullptr;
-    if (!found->second) raise(ErrorNumber::cannot_create_object);
-    return found->second;
+    if (found != controls.end() && !found->second) raise(ErrorNumber::cannot_create_object);
+    return found == controls.end() ? nullptr : found->second;
   }
 
  private:
-  static std::optional<Text> next_of(std::deque<Text>& answers) {
-    if (answers.empty()) return std::nullopt;
-    Text answer = std::move(answers.front());
-    answers.pop_front();
+  template <class Answer>
+  static std::optional<Answer> next_of(std::deque<Answer>& scripted) {
+    if (scripted.empty()) return std::nullopt;
+    Answer answer = std::move(scripted.front());
+    scripted.pop_front();
     return answer;
   }
 

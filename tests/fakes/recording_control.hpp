@@ -49,20 +49,21 @@ class RecordingControl : public Object {
     const std::string member = to_utf8(name);
     look_ups.push_back(member);
     const auto found = std::ranges::find(names_, member);
-    if (found != names_.end()) return static_cast<std::int32_t>(found - names_.begin());
+    if (found != names_.end()) return static_cast<std::int32_t>(found - names_.begin()) + 1;
     const auto is_named = [&](const auto& entry) { return entry.first.substr(0, entry.first.find('(')) == member; };
     const bool is_there = std::ranges::any_of(values, is_named) || std::ranges::find(methods, member) != methods.end();
     if (!is_there || uses_of(member) == 0) raise(ErrorNumber::member_not_supported);
     names_.push_back(member);
-    return static_cast<std::int32_t>(names_.size() - 1);
+    return static_cast<std::int32_t>(names_.size());
   }
 
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
     const std::size_t indexes = arguments.size() - (access == Access::put ? 1 : 0);
-    const auto index = static_cast<std::size_t>(member);
+    const auto index = static_cast<std::size_t>(member) - 1;  // Past the end for the default member, which is 0.
     std::string name = index < names_.size() ? names_[index] : '#' + std::to_string(member);
-    // Members that have a number alone are properties.
-    const unsigned declared = index < names_.size() ? uses_of(name) : property;
+    // Members that have a number alone are properties, there when they have a value.
+    const bool is_named = index < names_.size();
+    const unsigned declared = is_named ? uses_of(name) : access == Access::put || values.contains(name) ? property : 0;
     if ((declared & wanted(access, arguments)) == 0) raise(ErrorNumber::member_not_supported);
     for (std::size_t i = 0; i < indexes; ++i) name += (i == 0 ? "(" : ", ") + shown(arguments[i]);
     if (indexes > 0) name += ')';

@@ -3,12 +3,10 @@
 #include <algorithm>
 
 #include "automation/control.hpp"
-#include "automation/late_call.hpp"
 #include "controls/control_factory.hpp"
 #include "infoforms/frm_components.hpp"
-#include "library/interface_table.hpp"
+#include "tests/fakes/late_members.hpp"
 #include "tests/fakes/recording_control.hpp"
-#include "tests/fakes/utils_test.hpp"
 
 namespace talutil {
 namespace {
@@ -16,11 +14,9 @@ namespace {
 using talutil::testing::error_of;
 using talutil::testing::FakePlatform;
 
-class LibraryTest : public testing::UtilsTest {
- protected:
+struct LibraryTest : testing::LateMembers {
   Variant late(TextView name, Access access, std::vector<Argument> arguments = {}) {
-    const LateInterface& members = late_interface<ORVUtils>();
-    return members.call(&utils, members.slot_of(members.identifier_of(name), access), arguments, library.locale());
+    return call(name, access, arguments);
   }
 };
 
@@ -71,13 +67,10 @@ TEST_F(LibraryTest, ObjectsShareOneBlockOfSettings) {
 
 TEST_F(LibraryTest, ObjectPropertiesKeepObjectsOfTheirKindUntilTheNextPut) {
   using talutil::testing::RecordingControl;
-  const auto object_with = [](std::map<std::string, Variant> values) {
-    const auto object = std::make_shared<RecordingControl>();
-    object->values = std::move(values);
-    return object;
-  };
-  const auto form = object_with({{"hwnd", 1}});
-  const auto box = object_with({{"ScaleMode", 1}, {"ScaleX", 1.0F}});
+  const auto form = std::make_shared<RecordingControl>();
+  const auto box = std::make_shared<RecordingControl>();
+  form->values = {{"hwnd", 1}};
+  box->values = {{"ScaleMode", 1}, {"ScaleX", 1.0F}};
   const struct {
     TextView property;
     std::shared_ptr<RecordingControl> fits;
@@ -97,7 +90,7 @@ TEST_F(LibraryTest, ObjectPropertiesKeepObjectsOfTheirKindUntilTheNextPut) {
   }
 }
 
-TEST_F(LibraryTest, AnotherMakersControlTakesItsPlace) {
+TEST_F(LibraryTest, AThirdPartyControlTakesItsPlace) {
   const auto theirs = std::make_shared<testing::RecordingControl>();
   theirs->values = {{"#1745027088", u"THEIRS"}};  // It knows its identifiers and nothing else.
   platform.controls[u"SystemInfoControl.MSysInfo"] = theirs;
@@ -111,7 +104,7 @@ TEST_F(LibraryTest, AControlThatFailsLeavesNoHalfWindow) {
   EXPECT_EQ(platform.open_windows, 0);
   platform.controls.clear();
   platform.controls[u"SystemInfoControl.MSysInfo"] = std::make_shared<testing::RecordingControl>();
-  EXPECT_EQ(error_of([&] { library.start(); }), 9) << "one without a computer's name";
+  EXPECT_EQ(error_of([&] { library.start(); }), 438) << "one without a computer's name";
   EXPECT_EQ(platform.open_windows, 0);
   platform.controls.clear();
   library.start();
@@ -149,29 +142,23 @@ TEST_F(LibraryTest, DatabaseErrorReport) {
 
 // Hosts that are bound early have these positions in their programs. Slots count from 0 after the first seven.
 TEST(InterfaceTable, SlotsStandWhereHostsWereBound) {
-  struct SlotRow {
-    std::size_t slot;
-    std::string_view name;
-    Access access;
-  };
-  const SlotRow rows[] = {
-      {0, "AutomatedEndOfMonth", Access::get},
-      {17, "BookingScreenDate", Access::put},
-      {21, "VersionMajor", Access::put},
-      {24, "VersionMajor", Access::get},
-      {39, "bNewZealand", Access::put},
-      {43, "ComputerName", Access::get},
-      {90, "Terminate", Access::call},
-      {203, "StringReplaceWord", Access::call},
-      {204, "WriteServerPerformanceFile", Access::get},
-      {214, "GetIpAddrTable", Access::call},
-      {215, "VerifyMemField", Access::call},
-  };
+  using enum Access;
+  const testing::Rows<std::size_t, Access> rows = {{"AutomatedEndOfMonth", 0, get},
+                                                   {"BookingScreenDate", 17, put},
+                                                   {"VersionMajor", 21, put},
+                                                   {"VersionMajor", 24, get},
+                                                   {"bNewZealand", 39, put},
+                                                   {"ComputerName", 43, get},
+                                                   {"Terminate", 90, Access::call},
+                                                   {"StringReplaceWord", 203, Access::call},
+                                                   {"WriteServerPerformanceFile", 204, get},
+                                                   {"GetIpAddrTable", 214, Access::call},
+                                                   {"VerifyMemField", 215, Access::call}};
   const auto& members = described<ORVUtils>;
   ASSERT_EQ(members.size(), 216U);
-  for (const SlotRow& row : rows) {
-    EXPECT_EQ(members[row.slot].name, row.name) << row.slot;
-    EXPECT_EQ(members[row.slot].access, row.access) << row.name;
+  for (const auto& [name, slot, access] : rows) {
+    EXPECT_EQ(members[slot].name, std::string_view(name)) << slot;
+    EXPECT_EQ(members[slot].access, access) << name;
   }
 }
 

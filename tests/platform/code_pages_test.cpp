@@ -1,37 +1,24 @@
 // Code pages as both platforms have them, and the members that compare characters by them.
 #include <gtest/gtest.h>
 
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/fake_platform.hpp"
-#include "tests/platform/real_code_page.hpp"
+#include "tests/fakes/utils_test.hpp"
+#include "tests/platform/real_platform.hpp"
 
 namespace talutil::testing {
 namespace {
 
 /// A toolkit on a fake platform that has one of the real code pages.
 struct Toolkit {
-  explicit Toolkit(std::uint32_t number) : page(real_code_page(number)) {}
+  explicit Toolkit(std::uint32_t number)
+      : library((platform.use(&FakePlatform::used_code_page, real_code_page(number)), platform.platform())) {}
 
-  std::unique_ptr<CodePage> page;
   FakePlatform platform;
-  Library library{with_page()};
+  Library library;
   ORVUtils utils{library};
-
- private:
-  Platform with_page() {
-    platform.real_code_page = page.get();
-    return platform.platform();
-  }
 };
 
 TEST(CodePages, BytesAndTexts) {
-  const struct {
-    const char* name;
-    std::uint32_t page;
-    TextView text;
-    std::string_view bytes;
-  } both_ways[] = {
+  const Rows<std::uint32_t, TextView, std::string_view> both_ways = {
       {"Western", 1252, u"O\u2019Neil \u20AC", "O\x92Neil \x80"},
       {"Cyrillic", 1251, u"\u041E\u043B\u044C\u0433\u0430 \u21165", "\xCE\xEB\xFC\xE3\xE0 \xB9\x35"},
       {"Greek", 1253, u"\u038F\u03C1\u03B1", "\xBF\xF1\xE1"},
@@ -40,11 +27,10 @@ TEST(CodePages, BytesAndTexts) {
       {"a pair of units", 65001, u"\u0416\U0001F600", "\xD0\x96\xF0\x9F\x98\x80"},
       {"nothing", 932, u"", ""},
   };
-  for (const auto& row : both_ways) {
-    const auto page = real_code_page(row.page);
-    EXPECT_EQ(page->bytes_of(row.text), row.bytes) << row.name;
-    EXPECT_EQ(page->text_of(row.bytes), row.text) << row.name;
-  }
+  check_rows(both_ways, [](std::uint32_t number, TextView text, std::string_view bytes) {
+    EXPECT_EQ(real_code_page(number)->bytes_of(text), bytes);
+    EXPECT_EQ(real_code_page(number)->text_of(bytes), text);
+  });
   const char16_t lone[] = {0xD800, u'a'};
   EXPECT_EQ(real_code_page(1251)->bytes_of(u"\u6771a\U0001F600"), "?a??");
   EXPECT_EQ(real_code_page(65001)->bytes_of(TextView(lone, 2)), "\xEF\xBF\xBD\x61");
@@ -75,12 +61,7 @@ TEST(CodePages, MembersKeepTheLettersOfThePage) {
     return utils.RemoveStringsFromNumber(0, text, character);
   };
   const auto replaced = [](ORVUtils& utils, const Text& text) { return utils.StringReplace(text, text, u"-"); };
-  const struct {
-    const char* name;
-    std::uint32_t page;
-    Text (*call)(ORVUtils& utils, const Text& text);
-    Text text, expected;
-  } rows[] = {
+  const Rows<std::uint32_t, Text (*)(ORVUtils & utils, const Text& text), Text, Text> rows = {
       // The acute accent in the place of the quote is not in the page, and goes with the question mark.
       {"Cyrillic", 1251, verified, u"\u041E\u043B\u044C\u0433\u0430 \u041E'\u041D\u0438\u043B?",
        u"\u041E\u043B\u044C\u0433\u0430 \u041E\u041D\u0438\u043B"},
@@ -92,10 +73,10 @@ TEST(CodePages, MembersKeepTheLettersOfThePage) {
       {"one character of two bytes", 932, replaced, u"\u6771\u4EAC\u90FD\u6771", u"-\u4EAC\u90FD-"},
       {"all characters of one code", 932, replaced, u"\u00A2\uFFE0\u2260", u"--\u2260"},
   };
-  for (const auto& row : rows) {
-    Toolkit toolkit(row.page);
-    EXPECT_EQ(row.call(toolkit.utils, row.text), row.expected) << row.name << ", " << row.page;
-  }
+  check_rows(rows, [](std::uint32_t page, auto* call, const Text& text, const Text& expected) {
+    Toolkit toolkit(page);
+    EXPECT_EQ(call(toolkit.utils, text), expected);
+  });
 }
 
 // Long texts are passed over in blocks, short ones are not; both must agree with the page on every unit.
@@ -105,7 +86,7 @@ TEST(CodePages, StringReplaceAgreesWithThePageOnEveryCharacter) {
   for (const std::uint32_t number : {1252, 1251, 932, 65001}) {
     Toolkit toolkit(number);
     std::vector<std::string> bytes;
-    for (const char16_t unit : every) bytes.push_back(toolkit.page->bytes_of(TextView(&unit, 1)));
+    for (const char16_t unit : every) bytes.push_back(toolkit.platform.used_code_page->bytes_of(TextView(&unit, 1)));
     for (const char16_t wanted : Text(u"?& \0A\x0081\u20AC\u00E9\u0416\u6771\xD800", 11)) {
       Text expected;
       for (const char16_t unit : every) {

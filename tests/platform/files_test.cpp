@@ -2,30 +2,23 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <array>
 #include <future>
 
 #include "platform/file_names.hpp"
 #include "tests/fakes/error_of.hpp"
-#include "tests/platform/real_files.hpp"
+#include "tests/fakes/rows.hpp"
+#include "tests/platform/real_platform.hpp"
 
 namespace talutil::testing {
 namespace {
 
 class RealFiles : public ::testing::Test {
  protected:
-  void write(const Text& name, std::string_view bytes) {
-    const auto file = files->open_output(folder + name);
-    file->write(bytes);
-    file->close();
-  }
+  void write(const Text& name, std::string_view bytes) { write_bytes(folder + name, bytes); }
 
   std::string read(const Text& name) {
-    const auto file = files->open_input(folder + name);
-    std::string bytes;
-    std::array<char, 5> buffer{};
-    while (const std::size_t count = file->read(buffer)) bytes.append(buffer.data(), count);
-    EXPECT_EQ(file->size(), bytes.size());
+    std::string bytes = read_bytes(folder + name);
+    EXPECT_EQ(files->open_input(folder + name)->size(), bytes.size());
     return bytes;
   }
 
@@ -44,35 +37,29 @@ TEST(FileNames, Patterns) {
   const struct {
     TextView pattern, name;
     bool matches;
-  } rows[] = {
-      {u"*.*", u"name", true},
-      {u"*", u"a.b.c", true},
-      {u"*.", u"name", true},
-      {u"*.", u"a.b", false},
-      {u"*.htm", u"a.html", false},
-      {u"*.htm", u"A.B.HTM", true},
-      {u"a?c.txt", u"abc.txt", true},
-      {u"a?.txt", u"a.txt", true},
-      {u"a??", u"a", true},
-      {u"?a", u"a", false},
-      {u"name.*", u"NAME", true},
-      {u"name.*", u"names.x", false},
-      {u"a*b*c", u"aXbXbXc", true},
-      {u"a*b", u"abc", false},
-      {u"\u00C9*", u"\u00E9t\u00E9", true},
-      {u"", u"a", false},
-      {u"a.?", u"a", true},
-      {u"*.b.*", u"a.b", true},
-  };
+  } rows[] = {{u"*.*", u"name", true},
+              {u"*", u"a.b.c", true},
+              {u"*.", u"name", true},
+              {u"*.", u"a.b", false},
+              {u"*.htm", u"a.html", false},
+              {u"*.htm", u"A.B.HTM", true},
+              {u"a?c.txt", u"abc.txt", true},
+              {u"a?.txt", u"a.txt", true},
+              {u"a??", u"a", true},
+              {u"?a", u"a", false},
+              {u"name.*", u"NAME", true},
+              {u"name.*", u"names.x", false},
+              {u"a*b*c", u"aXbXbXc", true},
+              {u"a*b", u"abc", false},
+              {u"\u00C9*", u"\u00E9t\u00E9", true},
+              {u"", u"a", false},
+              {u"a.?", u"a", true},
+              {u"*.b.*", u"a.b", true}};
   for (const auto& row : rows) EXPECT_EQ(name_matches(row.name, row.pattern), row.matches) << to_utf8(row.pattern);
 }
 
 TEST_F(RealFiles, NamesThatAreNoFiles) {
-  const struct {
-    const char* name;
-    Text path;
-    std::int32_t error;
-  } rows[] = {
+  const Rows<Text, std::int32_t> rows = {
       {"device", u"CON", 52},
       {"device with extension, in a folder", folder + u"nul.txt", 52},
       {"device with a colon", u"LPT1:", 52},
@@ -87,12 +74,12 @@ TEST_F(RealFiles, NamesThatAreNoFiles) {
       {"missing drive", u"Q:\\a.txt", 76},
       {"a folder", folder, 75},
   };
-  for (const auto& row : rows) {
-    EXPECT_EQ(error_of([&] { (void)files->open_input(row.path); }), row.error) << row.name;
-    if (row.error == 53) continue;
-    EXPECT_EQ(error_of([&] { (void)files->open_output(row.path); }), row.error) << row.name << ", output";
-    EXPECT_EQ(error_of([&] { files->append(row.path, "x"); }), row.error) << row.name << ", append";
-  }
+  check_rows(rows, [&](const Text& path, std::int32_t error) {
+    EXPECT_EQ(error_of([&] { (void)files->open_input(path); }), error);
+    if (error == 53) return;
+    EXPECT_EQ(error_of([&] { (void)files->open_output(path); }), error) << "output";
+    EXPECT_EQ(error_of([&] { files->append(path, "x"); }), error) << "append";
+  });
 }
 
 TEST_F(RealFiles, OutputTakesTheNameWhenItIsClosed) {
@@ -120,15 +107,11 @@ TEST_F(RealFiles, ReadOnlyAndLockedFilesStay) {
   {
     const auto lock = lock_file(folder + u"a.txt");
     // At once, as each may wait a while for the lock.
-    const auto error_in_thread = [](auto call) {
-      return std::async(std::launch::async, [call] { return error_of(call); });
-    };
-    auto reading = error_in_thread([&] { (void)read(u"a.txt"); });
-    auto writing = error_in_thread([&] { write(u"a.txt", "new"); });
-    auto appending = error_in_thread([&] { files->append(folder + u"a.txt", "x"); });
-    EXPECT_EQ(reading.get(), 70);
-    EXPECT_EQ(writing.get(), 70);
-    EXPECT_EQ(appending.get(), 70);
+    std::vector<std::future<std::int32_t>> errors;
+    const std::function<void()> calls[] = {[&] { (void)read(u"a.txt"); }, [&] { write(u"a.txt", "new"); },
+                                           [&] { files->append(folder + u"a.txt", "x"); }};
+    for (const auto& call : calls) errors.push_back(std::async(std::launch::async, [&call] { return error_of(call); }));
+    for (auto& error : errors) EXPECT_EQ(error.get(), 70);
   }
   EXPECT_EQ(read(u"a.txt"), "old");
 }

@@ -1,19 +1,15 @@
 #include "platform/profile_document.hpp"
 
-#include <gtest/gtest.h>
+#include "tests/fakes/rows.hpp"
 
 namespace talutil {
 namespace {
 
 using Names = std::vector<Text>;
+using testing::check_rows;
 
 TEST(ProfileDocument, Reads) {
-  const struct {
-    const char* name;
-    std::string_view text;
-    Text section, item;
-    std::optional<Text> expected;
-  } rows[] = {
+  const testing::Rows<std::string_view, Text, Text, std::optional<Text>> rows = {
       {"blanks and case do not count", "[ Ab ]\r\n x y\t=\t1 \r\n", u"aB", u" X Y ", u"1"},
       {"the first section and item of a name", "[a]\nx=1\nx=2\n[a]\ny=3", u"a", u"x", u"1"},
       {"a second section of the name", "[a]\nx=1\n[a]\ny=3", u"a", u"y", std::nullopt},
@@ -29,16 +25,17 @@ TEST(ProfileDocument, Reads) {
       {"quotes that differ", "[a]\nx='y\"\n", u"a", u"x", u"'y\""},
       {"one quote", "[a]\nx=\"\n", u"a", u"x", u"\""},
       {"the end-of-file mark is a blank",
-       "[a]\nx=\x1A"
-       "1\x1A\n",
+       "[a]\nx=\032"
+       "1\032\n",
        u"a", u"x", u"1"},
-      {"a NUL ends a value", {"[a]\nx=1\0y\nz=2", 13}, u"a", u"x", u"1"},
+      {"a NUL ends a value", std::string_view("[a]\nx=1\0y\nz=2", 13), u"a", u"x", u"1"},
       {"code page 1252", "[a]\n\xE9=\x80", u"a", u"\u00C9", u"\u20AC"},
       {"UTF-8 with its mark", "\xEF\xBB\xBF[a]\nx=\xC5\x82", u"a", u"x", u"\u0142"},
-      {"UTF-16 with its mark", {"\xFF\xFE[\0a\0]\0\n\0x\0=\0B\x01", 16}, u"a", u"x", u"\u0142"},
+      {"UTF-16 with its mark", std::string_view("\xFF\xFE[\0a\0]\0\n\0x\0=\0B\x01", 16), u"a", u"x", u"\u0142"},
   };
-  for (const auto& row : rows)
-    EXPECT_EQ(ProfileDocument(row.text).value(row.section, row.item), row.expected) << row.name;
+  check_rows(rows, [](std::string_view text, const Text& section, const Text& item, const std::optional<Text>& value) {
+    EXPECT_EQ(ProfileDocument(text).value(section, item), value);
+  });
   const ProfileDocument names("t=0\n[b]\nx=1\n;c=2\ny\nz=\n=5\n[]\n[b]\n");
   EXPECT_EQ(names.item_names(u"B"), (Names{u"x", u"z", u""}));
   using Entry = ProfileDocument::Entry;
@@ -47,12 +44,7 @@ TEST(ProfileDocument, Reads) {
 }
 
 TEST(ProfileDocument, ChangesOneLine) {
-  const struct {
-    const char* name;
-    std::string_view before;
-    Text section, item, value;
-    std::string_view after;
-  } rows[] = {
+  const testing::Rows<std::string_view, Text, Text, Text, std::string_view> rows = {
       {"in place, spelling and blanks kept", "; head\r\n[A]\r\n\r\nx = 1 ; c\r\ny=2", u"a", u"X", u"9",
        "; head\r\n[A]\r\n\r\nx = 9\r\ny=2"},
       {"an item without a value", "[a]\nx\ny=1", u"a", u"x", u"2", "[a]\nx=2\ny=1"},
@@ -63,11 +55,11 @@ TEST(ProfileDocument, ChangesOneLine) {
       {"before all sections", "[a]\n", u"", u"x", u"1", "x=1\r\n[a]\n"},
       {"UTF-8 stays", "\xEF\xBB\xBF[a]\nx=1", u"a", u"x", u"\u0142", "\xEF\xBB\xBF[a]\nx=\xC5\x82"},
   };
-  for (const auto& row : rows) {
-    ProfileDocument document(row.before);
-    document.put(row.section, row.item, row.value);
-    EXPECT_EQ(document.bytes(), row.after) << row.name;
-  }
+  check_rows(rows, [](auto before, const Text& section, const Text& item, const Text& value, auto after) {
+    ProfileDocument document(before);
+    document.put(section, item, value);
+    EXPECT_EQ(document.bytes(), after);
+  });
 }
 
 }  // namespace

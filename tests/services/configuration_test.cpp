@@ -1,9 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/error_of.hpp"
-#include "tests/fakes/fake_platform.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil::testing {
 namespace {
@@ -18,17 +15,13 @@ class ConfiguredUtils final : public ORVUtils {
   FakePlatform& platform_;
 };
 
-class Configuration : public ::testing::Test {
- protected:
+struct Configuration : ::testing::Test {
   Configuration() {
-    SharedSettings& settings = library.settings();
     settings.sDatabaseName = u"Main";
     settings.sUserName = u"anne";
     settings.sNatNameD = u"mine";
     settings.sORVDataName = u"data";
   }
-
-  void file(std::string_view bytes) { platform.profiles.files.insert_or_assign(u"C:\\a.ini", ProfileDocument(bytes)); }
 
   Text read_file(const Text& item, const Text& otherwise) {
     return utils.GetCfgFileData(u"S", item, otherwise, u"C:\\a.ini", Boolean(true));
@@ -37,18 +30,17 @@ class Configuration : public ::testing::Test {
   FakePlatform platform;
   Library library{platform.platform()};
   ConfiguredUtils utils{library, platform};
+  SharedSettings& settings = library.settings();
   std::vector<Text>& accesses = platform.settings_store.accesses;
 };
 
 TEST_F(Configuration, ReadsOfAFile) {
   const std::string long_value(1500, 'v');
-  file("[S]\r\nabc=x\r\nempty=\r\nslash=\\\r\nunc=\\\\server\r\npath=\\C:\\Data\r\nthree=\\\\\\x\r\nlong=" +
-       long_value);
-  const struct {
-    const char* name;
-    Text item, otherwise, expected;
-    bool saves;
-  } rows[] = {
+  platform.profiles.files.insert_or_assign(
+      u"C:\\a.ini", ProfileDocument("[S]\r\nabc=x\r\nempty=\r\nslash=\\\r\nunc=\\\\server\r\npath=\\C:\\Data\r\n"
+                                    "three=\\\\\\x\r\nlong=" +
+                                    long_value));
+  const Rows<Text, Text, Text, bool> rows = {
       {"a value", u"ABC", u"d", u"x", false},
       {"an empty value is missing", u"empty", u"d", u"d", true},
       {"a backslash is missing", u"slash", u"d", u"d", true},
@@ -62,13 +54,14 @@ TEST_F(Configuration, ReadsOfAFile) {
       {"no item named: the first name", u"", u"d", u"abc", false},
       {"cut at 1023", u"long", u"d", Text(1023, u'v'), false},
   };
-  for (const auto& row : rows) {
+  check_rows(rows, [&](const Text& item, const Text& otherwise, const Text& expected, bool saves) {
     accesses.clear();
-    EXPECT_EQ(read_file(row.item, row.otherwise), row.expected) << row.name;
-    const std::vector<Text> saved = {u"ORV3\\Main_anne_UserSettings|S|" + row.item + u"=" + row.otherwise,
-                                     u"ORV3\\Main_DatabaseSettings|S|" + row.item + u"=" + row.otherwise};
-    EXPECT_EQ(accesses, row.saves ? saved : std::vector<Text>{}) << row.name;
-  }
+    EXPECT_EQ(read_file(item, otherwise), expected);
+    const Text saved = u"|S|" + item + u"=" + otherwise;
+    EXPECT_EQ(accesses, saves ? (std::vector<Text>{u"ORV3\\Main_anne_UserSettings" + saved,
+                                                   u"ORV3\\Main_DatabaseSettings" + saved})
+                              : std::vector<Text>{});
+  });
   EXPECT_EQ(utils.GetCfgFileData(u"S", u"abc", u"NoDefaultData", u"C:\\none.ini", Boolean(true)), u"");
   EXPECT_EQ(utils.GetCfgFileData(u"None", u"", u"d", u"C:\\a.ini", Boolean(true)), u"d");
 }
@@ -89,65 +82,50 @@ TEST_F(Configuration, WritesToAFile) {
 }
 
 TEST_F(Configuration, GroupsOfTheStore) {
-  const Text anne = u"ORV3\\Main_anne_UserSettings|S|k";
-  const Text nobody = u"ORV3\\Main__UserSettings|S|k";
-  const Text main = u"ORV3\\Main_DatabaseSettings|S|k";
-  const Text previous = u"ORV3\\PreviousDatabaseSettings|S|k";
-  const Text code = u"ORV3\\Programmer\\CodeCount|S|k";
-  const struct {
-    const char* name;
-    Text user, own_selector, data_selector, selector;
-    Text read;
-    std::vector<Text> written;
-  } rows[] = {
-      {"the user's", u"anne", u"mine", u"data", u"mine", anne, {anne, main}},
-      {"the database's", u"anne", u"mine", u"data", u"data", main, {anne, main}},
-      {"previous", u"anne", u"mine", u"data", u"PreviousDatabaseSettings", previous, {previous}},
-      {"code", u"anne", u"mine", u"data", u"CodeCount", code, {code}},
-      {"case counts", u"anne", u"mine", u"data", u"codecount", anne, {anne, main}},
-      {"unknown", u"anne", u"mine", u"data", u"C:\\a.ini", anne, {anne, main}},
-      {"no user: the database's", u"", u"mine", u"data", u"mine", main, {nobody, main}},
-      {"no user: previous all the same", u"", u"mine", u"data", u"PreviousDatabaseSettings", previous, {previous}},
-      {"no user: not code, which is written", u"", u"mine", u"data", u"CodeCount", main, {code}},
-      {"an empty selector is not the host's own", u"anne", u"", u"data", u"", anne, {anne, main}},
-      {"but can be the database's", u"anne", u"", u"", u"", main, {anne, main}},
-      {"the host's selectors come first",
-       u"anne",
-       u"CodeCount",
-       u"PreviousDatabaseSettings",
-       u"CodeCount",
-       anne,
-       {anne, main}},
-      {"the database's comes before previous",
-       u"anne",
-       u"x",
-       u"PreviousDatabaseSettings",
-       u"PreviousDatabaseSettings",
-       main,
-       {anne, main}},
+  const Text previous_selector = u"PreviousDatabaseSettings";
+  const Text code_selector = u"CodeCount";
+  // By their first letters: the user's, the database's, of the previous database, of the code counter.
+  std::map<char, Text> groups = {{'u', u"ORV3\\Main_anne_UserSettings|S|k"},
+                                 {'d', u"ORV3\\Main_DatabaseSettings|S|k"},
+                                 {'p', u"ORV3\\PreviousDatabaseSettings|S|k"},
+                                 {'c', u"ORV3\\Programmer\\CodeCount|S|k"},
+                                 {'n', u"ORV3\\Main__UserSettings|S|k"}};
+  const Rows<Text, Text, Text, Text, char, std::string> rows = {
+      {"the user's", u"anne", u"mine", u"data", u"mine", 'u', "ud"},
+      {"the database's", u"anne", u"mine", u"data", u"data", 'd', "ud"},
+      {"previous", u"anne", u"mine", u"data", previous_selector, 'p', "p"},
+      {"code", u"anne", u"mine", u"data", code_selector, 'c', "c"},
+      {"case counts", u"anne", u"mine", u"data", u"codecount", 'u', "ud"},
+      {"unknown", u"anne", u"mine", u"data", u"C:\\a.ini", 'u', "ud"},
+      {"no user: the database's", u"", u"mine", u"data", u"mine", 'd', "nd"},
+      {"no user: previous all the same", u"", u"mine", u"data", previous_selector, 'p', "p"},
+      {"no user: not code, which is written", u"", u"mine", u"data", code_selector, 'd', "c"},
+      {"an empty selector is not the host's own", u"anne", u"", u"data", u"", 'u', "ud"},
+      {"but can be the database's", u"anne", u"", u"", u"", 'd', "ud"},
+      {"the host's comes first", u"anne", code_selector, previous_selector, code_selector, 'u', "ud"},
+      {"the database's before previous", u"anne", u"x", previous_selector, previous_selector, 'd', "ud"},
   };
-  for (const auto& row : rows) {
-    library.settings().sUserName = row.user;
-    library.settings().sNatNameD = row.own_selector;
-    library.settings().sORVDataName = row.data_selector;
+  check_rows(rows, [&](const Text& user, const Text& own, const Text& data, const Text& selector, char read,
+                       const std::string& written) {
+    settings.sUserName = user;
+    settings.sNatNameD = own;
+    settings.sORVDataName = data;
     platform.settings_store.values.clear();
     accesses.clear();
     // A missing value is saved where it was looked for, whatever the default; that of the code counter is not.
-    const bool is_code = row.read == code;
-    EXPECT_EQ(utils.GetCfgFileData(u"S", u"k", u"NoDefaultData", row.selector, Boolean(false)),
-              is_code ? u"" : u"NoDefaultData")
-        << row.name;
-    EXPECT_EQ(accesses,
-              is_code ? std::vector<Text>{row.read} : (std::vector<Text>{row.read, row.read + u"=NoDefaultData"}))
-        << row.name;
+    std::vector<Text> expected = {groups[read]};
+    if (read != 'c') expected.push_back(groups[read] + u"=NoDefaultData");
+    EXPECT_EQ(utils.GetCfgFileData(u"S", u"k", u"NoDefaultData", selector, Boolean(false)),
+              read == 'c' ? u"" : u"NoDefaultData");
+    EXPECT_EQ(accesses, expected);
     accesses.clear();
+    expected.clear();
     Text output = u"\\v";
-    utils.SaveCfgFileData(u"S", u"k", output, row.selector, Boolean(false));
-    std::vector<Text> written = row.written;
-    for (Text& each : written) each += u"=\\v";
-    EXPECT_EQ(accesses, written) << row.name;
+    utils.SaveCfgFileData(u"S", u"k", output, selector, Boolean(false));
+    for (const char group : written) expected.push_back(groups[group] + u"=\\v");
+    EXPECT_EQ(accesses, expected);
     EXPECT_EQ(output, u"\\v");
-  }
+  });
   platform.settings_store.fails = true;
   EXPECT_EQ(error_of([&] { (void)utils.GetCfgFileData(u"S", u"k", u"d", u"x", Boolean(false)); }), 57);
 }

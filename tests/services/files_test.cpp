@@ -1,11 +1,11 @@
 #include <gtest/gtest.h>
 
-#include "tests/text/recording_utils.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil::testing {
 namespace {
 
-class FileMembers : public TextMembersTest {
+class FileMembers : public UtilsTest {
  protected:
   bool file_exists(const Text& path) { return bool(utils.FileExists(path)); }
   bool path_exists(const Text& path) { return bool(utils.PathExists(path)); }
@@ -17,11 +17,7 @@ TEST_F(FileMembers, FileExistsAndPathExists) {
   platform.files.put(u"C:\\Data\\hidden.txt", "", file_attribute::hidden);
   platform.files.put(u"C:\\Data\\system.txt", "", file_attribute::system);
   platform.files.put(u"C:\\Data\\sub\\b.txt", "");
-  const struct {
-    const char* name;
-    Text path;
-    bool is_file, is_folder;
-  } rows[] = {
+  const Rows<Text, bool, bool> rows = {
       {"empty", u"", false, false},
       {"file", u"c:\\data\\A.TXT", true, false},
       {"quoted file", u"\"C:\\Data\\a.txt\"", true, false},
@@ -36,10 +32,10 @@ TEST_F(FileMembers, FileExistsAndPathExists) {
       {"folder with its separator, which names its files too", u"C:\\Data\\sub\\", true, true},
       {"missing", u"C:\\Data\\c.txt", false, false},
   };
-  for (const auto& row : rows) {
-    EXPECT_EQ(file_exists(row.path), row.is_file) << row.name;
-    EXPECT_EQ(path_exists(row.path), row.is_folder) << row.name;
-  }
+  check_rows(rows, [&](const Text& path, bool is_file, bool is_folder) {
+    EXPECT_EQ(file_exists(path), is_file);
+    EXPECT_EQ(path_exists(path), is_folder);
+  });
   platform.files.failures[u"attributes"] = ErrorNumber::device_io_error;
   EXPECT_FALSE(path_exists(u"C:\\Data\\sub"));
   platform.files.failures[u"search"] = ErrorNumber::bad_file_name_or_number;
@@ -48,12 +44,8 @@ TEST_F(FileMembers, FileExistsAndPathExists) {
 }
 
 TEST_F(FileMembers, PathsInParts) {
-  const struct {
-    const char* name;
-    Text path, file, stem, folder, rewritten;
-  } rows[] = {
-      {"folder and extensions", u"C:\\dir\\file.tar.gz", u"file.tar.gz", u"file", u"C:\\dir\\",
-       u"C:\\dir\\file.tar.gz"},
+  const Rows<Text, Text, Text, Text, Text> rows = {
+      {"folder and extensions", u"C:\\d\\f.tar.gz", u"f.tar.gz", u"f", u"C:\\d\\", u"C:\\d\\f.tar.gz"},
       {"quotes are written back", u"\"C:\\a b\\x.y\"", u"x.y", u"x", u"C:\\a b\\", u"C:\\a b\\x.y"},
       {"folder only", u"C:\\dir\\", u"", u"", u"C:\\dir\\", u"C:\\dir\\"},
       {"drive and file", u"C:file.txt", u"file.txt", u"file", u"C:\\HOST\\", u"C:file.txt"},
@@ -64,15 +56,15 @@ TEST_F(FileMembers, PathsInParts) {
       {"leading dot", u"\\.x", u".x", u"", u"\\", u"\\.x"},
       {"empty", u"", u"", u"", u"", u""},
   };
-  for (const auto& row : rows) {
-    Text path = row.path;
-    EXPECT_EQ(utils.ExtractFilename(path, Boolean(true)), row.file) << row.name;
-    EXPECT_EQ(path, row.rewritten) << row.name;
-    EXPECT_EQ(utils.ExtractFilename(path, Boolean(false)), row.stem) << row.name;
-    path = row.path;
-    EXPECT_EQ(utils.ExtractPathName(path), row.folder) << row.name;
-    EXPECT_EQ(path, row.rewritten) << row.name;
-  }
+  check_rows(rows, [&](const Text& given, const Text& file, const Text& stem, const Text& folder, const Text& after) {
+    Text path = given;
+    EXPECT_EQ(utils.ExtractFilename(path, Boolean(true)), file);
+    EXPECT_EQ(path, after);
+    EXPECT_EQ(utils.ExtractFilename(path, Boolean(false)), stem);
+    path = given;
+    EXPECT_EQ(utils.ExtractPathName(path), folder);
+    EXPECT_EQ(path, after);
+  });
   Text name = u"C:file";
   platform.files.failures[u"current_folder"] = ErrorNumber::device_io_error;
   EXPECT_EQ(utils.ExtractPathName(name), u"\\");
@@ -82,25 +74,20 @@ TEST_F(FileMembers, GetFileListAndCount) {
   platform.files.put(u"C:\\D\\A.TXT", "");
   platform.files.put(u"C:\\D\\B.HTM", "");
   platform.files.put(u"C:\\D\\EMPTY\\SUB\\X", "");
-  const struct {
-    const char* name;
-    Text delimiter, path, files, expected;
-    std::int32_t count, error = 0;
-  } rows[] = {
-      {"one character", u",", u"C:\\D\\", u"", u"A.TXT,B.HTM", 2},
-      {"longer delimiter stays", u", ", u"C:\\D\\", u"", u"A.TXT, B.HTM, ", 2},
-      {"pattern", u",", u"C:\\D\\", u"*.htm", u"B.HTM", 1},
-      {"no delimiter", u"", u"C:\\D\\", u"", u"A.TXTB.HTM", 2},
-      {"empty folder", u",", u"C:\\D\\EMPTY\\", u"", u"", 0},
-      {"empty folder, no delimiter", u"", u"C:\\D\\EMPTY\\", u"", u"", 0, 5},
-      {"a path without a separator", u",", u"C:\\D", u"", u"", 0},
+  const Rows<Text, Text, Text, std::string, std::int32_t> rows = {
+      {"one character", u",", u"C:\\D\\", u"", "A.TXT,B.HTM", 2},
+      {"longer delimiter stays", u", ", u"C:\\D\\", u"", "A.TXT, B.HTM, ", 2},
+      {"pattern", u",", u"C:\\D\\", u"*.htm", "B.HTM", 1},
+      {"no delimiter", u"", u"C:\\D\\", u"", "A.TXTB.HTM", 2},
+      {"empty folder", u",", u"C:\\D\\EMPTY\\", u"", "", 0},
+      {"empty folder, no delimiter", u"", u"C:\\D\\EMPTY\\", u"", "error 5", 0},
+      {"a path without a separator", u",", u"C:\\D", u"", "", 0},
   };
-  for (const auto& row : rows) {
-    Text list;
-    EXPECT_EQ(error_of([&] { list = utils.GetFileList(row.delimiter, row.path, row.files); }), row.error) << row.name;
-    EXPECT_EQ(list, row.expected) << row.name;
-    EXPECT_EQ(utils.GetFileCount(row.path, row.files), row.count) << row.name;
-  }
+  check_rows(rows,
+             [&](const Text& delimiter, const Text& path, const Text& pattern, const std::string& list, int count) {
+               EXPECT_EQ(outcome([&] { return utils.GetFileList(delimiter, path, pattern); }), list);
+               EXPECT_EQ(utils.GetFileCount(path, pattern), count);
+             });
   platform.files.failures[u"search"] = ErrorNumber::bad_file_name_or_number;
   EXPECT_EQ(error_of([&] { (void)utils.GetFileCount(u"|", u""); }), 52);
   EXPECT_EQ(error_of([&] { (void)utils.GetFileList(u",", u"|", u""); }), 52);
@@ -138,17 +125,12 @@ TEST_F(FileMembers, SetupFileFoldersWithGoodSettings) {
   settings.sTemplatesDir = u"C:\\T\\";
   settings.sHelpDir = u"C:\\H\\";
   utils.SetupFileFolders();
-  const std::vector<Text> expected = {u"make_path C:\\P\\",
-                                      u"make_path C:\\D\\",
-                                      u"make_path C:\\R\\",
-                                      u"make_path C:\\R\\JobSheets\\",
-                                      u"make_path C:\\R\\SummaryJobSheets\\",
-                                      u"make_path C:\\R\\SummaryJobSheets\\Processed\\",
-                                      u"make_path C:\\T\\",
-                                      u"make_path C:\\H\\",
-                                      u"make_path C:\\TAL\\ORV3\\BinTemp\\",
-                                      u"make_path C:\\TAL\\ORV3\\Data\\Backups\\",
-                                      u"make_path C:\\T\\Letters\\"};
+  std::vector<Text> expected;
+  for (const TextView folder :
+       {u"P\\", u"D\\", u"R\\", u"R\\JobSheets\\", u"R\\SummaryJobSheets\\", u"R\\SummaryJobSheets\\Processed\\",
+        u"T\\", u"H\\", u"TAL\\ORV3\\BinTemp\\", u"TAL\\ORV3\\Data\\Backups\\", u"T\\Letters\\"}) {
+    expected.push_back(u"make_path C:\\" + Text(folder));
+  }
   EXPECT_EQ(calls(), expected);
 }
 

@@ -1,14 +1,11 @@
 #include <gtest/gtest.h>
 
-#include "automation/variant.hpp"
 #include "tests/fakes/utils_test.hpp"
 
-namespace talutil {
+namespace talutil::testing {
 namespace {
 
-using testing::FakeRegistry;
-
-struct RegistryTest : testing::UtilsTest {};
+using RegistryTest = UtilsTest;
 
 TEST_F(RegistryTest, ReadsTextsAndNumbersOfTheUser) {
   platform.registry.keys[u"Key"] = {
@@ -44,8 +41,8 @@ TEST_F(RegistryTest, WritesValuesOfKeysThatExist) {
   utils.REGISTRY_SetKeyValue(u"Key", u"number", u"-2", 4);
   utils.REGISTRY_SetKeyValue(u"Key", u"other", u"abc", 2);
   utils.REGISTRY_SetKeyValue(u"Missing", u"text", u"abc", 1);
-  EXPECT_EQ(testing::error_of([&] { utils.REGISTRY_SetKeyValue(u"Key", u"null", Null{}, 1); }), 94);
-  EXPECT_EQ(testing::error_of([&] { utils.REGISTRY_SetKeyValue(u"Key", u"word", u"abc", 4); }), 13);
+  EXPECT_EQ(error_of([&] { utils.REGISTRY_SetKeyValue(u"Key", u"null", Null{}, 1); }), 94);
+  EXPECT_EQ(error_of([&] { utils.REGISTRY_SetKeyValue(u"Key", u"word", u"abc", 4); }), 13);
   const auto& values = platform.registry.keys[u"Key"];
   EXPECT_EQ(values.size(), 3U);
   EXPECT_EQ(values.at(u"text").data, std::string("abc\0", 4));
@@ -64,13 +61,10 @@ TEST_F(RegistryTest, CreatesKeysBelowAnyRoot) {
 TEST_F(RegistryTest, AddressesFitOrAreNone) {
   for (const int count : {0, 1, 21, 22}) {
     platform.network.addresses.assign(static_cast<std::size_t>(count), {192, 168, 1, 20});
-    const Variant result = utils.GetIpAddrTable();
-    const auto* const addresses = result.get_if<TextArray>();
-    ASSERT_NE(addresses, nullptr);
-    EXPECT_TRUE(addresses->allocated);
-    EXPECT_EQ(addresses->items, std::vector<Text>(count == 22 ? 0 : static_cast<std::size_t>(count), u"192.168.1.20"));
+    const std::vector<Text> expected(count == 22 ? 0 : static_cast<std::size_t>(count), u"192.168.1.20");
+    EXPECT_EQ(utils.GetIpAddrTable(), Variant(array_of(expected))) << count;
   }
 }
 
 }  // namespace
-}  // namespace talutil
+}  // namespace talutil::testing

@@ -2,11 +2,10 @@
 
 #include "automation/control.hpp"
 #include "controls/zip_controls.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
 #include "services/mod_zip_files.hpp"
 #include "tests/archives/tree.hpp"
-#include "tests/fakes/fake_platform.hpp"
+#include "tests/fakes/recording_control.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil {
 namespace {
@@ -14,89 +13,70 @@ namespace {
 using archives::testing::read_tree;
 using archives::testing::Tree;
 using archives::testing::write_file;
-using testing::FakePlatform;
+using testing::RecordingControl;
 
-/// Another maker's control in the place of ours: writes down what it is told, and answers the results it was given.
-struct RecordingArchiveControl final : Object {
-  std::vector<std::string> uses;
-  std::vector<std::int16_t> results;
+struct ZipFilesTest : testing::UtilsTest {
+  ZipFilesTest()
+      : UtilsTest([](auto& fake) {
+          fake.use(&testing::FakePlatform::used_files, testing::real_files());
+          fake.use(&testing::FakePlatform::used_folders, testing::real_folders());
+        }) {}
 
-  std::int32_t member_id(TextView /*name*/) override { raise(ErrorNumber::member_not_supported); }
-
-  Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
-    if (access == Access::put) {
-      const Variant& value = arguments.front();
-      const std::string mark = value.is(Variant::Kind::text) ? "\"" : value.is(Variant::Kind::int16) ? "%" : "";
-      uses.push_back(std::to_string(member) + "=" + (mark == "%" ? "" : mark) + to_utf8(value.to_text(plain_numbers)) +
-                     mark);
-      return {};
-    }
-    uses.push_back("get " + std::to_string(member));
-    const std::int16_t result = results.empty() ? std::int16_t{0} : results.front();
-    if (!results.empty()) results.erase(results.begin());
-    return result;
-  }
-
-  [[nodiscard]] std::string told() const {
-    std::string all;
-    for (const std::string& use : uses) all += (all.empty() ? "" : " ") + use;
-    return all;
-  }
-};
-
-/// Fake but for its files.
-struct PlatformWithFiles : FakePlatform {
-  std::unique_ptr<Files> own_files = testing::real_files();
-  std::unique_ptr<Folders> own_folders = testing::real_folders();
-  PlatformWithFiles() {
-    real_files = own_files.get();
-    real_folders = own_folders.get();
-  }
-};
-
-class ZipFilesTest : public ::testing::Test {
- protected:
-  std::shared_ptr<RecordingArchiveControl> replace(const Text& class_name) {
-    auto control = std::make_shared<RecordingArchiveControl>();
+  /// A third-party control in the place of ours, whose result is 0.
+  std::shared_ptr<RecordingControl> replace(const Text& class_name, const char* result) {
+    auto control = std::make_shared<RecordingControl>();
+    control->values[result] = std::int16_t{0};
     platform.controls[class_name] = control;
     return control;
   }
 
-  void zip(const Text& archive, const Text& items, std::int16_t multi_volume = 0, const Text& password = {}) {
-    ORVUtils(library).CallZIPFiles(archive, items, multi_volume, password, Boolean(false));
-  }
-  void unzip(const Text& archive, const Text& target, const Text& items = {}, bool overwrite = false) {
-    ORVUtils(library).CallUnZIPFiles(archive, target, items, Boolean(overwrite));
+  /// What a control was asked for since the last time: "40=0" for what was put, "24" for what was read.
+  static std::string told(RecordingControl& control) {
+    std::string all;
+    for (std::string use : control.uses) {
+      for (const std::string_view mark : {"put ", "#", "&"}) {
+        if (const std::size_t at = use.find(mark); at != std::string::npos) use.erase(at, mark.size());
+      }
+      if (const std::size_t at = use.find(" = "); at != std::string::npos) use.replace(at, 3, "=");
+      all += use + ' ';
+    }
+    control.uses.clear();
+    return all;
   }
 
-  PlatformWithFiles platform;
-  Library library{platform.platform()};
+  void zip(const Text& archive, const Text& items, std::int16_t multi_volume = 0, const Text& password = {}) {
+    utils.CallZIPFiles(archive, items, multi_volume, password, Boolean(false));
+  }
+  void unzip(const Text& archive, const Text& target, const Text& items = {}, bool overwrite = false) {
+    utils.CallUnZIPFiles(archive, target, items, Boolean(overwrite));
+  }
+
   Text folder = testing::scratch_folder();
 };
 
 TEST_F(ZipFilesTest, TellsTheControlsInTheirOrder) {
-  const auto zip_control = replace(u"DZACTXLibCtl.dzactxctrl");
-  const auto unzip_control = replace(u"DUZACTXLibCtl.duzactxctrl");
+  const auto zip_control = replace(u"DZACTXLibCtl.dzactxctrl", "#39");
+  const auto unzip_control = replace(u"DUZACTXLibCtl.duzactxctrl", "#24");
   zip(u"a.zip", u"*.*", 1, u"key");
-  EXPECT_EQ(zip_control->told(),
+  EXPECT_EQ(told(*zip_control),
             "40=0 34=False 3=False 18=False 15=False 33=False 30=False 6=False 26=False 12=False 13=False 16=False "
             "24=False 29=False 14=False 36=False 28=False 17=False 23=False 10=False 9=False 7=False 4=True 19=False "
             "21=False 20=\"\" 22=\"\" 27=\"\" 25=\"\" 2=\"\" 31=\"\" 11=\"\" 1=\"\" 42=\"\" 37=0 8=0 5=6 38=100000000 "
-            "32=0 44=0 35=\"key\" 34=True 37=1 1=\"a.zip\" 2=\"*.*\" 40=4 get 39 get 39");
-  zip_control->uses.clear();
+            "32=0 44=0 35=\"key\" 34=True 37=1 1=\"a.zip\" 2=\"*.*\" 40=4 39 39 ");
   zip(u"a.zip", u"*.*", 2);
-  EXPECT_EQ(zip_control->told().find(" 37=1"), std::string::npos) << "only 1 asks for volumes";
+  EXPECT_EQ(told(*zip_control).find(" 37=1"), std::string::npos) << "only 1 asks for volumes";
 
   unzip(u"a.zip", u"C:\\out", u"*.txt", true);
   const std::string reset =
       "34=0 5=False 19=False 20=False 18=False 8=False 22=False 10=False 11=False 12=False 9=False 6=True 7=True "
       "15=True 13=True 14=True 21=\"\" 4=\"\" 2=\"\" 17=\"\" 31=\"\" 32=\"\" 1=\"\" 24=0 16=0 23=0 33=0 30=0 27=0 25=0 "
-      "26=0 43=0 28=0% 3=200 29=0 35=\"\" 37=0 42=0 1=\"a.zip\" 34=1 get 24 ";
-  EXPECT_EQ(unzip_control->told(), reset + "1=\"a.zip\" 4=\"C:\\out\" 2=\"*.txt\" 10=True 34=8 get 24 get 24");
-  unzip_control->uses.clear();
-  unzip_control->results = {13, 13, 13};
+      "26=0 43=0 28=0% 3=200 29=0 35=\"\" 37=0 42=0 1=\"a.zip\" 34=1 24 ";
+  EXPECT_EQ(told(*unzip_control), reset + "1=\"a.zip\" 4=\"C:\\out\" 2=\"*.txt\" 10=True 34=8 24 24 ");
+  unzip_control->before = [&](const std::string& use) {
+    if (use == "#24") unzip_control->values[use] = std::int16_t{13};
+  };
   unzip(u"a.zip", u"C:\\out");
-  EXPECT_EQ(unzip_control->told(), reset + "get 24 get 24") << "what cannot be read is not extracted";
+  EXPECT_EQ(told(*unzip_control), reset + "24 24 ") << "what cannot be read is not extracted";
   ASSERT_EQ(platform.messages.size(), 1U);
   EXPECT_TRUE(platform.messages[0].text.starts_with(u"ORV Zipping Error: ZE_NAME  Missing"));
 }
@@ -111,9 +91,7 @@ TEST_F(ZipFilesTest, CodesAreExplained) {
       {1, "ZE_BUSY  Busy, can 't enter now - You tried"},
       {12, "ZE_NONE      Nothing to do - The ItemList that you specified doesn't match any files to be zipped.  If"},
       {21, "ZE_MVUSAGE   Improper use"},
-      {22,
-       "  If this error occurred during a backup operation, your data is safe.  The data is copied to a "
-       "temporary folder before a zip operation is attempted."}};
+      {22, "  If this error occurred during a backup operation, your data is safe.  The data is copied"}};
   for (const auto& row : rows) {
     platform.messages.clear();
     ModZipFiles::show_result(row.code, platform);
@@ -166,11 +144,7 @@ TEST_F(ZipFilesTest, ControlsTellOfTheirProgress) {
   control.put(u"ZIPFile", folder + u"a.zip");
   control.put(u"ItemList", folder + u"a.txt");
   control.put(u"OnProgress", ObjectRef(handler));
-  const struct {
-    const char* name;
-    std::function<Variant()> work;
-    std::int16_t result;
-  } rows[] = {
+  const testing::Rows<std::function<Variant()>, std::int16_t> rows = {
       {"nothing answered", [] { return Variant(); }, 0},
       {"cancelled", [] { return Variant(Boolean(true)); }, 9},
       {"an error of the handler", []() -> Variant { raise(ErrorNumber::overflow); }, 9},
@@ -182,13 +156,13 @@ TEST_F(ZipFilesTest, ControlsTellOfTheirProgress) {
        },
        0},
   };
-  for (const auto& row : rows) {
-    handler->work = row.work;
+  testing::check_rows(rows, [&](const std::function<Variant()>& work, std::int16_t result) {
+    handler->work = work;
     handler->calls = 0;
     control.put(u"Action", 4);
-    EXPECT_EQ(control.get<std::int16_t>(u"ErrorCode"), row.result) << row.name;
-    EXPECT_GT(handler->calls, 0) << row.name;
-  }
+    EXPECT_EQ(control.get<std::int16_t>(u"ErrorCode"), result);
+    EXPECT_GT(handler->calls, 0);
+  });
   EXPECT_GT(platform.messages_handled, 0);
   control.put(u"Action", 5);
   EXPECT_EQ(control.get<std::int16_t>(ZipControl::result), 16);

@@ -3,12 +3,12 @@
 #include <cmath>
 #include <map>
 
-#include "tests/text/recording_utils.hpp"
+#include "tests/fakes/utils_test.hpp"
 
 namespace talutil::testing {
 namespace {
 
-using Passwords = TextMembersTest;
+using Passwords = UtilsTest;
 
 // How often each character follows each other one, against the odds: both ends of a mix have half the weight of the
 // rest, and the one before is left out. A row of k characters has k - 2 degrees of freedom.

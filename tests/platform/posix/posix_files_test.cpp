@@ -10,23 +10,13 @@
 #include <fstream>
 
 #include "tests/fakes/error_of.hpp"
-#include "tests/platform/real_files.hpp"
+#include "tests/fakes/rows.hpp"
+#include "tests/platform/real_platform.hpp"
 
 namespace talutil::testing {
 namespace {
 
-class PosixFilesTest : public ::testing::Test {
- protected:
-  static std::string bytes_of(const std::string& path) {
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), {}};
-  }
-  void write(const Text& path, std::string_view bytes) {
-    const auto file = files.open_output(path);
-    file->write(bytes);
-    file->close();
-  }
-
+struct PosixFilesTest : ::testing::Test {
   std::unique_ptr<Files> drives = real_files();
   posix::PosixFiles files;
   Text folder = scratch_folder();
@@ -37,11 +27,7 @@ TEST_F(PosixFilesTest, WhereWindowsPathsLie) {
   std::ofstream(native + "/Readme.TXT") << "x";
   std::filesystem::create_directory(native + "/Sub");
   const Text native_text = from_utf8(native);
-  const struct {
-    const char* name;
-    Text path;
-    std::string below;
-  } rows[] = {
+  const Rows<Text, std::string> rows = {
       {"case of folder and file", folder + u"SUB\\..\\README.txt", "/Readme.TXT"},
       {"slashes, doubled ones", folder + u"sub//\\new.txt", "/Sub/new.txt"},
       {"trailing dots and blanks", folder + u"sub. \\new. .", "/Sub/new"},
@@ -49,7 +35,7 @@ TEST_F(PosixFilesTest, WhereWindowsPathsLie) {
       {"native path in another case", native_text + u"/readme.txt", "/Readme.TXT"},
       {"drive of everything", u"z:" + native_text + u"\\sub", "/Sub"},
   };
-  for (const auto& row : rows) EXPECT_EQ(files.native(row.path), native + row.below) << row.name;
+  check_rows(rows, [&](const Text& path, const std::string& below) { EXPECT_EQ(files.native(path), native + below); });
   EXPECT_EQ(files.native(u"T:\\..\\..\\etc"), native.substr(0, native.find_last_of('/')) + "/etc");
   EXPECT_EQ(error_of([&] { (void)files.native(u"\\\\server\\share\\a"); }), 76);
 }
@@ -66,27 +52,27 @@ TEST_F(PosixFilesTest, TheCurrentFolderOnADrive) {
 }
 
 TEST_F(PosixFilesTest, LinksAndDevices) {
-  write(folder + u"real.txt", "old");
+  write_bytes(folder + u"real.txt", "old");
   std::filesystem::create_symlink("real.txt", native + "/link.txt");
   std::filesystem::create_symlink("loop", native + "/loop");
   mkfifo((native + "/pipe").c_str(), 0600);
-  write(folder + u"link.txt", "new");
+  write_bytes(folder + u"link.txt", "new");
   EXPECT_TRUE(std::filesystem::is_symlink(native + "/link.txt"));
-  EXPECT_EQ(bytes_of(native + "/real.txt"), "new");
+  EXPECT_EQ(read_bytes(folder + u"real.txt"), "new");
   EXPECT_EQ(error_of([&] { (void)files.open_input(folder + u"loop"); }), 75);
   EXPECT_EQ(error_of([&] { (void)files.open_input(folder + u"pipe"); }), 52);
-  EXPECT_EQ(error_of([&] { write(u"/dev/null", "x"); }), 52);
-  EXPECT_EQ(error_of([&] { write(folder + u"loop\\a", "x"); }), 75);
+  EXPECT_EQ(error_of([&] { write_bytes(u"/dev/null", "x"); }), 52);
+  EXPECT_EQ(error_of([&] { write_bytes(folder + u"loop\\a", "x"); }), 75);
   std::vector<Text> names;
   files.search(folder + u"*.*", 0, [&](TextView name) { return names.emplace_back(name), true; });
   EXPECT_EQ(names.size(), 2U);
   // A link is deleted, not what it leads to.
   files.delete_files(folder + u"link.*");
-  EXPECT_EQ(bytes_of(native + "/real.txt"), "new");
+  EXPECT_EQ(read_bytes(folder + u"real.txt"), "new");
 }
 
 TEST_F(PosixFilesTest, StoredAttributes) {
-  write(folder + u"a.txt", "");
+  write_bytes(folder + u"a.txt", "");
   if (setxattr((native + "/a.txt").c_str(), "user.DOSATTRIB", "0x6", 3, 0) != 0) {
     GTEST_SKIP() << "the temporary folder's file system stores no attributes";
   }
@@ -95,16 +81,16 @@ TEST_F(PosixFilesTest, StoredAttributes) {
 
 TEST_F(PosixFilesTest, AFullDiskLeavesTheOldFile) {
   if (mount("none", native.c_str(), "tmpfs", 0, "size=64k") != 0) GTEST_SKIP() << "mounting is not allowed here";
-  write(folder + u"a.txt", "old");
-  EXPECT_EQ(error_of([&] { write(folder + u"a.txt", std::string(100000, 'x')); }), 61);
-  EXPECT_EQ(bytes_of(native + "/a.txt"), "old");
+  write_bytes(folder + u"a.txt", "old");
+  EXPECT_EQ(error_of([&] { write_bytes(folder + u"a.txt", std::string(100000, 'x')); }), 61);
+  EXPECT_EQ(read_bytes(folder + u"a.txt"), "old");
   EXPECT_EQ(error_of([&] { files.append(folder + u"a.txt", std::string(100000, 'x')); }), 61);
-  EXPECT_EQ(bytes_of(native + "/a.txt"), "old");
+  EXPECT_EQ(read_bytes(folder + u"a.txt"), "old");
   umount(native.c_str());
 }
 
 TEST_F(PosixFilesTest, ProgressIsTold) {
-  write(folder + u"a.txt", "abc");
+  write_bytes(folder + u"a.txt", "abc");
   std::vector<std::uint64_t> told;
   files.set_progress([&](std::uint64_t done, std::uint64_t total) { told.insert(told.end(), {done, total}); });
   std::array<char, 2> buffer{};

@@ -5,14 +5,10 @@
 #include "automation/date.hpp"
 #include "tests/platform/win32/oracle.hpp"
 
-namespace talutil {
+namespace talutil::testing {
 namespace {
 
-// A hundred thousand in all.
-constexpr int text_count = 40'000;
-constexpr int parts_count = 20'000;
-constexpr int serial_count = 10'000;
-constexpr int pattern_count = 30'000;
+constexpr int generated_count = 25'000;
 
 /// Any second there is, from the first day asked for on.
 double any_days(Generator& generator, std::int32_t first_day = -657434) {
@@ -23,7 +19,7 @@ double any_days(Generator& generator, std::int32_t first_day = -657434) {
 
 TEST(PlatformDates, Parts) {
   Generator generator;
-  for (int i = 0; i < parts_count; ++i) {
+  for (int i = 0; i < generated_count; ++i) {
     const double days = any_days(generator);
     UDATE expected{};
     ASSERT_EQ(VarUdateFromDate(days, 0, &expected), S_OK) << days;
@@ -40,7 +36,7 @@ TEST(PlatformDates, Parts) {
 
 TEST(PlatformDates, SerialParts) {
   Generator generator;
-  for (int i = 0; i < serial_count; ++i) {
+  for (int i = 0; i < generated_count; ++i) {
     const auto part = [&](std::int32_t first, std::int32_t last) {
       return static_cast<std::int16_t>(generator.whole(first, last));
     };
@@ -61,7 +57,7 @@ TEST(PlatformDates, Patterns) {
                                    u"DDMMYYYYHHMMSS", u"DD_MM_YYYY",       u"d.m.yy h:n:s", u"nn m hh mm mm"};
   constexpr std::int32_t year_1000 = -328716;
   Generator generator;
-  for (int i = 0; i < pattern_count; ++i) {
+  for (int i = 0; i < generated_count; ++i) {
     const double days = any_days(generator, year_1000);
     Text pattern(generator.one_of(patterns));
     VARIANT value{};
@@ -125,13 +121,13 @@ Text date_like_text(Generator& generator) {
 TEST(PlatformDates, TextToDate) {
   Generator generator;
   int accepted = 0;
-  for (int i = 0; i < text_count; ++i) {
+  for (int i = 0; i < generated_count; ++i) {
     const Text text = date_like_text(generator);
     const std::string ours = outcome([&] { return text_to_date(text, year_of_clock()); });
     if (ours != "none") ++accepted;
     EXPECT_EQ(ours, platform_date(text)) << to_utf8(text);
   }
-  EXPECT_GT(accepted, text_count / 5);
+  EXPECT_GT(accepted, generated_count / 5);
 }
 
 TEST(PlatformDates, DeliberateDifferences) {
@@ -169,4 +165,4 @@ TEST(PlatformDates, DeliberateDifferences) {
 }
 
 }  // namespace
-}  // namespace talutil
+}  // namespace talutil::testing

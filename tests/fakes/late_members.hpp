@@ -1,7 +1,5 @@
 #pragma once
 
-#include <gtest/gtest.h>
-
 #include <string>
 #include <vector>
 
@@ -11,9 +9,14 @@
 
 namespace talutil::testing {
 
-/// Calls members as a table row writes them: arguments parted by "|", where "@null" and "@empty" are those
-/// values, "#5/3/2009#" a date, "=1.5" a number and everything else a text. The answer shows the result the same
-/// way, then each argument that was written back.
+/// A call as a table writes it: a member, its arguments parted by "|", where "@null", "@empty" and "@error" are those
+/// values, "#5/3/2009#" a date, "=1.5" a number and everything else a text, and the answer, which is the result in the
+/// same form and then each argument that was written back.
+struct LateRow {
+  TextView member, arguments;
+  std::string_view answer;
+};
+
 class LateMembers : public UtilsTest {
  protected:
   std::string call(TextView member, TextView written) {
@@ -23,11 +26,9 @@ class LateMembers : public UtilsTest {
       arguments.emplace_back(read(written.substr(start, end - start)));
       start = end + 1;
     }
-    const LateInterface& members = late_interface<ORVUtils>();
-    const std::int32_t slot = members.slot_of(members.identifier_of(member), Access::call);
     std::string answer;
     try {
-      answer = shown(members.call(&utils, slot, arguments, utils.locale()));
+      answer = shown(call(member, Access::call, arguments));
     } catch (const RunTimeError& error) {
       answer = "error " + std::to_string(error.number());
     }
@@ -37,6 +38,17 @@ class LateMembers : public UtilsTest {
     return answer;
   }
 
+  Variant call(TextView member, Access access, std::span<Argument> arguments) {
+    const LateInterface& members = late_interface<ORVUtils>();
+    const std::int32_t slot = members.slot_of(members.identifier_of(member), access);
+    return members.call(static_cast<ORVUtils*>(&utils), slot, arguments, utils.locale());
+  }
+
+  void check(std::span<const LateRow> rows) {
+    for (const auto& [member, arguments, answer] : rows) {
+      EXPECT_EQ(call(member, arguments), answer) << to_utf8(member) << '(' << to_utf8(arguments) << ')';
+    }
+  }
 
  private:
   static Variant read(TextView written) {

@@ -1,12 +1,16 @@
-#include "tests/platform/real_files.hpp"
+#include "tests/platform/real_platform.hpp"
 
 #include <gtest/gtest.h>
 
 #include <array>
 
 #include "platform/win32/handle.hpp"
+#include "platform/win32/win32_code_page.hpp"
 #include "platform/win32/win32_files.hpp"
 #include "platform/win32/win32_folders.hpp"
+#include "platform/win32/win32_registry.hpp"
+#include "platform/win32/win32_settings.hpp"
+#include "platform/win32/win32_time_conversions.hpp"
 
 namespace talutil::testing {
 
@@ -18,6 +22,25 @@ std::unique_ptr<Files> real_files() {
 }
 
 std::unique_ptr<Folders> real_folders() { return std::make_unique<win32::Win32Folders>(); }
+std::unique_ptr<CodePage> real_code_page(std::uint32_t page) { return std::make_unique<win32::Win32CodePage>(page); }
+std::shared_ptr<Profiles> real_profiles() { return std::make_unique<win32::Win32Profiles>(); }
+std::shared_ptr<SettingsStore> real_settings_store() { return std::make_unique<win32::Win32SettingsStore>(); }
+std::unique_ptr<TimeConversions> real_time_conversions() { return std::make_unique<win32::Win32TimeConversions>(); }
+
+std::shared_ptr<Registry> real_registry() {
+  RegDeleteKeyW(HKEY_CURRENT_USER, L"Software\\TALUtil\\Test\\Below");
+  RegDeleteKeyW(HKEY_CURRENT_USER, L"Software\\TALUtil\\Test");
+  return std::make_unique<win32::Win32Registry>();
+}
+
+void for_each_zone(const std::function<void(std::int64_t seconds)>& use) {
+  TIME_ZONE_INFORMATION zone{};
+  const DWORD season = GetTimeZoneInformation(&zone);
+  LONG bias = zone.Bias;
+  if (season == TIME_ZONE_ID_STANDARD) bias += zone.StandardBias;
+  if (season == TIME_ZONE_ID_DAYLIGHT) bias += zone.DaylightBias;
+  use(std::int64_t{-60} * bias);
+}
 
 Text scratch_folder() {
   static int count = 0;

@@ -1,0 +1,117 @@
+#include "tests/platform/real_platform.hpp"
+
+#include <fcntl.h>
+#include <stdlib.h>
+#include <sys/file.h>
+#include <sys/stat.h>
+#include <time.h>
+
+#include <filesystem>
+
+#include "platform/posix/descriptor.hpp"
+#include "platform/posix/posix_code_page.hpp"
+#include "platform/posix/posix_files.hpp"
+#include "platform/posix/posix_folders.hpp"
+#include "platform/posix/posix_registry.hpp"
+#include "platform/posix/posix_settings.hpp"
+#include "platform/posix/posix_time_conversions.hpp"
+
+namespace talutil::testing {
+
+namespace {
+
+/// Drive T: is a temporary folder, removed when the program ends.
+struct TemporaryDrives {
+  std::string root = [] {
+    std::string pattern = (std::filesystem::temp_directory_path() / "talutil-drives-XXXXXX").string();
+    return std::string(mkdtemp(pattern.data()));
+  }();
+  TemporaryDrives() {
+    std::filesystem::create_directory(root + "/t");
+    setenv("TALUTIL_DRIVES", root.c_str(), 1);
+  }
+  TemporaryDrives(const TemporaryDrives&) = delete;
+  TemporaryDrives& operator=(const TemporaryDrives&) = delete;
+  ~TemporaryDrives() { std::filesystem::remove_all(root); }
+};
+
+std::string native(const Text& path) { return posix::DrivePaths().native(path); }
+
+/// A part with what it lies in, of its own.
+template <class Part, class Base, class... Arguments>
+std::shared_ptr<Part> make_within(const Arguments&... arguments) {
+  struct Both {
+    explicit Both(const Arguments&... given) : base(given...) {}
+    Base base;
+    Part part{base};
+  };
+  const auto both = std::make_shared<Both>(arguments...);
+  return {both, &both->part};
+}
+
+std::string own_hive() { return native(scratch_folder() + u"hive.db"); }
+
+}  // namespace
+
+std::unique_ptr<Files> real_files() {
+  static const TemporaryDrives drives;
+  return std::make_unique<posix::PosixFiles>();
+}
+
+std::unique_ptr<Folders> real_folders() {
+  static_cast<void>(real_files());  // Makes the drives.
+  return std::make_unique<posix::PosixFolders>();
+}
+
+std::unique_ptr<CodePage> real_code_page(std::uint32_t number) { return posix::make_code_page(number); }
+std::shared_ptr<Profiles> real_profiles() { return make_within<posix::PosixProfiles, posix::PosixFiles>(); }
+std::shared_ptr<Registry> real_registry() { return make_within<posix::PosixRegistry, posix::Hive>(own_hive()); }
+std::shared_ptr<SettingsStore> real_settings_store() {
+  return make_within<posix::PosixSettingsStore, posix::Hive>(own_hive());
+}
+std::unique_ptr<TimeConversions> real_time_conversions() { return std::make_unique<posix::PosixTimeConversions>(); }
+
+void for_each_zone(const std::function<void(std::int64_t seconds)>& use) {
+  const char* const variable = getenv("TZ");
+  const std::string before = variable == nullptr ? "" : variable;
+  const struct {
+    const char* name;
+    std::int64_t standard_minutes, summer_minutes;
+  } zones[] = {{"Australia/Brisbane", 600, 600},
+               {"Australia/Sydney", 600, 660},
+               {"Europe/London", 0, 60},
+               {"America/St_Johns", -210, -150},
+               {"Pacific/Chatham", 765, 825}};
+  for (const auto& zone : zones) {
+    setenv("TZ", zone.name, 1);
+    tzset();
+    const time_t now = time(nullptr);
+    struct tm local {};
+    localtime_r(&now, &local);
+    use(60 * (local.tm_isdst > 0 ? zone.summer_minutes : zone.standard_minutes));
+  }
+  variable == nullptr ? unsetenv("TZ") : setenv("TZ", before.c_str(), 1);
+  tzset();
+}
+
+Text scratch_folder() {
+  static int count = 0;
+  Text folder = u"T:\\scratch" + from_utf8(std::to_string(++count)) + u"\\";
+  real_files()->make_path(folder);
+  return folder;
+}
+
+Text make_hidden_file(const Text& folder) {
+  real_files()->append(folder + u".hidden.txt", "");
+  return folder + u".hidden.txt";
+}
+
+void set_read_only(const Text& path, bool read_only) { chmod(native(path).c_str(), read_only ? 0444 : 0644); }
+
+std::shared_ptr<void> lock_file(const Text& path) {
+  auto file = std::make_shared<posix::Descriptor>(posix::open_file(native(path), O_RDONLY));
+  posix::lock(*file, LOCK_EX);
+  return file;
+}
+
+}  // namespace talutil::testing

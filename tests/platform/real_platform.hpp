@@ -1,0 +1,57 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+
+#include "platform/code_page.hpp"
+#include "platform/files.hpp"
+#include "platform/folders.hpp"
+#include "platform/registry.hpp"
+#include "platform/settings.hpp"
+#include "platform/time_conversions.hpp"
+
+/// The platform's own parts, for the tests that hold for both platforms.
+namespace talutil::testing {
+
+[[nodiscard]] std::unique_ptr<Files> real_files();
+[[nodiscard]] std::unique_ptr<Folders> real_folders();
+[[nodiscard]] std::unique_ptr<CodePage> real_code_page(std::uint32_t number);
+[[nodiscard]] std::shared_ptr<Profiles> real_profiles();
+[[nodiscard]] std::shared_ptr<SettingsStore> real_settings_store();
+[[nodiscard]] std::unique_ptr<TimeConversions> real_time_conversions();
+
+/// Without the user's key "Software\TALUtil\Test".
+[[nodiscard]] std::shared_ptr<Registry> real_registry();
+
+/// Calls with what local time is ahead of UTC today, in seconds: of each zone that the process can be put in.
+void for_each_zone(const std::function<void(std::int64_t seconds)>& use);
+
+/// An empty folder of this run's own, with a separator at its end, on a drive.
+[[nodiscard]] Text scratch_folder();
+
+/// A new empty file that the platform holds for hidden, and its path.
+Text make_hidden_file(const Text& folder);
+
+void set_read_only(const Text& path, bool read_only);
+
+/// Keeps others from opening a file as long as the result lives.
+[[nodiscard]] std::shared_ptr<void> lock_file(const Text& path);
+
+/// The whole of a file, which is put in place at once, or which was there.
+inline void write_bytes(const Text& path, std::string_view bytes) {
+  const auto files = real_files();
+  const auto file = files->open_output(path);
+  file->write(bytes);
+  file->close();
+}
+
+inline std::string read_bytes(const Text& path) {
+  const auto files = real_files();
+  const auto file = files->open_input(path);
+  std::string bytes;
+  char buffer[5];
+  while (const std::size_t count = file->read(buffer)) bytes.append(buffer, count);
+  return bytes;
+}
+
+}  // namespace talutil::testing
