@@ -13,18 +13,12 @@ Text joined(const std::vector<Text>& parts) {
 }
 
 TEST(ItemList, IsReadByBlanksAndQuotes) {
-  const struct {
-    const char* name;
-    TextView list;
-    TextView items;
-  } rows[] = {
-      {"nothing", u" \t\r\n", u""},
-      {"blanks between", u" a.txt  b.txt\tC:\\*.dat ", u"a.txt|b.txt|C:\\*.dat"},
-      {"quoted", u"\"C:\\My Data\\*.*\" x", u"C:\\My Data\\*.*|x"},
-      {"quoted in part", u"C:\\\"My Data\"\\a", u"C:\\My Data\\a"},
-      {"a quote left open", u"\"a b", u"a b"},
-  };
-  for (const auto& row : rows) EXPECT_EQ(joined(read_item_list(row.list)), row.items) << row.name;
+  const auto read = [](TextView list) { return joined(read_item_list(list)); };
+  EXPECT_EQ(read(u" \t\r\n"), u"");
+  EXPECT_EQ(read(u" a.txt  b.txt\tC:\\*.dat "), u"a.txt|b.txt|C:\\*.dat");
+  EXPECT_EQ(read(u"\"C:\\My Data\\*.*\" x"), u"C:\\My Data\\*.*|x");
+  EXPECT_EQ(read(u"C:\\\"My Data\"\\a"), u"C:\\My Data\\a") << "quoted in part";
+  EXPECT_EQ(read(u"\"a b"), u"a b") << "a quote left open";
 }
 
 TEST(EntryFilter, ComparesPartsFromTheFrontOrTheLast) {
@@ -47,30 +41,29 @@ TEST(EntryFilter, ComparesPartsFromTheFrontOrTheLast) {
 TEST(EntryNames, StayBelowTheFolder) {
   const struct {
     Text name;
-    TextView parts;  // "-" is refused.
-  } rows[] = {
-      {u"a/b.txt", u"a|b.txt"},
-      {u"a\\b.txt", u"a|b.txt"},
-      {u"/etc/passwd", u"etc|passwd"},
-      {u"C:\\Windows\\x.dll", u"Windows|x.dll"},
-      {u"\\\\server\\share\\x", u"server|share|x"},
-      {u"./a//b/", u"a|b"},
-      {u"../a", u"-"},
-      {u"a/..\\b", u"-"},
-      {u"", u"-"},
-      {u"C:", u"-"},
-      {Text(u"a\0b", 3), u"-"},
-      {u"con", u"_con"},
-      {u"a/NUL.txt", u"a|_NUL.txt"},
-      {u"com1", u"_com1"},
-      {u"com10", u"com10"},
-      {u"x/a:b?<>|*\".txt", u"x|a_b______.txt"},
-      {u"x\t\u0001y", u"x__y"},
-      {u"trailing. .", u"trailing___"},
-      {u"...", u"___"},
-      {Text(256, u'x'), u"-"},
-      {Text(65535, u'y'), u"-"},
-  };
+    Text parts;  // "-" is refused.
+  } rows[] = {{u"a/b.txt", u"a|b.txt"},
+              {u"a\\b.txt", u"a|b.txt"},
+              {u"/etc/passwd", u"etc|passwd"},
+              {u"C:\\Windows\\x.dll", u"Windows|x.dll"},
+              {u"\\\\server\\share\\x", u"server|share|x"},
+              {u"./a//b/", u"a|b"},
+              {u"../a", u"-"},
+              {u"a/..\\b", u"-"},
+              {u"", u"-"},
+              {u"C:", u"-"},
+              {Text(u"a\0b", 3), u"-"},
+              {u"con", u"_con"},
+              {u"a/NUL.txt", u"a|_NUL.txt"},
+              {u"com1", u"_com1"},
+              {u"com10", u"com10"},
+              {u"x/a:b?<>|*\".txt", u"x|a_b______.txt"},
+              {u"x\t\u0001y", u"x__y"},
+              {u"trailing. .", u"trailing___"},
+              {u"...", u"___"},
+              {Text(255, u'x'), Text(255, u'x')},
+              {Text(256, u'x'), u"-"},
+              {Text(65535, u'y'), u"-"}};
   for (const auto& row : rows) {
     const auto parts = safe_parts(row.name);
     EXPECT_EQ(parts ? joined(*parts) : u"-", row.parts) << to_utf8(row.name.substr(0, 40));

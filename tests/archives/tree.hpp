@@ -1,10 +1,13 @@
 #pragma once
 
+#include <gtest/gtest.h>
+
 #include <map>
 #include <string>
 
 #include "archives/packing.hpp"
 #include "archives/unpacking.hpp"
+#include "tests/fakes/rows.hpp"
 #include "tests/platform/real_platform.hpp"
 
 /// Trees of files on the real platform, as maps from path ("a\b.txt", folders with "\" at the end) to content.
@@ -12,27 +15,14 @@ namespace talutil::archives::testing {
 
 using Tree = std::map<Text, std::string>;
 
-inline std::unique_ptr<Folder> folder_of(const Text& base, const Text& path, Text& name) {
-  auto folder = talutil::testing::real_folders()->open(base);
-  std::vector<Text> parts;
-  for (std::size_t begin = 0; begin < path.size();) {
-    const std::size_t end = std::min(path.find(u'\\', begin), path.size());
-    parts.push_back(path.substr(begin, end - begin));
-    begin = end + 1;
-  }
-  for (std::size_t i = 0; i + 1 < parts.size(); ++i) folder = folder->folder(parts[i], true);
-  name = parts.back();
-  return folder;
-}
-
 inline void write_file(const Text& base, const Text& path, const std::string& content) {
-  Text name;
-  const auto folder = folder_of(base, path, name);
-  if (path.ends_with(u'\\')) {
-    folder->folder(name, true);
-    return;
+  auto folder = talutil::testing::real_folders()->open(base);
+  std::size_t begin = 0;
+  for (std::size_t end = 0; (end = path.find(u'\\', begin)) != Text::npos; begin = end + 1) {
+    folder = folder->folder(path.substr(begin, end - begin), true);
   }
-  const auto file = folder->create(name);
+  if (begin == path.size()) return;
+  const auto file = folder->create(path.substr(begin));
   file->write_at(0, content);
   const FileFacts facts{.modified = 1234567891, .mode = 0644};
   file->finish(&facts);
@@ -43,21 +33,17 @@ inline void write_tree(const Text& base, const Tree& tree) {
   for (const auto& [path, content] : tree) write_file(base, path, content);
 }
 
-inline std::string content_of(StoredFile& file) {
-  std::string content(static_cast<std::size_t>(file.size()), '\0');
-  content.resize(file.read_at(0, content));
-  return content;
-}
-
 inline void read_into(Folder& folder, const Text& prefix, Tree& tree) {
   folder.list([&](TextView name, const FileFacts& facts) {
     const Text path = prefix + Text(name);
     if (facts.kind == FileKind::folder) {
       tree[path + u"\\"];
-      read_into(*folder.folder(name, false), path + u"\\", tree);
-    } else {
-      tree[path] = content_of(*folder.open(name));
+      return read_into(*folder.folder(name, false), path + u"\\", tree);
     }
+    const auto file = folder.open(name);
+    std::string& content = tree[path];
+    content.resize(static_cast<std::size_t>(file->size()));
+    content.resize(file->read_at(0, content));
   });
 }
 
@@ -65,6 +51,13 @@ inline Tree read_tree(const Text& base) {
   Tree tree;
   read_into(*talutil::testing::real_folders()->open(base), {}, tree);
   return tree;
+}
+
+/// The paths of a tree, with a bar between them.
+inline Text paths_of(const Tree& tree) {
+  Text all;
+  for (const auto& [path, content] : tree) all += (all.empty() ? u"" : u"|") + path;
+  return all;
 }
 
 /// Something to compress, another for each seed.
@@ -104,5 +97,19 @@ inline Code test_file(const Text& archive, const UnpackingOptions& options = {},
   Progress progress;
   return code_of([&] { Archive(archive, *talutil::testing::real_folders()).test(options, ask, progress); });
 }
+
+/// A folder of its own for each test, with an archive in it.
+struct ArchiveTest : ::testing::Test {
+  /// What an archive unpacks to.
+  static Tree unpacked(const Text& archive, const Text& password = {}) {
+    const Text target = talutil::testing::scratch_folder();
+    EXPECT_EQ(unpack_files(archive, target, {.password = password}), Code::ok);
+    EXPECT_EQ(test_file(archive, {.password = password}), Code::ok);
+    return read_tree(target);
+  }
+
+  Text folder = talutil::testing::scratch_folder();
+  Text archive = folder + u"a.zip";
+};
 
 }  // namespace talutil::archives::testing
