@@ -56,6 +56,10 @@ void Collection::add(const Text& item, bool recurse, bool keep_folders) {
 
 void Collection::add_entry(std::size_t folder, TextView name, const FileFacts& facts, const std::string& prefix,
                            bool recurse, bool keep_folders) {
+  const bool has_control_character = std::ranges::any_of(name, [](char16_t unit) { return unit < u' '; });
+  if (facts.kind == FileKind::unnameable || has_control_character) return left_out_.add(from_utf8(prefix) + Text(name));
+  // What a run of ours that was killed has left.
+  if (name.starts_with(temporary_prefix)) return;
   if (facts.kind == FileKind::file) {
     items_.push_back({folder, Text(name), prefix + to_utf8(name), facts});
   } else if (facts.kind == FileKind::folder && recurse) {
@@ -112,6 +116,7 @@ std::unique_ptr<Folder> Collection::open(std::size_t place) {
 }
 
 bool Collection::is_archive(Folder& folder, TextView name) const {
+  if (!folders_.ignores_case()) return name == archive_.name && folder.path() == archive_.folder;
   return equals_without_case(name, archive_.name) && equals_without_case(folder.path(), archive_.folder);
 }
 

@@ -3,6 +3,7 @@
 #include <memory>
 #include <vector>
 
+#include "archives/passed_over.hpp"
 #include "platform/folders.hpp"
 
 namespace talutil::archives {
@@ -35,6 +36,9 @@ class Collection {
 
   [[nodiscard]] const std::vector<Item>& items() const noexcept { return items_; }
 
+  /// What was found, but has a name that no archive could restore.
+  [[nodiscard]] const PassedOver& left_out() const noexcept { return left_out_; }
+
   /// Removes the duplicates of files that several items referred to. Fails with bad_parameters if two different files
   /// would have the same name in the archive, since leaving one out would lose it.
   void drop_repeated();
@@ -64,6 +68,7 @@ class Collection {
   Archive archive_;
   std::vector<Place> places_;
   std::vector<Item> items_;
+  PassedOver left_out_;
   std::vector<Pending> pending_;
   std::unique_ptr<Folder> opened_;
   std::size_t opened_place_ = 0;

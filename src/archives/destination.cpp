@@ -1,5 +1,6 @@
 #include "archives/destination.hpp"
 
+#include <algorithm>
 #include <span>
 
 #include "archives/file_errors.hpp"
@@ -22,16 +23,9 @@ Answer unless_refused(Answer refused, Work&& work) {
   });
 }
 
-/// The key under which a folder is cached; no part contains a separator.
-Text key_of(std::span<const Text> parts) {
-  Text key;
-  for (const Text& part : parts) key += upper_case(part) + u"\\";
-  return key;
-}
-
 }  // namespace
 
-Destination::Destination(Folders& folders, Files& files, const Text& path) {
+Destination::Destination(Folders& folders, Files& files, const Text& path) : ignores_case_(folders.ignores_case()) {
   with_code(Code::cannot_create, [&] {
     files.make_path(path + u"\\");
     root_ = folders.open(path);
@@ -39,20 +33,29 @@ Destination::Destination(Folders& folders, Files& files, const Text& path) {
   });
 }
 
+Text Destination::key_of(const Text& name) const { return ignores_case_ ? upper_case(name) : name; }
+
+/// The key under which a folder is cached; no part contains a separator.
+Text Destination::key_of(std::span<const Text> parts) const {
+  Text key;
+  for (const Text& part : parts) key += key_of(part) + u"\\";
+  return key;
+}
+
 Folder& Destination::open(const Place& place) {
-  if (place.parts.empty()) return *root_;
-  if (opened_place_ == &place) return *opened_;
-  std::unique_ptr<Folder> folder;
-  for (const Text& part : place.parts) folder = (folder ? *folder : *root_).folder(part, false);
-  opened_ = std::move(folder);
-  opened_place_ = &place;
-  return *opened_;
+  const auto [way, opened] = std::ranges::mismatch(place.parts, opened_, {}, {}, &Opened::name);
+  opened_.erase(opened, opened_.end());
+  for (auto part = way; part != place.parts.end(); ++part) {
+    Folder& above = opened_.empty() ? *root_ : *opened_.back().folder;
+    opened_.push_back({*part, above.folder(*part, false)});
+  }
+  return opened_.empty() ? *root_ : *opened_.back().folder;
 }
 
 Destination::Place& Destination::read(const Text& key, std::vector<Text> parts) {
   Place& place = places_.emplace(key, Place{std::move(parts), {}}).first->second;
   open(place).list([&](TextView name, const FileFacts& facts) {
-    place.entries.emplace(upper_case(Text(name)), Known{Text(name), facts.kind});
+    place.entries.emplace(key_of(Text(name)), Known{Text(name), facts.kind});
   });
   return place;
 }
@@ -63,8 +66,8 @@ Destination::Place* Destination::place_of(std::span<const Text> parts) {
   Place* const above = place_of(parts.first(parts.size() - 1));
   if (above == nullptr) return nullptr;
   const Text& name = parts.back();
-  if (!above->entries.contains(upper_case(name))) static_cast<void>(open(*above).folder(name, true));
-  const auto known = above->entries.try_emplace(upper_case(name), Known{name, FileKind::folder}).first;
+  if (!above->entries.contains(key_of(name))) static_cast<void>(open(*above).folder(name, true));
+  const auto known = above->entries.try_emplace(key_of(name), Known{name, FileKind::folder, name}).first;
   if (known->second.kind != FileKind::folder) return nullptr;
   std::vector<Text> spelled = above->parts;
   spelled.push_back(known->second.name);
@@ -76,13 +79,14 @@ Destination::Answer Destination::create(const std::vector<Text>& parts, bool ove
   return unless_refused(Answer::refused, [&] {
     Place* const place = place_of(std::span(parts).first(parts.size() - 1));
     if (place == nullptr) return Answer::refused;
-    const auto [found, is_new] = place->entries.try_emplace(upper_case(parts.back()), Known{parts.back()});
+    const auto [found, is_new] = place->entries.try_emplace(key_of(parts.back()), Known{parts.back()});
     Known& known = found->second;
     if (!is_new) {
-      if (known.kind != FileKind::file || known.is_written) return Answer::refused;
-      if (!overwrite) return Answer::kept;
+      const bool is_twin = !known.written_as.empty() && known.written_as != parts.back();
+      if (known.kind != FileKind::file || is_twin) return Answer::refused;
+      if (!overwrite && known.written_as.empty()) return Answer::kept;
     }
-    known.is_written = true;
+    known.written_as = parts.back();
     file = open(*place).create(known.name);
     return Answer::made;
   });
@@ -91,8 +95,11 @@ Destination::Answer Destination::create(const std::vector<Text>& parts, bool ove
 bool Destination::make_folder(const std::vector<Text>& parts, const FileFacts& facts) {
   return unless_refused(false, [&] {
     const Place* const place = place_of(parts);
-    if (place != nullptr) finished_later_.emplace_back(place->parts, facts);
-    return place != nullptr;
+    if (place == nullptr) return false;
+    // A folder that was there before keeps its rights.
+    const Place& above = *place_of(std::span(parts).first(parts.size() - 1));
+    if (!above.entries.at(key_of(parts.back())).written_as.empty()) finished_later_.emplace_back(place->parts, facts);
+    return true;
   });
 }
 

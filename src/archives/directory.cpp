@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <limits>
+#include <optional>
 
 #include "archives/archive_error.hpp"
 #include "archives/little_endian.hpp"
@@ -49,7 +50,7 @@ End end_in(std::string_view tail, std::size_t place, std::uint64_t tail_offset) 
   end.entries = number_at<std::uint16_t>(tail, place + 10);
   end.size = number_at<std::uint32_t>(tail, place + 12);
   end.offset = number_at<std::uint32_t>(tail, place + 16);
-  end.comment = tail.substr(place + end_record_size);
+  end.comment = tail.substr(place + end_record_size, number_at<std::uint16_t>(tail, place + 20));
   if (place < zip64_locator_size) return end;
   const std::size_t locator = place - zip64_locator_size;
   if (number_at<std::uint32_t>(tail, locator) != zip64_locator_signature) return end;
@@ -63,12 +64,17 @@ End read_end(StoredFile& file) {
   constexpr std::uint64_t longest_tail = end_record_size + longest_comment + zip64_locator_size;
   const auto size = static_cast<std::size_t>(std::min(file.size(), longest_tail));
   const std::string tail = read_exactly(file, file.size() - size, size);
+  std::optional<End> followed;
   for (std::size_t place = size >= end_record_size ? size - end_record_size + 1 : 0; place-- > 0;) {
-    if (number_at<std::uint32_t>(tail, place) == end_signature &&
-        place + end_record_size + number_at<std::uint16_t>(tail, place + 20) == size) {
-      return end_in(tail, place, file.size() - size);
-    }
+    if (number_at<std::uint32_t>(tail, place) != end_signature) continue;
+    const std::size_t end_of_comment = place + end_record_size + number_at<std::uint16_t>(tail, place + 20);
+    if (end_of_comment == size) return end_in(tail, place, file.size() - size);
+    // Bytes behind the record, such as padding, are no fault if its directory fits before it.
+    if (followed || end_of_comment > size) continue;
+    const End end = end_in(tail, place, file.size() - size);
+    if (end.has_locator || end.size <= end.position) followed = end;
   }
+  if (followed) return *followed;
   fail_without_end(file);
 }
 
@@ -186,6 +192,59 @@ std::string read_exactly(StoredFile& file, std::uint64_t offset, std::uint64_t c
   std::string bytes(static_cast<std::size_t>(count), '\0');
   if (file.read_at(offset, bytes) != bytes.size()) throw Error(Code::unexpected_end, "the archive ends too early");
   return bytes;
+}
+
+void require_matching_headers(StoredFile& archive, const Directory& directory) {
+  constexpr std::size_t names_part = 26;  // Of a local header: the lengths of the name and the extra fields.
+  for (const DirectoryEntry& entry : directory.entries) {
+    const std::string local = read_exactly(archive, entry.offset, local_header_size + entry.name_length());
+    const std::string_view name = std::string_view(entry.header).substr(central_header_size, entry.name_length());
+    const auto is_same = [&](std::size_t local_place, std::size_t central_place, std::size_t count) {
+      return local.compare(local_place, count, entry.header, central_place, count) == 0;
+    };
+    const bool is_wide = number_at<std::uint32_t>(local, 18) == full32 || number_at<std::uint32_t>(local, 22) == full32;
+    // Checksum and sizes follow the data where a descriptor has them.
+    const bool has_same_sizes = entry.has_descriptor || is_wide || is_same(14, 16, 12);
+    if (number_at<std::uint32_t>(local, 0) != local_signature ||
+        number_at<std::uint16_t>(local, names_part) != name.size() ||
+        std::string_view(local).substr(local_header_size) != name || !is_same(8, 10, 2) || !has_same_sizes) {
+      throw Error(Code::bad_structure, std::string(name) + ": its two headers contradict each other");
+    }
+  }
+}
+
+std::uint64_t prefix_length(StoredFile& archive) {
+  End end = read_end(archive);
+  const auto has = [&](std::uint64_t place, std::uint32_t signature) {
+    return place <= archive.size() && archive.size() - place >= 4 &&
+           number_at<std::uint32_t>(read_exactly(archive, place, 4), 0) == signature;
+  };
+  if (end.has_locator) {
+    constexpr std::uint64_t records = zip64_end_size + zip64_locator_size;
+    if (has(end.zip64_offset, zip64_end_signature) || end.position < records) return 0;
+    const std::uint64_t place = end.position - records;
+    return place > end.zip64_offset && has(place, zip64_end_signature) ? place - end.zip64_offset : 0;
+  }
+  if (end.entries == 0 || end.size > end.position || has(end.offset, central_signature)) return 0;
+  const std::uint64_t place = end.position - end.size;
+  return place > end.offset && has(place, central_signature) ? place - end.offset : 0;
+}
+
+std::unique_ptr<StoredFile> without_prefix(std::unique_ptr<StoredFile> archive) {
+  class Rest final : public StoredFile {
+   public:
+    Rest(std::unique_ptr<StoredFile> whole, std::uint64_t start) : whole_(std::move(whole)), start_(start) {}
+    [[nodiscard]] std::uint64_t size() const noexcept override { return whole_->size() - start_; }
+    std::size_t read_at(std::uint64_t offset, std::span<char> buffer) override {
+      return whole_->read_at(start_ + offset, buffer);
+    }
+
+   private:
+    std::unique_ptr<StoredFile> whole_;
+    std::uint64_t start_;
+  };
+  const std::uint64_t start = prefix_length(*archive);
+  return start == 0 ? std::move(archive) : std::make_unique<Rest>(std::move(archive), start);
 }
 
 std::uint32_t volumes_before(StoredFile& last_volume) {

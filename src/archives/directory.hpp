@@ -1,5 +1,6 @@
 #pragma once
 
+#include <memory>
 #include <span>
 #include <string>
 #include <vector>
@@ -51,6 +52,15 @@ constexpr std::uint32_t zip64_locator_signature = 0x07064b50;
 /// Fails with unexpected_end if an entry reaches beyond the start of the directory, and with bad_structure if entries
 /// share bytes, which is how small archives that unpack to terabytes are made.
 void require_separate_entries(const Directory& directory);
+
+/// Fails with bad_structure if the local header of an entry contradicts the directory: in name, method or sizes.
+void require_matching_headers(StoredFile& archive, const Directory& directory);
+
+/// How many bytes stand before an archive whose positions do not count them, as before a program that unpacks itself.
+[[nodiscard]] std::uint64_t prefix_length(StoredFile& archive);
+
+/// The archive without such bytes.
+[[nodiscard]] std::unique_ptr<StoredFile> without_prefix(std::unique_ptr<StoredFile> archive);
 
 /// Reads exactly `count` bytes. Fails with unexpected_end if the file is shorter.
 [[nodiscard]] std::string read_exactly(StoredFile& file, std::uint64_t offset, std::uint64_t count);

@@ -11,6 +11,7 @@ namespace {
 
 constexpr std::size_t longest_part = 255;
 constexpr std::size_t longest_path = 32'000;
+constexpr std::size_t most_parts = 1'000;
 
 /// Replaces whatever has a special meaning to Windows in a part of a path.
 Text made_safe(Text part) {
@@ -33,7 +34,7 @@ TextView without_drive(TextView name) {
 std::optional<std::vector<Text>> safe_parts(TextView name) {
   if (name.find(u'\0') != TextView::npos || name.size() > longest_path) return std::nullopt;
   std::vector<Text> parts = parts_of(without_drive(name));
-  if (parts.empty()) return std::nullopt;
+  if (parts.empty() || parts.size() > most_parts) return std::nullopt;
   for (Text& part : parts) {
     if (part == u".." || part.size() > longest_part) return std::nullopt;
     part = made_safe(std::move(part));
@@ -41,5 +42,7 @@ std::optional<std::vector<Text>> safe_parts(TextView name) {
   }
   return parts;
 }
+
+bool is_destination(TextView name) { return name.starts_with(u'.') && parts_of(name).empty(); }
 
 }  // namespace talutil::archives

@@ -14,6 +14,13 @@ PackedFiles::PackedFiles(Collection& collection, std::int32_t level, Fault& faul
   if (!compressor_) throw std::bad_alloc();
 }
 
+time_t PackedFiles::storable_time(std::int64_t modified) noexcept {
+  // A day from both ends, since the stored time is local.
+  constexpr std::int64_t earliest = 315'619'200;
+  constexpr std::int64_t latest = 4'354'732'800;
+  return static_cast<time_t>(std::clamp(modified, earliest, latest));
+}
+
 zip_source_t* PackedFiles::source_of(const Item& item, zip_t* archive) {
   Source& source = sources_.emplace_back(Source{.files = this, .item = &item, .error = {}});
   zip_error_init(&source.error);
@@ -105,7 +112,7 @@ zip_int64_t PackedFiles::read(Source& source, std::span<char> buffer) {
 void PackedFiles::tell(const Source& source, zip_stat_t& status) const {
   zip_stat_init(&status);
   status.size = source.was_read ? source.size : source.item->facts.size;
-  status.mtime = static_cast<time_t>(source.item->facts.modified);
+  status.mtime = storable_time(source.item->facts.modified);
   // The traditional encryption derives its check byte from the time, so the time is always given.
   status.valid = ZIP_STAT_SIZE | ZIP_STAT_MTIME;
   if (!fits(*source.item)) return;

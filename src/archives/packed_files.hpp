@@ -19,6 +19,9 @@ class PackedFiles {
   /// A source for an item; null if the library is out of memory.
   [[nodiscard]] zip_source_t* source_of(const Item& item, zip_t* archive);
 
+  /// The nearest time that the directory of an archive can hold: it counts the years 1980 to 2107.
+  [[nodiscard]] static time_t storable_time(std::int64_t modified) noexcept;
+
   /// A file of this size and its compressed form are in memory at the same time.
   static constexpr std::uint64_t longest_in_memory = 16U << 20U;
 

@@ -1,8 +1,8 @@
 #include "archives/packing.hpp"
 
 #include <algorithm>
-#include <limits>
 #include <unordered_map>
+#include <utility>
 
 #include "archives/file_errors.hpp"
 #include "archives/item_list.hpp"
@@ -50,8 +50,16 @@ std::unique_ptr<NewFile> create(Target& target) {
 void require_archive(StoredFile* old) {
   if (old == nullptr || old->size() == 0) return;
   if (volumes_before(*old) != 0) throw Error(Code::split_set_in_use, "a split set cannot be added to");
+  const auto require_beginning = [](std::uint64_t first) {
+    if (first != 0) throw Error(Code::bad_parameters, "a program stands before the archive, which would be lost");
+  };
+  require_beginning(prefix_length(*old));
   constexpr std::uint64_t whole[] = {0};
-  require_separate_entries(read_directory(*old, whole));
+  const Directory directory = read_directory(*old, whole);
+  require_separate_entries(directory);
+  std::uint64_t first = directory.start;
+  for (const DirectoryEntry& entry : directory.entries) first = std::min(first, entry.offset);
+  require_beginning(first);
 }
 
 /// Adds the items of a collection to a container.
@@ -119,10 +127,10 @@ class Packer {
     require(zip_file_set_external_attributes(archive, index, 0, system, attributes) == 0);
     // The time of a file comes from its source.
     if (facts.kind == FileKind::folder) {
-      require(zip_file_set_mtime(archive, index, static_cast<time_t>(facts.modified), 0) == 0);
+      require(zip_file_set_mtime(archive, index, PackedFiles::storable_time(facts.modified), 0) == 0);
     }
     // The time in the directory has a resolution of two seconds and is local; this one is exact.
-    if (facts.modified < 0 || facts.modified > std::numeric_limits<std::int32_t>::max()) return;
+    if (!std::in_range<std::int32_t>(facts.modified)) return;
     constexpr zip_uint16_t extended_time = 0x5455;
     std::string field(1, '\1');
     append_number(field, static_cast<std::uint32_t>(facts.modified));
@@ -157,6 +165,7 @@ void pack(const Text& archive, TextView items, const PackingOptions& options, Fo
   Target target = open_target(archive, folders);
   Collection collection(folders, {target.folder->path(), target.name});
   for (const Text& item : read_item_list(items)) collection.add(item, options.recurse, options.keep_folders);
+  if (collection.items().empty()) collection.left_out().throw_if_any();
   if (collection.items().empty()) throw Error(Code::nothing_to_do, "no item matches");
   collection.drop_repeated();
 
@@ -176,12 +185,13 @@ void pack(const Text& archive, TextView items, const PackingOptions& options, Fo
   }
   if (options.volume_size) {
     split_archive(std::move(output), *target.folder, target.name, *options.volume_size, progress);
-    return;
+  } else {
+    with_code(Code::cannot_create, [&] {
+      output->finish(nullptr);
+      output->take_name();
+    });
   }
-  with_code(Code::cannot_create, [&] {
-    output->finish(nullptr);
-    output->take_name();
-  });
+  collection.left_out().throw_if_any();
 }
 
 }  // namespace talutil::archives

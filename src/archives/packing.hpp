@@ -20,7 +20,8 @@ struct PackingOptions {
 /// Packs the items of a list into an archive, creating it or adding to it: entries of the same name (ignoring case) are
 /// replaced, others kept. The old archive stays as it is until the new one is complete.
 ///
-/// Throws Error; Code lists the causes.
+/// Throws Error; Code lists the causes. Files whose names no archive could restore are left out; the outcome is then
+/// `incomplete`.
 void pack(const Text& archive, TextView items, const PackingOptions& options, Folders& folders, Progress& progress);
 
 }  // namespace talutil::archives

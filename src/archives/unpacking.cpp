@@ -14,6 +14,7 @@
 #include "archives/item_list.hpp"
 #include "archives/little_endian.hpp"
 #include "archives/packed_files.hpp"
+#include "archives/passed_over.hpp"
 #include "archives/split_set.hpp"
 #include "platform/file_names.hpp"
 
@@ -53,7 +54,8 @@ struct WrongPassword {};
 
 class Archive::Reader {
  public:
-  explicit Reader(std::unique_ptr<StoredFile> file) : file_(std::move(file)), container_(checked(*file_), fault_) {}
+  explicit Reader(std::unique_ptr<StoredFile> file)
+      : file_(without_prefix(std::move(file))), container_(checked(*file_), fault_) {}
 
   [[nodiscard]] zip_t* get() const noexcept { return container_.get(); }
   [[nodiscard]] std::uint64_t size() const noexcept { return file_->size(); }
@@ -72,6 +74,12 @@ class Archive::Reader {
     entry.facts.modified = modified(index, status);
     set_kind(index, entry);
     return entry;
+  }
+
+  /// Fails with bad_structure if a local header contradicts the directory.
+  void require_matching_headers() {
+    constexpr std::array<std::uint64_t, 1> whole{0};
+    archives::require_matching_headers(*file_, read_directory(*file_, whole));
   }
 
   /// Passes the bytes of an entry to a sink; throws if they are not the ones that were packed.
@@ -134,8 +142,9 @@ class Archive::Reader {
       facts.mode = attributes >> 16U;
       if (facts.mode != 0 && (facts.mode & posix_writable) == 0) facts.attributes |= file_attribute::read_only;
     }
-    const bool is_folder = !entry.name.empty() && separators.find(entry.name.back()) != TextView::npos;
-    if (is_folder) {
+    const bool is_marked = (attributes & file_attribute::folder) != 0 && facts.size == 0 && system != ZIP_OPSYS_UNIX;
+    const bool ends_as_folder = !entry.name.empty() && separators.find(entry.name.back()) != TextView::npos;
+    if (ends_as_folder || is_marked) {
       facts.kind = FileKind::folder;
       facts.attributes &= ~file_attribute::read_only;
     } else if ((facts.mode & posix_kind) == posix_link) {
@@ -235,28 +244,16 @@ class Password {
   bool is_proved_ = false;
 };
 
-/// Collects entries that were not unpacked, to report them at the end.
-class PassedOver {
- public:
-  void add(const Text& entry) {
-    constexpr std::size_t most_told = 3;
-    if (count_++ < most_told) names_ += (names_.empty() ? "" : ", ") + to_utf8(entry);
-  }
-
-  void throw_if_any() const {
-    if (count_ == 0) return;
-    throw Error(Code::incomplete, std::to_string(count_) + " entries were passed over, such as " + names_);
-  }
-
- private:
-  std::uint64_t count_ = 0;
-  std::string names_;
-};
-
 void require_modest_size(std::uint64_t total, std::uint64_t archive_size, const UnpackingOptions& options) {
   const bool is_too_large = options.largest_total != 0 && total > options.largest_total;
   const bool is_bomb = total > always_allowed && total / options.largest_ratio > archive_size;
   if (is_too_large || is_bomb) throw Error(Code::incomplete, "the archive would unpack to more than is allowed");
+}
+
+/// Whether a failure leaves hope for the entries after it.
+bool concerns_one_entry(Code code) noexcept {
+  return code == Code::bad_structure || code == Code::unexpected_end || code == Code::cannot_create ||
+         code == Code::incomplete;
 }
 
 /// Visits the selected entries, after checking that their total size is acceptable.
@@ -274,7 +271,8 @@ void for_each_entry(const Archive& archive, std::uint64_t archive_size, const Un
                 ? std::numeric_limits<std::uint64_t>::max()
                 : total + entry.facts.size;
   }
-  if (chosen.empty()) throw Error(Code::nothing_to_do, "no entry matches");
+  // An empty archive is unpacked in full.
+  if (chosen.empty() && archive.count() > 0) throw Error(Code::nothing_to_do, "no entry matches");
   require_modest_size(total, archive_size, options);
   progress.start(total);
   for (const std::uint64_t index : chosen) visit(index, archive.entry(index));
@@ -303,18 +301,20 @@ void Archive::extract(const Text& destination, const UnpackingOptions& options, 
   Password password(options.password, ask);
   PassedOver passed_over;
   for_each_entry(*this, reader_->size(), options, progress, [&](std::uint64_t index, const Entry& entry) {
+    if (is_destination(entry.name)) return;
     auto parts = safe_parts(entry.name);
     if (!parts || entry.facts.kind == FileKind::link) return passed_over.add(entry.name);
-    if (entry.facts.kind == FileKind::folder) {
-      if (options.keep_folders && !target.make_folder(*parts, entry.facts)) passed_over.add(entry.name);
-      return;
-    }
-    if (!options.keep_folders) parts->erase(parts->begin(), parts->end() - 1);
-    std::unique_ptr<NewFile> file;
-    const auto answer = target.create(*parts, options.overwrite, file);
-    if (answer == Destination::Answer::refused) passed_over.add(entry.name);
-    if (answer != Destination::Answer::made) return;
+    // One bad entry is no reason to lose the others.
     try {
+      if (entry.facts.kind == FileKind::folder) {
+        if (options.keep_folders && !target.make_folder(*parts, entry.facts)) passed_over.add(entry.name);
+        return;
+      }
+      if (!options.keep_folders) parts->erase(parts->begin(), parts->end() - 1);
+      std::unique_ptr<NewFile> file;
+      const auto answer = target.create(*parts, options.overwrite, file);
+      if (answer == Destination::Answer::refused) passed_over.add(entry.name);
+      if (answer != Destination::Answer::made) return;
       password.with(entry, [&](const std::string& bytes) {
         std::uint64_t place = 0;
         reader_->unpack(index, bytes, [&](std::string_view piece) {
@@ -323,15 +323,14 @@ void Archive::extract(const Text& destination, const UnpackingOptions& options, 
           progress.advance(piece.size(), entry.name);
         });
       });
+      with_code(Code::cannot_create, [&] {
+        file->finish(&entry.facts);
+        file->take_name();
+      });
     } catch (const Error& error) {
-      // An unsupported method is no reason to skip the other entries.
-      if (error.code() != Code::incomplete) throw;
-      return passed_over.add(entry.name);
+      if (!concerns_one_entry(error.code())) throw;
+      passed_over.add(entry.name, error.code(), error.what());
     }
-    with_code(Code::cannot_create, [&] {
-      file->finish(&entry.facts);
-      file->take_name();
-    });
   });
   target.finish_folders();
   passed_over.throw_if_any();
@@ -339,6 +338,11 @@ void Archive::extract(const Text& destination, const UnpackingOptions& options, 
 
 void Archive::test(const UnpackingOptions& options, const PasswordQuestion& ask, Progress& progress) {
   Password password(options.password, ask);
+  try {
+    reader_->require_matching_headers();
+  } catch (const Error& error) {
+    throw Error(Code::bad_test, error.what());
+  }
   for_each_entry(*this, reader_->size(), options, progress, [&](std::uint64_t index, const Entry& entry) {
     try {
       password.with(entry, [&](const std::string& bytes) {

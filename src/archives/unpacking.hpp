@@ -18,9 +18,9 @@ struct UnpackingOptions {
   bool overwrite = false;    ///< False keeps existing files.
   bool keep_folders = true;  ///< False removes the folders from the names of entries.
   /// Limits on the unpacked size: a total in bytes (0 for no limit) and, above one gibibyte, a multiple of the
-  /// archive's own size.
+  /// archive's own size. Deflate cannot exceed the usual multiple, so that only claims that are not true do.
   std::uint64_t largest_total = 0;
-  std::uint32_t largest_ratio = 200;
+  std::uint32_t largest_ratio = 1100;
 };
 
 /// An archive, or a split set (given by its last volume), open for reading. Throws Error.
@@ -44,12 +44,14 @@ class Archive {
   [[nodiscard]] Text comment() const;
 
   /// Unpacks the selected entries into a folder, which is created if it is missing. A file gets its name only once its
-  /// checksum has proved right. Skips entries with refused names (see entry_names.hpp), links, entries whose name was
-  /// already written (ignoring case), and unsupported methods; the outcome is then `incomplete`.
+  /// checksum has proved right. Goes on after entries that cannot be unpacked: refused names (see entry_names.hpp),
+  /// links, unsupported methods, damage, files that cannot be replaced; the outcome is then `incomplete`, or the code
+  /// of the first that has one of its own.
   void extract(const Text& destination, const UnpackingOptions& options, Folders& folders, Files& files,
                const PasswordQuestion& ask, Progress& progress);
 
-  /// Reads and checks the selected entries without writing anything. Damage is reported as bad_test.
+  /// Reads and checks the selected entries, and every entry's headers, without writing anything. Damage is reported as
+  /// bad_test.
   void test(const UnpackingOptions& options, const PasswordQuestion& ask, Progress& progress);
 
  private:

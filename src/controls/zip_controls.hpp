@@ -109,7 +109,7 @@ class UnzipControl final : public TableObject<UnzipControl>, public ArchiveContr
   static constexpr std::int32_t look = 1;
   static constexpr std::int32_t test = 7;
   static constexpr std::int32_t extract = 8;
-  static constexpr std::int32_t default_largest_ratio = 200;
+  static constexpr std::int32_t default_largest_ratio = 1100;
 
   explicit UnzipControl(const Platform& platform) : TableObject(platform), ArchiveControl(platform) {}
 

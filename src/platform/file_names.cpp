@@ -99,13 +99,14 @@ class Matcher {
 }  // namespace
 
 bool is_device_name(TextView part) {
-  constexpr std::array<TextView, 4> plain = {u"CON", u"PRN", u"AUX", u"NUL"};
+  constexpr std::array<TextView, 6> plain = {u"CON", u"PRN", u"AUX", u"NUL", u"CONIN$", u"CONOUT$"};
+  constexpr TextView digits = u"123456789\u00B9\u00B2\u00B3";
   constexpr std::array<TextView, 2> numbered = {u"COM", u"LPT"};
   TextView stem = part.substr(0, part.find_first_of(u".:"));
   stem = stem.substr(0, stem.find_last_not_of(u' ') + 1);
   const auto is_stem = [&](TextView name) { return equals_without_case(stem, name); };
   if (std::ranges::any_of(plain, is_stem)) return true;
-  if (stem.size() != 4 || stem.back() < u'1' || stem.back() > u'9') return false;
+  if (stem.size() != 4 || digits.find(stem.back()) == TextView::npos) return false;
   stem.remove_suffix(1);
   return std::ranges::any_of(numbered, is_stem);
 }

@@ -13,7 +13,11 @@
 /// Folders as archives need them: kept open, with exact entry names, and links recognised.
 namespace talutil {
 
-enum class FileKind : std::uint8_t { file, folder, link, other };
+/// `unnameable` is an entry whose name a Text cannot hold, whatever it is.
+enum class FileKind : std::uint8_t { file, folder, link, other, unnameable };
+
+/// Files that are being written have names that begin with this until they are complete.
+constexpr TextView temporary_prefix = u".talutil-";
 
 /// What an archive records about a file besides its contents.
 struct FileFacts {
@@ -63,7 +67,8 @@ class Folder {
   /// The full path; only a root ends in a separator.
   [[nodiscard]] virtual Text path() const = 0;
 
-  /// Lists every entry except the folder itself and its parent, in the system's order.
+  /// Lists every entry except the folder itself and its parent, in the system's order. A name that a Text cannot hold
+  /// is listed as nearly as possible.
   virtual void list(const std::function<void(TextView name, const FileFacts& facts)>& found) = 0;
 
   [[nodiscard]] virtual std::optional<FileFacts> facts(TextView name) = 0;
@@ -88,6 +93,9 @@ class Folders {
   /// Opens the folder of a path as Files interprets it; an empty path is the current folder. Raises 76 if it is
   /// missing.
   [[nodiscard]] virtual std::unique_ptr<Folder> open(const Text& path) = 0;
+
+  /// Whether names that differ only in case are one name.
+  [[nodiscard]] virtual bool ignores_case() const noexcept = 0;
 };
 
 }  // namespace talutil

@@ -66,19 +66,29 @@ struct UnpackingTest : ArchiveTest {
 
 TEST_F(UnpackingTest, PassesOverWhatIsNotSafe) {
   constexpr std::uint32_t link = 0120777;
+  std::string deep;
+  for (int level = 0; level < 1000; ++level) deep += "d/";
+  // Where names differ only in case, both are there if the system tells them apart.
+  const bool is_one_name = talutil::testing::real_folders()->ignores_case();
+  const Code of_twins = is_one_name ? Code::incomplete : Code::ok;
   const Rows<std::vector<Made>, Code, Text> rows = {
       {"climbs out", {{"../../evil"}, {"a/../../evil"}, {"good"}}, Code::incomplete, u"good"},
       {"absolute", {{"/etc/evil"}, {"C:\\evil"}}, Code::ok, u"etc\\|etc\\evil|evil"},
       {"a link, and a way through it", {{"l", "/etc", link}, {"l/x"}}, Code::incomplete, u"l\\|l\\x"},
       {"a NUL in a name", {{std::string("a\0.txt", 6)}, {"b"}}, Code::incomplete, u"b"},
       {"a name of 65,535 bytes", {{std::string(65535, 'n')}, {"b"}}, Code::incomplete, u"b"},
-      {"names that differ by case", {{"a", "first"}, {"A", "second"}}, Code::incomplete, u"a"},
-      {"the same name twice", {{"a", "first"}, {"a", "second"}}, Code::incomplete, u"a"},
-      {"a file where a folder is", {{"f/g"}, {"F"}}, Code::incomplete, u"f\\|f\\g"},
+      {"names that differ by case", {{"a"}, {"A"}}, of_twins, is_one_name ? u"a" : u"A|a"},
+      {"the same name twice", {{"a", "first"}, {"a"}}, Code::ok, u"a"},
+      {"a file where a folder is", {{"f/g"}, {"f"}}, Code::incomplete, u"f\\|f\\g"},
+      {"the folder itself", {{"./", ""}, {"./a"}}, Code::ok, u"a"},
+      {"no folder that deep", {{deep + "f"}, {"b"}}, Code::incomplete, u"b"},
       {"a folder where a file is", {{"f"}, {"f/g"}}, Code::incomplete, u"f"},
       {"a device", {{"x/aux.txt"}}, Code::ok, u"x\\|x\\_aux.txt"},
-      {"folders in another case", {{"Data/a"}, {"DATA/b"}}, Code::ok, u"Data\\|Data\\a|Data\\b"},
-      {"nothing in it", {}, Code::nothing_to_do, u""},
+      {"folders in another case",
+       {{"Data/a"}, {"DATA/b"}},
+       Code::ok,
+       is_one_name ? u"Data\\|Data\\a|Data\\b" : u"DATA\\|DATA\\b|Data\\|Data\\a"},
+      {"nothing in it", {}, Code::ok, u""},
       {"entries on the same bytes", {{"a"}, {"b", "content", 0, 0xFFFF'FFFF, true}}, Code::bad_structure, u""},
       {"longer than it is", {{"a", "content", 0, 8}}, Code::bad_structure, u""},
       {"shorter than it is", {{"a", "content", 0, 6}}, Code::bad_structure, u""},
@@ -89,6 +99,8 @@ TEST_F(UnpackingTest, PassesOverWhatIsNotSafe) {
     write_file(folder, u"out\\", "");
     EXPECT_EQ(unpack(entries), code);
     EXPECT_EQ(paths_of(out()), written);
+    // Of two entries of one name the last one counts.
+    for (const auto& [path, content] : out()) EXPECT_EQ(content, path.ends_with(u'\\') ? "" : "content");
   });
 }
 
@@ -113,10 +125,12 @@ TEST_F(UnpackingTest, UnpacksNoMoreThanIsAllowed) {
 }
 
 TEST_F(UnpackingTest, KeepsOrReplacesFiles) {
+  // The name on disk is kept where the system ignores case.
+  const std::string name = talutil::testing::real_folders()->ignores_case() ? "a.txt" : "A.txt";
   write_file(folder, u"out\\A.txt", "old");
-  EXPECT_EQ(unpack({{"a.txt", "new"}, {"b.txt"}}), Code::ok);
+  EXPECT_EQ(unpack({{name, "new"}, {"b.txt"}}), Code::ok);
   EXPECT_EQ(out(), (Tree{{u"A.txt", "old"}, {u"b.txt", "content"}}));
-  EXPECT_EQ(unpack({{"a.txt", "new"}, {"x/b.txt", "flat"}}, {.overwrite = true, .keep_folders = false}), Code::ok);
+  EXPECT_EQ(unpack({{name, "new"}, {"x/b.txt", "flat"}}, {.overwrite = true, .keep_folders = false}), Code::ok);
   EXPECT_EQ(out(), (Tree{{u"A.txt", "new"}, {u"b.txt", "flat"}}));
 }
 
@@ -167,8 +181,12 @@ TEST_F(UnpackingTest, NothingIsLeftOfADamagedFile) {
   bytes[bytes.find("xxx")] = 'y';
   write_file(folder, u"a.zip", bytes);
   EXPECT_EQ(unpack_files(archive, folder + u"out"), Code::bad_structure);
-  EXPECT_EQ(out(), (Tree{{u"first", "content"}}));
+  EXPECT_EQ(out(), (Tree{{u"first", "content"}, {u"third", "content"}})) << "the others are restored";
   EXPECT_EQ(test_file(archive), Code::bad_test);
+  // The directory contradicts what stands before an entry.
+  bytes = make_archive({{"name"}, {"b"}});
+  bytes[bytes.rfind("name")] = 'N';
+  EXPECT_EQ(test_bytes(bytes), Code::bad_test);
   // A directory that is encrypted.
   bytes = make_archive({{"a"}});
   const std::size_t directory = bytes.find("PK\1\2");
@@ -176,6 +194,23 @@ TEST_F(UnpackingTest, NothingIsLeftOfADamagedFile) {
     bytes[directory + i] = static_cast<char>(bytes[directory + i] ^ 0x5A);
   }
   EXPECT_EQ(test_bytes(bytes), Code::bad_structure);
+}
+
+TEST_F(UnpackingTest, ReadsWhatStandsAmongOtherBytes) {
+  const std::string bytes = make_archive({{"a"}, {"b"}});
+  for (const std::size_t behind : {0, 1, 2000, 65'000}) {
+    for (const std::size_t before : {0, 1, 3000}) {
+      write_file(folder, u"a.zip", std::string(before, 'x') + bytes + std::string(behind, '\0'));
+      const Text target = scratch_folder();
+      EXPECT_EQ(unpack_files(archive, target), Code::ok) << before << ' ' << behind;
+      EXPECT_EQ(read_tree(target), (Tree{{u"a", "content"}, {u"b", "content"}}));
+      EXPECT_EQ(test_file(archive), Code::ok);
+    }
+  }
+  // Adding to it would lose what stands before.
+  write_file(folder, u"a.zip", "program" + bytes);
+  write_file(folder, u"c", "new");
+  EXPECT_EQ(pack_files(archive, folder + u"c"), Code::bad_parameters);
 }
 
 TEST_F(UnpackingTest, TruncatedArchivesAreRefusedAndFlippedBitsFoundOrHarmless) {

@@ -150,6 +150,7 @@ struct FakePlatform : MessageBoxes,
   bool wait_and_handle() override { return ++waits < quits_after_waits; }
 
   std::unique_ptr<Folder> open(const Text& /*path*/) override { raise(ErrorNumber::path_not_found); }
+  [[nodiscard]] bool ignores_case() const noexcept override { return true; }
 
   std::optional<Text> ask(TextView prompt, TextView title, Entry entry) override {
     if (entry == Entry::masked) {

@@ -70,7 +70,7 @@ TEST_F(ZipFilesTest, TellsTheControlsInTheirOrder) {
   const std::string reset =
       "34=0 5=False 19=False 20=False 18=False 8=False 22=False 10=False 11=False 12=False 9=False 6=True 7=True "
       "15=True 13=True 14=True 21=\"\" 4=\"\" 2=\"\" 17=\"\" 31=\"\" 32=\"\" 1=\"\" 24=0 16=0 23=0 33=0 30=0 27=0 25=0 "
-      "26=0 43=0 28=0% 3=200 29=0 35=\"\" 37=0 42=0 1=\"a.zip\" 34=1 24 ";
+      "26=0 43=0 28=0% 3=1100 29=0 35=\"\" 37=0 42=0 1=\"a.zip\" 34=1 24 ";
   EXPECT_EQ(told(*unzip_control), reset + "1=\"a.zip\" 4=\"C:\\out\" 2=\"*.txt\" 10=True 34=8 24 24 ");
   unzip_control->before = [&](const std::string& use) {
     if (use == "#24") unzip_control->values[use] = std::int16_t{13};

@@ -137,7 +137,11 @@ class PosixFolder final : public Folder {
       const std::string_view name = entry->d_name;
       if (name == "." || name == "..") continue;
       // An entry that has vanished in the meantime is skipped.
-      if (const auto known = native_facts(entry->d_name)) found(from_utf8(name), *known);
+      auto known = native_facts(entry->d_name);
+      if (!known) continue;
+      const Text text = from_utf8(name);
+      if (to_utf8(text) != name) known->kind = FileKind::unnameable;
+      found(text, *known);
     }
   }
 

@@ -8,6 +8,7 @@ namespace talutil::posix {
 class PosixFolders final : public Folders {
  public:
   [[nodiscard]] std::unique_ptr<Folder> open(const Text& path) override;
+  [[nodiscard]] bool ignores_case() const noexcept override { return false; }
 
  private:
   DrivePaths paths_;

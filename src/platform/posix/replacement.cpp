@@ -11,6 +11,8 @@
 
 #include <array>
 
+#include "platform/folders.hpp"
+
 namespace talutil::posix {
 
 namespace {
@@ -21,7 +23,7 @@ std::string temporary_name(std::string_view target) {
   for (const char c : target) hash = (hash ^ static_cast<unsigned char>(c)) * 0x100000001B3;
   std::array<char, 17> digits{};
   snprintf(digits.data(), digits.size(), "%016llx", static_cast<unsigned long long>(hash));
-  return std::string(Replacement::prefix) + digits.data();
+  return to_utf8(temporary_prefix) + digits.data();
 }
 
 /// Whether a name in a folder still refers to an open file.

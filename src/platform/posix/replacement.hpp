@@ -15,9 +15,6 @@ namespace talutil::posix {
 /// turns by. A file that a killed process has left is therefore reused by the next writer.
 class Replacement {
  public:
-  /// Temporary files have names that begin with this.
-  static constexpr std::string_view prefix = ".talutil-";
-
   /// Locks the target against other writers and creates the temporary file. Raises the same errors as Files; waits at
   /// most as long as `lock`.
   /// @param access O_WRONLY, or O_RDWR if the target is to be read as well; a link is not followed

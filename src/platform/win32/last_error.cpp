@@ -14,12 +14,34 @@ struct Meaning {
   ErrorNumber number;
 };
 
+// Documented codes that the tool chain's headers lack.
+constexpr DWORD virus_infected = 225;
+constexpr DWORD virus_deleted = 226;
+constexpr DWORD disk_quota_exceeded = 1295;
+
 constexpr Meaning meanings[] = {
     {ERROR_FILE_NOT_FOUND, ErrorNumber::file_not_found},
     {ERROR_PATH_NOT_FOUND, ErrorNumber::path_not_found},
     {ERROR_INVALID_DRIVE, ErrorNumber::path_not_found},
     {ERROR_BAD_NETPATH, ErrorNumber::path_not_found},
     {ERROR_BAD_NET_NAME, ErrorNumber::path_not_found},
+    {ERROR_NETNAME_DELETED, ErrorNumber::path_not_found},
+    {ERROR_SEM_TIMEOUT, ErrorNumber::path_not_found},
+    {ERROR_NETWORK_UNREACHABLE, ErrorNumber::path_not_found},
+    {ERROR_HOST_UNREACHABLE, ErrorNumber::path_not_found},
+    {ERROR_NO_NET_OR_BAD_PATH, ErrorNumber::path_not_found},
+    {ERROR_DEV_NOT_EXIST, ErrorNumber::path_not_found},
+    {ERROR_NETWORK_ACCESS_DENIED, ErrorNumber::path_not_found},
+    {ERROR_SESSION_CREDENTIAL_CONFLICT, ErrorNumber::path_file_access},
+    {ERROR_LOGON_FAILURE, ErrorNumber::path_file_access},
+    {virus_infected, ErrorNumber::path_file_access},
+    {virus_deleted, ErrorNumber::path_file_access},
+    {ERROR_DELETE_PENDING, ErrorNumber::permission_denied},
+    {ERROR_USER_MAPPED_FILE, ErrorNumber::permission_denied},
+    {ERROR_CANT_ACCESS_FILE, ErrorNumber::permission_denied},
+    {disk_quota_exceeded, ErrorNumber::disk_full},
+    {ERROR_FILE_EXISTS, ErrorNumber::file_already_exists},
+    {ERROR_ALREADY_EXISTS, ErrorNumber::file_already_exists},
     {ERROR_TOO_MANY_OPEN_FILES, ErrorNumber::too_many_files},
     {ERROR_ACCESS_DENIED, ErrorNumber::path_file_access},
     {ERROR_WRITE_PROTECT, ErrorNumber::path_file_access},

@@ -1,11 +1,11 @@
 #include "platform/win32/stored_files.hpp"
 
-#include <atomic>
+#include <algorithm>
 
-#include "automation/numbers.hpp"
 #include "automation/run_time_error.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/last_error.hpp"
+#include "platform/win32/replacement.hpp"
 
 namespace talutil::win32 {
 
@@ -37,8 +37,7 @@ std::size_t read_file(const Owned<kind::File>& file, std::uint64_t offset, std::
 
 class Win32StoredFile final : public StoredFile {
  public:
-  Win32StoredFile(const Text& path, DWORD sharing)
-      : file_(CreateFileW(wide(path), GENERIC_READ, sharing, nullptr, OPEN_EXISTING, 0, nullptr)) {
+  explicit Win32StoredFile(Owned<kind::File> file) : file_(std::move(file)) {
     LARGE_INTEGER size{};
     if (!file_ || GetFileSizeEx(file_.get(), &size) == 0) raise_last_error();
     size_ = static_cast<std::uint64_t>(size.QuadPart);
@@ -56,80 +55,60 @@ class Win32StoredFile final : public StoredFile {
 
 class Win32NewFile final : public NewFile {
  public:
-  Win32NewFile(const Text& folder, TextView name) : folder_(folder), path_(folder + Text(name)) {
-    const DWORD attributes = GetFileAttributesW(wide(path_));
-    if (attributes != INVALID_FILE_ATTRIBUTES) {
-      if ((attributes & (FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_DIRECTORY)) != 0)
-        raise(ErrorNumber::path_file_access);
-      replaced_ = std::make_unique<Win32StoredFile>(path_, FILE_SHARE_READ);
-    }
-    static std::atomic<std::int32_t> next{0};
-    do {
-      temporary_ = folder + u".talutil-" + number_to_text(static_cast<std::int32_t>(GetCurrentProcessId())) + u"-" +
-                   number_to_text(next++);
-      file_ = Owned<kind::File>(CreateFileW(wide(temporary_), GENERIC_READ | GENERIC_WRITE, FILE_SHARE_READ, nullptr,
-                                            CREATE_NEW, FILE_ATTRIBUTE_NORMAL, nullptr));
-    } while (!file_ && GetLastError() == ERROR_FILE_EXISTS);
-    if (file_) return;
-    temporary_.clear();
-    raise_last_error();
-  }
-  Win32NewFile(const Win32NewFile&) = delete;
-  Win32NewFile& operator=(const Win32NewFile&) = delete;
-
-  ~Win32NewFile() override {
-    file_.reset();
-    if (!temporary_.empty()) DeleteFileW(wide(temporary_));
-  }
+  Win32NewFile(const Text& folder, TextView name)
+      : name_(name), replaced_(open_replaced(folder + name_)), replacement_(folder) {}
 
   [[nodiscard]] StoredFile* replaced() noexcept override { return replaced_.get(); }
   [[nodiscard]] std::uint64_t size() const noexcept override { return size_; }
   std::size_t read_at(std::uint64_t offset, std::span<char> buffer) override {
-    return read_file(file_, offset, buffer);
+    return read_file(replacement_.file(), offset, buffer);
   }
 
   void write_at(std::uint64_t offset, std::string_view bytes) override {
-    constexpr std::size_t longest = 1U << 24U;
-    seek(file_, offset);
+    seek(replacement_.file(), offset);
     size_ = std::max(size_, offset + bytes.size());
-    while (!bytes.empty()) {
-      DWORD written = 0;
-      const auto part = static_cast<DWORD>(std::min(bytes.size(), longest));
-      if (WriteFile(file_.get(), bytes.data(), part, &written, nullptr) == 0) raise_last_error();
-      if (written == 0) raise(ErrorNumber::disk_full);
-      bytes.remove_prefix(written);
-    }
+    write_all(replacement_.file(), bytes);
   }
 
   void finish(const FileFacts* facts) override {
-    if (facts != nullptr) {
-      const FILETIME time = file_time(facts->modified);
-      if (SetFileTime(file_.get(), nullptr, nullptr, &time) == 0) raise_last_error();
-    }
-    file_.reset();
-    if (facts != nullptr && (facts->attributes & kept_attributes) != 0) {
-      SetFileAttributesW(wide(temporary_), facts->attributes & kept_attributes);
-    }
+    if (facts == nullptr) return;
+    const FILETIME time = file_time(facts->modified);
+    if (SetFileTime(replacement_.file().get(), nullptr, nullptr, &time) == 0) raise_last_error();
+    attributes_ = facts->attributes & kept_attributes;
   }
 
   using NewFile::take_name;
   void take_name(TextView other_name) override {
+    // The lock on the old file ends here: the system replaces no file that is open.
+    const bool replaces = replaced_ != nullptr || !other_name.empty();
     replaced_.reset();
-    const Text path = other_name.empty() ? path_ : folder_ + Text(other_name);
-    if (MoveFileExW(wide(temporary_), wide(path), MOVEFILE_REPLACE_EXISTING) == 0) {
-      const DWORD reason = GetLastError();
-      // The file was writable a moment ago, so what prevents replacing it is that someone has it open.
-      raise_for(reason == ERROR_ACCESS_DENIED ? ERROR_SHARING_VIOLATION : reason);
-    }
-    temporary_.clear();
+    replacement_.take_name(other_name.empty() ? name_ : Text(other_name), attributes_, replaces,
+                           Replacement::Keep::nothing);
   }
 
  private:
-  Text folder_;
-  Text path_;
-  Text temporary_;
+  /// Opened for writing too where that is allowed, so that a second writer is refused at once.
+  [[nodiscard]] static std::unique_ptr<Win32StoredFile> open_replaced(const Text& path) {
+    const DWORD attributes = GetFileAttributesW(wide(path));
+    if (attributes == INVALID_FILE_ATTRIBUTES) return nullptr;
+    if ((attributes & (FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_DIRECTORY)) != 0) raise(ErrorNumber::path_file_access);
+    Owned<kind::File> file;
+    const auto open = [&](DWORD access) {
+      return retried([&] {
+        file.reset(CreateFileW(wide(path), access, FILE_SHARE_READ, nullptr, OPEN_EXISTING, 0, nullptr));
+        return file ? TRUE : FALSE;
+      });
+    };
+    DWORD code = open(GENERIC_READ | GENERIC_WRITE);
+    if (code == ERROR_ACCESS_DENIED) code = open(GENERIC_READ);
+    if (code != 0) raise_for(code);
+    return std::make_unique<Win32StoredFile>(std::move(file));
+  }
+
+  Text name_;
   std::unique_ptr<Win32StoredFile> replaced_;
-  Owned<kind::File> file_;
+  Replacement replacement_;
+  DWORD attributes_ = 0;
   std::uint64_t size_ = 0;
 };
 
@@ -145,7 +124,8 @@ FILETIME file_time(std::int64_t seconds) noexcept {
 }
 
 std::unique_ptr<StoredFile> open_stored_file(const Text& path, DWORD sharing) {
-  return std::make_unique<Win32StoredFile>(path, sharing);
+  return std::make_unique<Win32StoredFile>(
+      Owned<kind::File>(CreateFileW(wide(path), GENERIC_READ, sharing, nullptr, OPEN_EXISTING, 0, nullptr)));
 }
 
 std::unique_ptr<NewFile> create_new_file(const Text& folder, TextView name) {

@@ -1,11 +1,14 @@
 #include "platform/win32/win32_files.hpp"
 
+#include <algorithm>
 #include <array>
 
 #include "automation/run_time_error.hpp"
 #include "platform/file_names.hpp"
+#include "platform/win32/extended_path.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/last_error.hpp"
+#include "platform/win32/replacement.hpp"
 
 namespace talutil::win32 {
 
@@ -42,17 +45,6 @@ Owned<kind::File> open_file(const Text& path, DWORD access, DWORD sharing, DWORD
   return file;
 }
 
-void write_all(const Owned<kind::File>& file, std::string_view bytes) {
-  constexpr std::size_t longest = 1U << 24U;
-  while (!bytes.empty()) {
-    const std::string_view part = bytes.substr(0, longest);
-    DWORD written = 0;
-    if (WriteFile(file.get(), part.data(), static_cast<DWORD>(part.size()), &written, nullptr) == 0) raise_last_error();
-    if (written == 0) raise(ErrorNumber::disk_full);
-    bytes.remove_prefix(written);
-  }
-}
-
 class Win32InputFile final : public InputFile {
  public:
   explicit Win32InputFile(const Text& path) : file_(open_file(path, GENERIC_READ, shared, OPEN_EXISTING)) {
@@ -76,69 +68,65 @@ class Win32InputFile final : public InputFile {
   std::uint64_t size_ = 0;
 };
 
-/// Writes a temporary file that replaces the target when it is closed. If the folder does not allow new files,
-/// overwrites the target in place.
 class Win32OutputFile final : public OutputFile {
  public:
-  explicit Win32OutputFile(const Text& path) : path_(path) {
-    require_usable(path, true);
-    // Problems with the target are reported now, not after everything has been written.
-    Owned<kind::File> target(CreateFileW(wide(path_), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
-    const DWORD reason = GetLastError();
-    if (!target && reason != ERROR_FILE_NOT_FOUND) raise_for_path(reason, path_);
-    replaces_ = static_cast<bool>(target);
-    target.reset();
-    make_file();
-  }
-  Win32OutputFile(const Win32OutputFile&) = delete;
-  Win32OutputFile& operator=(const Win32OutputFile&) = delete;
+  explicit Win32OutputFile(const Text& path) : path_(path), replaces_(is_there(path)), replacement_(folder_of(path)) {}
 
-  ~Win32OutputFile() override {
-    if (temporary_.empty()) return;
-    file_.reset();
-    DeleteFileW(wide(temporary_));
-  }
-
-  void write(std::string_view bytes) override { write_all(file_, bytes); }
+  void write(std::string_view bytes) override { write_all(replacement_.file(), bytes); }
 
   void close() override {
-    if (FlushFileBuffers(file_.get()) == 0) raise_last_error();
-    file_.reset();
-    if (temporary_.empty()) return;
-    // Keeps the attributes and rights of the replaced file.
-    const BOOL is_done = replaces_ ? ReplaceFileW(wide(path_), wide(temporary_), nullptr, 0, nullptr, nullptr)
-                                   : MoveFileExW(wide(temporary_), wide(path_), MOVEFILE_REPLACE_EXISTING);
-    if (is_done == 0) raise_replacing(GetLastError());
-    temporary_.clear();
+    replacement_.take_name(Text(last_part(path_)), 0, replaces_ || GetFileAttributesW(wide(path_)) != missing,
+                           Replacement::Keep::attributes_and_rights);
   }
 
  private:
-  void make_file() {
-    const Text folder = path_.substr(0, path_.size() - last_part(path_).size());
-    std::array<wchar_t, MAX_PATH + 1> name{};
-    if (GetTempFileNameW(wide(folder.empty() ? Text(u".") : folder), L"tal", 0, name.data()) != 0) {
-      temporary_ = view(name.data(), wcslen(name.data()));
-      file_ = open_file(temporary_, GENERIC_WRITE, 0, TRUNCATE_EXISTING);
-      return;
-    }
+  static constexpr DWORD missing = INVALID_FILE_ATTRIBUTES;
+
+  /// Whether there is a target. Problems with it are reported now, not after everything has been written.
+  [[nodiscard]] static bool is_there(const Text& path) {
+    require_usable(path, true);
+    const Owned<kind::File> target(CreateFileW(wide(path), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
     const DWORD reason = GetLastError();
-    if (!replaces_ || reason != ERROR_ACCESS_DENIED) raise_for_path(reason, path_);
-    file_ = open_file(path_, GENERIC_WRITE, shared, TRUNCATE_EXISTING);
+    if (!target && reason != ERROR_FILE_NOT_FOUND) raise_for_path(reason, path);
+    return static_cast<bool>(target);
   }
 
-  /// The target was writable a moment ago, so what prevents replacing it is that someone has it open.
-  [[noreturn]] static void raise_replacing(DWORD code) {
-    raise_for(code == ERROR_ACCESS_DENIED ? ERROR_SHARING_VIOLATION : code);
+  [[nodiscard]] static Text folder_of(const Text& path) {
+    Text folder = extended_path(path.substr(0, path.size() - last_part(path).size()));
+    return folder.back() == u'\\' ? folder : folder + u'\\';
   }
 
   Text path_;
-  Text temporary_;
-  bool replaces_ = false;
-  Owned<kind::File> file_;
+  bool replaces_;
+  Replacement replacement_;
+};
+
+/// The right to append to a file, which its other appenders wait for.
+class AppendLock {
+ public:
+  AppendLock(HANDLE file, OVERLAPPED& place) : file_(file), place_(place) {
+    const DWORD code =
+        retried([&] { return LockFileEx(file, LOCKFILE_EXCLUSIVE_LOCK | LOCKFILE_FAIL_IMMEDIATELY, 0, 1, 0, &place); });
+    is_locked_ = code == 0;
+    // Some stores have no locks; a line may then be torn, but is not lost.
+    if (!is_locked_ && code != ERROR_INVALID_FUNCTION && code != ERROR_NOT_SUPPORTED) raise_for(code);
+  }
+  AppendLock(const AppendLock&) = delete;
+  AppendLock& operator=(const AppendLock&) = delete;
+  ~AppendLock() {
+    if (is_locked_) UnlockFileEx(file_, 0, 1, 0, &place_);
+  }
+
+ private:
+  HANDLE file_;
+  OVERLAPPED& place_;
+  bool is_locked_ = false;
 };
 
 bool is_nothing_found(DWORD code) {
-  return code == ERROR_FILE_NOT_FOUND || code == ERROR_PATH_NOT_FOUND || code == ERROR_NO_MORE_FILES;
+  constexpr DWORD codes[] = {ERROR_FILE_NOT_FOUND, ERROR_PATH_NOT_FOUND,      ERROR_NO_MORE_FILES, ERROR_BAD_NETPATH,
+                             ERROR_BAD_NET_NAME,   ERROR_NETWORK_UNREACHABLE, ERROR_NOT_READY};
+  return std::ranges::find(codes, code) != std::end(codes);
 }
 
 }  // namespace
@@ -202,9 +190,8 @@ void Win32Files::append(const Text& path, std::string_view bytes) {
   const Owned<kind::File> file = open_file(path, FILE_APPEND_DATA | GENERIC_READ, shared, OPEN_ALWAYS);
   // Locks a byte beyond the end of any file: appending processes wait for each other, others are unaffected.
   OVERLAPPED far_byte{};
-  far_byte.Offset = 0xFFFFFFFE;
-  far_byte.OffsetHigh = 0x7FFFFFFF;
-  if (LockFileEx(file.get(), LOCKFILE_EXCLUSIVE_LOCK, 0, 1, 0, &far_byte) == 0) raise_last_error();
+  far_byte.OffsetHigh = 0x3FFFFFFF;  // Some network stores refuse positions beyond 2^62.
+  const AppendLock turn(file.get(), far_byte);
   LARGE_INTEGER before{};
   if (GetFileSizeEx(file.get(), &before) == 0) raise_last_error();
   try {

@@ -1,6 +1,7 @@
 #include "platform/win32/win32_folders.hpp"
 
 #include "automation/run_time_error.hpp"
+#include "platform/win32/extended_path.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/last_error.hpp"
 #include "platform/win32/stored_files.hpp"
@@ -9,12 +10,17 @@ namespace talutil::win32 {
 
 namespace {
 
-/// For WIN32_FIND_DATAW and WIN32_FILE_ATTRIBUTE_DATA.
-template <class Data>
-FileFacts facts_of(const Data& data) {
+/// Whether an entry stands for another one. Folders of cloud storage are reparse points too, but their tags lack the
+/// name-surrogate bit (IsReparseTagNameSurrogate).
+bool is_link_entry(const WIN32_FIND_DATAW& data) {
+  constexpr DWORD name_surrogate = 0x20000000;
+  return (data.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0 && (data.dwReserved0 & name_surrogate) != 0;
+}
+
+FileFacts facts_of(const WIN32_FIND_DATAW& data) {
   FileFacts facts;
   const bool is_folder = (data.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0;
-  const bool is_link = (data.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0;
+  const bool is_link = is_link_entry(data);
   facts.kind = is_folder ? (is_link ? FileKind::link : FileKind::folder) : FileKind::file;
   facts.size = is_folder ? 0 : joined(data.nFileSizeHigh, data.nFileSizeLow);
   facts.modified = seconds_of(data.ftLastWriteTime);
@@ -29,7 +35,7 @@ class Win32Folder final : public Folder {
   explicit Win32Folder(Text path) : path_(std::move(path)) {}
 
   [[nodiscard]] Text path() const override {
-    const TextView plain = TextView(path_).substr(extended.size());
+    const TextView plain = TextView(path_).substr(extended_prefix.size());
     if (plain.starts_with(u"UNC\\")) return u"\\" + Text(plain.substr(3, plain.size() - 4));
     return Text(plain.size() == 3 ? plain : plain.substr(0, plain.size() - 1));
   }
@@ -45,9 +51,8 @@ class Win32Folder final : public Folder {
   }
 
   [[nodiscard]] std::optional<FileFacts> facts(TextView name) override {
-    WIN32_FILE_ATTRIBUTE_DATA data;
-    if (GetFileAttributesExW(wide(below(name)), GetFileExInfoStandard, &data) == 0) return std::nullopt;
-    return facts_of(data);
+    const auto found = find(name);
+    return found ? std::optional(facts_of(*found)) : std::nullopt;
   }
 
   [[nodiscard]] std::unique_ptr<StoredFile> open(TextView name) override {
@@ -61,10 +66,10 @@ class Win32Folder final : public Folder {
     if (make_missing && CreateDirectoryW(wide(path), nullptr) == 0 && GetLastError() != ERROR_ALREADY_EXISTS) {
       raise_last_error();
     }
-    const DWORD attributes = GetFileAttributesW(wide(path));
-    if (attributes == INVALID_FILE_ATTRIBUTES) raise_last_error();
-    const DWORD kind = attributes & (FILE_ATTRIBUTE_DIRECTORY | FILE_ATTRIBUTE_REPARSE_POINT);
-    if (kind != FILE_ATTRIBUTE_DIRECTORY) raise(ErrorNumber::path_file_access);
+    const auto found = find(name);
+    if (!found) raise_last_error();
+    const bool is_folder = (found->dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0;
+    if (!is_folder || is_link_entry(*found)) raise(ErrorNumber::path_file_access);
     return std::make_unique<Win32Folder>(path + u"\\");
   }
 
@@ -81,32 +86,24 @@ class Win32Folder final : public Folder {
     if (DeleteFileW(wide(below(name))) == 0) raise_last_error();
   }
 
-  static constexpr TextView extended = u"\\\\?\\";
-
  private:
   [[nodiscard]] Text below(TextView name) const { return path_ + Text(name); }
+
+  /// One entry; nothing if it is missing, with the system's last error. Names hold no wildcards.
+  [[nodiscard]] std::optional<WIN32_FIND_DATAW> find(TextView name) const {
+    WIN32_FIND_DATAW entry;
+    const Owned<kind::FileSearch> search(FindFirstFileW(wide(below(name)), &entry));
+    return search ? std::optional(entry) : std::nullopt;
+  }
 
   Text path_;
 };
 
-/// The full path, with nothing left for the platform to interpret.
-Text full_path(const Text& path) {
-  const wchar_t* const given = path.empty() ? L"." : wide(path);
-  const DWORD size = GetFullPathNameW(given, 0, nullptr, nullptr);
-  Text full(size, u'\0');
-  const DWORD length = GetFullPathNameW(given, size, reinterpret_cast<wchar_t*>(full.data()), nullptr);
-  if (length == 0 || length >= size) raise(ErrorNumber::path_not_found);
-  full.resize(length);
-  if (full.back() != u'\\') full += u'\\';
-  if (full.starts_with(Win32Folder::extended)) return full;
-  if (full.starts_with(u"\\\\")) return Text(Win32Folder::extended) + u"UNC\\" + full.substr(2);
-  return Text(Win32Folder::extended) + full;
-}
-
 }  // namespace
 
 std::unique_ptr<Folder> Win32Folders::open(const Text& path) {
-  Text full = full_path(path);
+  Text full = extended_path(path);
+  if (full.back() != u'\\') full += u'\\';
   const DWORD attributes = GetFileAttributesW(wide(full));
   if (attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_DIRECTORY) == 0) {
     raise(ErrorNumber::path_not_found);

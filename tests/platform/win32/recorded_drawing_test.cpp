@@ -6,7 +6,7 @@
 
 #include "platform/win32/page_renderer.hpp"
 #include "platform/win32/win32_drawing.hpp"
-#include "preview/report_composer.hpp"
+#include "documents/report_composer.hpp"
 
 namespace talutil::win32 {
 namespace {

@@ -1,0 +1,133 @@
+#include "platform/win32/replacement.hpp"
+
+#include <array>
+#include <atomic>
+#include <utility>
+
+#include "automation/numbers.hpp"
+#include "automation/run_time_error.hpp"
+#include "platform/folders.hpp"
+#include "platform/win32/last_error.hpp"
+
+namespace talutil::win32 {
+
+namespace {
+
+/// Documented at ReplaceFile: after these, the old file has lost its name, and the new one still has its temporary
+/// name.
+bool has_lost_target(DWORD code) noexcept {
+  return code == ERROR_UNABLE_TO_MOVE_REPLACEMENT || code == ERROR_UNABLE_TO_MOVE_REPLACEMENT_2;
+}
+
+}  // namespace
+
+bool is_passing(DWORD code) noexcept {
+  return code == ERROR_ACCESS_DENIED || code == ERROR_SHARING_VIOLATION || code == ERROR_LOCK_VIOLATION ||
+         code == ERROR_DELETE_PENDING || code == ERROR_USER_MAPPED_FILE || code == ERROR_UNABLE_TO_REMOVE_REPLACED;
+}
+
+void write_all(const Owned<kind::File>& file, std::string_view bytes) {
+  constexpr std::size_t longest = 1U << 24U;
+  while (!bytes.empty()) {
+    const std::string_view part = bytes.substr(0, longest);
+    DWORD written = 0;
+    if (WriteFile(file.get(), part.data(), static_cast<DWORD>(part.size()), &written, nullptr) == 0) raise_last_error();
+    if (written == 0) raise(ErrorNumber::disk_full);
+    bytes.remove_prefix(written);
+  }
+}
+
+Replacement::Replacement(Text folder) : folder_(std::move(folder)) {
+  remove_stale();
+  static std::atomic<std::int32_t> next{0};
+  do {
+    temporary_ = folder_ + Text(temporary_prefix) + number_to_text(static_cast<std::int32_t>(GetCurrentProcessId())) +
+                 u"-" + number_to_text(next++);
+    file_.reset(CreateFileW(wide(temporary_), GENERIC_READ | GENERIC_WRITE, FILE_SHARE_READ, nullptr, CREATE_NEW,
+                            FILE_ATTRIBUTE_HIDDEN, nullptr));
+  } while (!file_ && GetLastError() == ERROR_FILE_EXISTS);
+  if (file_) return;
+  temporary_.clear();
+  raise_last_error();
+}
+
+Replacement::~Replacement() {
+  file_.reset();
+  if (!temporary_.empty()) DeleteFileW(wide(temporary_));
+}
+
+/// Removes what killed processes have left. Only files older than a day, since others may be about to get their name.
+void Replacement::remove_stale() const {
+  FILETIME now{};
+  GetSystemTimeAsFileTime(&now);
+  const auto number = [](const FILETIME& time) { return ULARGE_INTEGER{{time.dwLowDateTime, time.dwHighDateTime}}; };
+  constexpr ULONGLONG day = 864'000'000'000;
+  WIN32_FIND_DATAW entry;
+  const Owned<kind::FileSearch> search(FindFirstFileW(wide(folder_ + Text(temporary_prefix) + u"*"), &entry));
+  if (!search) return;
+  do {
+    const bool is_old = number(entry.ftLastWriteTime).QuadPart + day < number(now).QuadPart;
+    if (is_old) DeleteFileW(wide(folder_ + Text(view(entry.cFileName, wcslen(entry.cFileName)))));
+  } while (FindNextFileW(search.get(), &entry) != 0);
+}
+
+void Replacement::take_name(const Text& name, DWORD attributes, bool replaces, Keep keep) {
+  const Text target = folder_ + name;
+  if (FlushFileBuffers(file_.get()) == 0) raise_last_error();
+  file_.reset();
+  SetFileAttributesW(wide(temporary_), attributes == 0 ? FILE_ATTRIBUTE_NORMAL : attributes);
+  const DWORD how = MOVEFILE_WRITE_THROUGH | (replaces ? MOVEFILE_REPLACE_EXISTING : 0);
+  const auto move = [&] { return MoveFileExW(wide(temporary_), wide(target), how); };
+  const auto replace = [&] {
+    // Without the right to change permissions, the new version has those of the folder.
+    constexpr DWORD flags = REPLACEFILE_IGNORE_MERGE_ERRORS | REPLACEFILE_IGNORE_ACL_ERRORS;
+    return ReplaceFileW(wide(target), wide(temporary_), nullptr, flags, nullptr, nullptr);
+  };
+  DWORD code = 0;
+  if (replaces && keep == Keep::attributes_and_rights) {
+    code = retried(replace);
+    if (has_lost_target(code)) {
+      code = retried(move);
+      if (code != 0) {
+        const Text kept = std::exchange(temporary_, {});
+        throw RunTimeError(
+            ErrorNumber::path_file_access,
+            u"Path/File access error: " + target + u" could not be replaced; its new contents are in " + kept);
+      }
+    }
+  }
+  if (code != 0 || !replaces || keep == Keep::nothing) code = retried(move);
+  if (code == ERROR_ALREADY_EXISTS || code == ERROR_FILE_EXISTS) raise(ErrorNumber::permission_denied);
+  if (code != 0 && replaces && is_passing(code)) return overwrite(target);
+  if (code != 0) raise_for(code);
+  temporary_.clear();
+}
+
+/// The one step that is not atomic: for files that others have open, and in folders where files cannot be replaced.
+void Replacement::overwrite(const Text& target) {
+  constexpr DWORD shared = FILE_SHARE_READ | FILE_SHARE_WRITE;
+  const Owned<kind::File> from(
+      CreateFileW(wide(temporary_), GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING, 0, nullptr));
+  if (!from) raise_last_error();
+  const Owned<kind::File> to(CreateFileW(wide(target), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
+  // It was writable a moment ago, so what prevents it is that another program has it open.
+  if (!to) raise(ErrorNumber::permission_denied);
+  try {
+    std::array<char, 1U << 16U> buffer;
+    for (;;) {
+      DWORD count = 0;
+      if (ReadFile(from.get(), buffer.data(), static_cast<DWORD>(buffer.size()), &count, nullptr) == 0) {
+        raise_last_error();
+      }
+      if (count == 0) break;
+      write_all(to, std::string_view(buffer.data(), count));
+    }
+    // Cut off at the end and not at the beginning, so that the old contents remain as long as possible.
+    if (SetEndOfFile(to.get()) == 0 || FlushFileBuffers(to.get()) == 0) raise_last_error();
+  } catch (const RunTimeError& error) {
+    const Text kept = std::exchange(temporary_, {});
+    throw RunTimeError(error.number(), error.description() + u": " + target + u"; its new contents are in " + kept);
+  }
+}
+
+}  // namespace talutil::win32
