@@ -17,11 +17,13 @@ namespace {
 // The sharing mode of sequential files: others may read and write meanwhile.
 constexpr DWORD shared = FILE_SHARE_READ | FILE_SHARE_WRITE;
 
+bool drive_is_missing(const Text& path) {
+  return path.find(u':') == 1 && GetDriveTypeW(wide(path.substr(0, 2) + u"\\")) <= DRIVE_NO_ROOT_DIR;
+}
+
 /// Some systems report a missing drive as a missing file.
 [[noreturn]] void raise_for_path(DWORD code, const Text& path) {
-  const bool drive_is_missing =
-      path.find(u':') == 1 && GetDriveTypeW(wide(path.substr(0, 2) + u"\\")) <= DRIVE_NO_ROOT_DIR;
-  raise_for(drive_is_missing ? ERROR_PATH_NOT_FOUND : code);
+  raise_for(drive_is_missing(path) ? ERROR_PATH_NOT_FOUND : code);
 }
 
 /// Raises the error of an invalid name, and 75 if a read-only file is to be written, because some systems let an
@@ -87,7 +89,7 @@ class Win32OutputFile final : public OutputFile {
     require_usable(path, true);
     const Owned<kind::File> target(CreateFileW(wide(path), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
     const DWORD reason = GetLastError();
-    if (!target && reason != ERROR_FILE_NOT_FOUND) raise_for_path(reason, path);
+    if (!target && (reason != ERROR_FILE_NOT_FOUND || drive_is_missing(path))) raise_for_path(reason, path);
     return static_cast<bool>(target);
   }
 
