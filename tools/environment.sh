@@ -1,6 +1,6 @@
-# What ./test, ./demo and ./benchmark share: the packages, the Wine root and how to run things in it.
-# Sourced by bash scripts that have set -euo pipefail; needs a Debian 12 machine and, only while
-# something is missing, root rights and the machine's own package mirror.
+# Shared by ./test, ./demo and ./benchmark: the packages, the Wine root and functions to run programs in it. Sourced by
+# bash scripts that have set -euo pipefail. Needs a Debian 12 machine and, only if something is missing, root rights and
+# the machine's own package mirror.
 
 talutil_top=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)
 talutil_build=${TALUTIL_BUILD:-$talutil_top/build}
@@ -11,7 +11,7 @@ exchange_packages="zip unzip p7zip-full python3 poppler-utils qpdf fonts-dejavu-
 windows_packages="binutils libz-mingw-w64-dev debootstrap debian-archive-keyring g++-mingw-w64-i686-posix mingw-w64-tools xvfb xauth"
 windows64_packages="libz-mingw-w64-dev g++-mingw-w64-x86-64-posix mingw-w64-tools wine64 xvfb xauth"
 
-# Every checkout on the machine shares what the compiler has made: paths count from the checkout's own folder.
+# All checkouts on the machine share the compiler cache: paths are relative to the checkout's folder.
 export CCACHE_BASEDIR=$talutil_top CCACHE_NOHASHDIR=1
 
 fail() {
@@ -21,7 +21,7 @@ fail() {
 
 say() { printf '== %s\n' "$*"; }
 
-# Installs those of the named packages that the machine lacks.
+# Installs the named packages that are missing.
 need_packages() {
   local missing=() package
   for package in "$@"; do
@@ -35,26 +35,26 @@ need_packages() {
     fail "could not install: ${missing[*]}"
 }
 
-# The kind of third-party libraries that a preset is built with.
+# The variant of the third-party libraries that a preset uses.
 flavour_of() { case $1 in windows* | fuzz) echo "$1" ;; *) echo native ;; esac; }
 
-# The Wine root: a small i386 Debian of its own, because 32-bit Wine cannot stand beside the 64-bit
-# packages. Its folder is named by a hash of the recipe, so every checkout on the machine shares it and
-# a changed recipe makes a new one. The folder appears under its name only when it is complete.
+# The Wine root is a small i386 Debian, because 32-bit Wine cannot be installed alongside the 64-bit packages. Its
+# folder is named by a hash of the recipe, so that all checkouts on the machine share it and a changed recipe creates a
+# new one. The folder gets its name only once it is complete.
 wine_root_suite=bookworm
 wine_root_include=wine32,libgnutls30,fonts-liberation,fonts-dejavu-core
 wine_root_recipe="$wine_root_suite i386 minbase $wine_root_include 1"
 wine_root=$talutil_cache/wine-$(printf %s "$wine_root_recipe" | sha256sum | cut -c1-12)
 
-# The mirror that the machine itself installs the named suite of Debian from.
+# The mirror from which the machine installs the given suite of Debian.
 debian_mirror() {
   apt-get indextargets --format '$(REPO_URI) $(RELEASE)' 'Created-By: Packages' |
     awk -v suite="$1" '$2 == suite && !found { found = 1; print $1 }'
 }
 
-# Some virtual machines refuse 32-bit programs. There the root runs under QEMU's user-mode emulator
-# (version 10 of the backports: version 7 hangs in Wine's services), registered with the kernel until
-# the next boot. Everything still passes, at about a fifth of the speed.
+# Some virtual machines refuse 32-bit programs. There the root runs under QEMU's user-mode emulator (version 10 from the
+# backports, because version 7 hangs in Wine's services), which is registered with the kernel until the next boot.
+# Everything still passes, at about a fifth of the speed.
 runs_i386() {
   local probe status=0
   probe=$(mktemp -d)
@@ -92,8 +92,8 @@ ensure_i386() {
   fetch_emulator
   local registry=/proc/sys/fs/binfmt_misc
   [ -e $registry/register ] || mount -t binfmt_misc binfmt_misc $registry
-  # The header of a 32-bit executable or shared object for the i386; F keeps the emulator open, so that
-  # it is found inside the root too.
+  # The header of 32-bit executables and shared objects for the i386; F keeps the emulator open, so that it can also be
+  # used inside the root.
   printf '%s' ':talutil-i386:M::\x7fELF\x01\x01\x01\x00\x00\x00\x00\x00\x00\x00\x00\x00\x02\x00\x03\x00:\xff\xff\xff\xff\xff\xfe\xfe\x00\xff\xff\xff\xff\xff\xff\xff\xff\xfe\xff\xff\xff:'"$emulator"':F' \
     >$registry/register
   runs_i386 || fail "the emulator is registered but 32-bit programs still do not run"
@@ -113,12 +113,12 @@ make_wine_root() {
     { tail -5 "$unfinished.log" >&2; fail "debootstrap failed; its log is $unfinished.log"; }
   mkdir -p "$unfinished/checkout" "$unfinished/build"
   rm -f "$unfinished.log"
-  # Another run may have finished first; both made the same thing.
+  # Another run may have finished first; the results are the same.
   mv -T "$unfinished" "$wine_root" 2>/dev/null || rm -rf "$unfinished"
 }
 
-# Two Wines run the programs: the 32-bit one of the root, and the 64-bit one of the machine's own packages, which needs
-# no root and no emulator. Both show the checkout as Z:\checkout and the build folder as Z:\build.
+# Programs run in one of two Wines: the 32-bit one in the root, or the 64-bit one from the machine's own packages, which
+# needs neither root nor emulator. In both, the checkout is Z:\checkout and the build folder Z:\build.
 wine_bits=32
 
 use_wine64() {
@@ -126,19 +126,19 @@ use_wine64() {
   need_packages $windows64_packages
 }
 
-# The folder of the Wine prefix, as the host sees it, and the build folder as Wine's own programs see it.
+# The folder of the Wine prefix as the host sees it, and the build folder as Wine's own programs see it.
 wine_prefix() { [ $wine_bits = 64 ] && echo "$talutil_build/wine64-prefix" || echo "$talutil_build/wine-prefix"; }
 build_below_wine() { [ $wine_bits = 64 ] && echo "$talutil_build" || echo /build; }
 
-# What Wine's programs see of the environment, and no more. A test may choose another locale for them.
+# The environment of programs in Wine. A test may choose another locale for them.
 wine_environment() {
   printf '%s\n' PATH=/usr/bin:/bin:/usr/sbin:/sbin USER=root "LANG=${WINE_LANG:-C.UTF-8}" \
     ${WINE_LANG:+"LC_ALL=$WINE_LANG"} ${WINE_LOCPATH:+"LOCPATH=$WINE_LOCPATH"} ${DISPLAY:+"DISPLAY=$DISPLAY"} \
     "WINEDEBUG=${WINEDEBUG:--all}" 'WINEDLLOVERRIDES=winedbg.exe=d;mscoree=d;mshtml=d'
 }
 
-# Runs a command inside the Wine root, with the checkout under /checkout (Z:\checkout) and the build
-# folder under /build (Z:\build). Mounts live in a namespace of their own and end with the command.
+# Runs a command inside the Wine root, with the checkout as /checkout (Z:\checkout) and the build folder as /build
+# (Z:\build). The mounts are in a separate namespace and end with the command.
 in_wine_root() {
   mkdir -p "$talutil_build"
   local limit=${WINE_TIMEOUT:-120} variables
@@ -155,7 +155,7 @@ in_wine_root() {
   ' in_wine_root "$wine_root" "$talutil_top" "$talutil_build" "${variables[@]}" "$@"
 }
 
-# The current folder is one that a drive leads to: programs ask for it by its drive.
+# The current folder must be on a drive, because programs look for it there.
 in_wine64() (
   local limit=${WINE_TIMEOUT:-120} variables
   mapfile -t variables < <(wine_environment)
@@ -166,13 +166,13 @@ in_wine64() (
 
 wine() { if [ $wine_bits = 64 ]; then in_wine64 /usr/lib/wine/wine64 "$@"; else in_wine_root /usr/lib/wine/wine "$@"; fi; }
 
-# A persistent server would hold the caller's standard output open.
+# A persistent server would keep the caller's standard output open.
 wine_server() {
   if [ $wine_bits = 64 ]; then in_wine64 /usr/lib/wine/wineserver64 "$@"; else in_wine_root /usr/lib/wine/wineserver32 "$@"; fi \
     >/dev/null 2>&1 || true
 }
 
-# Makes the prefix when it is missing. Its drive Z: is the whole machine until it is made, for Wine finds the
+# Creates the prefix if it is missing. During that, its drive Z: is the whole machine, because Wine finds the
 # description of new prefixes there.
 make_wine_prefix() {
   local prefix drive
@@ -187,12 +187,12 @@ make_wine_prefix() {
     ln -sfn "$talutil_build" "$drive/build"
     ln -sfn "$drive" "$prefix/dosdevices/z:"
   fi
-  # The tests' screen has no window manager, whose answers windows would wait two seconds for.
+  # There is no window manager on the tests' screen, and windows would wait two seconds for its answers.
   wine reg.exe add 'HKCU\Software\Wine\X11 Driver' /v Managed /d N /f >/dev/null 2>&1 || true  # Slower, no worse.
   touch "$prefix/made"
 }
 
-# Makes what is missing and keeps the Wine server for a minute after the last program, so that a script host starts in
+# Creates what is missing and keeps the Wine server for a minute after the last program, so that a script host starts in
 # a fraction of a second.
 start_wine() {
   [ $wine_bits = 64 ] || make_wine_root
@@ -200,6 +200,6 @@ start_wine() {
   wine_server -p60
 }
 
-# Where the cross builds find the platform's own type library.
+# Where the cross builds find the platform's standard type library.
 export TALUTIL_STDOLE_DIR=$wine_root/usr/lib/i386-linux-gnu/wine/i386-windows
 export TALUTIL_STDOLE64_DIR=/usr/lib/x86_64-linux-gnu/wine/x86_64-windows

@@ -1,8 +1,8 @@
-// Writes examples/data/customers.csv, two thousand customers as they come out of a neglected application:
+// Writes examples/data/customers.csv, two thousand customers as a neglected application would export them:
 //
 //   g++ -std=c++20 tools/make_customers.cpp -o make_customers && ./make_customers > examples/data/customers.csv
 //
-// The bytes are code page 1252 with lines that end in a carriage return and a line feed, the same on every run.
+// Lines end in CR LF, the encoding is code page 1252, and the bytes are the same on every run.
 #include <cstdint>
 #include <cstdio>
 #include <string>
@@ -16,7 +16,7 @@ using Words = std::vector<std::string>;
 
 constexpr int row_count = 2000;
 
-/// A small generator of our own, so that the file is the same wherever it is made.
+/// A small generator of our own, so that the file is the same on every machine.
 class Chance {
  public:
   int below(int limit) {
@@ -55,7 +55,7 @@ const Words tags{"regular",  "trade",     "owes money", "VIP",       "do not cal
 
 const std::string line_break = "\r\n";
 
-/// As clerks type: now and then all capitals, now and then none.
+/// As clerks type: sometimes in capitals, sometimes without any.
 std::string in_typed_case(Chance& chance, std::string text) {
   const int habit = chance.below(5);
   if (habit > 1) return text;
@@ -70,7 +70,7 @@ std::string in_typed_case(Chance& chance, std::string text) {
   return text;
 }
 
-/// Joins lines picked at random.
+/// Joins randomly chosen lines.
 std::string lines(Chance& chance, const Words& words, int count) {
   std::string result;
   for (int i = 0; i < count; ++i) result += (i > 0 ? line_break : "") + chance.pick(words);
@@ -92,7 +92,7 @@ std::string name(Chance& chance) {
   }
 }
 
-/// Two lines and more, some of them for the office only ($*$).
+/// Two or more lines, some of them for the office only ($*$).
 std::string address(Chance& chance, const std::string& suburb) {
   std::string result = lines(chance, places, chance.below(4)) + (chance.one_in(2) ? line_break : "");
   if (chance.one_in(5)) result += "$*$ moved in " + std::to_string(1990 + chance.below(20)) + line_break;
@@ -123,7 +123,7 @@ std::string notes(Chance& chance) {
   return result;
 }
 
-/// A comma list; a third of them lack the comma that should close it.
+/// A comma-separated list; in a third of them the closing comma is missing.
 std::string tag_list(Chance& chance) {
   std::string result;
   for (int count = chance.below(4); count > 0; --count) result += chance.pick(tags) + ",";
@@ -131,7 +131,7 @@ std::string tag_list(Chance& chance) {
   return result;
 }
 
-/// In quotes where the text needs them, and now and then where it does not.
+/// Quoted if the text requires it, and sometimes if it does not.
 std::string field(Chance& chance, const std::string& text) {
   if (text.find_first_of(",\"\r\n") == std::string::npos && !chance.one_in(10)) return text;
   std::string result = "\"";
@@ -146,7 +146,7 @@ std::string row(Chance& chance, int id) {
                phone(chance),           amount(chance),
                quantity(chance),        notes(chance),
                tag_list(chance)};
-  // What an old record reader left behind the end of a name.
+  // Remains of an old record reader after the end of a name.
   if (chance.one_in(25)) fields[1] += "\0\0old"s;
   if (chance.one_in(40)) fields[3] += "\0"s;
   std::string result;

@@ -1,11 +1,11 @@
-// Mends the type library that the interface compiler wrote, in place:
+// Patches, in place, the type library that the IDL compiler has written:
 //
-// - a text parameter with a default was declared by value, because the compiler refuses a default on one
-//   passed by reference; here it becomes `[in, out, optional, defaultvalue(...)] BSTR*`, as it is published;
-// - the record GUID was given another name, because the compiler takes that one for the platform's own;
-// - the time of the build is taken out, so that the same sources give the same library to the byte.
+// - a text parameter with a default was declared by value, because the compiler rejects a default on one
+//   passed by reference; here it becomes `[in, out, optional, defaultvalue(...)] BSTR*`, as published;
+// - the record GUID had another name, because the compiler takes that one for the platform's own record;
+// - the time of the build is removed, so that the same sources always result in exactly the same library.
 //
-// The file is in the MSFT format: a header, an offset for each type, and a directory of segments.
+// The file is in the MSFT format: a header, an offset per type, and a directory of segments.
 #include <algorithm>
 #include <cstdint>
 #include <cstdio>
@@ -60,7 +60,7 @@ class TypeLibrary {
     return {word(entry), word(entry + 4)};
   }
 
-  /// Returns how many parameters were turned into references.
+  /// Returns the number of parameters turned into references.
   int pass_default_texts_by_reference() {
     const std::uint32_t reference = text_reference();
     int mended = 0;
@@ -73,7 +73,7 @@ class TypeLibrary {
     return mended;
   }
 
-  /// The stand-in has the hash of the name it stands for, so the name alone is written over.
+  /// The stand-in has the same hash as the real name, so only the name has to be overwritten.
   void name_guid_record() {
     const auto [offset, size] = segment(name_segment);
     const std::string_view stand_in = talutil::guid_stand_in;
@@ -100,7 +100,7 @@ class TypeLibrary {
   [[nodiscard]] const std::string& bytes() const noexcept { return bytes_; }
 
  private:
-  /// The offset, within the type descriptions, of the pointer to a text; that is how parameters refer to it.
+  /// The offset, within the type descriptions, of the pointer to a text; parameters refer to it by this offset.
   [[nodiscard]] std::uint32_t text_reference() const {
     const auto [offset, size] = segment(type_description_segment);
     for (std::size_t at = 0; at + 8 <= size; at += 8) {

@@ -1,6 +1,6 @@
-// Writes what the Windows build makes from the interface tables: "idl" and "header" the interface
-// definition as the compiler wants it for the type library and for the header, "manifest" the manifest for use without
-// registration. Built for the machine that builds, also when the library itself is built for Windows.
+// Writes what the Windows build needs from the interface tables: "idl" and "header" print the interface definition as
+// the IDL compiler needs it for the type library and for the header, "manifest" prints the manifest for use without
+// registration. Built for the build machine, even when the library itself is built for Windows.
 #include <cstdio>
 #include <string>
 #include <string_view>
@@ -13,14 +13,15 @@ namespace {
 
 using namespace talutil;
 
-/// Without a threading model: objects live in the program's first apartment, and calls from others go there.
+/// Without a threading model: objects live in the program's first apartment, and calls from others are marshalled
+/// there.
 std::string class_entry(const identity::Class& entry) {
   return "    <comClass clsid=\"{" + std::string(entry.identifier) + "}\" progid=\"" + std::string(entry.program_id) +
          "\" tlbid=\"{" + std::string(identity::type_library) + "}\"/>\n";
 }
 
-/// How calls of an interface go to another apartment: by the platform's marshaller for type libraries, whose class
-/// identifier is a constant of the platform (PSOAInterface).
+/// How calls of an interface are marshalled to another apartment: by the platform's marshaller for type libraries,
+/// whose class identifier is a platform constant (PSOAInterface).
 std::string interface_entry(std::string_view name, std::string_view identifier) {
   return "  <comInterfaceExternalProxyStub name=\"" + std::string(name) + "\" iid=\"{" + std::string(identifier) +
          "}\" proxyStubClsid32=\"{00020424-0000-0000-C000-000000000046}\" numMethods=\"7\" tlbid=\"{" +
