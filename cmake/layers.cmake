@@ -1,9 +1,9 @@
-# The layers of the code. Each is a folder of src with a target of its own, which sees the headers of the layers below it
-# and no others: an include root holds one folder alone, so that an include against the arrows does not compile.
+# The layers of the code. Each is a folder of src with its own target, which only sees the headers of the layers below
+# it: an include root contains a single folder, so that an include in the wrong direction does not compile.
 #
 #   talutil_layer(NAME [FOLDER folder] BELOW layer... [LIBRARIES library...])
 #
-# The folder has the layer's name unless it says otherwise; libraries are seen by this layer alone.
+# The folder has the layer's name by default; the libraries are visible to this layer only.
 function(talutil_layer name)
   cmake_parse_arguments(PARSE_ARGV 1 layer "" "FOLDER" "BELOW;LIBRARIES")
   if(NOT layer_FOLDER)
@@ -24,8 +24,8 @@ function(talutil_layer name)
   target_link_libraries(layer_${name} PUBLIC talutil_options ${layer_BELOW} PRIVATE ${layer_LIBRARIES})
 endfunction()
 
-# From the bottom to the top: values, the seam to the platform, what stands on it, and the families of members.
-# Where a layer stands on two, neither of these knows the other.
+# From bottom to top: values, the seam to the platform, what is built on that, and the families of members. If a layer
+# is above two others, neither of these knows the other.
 talutil_layer(automation)
 talutil_layer(platform BELOW automation)
 talutil_layer(documents BELOW platform LIBRARIES documents::pdf)

@@ -3,8 +3,8 @@
 #   cmake --preset windows                      # or, without presets:
 #   cmake -S . -B build/windows -G Ninja -DCMAKE_TOOLCHAIN_FILE=cmake/mingw32.cmake
 #
-# Numbers are computed in SSE registers, as on Linux, so that both builds give the same ones; hosts' stacks
-# may be aligned to 4 bytes only, hence -mstackrealign.
+# Numbers are computed in SSE registers, as on Linux, so that both builds have the same results; hosts' stacks may be
+# aligned to only 4 bytes, hence -mstackrealign.
 set(CMAKE_SYSTEM_NAME Windows)
 set(CMAKE_SYSTEM_PROCESSOR i686)
 set(talutil_tool_prefix i686-w64-mingw32)

@@ -1,5 +1,5 @@
-# NOTICES.txt, which every package carries: what the licences of the libraries that are linked in ask to be handed on.
-# The texts come from the sources that were built and from the distribution's packages.
+# Generates NOTICES.txt for every package: the notices that the licences of statically linked libraries require. The
+# texts come from the sources that were built and from the distribution's packages.
 set(notices "")
 function(talutil_notice library file)
   if(NOT EXISTS ${file})

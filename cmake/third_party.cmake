@@ -1,5 +1,5 @@
-# The libraries that tools/third_party.sh builds: archives::zip, archives::deflate and documents::pdf. Configuring looks
-# for them and installs nothing.
+# The libraries that tools/third_party.sh builds: archives::zip, archives::deflate and documents::pdf. Configuring only
+# looks for them; it installs nothing.
 set(flavour native)
 if(WIN32 AND CMAKE_SIZEOF_VOID_P EQUAL 8)
   set(flavour windows64)
@@ -15,7 +15,7 @@ if(NOT EXISTS ${third_party}/lib)
                       "\"tools/third_party.sh ${flavour}\" once, which installs what it needs and builds them")
 endif()
 set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS tools/third_party.sh)
-# The DLL brings no other with it.
+# The DLL does not depend on any other.
 if(WIN32)
   set(ZLIB_USE_STATIC_LIBS ON)
 endif()
@@ -32,7 +32,7 @@ talutil_import(documents::pdf libhpdf.a)
 target_link_libraries(archives::zip INTERFACE ZLIB::ZLIB)
 target_link_libraries(documents::pdf INTERFACE ZLIB::ZLIB)
 if(WIN32)
-  # As the library was built: 64-bit times.
+  # As in the library's own build: 64-bit times.
   target_compile_definitions(archives::zip INTERFACE __MINGW_USE_VC2005_COMPAT)
 else()
   target_link_libraries(archives::zip INTERFACE OpenSSL::Crypto)

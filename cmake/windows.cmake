@@ -1,13 +1,13 @@
-# The Windows side: the platform, the type library made from the interface table, and TALUtil.dll.
+# The Windows side: the platform, the type library generated from the interface table, and TALUtil.dll.
 add_compile_definitions(UNICODE _UNICODE WINVER=0x0601 _WIN32_WINNT=0x0601)
 
 talutil_layer(win32 FOLDER platform/win32 BELOW platform)
 add_library(talutil_platform STATIC)
-# The system's cryptography is loaded at its first use: most hosts never need it, and it is slow to load.
+# The system's cryptography is loaded on first use: most hosts never need it, and it is slow to load.
 if(CMAKE_SIZEOF_VOID_P EQUAL 8)
   set(idl_flags -m64 --win64)
   set(manifest_kind manifest64)
-  # Without the bytes of the arguments, which 64-bit names do not have.
+  # Without the sizes of the arguments, which 64-bit names do not have.
   file(STRINGS cmake/bcrypt.def bcrypt_lines REGEX "^[A-Z]")
   list(TRANSFORM bcrypt_lines REPLACE "@[0-9]+$" "")
   list(JOIN bcrypt_lines "\n" bcrypt_text)
@@ -27,8 +27,8 @@ add_custom_target(delayed_imports DEPENDS ${delayed_bcrypt})
 add_dependencies(talutil_platform delayed_imports)
 target_link_libraries(talutil_platform PUBLIC talutil_core layer_win32 PRIVATE ${delayed_bcrypt} delayimp)
 
-# The type library: the table is printed as IDL by a program of the building machine, compiled, and mended.
-# It refers to the platform's stdole2.tlb, which the compiler looks for in the folder below.
+# The type library: a program on the build machine prints the table as IDL, which is then compiled and patched. It
+# refers to the platform's stdole2.tlb, which the IDL compiler looks for in the folder below.
 set(TALUTIL_STDOLE_DIR "" CACHE PATH "The folder with stdole2.tlb (the Wine root has one)")
 if(NOT EXISTS "${TALUTIL_STDOLE_DIR}/stdole2.tlb")
   message(FATAL_ERROR "TALUTIL_STDOLE_DIR (\"${TALUTIL_STDOLE_DIR}\") has no stdole2.tlb: source tools/environment.sh "
@@ -60,7 +60,7 @@ add_custom_command(
   COMMAND ${generated}/mend_typelib ${generated}/TALUtil.tlb
   COMMAND ${idl_compiler} ${idl_flags} -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
           -h -o ${generated}/TALUtil.h ${generated}/TALUtil-header.idl
-  # Clients have the platform's headers in place of the base types.
+  # Clients use the platform's headers instead of our base types.
   COMMAND sed -i /base.h/d ${generated}/TALUtil.h
   DEPENDS ${generated}/write_idl ${generated}/mend_typelib tools/base.idl
   COMMENT "Making the type library")
@@ -72,17 +72,17 @@ talutil_layer(com BELOW startup win32)
 add_library(TALUtil SHARED src/com/talutil.def ${generated}/talutil.rc ${generated}/TALUtil.h)
 set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
 target_link_libraries(TALUtil PRIVATE layer_com talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)
-# Sections on page boundaries are mapped; others are read and copied, which is most of the time that loading takes.
+# Page-aligned sections are mapped; others are read and copied, which takes most of the loading time.
 target_link_options(TALUtil PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup -Wl,--file-alignment=4096)
 
-# For our own clients of the DLL: headers alone, none of its code.
+# For our own clients of the DLL: headers only, no code.
 add_library(client_headers INTERFACE)
 foreach(layer com win32 automation platform library)
   target_include_directories(client_headers INTERFACE $<TARGET_PROPERTY:layer_${layer},INTERFACE_INCLUDE_DIRECTORIES>)
 endforeach()
 target_link_libraries(client_headers INTERFACE talutil_options)
 
-# In a folder of its own: the library finds it where a package puts it, beside the program or beside TALUtil.dll.
+# In a separate folder: the library is to find it where a package would put it, beside the program or TALUtil.dll.
 add_library(printhelper SHARED src/printhelper/printhelper.cpp src/printhelper/printhelper.def
             src/platform/win32/exception_frames.cpp)
 target_include_directories(printhelper PRIVATE src)
