@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# Archives against zip and unzip: bench/archives.sh PATH_TO_TALUTIL [large]
-# Packs and unpacks 200 MB of mixed files of this machine, each way three times in turn, and prints the ratios of the
-# best times, the sizes and the peak memory. With "large" also 70,000 files, and one of 5 GB.
+# Compares archives with zip and unzip: bench/archives.sh PATH_TO_TALUTIL [large]
+# Packs and unpacks 200 MB of mixed files from this machine, three times each, alternating, and prints the ratios of the
+# best times, the sizes and the peak memory. With "large", also does so for 70,000 files and for one of 5 GB.
 set -euo pipefail
 [ -x "${1:-}" ] || { echo "usage: bench/archives.sh PATH_TO_TALUTIL [large]" >&2; exit 2; }
 talutil=$(realpath "$1")
@@ -9,7 +9,7 @@ work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
 cd "$work"
 
-# Programs, texts and data; no two names that differ only by case, which a Windows folder cannot hold.
+# Programs, texts and data, without names that differ only in case, which a Windows folder cannot contain.
 make_tree() {
   find /usr/bin /usr/lib/gcc /usr/lib/python3 /usr/lib/python3.11 /usr/share -type f -size +0 -size -30M -printf '%s %p\n' |
     LC_ALL=C sort -k2 | awk '{ key = tolower($2) } !(key in seen) && NF == 2 { seen[key]; print }' |
@@ -18,7 +18,7 @@ make_tree() {
   tar -cf - -T list 2>/dev/null | tar -xf - -C tree
 }
 
-# Seconds and peak kilobytes of a command.
+# Runs a command; prints its seconds and peak kilobytes.
 measure() { /usr/bin/env python3 - "$@" <<'P'
 import os, resource, subprocess, sys, time
 begin = time.monotonic()
@@ -60,7 +60,7 @@ printf '70,000 files: packed in %s (seconds, KB)' "$(measure "$talutil" zip many
 printf ', tested in %s\n' "$(measure "$talutil" zip --test many.zip)"
 unzip -tq many.zip
 
-# Half of it compresses; nothing repeats over the window.
+# Half of it is compressible; nothing repeats within the window.
 python3 - <<'P'
 import os
 block = os.urandom(1 << 19) + b"0123456789abcdef" * (1 << 15)

@@ -3,7 +3,7 @@
 
 #include <limits>
 
-// Figures mean little without what they were measured with; the machine is told by the library itself.
+// Results mean little without the machine they were measured on; the benchmark library reports that itself.
 int main(int argc, char** argv) {
   benchmark::AddCustomContext("compiler", __VERSION__);
 #ifdef __OPTIMIZE__
@@ -11,8 +11,8 @@ int main(int argc, char** argv) {
 #else
   benchmark::AddCustomContext("optimised", "NO: build with CMAKE_BUILD_TYPE=Release");
 #endif
-  // Large blocks would go back to the system after every round, and its fresh pages cost more than the work that
-  // is to be measured, on virtual machines several times more.
+  // Otherwise large blocks would be returned to the system after every round, and fresh pages cost more than the work
+  // to be measured, several times more on virtual machines.
   mallopt(M_MMAP_MAX, 0);
   mallopt(M_TRIM_THRESHOLD, std::numeric_limits<int>::max());
   benchmark::AddCustomContext("memory", "kept between rounds");

@@ -35,7 +35,7 @@ BENCHMARK_CAPTURE(member, WeekYearToDate, [](ORVUtils& utils) {
   return utils.WeekYearToDate(week, 2009, 1);
 });
 
-/// Two hundred years against one day, call for call in turn; "ratio" is the first divided by the second.
+/// Compares two hundred years with one day, alternating calls; "ratio" is the first divided by the second.
 template <class Call>
 void long_and_short_period(benchmark::State& state, Call call) {
   using Clock = std::chrono::steady_clock;

@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# Reports against other programs that make PDF: bench/documents.sh PATH_TO_TALUTIL
-# A table of 10,000 rows against LibreOffice, where it is installed, and a text of 100,000 lines against enscript and
-# ps2pdf; then what more pages cost. The ratios are of the best of three times, taken in turn.
+# Compares reports with other programs that create PDF: bench/documents.sh PATH_TO_TALUTIL
+# Compares a table of 10,000 rows with LibreOffice, if that is installed, and a text of 100,000 lines with enscript and
+# ps2pdf; then measures the cost of more pages. The ratios are of the best of three times, alternating.
 set -euo pipefail
 [ -x "${1:-}" ] || { echo "usage: bench/documents.sh PATH_TO_TALUTIL" >&2; exit 2; }
 talutil=$(realpath "$1")
@@ -9,7 +9,7 @@ work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
 cd "$work"
 
-# Seconds and peak kilobytes of a command.
+# Runs a command; prints its seconds and peak kilobytes.
 measure() { /usr/bin/env python3 - "$@" <<'P'
 import resource, subprocess, sys, time
 begin = time.monotonic()

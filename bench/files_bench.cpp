@@ -20,7 +20,7 @@
 namespace talutil {
 namespace {
 
-/// A toolkit on the real files.
+/// A toolkit that uses real files.
 struct Toolkit {
   testing::FakePlatform platform;
   posix::PosixFiles files;
@@ -31,7 +31,7 @@ struct Toolkit {
   ORVUtils utils{library};
 };
 
-/// A folder that goes with the program, and in it a text file of 60 MB with lines of 20 to 100 characters.
+/// A folder that is removed with the program, containing a text file of 60 MB with lines of 20 to 100 characters.
 struct Scratch {
   std::string folder = [] {
     std::string pattern = (std::filesystem::temp_directory_path() / "talutil-bench-XXXXXX").string();
@@ -68,21 +68,21 @@ void report_bytes(benchmark::State& state) {
                           static_cast<std::int64_t>(std::filesystem::file_size(scratch().text_file)));
 }
 
-/// The yardstick: the bytes of the file and no more.
+/// The baseline: just reads the bytes of the file.
 std::string read_bytes(const std::string& path) {
   std::string bytes(std::filesystem::file_size(path), '\0');
   std::ifstream(path, std::ios::binary).read(bytes.data(), static_cast<std::streamsize>(bytes.size()));
   return bytes;
 }
 
-// ---- once, in a fresh process: what a host waits for, and its peak memory
+// ---- once, in a fresh process: the time a host waits, and the peak memory
 
 struct Cost {
   double megabytes = 0;
   double milliseconds = 0;
 };
 
-/// The time of some work, without that of starting, and what its process had at most.
+/// The time of some work, without starting the process, and the peak memory of its process.
 Cost cost_of(const std::function<void()>& work) {
   int ends[2];
   if (pipe(ends) != 0) return {};
@@ -192,7 +192,7 @@ FILE_BENCHMARK(load_text_box);
 
 // ---- the event log: 8 processes of 10,000 lines each, half of them killed at a random moment
 
-/// Appends and says so: the number of each line that was acknowledged goes to a pipe.
+/// Appends lines and reports each acknowledged line's number through a pipe.
 [[noreturn]] void log_events(std::int32_t process, int acknowledgements) {
   Toolkit toolkit;
   SharedSettings& settings = toolkit.library.settings();
@@ -240,7 +240,7 @@ void event_log_of_eight(benchmark::State& state) {
       acknowledged += process.acknowledged;
     }
 
-    // Every line whole, each process's in its order, and none missing that was acknowledged.
+    // Every line must be whole, each process's lines in order, and no acknowledged line missing.
     std::int64_t torn = 0;
     std::vector<std::int32_t> next(processes, 0);
     std::ifstream file(log, std::ios::binary);

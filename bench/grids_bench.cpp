@@ -1,5 +1,5 @@
-// Grids: what a loop over the rows of a host's grid costs beside the uses of the grid themselves, and the memory of
-// ours.
+// Grids: the cost of a loop over the rows of a host's grid in addition to the calls of the grid themselves, and the
+// memory that our grid takes.
 #include <benchmark/benchmark.h>
 #include <malloc.h>
 
@@ -10,7 +10,7 @@ namespace talutil {
 
 namespace {
 
-/// A grid that answers at once: every cell has the same text.
+/// A grid that responds at once: every cell has the same text.
 class QuickGrid final : public Object {
  public:
   static constexpr std::int32_t rows = 10000;

@@ -6,7 +6,7 @@
 namespace talutil {
 namespace {
 
-// The first text of a process waits for its key.
+// The first text of a process has to wait for its key.
 void first_encryption(benchmark::State& state) {
   for (auto _ : state) {
     Toolkit toolkit;
@@ -36,7 +36,7 @@ void decrypt(benchmark::State& state) {
 }
 BENCHMARK(decrypt)->Apply(sizes);
 
-// One line of names, which must take no longer a letter than a short one.
+// One line of names, which must not take longer per letter than a short one.
 void name_case_grows(benchmark::State& state) {
   Text text;
   while (text.size() < static_cast<std::size_t>(state.range(0))) text += u"LUDWIG VAN O\u00B4MCDONALD-SMITH'S 3RD NSW ";

@@ -13,7 +13,7 @@
 namespace talutil {
 namespace {
 
-/// A store in a folder that goes with the program.
+/// A store in a folder that is removed with the program.
 struct Scratch {
   std::string folder = [] {
     std::string pattern = std::filesystem::temp_directory_path() / "talutil-bench-XXXXXX";
@@ -54,7 +54,7 @@ BENCHMARK(store_reads)->UseRealTime();
 
 // ---- 8 processes of 1,000 writes each, half of them killed at a random moment
 
-/// Writes and says so: the number of each acknowledged write goes to a pipe.
+/// Writes settings and reports each acknowledged write's number through a pipe.
 [[noreturn]] void write_settings(const std::string& path, std::int32_t process, int acknowledgements) {
   posix::Hive hive(path);
   posix::PosixSettingsStore store(hive);

@@ -13,8 +13,8 @@ namespace {
 constexpr std::int64_t kilobyte = 1024;
 constexpr std::int64_t megabyte = 1024 * kilobyte;
 
-/// Words of the given letters with blanks, line breaks and commas between them, and one special character in
-/// fifty: text as users type and paste it. No blanks stand at the ends, since those would be trimmed.
+/// Words of the given letters with blanks, line breaks and commas in between, and one special character in fifty: text
+/// as users type and paste it. No blanks at the ends, because those would be trimmed.
 Text dirty_text(std::size_t bytes, TextView letters) {
   constexpr TextView specials = u"&\"'\t#><?";
   std::mt19937 random(42);
@@ -51,7 +51,7 @@ Text dirty_text(std::int64_t bytes, Letters letters) {
   return dirty_text(static_cast<std::size_t>(bytes), choices[static_cast<std::size_t>(letters)]);
 }
 
-/// Two flat buffers, each large enough for a text after the replacements.
+/// Two flat buffers, each large enough for a text after all replacements.
 struct FlatBuffers {
   explicit FlatBuffers(std::size_t length)
       : first(std::make_unique<char16_t[]>(3 * length)), second(std::make_unique<char16_t[]>(3 * length)) {}
@@ -59,8 +59,8 @@ struct FlatBuffers {
   std::unique_ptr<char16_t[]> second;
 };
 
-/// The yardstick: the eight replacements as a plain loop over a flat copy, in buffers that are there already.
-/// `code_of` says what is compared.
+/// The baseline: the eight replacements as a plain loop over a flat copy, in existing buffers. `code_of` determines
+/// what is compared.
 template <class CodeOf>
 TextView eight_plain_passes(const Text& text, FlatBuffers& buffers, CodeOf code_of) {
   const struct {
@@ -99,12 +99,13 @@ void measure_yardstick(benchmark::State& state, CodeOf code_of) {
   report(state, state.range(0));
 }
 
-/// Compares code units: the same for plain and accented letters, but other letters stay where they should go.
+/// Compares code units: the same for plain and accented letters, but does not remove other letters that should be
+/// removed.
 void eight_passes(benchmark::State& state) {
   measure_yardstick(state, [](char16_t unit) { return unit; });
 }
 
-/// Compares ANSI codes, as the members do, by a table of them all: the same result for all letters.
+/// Compares ANSI codes, as the members do, using a table of all codes: the same result for all letters.
 void eight_passes_by_code(benchmark::State& state) {
   std::vector<std::uint8_t> codes;
   for (std::uint32_t unit = 0; unit <= 0xFFFF; ++unit) codes.push_back(ansi_code(static_cast<char16_t>(unit)));
@@ -125,8 +126,7 @@ void verify_text_data(benchmark::State& state) {
   report(state, state.range(0));
 }
 
-// A field of 64 bytes, and the megabyte whose times are to be divided by one another: for plain, accented and
-// other letters.
+// A field of 64 bytes, and a megabyte, whose times are to be compared; for plain, accented and other letters.
 void sizes_and_letters(benchmark::internal::Benchmark* bench) {
   bench->ArgNames({"bytes", "letters"})->ArgsProduct({{64, megabyte}, {0, 1, 2}});
 }
@@ -134,7 +134,7 @@ BENCHMARK(eight_passes)->Apply(sizes_and_letters);
 BENCHMARK(eight_passes_by_code)->Apply(sizes_and_letters);
 BENCHMARK(verify_text_data)->Apply(sizes_and_letters);
 
-/// One member on texts of growing size; the last lines of its table tell whether its time grows in step.
+/// Runs one member on texts of growing size; the last lines of its table show whether its time grows in proportion.
 template <class Call>
 void grow(benchmark::State& state, Letters letters, Call call) {
   Toolkit toolkit;
@@ -167,7 +167,7 @@ BENCHMARK_CAPTURE(grow, StringReplaceWord, Letters::plain, [](ORVUtils& utils, c
   return utils.StringReplaceWord(text, u"\r\n", u" ");
 })->Apply(growing_sizes);
 
-// A word of half the text's length that nearly occurs at every position.
+// A word half as long as the text that almost occurs at every position.
 BENCHMARK_CAPTURE(grow, StringReplaceWord_repetitive, Letters::plain, [](ORVUtils& utils, const Text& text) {
   const Text run(text.size(), u'a');
   return utils.StringReplaceWord(run, run.substr(0, run.size() / 2) + u"b", u"");

@@ -6,7 +6,7 @@
 
 namespace talutil {
 
-/// A toolkit without a machine, so that members alone are measured.
+/// A toolkit on a fake platform, so that only the members are measured.
 struct Toolkit {
   testing::FakePlatform platform;
   Library library{platform.platform()};

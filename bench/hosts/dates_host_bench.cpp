@@ -1,4 +1,4 @@
-// Times the reading and formatting of dates against the platform's own functions, in turn in one process.
+// Compares reading and formatting dates with the platform's functions, alternating in one process.
 #include <array>
 #include <cstdio>
 #include <cstdlib>
@@ -26,7 +26,7 @@ double time_of(Call call) {
   return now_in_microseconds() - start;
 }
 
-/// The median of the ratios of both, taken in turn.
+/// The median of the ratios of the two, measured alternately.
 template <class Ours, class Platforms>
 void compare(const char* what, std::size_t items, Ours ours, Platforms platforms) {
   std::vector<double> our_times;

@@ -1,5 +1,5 @@
-// Times what a client waits for: loading the library, making an object and letting go of both, against one of the
-// platform's own objects; and a call bound early.
+// Measures what a client waits for: loading the library, creating an object and releasing both, compared with one of
+// the platform's objects; and an early-bound call.
 #include <cstdio>
 
 #include "table_object.hpp"
@@ -14,7 +14,7 @@ Function function_of(HMODULE module, const char* name) {
   return reinterpret_cast<Function>(reinterpret_cast<void*>(GetProcAddress(module, name)));
 }
 
-/// From nothing loaded to an object that is released, by the steps that the system takes for a client.
+/// From an unloaded library to a released object, in the steps that the system performs for a client.
 double first_life_of_object(const CLSID& class_id, const wchar_t* path) {
   const double start = now_in_microseconds();
   const HMODULE module = LoadLibraryW(path);
@@ -38,7 +38,7 @@ CLSID class_of(const wchar_t* program_id) {
 constexpr const wchar_t* ours_word = L"ours";
 constexpr const wchar_t* theirs_word = L"theirs";
 
-/// One such life in a process of its own, in microseconds: the library stays in a process that has used it.
+/// One such sequence in a separate process, in microseconds, because the library stays in a process that has used it.
 double life_in_own_process(const std::wstring& folder, const wchar_t* whose) {
   std::array<wchar_t, MAX_PATH> program{};
   GetModuleFileNameW(nullptr, program.data(), static_cast<DWORD>(program.size()));
@@ -57,7 +57,7 @@ double life_in_own_process(const std::wstring& folder, const wchar_t* whose) {
   return microseconds;
 }
 
-/// What such a process does: its exit code is the time.
+/// Runs in that process: the exit code is the time.
 int measure_life(const std::wstring& folder, const std::wstring& whose) {
   const std::wstring library = folder + L"\\TALUtil.dll";
   return static_cast<int>(whose == ours_word
@@ -94,7 +94,7 @@ void time_ciphers(_ORVUtils* u) {
   time("CryptoDecryptString", [&] { u->CryptoDecryptString(cipher, Text()); });
 }
 
-/// A use of a member with nothing around it: what any late-bound client pays.
+/// A bare use of a member: what any late-bound client pays.
 void bare_use(IDispatch* object, DISPID member, WORD flags, VARIANT* last_first, UINT count, VARIANT* result) {
   DISPID named = DISPID_PROPERTYPUT;
   const bool is_put = flags == DISPATCH_PROPERTYPUT;
@@ -118,7 +118,7 @@ void tick_bare(TableObject& table) {
   }
 }
 
-/// The reads of an export, and its text written in one piece.
+/// The reads of an export, and its text written at once.
 void export_bare(TableObject& table, const std::wstring& path) {
   std::string text;
   for (LONG r = 0; r < table.rows(); ++r) {
@@ -162,8 +162,8 @@ void compare_with_bare(const char* what, double goal, Ours ours, Bare bare) {
               median(our_times) / 1000, median(bare_times) / 1000, median(ratios), goal);
 }
 
-/// A file dialog in the place of ours, whose user has answered already: exports are timed without a dialog. It is its
-/// own class object.
+/// A file dialog that replaces ours and returns at once, so that exports are timed without a dialog. It is its own
+/// class object.
 class AnsweredDialog final : public IClassFactory {
  public:
   static constexpr CLSID class_id = {0x61C0A9F4, 0x2F0E, 0x4F6D, {0x8A, 0x11, 0x0D, 0x5C, 0x7E, 0x39, 0xB2, 0x48}};
@@ -196,7 +196,7 @@ class AnsweredDialog final : public IClassFactory {
   static constexpr const wchar_t* key = L"Software\\TALUtil\\Controls";
   static constexpr const wchar_t* name = L"MSComDlg.CommonDialog";
 
-  /// Takes every member; what is read is the path.
+  /// Accepts every member; reading returns the path.
   class Dialog final : public NamelessObject {
    public:
     explicit Dialog(std::wstring path) : path_(std::move(path)) {}
@@ -221,7 +221,7 @@ class AnsweredDialog final : public IClassFactory {
   DWORD cookie_ = 0;
 };
 
-/// The grid of a host, which answers at once: all that is measured is the way there and back.
+/// A host's grid that responds at once, so that only the calls themselves are measured.
 void time_grids(_ORVUtils* u, const std::wstring& folder) {
   TableObject table(10000, 20);
   for (LONG r = 0; r < table.rows(); ++r) {
@@ -231,7 +231,7 @@ void time_grids(_ORVUtils* u, const std::wstring& folder) {
   Value grid(&table);
   const std::wstring path = folder + L"\\host_bench.txt";
   const AnsweredDialog dialog(path);
-  u->Terminate();  // So that the components window makes its controls anew.
+  u->Terminate();  // So that the components window creates its controls again.
   compare_with_bare(
       "export of 10,000 x 20 cells", 1.3,
       [&] { require(u->ExportGridData(grid, Short{0}, Number<VARIANT_BOOL>{VARIANT_TRUE}, Text(L"x")), "export"); },

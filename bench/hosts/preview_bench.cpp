@@ -1,4 +1,4 @@
-// Times the preview window: opening it over few and over many pages, drawing a page again, and what is left of it.
+// Times the preview window: opening it with few and with many pages, drawing a page again, and what it leaves behind.
 #include <cstdio>
 
 #include "controls/print_control.hpp"
@@ -7,7 +7,7 @@
 #include "tests/fakes/fake_platform.hpp"
 #include "timing.hpp"
 
-// The platform's macro of that name hides the member.
+// The platform's macro of that name would hide the member.
 #undef StartDoc
 
 using namespace talutil;
@@ -15,7 +15,7 @@ using namespace talutil::hosts;
 
 namespace {
 
-/// Does something with the window once it is shown, and closes it.
+/// Does something with the window once it is visible, and closes it.
 struct Visitor final : PreviewEvents {
   PreviewView* view = nullptr;
   double shown_at = 0;
@@ -32,7 +32,7 @@ struct Visitor final : PreviewEvents {
       RedrawWindow(window, nullptr, nullptr, RDW_INVALIDATE | RDW_UPDATENOW | RDW_ALLCHILDREN);
     }
     redraw_time = now_in_microseconds() - shown_at;
-    // By way of its messages, as a user does.
+    // Through its messages, like a user.
     PostMessageW(window, WM_CLOSE, 0, 0);
   }
   void resized() noexcept override {}
@@ -53,7 +53,7 @@ std::shared_ptr<PrintControl> document_of(const Platform& platform, std::int32_t
   return print;
 }
 
-/// Milliseconds from asking for the window to its first page.
+/// Milliseconds from requesting the window to its first page.
 double open_window(PrintControl& print, Visitor& visitor) {
   win32::Win32FormWindows windows;
   const double start = now_in_microseconds();
@@ -61,7 +61,7 @@ double open_window(PrintControl& print, Visitor& visitor) {
   visitor.view = view.get();
   view->set_window_state(2);
   view->show_modal();
-  // As the loop of a host does between two windows.
+  // As a host's loop would between two windows.
   (void)win32::Win32MessagePump().handle_waiting();
   return (visitor.shown_at - start) / 1000;
 }
@@ -69,7 +69,7 @@ double open_window(PrintControl& print, Visitor& visitor) {
 }  // namespace
 
 int main() {
-  // Without a window manager, windows of the screen's own wait seconds for its answers.
+  // Without a window manager, windows on the real screen would wait seconds for its answers.
   SetThreadDesktop(CreateDesktopW(L"TALUtilBench", nullptr, nullptr, 0, GENERIC_ALL, nullptr));
   testing::FakePlatform platform;
   const auto few = document_of(platform.platform(), 10);

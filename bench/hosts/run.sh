@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# The figures of the Windows side: run.sh [NAME OF THE FOLDER BELOW build]. Needs the windows preset and its targets
-# host_bench, dates_host_bench and preview_bench to be built.
+# Runs the Windows benchmarks: run.sh [NAME OF THE FOLDER BELOW build]. Needs the windows preset, with the targets
+# host_bench, dates_host_bench and preview_bench built.
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 . "$talutil_top/tests/hosts/screen.sh"

@@ -5,7 +5,7 @@
 
 #include "platform/win32/windows.hpp"
 
-/// What the programs that measure under Windows share.
+/// Shared by the programs that measure under Windows.
 namespace talutil::hosts {
 
 inline double now_in_microseconds() {
