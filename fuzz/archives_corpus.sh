@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Makes a corpus for archives_fuzz: fuzz/archives_corpus.sh PATH_TO_TALUTIL FOLDER
-# One small archive of each kind, and each of them cut off at every 64th byte.
+# Creates a corpus for archives_fuzz: fuzz/archives_corpus.sh PATH_TO_TALUTIL FOLDER
+# One small archive of each kind, and each of these cut off at every multiple of 64 bytes.
 set -euo pipefail
 [ $# = 2 ] || { echo "usage: $0 PATH_TO_TALUTIL FOLDER" >&2; exit 2; }
 talutil=$(realpath "$1")

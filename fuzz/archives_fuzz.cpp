@@ -1,6 +1,6 @@
-// What must hold for any archive: archives_fuzz -max_len=4096 -runs=1000000 CORPUS
+// Checks what must hold for any archive: archives_fuzz -max_len=4096 -runs=1000000 CORPUS
 //
-// A corpus that begins with real archives finds more: fuzz/archives_corpus.sh makes one.
+// A corpus that begins with real archives finds more; fuzz/archives_corpus.sh creates one.
 #include "archives/archive_error.hpp"
 #include "archives/entry_names.hpp"
 #include "archives/unpacking.hpp"
@@ -34,7 +34,7 @@ void check(std::string_view bytes) {
     for (std::uint64_t i = 0; i < archive.count(); ++i) {
       if (const auto parts = archives::safe_parts(archive.entry(i).name)) require_safe(*parts);
     }
-    // A little more than deflate can give, so that a run does not take seconds.
+    // Slightly more than deflate can produce, so that a run does not take seconds.
     archives::UnpackingOptions options;
     options.password = u"p";
     options.largest_total = bytes.size() * 1100 + 1'000'000;

@@ -1,4 +1,4 @@
-// What must hold for any name that is brought into another case: case_fuzz -max_len=512 -runs=1000000
+// Checks what must hold for any name converted to another case: case_fuzz -max_len=512 -runs=1000000
 #include <algorithm>
 
 #include "controls/name_case.hpp"
@@ -12,7 +12,7 @@ namespace {
 
 using fuzz::require;
 
-/// The letter whatever its case, the sigma of word ends among them.
+/// The letter regardless of its case, including the final sigma.
 char16_t folded(char16_t unit) { return upper_case(unit == u'\u03C2' ? u'\u03C3' : unit); }
 
 void check(fuzz::Input input) {

@@ -1,4 +1,4 @@
-// What must hold for any cipher text: cipher_fuzz -max_len=512 -runs=1000000
+// Checks what must hold for any cipher text: cipher_fuzz -max_len=512 -runs=1000000
 #include <optional>
 
 #include "automation/run_time_error.hpp"
@@ -12,7 +12,7 @@ namespace {
 
 using fuzz::require;
 
-/// Nothing where it is refused, which must be with the one error there is.
+/// Returns nothing if the text is rejected, which must be with the one possible error.
 std::optional<Text> decrypted(ORVUtils& utils, const Text& cipher) {
   try {
     return utils.CryptoDecryptString(cipher);

@@ -1,4 +1,4 @@
-// What must hold for any text that is read as a date. Build with clang and run:
+// Checks what must hold for any text that is read as a date. Build with clang and run:
 //   dates_fuzz -max_len=40 -runs=10000000
 
 #include <algorithm>
@@ -20,7 +20,7 @@ void require(bool holds, const char* what) {
   std::abort();
 }
 
-/// Most bytes stand for what dates are made of, whole words included, so that many texts are dates.
+/// Maps most bytes to elements of dates, including whole words, so that many texts are dates.
 Text text_of(const std::uint8_t* data, std::size_t size) {
   constexpr TextView pieces[] = {u"0",  u"1",  u"2",   u"3",   u"4",   u"5",    u"9",   u"12", u"31",   u"20", u"1999",
                                  u"/",  u"/",  u"-",   u".",   u",",   u":",    u":",   u" ",  u" ",    u"\t", u"Mar",

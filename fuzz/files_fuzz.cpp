@@ -1,4 +1,4 @@
-// What must hold for any bytes of a text file and any pattern. Build with clang and run:
+// Checks what must hold for any bytes of a text file and any pattern. Build with clang and run:
 //   files_fuzz -max_len=512 -max_total_time=60
 
 #include <cstdint>
@@ -19,7 +19,7 @@ void require(bool holds, const char* what) {
   std::abort();
 }
 
-/// Lines by the plain reading of the rule.
+/// Splits lines by a naive implementation of the rule.
 std::vector<Text> naive_lines(std::string bytes) {
   bytes = bytes.substr(0, bytes.find('\x1A'));
   std::vector<Text> lines;
@@ -32,7 +32,7 @@ std::vector<Text> naive_lines(std::string bytes) {
   return lines;
 }
 
-/// Matching by trying everything, for patterns without the special meanings of dots.
+/// Matches by trying everything, for patterns without the special rules for dots.
 bool naive_match(TextView name, TextView pattern) {
   if (pattern.empty()) return name.empty();
   if (pattern[0] == u'*')

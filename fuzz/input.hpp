@@ -14,8 +14,8 @@ inline void require(bool holds, const char* what) {
   std::abort();
 }
 
-/// Reads choices and texts off the fuzzer's bytes. Half of the letters come from a few common ones, so that words
-/// repeat and the special characters are met; the others are any code unit.
+/// Derives choices and texts from the fuzzer's bytes. Half of the characters come from a few common ones, so that words
+/// repeat and special characters occur; the others are any code unit.
 class Input {
  public:
   Input(const std::uint8_t* data, std::size_t size, TextView common) : at_(data), end_(data + size), common_(common) {}

@@ -1,4 +1,4 @@
-// What must hold for any text, checked against plain references. Build with clang and run:
+// Checks what must hold for any text, compared with naive references. Build with clang and run:
 //   text_fuzz -max_len=512 -max_total_time=60
 
 #include <algorithm>
@@ -40,7 +40,7 @@ void check_verified_text(ORVUtils& utils, const Text& text, std::int16_t width, 
   require(verified.find(u'\0') == Text::npos, "no NUL is left");
   require(width <= 0 || verified.size() <= static_cast<std::size_t>(width), "the width is kept");
   if (extras == 4 || extras == 5) return;
-  // Removing a character can bring a blank to an end, which only a second call trims.
+  // Removing a character can leave a blank at an end, which only a second call trims.
   require(utils.VerifyTextData(width, extras, verified) == trim_blanks(verified), "a second call only trims");
 }
 
@@ -55,7 +55,7 @@ void check_line_handling(ORVUtils& utils, const Text& text) {
 }
 
 void check_line_break_markers(ORVUtils& utils, const Text& text, char16_t marker) {
-  // Only whole line breaks and no marker: what hosts store that way.
+  // Only whole line breaks and no marker, as in texts that hosts store.
   Text lines = naive_replace(naive_replace(text, u'\r', u""), marker, u"");
   lines = naive_replace(lines, u'\n', u"\r\n");
   if (ansi_code(marker) == u'\r' || ansi_code(marker) == u'\n') return;
@@ -97,7 +97,7 @@ void check(fuzz::Input input) {
   check_list(utils, text);
   require(utils.ReverseString(utils.ReverseString(text)) == text, "twice reversed is not reversed");
 
-  // Long texts go other ways than short ones.
+  // Long texts take other code paths than short ones.
   for (std::size_t i = 0, once = text.size(); i < repeats && i < 16; ++i) text.append(text, 0, once);
   require(utils.StringReplaceWord(text, from, to) == naive_replace_word(text, from, to), "StringReplaceWord");
   if (!from.empty()) require(utils.StringReplace(text, from, to) == naive_replace(text, from[0], to), "StringReplace");
