@@ -1,9 +1,9 @@
 #!/usr/bin/env bash
-# Books the jobs of bookings.vbs by the native command and prints the same lines: bookings.sh PATH_TO_TALUTIL JOBS
+# Books the jobs of bookings.vbs with the native command and prints the same lines: bookings.sh PATH_TO_TALUTIL JOBS
 set -euo pipefail
 talutil=$1
 
-# The result of a member, without the arguments that are written back.
+# Prints the result of a member, without the arguments that are written back.
 use() { "$talutil" call "$@" | head -1; }
 
 minutes=0

@@ -1,11 +1,11 @@
-' Books a month of repeating jobs with TALUtil.ORVUtils, all calls bound late: each visit with its week and its
-' duration as stored and as shown, then the totals of the month.
+' Books a month of repeating jobs with TALUtil.ORVUtils, with late-bound calls only: prints each visit with its week
+' and its duration as stored and as shown, then the totals of the month.
 '
 '   cscript //nologo bookings.vbs JOBS
 '
-' A job is a line with its name, first visit, step word, number of steps and decimal hours, parted by commas.
-' bookings.sh prints the same by the native command. The last line printed is "done": without it an error has
-' ended the script.
+' Each job is a line with its name, first visit, step word, number of steps and decimal hours, separated by commas.
+' bookings.sh prints the same with the native command. The last line printed is "done"; if it is missing, an error
+' has ended the script.
 Option Explicit
 
 Dim utils, jobs, minutes
@@ -21,7 +21,7 @@ WScript.Echo "the quarter ends in " & utils.GetMonthsInPeriod("31/3/2009", "30/6
 utils.Terminate
 WScript.Echo "done"
 
-' Prints the visits of a job within its first month and gives their minutes.
+' Prints the visits of a job within its first month and returns their total minutes.
 Function Book(job)
   Dim visit, month, stored, hours
   visit = utils.VerifyNullDate(0, utils.GetData(job, 1, 2))

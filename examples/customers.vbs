@@ -1,10 +1,10 @@
-' Cleans a CSV file field by field with TALUtil.ORVUtils and writes it as SQL inserts, all calls bound late:
+' Cleans a CSV file field by field with TALUtil.ORVUtils and writes it as SQL inserts, with late-bound calls only:
 '
 '   cscript //nologo customers.vbs CSV PLAN OUTPUT [REPORT]
 '
-' The plan is the one of "talutil clean", whose file this script makes to the byte. What is printed also goes
-' to the report file, as a console does not show every character of code page 1252. Beside the output stand a copy
-' of it (.bak) and EventLog.txt, which says what was done. The last line printed is "done": without it an error
+' The plan is the same as for "talutil clean", and so is every byte of the result. The printed lines are also written
+' to the report file, because a console cannot show every character of code page 1252. Next to the output are a copy
+' of it (.bak) and EventLog.txt, a log of what was done. The last line printed is "done"; if it is missing, an error
 ' has ended the script.
 Option Explicit
 
@@ -35,12 +35,12 @@ Sub Main(arguments)
   KeepRecord arguments(0), arguments(2)
 End Sub
 
-' A case style that the user has chosen; name case, which is then kept in the user's settings, until one has.
+' The case style that the user has chosen; until then name case, which is saved in the user's settings.
 Function Choice(name)
   Choice = utils.GetCfgFileData("Cleaning", name, "1", utils.sNatNameD)
 End Function
 
-' Copies the result line by line and notes in the event log beside it what was done.
+' Copies the result line by line and records that in the event log next to it.
 Sub KeepRecord(ByVal csvPath, ByVal sqlPath)
   utils.CopyFileToBackupFile sqlPath, sqlPath & ".bak"
   utils.EventLog = 1
@@ -77,15 +77,15 @@ Function CleanFile(files, csvPath, planPath, sqlPath)
   SayColumns columns, columnCount, changes, firsts
 End Function
 
-' The cleaned fields of a row as SQL values. In here and in ReadRow every statement runs twenty thousand times:
-' engines look variables up by name, so these have few.
+' The cleaned fields of a row as SQL values. Here and in ReadRow every statement runs twenty thousand times; engines
+' look variables up by name, so these functions have few.
 Function CleanRow(row, count, steps, changes, firsts)
   Dim after, i, before, values
   values = "'"
   For i = 0 To count - 1
     before = row(i)
     after = CleanStep(steps(i), before)
-    ' The length first: it is quicker, and some engines compare as if a NUL character were not there.
+    ' Compare the length first: that is faster, and some engines ignore NUL characters in comparisons.
     If Len(after) <> Len(before) Then
       NoteChange changes, firsts, i, before, after
     ElseIf after <> before Then
@@ -97,14 +97,14 @@ Function CleanRow(row, count, steps, changes, firsts)
   CleanRow = Left(values, Len(values) - 3)
 End Function
 
-' Counts the changes of a column and keeps its first one.
+' Counts the changes in a column and keeps the first one.
 Sub NoteChange(changes, firsts, column, before, after)
   If IsEmpty(firsts(column)) Then firsts(column) = Array(before, after)
   changes(column) = changes(column) + 1
 End Sub
 
-' ---- Reading. A file is taken apart at its quotes: parts 0, 2, 4 ... stand outside of quotes, the others
-' inside, and an empty part outside is a doubled quote. "rest" is what is left of the part at hand.
+' ---- Reading. A file is split at its quotes: parts 0, 2, 4 ... are outside of quotes, the others inside, and an
+' empty part outside is a doubled quote. "rest" is what remains of the current part.
 
 Function ReadFile(files, path)
   Dim stream
@@ -113,7 +113,7 @@ Function ReadFile(files, path)
   stream.Close
 End Function
 
-' Fills the row and gives the number of its fields; 0 at the end.
+' Fills the row and returns the number of its fields; 0 at the end.
 Function ReadRow(parts, part, rest, row)
   Dim field, i, count, cells, rowEnd
   ReadRow = 0
@@ -149,8 +149,8 @@ Function ReadRow(parts, part, rest, row)
   ReadRow = count + 1
 End Function
 
-' ---- The plan: for each column a step, an array of words: a member and its arguments, "list" and the step
-' of its elements, or "chain" and the array of steps that "|" joins.
+' ---- The plan: one step per column, as an array of words: a member and its arguments, "list" and the step for its
+' elements, or "chain" and the array of steps joined by "|".
 
 Function ReadPlan(text, columns, columnCount)
   Dim lines, i, column, blank, found(50)
@@ -209,7 +209,7 @@ Function CleanStep(words, value)
   End Select
 End Function
 
-' An open list is closed first: the reader drops what stands after the last comma.
+' Close an open list first, because the reader drops the text after the last comma.
 Function CleanList(words, ByVal value)
   Dim list, count, i
   CleanList = ""
@@ -228,7 +228,7 @@ Function CleanChain(links, ByVal value)
   CleanChain = value
 End Function
 
-' ---- What is written and printed.
+' ---- Writing and printing.
 
 Function InsertOpening(columns, columnCount)
   Dim i
@@ -251,7 +251,7 @@ Sub SayColumns(columns, columnCount, changes, firsts)
   Next
 End Sub
 
-' The start of a text, with its control characters shown.
+' The start of a text, with control characters made visible.
 Function Sample(value)
   Const longest = 34
   Dim i, character

@@ -1,10 +1,10 @@
-' An unattended month-end run with TALUtil.ORVUtils: tables become the three reports that hosts expect, as PDF files,
-' and no window is shown.
+' An unattended month-end run with TALUtil.ORVUtils: turns tables into the three reports that hosts expect, as PDF
+' files, without showing a window.
 '
 '   cscript //nologo month_end.vbs CUSTOMERS BOOKINGS FOLDER
 '
-' The reports are written where hosts look for them, then copied to the folder. The last line printed is "done": without
-' it an error has ended the script.
+' The reports are written where hosts look for them, then copied to the folder. The last line printed is "done"; if it
+' is missing, an error has ended the script.
 Option Explicit
 
 Const commaText = 3

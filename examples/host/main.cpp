@@ -1,5 +1,5 @@
-// A small host of TALUtil: a window with a combo box, a table, a list of what the library answers, a drawing and two
-// controls that can be dragged about. Register TALUtil.dll first (regsvr32), or run beside its manifest.
+// A small host of TALUtil: a window with a combo box, a table, a list of the library's results, a drawing and two
+// controls that can be dragged around. Register TALUtil.dll first (regsvr32), or run the host next to its manifest.
 #include "window_objects.hpp"
 // After windows.h.
 #include <commctrl.h>
@@ -15,7 +15,7 @@ enum Command : int { find_branch = 100, tick_all, tick_none, count_ticks, export
 
 constexpr LONG done_column = 3;
 
-/// A text as an argument of the library, which takes texts by reference.
+/// A text as an argument for the library, which takes texts by reference.
 class Bstr {
  public:
   Bstr(const wchar_t* text) : text_(SysAllocString(text)) {}
@@ -33,7 +33,7 @@ T* by_reference(T&& value) {
   return &value;
 }
 
-/// The table, TALUtil.Grid: late-bound, as a script uses it.
+/// The table, TALUtil.Grid: late-bound, as scripts use it.
 class Table {
  public:
   Table() {
@@ -82,7 +82,7 @@ class Table {
   IDispatch* object_ = nullptr;
 };
 
-/// A control that can be dragged: the library follows the mouse and remembers the place.
+/// A control that can be dragged: the library follows the mouse and remembers the position.
 struct Movable {
   HWND window = nullptr;
   _cControlPosition* position = nullptr;
@@ -188,7 +188,7 @@ class Host {
 
   void show_table() const { SendMessageW(list_, LVM_SETITEMCOUNT, static_cast<WPARAM>(table_.rows() - 1), 0); }
 
-  /// A row for each place that MyDrawText knows, the text short and then too long for its rectangle.
+  /// One row per position that MyDrawText supports, first with a short text, then with one too long for its rectangle.
   void make_drawing() {
     constexpr int width = 370;
     picture_window_ = child(L"Static", L"", SS_OWNERDRAW, 368, 326, width, 160, 0, WS_EX_CLIENTEDGE);
@@ -245,7 +245,7 @@ class Host {
     movables_.push_back(movable);
   }
 
-  /// The mouse over a movable control: its own coordinates, in twips.
+  /// The mouse over a movable control, in the control's own coordinates, in twips.
   static LRESULT CALLBACK drag(HWND window, UINT message, WPARAM what, LPARAM where, UINT_PTR, DWORD_PTR host) {
     Host& self = *reinterpret_cast<Host*>(host);
     const auto x = static_cast<float>(static_cast<short>(LOWORD(where))) * twips_per_pixel();
@@ -317,7 +317,7 @@ class Host {
     InvalidateRect(list_, nullptr, FALSE);
   }
 
-  /// The list view asks for each cell when it paints it.
+  /// The list view asks for each cell when painting it.
   void give_cell(NMLVDISPINFOW& wanted) const {
     static std::wstring text;
     if ((wanted.item.mask & LVIF_TEXT) == 0) return;

@@ -9,21 +9,21 @@
 #include <string>
 #include <vector>
 
-/// An automation object made of functions: the library drives a host's windows through such objects, by name. A member
-/// answers only as what it is, as real controls do: a method when it is called, a property when it is read or put.
+/// An automation object made of functions: the library drives a host's windows through such objects, by name. As with
+/// real controls, a member can only be used as what it is: a method is called, a property is read or set.
 ///
 ///     auto* const form = new Scriptable;
 ///     form->property(L"Width", [=] { return variant(width_of(window)); }, [=](const VARIANT& v) { ... });
 ///     form->method(L"Refresh", {0, 0}, [=](const Scriptable::Arguments&) { UpdateWindow(window); return VARIANT{}; });
 class Scriptable : public IDispatch {
  public:
-  /// The arguments of a use, in the order that they are written.
+  /// The arguments of a call, in the order in which they are written.
   using Arguments = std::vector<VARIANT>;
   using Method = std::function<VARIANT(const Arguments&)>;
   using Getter = std::function<VARIANT()>;
   using Setter = std::function<void(const VARIANT&)>;
 
-  /// How many arguments a method takes.
+  /// The number of arguments that a method takes.
   struct Count {
     std::size_t least;
     std::size_t most;
@@ -34,7 +34,7 @@ class Scriptable : public IDispatch {
   }
 
   /// Any of the functions may be missing. `put` takes a value (`form.Width = 100`), `set` a reference to an object
-  /// (`Set control.Container = form`). A caller may try the one after the other.
+  /// (`Set control.Container = form`). A caller may try one after the other.
   void property(const wchar_t* name, Getter get, Setter put = {}, Setter set = {}) {
     members_.push_back({name, {0, 0}, {}, std::move(get), std::move(put), std::move(set)});
   }
@@ -91,10 +91,10 @@ class Scriptable : public IDispatch {
   };
 
   static HRESULT use(const Member& member, WORD flags, const DISPPARAMS& given, VARIANT* result) {
-    // Callers that are bound late cannot tell a function from a property and ask for a value with both flags.
+    // Late-bound callers cannot tell a function from a property and ask for a value with both flags.
     if ((flags & DISPATCH_METHOD) != 0 && member.call) {
       if (given.cArgs < member.count.least || given.cArgs > member.count.most) return DISP_E_BADPARAMCOUNT;
-      // Automation hands arguments over last first.
+      // Automation passes arguments in reverse order.
       const Arguments arguments(std::reverse_iterator(given.rgvarg + given.cArgs), std::reverse_iterator(given.rgvarg));
       return answer(member.call(arguments), result);
     }
@@ -112,7 +112,7 @@ class Scriptable : public IDispatch {
     return S_OK;
   }
 
-  /// Hands a value over to the caller, who may not want it.
+  /// Passes a value to the caller, who may not want it.
   static HRESULT answer(VARIANT value, VARIANT* result) {
     if (result != nullptr)
       *result = value;
@@ -127,7 +127,7 @@ class Scriptable : public IDispatch {
   ULONG references_ = 1;
 };
 
-/// Values for automation and back.
+/// Conversion of values to and from automation's types.
 inline VARIANT variant(LONG number) {
   VARIANT value{};
   V_VT(&value) = VT_I4;
@@ -152,7 +152,7 @@ inline VARIANT variant(const std::wstring& text) {
   V_BSTR(&value) = SysAllocString(text.c_str());
   return value;
 }
-/// The value gets a reference of its own.
+/// The result holds its own reference to the object.
 inline VARIANT variant(IDispatch* object) {
   VARIANT value{};
   V_VT(&value) = VT_DISPATCH;

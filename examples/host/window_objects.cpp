@@ -22,7 +22,7 @@ void resize(HWND window, int width, int height) {
   SetWindowPos(window, nullptr, 0, 0, width, height, SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE);
 }
 
-/// What a picture box draws on, with what it remembers between two drawings.
+/// What a picture box draws on, and what it remembers between drawings.
 struct Picture {
   HDC context = CreateCompatibleDC(nullptr);
   HBITMAP bitmap = nullptr;
@@ -69,7 +69,7 @@ std::map<HWND, std::shared_ptr<Picture>>& pictures() {
   return all;
 }
 
-/// What can be drawn on has a scale: twips, since this host has no other.
+/// Objects that can be drawn on have a scale: twips, because this host has no other.
 void add_scale(Scriptable& object) {
   object.property(L"ScaleMode", [] { return variant(scale_twips); });
   const auto same = [](const Scriptable::Arguments& arguments) { return variant(number_of(arguments.at(0))); };

@@ -2,7 +2,7 @@
 
 #include "scriptable.hpp"
 
-/// The objects that the library sees of this host's windows. Sizes and places are twips, 1440 an inch.
+/// This host's windows as objects for the library. Sizes and positions are in twips (1/1440 inch).
 
 /// A form: WindowState, Width, Height, ScaleWidth, ScaleHeight, ScaleMode, ScaleX, ScaleY, hwnd, Refresh.
 Scriptable* form_object(HWND window);
@@ -18,5 +18,5 @@ Scriptable* combo_object(HWND window);
 Scriptable* picture_object(HWND window, int width, int height);
 void paint_picture(HWND window, HDC target);
 
-/// A pixel of the screen in twips.
+/// The size of a screen pixel in twips.
 float twips_per_pixel();
