@@ -100,6 +100,7 @@ class FormView {
   virtual void set_tabs(std::uint8_t part, std::span<const TextView> captions) = 0;
 
   /// Shows a table, which must outlive the view unless another table replaces it.
+  /// @param bar_column a column of percentages to be drawn as bars; -1 for none
   virtual void set_table(std::uint8_t part, TableSource& table, std::int32_t bar_column) = 0;
 
   /// Copies a text to the clipboard.

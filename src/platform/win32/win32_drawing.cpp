@@ -39,7 +39,7 @@ void call_helper(const char* function, std::int32_t window) {
 void Win32Drawing::draw_text(std::intptr_t device_context, const PixelRectangle& place, TextView text,
                              std::int32_t colour, bool breaks_words) {
   const auto length = checked_cast<std::int32_t>(text.size());
-  const HDC context = reinterpret_cast<HDC>(device_context);  // NOLINT(performance-no-int-to-ptr): the seam's handles.
+  const HDC context = reinterpret_cast<HDC>(device_context);  // NOLINT(performance-no-int-to-ptr): the seam passes it.
   const COLORREF before = SetTextColor(context, colour_of(colour));
   if (before == CLR_INVALID) raise(ErrorNumber::invalid_procedure_call);
   const int background_before = SetBkMode(context, TRANSPARENT);
@@ -52,7 +52,7 @@ void Win32Drawing::draw_text(std::intptr_t device_context, const PixelRectangle&
 }
 
 WindowImage Win32Drawing::image_of(std::intptr_t window) {
-  const HWND handle = reinterpret_cast<HWND>(window);  // NOLINT(performance-no-int-to-ptr): the seam keeps handles so.
+  const HWND handle = reinterpret_cast<HWND>(window);  // NOLINT(performance-no-int-to-ptr): the seam passes integers.
   RECT place{};
   if (GetWindowRect(handle, &place) == FALSE) raise(ErrorNumber::invalid_procedure_call);
   WindowImage image;

@@ -35,7 +35,7 @@ std::optional<Text> Win32FolderPicker::choose(TextView title, std::intptr_t owne
 
   const std::string caption = to_platform_ansi(title);
   BROWSEINFOA dialog{};
-  dialog.hwndOwner = reinterpret_cast<HWND>(owner);  // NOLINT(performance-no-int-to-ptr): the seam keeps handles so.
+  dialog.hwndOwner = reinterpret_cast<HWND>(owner);  // NOLINT(performance-no-int-to-ptr): the seam passes integers.
   dialog.lpszTitle = caption.c_str();
   const Owned<ItemList> items(browse(&dialog));
   if (!items) return std::nullopt;
