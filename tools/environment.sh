@@ -73,7 +73,7 @@ fetch_emulator() {
   local mirror work
   mirror=$(debian_mirror "$wine_root_suite")
   work=$(mktemp -d)
-  say "this machine runs no 32-bit programs: fetching the emulator (once)"
+  say "this machine cannot run 32-bit programs: fetching the emulator (once)"
   mkdir -p "$work/lists/partial" "$talutil_cache"
   echo "deb [signed-by=/usr/share/keyrings/debian-archive-keyring.gpg] $mirror $emulator_suite main" >"$work/sources"
   local options=(-qq -o "Dir::Etc::sourcelist=$work/sources" -o Dir::Etc::sourceparts=/dev/null
@@ -88,7 +88,7 @@ fetch_emulator() {
 
 ensure_i386() {
   runs_i386 && return 0
-  [ "$(id -u)" = 0 ] || fail "this machine runs no 32-bit programs, and registering the emulator needs root"
+  [ "$(id -u)" = 0 ] || fail "this machine cannot run 32-bit programs, and registering the emulator requires root"
   fetch_emulator
   local registry=/proc/sys/fs/binfmt_misc
   [ -e $registry/register ] || mount -t binfmt_misc binfmt_misc $registry
@@ -102,11 +102,11 @@ ensure_i386() {
 make_wine_root() {
   ensure_i386
   [ ! -d "$wine_root" ] || return 0
-  [ "$(id -u)" = 0 ] || fail "no Wine root in $wine_root yet; making it needs root"
+  [ "$(id -u)" = 0 ] || fail "no Wine root in $wine_root yet; creating it requires root"
   local mirror unfinished=$wine_root.$$
   mirror=$(debian_mirror "$wine_root_suite")
-  [ -n "$mirror" ] || fail "apt knows no mirror for $wine_root_suite; the Wine root cannot be made"
-  say "making the Wine root (once, one to four minutes)"
+  [ -n "$mirror" ] || fail "apt has no mirror for $wine_root_suite; the Wine root cannot be created"
+  say "creating the Wine root (once, one to four minutes)"
   mkdir -p "$talutil_cache"
   debootstrap --arch=i386 --variant=minbase --include="$wine_root_include" \
     "$wine_root_suite" "$unfinished" "$mirror" >"$unfinished.log" 2>&1 ||
@@ -178,7 +178,7 @@ make_wine_prefix() {
   local prefix drive
   prefix=$(wine_prefix)
   [ ! -f "$prefix/made" ] || return 0
-  say "making the $wine_bits-bit Wine prefix (once a build folder)"
+  say "creating the $wine_bits-bit Wine prefix (once per build folder)"
   WINE_TIMEOUT=180 wine wineboot --init >/dev/null 2>&1 || fail "wineboot failed for $prefix"
   wine_server -w
   if [ $wine_bits = 64 ]; then
