@@ -137,9 +137,9 @@ void getline_loop(benchmark::State& state) {
 }
 
 void our_lines(benchmark::State& state) {
-  posix::PosixFiles files;
+  posix::PosixPlatform platform;
   for (auto _ : state) {
-    SequentialInput file(files, scratch().text_path);
+    SequentialInput file(platform.platform(), scratch().text_path);
     Text line;
     while (!file.at_end()) {
       file.read_line(line);

@@ -48,18 +48,15 @@ Text delimited_cell(TextView text, std::size_t& at, char16_t separator) {
 
 }  // namespace
 
-bool TableFile::fits_code_page(TextView text) noexcept {
-  // For a character that the code page lacks, conversion yields the nearest one or a question mark.
-  return is_ascii(text) ||
-         std::ranges::all_of(text, [](char16_t unit) { return chr(ansi_code(unit)).front() == unit; });
-}
-
-TableFile::TableFile(Files& files, const Text& path, bool is_wide)
-    : file_(files.open_output(path)), bytes_(is_wide ? byte_order_mark : std::string_view()), is_wide_(is_wide) {}
+TableFile::TableFile(Files& files, CodePage& code_page, const Text& path, bool is_wide)
+    : code_page_(code_page),
+      file_(files.open_output(path)),
+      bytes_(is_wide ? byte_order_mark : std::string_view()),
+      is_wide_(is_wide) {}
 
 void TableFile::write(TextView text) {
   constexpr std::size_t enough = 65536;
-  bytes_ += is_wide_ ? to_utf8(text) : to_ansi(text);
+  bytes_ += is_wide_ ? to_utf8(text) : code_page_.bytes_of(text);
   if (bytes_.size() >= enough) flush();
 }
 
@@ -73,7 +70,7 @@ void TableFile::flush() {
   bytes_.clear();
 }
 
-Text read_table_file(Files& files, const Text& path) {
+Text read_table_file(Files& files, CodePage& code_page, const Text& path) {
   const auto file = files.open_input(path);
   constexpr std::uint64_t largest = 1U << 30;  // A larger table would not fit into a 32-bit process.
   if (file->size() > largest) raise(ErrorNumber::out_of_memory);
@@ -85,7 +82,8 @@ Text read_table_file(Files& files, const Text& path) {
     size += read;
   }
   const std::string_view content = std::string_view(bytes).substr(0, size);
-  return content.starts_with(byte_order_mark) ? from_utf8(content.substr(byte_order_mark.size())) : from_ansi(content);
+  return content.starts_with(byte_order_mark) ? from_utf8(content.substr(byte_order_mark.size()))
+                                              : code_page.text_of(content);
 }
 
 void append_delimited(Text& line, TextView cell, char16_t separator) {

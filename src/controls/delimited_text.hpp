@@ -5,35 +5,35 @@
 #include <span>
 #include <vector>
 
+#include "platform/code_page.hpp"
 #include "platform/files.hpp"
 
 /// Tables as text: each row is a line that ends with carriage return and line feed.
 namespace talutil {
 
-/// Writes a file in code page 1252, or in UTF-8 with a byte order mark if it is to contain characters that the code
+/// Writes a file in the ANSI code page, or in UTF-8 with a byte order mark if it is to contain characters that the code
 /// page lacks. `close` gives the file its name.
 class TableFile {
  public:
-  /// @param is_wide true if any text of the file fails `fits_code_page`
+  /// @param is_wide true if the code page lacks a character of any text in the file
   ///
   /// Raises the same errors as opening a file.
-  TableFile(Files& files, const Text& path, bool is_wide);
+  TableFile(Files& files, CodePage& code_page, const Text& path, bool is_wide);
 
   void write(TextView text);
   void close();
 
-  [[nodiscard]] static bool fits_code_page(TextView text) noexcept;
-
  private:
   void flush();
 
+  CodePage& code_page_;
   std::unique_ptr<OutputFile> file_;
   std::string bytes_;
   bool is_wide_;
 };
 
 /// The text of such a file. Raises the same errors as opening and reading it.
-[[nodiscard]] Text read_table_file(Files& files, const Text& path);
+[[nodiscard]] Text read_table_file(Files& files, CodePage& code_page, const Text& path);
 
 /// Appends a cell. It is quoted, with its quotes doubled, if it contains a separator, a quote or a line break.
 void append_delimited(Text& line, TextView cell, char16_t separator);

@@ -185,12 +185,12 @@ void Grid::SaveGrid(const Text& file, std::int16_t format_code, Boolean fixed_ce
   for (std::size_t r = first_row; r < rows_.size(); ++r) {
     for (std::size_t c = first_column; c < columns_.size(); ++c) {
       const TextView text = rows_[r].text.cell(c);
-      is_wide = is_wide || !TableFile::fits_code_page(text);
+      is_wide = is_wide || !code_page_.holds(text);
       widths[c] = std::max(widths[c], text.size());
     }
   }
 
-  TableFile output(files_, file, is_wide);
+  TableFile output(files_, code_page_, file, is_wide);
   Text line;
   for (std::size_t r = first_row; r < rows_.size(); ++r) {
     line.clear();
@@ -214,7 +214,7 @@ void Grid::SaveGrid(const Text& file, std::int16_t format_code, Boolean fixed_ce
 
 void Grid::LoadGrid(const Text& file, std::int16_t format_code, Boolean fixed_cells) {
   const Format format = format_of(format_code);
-  const Text text = read_table_file(files_, file);
+  const Text text = read_table_file(files_, code_page_, file);
   const auto rows = format == Format::fixed_text ? read_fixed(text) : read_delimited(text, separator_of(format));
 
   const auto first_row = static_cast<std::size_t>(fixed_cells ? 0 : fixed_rows_);

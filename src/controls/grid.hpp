@@ -54,7 +54,8 @@ class Grid final : public TableObject<Grid>, public TableSource {
   static constexpr std::int32_t most_columns = 32767;
   static constexpr std::int32_t default_width = 1000;  ///< In twips.
 
-  explicit Grid(const Platform& platform) : TableObject(platform), files_(platform.files) {}
+  explicit Grid(const Platform& platform)
+      : TableObject(platform), files_(platform.files), code_page_(platform.code_page) {}
 
   /// The size of the table. Shrinking discards cells; new cells are empty. If fewer rows or columns remain than were
   /// fixed, all of them are fixed. Raise 5 for a negative number and 7 beyond the limits above.
@@ -176,6 +177,7 @@ class Grid final : public TableObject<Grid>, public TableSource {
   void keep_selection_inside() noexcept;
 
   Files& files_;
+  CodePage& code_page_;
   std::vector<TableRow> rows_;
   std::vector<Column> columns_;
   std::int32_t fixed_rows_ = 0;

@@ -41,6 +41,12 @@ class CodePage {
   [[nodiscard]] virtual std::string bytes_of(TextView text) = 0;
   [[nodiscard]] virtual Text text_of(std::string_view bytes) = 0;
 
+  /// Appends the text of some bytes.
+  virtual void append_text(Text& text, std::string_view bytes) { text += text_of(bytes); }
+
+  /// Whether every character of a text is on the page, so that its bytes say the same.
+  [[nodiscard]] bool holds(TextView text) { return is_ascii(text) || text_of(bytes_of(text)) == text; }
+
  private:
   static constexpr std::uint32_t unknown = 0xFFFFFFFF;
 
@@ -56,6 +62,7 @@ class WesternCodePage final : public CodePage {
  public:
   [[nodiscard]] std::string bytes_of(TextView text) override { return to_ansi(text); }
   [[nodiscard]] Text text_of(std::string_view bytes) override { return from_ansi(bytes); }
+  void append_text(Text& text, std::string_view bytes) override { append_ansi(text, bytes); }
 };
 
 }  // namespace talutil

@@ -8,8 +8,8 @@
 
 namespace talutil {
 
-/// The registry through the platform's ANSI functions: names and texts are converted by the code page, and every call
-/// returns a status code of the platform.
+/// The registry. Values go through the platform's ANSI functions: their names and texts are converted by the code page.
+/// Every call returns a status code of the platform.
 class Registry {
  public:
   using Handle = std::uintptr_t;

@@ -6,7 +6,7 @@
 
 namespace talutil {
 
-/// The platform's profile files: sections in brackets, lines of the form item=value, text in code page 1252.
+/// The platform's profile files: sections in brackets, lines of the form item=value, text in the ANSI code page.
 class Profiles {
  public:
   /// The longest value that a read returns: its buffer holds 1024 characters including the NUL.

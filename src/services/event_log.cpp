@@ -9,7 +9,8 @@ void ORVUtils::AppendEventLog(const Text& sEventName, const Text& sEventForm) {
   const Text stamp = format_date(library_.platform().clock.now(), u"DDMMYYYYHHMMSS");
   const Text line = settings().sUserName + u':' + stamp + u':' + sEventName + u':' + sEventForm;
   // This doubles the separator if the folder ends in one, which the file system accepts.
-  library_.platform().files.append(settings().sORVPath + u"\\EventLog.txt", file_line(line));
+  const Platform& platform = library_.platform();
+  platform.files.append(settings().sORVPath + u"\\EventLog.txt", file_line(platform.code_page, line));
 }
 
 }  // namespace talutil

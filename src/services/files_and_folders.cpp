@@ -46,8 +46,10 @@ void for_each_file(Files& files, const Text& path, const Text& pattern, Found fo
 
 bool is_drive_path(TextView path) { return path.find(u':') == 1; }
 
-/// A text as the platform's ANSI functions see it.
-Text as_ansi(const Text& text) { return from_ansi(to_ansi(text)); }
+/// A text with only the characters of the system's ANSI code page, by which these members pass on what they get.
+Text as_ansi(const Platform& platform, const Text& text) {
+  return platform.code_page.text_of(platform.code_page.bytes_of(text));
+}
 
 /// The application's own folder, which contains the fallback folders.
 constexpr TextView program_folder = u"C:\\TAL\\ORV3";
@@ -77,10 +79,12 @@ constexpr FolderStep folder_steps[] = {
     help_files,
 };
 
-void provide_folder(ORVUtils& utils, Files& files, const FolderStep& step) {
+void provide_folder(ORVUtils& utils, const Platform& platform, const FolderStep& step) {
   Text& folder = utils.settings().*step.setting;
   const Text below(step.below);
-  const auto make = [&] { files.make_path(as_ansi(below.empty() ? folder : folder + below + u'\\')); };
+  const auto make = [&] {
+    platform.files.make_path(as_ansi(platform, below.empty() ? folder : folder + below + u'\\'));
+  };
   make();
   if (utils.PathExists(folder + below)) return;
   folder = Text(program_folder).append(step.fall_back);
@@ -141,7 +145,7 @@ Text ORVUtils::ExtractPathName(Text& vSpecIn) {
 
 void ORVUtils::VerifyFilePath(const Text& sPath) {
   try {
-    library_.platform().files.make_path(as_ansi(sPath));
+    library_.platform().files.make_path(as_ansi(library_.platform(), sPath));
   } catch (const RunTimeError& error) {
     library_.platform().message_boxes.show(error.description() + u"   VerifyFilePath : " + sPath, MessageButtons::ok,
                                            {});
@@ -172,17 +176,17 @@ Text ORVUtils::GetFileList(const Text& sDelimiter, const Text& sPath, const Text
 
 Text ORVUtils::BrowseForFolder(const Text& szTitle) {
   const std::intptr_t owner = library_.components().owner_handle();
-  return library_.platform().folder_picker.choose(as_ansi(szTitle), owner).value_or(Text());
+  return library_.platform().folder_picker.choose(as_ansi(library_.platform(), szTitle), owner).value_or(Text());
 }
 
 void ORVUtils::SetupFileFolders() {
   Files& files = library_.platform().files;
   try {
-    for (const FolderStep& step : folder_steps) provide_folder(*this, files, step);
+    for (const FolderStep& step : folder_steps) provide_folder(*this, library_.platform(), step);
     const Text fixed(program_folder);
     files.make_path(fixed + u"\\BinTemp\\");
     files.make_path(fixed + u"\\Data\\Backups\\");
-    files.make_path(as_ansi(settings().sTemplatesDir + u"Letters\\"));
+    files.make_path(as_ansi(library_.platform(), settings().sTemplatesDir + u"Letters\\"));
   } catch (const RunTimeError& error) {
     if (!settings().bIsProgrammer.is_exactly_true()) return;
     library_.platform().message_boxes.show(u"SetupFileFolders - " + error.description(), MessageButtons::ok, {});

@@ -31,7 +31,8 @@ class OpenKey {
 
 /// Reads a value of type 1 or 4. Leaves `value` unchanged if there is no such value; sets it to Empty if it cannot be
 /// read.
-std::int32_t read_value(Registry& registry, Registry::Handle key, const Text& name, Variant& value) {
+std::int32_t read_value(const Platform& platform, Registry::Handle key, const Text& name, Variant& value) {
+  Registry& registry = platform.registry;
   std::uint32_t type = 0;
   std::uint32_t size = 0;
   std::int32_t status = registry.query(key, name, type, size, {});
@@ -40,8 +41,8 @@ std::int32_t read_value(Registry& registry, Registry::Handle key, const Text& na
     std::string bytes(size, '\0');
     if (size > 0) status = registry.query(key, name, type, size, bytes);
     // The stored NUL is not part of the text.
-    value = status == Registry::ok ? Variant(from_ansi(std::string_view(bytes).substr(0, size > 0 ? size - 1 : 0)))
-                                   : Variant();
+    const std::string_view stored = std::string_view(bytes).substr(0, size > 0 ? size - 1 : 0);
+    value = status == Registry::ok ? Variant(platform.code_page.text_of(stored)) : Variant();
     return status;
   }
   if (type != Registry::number) return other_type;
@@ -67,17 +68,17 @@ std::string number_bytes(std::int32_t number) {
 }  // namespace
 
 std::int32_t ORVUtils::REGISTRY_QueryValue(const Text& sKeyName, const Text& sValueName) {
-  Registry& registry = library_.platform().registry;
-  const OpenKey key(registry, sKeyName, Registry::query_value);
+  const Platform& platform = library_.platform();
+  const OpenKey key(platform.registry, sKeyName, Registry::query_value);
   Variant ignored;
-  return read_value(registry, key.get(), sValueName, ignored);
+  return read_value(platform, key.get(), sValueName, ignored);
 }
 
 Text ORVUtils::REGISTRY_ReturnValue(const Text& sKeyName, const Text& sValueName) {
-  Registry& registry = library_.platform().registry;
-  const OpenKey key(registry, sKeyName, Registry::query_value);
+  const Platform& platform = library_.platform();
+  const OpenKey key(platform.registry, sKeyName, Registry::query_value);
   Variant value;
-  const std::int32_t status = read_value(registry, key.get(), sValueName, value);
+  const std::int32_t status = read_value(platform, key.get(), sValueName, value);
   return status == Registry::not_found ? Text() : value.to_text(locale());
 }
 
@@ -87,7 +88,8 @@ void ORVUtils::REGISTRY_SetKeyValue(const Text& sKeyName, const Text& sValueName
   const OpenKey key(registry, sKeyName, Registry::set_value);
   const auto type = static_cast<std::uint32_t>(lValueType);
   if (type == Registry::text) {
-    registry.set(key.get(), sValueName, type, to_ansi(vValueSetting.to_text(locale())) + '\0');
+    const std::string bytes = library_.platform().code_page.bytes_of(vValueSetting.to_text(locale()));
+    registry.set(key.get(), sValueName, type, bytes + '\0');
   } else if (type == Registry::number) {
     registry.set(key.get(), sValueName, type, number_bytes(vValueSetting.to_int32(locale())));
   }

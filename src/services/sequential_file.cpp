@@ -11,7 +11,8 @@ constexpr char end_of_file_mark = 26;
 
 }  // namespace
 
-SequentialInput::SequentialInput(Files& files, const Text& path) : file_(files.open_input(path)), buffer_(buffer_size) {
+SequentialInput::SequentialInput(const Platform& platform, const Text& path)
+    : code_page_(platform.code_page), file_(platform.files.open_input(path)), buffer_(buffer_size) {
   fill();
 }
 
@@ -34,30 +35,48 @@ void SequentialInput::read_line(Text& line) {
   line.clear();
   while (!at_end()) {
     const std::size_t length = pending().find('\r');
-    append_ansi(line, pending().substr(0, length));
+    // Only whole lines are converted, because a character may have several bytes.
     if (length == std::string_view::npos) {
+      carried_ += pending();
       begin_ = end_;
       continue;
+    }
+    if (carried_.empty()) {
+      code_page_.append_text(line, pending().substr(0, length));
+    } else {
+      carried_ += pending().substr(0, length);
+      break_off(line);
     }
     begin_ += length + 1;
     // The line feed may be the first byte of the next buffer.
     if (!at_end() && pending().front() == '\n') ++begin_;
     return;
   }
+  break_off(line);
+}
+
+/// Converts what was carried over from earlier buffers.
+void SequentialInput::break_off(Text& text) {
+  code_page_.append_text(text, carried_);
+  carried_.clear();
 }
 
 Text SequentialInput::read_rest() {
   Text text;
   text.reserve(static_cast<std::size_t>(file_->size()));
   while (!at_end()) {
-    append_ansi(text, pending());
+    const std::size_t length = pending().rfind('\n') + 1;
+    carried_ += pending().substr(0, length);
+    if (length > 0) break_off(text);
+    carried_ += pending().substr(length);
     begin_ = end_;
   }
+  break_off(text);
   return text;
 }
 
 void SequentialOutput::write_line(TextView line) {
-  buffer_ += file_line(line);
+  buffer_ += file_line(code_page_, line);
   if (buffer_.size() < buffer_size) return;
   file_->write(buffer_);
   buffer_.clear();
@@ -68,6 +87,6 @@ void SequentialOutput::close() {
   file_->close();
 }
 
-std::string file_line(TextView line) { return to_ansi(line) + "\r\n"; }
+std::string file_line(CodePage& code_page, TextView line) { return code_page.bytes_of(line) + "\r\n"; }
 
 }  // namespace talutil

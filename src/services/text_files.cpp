@@ -27,7 +27,7 @@ void write_lines(const TextArray& list, SequentialOutput& file) {
 
 std::int32_t ORVUtils::OpenBigFile(const Text& sFilename, TextArray& sFList, const std::int16_t& iEraseBlanks) {
   if (!FileExists(sFilename).is_exactly_true()) return 0;
-  SequentialInput file(library_.platform().files, sFilename);
+  SequentialInput file(library_.platform(), sFilename);
   std::size_t n = 0;
   while (!file.at_end()) {
     Text& element = resize_to(sFList, n);
@@ -47,7 +47,7 @@ std::int32_t ORVUtils::OpenBigFile(const Text& sFilename, TextArray& sFList, con
 
 std::int32_t ORVUtils::OpenFile(const Text& sFilename, TextArray& sFList, const std::int32_t& iRowLimit) {
   if (!FileExists(sFilename).is_exactly_true()) return 0;
-  SequentialInput file(library_.platform().files, sFilename);
+  SequentialInput file(library_.platform(), sFilename);
   std::int32_t n = 0;
   // The limit is checked after each line, so 0 or less means no limit.
   while (!file.at_end()) {
@@ -59,7 +59,7 @@ std::int32_t ORVUtils::OpenFile(const Text& sFilename, TextArray& sFList, const 
 }
 
 void ORVUtils::SaveBigFile(const TextArray& sFList, const Text& sFilename) {
-  SequentialOutput file(library_.platform().files, sFilename);
+  SequentialOutput file(library_.platform(), sFilename);
   write_lines(sFList, file);
   file.close();
 }
@@ -68,21 +68,21 @@ void ORVUtils::CopyFileToBackupFile(const Text& sSrcFileName, const Text& sDestF
   constexpr std::int32_t row_limit = 30000;
   TextArray lines;
   OpenFile(sSrcFileName, lines, row_limit);
-  SequentialOutput file(library_.platform().files, sDestFileName);
+  SequentialOutput file(library_.platform(), sDestFileName);
   // A source without lines leaves the array without bounds: this raises 9, and the existing backup stays.
   write_lines(lines, file);
   file.close();
 }
 
 void ORVUtils::SaveTextBox(const Text& sText, const Text& sFilename) {
-  SequentialOutput file(library_.platform().files, sFilename);
+  SequentialOutput file(library_.platform(), sFilename);
   file.write_line(sText);
   file.close();
 }
 
 Text ORVUtils::LoadTextBox(const Text& sFilename) {
   if (!FileExists(sFilename).is_exactly_true()) return {};
-  return SequentialInput(library_.platform().files, sFilename).read_rest();
+  return SequentialInput(library_.platform(), sFilename).read_rest();
 }
 
 }  // namespace talutil

@@ -21,6 +21,16 @@ Select Case WScript.Arguments(0)
     said = Asc(olga) & CInt(u.VerifyTextData(0, 0, " " & olga & " #5? ") = olga & " 5") & _
       CInt(u.RemoveNumberFromString(house & " 5?") = house) & u.RemoveStringsFromNumber(0, house & " 5", "") & _
       CInt(u.StringReplace(olga & "?", "?", "-") = olga & "-")
+    ' Settings files, text files and registry values with such names and contents, in a folder of such a name.
+    v = "C:\" & house & "\"
+    u.VerifyFilePath v
+    u.SaveTextBox olga, v & olga & ".txt"
+    u.SaveCfgFileData olga, house, olga, v & olga & ".ini", False
+    u.REGISTRY_CreateNewKey "Software\" & olga, &H80000001
+    u.REGISTRY_SetKeyValue "Software\" & olga, house, olga, 1
+    said = said & CInt(u.PathExists(v)) & CInt(u.LoadTextBox(v & olga & ".txt") = olga & vbCrLf) & _
+      CInt(u.GetCfgFileData(olga, house, "none", v & olga & ".ini", False) = olga) & _
+      CInt(u.REGISTRY_ReturnValue("Software\" & olga, house) = olga)
   Case "cipher"  ' Opens a text that the native command has made, and writes one of its own for the command to open.
     plain = "O" & Chr(180) & "Neil, 5 " & Chr(128)
     said = CInt(u.CryptoDecryptString(WScript.Arguments(1)) = plain)

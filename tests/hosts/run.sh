@@ -161,7 +161,7 @@ localedef -i ru_RU -f UTF-8 "$talutil_build/locales/ru_RU.UTF-8"
 export WINE_LANG=ru_RU.UTF-8 WINE_LOCPATH
 WINE_LOCPATH=$(build_below_wine)/locales
 restart_wine
-elsewhere 206-1-15-1 code_page
+elsewhere 206-1-15-1-1-1-1-1 code_page
 unset WINE_LANG WINE_LOCPATH
 restart_wine
 

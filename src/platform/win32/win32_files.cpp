@@ -133,16 +133,6 @@ bool is_nothing_found(DWORD code) {
 
 }  // namespace
 
-std::string to_platform_ansi(TextView text) {
-  if (text.empty()) return {};
-  const auto* const units = reinterpret_cast<const wchar_t*>(text.data());
-  const int length = static_cast<int>(text.size());
-  const int size = WideCharToMultiByte(CP_ACP, 0, units, length, nullptr, 0, nullptr, nullptr);
-  std::string bytes(static_cast<std::size_t>(size), '\0');
-  WideCharToMultiByte(CP_ACP, 0, units, length, bytes.data(), size, nullptr, nullptr);
-  return bytes;
-}
-
 void Win32Files::search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) {
   constexpr DWORD passed_over = FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM | FILE_ATTRIBUTE_DIRECTORY;
   require_pattern(pattern);
@@ -167,11 +157,15 @@ std::uint32_t Win32Files::attributes(const Text& path) {
 }
 
 bool Win32Files::make_path(const Text& path) {
-  using Function = BOOL(WINAPI*)(PCSTR);
-  static_assert(sizeof(BOOL) == sizeof(int));
-  const auto make = late_function<Function>(L"imagehlp.dll", "MakeSureDirectoryPathExists");
-  if (make == nullptr) raise(ErrorNumber::file_not_found);
-  return make(to_platform_ansi(path).c_str()) != 0;
+  const std::size_t last = path.find_last_of(separators);
+  if (last == Text::npos) return true;
+  // What there is already, a drive or a share among it, refuses; what counts is whether there is a folder at the end.
+  for (std::size_t end = path.find_first_of(separators); end != Text::npos;
+       end = path.find_first_of(separators, end + 1)) {
+    if (end > 0) CreateDirectoryW(wide(path.substr(0, end)), nullptr);
+  }
+  const DWORD attributes = GetFileAttributesW(wide(path.substr(0, last + 1)));
+  return attributes != INVALID_FILE_ATTRIBUTES && (attributes & FILE_ATTRIBUTE_DIRECTORY) != 0;
 }
 
 Text Win32Files::current_folder(TextView drive) {

@@ -8,7 +8,7 @@ class Win32Files final : public Files {
  public:
   void search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) override;
   std::uint32_t attributes(const Text& path) override;
-  /// Calls MakeSureDirectoryPathExists. Raises 53 if the system lacks the library that contains it.
+  /// As MakeSureDirectoryPathExists does, but with every character of the path.
   bool make_path(const Text& path) override;
   Text current_folder(TextView drive) override;
   /// Calls DeleteFile of "Scripting.FileSystemObject". Raises that object's errors, and 429 if it cannot be created.
@@ -17,8 +17,5 @@ class Win32Files final : public Files {
   std::unique_ptr<OutputFile> open_output(const Text& path) override;
   void append(const Text& path, std::string_view bytes) override;
 };
-
-/// Converts a text to the code page of the platform's ANSI functions.
-[[nodiscard]] std::string to_platform_ansi(TextView text);
 
 }  // namespace talutil::win32

@@ -1,7 +1,7 @@
 #include "platform/win32/win32_registry.hpp"
 
 #include "platform/win32/handle.hpp"
-#include "platform/win32/win32_files.hpp"
+#include "platform/win32/win32_code_page.hpp"
 
 namespace talutil::win32 {
 
@@ -13,15 +13,15 @@ HKEY native(Registry::Handle key) noexcept { return reinterpret_cast<HKEY>(key);
 
 std::int32_t Win32Registry::open(Handle root, const Text& path, std::uint32_t access, Handle& key) {
   HKEY opened = nullptr;
-  const LSTATUS status = RegOpenKeyExA(native(root), to_platform_ansi(path).c_str(), 0, access, &opened);
+  const LSTATUS status = RegOpenKeyExW(native(root), wide(path), 0, access, &opened);
   if (status == ERROR_SUCCESS) key = reinterpret_cast<Handle>(opened);
   return status;
 }
 
 std::int32_t Win32Registry::create(Handle root, const Text& path, Handle& key) {
   HKEY opened = nullptr;
-  const LSTATUS status = RegCreateKeyExA(native(root), to_platform_ansi(path).c_str(), 0, nullptr,
-                                         REG_OPTION_NON_VOLATILE, all_but_links, nullptr, &opened, nullptr);
+  const LSTATUS status = RegCreateKeyExW(native(root), wide(path), 0, nullptr, REG_OPTION_NON_VOLATILE, all_but_links,
+                                         nullptr, &opened, nullptr);
   if (status == ERROR_SUCCESS) key = reinterpret_cast<Handle>(opened);
   return status;
 }
@@ -34,14 +34,14 @@ std::int32_t Win32Registry::query(Handle key, const Text& name, std::uint32_t& t
   auto found_size = static_cast<DWORD>(buffer.size());
   auto* const bytes = buffer.empty() ? nullptr : reinterpret_cast<BYTE*>(buffer.data());
   const LSTATUS status =
-      RegQueryValueExA(native(key), to_platform_ansi(name).c_str(), nullptr, &found_type, bytes, &found_size);
+      RegQueryValueExA(native(key), Win32CodePage().bytes_of(name).c_str(), nullptr, &found_type, bytes, &found_size);
   type = found_type;
   size = found_size;
   return status;
 }
 
 std::int32_t Win32Registry::set(Handle key, const Text& name, std::uint32_t type, std::string_view data) {
-  return RegSetValueExA(native(key), to_platform_ansi(name).c_str(), 0, type,
+  return RegSetValueExA(native(key), Win32CodePage().bytes_of(name).c_str(), 0, type,
                         reinterpret_cast<const BYTE*>(data.data()), static_cast<DWORD>(data.size()));
 }
 

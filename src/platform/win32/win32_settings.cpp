@@ -13,11 +13,14 @@ namespace {
 constexpr TextView settings_key = u"Software\\TALUtil\\Settings\\";
 
 /// The result of the profile functions; a null item lists the names.
-Text read_profile(const Text& file, const Text& section, const char* item) {
-  std::array<char, Profiles::longest_value + 1> buffer{};
-  const DWORD count = GetPrivateProfileStringA(to_ansi(section).c_str(), item, "", buffer.data(),
-                                               static_cast<DWORD>(buffer.size()), to_ansi(file).c_str());
-  return from_ansi({buffer.data(), count});
+///
+/// The wide functions: a file without a byte order mark is in the system's ANSI code page for them too, but paths and
+/// the names in them keep every character.
+Text read_profile(const Text& file, const Text& section, const wchar_t* item) {
+  std::array<wchar_t, Profiles::longest_value + 1> buffer{};
+  const DWORD count =
+      GetPrivateProfileStringW(wide(section), item, L"", buffer.data(), static_cast<DWORD>(buffer.size()), wide(file));
+  return Text(view(buffer.data(), count));
 }
 
 /// Names end at a NUL, as they do for the system.
@@ -45,14 +48,13 @@ bool is_there(LSTATUS status, const Text& path) {
 }  // namespace
 
 Text Win32Profiles::value(const Text& file, const Text& section, const Text& item) {
-  return read_profile(file, section, to_ansi(item).c_str());
+  return read_profile(file, section, wide(item));
 }
 
 Text Win32Profiles::item_names(const Text& file, const Text& section) { return read_profile(file, section, nullptr); }
 
 void Win32Profiles::put(const Text& file, const Text& section, const Text& item, const Text& value) {
-  WritePrivateProfileStringA(to_ansi(section).c_str(), to_ansi(item).c_str(), to_ansi(value).c_str(),
-                             to_ansi(file).c_str());
+  WritePrivateProfileStringW(wide(section), wide(item), wide(value), wide(file));
 }
 
 std::optional<Text> Win32SettingsStore::value(const Text& application, const Text& section, const Text& key) {
