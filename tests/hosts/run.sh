@@ -18,7 +18,7 @@ rm -f "$pictures"/*.wanted
 
 start_screen
 
-# Runs one command; its own last line is its counts. Without them it has died, which is one failure more.
+# Runs one command; its own last line is its counts. Without them, or after them, it has died, which is one failure more.
 run() {
   local name=$1 log=$talutil_build/$folder-$1.log counts status=0
   shift
@@ -29,6 +29,9 @@ run() {
     tail -5 "$log"
     printf 'FAILED %s: expected to end with its counts, ended with status %s; see %s\n' "$name" "$status" "$log"
     counts="0 passed, 1 failed"
+  elif [ "$status" != 0 ] && [ "${counts#*, }" = "0 failed" ]; then
+    printf 'FAILED %s: expected status 0 after its counts, got %s; see %s\n' "$name" "$status" "$log"
+    counts="${counts%%,*}, 1 failed"
   fi
   passed=$((passed + ${counts%% passed*}))
   counts=${counts#*, }
