@@ -2,7 +2,7 @@
 // the platform's objects; and an early-bound call.
 #include <cstdio>
 
-#include "table_object.hpp"
+#include "host_grid.hpp"
 #include "timing.hpp"
 
 using namespace talutil::hosts;
@@ -109,27 +109,27 @@ VARIANT number(LONG value) {
   return result;
 }
 
-void tick_bare(TableObject& table) {
+void tick_bare(HostGrid& table) {
   for (LONG r = 0; r < table.rows(); ++r) {
     std::array<VARIANT, 3> arguments{VARIANT{}, number(0), number(r)};
     V_VT(&arguments[0]) = VT_BOOL;
     V_BOOL(&arguments[0]) = VARIANT_TRUE;
-    bare_use(&table, TableObject::TextMatrix, DISPATCH_PROPERTYPUT, arguments.data(), 3, nullptr);
+    bare_use(&table, HostGrid::TextMatrix, DISPATCH_PROPERTYPUT, arguments.data(), 3, nullptr);
   }
 }
 
-/// The reads of an export, and its text written at once.
-void export_bare(TableObject& table, const std::wstring& path) {
+/// The reads of an export, and its text written in one piece.
+void export_bare(HostGrid& table, const std::wstring& path) {
   std::string text;
   for (LONG r = 0; r < table.rows(); ++r) {
     VARIANT answer{};
     VARIANT row = number(r);
-    bare_use(&table, TableObject::RowHidden, DISPATCH_PROPERTYGET, &row, 1, &answer);
-    bare_use(&table, TableObject::Cols, DISPATCH_PROPERTYGET, nullptr, 0, &answer);
+    bare_use(&table, HostGrid::RowHidden, DISPATCH_PROPERTYGET, &row, 1, &answer);
+    bare_use(&table, HostGrid::Cols, DISPATCH_PROPERTYGET, nullptr, 0, &answer);
     for (LONG c = 0; c < table.columns(); ++c) {
       std::array<VARIANT, 2> cell{number(c), row};
-      bare_use(&table, TableObject::ColHidden, DISPATCH_PROPERTYGET, cell.data(), 1, &answer);
-      bare_use(&table, TableObject::TextMatrix, DISPATCH_PROPERTYGET, cell.data(), 2, &answer);
+      bare_use(&table, HostGrid::ColHidden, DISPATCH_PROPERTYGET, cell.data(), 1, &answer);
+      bare_use(&table, HostGrid::TextMatrix, DISPATCH_PROPERTYGET, cell.data(), 2, &answer);
       if (c > 0) text += ',';
       for (const wchar_t unit : view(V_BSTR(&answer))) text += static_cast<char>(unit);
       VariantClear(&answer);
@@ -223,7 +223,7 @@ class AnsweredDialog final : public IClassFactory {
 
 /// A host's grid that responds at once, so that only the calls themselves are measured.
 void time_grids(_ORVUtils* u, const std::wstring& folder) {
-  TableObject table(10000, 20);
+  HostGrid table(10000, 20);
   for (LONG r = 0; r < table.rows(); ++r) {
     for (LONG c = 0; c < table.columns(); ++c)
       table.text(r, c) = L"cell " + std::to_wstring(r) + L" " + std::to_wstring(c);

@@ -3,7 +3,7 @@
 #include <fstream>
 #include <sstream>
 
-#include "table_object.hpp"
+#include "host_grid.hpp"
 #include "windows.hpp"
 
 using namespace talutil::hosts;
@@ -54,7 +54,7 @@ std::string bytes_of(const std::wstring& path) {
 
 /// Exports a table, the user saving to what the dialog proposes, or not.
 void grids_are_exported(_ORVUtils* u, const std::wstring& folder) {
-  TableObject table(2, 2);
+  HostGrid table(2, 2);
   table.text(0, 0) = L"a,b";
   table.text(1, 1) = L"\u20AC";
   Value grid(&table);

@@ -3,8 +3,8 @@
 #include <cmath>
 
 #include "examples/host/window_objects.hpp"
+#include "host_grid.hpp"
 #include "hostile_values.hpp"
-#include "table_object.hpp"
 
 using namespace talutil::hosts;
 
@@ -129,7 +129,7 @@ void errors_of_objects_reach_the_caller(_ORVUtils* u) {
       {answer<DISP_E_NOTACOLLECTION>, run_time_error(451),
        L"TALUtil.ORVUtils: Property let procedure not defined and property get procedure did not return an object"},
   };
-  TableObject table(3, 1);
+  HostGrid table(3, 1);
   Value grid(&table);
   for (const auto& row : rows) {
     table.before = row.fails;
@@ -156,7 +156,7 @@ void errors_of_objects_reach_the_caller(_ORVUtils* u) {
 }
 
 void grids_are_driven(_ORVUtils* u) {
-  TableObject table(10000, 1);
+  HostGrid table(10000, 1);
   // A variable of a script within a variable: the object is found behind both.
   Value inner(&table);
   Value outer(&inner.get());
@@ -171,7 +171,7 @@ void grids_are_driven(_ORVUtils* u) {
   // The host lets go of its variable, and calls the library again, in the middle of a call.
   Long pages;
   table.before = [&](const Use& use) {
-    if (use.member != TableObject::TextMatrix) return S_OK;
+    if (use.member != HostGrid::TextMatrix) return S_OK;
     inner = Value();
     return u->GetMaxPages(Long{4}, Long{14}, pages);
   };

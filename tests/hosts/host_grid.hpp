@@ -5,9 +5,9 @@
 namespace talutil::hosts {
 
 /// A grid of the client's, as a third-party one would be: texts, of which those of a column of Booleans can be put.
-class TableObject final : public HostObject {
+class HostGrid final : public HostObject {
  public:
-  TableObject(LONG rows, LONG columns)
+  HostGrid(LONG rows, LONG columns)
       : HostObject({L"Rows", L"Cols", L"FixedRows", L"ColDataType", L"ColHidden", L"RowHidden", L"TextMatrix", L"Cell",
                     L"Row", L"RowSel"},
                    {}),
