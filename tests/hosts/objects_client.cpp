@@ -90,12 +90,20 @@ Outcome save_widths(_ORVUtils* u, Value& grid, bool is_early) {
   return early_outcome(u->SaveGridWidths(grid, Text(L"Grid"), Short{0}));
 }
 
-HRESULT raise_with_help(const Use& use) {
-  use.exception->scode = their_error;
-  use.exception->bstrSource = SysAllocString(L"OtherGrid");
-  use.exception->bstrDescription = SysAllocString(L"The grid is busy.");
-  use.exception->bstrHelpFile = SysAllocString(L"grid.chm");
-  use.exception->dwHelpContext = 77;
+HRESULT WINAPI fill_in(EXCEPINFO* exception) {
+  exception->scode = their_error;
+  exception->bstrSource = SysAllocString(L"OtherGrid");
+  exception->bstrDescription = SysAllocString(L"The grid is busy.");
+  exception->bstrHelpFile = SysAllocString(L"grid.chm");
+  exception->dwHelpContext = 77;
+  return S_OK;
+}
+
+HRESULT raise_with_help(const Use& use) { return fill_in(use.exception), DISP_E_EXCEPTION; }
+
+/// The caller has to ask for what the error is.
+HRESULT raise_deferred(const Use& use) {
+  use.exception->pfnDeferredFillIn = fill_in;
   return DISP_E_EXCEPTION;
 }
 
@@ -119,6 +127,7 @@ void errors_of_objects_reach_the_caller(_ORVUtils* u) {
     const wchar_t* text;
   } rows[] = {
       {raise_with_help, their_error, L"OtherGrid: The grid is busy."},
+      {raise_deferred, their_error, L"OtherGrid: The grid is busy."},
       {raise_bare<unplugged>, unplugged, of_the_system},
       {answer<unplugged>, unplugged, of_the_system},
       {answer<E_NOTIMPL>, run_time_error(445), L"TALUtil.ORVUtils: Object doesn't support this action"},
