@@ -5,61 +5,85 @@ using namespace talutil::hosts;
 
 namespace {
 
-/// A value below Software\Classes.
-std::wstring value_of(HKEY root, const std::wstring& key, const wchar_t* name = nullptr) {
+/// Everything below a key of Software\Classes, a line for each value: "KEY\NAME=VALUE".
+std::wstring tree_of(HKEY root, const std::wstring& key) {
+  std::wstring lines = key + L"\n";
+  HKEY handle = nullptr;
+  if (RegOpenKeyExW(root, (L"Software\\Classes\\" + key).c_str(), 0, KEY_READ, &handle) != ERROR_SUCCESS) return {};
+  std::array<wchar_t, 300> name{};
   std::array<wchar_t, 300> value{};
-  DWORD size = sizeof value;
-  const LSTATUS status =
-      RegGetValueW(root, (L"Software\\Classes\\" + key).c_str(), name, RRF_RT_REG_SZ, nullptr, value.data(), &size);
-  return status == ERROR_SUCCESS ? value.data() : L"(none)";
+  for (DWORD i = 0, length = 300, size = sizeof value;
+       RegEnumValueW(handle, i, name.data(), &length, nullptr, nullptr, reinterpret_cast<BYTE*>(value.data()), &size) ==
+       ERROR_SUCCESS;
+       ++i, length = 300, size = sizeof value)
+    lines += key + L"\\" + name.data() + L"=" + value.data() + L"\n";
+  for (DWORD i = 0; RegEnumKeyW(handle, i, name.data(), 300) == ERROR_SUCCESS; ++i)
+    lines += tree_of(root, key + L"\\" + name.data());
+  RegCloseKey(handle);
+  return lines;
 }
 
-bool has_key(HKEY root, const std::wstring& key) {
-  HKEY handle = nullptr;
-  const LSTATUS status = RegOpenKeyExW(root, (L"Software\\Classes\\" + key).c_str(), 0, KEY_READ, &handle);
-  if (status == ERROR_SUCCESS) RegCloseKey(handle);
-  return status == ERROR_SUCCESS;
+const std::wstring object_id = L"{13223AC3-C9F1-4A82-A6C4-951E12542E20}";
+const std::wstring position_id = L"{9039A04F-B619-4A0C-A9C9-AA2B3F5BC3DC}";
+const std::wstring library_id = L"{BC9C637E-DB88-4022-B98F-6F65F8CE12E5}";
+const std::wstring interface_id = L"{6AF6495B-C4A1-4417-92A9-AE87BC1F2674}";
+
+std::wstring classes_in(HKEY root) {
+  std::wstring trees;
+  for (const wchar_t* const name : {L"TALUtil.ORVUtils", L"TALUtil.cControlPosition"}) trees += tree_of(root, name);
+  for (const std::wstring& id : {object_id, position_id}) trees += tree_of(root, L"CLSID\\" + id);
+  return trees;
+}
+
+std::wstring type_library_in(HKEY root) {
+  return tree_of(root, L"TypeLib\\" + library_id) + tree_of(root, L"Interface\\" + interface_id);
 }
 
 enum class Scope { none, user, machine };
 
 /// Looks for everything that a registration in one scope makes, and for nothing of it in the other.
 void is_registered(Scope scope, const std::wstring& path) {
-  const std::wstring object = L"{13223AC3-C9F1-4A82-A6C4-951E12542E20}";
-  const std::wstring position = L"{9039A04F-B619-4A0C-A9C9-AA2B3F5BC3DC}";
-  const std::wstring library = L"{BC9C637E-DB88-4022-B98F-6F65F8CE12E5}";
-  const std::wstring interface_key = L"Interface\\{6AF6495B-C4A1-4417-92A9-AE87BC1F2674}";
-  const std::wstring library_key = L"TypeLib\\" + library;
-  const struct {
-    std::wstring key;
-    std::wstring expected;
-    const wchar_t* name = nullptr;
-  } rows[] = {
-      {L"TALUtil.ORVUtils\\CLSID", object},
-      {L"TALUtil.cControlPosition\\CLSID", position},
-      {L"CLSID\\" + object + L"\\InprocServer32", path},
-      {L"CLSID\\" + object + L"\\InprocServer32", L"(none)", L"ThreadingModel"},
-      {L"CLSID\\" + object + L"\\ProgID", L"TALUtil.ORVUtils"},
-      {L"CLSID\\" + object + L"\\TypeLib", library},
-      {L"CLSID\\" + position + L"\\InprocServer32", path},
-      {L"CLSID\\" + position + L"\\ProgID", L"TALUtil.cControlPosition"},
-      {library_key + (sizeof(void*) == 8 ? L"\\1.0\\0\\win64" : L"\\1.0\\0\\win32"), path},
-      {interface_key + L"\\TypeLib", library},
-  };
+  const std::wstring classes[] = {L"TALUtil.ORVUtils\\CLSID\\=" + object_id,
+                                  L"TALUtil.cControlPosition\\CLSID\\=" + position_id,
+                                  L"CLSID\\" + object_id + L"\\InprocServer32\\=" + path,
+                                  L"CLSID\\" + object_id + L"\\ProgID\\=TALUtil.ORVUtils",
+                                  L"CLSID\\" + object_id + L"\\TypeLib\\=" + library_id,
+                                  L"CLSID\\" + position_id + L"\\InprocServer32\\=" + path,
+                                  L"CLSID\\" + position_id + L"\\ProgID\\=TALUtil.cControlPosition"};
+  const std::wstring libraries[] = {
+      L"TypeLib\\" + library_id + (sizeof(void*) == 8 ? L"\\1.0\\0\\win64\\=" : L"\\1.0\\0\\win32\\=") + path,
+      L"Interface\\" + interface_id + L"\\TypeLib\\=" + library_id};
   for (const auto& [root, owner] : {std::pair(HKEY_LOCAL_MACHINE, Scope::machine), {HKEY_CURRENT_USER, Scope::user}}) {
-    const std::string where = owner == Scope::user ? "user, " : "machine, ";
-    for (const auto& row : rows) {
-      const bool is_of_library = row.key.starts_with(library_key) || row.key.starts_with(interface_key);
-      // Wine registers a type library for all users even when asked to do it for one.
-      if (is_of_library && scope == Scope::user && GetProcAddress(GetModuleHandleW(L"ntdll"), "wine_get_version"))
-        continue;
-      const std::wstring top = row.key.substr(0, row.key.find(L'\\', row.key.find(L'}') + 1));
-      if (owner == scope)
-        check_equal(row.expected, value_of(root, row.key, row.name), where + narrow(row.key));
-      else
-        check(!has_key(root, top), where + narrow(top) + " is not there");
-    }
+    const auto has = [](const std::wstring& tree, std::span<const std::wstring> lines) {
+      for (const std::wstring& line : lines) check(tree.find(line + L"\n") != std::wstring::npos, narrow(line));
+    };
+    const std::string where = owner == Scope::user ? "the user's part" : "the machine's part";
+    const std::wstring found = classes_in(root);
+    if (owner == scope)
+      has(found, classes);
+    else
+      check_equal(L"", found, where);
+    check_equal(std::wstring::npos, found.find(L"ThreadingModel"), where + " has no threading model");
+    // Wine registers a type library for all users even when asked to do it for one.
+    if (scope == Scope::user && GetProcAddress(GetModuleHandleW(L"ntdll"), "wine_get_version") != nullptr) continue;
+    if (owner == scope)
+      has(type_library_in(root), libraries);
+    else
+      check_equal(L"", type_library_in(root), where);
   }
+}
+
+/// Registers over what an earlier version has left, which ends in the same as on clean ground.
+void earlier_registrations_are_replaced(HKEY root, const std::function<HRESULT()>& registers) {
+  const std::wstring clean = classes_in(root);
+  for (const std::wstring& id : {object_id, position_id}) {
+    const std::wstring key = L"Software\\Classes\\CLSID\\" + id + L"\\InprocServer32";
+    for (const wchar_t* const name : {L"", L"ThreadingModel"})
+      RegSetKeyValueW(root, key.c_str(), name, REG_SZ, L"Both", 5 * sizeof(wchar_t));
+  }
+  check(classes_in(root) != clean, "what an earlier version has left");
+  check_equal(S_OK, registers(), "registration once more");
+  check_equal(clean, classes_in(root), "what is registered over it");
 }
 
 void an_object_can_be_called() {
@@ -113,11 +137,12 @@ int wmain(int, wchar_t** arguments) {
 
     check_equal(S_OK, install(TRUE, L"user"), "registration for the user");
     is_registered(Scope::user, path);
+    earlier_registrations_are_replaced(HKEY_CURRENT_USER, [&] { return install(TRUE, L"user"); });
     check_equal(S_OK, install(FALSE, L"user"), "removal for the user");
     is_registered(Scope::none, path);
     check_equal(S_OK, register_server(), "registration for the machine");
-    check_equal(S_OK, register_server(), "registration once more");
     is_registered(Scope::machine, path);
+    earlier_registrations_are_replaced(HKEY_LOCAL_MACHINE, register_server);
     check_equal(S_OK, unregister_server(), "removal for the machine");
     is_registered(Scope::none, path);
     check_equal(S_OK, unregister_server(), "removal once more");
