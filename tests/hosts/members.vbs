@@ -4,8 +4,9 @@
 '
 '   cscript //nologo members.vbs CLIENT
 '
-' CLIENT keeps the files and settings of one run apart from those of others. A script control runs this file too, and as
-' far as the line of dashes it is run as JScript, into which to_jscript.awk turns it; docs/clients.md says what differs.
+' CLIENT keeps the files and settings of one run apart from those of others. A script control runs this file too. As far
+' as the line of dashes it is run as JScript, into which to_jscript.awk turns it, and compiled clients do the same as far
+' as the double line; docs/clients.md says what differs.
 Option Explicit
 On Error Resume Next
 
@@ -62,8 +63,7 @@ missing = "00:00:00"
 Say "date", Year(u.VerifyNullDate(0, missing)) '= 1980
 Say "date.back", missing '= 01/01/1980
 'jscript: date.back=00:00:00
-'pascal_late: date.typed=01/01/1980
-'pascal_early: date.typed=01/01/1980
+'pascal: date.typed=01/01/1980
 Say "month", u.IncMonth(DateSerial(2009, 1, 31), 1) '= 28/02/2009
 Say "week", u.GetWeekNumber(DateSerial(2009, 12, 31)) '= 52
 week = 60
@@ -90,7 +90,6 @@ Say "duration.minutes", u.ConvertDatabaseDurationToMinutes(u.DurToTime(hours)) '
 Say "duration.back", "[" & hours & "]" '= [1.5]
 'jscript: duration.back=[ 1.5 ]
 ini = folder & "client.ini"
-key = "Software\TALUtil Clients\" & client
 u.sDatabaseName = "Clients"
 u.sUserName = client
 output = "north"
@@ -100,24 +99,6 @@ output = "\\server\share"
 Call u.SaveCfgFileData("Branch", "Path", output, ini, True)
 Say "setting.back", output '= \
 'jscript: setting.back=\\server\share
-output = "stored"
-Call u.SaveCfgFileData(client, "Name", output, "any")
-Say "setting.store", u.GetCfgFileData(client, "Name", "none", "any") '= stored
-Call u.REGISTRY_CreateNewKey(key, -2147483647)
-Call u.REGISTRY_SetKeyValue(key, "Number", 42, 4)
-Say "registry", u.REGISTRY_ReturnValue(key, "Number") '= 42
-Call u.SaveTextBox("a line", folder & "in\a.txt")
-Call u.SaveTextBox(u.CryptoEncryptString("branch 12"), folder & "in\b.txt")
-Say "files", u.GetFileList(",", folder & "in\", "*.txt") '= a.txt,b.txt
-Call u.CallZIPFiles(folder & "a.zip", folder & "in", 0, "")
-Call u.CallUnZIPFiles(folder & "a.zip", folder & "out\", "")
-Say "zip", Left(u.LoadTextBox(folder & "out\in\a.txt"), 6) '= a line
-secret = u.LoadTextBox(folder & "out\in\b.txt")
-Say "secret", u.CryptoDecryptString(Left(secret, Len(secret) - 2)) '= branch 12
-u.sORVPath = folder
-u.EventLog = 1
-Call u.AppendEventLog("Saved", "frmBooking")
-Say "log", InStr(u.LoadTextBox(folder & "EventLog.txt"), ":Saved:frmBooking") > 0 '= True
 Set grid = CreateObject("TALUtil.Grid")
 grid.Cols = 3
 grid.ColWidth(1) = 480
@@ -133,6 +114,30 @@ Call position.SaveControlPosition()
 position.left = 0
 Call position.GetControlPosition()
 Say "position", position.left '= 120
+v = u.IncWeek("5/3/2009", 4682) : SayError "error.overflow" '= 6 Overflow
+u.DrawTextPictureBox = "a text" : SayError "error.object" '= 13 Type mismatch
+v = u.CryptoDecryptString("QUJD") : SayError "error.own" '= 5 This is not a cipher text of this library, or it was changed
+Say "done", True '= True
+'=======================================================================================================================
+output = "stored"
+Call u.SaveCfgFileData(client, "Name", output, "any")
+Say "setting.store", u.GetCfgFileData(client, "Name", "none", "any") '= stored
+key = "Software\TALUtil Clients\" & client
+Call u.REGISTRY_CreateNewKey(key, -2147483647)
+Call u.REGISTRY_SetKeyValue(key, "Number", 42, 4)
+Say "registry", u.REGISTRY_ReturnValue(key, "Number") '= 42
+Call u.SaveTextBox("a line", folder & "in\a.txt")
+Call u.SaveTextBox(u.CryptoEncryptString("branch 12"), folder & "in\b.txt")
+Say "files", u.GetFileList(",", folder & "in\", "*.txt") '= a.txt,b.txt
+Call u.CallZIPFiles(folder & "a.zip", folder & "in", 0, "")
+Call u.CallUnZIPFiles(folder & "a.zip", folder & "out\", "")
+Say "zip", Left(u.LoadTextBox(folder & "out\in\a.txt"), 6) '= a line
+secret = u.LoadTextBox(folder & "out\in\b.txt")
+Say "secret", u.CryptoDecryptString(Left(secret, Len(secret) - 2)) '= branch 12
+u.sORVPath = folder
+u.EventLog = 1
+Call u.AppendEventLog("Saved", "frmBooking")
+Say "log", InStr(u.LoadTextBox(folder & "EventLog.txt"), ":Saved:frmBooking") > 0 '= True
 pdf = "C:\TAL\ORV3\DATA\MONTHLYREPORTS\SalesReport.pdf"
 Call u.DeleteFiles(pdf)
 Set grid = CreateObject("TALUtil.Grid")
@@ -146,19 +151,11 @@ u.AutomatedEndOfMonth = True
 Call u.GridPrintPreview(100, 2, "Sales", "", grid, DateSerial(2009, 3, 1), DateSerial(2009, 3, 31), "SalesReport")
 u.AutomatedEndOfMonth = False
 Say "report", Left(u.LoadTextBox(pdf), 5) '= %PDF-
-v = u.IncWeek("5/3/2009", 4682) : SayError "error.overflow" '= 6 Overflow
-u.DrawTextPictureBox = "a text" : SayError "error.object" '= 13 Type mismatch
-v = u.CryptoDecryptString("QUJD") : SayError "error.own" '= 5 This is not a cipher text of this library, or it was changed
-Say "done", True '= True
 'jscript: combo=1
 'jscript: combo.text=[]
 'jscript: widths.own=0 480 1000
 'jscript: list.variable=undefined
 'jscript: error.list=13 Type mismatch
-'pascal_late: combo=1
-'pascal_late: combo.text=[]
-'pascal_early: combo=1
-'pascal_early: combo.text=[]
 '-----------------------------------------------------------------------------------------------------------------------
 Set other = CreateObject("TALUtil.ORVUtils")
 Say "another object", (other.sUserName = client) & " " & other.WriteServerPerformanceFile '= True False

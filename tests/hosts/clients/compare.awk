@@ -1,19 +1,20 @@
 # Compares what a client has printed with what stands in members.vbs: awk -v client=NAME -v status=ITS_STATUS -f
-# compare.awk members.vbs OUTPUT. Prints a line for each difference, then the counts. Below the line of dashes stands what
-# VBScript alone does.
+# compare.awk members.vbs OUTPUT. Prints a line for each difference, then the counts. A client stops at its line: what the
+# compiled ones do ends at the double line, what JScript does at the line of dashes.
 
 function name_of(line) { return substr(line, 1, index(line, "=") - 1) }
 
-FNR == NR && /^'---/ { is_common = client !~ /vbscript|script_control/ }
+FNR == NR && /^'===/ { is_over = client ~ /pascal/ }
+FNR == NR && /^'---/ { is_over = client !~ /vbscript|script_control/ }
 FNR == NR && /^'[a-z_]+: / {
-  if (index($0, "'" client ": ") != 1) next
-  $0 = substr($0, length(client) + 4)
+  if (index("'" client ":", substr($1, 1, length($1) - 1)) != 1) next
+  $0 = substr($0, length($1) + 2)
   own[name_of($0)] = 1
   expected[name_of($0)] = $0
   next
 }
 FNR == NR {
-  if (is_common) next
+  if (is_over) next
   value = match($0, / '= .*/) ? substr($0, RSTART + 4) : ""
   # What is expected of a statement of several lines stands behind the last of them.
   if (sub(/.*Say[A-Za-z]* "/, "")) name = substr($0, 1, index($0, "\"") - 1)
