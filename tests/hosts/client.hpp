@@ -46,18 +46,15 @@ inline std::string narrow(std::wstring_view text) {
 
 template <class T>
 std::string shown(const T& value) {
-  if constexpr (std::is_same_v<T, std::string_view>) {
-    return std::string(value);
-  } else if constexpr (std::is_same_v<T, std::wstring_view>) {
-    return narrow(value);
-  } else if constexpr (std::is_same_v<T, HRESULT>) {
+  if constexpr (std::is_same_v<T, std::string_view>) return std::string(value);
+  if constexpr (std::is_same_v<T, std::wstring_view>) return narrow(value);
+  if constexpr (std::is_same_v<T, HRESULT>) {
     // Also what a LONG looks like: small values are easier to read as numbers.
     std::array<char, 16> text{};
     std::snprintf(text.data(), text.size(), value < 0 ? "0x%08lX" : "%ld", value);
     return text.data();
-  } else {
-    return std::to_string(value);
   }
+  if constexpr (std::is_arithmetic_v<T>) return std::to_string(value);
 }
 
 inline bool check(bool condition, const std::string& what,
@@ -207,6 +204,19 @@ Pointer<Interface> create_object(const CLSID& id = CLSID_ORVUtils, const IID& in
   Pointer<Interface> object;
   require(CoCreateInstance(id, nullptr, CLSCTX_INPROC_SERVER, interface_id, object.receive_untyped()), "creating");
   return object;
+}
+
+/// A window of the client's, 10 pixels from the corner of its parent or of the screen.
+inline HWND window(const wchar_t* window_class, DWORD style, int width, int height, HWND parent = nullptr) {
+  return CreateWindowW(window_class, L"A window", style, 10, 10, width, height, parent, nullptr, nullptr, nullptr);
+}
+
+/// A combo box of entries with keys.
+inline HWND combo_box(std::initializer_list<LPARAM> keys) {
+  const HWND box = window(L"ComboBox", CBS_DROPDOWN, 100, 100);
+  for (const LPARAM key : keys)
+    SendMessageW(box, CB_SETITEMDATA, static_cast<WPARAM>(SendMessageW(box, CB_ADDSTRING, 0, LPARAM(L"entry"))), key);
+  return box;
 }
 
 /// Handles the messages that wait for this thread, calls from other apartments among them.

@@ -52,6 +52,13 @@ LONG height_of(HWND window) {
   return place.bottom - place.top;
 }
 
+/// The one window of a form that is shown.
+HWND only_form() {
+  const auto windows = top_windows(form_class);
+  check_equal(std::size_t{1}, windows.size(), "windows of forms");
+  return windows.at(0);
+}
+
 void boxes_take_texts(_ORVUtils* u) {
   LONG usual_height = 0;
   const auto looks_usual = [&](HWND window) {
@@ -61,13 +68,13 @@ void boxes_take_texts(_ORVUtils* u) {
     check(GetWindow(controls(window, L"Static").at(0), GW_HWNDNEXT) == controls(window, L"Edit").at(0),
           "the label names the entry");
   };
-  const auto is_masked = [](HWND window) {
-    check(has_style(controls(window, L"Edit").at(0), GWL_STYLE, ES_PASSWORD), "masked");
+  const auto is_masked = [](HWND box) {
+    check(has_style(controls(box, L"Edit").at(0), GWL_STYLE, ES_PASSWORD), "mask");
   };
-  const auto has_no_entry = [](HWND window) { check(controls(window, L"Edit").empty(), "no entry"); };
-  const auto has_grown = [&](HWND window) { check(height_of(window) > usual_height + 40, "grown with its prompt"); };
-  const auto is_high = [&](HWND window) { check(height_of(window) > 3 * usual_height, "an endless prompt"); };
-  const auto is_as_written = [](HWND window) { check_equal(L"{\\rtf1 rich}", prompt_of(window), "a rich prompt"); };
+  const auto has_no_entry = [](HWND box) { check(controls(box, L"Edit").empty(), "no entry"); };
+  const auto has_grown = [&](HWND box) { check(height_of(box) > usual_height + 40, "grown with its prompt"); };
+  const auto is_high = [&](HWND box) { check(height_of(box) > 3 * usual_height, "an endless prompt"); };
+  const auto is_as_written = [](HWND box) { check_equal(L"{\\rtf1 rich}", prompt_of(box), "a rich prompt"); };
   const std::wstring several = L"one\r\ntwo\nthree\r\nfour\r\n\u05E9\u05DC\u05D5\u05DD \u4F60\u597D\r\n";
   std::wstring endless;
   while (endless.size() < 65536) endless += L"A line of a prompt that nobody reads to its end.\n";
@@ -126,8 +133,7 @@ void boxes_are_entered_once(_ORVUtils* u) {
   check(is_asked_to_quit(7), "it quits");
 
   // A window of the host that goes away takes its box with it.
-  const HWND owner = CreateWindowW(L"Static", L"host", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 200, 100, nullptr,
-                                   nullptr, nullptr, nullptr);
+  const HWND owner = window(L"Static", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 200, 100);
   SetForegroundWindow(owner);
   const auto is_waiting = [&] { return IsWindowEnabled(owner) == FALSE; };
   ask(u, {}, [&](HWND) {
@@ -147,9 +153,7 @@ void notices_stay(_ORVUtils* u) {
   std::wstring result;
   const Question notice{.prompt = L"Please wait...", .has_entry = no, .is_frameless = yes, .is_unclosable = yes};
   check_equal(S_OK, ask(u, notice, result), "a notice");
-  const auto windows = top_windows(form_class);
-  if (!check_equal(std::size_t{1}, windows.size(), "the notice is there")) return;
-  const HWND window = windows[0];
+  const HWND window = only_form();
   check(!has_style(window, GWL_STYLE, WS_CAPTION) && has_style(window, GWL_EXSTYLE, WS_EX_TOPMOST),
         "frameless, on top");
   check_equal(L"Who?|Please wait...", words_of(window), "nothing but its text");
@@ -165,9 +169,7 @@ void notices_stay(_ORVUtils* u) {
 void keys_are_listed(_ORVUtils* u) {
   check_equal(S_OK, u->ShowShortCutKeys(), "ShowShortCutKeys");
   check_equal(S_OK, u->ShowShortCutKeys(), "again");
-  const auto windows = top_windows(form_class);
-  if (!check_equal(std::size_t{1}, windows.size(), "one window")) return;
-  const HWND window = windows[0];
+  const HWND window = only_form();
   const HWND list = controls(window, L"RichEdit20W").at(0);
   CHARFORMAT2W format{};
   format.cbSize = sizeof format;
@@ -192,12 +194,8 @@ void keys_are_listed(_ORVUtils* u) {
   check(is_at(print), "Tab leaves it");
   // There is no printer: the user is told, the host is not.
   std::atomic<bool> is_told = false;
-  const auto answer = [&](HWND box) {
-    PostMessageW(box, WM_COMMAND, IDOK, 0);
-    is_told = true;
-  };
-  with_user(
-      dialog_class, [&] { press(VK_SPACE), messages_until([&] { return is_told.load(); }); }, answer);
+  const auto print_it = [&] { press(VK_SPACE), messages_until([&] { return is_told.load(); }); };
+  with_user(dialog_class, print_it, [&](HWND box) { is_told = PostMessageW(box, WM_COMMAND, IDOK, 0) != FALSE; });
   check(is_told, "a box tells that nothing can be printed");
   SetWindowPos(window, nullptr, 0, 0, 700, 600, SWP_NOMOVE | SWP_NOZORDER);
   RECT inside{};
@@ -297,10 +295,9 @@ void unattended_reports_are_written(_ORVUtils* u) {
   DeleteFileW(path.c_str());
   u->put_AutomatedEndOfMonth(VARIANT_TRUE);
   // A window alone: its picture is the report.
-  const HWND window = CreateWindowW(L"Static", L"A report", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 200, 100, nullptr,
-                                    nullptr, nullptr, nullptr);
+  const HWND report = window(L"Static", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 200, 100);
   HostObject grid({L"hwnd"},
-                  [&](const Use& use) { return use.answer(static_cast<LONG>(reinterpret_cast<LONG_PTR>(window))); });
+                  [&](const Use& use) { return use.answer(static_cast<LONG>(reinterpret_cast<LONG_PTR>(report))); });
   Value holder(&grid);
   Value empty;
   const HRESULT status =
@@ -310,41 +307,36 @@ void unattended_reports_are_written(_ORVUtils* u) {
   std::ifstream(path, std::ios::binary).read(start.data(), 5);
   check_equal("%PDF-", start, "the report of an unattended run");
   u->put_AutomatedEndOfMonth(VARIANT_FALSE);
-  DestroyWindow(window);
+  DestroyWindow(report);
 }
 
 /// Opens and closes each window, and looks at what is left of it.
 void nothing_is_left(_ORVUtils* u, int openings) {
+  const auto keys = [u] {
+    u->ShowShortCutKeys();
+    close(only_form());
+  };
+  const auto switches = [u] {
+    with_user(
+        form_class, [u] { u->ShowCmdLineHelp(); }, close);
+  };
+  const auto system = [u] {
+    with_user(
+        form_class, [u] { u->ShowSysInfo(); }, close);
+  };
   const std::pair<const char*, std::function<void()>> windows[] = {{"the input box", [u] { ask(u, {}, close); }},
-                                                                   {"the list of keys",
-                                                                    [u] {
-                                                                      u->ShowShortCutKeys();
-                                                                      for (const HWND window : top_windows(form_class))
-                                                                        close(window);
-                                                                    }},
-                                                                   {"the switches",
-                                                                    [u] {
-                                                                      with_user(
-                                                                          form_class, [u] { u->ShowCmdLineHelp(); },
-                                                                          close);
-                                                                    }},
-                                                                   {"the system",
-                                                                    [u] {
-                                                                      with_user(
-                                                                          form_class, [u] { u->ShowSysInfo(); }, close);
-                                                                    }},
+                                                                   {"the list of keys", keys},
+                                                                   {"the switches", switches},
+                                                                   {"the system", system},
                                                                    {"the preview", [u] { preview(u, L"x", close); }}};
   const auto count = [](DWORD kind) { return static_cast<int>(GetGuiResources(GetCurrentProcess(), kind)); };
   for (const auto& [name, open] : windows) {
     for (int i = 0; i < 5; ++i) open();
-    const int drawing = count(GR_GDIOBJECTS);
-    const int user = count(GR_USEROBJECTS);
+    const int before[] = {count(GR_GDIOBJECTS), count(GR_USEROBJECTS)};
     for (int i = 0; i < openings; ++i) open();
-    const int more_drawing = count(GR_GDIOBJECTS) - drawing;
-    const int more_user = count(GR_USEROBJECTS) - user;
-    check(more_drawing <= 2 && more_user <= 2, std::string("handles after opening ") + name + ": " +
-                                                   std::to_string(more_drawing) + " and " + std::to_string(more_user) +
-                                                   " more");
+    const int more[] = {count(GR_GDIOBJECTS) - before[0], count(GR_USEROBJECTS) - before[1]};
+    const std::string numbers = std::to_string(more[0]) + " and " + std::to_string(more[1]);
+    check(more[0] <= 2 && more[1] <= 2, std::string(name) + " leaves handles: " + numbers);
   }
 }
 
@@ -357,10 +349,13 @@ int wmain(int count, wchar_t** arguments) {
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();
     boxes_take_texts(u);
-    const auto help = [u] { check_equal(S_OK, u->ShowCmdLineHelp(), "ShowCmdLineHelp"); };
-    const auto system = [u] { check_equal(S_OK, u->ShowSysInfo(), "ShowSysInfo"); };
-    check_equal(1, with_user(form_class, help, switches_are_explained), "windows of switches");
-    check_equal(1, with_user(form_class, system, system_is_described), "windows of the system");
+    const std::pair<HRESULT (STDMETHODCALLTYPE _ORVUtils::*)(), void (*)(HWND)> members[] = {
+        {&_ORVUtils::ShowCmdLineHelp, switches_are_explained}, {&_ORVUtils::ShowSysInfo, system_is_described}};
+    for (const auto& [show, user] : members) {
+      const int shown = with_user(
+          form_class, [&, call = show] { check_equal(S_OK, (u->*call)(), "a window"); }, user);
+      check_equal(1, shown, "windows that were shown");
+    }
     keys_are_listed(u);
     if (count <= 3) {
       std::wstring pages;

@@ -10,10 +10,6 @@ using namespace talutil::hosts;
 
 namespace {
 
-HWND window(const wchar_t* window_class, DWORD style, int x, int y, int width, int height, HWND parent = nullptr) {
-  return CreateWindowW(window_class, L"", style, x, y, width, height, parent, nullptr, nullptr, nullptr);
-}
-
 /// The dots of a colour within a picture.
 int dots_of(IDispatch* picture, COLORREF colour) {
   const auto context = reinterpret_cast<HDC>(static_cast<LONG_PTR>(V_I4(&use(picture, L"hDC").result.get())));
@@ -24,9 +20,9 @@ int dots_of(IDispatch* picture, COLORREF colour) {
 
 /// The example host's own objects, of which nothing is left at the end.
 void windows_are_driven(_ORVUtils* u) {
-  const HWND outer = window(L"Static", WS_OVERLAPPEDWINDOW, 0, 0, 400, 300);
+  const HWND outer = window(L"Static", WS_OVERLAPPEDWINDOW, 400, 300);
   Scriptable* const form = form_object(outer);
-  Scriptable* const control = control_object(window(L"Static", WS_CHILD, 10, 10, 100, 50, outer), form);
+  Scriptable* const control = control_object(window(L"Static", WS_CHILD, 100, 50, outer), form);
   const auto position = create_object<_cControlPosition>(CLSID_cControlPosition, IID__cControlPosition);
   const float pixel = twips_per_pixel();
   check_equal(S_OK, position->DragControl(Value(form), Value(control), 20 * pixel, 30 * pixel), "a drag");
@@ -36,9 +32,7 @@ void windows_are_driven(_ORVUtils* u) {
   position->get_Top(top);
   check(left.value == std::lround(30 * pixel) && top.value == std::lround(40 * pixel), "where the control was dragged");
 
-  const HWND box = window(L"ComboBox", CBS_DROPDOWN, 0, 0, 100, 100);
-  for (const LPARAM key : {7, 19, 42})
-    SendMessageW(box, CB_SETITEMDATA, static_cast<WPARAM>(SendMessageW(box, CB_ADDSTRING, 0, LPARAM(L"entry"))), key);
+  const HWND box = combo_box({7, 19, 42});
   Scriptable* const combo = combo_object(box);
   Long index;
   check_equal(S_OK, u->GetComboListIndex(Value(combo), Long{42}, index), "a search for a key");

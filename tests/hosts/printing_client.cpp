@@ -78,11 +78,10 @@ LONG helper_answer(HMODULE helper, LONG window) {
 
 /// A form as PrintScreen wants it, and the print helper, which the client puts beside the library.
 void forms_are_printed(_ORVUtils* u, const std::wstring& folder, const std::wstring& output) {
-  const HWND window = CreateWindowW(L"Static", L"A window to print", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 10, 10, 400, 200,
-                                    nullptr, nullptr, nullptr, nullptr);
-  const auto number = static_cast<LONG>(reinterpret_cast<LONG_PTR>(window));
+  const HWND shown = window(L"Static", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 400, 200);
+  const auto number = static_cast<LONG>(reinterpret_cast<LONG_PTR>(shown));
   HostObject form({L"hwnd", L"Refresh"}, [&](const Use& use) {
-    return use.member == 1 ? use.answer(number) : UpdateWindow(window) != FALSE ? S_OK : E_FAIL;
+    return use.member == 1 ? use.answer(number) : UpdateWindow(shown) != FALSE ? S_OK : E_FAIL;
   });
   Value holder(&form);
   const auto is_asked = [&](std::vector<DISPID> members) {
@@ -107,7 +106,7 @@ void forms_are_printed(_ORVUtils* u, const std::wstring& folder, const std::wstr
   check_equal(1, helper_answer(helper, number), "a window and a printer");
   FreeLibrary(helper);
   DeleteFileW(beside.c_str());
-  DestroyWindow(window);
+  DestroyWindow(shown);
 }
 
 /// Does what prints by way of the printer dialog, which is answered with OK.
