@@ -241,64 +241,40 @@ std::string description_of(const Choice& choice) {
   return text;
 }
 
-class Calls {
- public:
-  Calls(IDispatch* object, std::initializer_list<IDispatch*> host_objects)
-      : object_(object), slots_(slots_of(object)), values_(hostile_values()) {
-    std::erase_if(slots_, is_left_out);
-    // An argument that is left out can only be so in a late call.
-    std::erase_if(values_, [](const Hostile& value) { return value.name == "missing"; });
-    for (const std::wstring_view text : texts)
-      add_all_ways(values_, "text " + narrow(text), [text] { return Value(text); });
-    for (IDispatch* const host : host_objects)
-      add_all_ways(values_, "an object of the host's", [host] { return Value(host); });
-    for (const double number : doubles)
-      add_all_ways(values_, "date", [number] { return Value(VT_DATE, &VARIANT::date, number); });
+Choice chosen(const std::vector<Slot>& slots, const std::vector<Hostile>& values, std::mt19937& random) {
+  Choice choice(slots[random() % slots.size()]);
+  int earlier = -1;  // The first place of a variant that is written back.
+  for (std::size_t i = 0; i < choice.values.size(); ++i) {
+    const SlotParameter& parameter = choice.slot->parameters[i];
+    choice.draws[i] = static_cast<std::uint32_t>(random());
+    if (parameter.bare() == VT_VARIANT) choice.values[i] = &values[random() % values.size()];
+    if (parameter.referenced != VT_VARIANT) continue;
+    if (random() % 4 == 0) choice.shares[i] = earlier;
+    if (earlier < 0) earlier = static_cast<int>(i);
   }
+  return choice;
+}
 
-  /// The same calls for the same seed. What is written to the disk or the registry by the first call of two may change
-  /// the second, so that a difference must show twice.
-  void compare(unsigned seed, long pairs) {
-    random_.seed(seed);
-    for (; pairs > 0; --pairs) {
-      const Choice choice = chosen();
-      std::wstring early;
-      std::wstring late;
-      for (int tries = 0; tries == 0 || (tries < 2 && early != late); ++tries) {
-        early = text_of(call_early, object_, choice);
-        late = text_of(call_late, object_, choice);
-      }
-      if (early != late && ++differences <= 10)
-        check(false, description_of(choice) + "\n  early " + narrow(early) + "\n  late  " + narrow(late));
+/// Makes the same calls for the same seed; answers how many differ. What is written to the disk or the registry by the
+/// first call of two may change the second, so that a difference must show twice.
+long differences(IDispatch* u, const std::vector<Hostile>& values, unsigned seed, long pairs) {
+  std::vector<Slot> slots = slots_of(u);
+  std::erase_if(slots, is_left_out);
+  std::mt19937 random(seed);
+  long count = 0;
+  for (; pairs > 0; --pairs) {
+    const Choice choice = chosen(slots, values, random);
+    std::wstring early;
+    std::wstring late;
+    for (int tries = 0; tries == 0 || (tries < 2 && early != late); ++tries) {
+      early = text_of(call_early, u, choice);
+      late = text_of(call_late, u, choice);
     }
+    if (early != late && ++count <= 10)
+      check(false, description_of(choice) + "\n  early " + narrow(early) + "\n  late  " + narrow(late));
   }
-
-  long differences = 0;
-
- private:
-  Choice chosen() {
-    Choice choice(slots_[random_() % slots_.size()]);
-    for (std::size_t i = 0; i < choice.values.size(); ++i) {
-      if (choice.slot->parameters[i].bare() == VT_VARIANT) choice.values[i] = &values_[random_() % values_.size()];
-      choice.draws[i] = static_cast<std::uint32_t>(random_());
-      choice.shares[i] = earlier_variant(*choice.slot, i);
-    }
-    return choice;
-  }
-
-  int earlier_variant(const Slot& slot, std::size_t place) {
-    if (slot.parameters[place].referenced != VT_VARIANT || random_() % 4 != 0) return -1;
-    for (std::size_t i = 0; i < place; ++i) {
-      if (slot.parameters[i].referenced == VT_VARIANT) return static_cast<int>(i);
-    }
-    return -1;
-  }
-
-  IDispatch* object_;
-  std::vector<Slot> slots_;
-  std::vector<Hostile> values_;
-  std::mt19937 random_;
-};
+  return count;
+}
 
 void let_go_of_objects(IDispatch* u) {
   for (const wchar_t* name : {L"FolderBrowseForm", L"SplashForm", L"DrawTextPictureBox"})
@@ -317,20 +293,29 @@ void both_ways_agree(IDispatch* u, unsigned seed, long wanted) {
   *form.receive() = form_object(outer);
   *combo.receive() = combo_object(box);
   *picture.receive() = picture_object(outer, 400, 300);
-  Calls calls(u, {form.get(), combo.get(), picture.get()});
+  std::vector<Hostile> values = hostile_values();
+  // An argument that is left out can only be so in a late call.
+  std::erase_if(values, [](const Hostile& value) { return value.name == "missing"; });
+  for (const std::wstring_view text : texts)
+    add_all_ways(values, "text " + narrow(text), [text] { return Value(text); });
+  for (IDispatch* const host : {form.get(), combo.get(), picture.get()})
+    add_all_ways(values, "an object of the host's", [host] { return Value(host); });
+  for (const double number : doubles)
+    add_all_ways(values, "date", [number] { return Value(VT_DATE, &VARIANT::date, number); });
+  long different = 0;
   const auto run = [&] {
-    calls.compare(seed, wanted / 4);
+    different += differences(u, values, seed, wanted / 4);
     let_go_of_objects(u);
     return bytes_in_use();
   };
   constexpr std::size_t tolerance = 16384;
   const std::size_t before = run();
   const std::size_t after = run();
-  std::printf("%ld calls, %ld differences, heaps from %zu to %zu bytes in the second half\n", wanted, calls.differences,
-              before, after);
+  std::printf("%ld calls, %ld differences, heaps from %zu to %zu bytes in the second half\n", wanted, different, before,
+              after);
   check(after < before + tolerance,
         "the calls took the heaps from " + std::to_string(before) + " to " + std::to_string(after) + " bytes");
-  check_equal(0L, calls.differences, "differences in " + std::to_string(wanted) + " calls");
+  check_equal(0L, different, "differences in " + std::to_string(wanted) + " calls");
   DestroyWindow(outer);
   DestroyWindow(box);
 }

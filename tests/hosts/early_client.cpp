@@ -3,7 +3,6 @@
 // letting go of its objects while they work.
 #include <xmmintrin.h>
 
-#include <cmath>
 #include <limits>
 
 #include "client.hpp"
@@ -67,17 +66,6 @@ void properties_keep_what_they_are_given(U* u) {
   auto length = static_cast<DWORD>(name.size());
   GetComputerNameW(name.data(), &length);
   check_equal(std::wstring_view(name.data(), length), computer.view(), "ComputerName");
-}
-
-void records_are_read_and_written(U* u) {
-  TALUtil_SYSTEMTIME time{0, 0, 77, 0, 0, 0, 0, 88};
-  DATE date = 0;
-  check_equal(S_OK, u->DateToSystemTime(39877.5732638889, &time), "DateToSystemTime");
-  const short expected[] = {2009, 3, 77, 5, 13, 45, 30, 88};
-  check(std::memcmp(expected, &time, sizeof time) == 0, "the record that was written");
-  time.wMonth = 13;
-  check_equal(S_OK, u->SystemTimeToDate(&time, &date), "SystemTimeToDate");
-  check(std::abs(date - 40183.5732638889) < 1e-9, "its date, " + std::to_string(date));
 }
 
 int timer_ticks = 0;
@@ -231,8 +219,8 @@ int wmain(int, wchar_t**) {
     U* const u = object.get();
     for (const auto check_part :
          {first_error_is_caught, settings_are_shared_and_survive, properties_keep_what_they_are_given,
-          records_are_read_and_written, passwords_let_messages_in, interfaces_are_one_object,
-          unmasked_exceptions_do_no_harm, short_precision_changes_no_digit})
+          passwords_let_messages_in, interfaces_are_one_object, unmasked_exceptions_do_no_harm,
+          short_precision_changes_no_digit})
       check_part(u);
     objects_outlive_their_calls();
     positions_are_their_own();

@@ -13,7 +13,6 @@ using namespace talutil::hosts;
 namespace {
 
 constexpr const wchar_t* form_class = L"TALUtilForm";
-constexpr const wchar_t* preview_class = L"TALUtilPreview";
 constexpr VARIANT_BOOL yes = VARIANT_TRUE;
 constexpr VARIANT_BOOL no = VARIANT_FALSE;
 constexpr LONG usual_colour = 0xC0E0FF;
@@ -245,18 +244,6 @@ void system_is_described(HWND window) {
   check(wait_until([&] { return rows_of(window) >= 8; }), "the details of a folder");
   check_equal(L"c:\\windows", text_of(controls(window, L"Edit").at(0)), "the path as it was typed");
   follow(window, "{picture system-folder}{click &Refresh}{ESC}");
-}
-
-/// Opens the preview of a text, the user doing what the function does; it must close the window.
-void preview(_ORVUtils* u, const std::wstring& text, const std::function<void(HWND)>& user) {
-  HostObject box({L"Text"}, [&](const Use& use) { return use.answer(std::wstring_view(text)); });
-  Value holder(&box);
-  const auto open = [&] {
-    const HRESULT status = u->TextBoxPrintPreview(Short{100}, Short{1}, Text(L"Notes"), Text(L"C:\\exports\\"), holder);
-    check_equal(S_OK, status, "TextBoxPrintPreview");
-  };
-  check_equal(1, with_user(preview_class, open, user), "preview windows");
-  check(top_windows(preview_class).empty(), "the window is gone");
 }
 
 void pages_are_shown(HWND window) {

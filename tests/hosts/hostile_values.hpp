@@ -53,24 +53,23 @@ inline void add_all_ways(std::vector<Hostile>& list, const std::string& name, co
     const bool is_whole = places.cell.type() == VT_DECIMAL;
     return Value::reference(places.cell.type(), is_whole ? places.cell : static_cast<void*>(&V_I8(&places.cell.get())));
   };
-  list.push_back({name, [make](Places& places) { places.argument = make(); }});
-  list.push_back({name + " by reference", [refer](Places& places) { places.argument = refer(places); }});
-  list.push_back({name + " in a variable", [make](Places& places) {
-                    places.cell = make();
-                    places.argument = Value(&places.cell.get());
-                  }});
-  list.push_back({name + " in a variable by reference", [refer](Places& places) {
-                    places.outer = refer(places).get();
-                    places.argument = Value(&places.outer);
-                  }});
+  const auto add = [&](const char* way, std::function<void(Places&)> place) { list.push_back({name + way, place}); };
+  add("", [make](Places& places) { places.argument = make(); });
+  add(" by reference", [refer](Places& places) { places.argument = refer(places); });
+  add(" in a variable", [make](Places& places) { places.argument = Value(&(places.cell = make()).get()); });
+  add(" in a variable by reference", [refer](Places& places) {
+    places.outer = refer(places).get();
+    places.argument = Value(&places.outer);
+  });
 }
 
 inline std::vector<Hostile> hostile_values() {
   std::vector<Hostile> list;
   // Every kind of variant there is and some there are not, all of them zero; texts, objects and arrays are null.
-  std::vector<int> types = {VT_RECORD,        VT_FILETIME,         VT_CLSID,
-                            VT_ARRAY,         VT_ARRAY | VT_BSTR,  VT_ARRAY | VT_VARIANT,
-                            VT_ARRAY | VT_I4, VT_VECTOR | VT_BSTR, VT_RESERVED | VT_I4};
+  constexpr int array = VT_ARRAY;
+  std::vector<int> types{VT_RECORD,     VT_FILETIME,         VT_CLSID,
+                         array,         array | VT_BSTR,     array | VT_VARIANT,
+                         array | VT_I4, VT_VECTOR | VT_BSTR, VT_RESERVED | VT_I4};
   for (int type = VT_EMPTY; type < 32; ++type) {
     if (type != VT_VARIANT) types.push_back(type);
   }
@@ -81,6 +80,8 @@ inline std::vector<Hostile> hostile_values() {
                     [type](Places& places) { places.argument = Value::reference(type, nullptr); }});
   }
   using Limits = std::numeric_limits<double>;
+  static constexpr auto two_texts = {L"a", L"b"};
+  static constexpr DECIMAL largest_decimal{0, {{0, 0}}, 0xFFFFFFFF, {{0xFFFFFFFF, 0xFFFFFFFF}}};
   const std::pair<const char*, Value (*)()> values[] = {
       {"number as text", [] { return Value(L"12"); }},
       {"text", [] { return Value(std::wstring_view(L"a\0\xD800,", 4)); }},
@@ -91,28 +92,17 @@ inline std::vector<Hostile> hostile_values() {
       {"date beyond the calendar", [] { return Value(VT_DATE, &VARIANT::date, Limits::max()); }},
       {"largest currency", [] { return Value(VT_CY, &VARIANT::llVal, std::numeric_limits<LONGLONG>::max()); }},
       {"largest whole number", [] { return Value(VT_UI8, &VARIANT::llVal, -1); }},
-      {"largest decimal",
-       [] {
-         DECIMAL number{};
-         number.Hi32 = number.Lo32 = number.Mid32 = 0xFFFFFFFF;
-         return Value(VT_DECIMAL, &VARIANT::decVal, number);
-       }},
+      {"largest decimal", [] { return Value(VT_DECIMAL, &VARIANT::decVal, largest_decimal); }},
       {"object with a value", [] { return Value(&with_value); }},
       {"object without a value", [] { return Value(&without_value); }},
       {"object that fails", [] { return Value(&failing); }},
-      {"texts",
-       [] {
-         return Value::array(VT_BSTR, 0, {L"a", L"b"});
-       }},
+      {"texts", [] { return Value::array(VT_BSTR, 0, two_texts); }},
       {"variants from 1", [] { return Value::array(VT_VARIANT, 1, {L"a"}); }},
       {"numbers", [] { return Value::array(VT_I4, -1, {}); }},
       {"two dimensions", [] { return Value::square(VT_VARIANT); }},
   };
   for (const auto& [name, make] : values) add_all_ways(list, name, make);
-  list.push_back({"a circle", [](Places& places) {
-                    places.outer = Value(&places.outer).get();
-                    places.argument = Value(&places.outer);
-                  }});
+  list.push_back({"a circle", [](Places& places) { places.outer = (places.argument = Value(&places.outer)).get(); }});
   return list;
 }
 

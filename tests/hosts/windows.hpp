@@ -192,6 +192,20 @@ bool messages_until(Condition&& condition) {
 
 inline void close(HWND window) { SendMessageW(window, WM_CLOSE, 0, 0); }
 
+constexpr const wchar_t* preview_class = L"TALUtilPreview";
+
+/// Opens the preview of a text, the user doing what the function does; it must close the window.
+inline void preview(_ORVUtils* u, std::wstring_view text, const std::function<void(HWND)>& user) {
+  HostObject box({L"Text"}, [&](const Use& use) { return use.answer(text); });
+  Value holder(&box);
+  const auto open = [&] {
+    const HRESULT status = u->TextBoxPrintPreview(Short{100}, Short{1}, Text(L"Notes"), Text(L"C:\\exports\\"), holder);
+    check_equal(S_OK, status, "TextBoxPrintPreview");
+  };
+  check_equal(1, with_user(preview_class, open, user), "preview windows");
+  check(top_windows(preview_class).empty(), "the window is gone");
+}
+
 /// Whether the thread was asked to quit; takes the request away.
 inline bool is_asked_to_quit(WPARAM code) {
   MSG message{};
