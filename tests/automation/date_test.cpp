@@ -3,18 +3,16 @@
 #include <gtest/gtest.h>
 
 #include "tests/fakes/error_of.hpp"
+#include "tests/fakes/rows.hpp"
 
 namespace talutil {
 namespace {
 
+using testing::check_rows;
 using testing::outcome;
 
 TEST(Date, DaysAndParts) {
-  const struct {
-    const char* name;
-    double days;
-    DateParts parts;
-  } rows[] = {
+  const testing::Rows<double, DateParts> rows = {
       {"day 0", 0, {1899, 12, 30, 0, 0, 0}},
       {"the fraction counts up before day 0 too", -1.25, {1899, 12, 29, 6, 0, 0}},
       {"a fraction below 0 on day 0", 0.75, {1899, 12, 30, 18, 0, 0}},
@@ -23,12 +21,10 @@ TEST(Date, DaysAndParts) {
       {"last of the first day", -657434.99998842592, {100, 1, 1, 23, 59, 59}},
       {"last", 2958465.99998842592, {9999, 12, 31, 23, 59, 59}},
   };
-  for (const auto& row : rows) {
-    EXPECT_EQ(parts_of({row.days}), row.parts) << row.name;
-    const auto back = date_from_parts(row.parts);
-    ASSERT_TRUE(back) << row.name;
-    EXPECT_NEAR(back->days, row.days, 1e-9) << row.name;
-  }
+  check_rows(rows, [](double days, const DateParts& parts) {
+    EXPECT_EQ(parts_of({days}), parts);
+    EXPECT_NEAR(date_from_parts(parts).value().days, days, 1e-9);
+  });
   EXPECT_EQ(parts_of({-0.25}), (DateParts{1899, 12, 30, 6, 0, 0}));
   EXPECT_EQ(parts_of({39876.999999}), (DateParts{2009, 3, 5, 0, 0, 0}));
   EXPECT_EQ(parts_of({-1.999999}), (DateParts{1899, 12, 30, 0, 0, 0}));
@@ -74,15 +70,7 @@ TEST(Date, TextToDate) {
 
 TEST(Date, Intervals) {
   using enum DateInterval;
-  const struct {
-    const char* name;
-    DateInterval interval;
-    std::int32_t count;
-    TextView from;
-    const char* added;
-    TextView to;
-    std::int32_t boundaries;
-  } rows[] = {
+  const testing::Rows<DateInterval, std::int32_t, TextView, std::string, TextView, std::int32_t> rows = {
       {"seconds across day 0", second, -1, u"30/12/1899", "29/12/1899 23:59:59", u"29/12/1899 23:59:58", -2},
       {"minutes", minute, 90, u"1/1/1800", "01/01/1800 01:30", u"1/1/1800 1:30:59", 90},
       {"hours before day 0", hour, -26, u"2/1/1800 1:30", "31/12/1799 23:30", u"1/1/1800 23:59", -2},
@@ -90,11 +78,11 @@ TEST(Date, Intervals) {
       {"a month's last day", month, 1, u"31/1/2008 13:45", "29/02/2008 13:45", u"1/3/2007", -10},
       {"years", year, -1, u"29/2/2008", "28/02/2007", u"1/1/1899", -109},
   };
-  for (const auto& row : rows) {
-    const Date from = Variant(row.from).to_date(plain_numbers);
-    EXPECT_EQ(outcome([&] { return date_add(row.interval, row.count, from); }), row.added) << row.name;
-    EXPECT_EQ(date_difference(row.interval, from, Variant(row.to).to_date(plain_numbers)), row.boundaries) << row.name;
-  }
+  check_rows(rows, [](auto interval, auto count, TextView start, const auto& added, TextView end, auto boundaries) {
+    const Date from = Variant(start).to_date(plain_numbers);
+    EXPECT_EQ(outcome([&] { return date_add(interval, count, from); }), added);
+    EXPECT_EQ(date_difference(interval, from, Variant(end).to_date(plain_numbers)), boundaries);
+  });
   EXPECT_EQ(outcome([] { return date_add(day, 1, Date{2958465}); }), "error 5");
   EXPECT_EQ(outcome([] { return date_add(month, -1, Date{-657434}); }), "error 5");
   EXPECT_EQ(outcome([] { return date_add(year, 2147483647, Date{}); }), "error 5");

@@ -1,12 +1,8 @@
 #include "automation/late_call.hpp"
 
-#include <gtest/gtest.h>
-
-#include <string>
-#include <vector>
-
 #include "automation/run_time_error.hpp"
-#include "tests/fakes/error_of.hpp"
+#include "tests/fakes/late_members.hpp"
+#include "tests/fakes/recording_control.hpp"
 
 namespace talutil {
 namespace {
@@ -47,69 +43,57 @@ constexpr auto members_of(std::type_identity<Sample>) {
                  P::template method<&Sample::Count>("Count", "", "list", "anything"));
 }
 
-class LateCallTest : public ::testing::Test {
- protected:
-  Variant call(TextView name, Access access, std::vector<Argument> arguments = {}) {
-    given_ = std::move(arguments);
-    const LateInterface& members = late_interface<Sample>();
-    return members.call(&sample_, members.slot_of(members.identifier_of(name), access), given_, plain_numbers);
+Variant use(Sample& sample, TextView name, Access access, std::span<Argument> arguments) {
+  const LateInterface& members = late_interface<Sample>();
+  return members.call(&sample, members.slot_of(members.identifier_of(name), access), arguments, plain_numbers);
+}
+
+TEST(LateCall, CoercesArgumentsAndWritesBackInTheTypeOfTheParameter) {
+  using enum Access;
+  const struct {
+    TextView member;
+    Access access;
+    TextView arguments;
+    std::string_view answer;
+  } rows[] = {
+      {u"join", call, u"=5|b", "\"5-b\""},
+      {u"JOIN", call, u"a|b|+", "\"a+b\""},
+      {u"Join", get, u"a|b", "\"a-b\""},  // A method's answer.
+      {u"Join", call, u"a|@empty|-", "\"a-\" | \"filled\""},
+      // With a default in play the arguments travel through places of the call's own, and come back.
+      {u"Join", call, u"a||@missing", "\"a-\" | \"filled\""},
+      {u"WriteThenFail", call, u"1", "error 9 | 7%"},
+      {u"Size", put, u" 12 ", "Empty"},
+      {u"Size", get, u"@none", "12&"},
+      {u"Size", call, u"@none", "12&"},
+      {u"Name", get, u"@none", "\"sample\""},
+      {u"Nothing", call, u"@none", "error 438"},
+      {u"Join", call, u"a", "error 449"},
+      // A variable that stands for an argument which its own caller left out is a value where one is required.
+      {u"Join", call, u"@missing|b", "error 13"},
+      {u"Join", call, u"a|b|c|d", "error 450"},
+      {u"Join", call, u"@null|b", "error 94"},
+      {u"Count", call, u"no array|@empty", "error 13"},
+      {u"Picture", put, u"a text", "error 13"},
+      {u"Picture", put, u"@empty", "error 13"},
+  };
+  Sample sample;
+  for (const auto& [member, access, arguments, answer] : rows) {
+    const auto use_it = [&](auto given) { return use(sample, member, access, given); };
+    EXPECT_EQ(testing::late_answer(arguments, &testing::shown, use_it), answer)
+        << to_utf8(member) << to_utf8(arguments);
   }
-
-  std::int32_t error(TextView name, Access access, std::vector<Argument> arguments = {}) {
-    return talutil::testing::error_of([&] { call(name, access, std::move(arguments)); });
-  }
-
-  Sample sample_;
-  std::vector<Argument> given_;
-};
-
-TEST_F(LateCallTest, CoercesArgumentsAndFillsDefaults) {
-  EXPECT_EQ(call(u"join", Access::call, {Variant(std::int16_t{5}), Variant(u"b")}), Variant(u"5-b"));
-  EXPECT_FALSE(given_[1].is_changed);
-  EXPECT_EQ(call(u"JOIN", Access::call, {Variant(u"a"), Variant(u"b"), Variant(u"+")}), Variant(u"a+b"));
-  EXPECT_EQ(call(u"Join", Access::call, {Variant(u"a"), Variant(u"b"), Variant(missing_argument)}), Variant(u"a-b"));
-  call(u"Size", Access::put, {Variant(u" 12 ")});
-  EXPECT_EQ(call(u"Size", Access::get), Variant(std::int32_t{12}));
-  EXPECT_EQ(call(u"Size", Access::call), Variant(std::int32_t{12}));
-  EXPECT_EQ(call(u"Name", Access::get), Variant(u"sample"));
-  EXPECT_EQ(call(u"Join", Access::get, {Variant(u"a"), Variant(u"b")}), Variant(u"a-b")) << "a method's answer";
 }
 
-TEST_F(LateCallTest, WritesBackWhatChangedInTheTypeOfTheParameter) {
-  call(u"Join", Access::call, {Variant(u"a"), Variant(), Variant(u"-")});
-  EXPECT_TRUE(given_[1].is_changed);
-  EXPECT_EQ(given_[1].value, Variant(u"filled"));
-
-  call(u"Count", Access::call, {Variant(), Variant(u"x")});
-  EXPECT_EQ(given_[0].value, Variant(TextArray{{u"more"}, 0, true}));
-  EXPECT_EQ(given_[1].value, Variant(Date{1}));
-
-  // With a default in play the arguments travel through places of the call's own, and come back.
-  call(u"Join", Access::call, {Variant(u"a"), Variant(u""), Variant(missing_argument)});
-  EXPECT_EQ(given_[1].value, Variant(u"filled"));
-}
-
-TEST_F(LateCallTest, KeepsWhatWasWrittenBeforeAnError) {
-  EXPECT_EQ(error(u"WriteThenFail", Access::call, {Variant(u"1")}), 9);
-  EXPECT_EQ(given_[0].value, Variant(std::int16_t{7}));
-  EXPECT_TRUE(given_[0].is_changed);
-}
-
-TEST_F(LateCallTest, RefusesWrongCalls) {
-  EXPECT_EQ(error(u"Nothing", Access::call), 438);
-  EXPECT_EQ(error(u"Join", Access::call, {Variant(u"a")}), 449);
-  // A variable that stands for an argument which its own caller left out is a value where one is required.
-  EXPECT_EQ(error(u"Join", Access::call, {Variant(missing_argument), Variant(u"b")}), 13);
-  EXPECT_EQ(error(u"Join", Access::call, {Variant(u"a"), Variant(u"b"), Variant(u"c"), Variant(u"d")}), 450);
-  EXPECT_EQ(error(u"Join", Access::call, {Variant(Null{}), Variant(u"b")}), 94);
-  EXPECT_EQ(error(u"Count", Access::call, {Variant(u"no array"), Variant()}), 13);
+TEST(LateCall, TakesArraysAndObjects) {
+  Sample sample;
+  std::vector<Argument> arguments{Variant(), Variant(u"x")};
+  EXPECT_EQ(use(sample, u"Count", Access::call, arguments), Variant(1));
+  EXPECT_EQ(arguments[0].value, Variant(TextArray{{u"more"}, 0, true}));
+  EXPECT_EQ(arguments[1].value, Variant(Date{1}));
+  arguments = {Variant(ObjectRef())};
+  use(sample, u"Picture", Access::put, arguments);
   EXPECT_EQ(late_interface<Sample>().slot_of(0x1234, Access::put), -1);
-}
-
-TEST_F(LateCallTest, ObjectPropertiesTakeObjectsOnly) {
-  EXPECT_EQ(error(u"Picture", Access::put, {Variant(u"a text")}), 13);
-  EXPECT_EQ(error(u"Picture", Access::put, {Variant()}), 13);
-  EXPECT_EQ(error(u"Picture", Access::put, {Variant(ObjectRef())}), 0);
 }
 
 }  // namespace

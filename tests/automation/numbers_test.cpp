@@ -19,12 +19,6 @@ using testing::outcome;
 constexpr double infinity = std::numeric_limits<double>::infinity();
 constexpr Locale comma_locale{.decimal_separator = u',', .thousands_separator = u'.', .currency_symbol = {u'\u20AC'}};
 
-struct ReadingRow {
-  const char* name;
-  TextView text;
-  const char* expected;
-};
-
 // Without blanks, other bases and separators a number is what the C library takes for one.
 TEST(Numbers, AreReadAsTheCLibraryReadsThem) {
   constexpr TextView pieces[] = {u"0", u"1", u"25", u"007", u"9999", u".", u"-", u"+", u"e", u"E+", u"e-", u"y"};
@@ -45,8 +39,40 @@ TEST(Numbers, AreReadAsTheCLibraryReadsThem) {
   }
 }
 
+// The nearest whole number to a quotient, the even one of two.
+std::int64_t rounded(std::int64_t number, std::int64_t divisor) {
+  const std::int64_t rest = ((number % divisor) + divisor) % divisor;
+  const std::int64_t below = (number - rest) / divisor;
+  return rest * 2 > divisor || (rest * 2 == divisor && below % 2 != 0) ? below + 1 : below;
+}
+
+TEST(Numbers, TextsAreRoundedExactly) {
+  constexpr std::int64_t powers[] = {1, 10, 100, 1000, 10'000, 100'000, 1'000'000};
+  constexpr std::int64_t edges[] = {0, 0, 32767, -32768, 2147483647, -2147483648};
+  testing::Generator generator;
+  for (int i = 0; i < 20'000; ++i) {
+    // Around halves of whole numbers and of ten-thousandths, at the ends of types and elsewhere.
+    const std::size_t places = static_cast<std::size_t>(generator.whole(1, 6));
+    const std::int64_t scale = powers[places];
+    const std::int64_t halves[] = {0, scale / 2, places > 4 ? powers[places - 4] / 2 : 0, generator.whole(0, 999'999)};
+    const std::int64_t number = (generator.one_of(edges) + generator.whole(-3, 3)) * scale + generator.one_of(halves) +
+                                generator.whole(-1, 1) + (i % 2) * generator.whole(-1000, 1000) * powers[5];
+    const std::string digits = std::to_string(std::abs(number) % scale + scale).substr(1);
+    const Text text = from_utf8((number < 0 ? "-" : "") + std::to_string(std::abs(number) / scale) + "." + digits);
+    const std::int64_t whole = rounded(number, scale);
+    EXPECT_EQ(outcome([&] { return text_to_integer<std::int16_t>(text); }),
+              outcome([&] { return checked_cast<std::int16_t>(whole); }))
+        << to_utf8(text);
+    EXPECT_EQ(outcome([&] { return text_to_integer<std::int32_t>(text); }),
+              outcome([&] { return checked_cast<std::int32_t>(whole); }))
+        << to_utf8(text);
+    const std::int64_t money = places > 4 ? rounded(number, powers[places - 4]) : number * powers[4 - places];
+    EXPECT_EQ(text_to_currency(text), Currency{money}) << to_utf8(text);
+  }
+}
+
 TEST(Numbers, LeadingNumber) {
-  const ReadingRow rows[] = {
+  const testing::Rows<TextView, std::string> rows = {
       {"stops at a comma", u"1,000", "1"},
       {"skips every kind of blank", u"\t-\r1\n2\u3000. 5 e \u30001", "-125"},
       {"stops at a no-break blank", u"1\u00A02", "1"},
@@ -66,7 +92,9 @@ TEST(Numbers, LeadingNumber) {
       {"zero with a huge exponent", u"0E99999", "0"},
       {"leading zeros count against the exponent", u"0.0001E312", "1E+308"},
   };
-  for (const auto& row : rows) EXPECT_EQ(outcome([&] { return leading_number(row.text); }), row.expected) << row.name;
+  check_rows(rows, [](TextView text, const std::string& number) {
+    EXPECT_EQ(outcome([&] { return leading_number(text); }), number);
+  });
 }
 
 TEST(Numbers, LongTextsTakeLinearTime) {
@@ -94,58 +122,35 @@ TEST(Numbers, ToText) {
 }
 
 TEST(Numbers, WholeTexts) {
-  const ReadingRow rows[] = {
-      {"blanks around", u" \t5\u00A0", "5"},
-      {"signs at both ends", u"-5-", "none"},
-      {"brackets", u"($1,234.5)", "-1234.5"},
-      {"bracket left open", u"(5", "none"},
-      {"another currency", u"\u00A35", "none"},
-      {"separators anywhere behind a digit", u"1,0,0,", "100"},
-      {"separator first", u",1", "none"},
-      {"hexadecimal has no sign of its own", u" &hffff ", "65535"},
-      {"wide hexadecimal", u"&HFFFFFFFFFF", "1099511627775"},
-      {"no bits", u"&H", "none"},
-      {"digits of another script", u"\uFF15", "none"},
+  // As a number, a currency and a whole number of 16 and 32 bits.
+  const testing::Rows<TextView, std::string, std::string, std::string, std::string> rows = {
+      {"blanks around", u" \t5\u00A0", "5", "5", "5", "5"},
+      {"brackets", u"($1,234.5)", "-1234.5", "-1234.5", "-1234", "-1234"},
+      {"separators anywhere behind a digit", u"1,0,0,", "100", "100", "100", "100"},
+      {"bits of either width", u" &hffff ", "65535", "65535", "-1", "65535"},
+      {"bits of one width", u"&HFFFFFFFF", "4294967295", "4294967295", "error 6", "-1"},
+      {"too many bits", u"&HFFFFFFFFFF", "1099511627775", "1099511627775", "error 6", "error 6"},
+      {"signed bits", u"-&H8000", "-32768", "-32768", "-32768", "-32768"},
+      {"above half by little", u"2.5000000000000000001", "2.5", "2.5", "3", "3"},
+      {"half a ten-thousandth", u"-0.0000500000000000000000001", "-5E-05", "-0.0001", "0", "0"},
+      {"largest currency", u"922337203685477.5807", "922337203685478", "922337203685477.5807", "error 6", "error 6"},
+      {"lowest", u"-922337203685477.5808", "-922337203685478", "-922337203685477.5808", "error 6", "error 6"},
+      {"one more", u"922337203685477.5808", "922337203685478", "error 6", "error 6", "error 6"},
+      {"one digit more than 64 bits hold", u"1e16", "1E+16", "error 6", "error 6", "error 6"},
   };
-  for (const auto& row : rows) EXPECT_EQ(outcome([&] { return text_to_number(row.text); }), row.expected) << row.name;
-  EXPECT_EQ(text_to_number(u"\u20AC 1.234,5", comma_locale), 1234.5);
-  EXPECT_EQ(text_to_number(u"0.1"), 0.1);
-  EXPECT_EQ(text_to_number(u" "), std::nullopt);
-}
-
-TEST(Numbers, TextToCurrencyAndIntegers) {
-  const ReadingRow currency[] = {
-      {"half to even, down", u"1.00005", "1"},
-      {"half to even, up", u"1.00015", "1.0002"},
-      {"above half", u"1.0000500000000000000000001", "1.0001"},
-      {"below a ten-thousandth", u"0.00004", "0"},
-      {"half a ten-thousandth", u"-0.000050001", "-0.0001"},
-      {"exact where a double is not", u"922337203685477.5807", "922337203685477.5807"},
-      {"lowest", u"-922337203685477.5808", "-922337203685477.5808"},
-      {"one more", u"922337203685477.5808", "error 6"},
-      {"one digit more than 64 bits hold", u"1e16", "error 6"},
-      {"hexadecimal", u"&HFFFF", "65535"},
-      {"no number", u"abc", "none"},
-  };
-  for (const auto& row : currency) {
-    EXPECT_EQ(outcome([&] { return text_to_currency(row.text); }), row.expected) << row.name;
-  }
-  const testing::Rows<TextView, std::string, std::string> integers = {
-      {"half to even", u"2.5", "2", "2"},
-      {"above half by little", u"2.5000000000000000001", "3", "3"},
-      {"bits of either width", u"&HFFFF", "-1", "65535"},
-      {"bits of one width", u"&HFFFFFFFF", "error 6", "-1"},
-      {"too many bits", u"&H100000000", "error 6", "error 6"},
-      {"signed bits", u"-&H8000", "-32768", "-32768"},
-      {"16-bit edge", u"32767.5", "error 6", "32768"},
-      {"32-bit edge", u"-2147483648.5", "error 6", "-2147483648"},
-      {"beyond it", u"2147483647.5", "error 6", "error 6"},
-      {"no number", u"1x", "none", "none"},
-  };
-  check_rows(integers, [](TextView text, const std::string& as_16, const std::string& as_32) {
+  const auto check = [](TextView text, const auto& number, const auto& currency, const auto& as_16, const auto& as_32) {
+    EXPECT_EQ(outcome([&] { return text_to_number(text); }), number);
+    EXPECT_EQ(outcome([&] { return text_to_currency(text); }), currency);
     EXPECT_EQ(outcome([&] { return text_to_integer<std::int16_t>(text); }), as_16);
     EXPECT_EQ(outcome([&] { return text_to_integer<std::int32_t>(text); }), as_32);
-  });
+  };
+  check_rows(rows, check);
+  for (const TextView none : {u"-5-", u"(5", u"\u00A35", u",1", u"&H", u"\uFF15", u"abc", u"1x", u" "}) {
+    SCOPED_TRACE(to_utf8(none));
+    check(none, "none", "none", "none", "none");
+  }
+  EXPECT_EQ(text_to_number(u"\u20AC 1.234,5", comma_locale), 1234.5);
+  EXPECT_EQ(text_to_number(u"0.1"), 0.1);
 }
 
 TEST(Numbers, Rounding) {

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "tests/fakes/error_of.hpp"
+#include "tests/fakes/rows.hpp"
 
 namespace talutil {
 namespace {
@@ -10,26 +11,14 @@ namespace {
 using testing::outcome;
 
 TEST(Text, TrimsBlanksOnly) {
-  const struct {
-    const char* name;
-    TextView text;
-    TextView expected;
-  } rows[] = {
-      {"both ends", u"  a b ", u"a b"},
-      {"nothing but blanks", u"   ", u""},
-      {"empty", u"", u""},
-      {"tabs, breaks and no-break blanks stay", u" \t a\r\n\u00A0 ", u"\t a\r\n\u00A0"},
-  };
-  for (const auto& row : rows) EXPECT_EQ(trim_blanks(row.text), row.expected) << row.name;
-}
-
-TEST(Text, EveryByteComesBackThroughItsCharacter) {
-  for (int code = 0; code < 256; ++code) EXPECT_EQ(ansi_code(chr(code).front()), code);
-  EXPECT_EQ(outcome([] { return chr(256); }), "error 5");
-  EXPECT_EQ(outcome([] { return chr(-1); }), "error 5");
+  EXPECT_EQ(trim_blanks(u"  a b "), u"a b");
+  EXPECT_EQ(trim_blanks(u"   "), u"");
+  EXPECT_EQ(trim_blanks(u" \t a\r\n\u00A0 "), u"\t a\r\n\u00A0") << "tabs, breaks and no-break blanks stay";
 }
 
 TEST(Text, AnsiBytes) {
+  for (int code = 0; code < 256; ++code) EXPECT_EQ(ansi_code(chr(code).front()), code);
+  for (const int code : {-1, 256}) EXPECT_EQ(outcome([&] { return chr(code); }), "error 5") << code;
   EXPECT_EQ(to_ansi(u"O\u2019Neil \u0141\u4E00"), "O\x92Neil L?");
   EXPECT_EQ(from_ansi("O\x92Neil \x9F"), u"O\u2019Neil \u0178");
 }
@@ -44,23 +33,12 @@ TEST(Text, LetterCase) {
 }
 
 TEST(Text, Utf8) {
-  const struct {
-    const char* name;
-    TextView text;
-    std::string_view bytes;
-  } both_ways[] = {
-      {"one to three bytes", u"a\u007F\u0080\u07FF\u0800\uFFFF", "a\x7F\xC2\x80\xDF\xBF\xE0\xA0\x80\xEF\xBF\xBF"},
-      {"four bytes", u"\U00010000\U0010FFFF", "\xF0\x90\x80\x80\xF4\x8F\xBF\xBF"},
-  };
-  for (const auto& row : both_ways) {
-    EXPECT_EQ(to_utf8(row.text), row.bytes) << row.name;
-    EXPECT_EQ(from_utf8(row.bytes), row.text) << row.name;
-  }
-  const struct {
-    const char* name;
-    std::string_view bytes;
-    TextView expected;
-  } bad[] = {
+  // The first and the last character of each length.
+  constexpr TextView text = u"a\u007F\u0080\u07FF\u0800\uFFFF\U00010000\U0010FFFF";
+  constexpr auto bytes = "a\x7F\xC2\x80\xDF\xBF\xE0\xA0\x80\xEF\xBF\xBF\xF0\x90\x80\x80\xF4\x8F\xBF\xBF";
+  EXPECT_EQ(to_utf8(text), bytes);
+  EXPECT_EQ(from_utf8(bytes), text);
+  const testing::Rows<std::string_view, TextView> bad = {
       {"continuation alone", "\x80z", u"\uFFFDz"},
       {"overlong", "\xC0\x80", u"\uFFFD\uFFFD"},
       {"overlong, three bytes", "\xE0\x80\x80", u"\uFFFD\uFFFD\uFFFD"},
@@ -69,7 +47,7 @@ TEST(Text, Utf8) {
       {"cut short", "a\xE2\x82", u"a\uFFFD\uFFFD"},
       {"interrupted", "\xE2\x82z", u"\uFFFD\uFFFDz"},
   };
-  for (const auto& row : bad) EXPECT_EQ(from_utf8(row.bytes), row.expected) << row.name;
+  testing::check_rows(bad, [](std::string_view given, TextView read) { EXPECT_EQ(from_utf8(given), read); });
   const char16_t lone[] = {0xDC00, 0xD800, u'z', 0xD800};
   EXPECT_EQ(to_utf8(TextView(lone, 4)), "\xEF\xBF\xBD\xEF\xBF\xBDz\xEF\xBF\xBD");
 }

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
+
 #include "tests/fakes/error_of.hpp"
 #include "tests/fakes/recording_control.hpp"
 #include "tests/fakes/rows.hpp"
@@ -53,6 +55,22 @@ TEST(Variant, Conversions) {
   check_rows(refused, [&](const Variant& value, const Outcome& error) {
     check(value, error, error, error, error, error, error);
   });
+}
+
+TEST(Variant, ConversionsOfNumbersAreOdd) {
+  testing::Generator generator;
+  for (int i = 0; i < 10'000; ++i) {
+    const double number = std::ldexp(generator.whole(1, 1 << 30), generator.whole(-60, 150) * generator.whole(0, 2));
+    const auto compare = [&](auto convert) {
+      const std::string positive = outcome([&] { return convert(Variant(number)); });
+      const std::string negative = positive == "0" || positive.starts_with("error") ? positive : "-" + positive;
+      EXPECT_EQ(outcome([&] { return convert(Variant(-number)); }), negative) << number;
+    };
+    compare([](const Variant& value) { return value.to_single(plain_numbers); });
+    compare([](const Variant& value) { return value.to_int16(plain_numbers); });
+    compare([](const Variant& value) { return value.to_int32(plain_numbers); });
+    compare([](const Variant& value) { return value.to_currency(plain_numbers); });
+  }
 }
 
 TEST(Variant, NarrowConversions) {

@@ -9,33 +9,52 @@
 
 namespace talutil::testing {
 
-/// A call as a table writes it: a member, its arguments parted by "|", where "@null", "@empty" and "@error" are those
-/// values, "#5/3/2009#" a date, "=1.5" a number and everything else a text, and the answer, which is the result in the
-/// same form and then each argument that was written back.
+/// A call as a table writes it: a member, its arguments parted by "|", where "@null", "@empty", "@missing" and "@error"
+/// are those values, "#5/3/2009#" a date, "=1.5" a number and everything else a text, and the answer, which is the
+/// result in the same form and then each argument that was written back.
 struct LateRow {
   TextView member, arguments;
   std::string_view answer;
 };
 
+inline Variant late_value(TextView written) {
+  if (written == u"@null") return Null{};
+  if (written == u"@empty") return {};
+  if (written == u"@missing") return missing_argument;
+  if (written == u"@error") return ErrorValue{5};
+  if (written.starts_with(u'=')) return Variant(written.substr(1)).to_double(plain_numbers);
+  if (written.starts_with(u'#')) return Variant(written.substr(1, written.size() - 2)).to_date(plain_numbers);
+  return written;
+}
+
+inline std::string shown_late(const Variant& value) {
+  if (value.is(Variant::Kind::empty)) return "Empty";
+  const std::string text = to_utf8(value.to_text(plain_numbers));
+  return value.is(Variant::Kind::date) ? "#" + text + "#" : text;
+}
+
+/// What a call answers with the arguments of a row ("@none" is without any), shown by a function.
+template <class Show, class Call>
+std::string late_answer(TextView written, Show show, Call call) {
+  std::vector<Argument> arguments;
+  for (std::size_t start = 0; start <= written.size() && written != u"@none";) {
+    const std::size_t end = std::min(written.find(u'|', start), written.size());
+    arguments.emplace_back(late_value(written.substr(start, end - start)));
+    start = end + 1;
+  }
+  std::string answer;
+  const std::int32_t error = error_of([&] { answer = show(call(std::span(arguments))); });
+  if (error != 0) answer = "error " + std::to_string(error);
+  for (const Argument& argument : arguments) {
+    if (argument.is_changed) answer += " | " + show(argument.value);
+  }
+  return answer;
+}
+
 class LateMembers : public UtilsTest {
  protected:
   std::string call(TextView member, TextView written) {
-    std::vector<Argument> arguments;
-    for (std::size_t start = 0; start <= written.size();) {
-      const std::size_t end = std::min(written.find(u'|', start), written.size());
-      arguments.emplace_back(read(written.substr(start, end - start)));
-      start = end + 1;
-    }
-    std::string answer;
-    try {
-      answer = shown(call(member, Access::call, arguments));
-    } catch (const RunTimeError& error) {
-      answer = "error " + std::to_string(error.number());
-    }
-    for (const Argument& argument : arguments) {
-      if (argument.is_changed) answer += " | " + shown(argument.value);
-    }
-    return answer;
+    return late_answer(written, &shown_late, [&](auto arguments) { return call(member, Access::call, arguments); });
   }
 
   Variant call(TextView member, Access access, std::span<Argument> arguments) {
@@ -48,22 +67,6 @@ class LateMembers : public UtilsTest {
     for (const auto& [member, arguments, answer] : rows) {
       EXPECT_EQ(call(member, arguments), answer) << to_utf8(member) << '(' << to_utf8(arguments) << ')';
     }
-  }
-
- private:
-  static Variant read(TextView written) {
-    if (written == u"@null") return Null{};
-    if (written == u"@empty") return {};
-    if (written == u"@error") return ErrorValue{5};
-    if (written.starts_with(u'=')) return Variant(written.substr(1)).to_double(plain_numbers);
-    if (written.starts_with(u'#')) return Variant(written.substr(1, written.size() - 2)).to_date(plain_numbers);
-    return written;
-  }
-
-  static std::string shown(const Variant& value) {
-    if (value.is(Variant::Kind::empty)) return "Empty";
-    const std::string text = to_utf8(value.to_text(plain_numbers));
-    return value.is(Variant::Kind::date) ? "#" + text + "#" : text;
   }
 };
 
