@@ -38,11 +38,10 @@ printf 'secret\n' >password
 same() { diff -r data "$1/data" && [ "$(stat -c '%a %Y' data/numbers.txt)" = "$(stat -c '%a %Y' "$1/data/numbers.txt")" ]; }
 
 read_by_python() {
-  python3 - "$1" "${2:-}" <<'P'
+  python3 - "$1" <<'P'
 import sys, zipfile
 archive = zipfile.ZipFile(sys.argv[1])
-if sys.argv[2]:
-    archive.setpassword(sys.argv[2].encode())
+archive.setpassword(b"secret")
 sys.exit(archive.testzip() is not None or archive.read("data/sub/deep/Żółw é.txt") != b"wide")
 P
 }
@@ -65,24 +64,19 @@ P
 unpack_by_unzip() { unzip -q "$@" -d unzipped && same unzipped && rm -r unzipped; }
 
 pack() { "$talutil" zip "$@"; }
-check "pack" pack plain.zip data
-check "unzip reads ours" unpack_by_unzip plain.zip
-check "7z reads ours" 7z t plain.zip
-check "Python reads ours" read_by_python plain.zip
-check "pack with a password" pack old.zip data --password-file password
-check "unzip reads our encryption" unpack_by_unzip -P secret old.zip
-check "7z reads our encryption" 7z t -psecret old.zip
-check "Python reads our encryption" read_by_python old.zip secret
-check "pack with AES" pack aes.zip data --aes --password-file password
-check "7z reads our AES" 7z t -psecret aes.zip
-for size in 65536 65537 100000 150001; do
-  rm -f set.z*
-  check "pack volumes of $size" pack set.zip data --volumes $size
-  check "7z reads our volumes of $size" 7z t set.zip
+for kind in plain "old --password-file password" "aes --aes --password-file password"; do
+  read -r name options <<<"$kind"
+  check "pack $name" pack $name.zip data $options
+  check "7z reads our $name" 7z t -psecret $name.zip
+  [ $name != aes ] || continue
+  check "unzip reads our $name" unpack_by_unzip -P secret $name.zip
+  check "Python reads our $name" read_by_python $name.zip
 done
-rm -f set.z*
-pack set.zip data --volumes 70000 --aes --password-file password >/dev/null
-check "7z reads our encrypted volumes" 7z t -psecret set.zip
+for options in "65536" "65537" "100000" "150001" "70000 --aes --password-file password"; do
+  rm -f set.z*
+  check "pack volumes of $options" pack set.zip data --volumes $options
+  check "7z reads our volumes of $options" 7z t -psecret set.zip
+done
 
 # Packs by another program and reads that: read_theirs NAME ARCHIVE COMMAND...
 read_theirs() {

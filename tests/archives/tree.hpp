@@ -6,6 +6,7 @@
 #include <string>
 
 #include "archives/packing.hpp"
+#include "archives/split_set.hpp"
 #include "archives/unpacking.hpp"
 #include "tests/fakes/rows.hpp"
 #include "tests/platform/real_platform.hpp"
@@ -13,10 +14,16 @@
 /// Trees of files on the real platform, as maps from path ("a\b.txt", folders with "\" at the end) to content.
 namespace talutil::archives::testing {
 
+using talutil::testing::check_rows;
+using talutil::testing::real_files;
+using talutil::testing::real_folders;
+using talutil::testing::Rows;
+using talutil::testing::scratch_folder;
+
 using Tree = std::map<Text, std::string>;
 
 inline void write_file(const Text& base, const Text& path, const std::string& content) {
-  auto folder = talutil::testing::real_folders()->open(base);
+  auto folder = real_folders()->open(base);
   std::size_t begin = 0;
   for (std::size_t end = 0; (end = path.find(u'\\', begin)) != Text::npos; begin = end + 1) {
     folder = folder->folder(path.substr(begin, end - begin), true);
@@ -49,7 +56,7 @@ inline void read_into(Folder& folder, const Text& prefix, Tree& tree) {
 
 inline Tree read_tree(const Text& base) {
   Tree tree;
-  read_into(*talutil::testing::real_folders()->open(base), {}, tree);
+  read_into(*real_folders()->open(base), {}, tree);
   return tree;
 }
 
@@ -81,34 +88,32 @@ Code code_of(Work work) {
 
 inline Code pack_files(const Text& archive, TextView items, const PackingOptions& options = {},
                        Progress progress = Progress()) {
-  return code_of([&] { pack(archive, items, options, *talutil::testing::real_folders(), progress); });
+  return code_of([&] { pack(archive, items, options, *real_folders(), progress); });
 }
 
 inline Code unpack_files(const Text& archive, const Text& destination, const UnpackingOptions& options = {},
                          const PasswordQuestion& ask = {}, Progress progress = Progress()) {
-  return code_of([&] {
-    const auto folders = talutil::testing::real_folders();
-    const auto files = talutil::testing::real_files();
-    Archive(archive, *folders).extract(destination, options, *folders, *files, ask, progress);
-  });
+  const auto folders = real_folders();
+  const auto files = real_files();
+  return code_of([&] { Archive(archive, *folders).extract(destination, options, *folders, *files, ask, progress); });
 }
 
 inline Code test_file(const Text& archive, const UnpackingOptions& options = {}, const PasswordQuestion& ask = {}) {
   Progress progress;
-  return code_of([&] { Archive(archive, *talutil::testing::real_folders()).test(options, ask, progress); });
+  return code_of([&] { Archive(archive, *real_folders()).test(options, ask, progress); });
 }
 
 /// A folder of its own for each test, with an archive in it.
 struct ArchiveTest : ::testing::Test {
   /// What an archive unpacks to.
   static Tree unpacked(const Text& archive, const Text& password = {}) {
-    const Text target = talutil::testing::scratch_folder();
+    const Text target = scratch_folder();
     EXPECT_EQ(unpack_files(archive, target, {.password = password}), Code::ok);
     EXPECT_EQ(test_file(archive, {.password = password}), Code::ok);
     return read_tree(target);
   }
 
-  Text folder = talutil::testing::scratch_folder();
+  Text folder = scratch_folder();
   Text archive = folder + u"a.zip";
 };
 

@@ -2,7 +2,6 @@
 
 #include "archives/directory.hpp"
 #include "archives/little_endian.hpp"
-#include "archives/split_set.hpp"
 #include "tests/archives/memory_file.hpp"
 #include "tests/archives/tree.hpp"
 
@@ -10,9 +9,6 @@ namespace talutil::archives {
 namespace {
 
 using namespace testing;
-using talutil::testing::check_rows;
-using talutil::testing::Rows;
-using talutil::testing::scratch_folder;
 
 /// An entry as nobody's program would write it.
 struct Made {
@@ -69,7 +65,7 @@ TEST_F(UnpackingTest, PassesOverWhatIsNotSafe) {
   std::string deep;
   for (int level = 0; level < 1000; ++level) deep += "d/";
   // Where names differ only in case, both are there if the system tells them apart.
-  const bool is_one_name = talutil::testing::real_folders()->ignores_case();
+  const bool is_one_name = real_folders()->ignores_case();
   const Code of_twins = is_one_name ? Code::incomplete : Code::ok;
   const Rows<std::vector<Made>, Code, Text> rows = {
       {"climbs out", {{"../../evil"}, {"a/../../evil"}, {"good"}}, Code::incomplete, u"good"},
@@ -126,7 +122,7 @@ TEST_F(UnpackingTest, UnpacksNoMoreThanIsAllowed) {
 
 TEST_F(UnpackingTest, KeepsOrReplacesFiles) {
   // The name on disk is kept where the system ignores case.
-  const std::string name = talutil::testing::real_folders()->ignores_case() ? "a.txt" : "A.txt";
+  const std::string name = real_folders()->ignores_case() ? "a.txt" : "A.txt";
   write_file(folder, u"out\\A.txt", "old");
   EXPECT_EQ(unpack({{name, "new"}, {"b.txt"}}), Code::ok);
   EXPECT_EQ(out(), (Tree{{u"A.txt", "old"}, {u"b.txt", "content"}}));
@@ -163,17 +159,6 @@ TEST_F(UnpackingTest, AsksForPasswords) {
     });
     EXPECT_EQ(unpack_files(locked, scratch_folder(), {.password = u"wrong"}), Code::bad_parameters) << "nobody to ask";
   }
-}
-
-TEST_F(UnpackingTest, OpensWithTheCodeOfTheFault) {
-  write_file(folder, u"text.zip", "no archive at all");
-  write_file(folder, u"locked.zip", make_archive({{"a"}}));
-  const auto lock = talutil::testing::lock_file(folder + u"locked.zip");
-  EXPECT_EQ(test_file(u""), Code::missing);
-  EXPECT_EQ(test_file(folder + u"none.zip"), Code::missing);
-  EXPECT_EQ(test_file(folder + u"none\\a.zip"), Code::missing);
-  EXPECT_EQ(test_file(folder + u"text.zip"), Code::bad_structure);
-  EXPECT_EQ(test_file(folder + u"locked.zip"), Code::cannot_open);
 }
 
 TEST_F(UnpackingTest, NothingIsLeftOfADamagedFile) {
@@ -220,7 +205,7 @@ TEST_F(UnpackingTest, TruncatedArchivesAreRefusedAndFlippedBitsFoundOrHarmless) 
        {PackingOptions{}, PackingOptions{.password = u"p"}, PackingOptions{.aes = true, .password = u"p"}}) {
     EXPECT_EQ(pack_files(archive, folder + u"data", options), Code::ok);
     kinds.push_back(read_tree(folder).at(u"a.zip"));
-    talutil::testing::real_files()->delete_files(archive);
+    real_files()->delete_files(archive);
   }
   for (const std::string& whole : kinds) {
     for (std::size_t length = 0; length < whole.size(); length += length + 64 < whole.size() ? 64 : 1) {
@@ -243,26 +228,6 @@ TEST_F(UnpackingTest, TruncatedArchivesAreRefusedAndFlippedBitsFoundOrHarmless) 
       EXPECT_TRUE(!is_content || code == Code::bad_test) << bit;
     }
     EXPECT_GT(found, whole.size() * 8 / 3) << kind;
-  }
-}
-
-TEST_F(UnpackingTest, SplitSetsAreReadInEveryForm) {
-  std::string noise;
-  for (std::uint32_t value = 1; noise.size() < 300'000;) append_number(noise, value = value * 1664525U + 1013904223U);
-  write_file(folder, u"noise.bin", noise);
-  ASSERT_EQ(pack_files(folder + u"set.zip", folder + u"noise.bin", {.volume_size = smallest_volume}), Code::ok);
-  ASSERT_EQ(pack_files(folder + u"one.zip", folder + u"noise.bin", {.volume_size = 10'000'000}), Code::ok);
-  Tree files = read_tree(folder);
-  EXPECT_EQ(files.count(u"set.z04"), 1U);
-  EXPECT_EQ(files.at(u"set.z01").size(), smallest_volume);
-  EXPECT_EQ(files.count(u"one.z01"), 0U) << "one volume is a plain archive";
-  const std::string& plain = files.at(u"one.zip");
-  for (int piece = 0; piece < 4; ++piece) {
-    write_file(folder, u"cut.zip.00" + Text(1, static_cast<char16_t>(u'1' + piece)),
-               plain.substr(static_cast<std::size_t>(piece) * 80'000, piece == 3 ? std::string::npos : 80'000));
-  }
-  for (const TextView name : {u"set.zip", u"one.zip", u"cut.zip.001"}) {
-    EXPECT_EQ(unpacked(folder + Text(name)), (Tree{{u"noise.bin", noise}})) << to_utf8(name);
   }
 }
 
