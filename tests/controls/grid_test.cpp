@@ -1,7 +1,5 @@
 #include "controls/grid.hpp"
 
-#include <gmock/gmock.h>
-
 #include "automation/control.hpp"
 #include "controls/delimited_text.hpp"
 #include "infoforms/frm_components.hpp"
@@ -9,11 +7,12 @@
 #include "tests/fakes/utils_test.hpp"
 
 namespace talutil {
-
 namespace {
 
+using testing::check_rows;
 using testing::error_of;
 using testing::RecordingControl;
+using Table = std::vector<std::vector<Text>>;
 
 struct Grids : testing::UtilsTest {
   std::shared_ptr<Grid> grid = std::make_shared<Grid>(library.platform());
@@ -30,11 +29,10 @@ struct Grids : testing::UtilsTest {
     }
   }
 
-  [[nodiscard]] std::vector<std::vector<Text>> cells() const {
-    std::vector<std::vector<Text>> result;
+  [[nodiscard]] Table cells() const {
+    Table result(static_cast<std::size_t>(grid->Rows()));
     for (std::int32_t r = 0; r < grid->Rows(); ++r) {
-      std::vector<Text>& row = result.emplace_back();
-      for (std::int32_t c = 0; c < grid->Cols(); ++c) row.push_back(grid->TextMatrix(r, c));
+      for (std::int32_t c = 0; c < grid->Cols(); ++c) result[r].push_back(grid->TextMatrix(r, c));
     }
     return result;
   }
@@ -63,7 +61,7 @@ TEST_F(Grids, AreDrivenLateBound) {
   control.call(u"AddItem", {u"a\tb\tc", 0});
   control.call(u"AddItem", {u"d"});
   EXPECT_EQ(control.get(u"Row"), Variant(1)) << "and on its rows";
-  EXPECT_EQ(cells(), (std::vector<std::vector<Text>>{{u"a", u"b"}, {u"", u"False"}, {u"d", u""}}));
+  EXPECT_EQ(cells(), (Table{{u"a", u"b"}, {u"", u"False"}, {u"d", u""}}));
   control.call(u"RemoveItem", {1});
   control.put(u"FixedRows", 1);
   control.call(u"AddItem", {u"heading", 0});
@@ -72,18 +70,12 @@ TEST_F(Grids, AreDrivenLateBound) {
   EXPECT_EQ(control.get(u"FixedRows"), Variant(1)) << "no data row becomes a heading";
   control.put(u"Cols", 1);
   control.put(u"Cols", 2);
-  EXPECT_EQ(cells(), (std::vector<std::vector<Text>>{{u"a", u""}, {u"d", u""}})) << "lost cells stay lost";
+  EXPECT_EQ(cells(), (Table{{u"a", u""}, {u"d", u""}})) << "lost cells stay lost";
   control.call(u"Clear");
-  EXPECT_EQ(cells(), (std::vector<std::vector<Text>>{{u"", u""}, {u"", u""}}));
+  EXPECT_EQ(cells(), (Table{{u"", u""}, {u"", u""}}));
 
   using enum Access;
-  const struct {
-    const char* name;
-    TextView member;
-    Access access;
-    std::vector<Variant> arguments;
-    std::int32_t error;
-  } bad[] = {
+  const testing::Rows<TextView, Access, std::vector<Variant>, std::int32_t> bad = {
       {"a row that is not there", u"TextMatrix", get, {2, 0}, 9},
       {"a column before the first", u"TextMatrix", get, {0, -1}, 9},
       {"the width of no column", u"ColWidth", put, {2, 1}, 9},
@@ -100,10 +92,9 @@ TEST_F(Grids, AreDrivenLateBound) {
       {"an unknown member", u"Nothing", get, {}, 438},
       {"an unknown format", u"SaveGrid", call, {u"C:\\x.txt", 6}, 5},
   };
-  for (const auto& row : bad) {
-    const auto use = [&] { (void)grid->invoke(grid->member_id(row.member), row.access, row.arguments); };
-    EXPECT_EQ(error_of(use), row.error) << row.name;
-  }
+  check_rows(bad, [&](TextView member, Access access, const std::vector<Variant>& arguments, std::int32_t error) {
+    EXPECT_EQ(error_of([&] { (void)grid->invoke(grid->member_id(member), access, arguments); }), error);
+  });
 }
 
 TEST_F(Grids, AreWrittenAndReadBack) {
@@ -129,14 +120,7 @@ TEST_F(Grids, AreWrittenAndReadBack) {
   grid->put_TextMatrix(1, 1, u"changed");
   grid->LoadGrid(u"C:\\inner.txt", 3, Boolean(false));
   EXPECT_EQ(cells(), written) << "the fixed cells stay";
-
-  // A character without a place in the code page makes the file UTF-8.
-  grid->put_TextMatrix(1, 1, u"\u0416");
-  grid->SaveGrid(u"C:\\wide.txt", 3, Boolean(true));
-  EXPECT_THAT(file(u"C:\\wide.txt"), ::testing::StartsWith("\xEF\xBB\xBF"
-                                                           "5 \xE2\x82\xAC,"));
-  grid->LoadGrid(u"C:\\wide.txt", 3, Boolean(true));
-  EXPECT_EQ(grid->TextMatrix(1, 1), u"\u0416");
+  grid->LoadGrid(u"C:\\comma.txt", 3, Boolean(true));
   EXPECT_EQ(std::pair(grid->FixedRows(), grid->FixedCols()), std::pair(1, 1)) << "and stay fixed";
 
   grid->put_Cols(0);
@@ -147,12 +131,33 @@ TEST_F(Grids, AreWrittenAndReadBack) {
   grid->SaveGrid(u"C:\\fixed.txt", 5, Boolean(true));
   EXPECT_EQ(file(u"C:\\fixed.txt"), "long name  x\r\n           y z\r\n");
   grid->LoadGrid(u"C:\\fixed.txt", 5, Boolean(true));
-  EXPECT_EQ(cells(), (std::vector<std::vector<Text>>{{u"long name", u"x"}, {u"", u"y z"}}));
+  EXPECT_EQ(cells(), (Table{{u"long name", u"x"}, {u"", u"y z"}}));
 
-  EXPECT_EQ(read_delimited(u"\"a\"b,c\n\n\"open,\r\n", u','),
-            (std::vector<std::vector<Text>>{{u"ab", u"c"}, {u""}, {u"open,\r\n"}}));
+  EXPECT_EQ(read_delimited(u"\"a\"b,c\n\n\"open,\r\n", u','), (Table{{u"ab", u"c"}, {u""}, {u"open,\r\n"}}));
   EXPECT_EQ(error_of([&] { grid->LoadGrid(u"C:\\missing.txt", 3, Boolean(true)); }), 53);
   EXPECT_EQ(grid->Rows(), 2) << "nothing is lost";
+}
+
+// Longer than what is written at once; a character without a place in the code page makes the file UTF-8.
+TEST_F(Grids, LongTablesAreWrittenWhole) {
+  for (const TextView first : {u"\u20AC", u"\u0416"}) {
+    const bool is_wide = first == u"\u0416";
+    fill(5000, 6);
+    grid->put_TextMatrix(0, 0, Text(first));
+    const Table written = cells();
+    for (const auto& [format, separator] : {std::pair{std::int16_t{3}, u','}, std::pair{std::int16_t{4}, u'\t'}}) {
+      Text expected;
+      for (const auto& row : written) {
+        for (const Text& cell : row) expected += cell + separator;
+        expected.replace(expected.size() - 1, 1, u"\r\n");
+      }
+      grid->SaveGrid(u"C:\\long.txt", format, Boolean(true));
+      EXPECT_TRUE(file(u"C:\\long.txt") == (is_wide ? "\xEF\xBB\xBF" + to_utf8(expected) : to_ansi(expected)));
+      grid->put_Cols(0);
+      grid->LoadGrid(u"C:\\long.txt", format, Boolean(true));
+      EXPECT_TRUE(cells() == written) << format << is_wide;
+    }
+  }
 }
 
 TEST_F(Grids, VisibleCellsAreExported) {
@@ -263,5 +268,4 @@ TEST_F(Grids, DialogsTellOfACancelOnlyWhenAsked) {
 }
 
 }  // namespace
-
 }  // namespace talutil
