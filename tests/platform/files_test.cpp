@@ -34,28 +34,17 @@ class RealFiles : public ::testing::Test {
 };
 
 TEST(FileNames, Patterns) {
-  const struct {
-    TextView pattern, name;
-    bool matches;
-  } rows[] = {{u"*.*", u"name", true},
-              {u"*", u"a.b.c", true},
-              {u"*.", u"name", true},
-              {u"*.", u"a.b", false},
-              {u"*.htm", u"a.html", false},
-              {u"*.htm", u"A.B.HTM", true},
-              {u"a?c.txt", u"abc.txt", true},
-              {u"a?.txt", u"a.txt", true},
-              {u"a??", u"a", true},
-              {u"?a", u"a", false},
-              {u"name.*", u"NAME", true},
-              {u"name.*", u"names.x", false},
-              {u"a*b*c", u"aXbXbXc", true},
-              {u"a*b", u"abc", false},
-              {u"\u00C9*", u"\u00E9t\u00E9", true},
-              {u"", u"a", false},
-              {u"a.?", u"a", true},
-              {u"*.b.*", u"a.b", true}};
-  for (const auto& row : rows) EXPECT_EQ(name_matches(row.name, row.pattern), row.matches) << to_utf8(row.pattern);
+  using Pair = std::pair<TextView, TextView>;
+  for (const auto& [pattern, name] :
+       {Pair(u"*.*", u"name"), Pair(u"*", u"a.b.c"), Pair(u"*.", u"name"), Pair(u"*.htm", u"A.B.HTM"),
+        Pair(u"a?c.txt", u"abc.txt"), Pair(u"a?.txt", u"a.txt"), Pair(u"a??", u"a"), Pair(u"name.*", u"NAME"),
+        Pair(u"a*b*c", u"aXbXbXc"), Pair(u"\u00C9*", u"\u00E9t\u00E9"), Pair(u"a.?", u"a"), Pair(u"*.b.*", u"a.b")}) {
+    EXPECT_TRUE(name_matches(name, pattern)) << to_utf8(pattern);
+  }
+  for (const auto& [pattern, name] : {Pair(u"*.", u"a.b"), Pair(u"*.htm", u"a.html"), Pair(u"?a", u"a"),
+                                      Pair(u"name.*", u"names.x"), Pair(u"a*b", u"abc"), Pair(u"", u"a")}) {
+    EXPECT_FALSE(name_matches(name, pattern)) << to_utf8(pattern);
+  }
 }
 
 TEST_F(RealFiles, NamesThatAreNoFiles) {
@@ -84,12 +73,9 @@ TEST_F(RealFiles, NamesThatAreNoFiles) {
 
 TEST_F(RealFiles, OutputTakesTheNameWhenItIsClosed) {
   write(u"a.txt", "old");
-  {
-    const auto file = files->open_output(folder + u"a.txt");
-    file->write("new");
-  }
+  files->open_output(folder + u"a.txt")->write("new");
   EXPECT_EQ(read(u"A.TXT"), "old");
-  EXPECT_EQ(names(u"*.*"), std::vector<Text>{u"a.txt"});  // Nothing is left of what was not closed.
+  EXPECT_EQ(names(u"*.*", file_attribute::hidden), std::vector<Text>{u"a.txt"}) << "what was not closed is left";
   write(u"a.txt", "newer, longer");
   EXPECT_EQ(read(u"a.txt. "), "newer, longer");
   files->append(folder + u"\\a.txt", "+");

@@ -2,10 +2,13 @@
 
 #include <functional>
 #include <memory>
+#include <vector>
 
+#include "automation/numbers.hpp"
 #include "platform/code_page.hpp"
 #include "platform/files.hpp"
 #include "platform/folders.hpp"
+#include "platform/network.hpp"
 #include "platform/registry.hpp"
 #include "platform/settings.hpp"
 #include "platform/time_conversions.hpp"
@@ -22,6 +25,18 @@ namespace talutil::testing {
 
 /// Without the user's key "Software\TALUtil\Test".
 [[nodiscard]] std::shared_ptr<Registry> real_registry();
+
+[[nodiscard]] std::unique_ptr<Network> real_network();
+
+/// The addresses of this machine by another function of the system, in ascending order.
+[[nodiscard]] std::vector<Text> machine_addresses();
+
+/// Four bytes as an address is written.
+[[nodiscard]] inline Text address_at(const std::uint8_t* bytes) {
+  Text address = number_to_text(std::int32_t{bytes[0]});
+  for (int i = 1; i < 4; ++i) address += u'.' + number_to_text(std::int32_t{bytes[i]});
+  return address;
+}
 
 /// Calls with what local time is ahead of UTC today, in seconds: of each zone that the process can be put in.
 void for_each_zone(const std::function<void(std::int64_t seconds)>& use);

@@ -1,8 +1,8 @@
-// Profile files, settings and the registry as both platforms have them.
+// Profile files, settings, the registry and addresses as both platforms have them.
 #include <algorithm>
 
 #include "platform/profile_document.hpp"
-#include "tests/fakes/utils_test.hpp"
+#include "tests/fakes/rows.hpp"
 #include "tests/platform/real_platform.hpp"
 
 namespace talutil::testing {
@@ -41,12 +41,6 @@ struct ProfileGenerator : Generator {
   }
 };
 
-std::string read(const ProfileDocument& document, const Text& section, const Text& item) {
-  Text names;
-  for (const Text& name : document.item_names(section)) names.append(name).append(1, u'\0');
-  return to_ansi(names + document.value(section, item).value_or(Text()).substr(0, Profiles::longest_value));
-}
-
 #ifdef _WIN32
 constexpr int file_count = 2000;  // The platform has functions of its own.
 #else
@@ -69,13 +63,17 @@ TEST(Profiles, AreReadAndChangedAsTheDocumentIs) {
     std::string edits;
     ProfileDocument document(before);
     const Text path = put_file(before);
-    const auto compare = [&](const Text& file) {
-      const Text section = from_ansi(generator.section());
-      const Text item = from_ansi(generator.item());
-      ASSERT_EQ(read(document, section, item),
+    const auto compare_item = [&](const Text& file, const Text& section, const Text& item) {
+      Text names;
+      for (const Text& name : document.item_names(section)) names.append(name).append(1, u'\0');
+      const Text value = document.value(section, item).value_or(Text()).substr(0, Profiles::longest_value);
+      ASSERT_EQ(to_ansi(names + value),
                 to_ansi(profiles->item_names(file, section) + profiles->value(file, section, item)))
           << '[' << to_ansi(section) << "] " << to_ansi(item) << " after" << edits << " of:\n"
           << before;
+    };
+    const auto compare = [&](const Text& file) {
+      compare_item(file, from_ansi(generator.section()), from_ansi(generator.item()));
     };
     compare(path);
     for (int left = generator.whole(1, 3); left > 0; --left) {
@@ -85,10 +83,7 @@ TEST(Profiles, AreReadAndChangedAsTheDocumentIs) {
       edits += " [" + to_ansi(section) + "] " + to_ansi(item) + "=" + to_ansi(value);
       document.put(section, item, value);
       profiles->put(path, section, item, value);
-      ASSERT_EQ(to_ansi(document.value(section, item).value_or(Text()).substr(0, Profiles::longest_value)),
-                to_ansi(profiles->value(path, section, item)))
-          << edits << " of:\n"
-          << before;
+      compare_item(path, section, item);
     }
     compare(put_file(document.bytes()));
     if (::testing::Test::HasFailure()) return;
@@ -172,20 +167,19 @@ TEST(Registry, KeepsTypesAndAnswersByTheStatusOfThePlatform) {
   EXPECT_EQ(registry->query(key, u"text", type, size, {}), Registry::invalid_handle);
 }
 
-struct RegistryMembers : UtilsTest {
-  RegistryMembers() : UtilsTest([](auto& fake) { fake.use(&FakePlatform::used_registry, real_registry()); }) {}
-};
-
-TEST_F(RegistryMembers, UseThePlatforms) {
-  const Text path = u"Software\\TALUtil\\Test";
-  EXPECT_EQ(utils.REGISTRY_QueryValue(path, u"text"), Registry::invalid_handle);
-  utils.REGISTRY_CreateNewKey(path, static_cast<std::int32_t>(0x80000001U));
-  utils.REGISTRY_CreateNewKey(path, static_cast<std::int32_t>(0x80000001U));
-  EXPECT_EQ(utils.REGISTRY_QueryValue(path, u"text"), Registry::not_found);
-  utils.REGISTRY_SetKeyValue(path, u"text", u"abc", 1);
-  utils.REGISTRY_SetKeyValue(path, u"number", 42, 4);
-  EXPECT_EQ(utils.REGISTRY_ReturnValue(path, u"text"), u"abc");
-  EXPECT_EQ(utils.REGISTRY_ReturnValue(path, u"number"), u"42");
+TEST(Network, WritesTheAddressesOfTheMachineWhereTheyFit) {
+  const std::vector<Text> expected = machine_addresses();
+  const std::size_t size = 4 + 24 * expected.size();
+  for (const std::size_t room : {std::size_t{0}, size - 1, size, size + 1}) {
+    std::vector<std::uint8_t> table(room, 0xEE);
+    real_network()->read_address_table(table);
+    if (room < size) {
+      EXPECT_EQ(table, std::vector<std::uint8_t>(room, 0xEE)) << room;
+      continue;
+    }
+    EXPECT_EQ(table[0], expected.size());
+    for (std::size_t i = 0; i < expected.size(); ++i) EXPECT_EQ(address_at(&table[4 + 24 * i]), expected[i]);
+  }
 }
 
 }  // namespace

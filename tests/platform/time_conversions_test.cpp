@@ -1,45 +1,44 @@
-// Conversions of times as both platforms have them, by a counter of days.
+// Conversions of times as both platforms have them, by a calendar of the standard library.
+#include <chrono>
+
 #include "tests/fakes/utils_test.hpp"
 #include "tests/platform/real_platform.hpp"
 
 namespace talutil::testing {
 namespace {
 
-constexpr std::int64_t file_time_day = 86400 * file_time_second;
-
-bool is_leap(int year) { return year % 4 == 0 && (year % 100 != 0 || year % 400 == 0); }
-int length_of(int month, int year) {
-  return month == 2 ? is_leap(year) ? 29 : 28 : month == 4 || month == 6 || month == 9 || month == 11 ? 30 : 31;
-}
+using namespace std::chrono;
 
 struct TimeConversionsTest : UtilsTest {
   TimeConversionsTest()
       : UtilsTest([](auto& fake) { fake.use(&FakePlatform::used_time_conversions, real_time_conversions()); }) {}
   TimeConversions* conversions = platform.used_time_conversions;
   Generator generator;
+  std::int16_t part(int first, int last) { return static_cast<std::int16_t>(generator.whole(first, last)); }
 };
 
 TEST_F(TimeConversionsTest, EveryDayIsCounted) {
-  SystemTime time{1601, 1, 1, 1};
-  for (std::int64_t day = 0; time.wYear < 2201; ++day) {
-    time.wHour = static_cast<std::int16_t>(generator.whole(0, 23));
-    time.wMinute = static_cast<std::int16_t>(generator.whole(0, 59));
-    time.wSecond = static_cast<std::int16_t>(generator.whole(0, 59));
-    const std::int64_t seconds = (time.wHour * 60 + time.wMinute) * 60 + time.wSecond;
+  constexpr sys_days first = 1601y / 1 / 1;
+  for (sys_days day = first; day < sys_days(2201y / 1 / 1); day += days(1)) {
+    const year_month_day date(day);
+    const SystemTime time{static_cast<std::int16_t>(int(date.year())),
+                          static_cast<std::int16_t>(unsigned(date.month())),
+                          static_cast<std::int16_t>(weekday(day).c_encoding()),
+                          static_cast<std::int16_t>(unsigned(date.day())),
+                          part(0, 23),
+                          part(0, 59),
+                          part(0, 59)};
+    const seconds since = day - first + hours(time.wHour) + minutes(time.wMinute) + seconds(time.wSecond);
     FileTime file = 77;
     SystemTime back;
     conversions->system_to_file(time, file);
-    ASSERT_EQ(file, day * file_time_day + seconds * file_time_second);
+    ASSERT_EQ(file, since.count() * file_time_second);
     conversions->file_to_system(file, back);
-    ASSERT_EQ(back, time) << day;
-    time.wDayOfWeek = static_cast<std::int16_t>((time.wDayOfWeek + 1) % 7);
-    if (++time.wDay > length_of(time.wMonth, time.wYear)) time.wDay = 1, ++time.wMonth;
-    if (time.wMonth > 12) time.wMonth = 1, ++time.wYear;
+    ASSERT_EQ(back, time) << file;
   }
 }
 
 TEST_F(TimeConversionsTest, WhatIsNoTimeIsLeftAlone) {
-  const auto part = [&](int first, int last) { return static_cast<std::int16_t>(generator.whole(first, last)); };
   for (int i = 0; i < 10'000; ++i) {
     // Some platforms take 29 February of any year for a day.
     const SystemTime time{part(1590, 1612), part(0, 13),  part(0, 9),  i % 10 == 0 ? std::int16_t{32} : part(0, 28),

@@ -69,6 +69,11 @@ TEST_F(SettingsFiles, ProfilesAreReplacedWhole) {
   EXPECT_EQ(testing::read_bytes(from_utf8(path)), "[S]\r\nk=\x80\r\n");
   EXPECT_EQ(std::filesystem::status(path).permissions(), std::filesystem::perms(0640)) << "the access rights stay";
   EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder), {}), 1) << "no draft is left";
+  {
+    const auto lock = testing::lock_file(from_utf8(path));
+    profiles->put(from_utf8(path), u"S", u"k", u"2");
+  }
+  EXPECT_EQ(testing::read_bytes(from_utf8(path)), "[S]\r\nk=\x80\r\n") << "what is locked just then stays";
   profiles->put(from_utf8((folder / "none/a.ini").string()), u"S", u"k", u"v");
   EXPECT_FALSE(std::filesystem::exists(folder / "none"));
 }

@@ -1,12 +1,19 @@
 #include "tests/platform/real_platform.hpp"
 
 #include <fcntl.h>
+#include <net/if.h>
+#include <netinet/in.h>
 #include <stdlib.h>
 #include <sys/file.h>
+#include <sys/ioctl.h>
+#include <sys/socket.h>
 #include <sys/stat.h>
 #include <time.h>
 
+#include <array>
+#include <cstring>
 #include <filesystem>
+#include <set>
 
 #include "platform/posix/descriptor.hpp"
 #include "platform/posix/posix_code_page.hpp"
@@ -70,6 +77,26 @@ std::shared_ptr<SettingsStore> real_settings_store() {
   return make_within<posix::PosixSettingsStore, posix::Hive>(own_hive());
 }
 std::unique_ptr<TimeConversions> real_time_conversions() { return std::make_unique<posix::PosixTimeConversions>(); }
+
+std::unique_ptr<Network> real_network() { return std::make_unique<posix::PosixNetwork>(); }
+
+std::vector<Text> machine_addresses() {
+  std::array<ifreq, 100> interfaces{};
+  ifconf list{};
+  list.ifc_len = sizeof interfaces;
+  list.ifc_req = interfaces.data();
+  const posix::Descriptor socket(::socket(AF_INET, SOCK_DGRAM, 0));
+  ioctl(socket.get(), SIOCGIFCONF, &list);
+  std::multiset<std::array<std::uint8_t, 4>> found;
+  for (std::size_t i = 0; i < static_cast<std::size_t>(list.ifc_len) / sizeof(ifreq); ++i) {
+    std::array<std::uint8_t, 4> address{};
+    std::memcpy(address.data(), interfaces[i].ifr_addr.sa_data + 2, sizeof address);
+    found.insert(address);
+  }
+  std::vector<Text> addresses;
+  for (const auto& address : found) addresses.push_back(address_at(address.data()));
+  return addresses;
+}
 
 void for_each_zone(const std::function<void(std::int64_t seconds)>& use) {
   const char* const variable = getenv("TZ");

@@ -104,18 +104,8 @@ Text date_like_text(Generator& generator) {
     if (!part.empty()) date += Text(generator.one_of(marks)) + Text(part);
   }
   const Text time(generator.one_of(times));
-  switch (generator.whole(0, 4)) {
-    case 0:
-      return date + u" " + time;
-    case 1:
-      return time + u"  " + date;
-    case 2:
-      return time;
-    case 3:
-      return date + u"/";
-    default:
-      return date;
-  }
+  const Text forms[] = {date, date + u" " + time, time + u"  " + date, time, date + u"/"};
+  return generator.one_of(forms);
 }
 
 TEST(PlatformDates, TextToDate) {

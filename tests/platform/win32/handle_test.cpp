@@ -19,39 +19,26 @@ struct Noted {
 };
 
 TEST(Owned, GivesEachHandleBackOnceAndKeepsTheLastError) {
-  using Closed = std::vector<int>;
-  using Item = Owned<Noted>;
-  const struct {
-    const char* name;
-    void (*use)(Item& item, Closed& others);
-    Closed expected, expected_others;
-  } rows[] = {
-      {"ends", [](Item&, Closed&) {}, {1}, {}},
-      {"released", [](Item& item, Closed&) { EXPECT_EQ(item.release(), 1); }, {}, {}},
-      {"exchanged", [](Item& item, Closed&) { item.reset(2); }, {1, 2}, {}},
-      {"received", [](Item& item, Closed&) { *item.receive() = 2; }, {1, 2}, {}},
-      {"moved from", [](Item& item, Closed&) { const Item other(std::move(item)); }, {1}, {}},
-      // A handle goes back to where it came from.
-      {"moved to", [](Item& item, Closed& others) { item = Item(2, {&others}); }, {1}, {2}},
-      {"moved to itself",
-       [](Item& item, Closed&) {
-         item = static_cast<Item&&>(item);
-         EXPECT_EQ(item.get(), 1);
-       },
-       {1},
-       {}},
-  };
-  for (const auto& row : rows) {
-    Closed closed, others;
-    SetLastError(ERROR_FILE_EXISTS);
-    {
-      Item item(1, {&closed});
-      row.use(item, others);
-    }
-    EXPECT_EQ(closed, row.expected) << row.name;
-    EXPECT_EQ(others, row.expected_others) << row.name;
-    EXPECT_EQ(GetLastError(), DWORD{ERROR_FILE_EXISTS}) << row.name;
+  std::vector<int> closed, others;
+  SetLastError(ERROR_FILE_EXISTS);
+  {
+    using Item = Owned<Noted>;
+    Item ends(1, {&closed}), released(2, {&closed}), exchanged(3, {&closed}), received(4, {&closed});
+    EXPECT_EQ(released.release(), 2);
+    exchanged.reset(30);
+    *received.receive() = 40;
+    Item moved(5, {&closed});
+    Item moved_to(std::move(moved));
+    // A handle goes back to where it came from.
+    moved_to = Item(6, {&others});
+    moved_to = static_cast<Item&&>(moved_to);
+    EXPECT_EQ(moved_to.get(), 6);
+    EXPECT_EQ(closed, (std::vector{3, 4, 5}));
+    EXPECT_EQ(others, std::vector<int>());
   }
+  EXPECT_EQ(closed, (std::vector{3, 4, 5, 40, 30, 1}));
+  EXPECT_EQ(others, std::vector{6});
+  EXPECT_EQ(GetLastError(), DWORD{ERROR_FILE_EXISTS});
 }
 
 }  // namespace

@@ -33,6 +33,18 @@ std::shared_ptr<Registry> real_registry() {
   return std::make_unique<win32::Win32Registry>();
 }
 
+std::unique_ptr<Network> real_network() { return std::make_unique<win32::Win32Network>(); }
+
+std::vector<Text> machine_addresses() {
+  using Function = DWORD(WINAPI*)(void*, ULONG*, BOOL);
+  std::array<std::uint8_t, 4096> table{};
+  ULONG size = table.size();
+  win32::late_function<Function>(L"iphlpapi.dll", "GetIpAddrTable")(table.data(), &size, TRUE);
+  std::vector<Text> addresses;
+  for (std::size_t i = 0; i < table[0]; ++i) addresses.push_back(address_at(&table[4 + 24 * i]));
+  return addresses;
+}
+
 void for_each_zone(const std::function<void(std::int64_t seconds)>& use) {
   TIME_ZONE_INFORMATION zone{};
   const DWORD season = GetTimeZoneInformation(&zone);
