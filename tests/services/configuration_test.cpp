@@ -1,89 +1,60 @@
-#include <gtest/gtest.h>
-
-#include "tests/fakes/utils_test.hpp"
+#include "tests/library/answers.hpp"
 
 namespace talutil::testing {
 namespace {
 
-/// A toolkit whose file is there when the profiles have one.
-class ConfiguredUtils final : public ORVUtils {
- public:
-  ConfiguredUtils(Library& library, FakePlatform& platform) : ORVUtils(library), platform_(platform) {}
-  Boolean FileExists(Text sFilename) override { return Boolean(platform_.profiles.files.contains(sFilename)); }
-
- private:
-  FakePlatform& platform_;
-};
-
-struct Configuration : ::testing::Test {
+struct Configuration : AnsweringMembers {
   Configuration() {
     settings.sDatabaseName = u"Main";
     settings.sUserName = u"anne";
     settings.sNatNameD = u"mine";
     settings.sORVDataName = u"data";
+    platform.files.put(u"C:\\a.ini", "");
   }
 
-  Text read_file(const Text& item, const Text& otherwise) {
-    return utils.GetCfgFileData(u"S", item, otherwise, u"C:\\a.ini", Boolean(true));
-  }
-
-  FakePlatform platform;
-  Library library{platform.platform()};
-  ConfiguredUtils utils{library, platform};
   SharedSettings& settings = library.settings();
   std::vector<Text>& accesses = platform.settings_store.accesses;
 };
 
 TEST_F(Configuration, ReadsOfAFile) {
-  const std::string long_value(1500, 'v');
+  const std::string longest(1023, 'v');
   platform.profiles.files.insert_or_assign(
       u"C:\\a.ini", ProfileDocument("[S]\r\nabc=x\r\nempty=\r\nslash=\\\r\nunc=\\\\server\r\npath=\\C:\\Data\r\n"
                                     "three=\\\\\\x\r\nlong=" +
-                                    long_value));
-  const Rows<Text, Text, Text, bool> rows = {
-      {"a value", u"ABC", u"d", u"x", false},
-      {"an empty value is missing", u"empty", u"d", u"d", true},
-      {"a backslash is missing", u"slash", u"d", u"d", true},
-      {"no item", u"none", u"d", u"d", true},
-      {"no item, no default", u"none", u"NoDefaultData", u"", false},
-      {"no item, an empty default is saved", u"none", u"", u"", true},
-      {"one backslash goes", u"path", u"d", u"C:\\Data", false},
-      {"a path of the network loses one and comes back", u"unc", u"d", u"\\server", false},
-      {"of three two are left: empty", u"three", u"d", u"", false},
-      {"a default that begins with two is empty, and saved as it is", u"none", u"\\\\server", u"", true},
-      {"no item named: the first name", u"", u"d", u"abc", false},
-      {"cut at 1023", u"long", u"d", Text(1023, u'v'), false},
-  };
-  check_rows(rows, [&](const Text& item, const Text& otherwise, const Text& expected, bool saves) {
-    accesses.clear();
-    EXPECT_EQ(read_file(item, otherwise), expected);
-    const Text saved = u"|S|" + item + u"=" + otherwise;
-    EXPECT_EQ(accesses, saves ? (std::vector<Text>{u"ORV3\\Main_anne_UserSettings" + saved,
-                                                   u"ORV3\\Main_DatabaseSettings" + saved})
-                              : std::vector<Text>{});
-  });
-  EXPECT_EQ(utils.GetCfgFileData(u"S", u"abc", u"NoDefaultData", u"C:\\none.ini", Boolean(true)), u"");
-  EXPECT_EQ(utils.GetCfgFileData(u"None", u"", u"d", u"C:\\a.ini", Boolean(true)), u"d");
+                                    longest + "more"));
+  // clang-format off
+  check({{u"GetCfgFileData", {
+      {u"S|ABC|d|C:\\a.ini|True", "x"}, {u"S||d|C:\\a.ini|True", "abc"}, {u"S|long|d|C:\\a.ini|True", longest},
+      {u"S|path|d|C:\\a.ini|True", "C:\\Data"}, {u"S|unc|d|C:\\a.ini|True", "\\server"},
+      {u"S|three|d|C:\\a.ini|True", ""}, {u"S|none|NoDefaultData|C:\\a.ini|True", ""},
+      {u"S|abc|NoDefaultData|C:\\none.ini|True", ""},
+      // These are missing, and the default is saved, even where it is not what is returned.
+      {u"S|empty|d|C:\\a.ini|True", "d"}, {u"S|slash|d|C:\\a.ini|True", "d"}, {u"S|none|d|C:\\a.ini|True", "d"},
+      {u"S|none||C:\\a.ini|True", ""}, {u"S|none|\\\\server|C:\\a.ini|True", ""}, {u"T||d|C:\\a.ini|True", "d"}}}});
+  // clang-format on
+  std::vector<Text> saved;
+  for (const TextView item : {u"S|empty=d", u"S|slash=d", u"S|none=d", u"S|none=", u"S|none=\\\\server", u"T|=d"}) {
+    saved.push_back(u"ORV3\\Main_anne_UserSettings|" + Text(item));
+    saved.push_back(u"ORV3\\Main_DatabaseSettings|" + Text(item));
+  }
+  EXPECT_EQ(accesses, saved);
 }
 
 TEST_F(Configuration, WritesToAFile) {
-  const struct {
-    Text output, written;
-  } rows[] = {{u"x", u"x"},    {u"", u"\\"}, {u"\\", u"\\"}, {u"\\x", u"\\"}, {u"\\\\server\\share", u"\\"},
-              {u"a\\", u"a\\"}};
-  for (const auto& row : rows) {
-    Text output = row.output;
+  const std::pair<Text, Text> rows[] = {
+      {u"x", u"x"}, {u"", u"\\"}, {u"\\", u"\\"}, {u"\\x", u"\\"}, {u"\\\\server\\share", u"\\"}, {u"a\\", u"a\\"}};
+  for (const auto& [given, written] : rows) {
+    Text output = given;
     utils.SaveCfgFileData(u"S", u"k", output, u"C:\\a.ini", Boolean(true));
-    EXPECT_EQ(output, row.written);
-    EXPECT_EQ(platform.profiles.files.at(u"C:\\a.ini").value(u"S", u"k"), row.written);
+    EXPECT_EQ(output, written);
+    EXPECT_EQ(platform.profiles.files.at(u"C:\\a.ini").value(u"S", u"k"), written);
   }
   EXPECT_TRUE(accesses.empty());
-  EXPECT_EQ(read_file(u"k", u"d"), u"a\\");
 }
 
 TEST_F(Configuration, GroupsOfTheStore) {
-  const Text previous_selector = u"PreviousDatabaseSettings";
-  const Text code_selector = u"CodeCount";
+  const Text previous = u"PreviousDatabaseSettings";
+  const Text code = u"CodeCount";
   // By their first letters: the user's, the database's, of the previous database, of the code counter.
   std::map<char, Text> groups = {{'u', u"ORV3\\Main_anne_UserSettings|S|k"},
                                  {'d', u"ORV3\\Main_DatabaseSettings|S|k"},
@@ -93,17 +64,17 @@ TEST_F(Configuration, GroupsOfTheStore) {
   const Rows<Text, Text, Text, Text, char, std::string> rows = {
       {"the user's", u"anne", u"mine", u"data", u"mine", 'u', "ud"},
       {"the database's", u"anne", u"mine", u"data", u"data", 'd', "ud"},
-      {"previous", u"anne", u"mine", u"data", previous_selector, 'p', "p"},
-      {"code", u"anne", u"mine", u"data", code_selector, 'c', "c"},
+      {"previous", u"anne", u"mine", u"data", previous, 'p', "p"},
+      {"code", u"anne", u"mine", u"data", code, 'c', "c"},
       {"case counts", u"anne", u"mine", u"data", u"codecount", 'u', "ud"},
       {"unknown", u"anne", u"mine", u"data", u"C:\\a.ini", 'u', "ud"},
       {"no user: the database's", u"", u"mine", u"data", u"mine", 'd', "nd"},
-      {"no user: previous all the same", u"", u"mine", u"data", previous_selector, 'p', "p"},
-      {"no user: not code, which is written", u"", u"mine", u"data", code_selector, 'd', "c"},
+      {"no user: previous all the same", u"", u"mine", u"data", previous, 'p', "p"},
+      {"no user: not code, which is written", u"", u"mine", u"data", code, 'd', "c"},
       {"an empty selector is not the host's own", u"anne", u"", u"data", u"", 'u', "ud"},
       {"but can be the database's", u"anne", u"", u"", u"", 'd', "ud"},
-      {"the host's comes first", u"anne", code_selector, previous_selector, code_selector, 'u', "ud"},
-      {"the database's before previous", u"anne", u"x", previous_selector, previous_selector, 'd', "ud"},
+      {"the host's comes first", u"anne", code, previous, code, 'u', "ud"},
+      {"the database's before previous", u"anne", u"x", previous, previous, 'd', "ud"},
   };
   check_rows(rows, [&](const Text& user, const Text& own, const Text& data, const Text& selector, char read,
                        const std::string& written) {
@@ -127,7 +98,8 @@ TEST_F(Configuration, GroupsOfTheStore) {
     EXPECT_EQ(output, u"\\v");
   });
   platform.settings_store.fails = true;
-  EXPECT_EQ(error_of([&] { (void)utils.GetCfgFileData(u"S", u"k", u"d", u"x", Boolean(false)); }), 57);
+  check(
+      {{u"GetCfgFileData", {{u"S|k|d|x|False", "error 57"}}}, {u"SaveCfgFileData", {{u"S|k|d|x|False", "error 57"}}}});
 }
 
 }  // namespace

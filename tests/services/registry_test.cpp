@@ -1,48 +1,34 @@
-#include <gtest/gtest.h>
-
-#include "tests/fakes/utils_test.hpp"
+#include "tests/library/answers.hpp"
 
 namespace talutil::testing {
 namespace {
 
-using RegistryTest = UtilsTest;
+using RegistryTest = AnsweringMembers;
 
 TEST_F(RegistryTest, ReadsTextsAndNumbersOfTheUser) {
+  // clang-format off
   platform.registry.keys[u"Key"] = {
-      {u"text", {1, std::string("abc\0", 4)}},
-      {u"empty", {1, std::string(1, '\0')}},
-      {u"nothing", {1, ""}},
-      {u"number", {4, std::string("\xD6\xFF\xFF\xFF", 4)}},
-      {u"binary", {3, "xy"}},
-      {u"long", {4, "123456"}},
-  };
-  const struct {
-    TextView key;
-    TextView name;
-    std::int32_t status;
-    TextView text;
-  } rows[] = {
-      {u"Key", u"text", 0, u"abc"},   {u"Key", u"empty", 0, u""},    {u"Key", u"nothing", 0, u""},
-      {u"Key", u"number", 0, u"-42"}, {u"Key", u"binary", -1, u""},  {u"Key", u"long", 234, u""},
-      {u"Key", u"missing", 2, u""},   {u"Missing", u"text", 6, u""},
-  };
-  for (const auto& row : rows) {
-    EXPECT_EQ(utils.REGISTRY_QueryValue(Text(row.key), Text(row.name)), row.status) << to_utf8(row.name);
-    EXPECT_EQ(utils.REGISTRY_ReturnValue(Text(row.key), Text(row.name)), row.text) << to_utf8(row.name);
-  }
+      {u"text", {1, std::string("abc\0", 4)}}, {u"empty", {1, std::string(1, '\0')}}, {u"nothing", {1, ""}},
+      {u"number", {4, std::string("\xD6\xFF\xFF\xFF", 4)}}, {u"binary", {3, "xy"}}, {u"long", {4, "123456"}}};
+  check({{u"REGISTRY_QueryValue", {{u"Key|text", "0"}, {u"Key|empty", "0"}, {u"Key|nothing", "0"}, {u"Key|number", "0"},
+          {u"Key|binary", "-1"}, {u"Key|long", "234"}, {u"Key|missing", "2"}, {u"Missing|text", "6"}}},
+         {u"REGISTRY_ReturnValue", {{u"Key|text", "abc"}, {u"Key|empty", ""}, {u"Key|nothing", ""}, {u"Key|number", "-42"},
+          {u"Key|binary", ""}, {u"Key|long", ""}, {u"Key|missing", ""}, {u"Missing|text", ""}}}});
+  // clang-format on
   EXPECT_EQ(platform.registry.calls[0], u"open 1 Key");
   EXPECT_TRUE(platform.registry.opened.empty()) << "a key was left open";
 }
 
 TEST_F(RegistryTest, WritesValuesOfKeysThatExist) {
   platform.registry.keys[u"Key"];
-  utils.REGISTRY_SetKeyValue(u"Key", u"text", u"abc", 1);
-  utils.REGISTRY_SetKeyValue(u"Key", u"from a number", 12, 1);
-  utils.REGISTRY_SetKeyValue(u"Key", u"number", u"-2", 4);
-  utils.REGISTRY_SetKeyValue(u"Key", u"other", u"abc", 2);
-  utils.REGISTRY_SetKeyValue(u"Missing", u"text", u"abc", 1);
-  EXPECT_EQ(error_of([&] { utils.REGISTRY_SetKeyValue(u"Key", u"null", Null{}, 1); }), 94);
-  EXPECT_EQ(error_of([&] { utils.REGISTRY_SetKeyValue(u"Key", u"word", u"abc", 4); }), 13);
+  check({{u"REGISTRY_SetKeyValue",
+          {{u"Key|text|abc|1", "Empty"},
+           {u"Key|from a number|=12|1", "Empty"},
+           {u"Key|number|-2|4", "Empty"},
+           {u"Key|other|abc|2", "Empty"},
+           {u"Missing|text|abc|1", "Empty"},
+           {u"Key|null|@null|1", "error 94"},
+           {u"Key|word|abc|4", "error 13"}}}});
   const auto& values = platform.registry.keys[u"Key"];
   EXPECT_EQ(values.size(), 3U);
   EXPECT_EQ(values.at(u"text").data, std::string("abc\0", 4));
