@@ -1,61 +1,54 @@
-#include <gtest/gtest.h>
-
 #include <cmath>
 #include <map>
 
-#include "tests/fakes/utils_test.hpp"
+#include "tests/library/answers.hpp"
 
 namespace talutil::testing {
 namespace {
 
-using Passwords = UtilsTest;
+using Passwords = AnsweringMembers;
 
 // How often each character follows each other one, against the odds: both ends of a mix have half the weight of the
 // rest, and the one before is left out. A row of k characters has k - 2 degrees of freedom.
 TEST_F(Passwords, AMillionDrawsOfEachMixAreAsLikelyAsTold) {
-  const struct {
-    const char* name;
-    std::int16_t mix, hex;
-    TextView characters;
-  } rows[] = {
-      {"digits", 0, 9, u"0123456789"},
-      {"letters and symbols", 1, 9,
-       u"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz`~!@#$%^&*()_-+=[]{}:;'<,>.?/|\\"},
-      {"everything", 2, 0,
-       u"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz`~!@#$%^&*()_-+=[]{}:;'<,>.?/|\\0123456789"},
-      {"hexadecimal", 2, 1, u"0123456789ABCDEF"},
+  const std::tuple<std::int16_t, std::int16_t, TextView> rows[] = {
+      {0, 9, u"0123456789"},
+      {1, 9, u"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz`~!@#$%^&*()_-+=[]{}:;'<,>.?/|\\"},
+      {2, 0, u"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz`~!@#$%^&*()_-+=[]{}:;'<,>.?/|\\0123456789"},
+      {2, 1, u"0123456789ABCDEF"},
   };
-  for (const auto& row : rows) {
+  for (const auto& [mix, hex, characters] : rows) {
+    SCOPED_TRACE(to_utf8(characters));
     std::map<std::pair<char16_t, char16_t>, double> pairs;
     std::map<char16_t, double> firsts;
     for (int call = 0; call < 31; ++call) {
-      const Text password = utils.GenerateFilePassword(32767, row.mix, row.hex);
-      ASSERT_EQ(password.size(), 32767U) << row.name;
+      const Text password = utils.GenerateFilePassword(32767, mix, hex);
+      ASSERT_EQ(password.size(), 32767U);
       for (std::size_t i = 1; i < password.size(); ++i) {
         ++pairs[{password[i - 1], password[i]}];
         ++firsts[password[i - 1]];
       }
     }
-    const auto count = static_cast<double>(row.characters.size());
+    const auto count = static_cast<double>(characters.size());
     const auto odds = [&](char16_t c) {
-      return (c == row.characters.front() || c == row.characters.back() ? 0.5 : 1) / (count - 1);
+      return (c == characters.front() || c == characters.back() ? 0.5 : 1) / (count - 1);
     };
     double chi_square = 0;
     double met = 0;
-    for (const char16_t a : row.characters) {
-      for (const char16_t b : row.characters) {
+    for (const char16_t a : characters) {
+      for (const char16_t b : characters) {
         const double expected = a == b ? 0 : firsts[a] * odds(b) / (1 - odds(a));
         const double seen = pairs[{a, b}];
         met += seen;
         if (a == b)
-          ASSERT_EQ(seen, 0) << row.name;
+          ASSERT_EQ(seen, 0);
         else
           chi_square += (seen - expected) * (seen - expected) / expected;
       }
     }
-    EXPECT_EQ(met, 31 * 32766) << row.name << ": characters of another mix";
+    EXPECT_EQ(met, 31 * 32766) << "characters of another mix";
     const double freedom = count * (count - 2);
-    EXPECT_LT(std::abs(chi_square - freedom), 4 * std::sqrt(2 * freedom)) << row.name;
+    EXPECT_LT(std::abs(chi_square - freedom), 4 * std::sqrt(2 * freedom));
   }
 }
 
@@ -83,15 +76,12 @@ TEST_F(Passwords, HalvesRoundToEvenAndRepeatedDrawsAreDropped) {
 }
 
 TEST_F(Passwords, NothingToDraw) {
-  const struct {
-    std::int16_t length, mix, hex;
-    Text expected;
-  } rows[] = {{0, 1, 0, u""}, {-32768, 2, 0, u""}, {5, 7, 0, u""}, {5, -1, 1, u""}, {1, 2, 5, u"A"}, {0, 2, 5, u""}};
-  for (const auto& row : rows) EXPECT_EQ(utils.GenerateFilePassword(row.length, row.mix, row.hex), row.expected);
+  check({{u"GenerateFilePassword",
+          {{u"0|1|0", ""}, {u"-32768|2|0", ""}, {u"5|7|0", ""}, {u"5|-1|1", ""}, {u"1|2|5", "A"}, {u"0|2|5", ""}}}});
   EXPECT_EQ(platform.waits, 0);
   // It sleeps between messages until the thread is asked to quit.
   platform.quits_after_waits = 3;
-  EXPECT_EQ(error_of([&] { (void)utils.GenerateFilePassword(2, 2, 5); }), 18);
+  check({{u"GenerateFilePassword", {{u"2|2|5", "error 18"}}}});
   EXPECT_EQ(platform.waits, 3);
 }
 

@@ -1,15 +1,13 @@
-#include <gtest/gtest.h>
-
 #include <limits>
 
 #include "tests/fakes/recording_control.hpp"
-#include "tests/fakes/utils_test.hpp"
+#include "tests/library/answers.hpp"
 
 namespace talutil::testing {
 namespace {
 
 using namespace std::string_view_literals;
-using Sanitising = UtilsTest;
+using Sanitising = AnsweringMembers;
 
 constexpr std::int32_t counter_maximum = std::numeric_limits<std::int32_t>::max();
 
@@ -64,30 +62,25 @@ TEST_F(Sanitising, VerifyTextDataCleansAndCuts) {
         << to_utf8(text) << ", extras " << extras << ", width " << width;
   }
   const Rows<std::int16_t, Variant, Text> rows = {
-      {"Null", 0, Null{}, u""},
       {"Empty, whose lines are not looked at", 5, Variant(), u""},
-      {"empty text", 5, u"", u""},
-      {"other extras", 6, u"1, 2", u"1, 2"},
       {"trimmed before the end at NUL", 0, Text(u" ab \0 cd", 8), u"ab "},
-      {"number", 0, 12.5, u"12.5"},
       {"object", 0, holder_of(u" a "), u"a"},
       {"object that holds Null", 0, holder_of(Null{}), u""},
-      {"a line break at the end makes one more line", 5, u"A\r\n", lines({u"A", u""})},
-      {"nothing but a mark", 5, u"$*$", u""},
-      {"part of a mark", 5, u"$*", lines({u"$*"})},
-      {"a mark that the cleaning made", 5, u"A\r\n$#*$", lines({u"A"})},
-      {"lone carriage returns and line feeds break nothing", 5, u"A\rB\nC", lines({u"A\rB\nC"})},
-      {"a text that was cleaned away is one empty line", 5, u"\"", lines({u""})},
-      {"two short lines", 4, u"Unit 5\r\nMain Rd", lines({u"Unit 5 - Main Rd"})},
-      {"two at a time, from the end", 4, u"a\r\nb\r\nc", lines({u"a", u"b - c"})},
-      {"a seventh line goes", 4, u"a\r\nb\r\nc\r\nd\r\ne\r\nf\r\ng", lines({u"b - c", u"d - e", u"f - g"})},
-      {"nothing is left", 4, u" \r\n $*$", u""},
   };
   check_rows(rows, [&](std::int16_t extras, const Variant& data, const Text& expected) {
     EXPECT_EQ(utils.VerifyTextData(0, extras, data), expected);
   });
-  EXPECT_EQ(utils.VerifyTextData(2, 5, u"A"), u"A\r") << "cut within the line break";
-  EXPECT_EQ(utils.settings().CounterVerifyText, calls + static_cast<std::int32_t>(rows.size()) + 1);
+  EXPECT_EQ(utils.settings().CounterVerifyText, calls + static_cast<std::int32_t>(rows.size()));
+  // clang-format off
+  check({{u"VerifyTextData", {{u"0|0|@null", ""}, {u"0|5|", ""}, {u"0|6|1, 2", "1, 2"}, {u"0|0|=12.5", "12.5"},
+          // A line break at the end makes one more line; a lone carriage return or line feed breaks nothing.
+          {u"0|5|A\r\n", "A\r\n\r\n"}, {u"0|5|A\rB\nC", "A\rB\nC\r\n"}, {u"0|5|\"", "\r\n"}, {u"2|5|A", "A\r"},
+          // A mark may be one that the cleaning made.
+          {u"0|5|$*$", ""}, {u"0|5|$*", "$*\r\n"}, {u"0|5|A\r\n$#*$", "A\r\n"}, {u"0|4| \r\n $*$", ""},
+          // Lines are joined two at a time, from the end, and a seventh goes.
+          {u"0|4|Unit 5\r\nMain Rd", "Unit 5 - Main Rd\r\n"}, {u"0|4|a\r\nb\r\nc", "a\r\nb - c\r\n"},
+          {u"0|4|a\r\nb\r\nc\r\nd\r\ne\r\nf\r\ng", "b - c\r\nd - e\r\nf - g\r\n"}}}});
+  // clang-format on
 }
 
 // Marked lines are dropped, the last three others kept; one below 40 is joined to the one before it where both are
@@ -131,21 +124,25 @@ TEST_F(Sanitising, VerifyTextDataKeepsLinesByTheirLengths) {
 
 // An override of a member sees every inner call, in this order.
 TEST_F(Sanitising, ToolkitIsCalledInOrder) {
-  (void)utils.VerifyTextData(1, 3, u" a,b c ");
-  EXPECT_EQ(utils.calls,
-            (std::vector<Text>{u"StripNulls|a,b c", u"StringReplace|a,b c|&|and", u"StringReplace|a,b c|\"|",
-                               u"StringReplace|a,b c|'|\u00B4", u"StringReplace|a,b c|\t|", u"StringReplace|a,b c|#|",
-                               u"StringReplace|a,b c|>|", u"StringReplace|a,b c|<|", u"StringReplace|a,b c|?|",
-                               u"StringReplace|a,b c|,|", u"StringReplace|ab c| |"}));
-  utils.calls.clear();
+  const auto check_calls = [&](const Text& start, std::initializer_list<TextView> changes, const Text& last) {
+    std::vector<Text> expected = {start};
+    for (const TextView change : changes) expected.push_back(u"StringReplace" + Text(change));
+    expected.push_back(last);
+    EXPECT_EQ(utils.calls, expected);
+    utils.calls.clear();
+  };
+  (void)utils.VerifyTextData(1, 3, u" a,b ");
+  check_calls(u"StripNulls|a,b",
+              {u"|a,b|&|and", u"|a,b|\"|", u"|a,b|'|\u00B4", u"|a,b|\t|", u"|a,b|#|", u"|a,b|>|", u"|a,b|<|",
+               u"|a,b|?|", u"|a,b|,|"},
+              u"StringReplace|ab| |");
   (void)utils.VerifyTextData(0, 3, Null{});
   EXPECT_TRUE(utils.calls.empty());
   (void)utils.VerifyMemField(u"x");
-  EXPECT_EQ(utils.calls,
-            (std::vector<Text>{u"StringReplace|x|\n| ", u"StringReplaceWord|x|  | ", u"StringReplaceWord|x|   | ",
-                               u"StringReplaceWord|x|    | ", u"StringReplaceWord|x|\r\n\r\n|\r\n",
-                               u"StringReplaceWord|x|\r\n\r\n\r\n|\r\n", u"StringReplaceWord|x|\r\r|\r",
-                               u"StringReplaceWord|x|\r\r\r|\r", u"StringReplaceWord|x|\r\r\r\r|\r"}));
+  check_calls(u"StringReplace|x|\n| ",
+              {u"Word|x|  | ", u"Word|x|   | ", u"Word|x|    | ", u"Word|x|\r\n\r\n|\r\n", u"Word|x|\r\n\r\n\r\n|\r\n",
+               u"Word|x|\r\r|\r", u"Word|x|\r\r\r|\r"},
+              u"StringReplaceWord|x|\r\r\r\r|\r");
 }
 
 TEST_F(Sanitising, CallsAreCountedBeforeTheValueIsLookedAtAndAFullCounterEndsThem) {
@@ -163,28 +160,22 @@ TEST_F(Sanitising, CallsAreCountedBeforeTheValueIsLookedAtAndAFullCounterEndsThe
     EXPECT_EQ(std::pair(texts, integers), std::pair(count, count));
   });
   texts = integers = counter_maximum - 1;
-  EXPECT_EQ(utils.VerifyTextData(0, 0, Null{}), u"");
-  EXPECT_EQ(utils.VerifyIntData(1, Null{}), u"0");
-  EXPECT_EQ(error_of([&] { (void)utils.VerifyTextData(0, 0, Null{}); }), 6);
-  EXPECT_EQ(error_of([&] { (void)utils.VerifyIntData(1, Null{}); }), 6);
+  check({{u"VerifyTextData", {{u"0|0|@null", ""}, {u"0|0|@null", "error 6"}}},
+         {u"VerifyIntData", {{u"1|@null", "0"}, {u"1|@null", "error 6"}}}});
   EXPECT_EQ(std::pair(texts, integers), std::pair(counter_maximum, counter_maximum));
 }
 
 TEST_F(Sanitising, VerifyIntData) {
-  const Rows<std::int16_t, Variant, std::string> rows = {
-      {"Null", 0, Null{}, ""},
-      {"Null with the flag", 1, Null{}, "0"},
-      {"Null with another flag", -1, Null{}, ""},
-      {"object that holds Null", 1, holder_of(Null{}), "0"},
-      {"Empty", 0, Variant(), "0"},
-      {"trailing zero and unit", 0, u"3.50kg", "3.5"},
-      {"number", 0, std::int16_t{-7}, "-7"},
-      {"object", 0, holder_of(u"8 St"), "8"},
-      {"too large", 0, u"1E999", "error 6"},
-  };
-  check_rows(rows, [&](std::int16_t flag, const Variant& data, const std::string& answer) {
-    EXPECT_EQ(outcome([&] { return utils.VerifyIntData(flag, data); }), answer);
-  });
+  check({{u"VerifyIntData",
+          {{u"0|@null", ""},
+           {u"1|@null", "0"},
+           {u"-1|@null", ""},
+           {u"0|@empty", "0"},
+           {u"0|3.50kg", "3.5"},
+           {u"0|=-7", "-7"},
+           {u"0|1E999", "error 6"}}}});
+  EXPECT_EQ(utils.VerifyIntData(1, holder_of(Null{})), u"0");
+  EXPECT_EQ(utils.VerifyIntData(0, holder_of(u"8 St")), u"8");
   platform.separators.decimal_separator = u',';
   platform.separators.thousands_separator = u'.';
   library.start();
@@ -196,10 +187,10 @@ TEST_F(Sanitising, VerifyIntData) {
 TEST_F(Sanitising, VerifyMemField) {
   EXPECT_EQ(utils.VerifyMemField(u"\t\"'A\n\nB\r\n\r\nC"), u"\t\"'A B\r \r C");
   // How many blanks, and how many carriage returns, are left of a run.
-  const struct { std::size_t before, after; } runs[] = {{1, 1}, {2, 1}, {3, 2}, {4, 2}, {5, 1}, {9, 3}, {16, 1}};
-  for (const auto& run : runs) {
-    EXPECT_EQ(utils.VerifyMemField(Text(run.before, u' ')), Text(run.after, u' ')) << run.before;
-    EXPECT_EQ(utils.VerifyMemField(Text(run.before, u'\r')), Text(run.after, u'\r')) << run.before;
+  for (const auto& [before, after] : {std::pair(1, 1), {2, 1}, {3, 2}, {4, 2}, {5, 1}, {9, 3}, {16, 1}}) {
+    for (const char16_t unit : {u' ', u'\r'}) {
+      EXPECT_EQ(utils.VerifyMemField(Text(std::size_t(before), unit)), Text(std::size_t(after), unit)) << before;
+    }
   }
 }
 
