@@ -2,7 +2,7 @@
 
 #include "library/c_control_position.hpp"
 #include "tests/fakes/recording_control.hpp"
-#include "tests/fakes/utils_test.hpp"
+#include "tests/library/answers.hpp"
 
 namespace talutil {
 
@@ -14,7 +14,7 @@ using ::testing::IsEmpty;
 using testing::RecordingControl;
 using Uses = std::vector<std::string>;
 
-struct Forms : testing::UtilsTest {
+struct Forms : testing::AnsweringMembers {
   std::shared_ptr<RecordingControl> control = std::make_shared<RecordingControl>();
   Variant holder{ObjectRef(control)};
 
@@ -41,10 +41,8 @@ TEST_F(Forms, ComboEntriesAreFoundByTheirKey) {
   control->values["ListCount"] = std::int16_t{0};
   EXPECT_EQ(utils.GetComboListIndex(holder, 42), -1);
 
-  for (const auto& [value, error] : std::initializer_list<std::pair<Variant, int>>{
-           {Variant(), 424}, {Null{}, 424}, {Variant(u"combo"), 424}, {ObjectRef(), 91}}) {
-    EXPECT_EQ(error_of([&] { utils.GetComboListIndex(value, 1); }), error);
-  }
+  check({{u"GetComboListIndex", {{u"@empty|1", "error 424"}, {u"@null|1", "error 424"}, {u"combo|1", "error 424"}}}});
+  EXPECT_EQ(error_of([&] { utils.GetComboListIndex(ObjectRef(), 1); }), 91);
   control->values.erase("ListCount");
   EXPECT_EQ(error_of([&] { utils.GetComboListIndex(holder, 1); }), 9) << "the control's own error";
   EXPECT_EQ(control.use_count(), 2) << "no reference is kept";
@@ -114,14 +112,10 @@ TEST_F(Forms, GridWidthsAreRemembered) {
 }
 
 TEST_F(Forms, TicksAreSetAndCounted) {
-  control->values = {{"Rows", std::int32_t{4}},
-                     {"FixedRows", std::int32_t{1}},
-                     {"ColDataType(3&)", std::int16_t{11}},
-                     {"ColDataType(0&)", std::int16_t{8}},
-                     {"TextMatrix", {}},
-                     {"Cell(5%, 1&, 3&)", std::int16_t{1}},
-                     {"Cell(5%, 2&, 3&)", std::int16_t{2}},
-                     {"Cell(5%, 3&, 3&)", u"1"}};
+  constexpr std::int16_t ticks = 11;
+  control->values = {{"Rows", 4}, {"FixedRows", 1}, {"TextMatrix", {}}, {"ColDataType(3&)", ticks}};
+  control->values.insert({{"ColDataType(0&)", 8}, {"Cell(5%, 1&, 3&)", 1}, {"Cell(5%, 2&, 3&)", 2}});
+  control->values["Cell(5%, 3&, 3&)"] = u"1";
   utils.SelectGridRows(3, holder, 1);
   EXPECT_EQ(uses(), (Uses{"Rows", "FixedRows", "ColDataType(3&)", "put TextMatrix(1&, 3&) = True",
                           "put TextMatrix(2&, 3&) = True", "put TextMatrix(3&, 3&) = True"}));
@@ -160,10 +154,11 @@ TEST_F(Forms, TicksAreSetAndCounted) {
 }
 
 TEST_F(Forms, WindowStatesAreRemembered) {
+  const Uses as_it_was{"put WindowState = 0#", "WindowState", "Width",
+                       "put Width = 6000#",    "Height",      "put Height = 4500#"};
   control->values = {{"WindowState", std::int16_t{2}}, {"Width", 6000.0F}, {"Height", 4500.0F}};
   utils.LoadWindowState(holder, u"Main");
-  EXPECT_EQ(uses(), (Uses{"put WindowState = 0#", "WindowState", "Width", "put Width = 6000#", "Height",
-                          "put Height = 4500#"}));
+  EXPECT_EQ(uses(), as_it_was);
   utils.SaveWindowState(holder, u"Main");
   EXPECT_EQ(uses(), (Uses{"WindowState", "WindowState", "Width", "Height"}));
   // A maximised window keeps its size to itself, and the last normal size survives it.
@@ -171,11 +166,9 @@ TEST_F(Forms, WindowStatesAreRemembered) {
   utils.SaveWindowState(holder, u"Main");
   utils.LoadWindowState(holder, u"Main");
   EXPECT_EQ(uses(), (Uses{"WindowState", "WindowState", "put WindowState = 2#", "WindowState"}));
-  Text normal = u"0";
-  utils.SaveCfgFileData(u"Main", u"WindowState", normal, u"CFG", Boolean(false));
+  check({{u"SaveCfgFileData", {{u"Main|WindowState|0|CFG|False", "Empty"}}}});
   utils.LoadWindowState(holder, u"Main");
-  EXPECT_EQ(uses(), (Uses{"put WindowState = 0#", "WindowState", "Width", "put Width = 6000#", "Height",
-                          "put Height = 4500#"}));
+  EXPECT_EQ(uses(), as_it_was);
 }
 
 TEST_F(Forms, ConfirmationsWantYesInUpperCase) {
@@ -211,38 +204,18 @@ TEST_F(Forms, PointsOnAnEdgeAreOutside) {
   const auto inside = [&](const Variant& x, const Variant& y) {
     return utils.GetMousePos(x, y, 10, std::int16_t{10}, 20.0, u"30").is_exactly_true();
   };
-  EXPECT_TRUE(inside(15, 15)) << "numbers come before texts";
-  EXPECT_FALSE(inside(10, 15));
-  EXPECT_FALSE(inside(20, 15));
-  EXPECT_FALSE(inside(15, 10));
-  EXPECT_FALSE(inside(15, Null{}));
-  EXPECT_FALSE(inside(Variant(), 15)) << "Empty is 0";
-  EXPECT_TRUE(utils.GetMousePos(u"5", u"5", u"10", u"10", u"9", u"9")) << "texts compare as texts";
-  EXPECT_TRUE(inside(10.5F, 29.5));
-  EXPECT_EQ(error_of([&] { inside(0, ErrorValue{5}); }), 13) << "wherever it stands";
+  EXPECT_TRUE(inside(15, 15) && inside(10.5F, 29.5)) << "numbers come before texts";
+  EXPECT_FALSE(inside(10, 15) || inside(20, 15) || inside(15, 10) || inside(15, Null{}) || inside(Variant(), 15));
+  check({{u"GetMousePos", {{u"5|5|10|10|9|9", "True"}, {u"=0|@error|=10|=10|=20|30", "error 13"}}}});
 }
 
 TEST_F(Forms, PagesAreCountedInSinglePrecision) {
-  const struct {
-    std::int32_t rows_per_page;
-    std::int32_t rows;
-    std::int32_t pages;
-  } table[] = {{10, 0, 0},
-               {10, 1, 1},
-               {4, 10, 3},
-               {4, 12, 3},
-               {4, 14, 4},
-               {10, -15, -2},
-               {-10, 15, -2},
-               {1, 16777217, 16777216},
-               {2, 33554435, 16777216},
-               {1, 2147483520, 2147483520}};
-  for (const auto& row : table) {
-    EXPECT_EQ(utils.GetMaxPages(row.rows_per_page, row.rows), row.pages) << row.rows_per_page << ' ' << row.rows;
-  }
-  EXPECT_EQ(error_of([&] { utils.GetMaxPages(0, 0); }), 11);
-  EXPECT_EQ(error_of([&] { utils.GetMaxPages(1, 2147483647); }), 6);
-  EXPECT_EQ(error_of([&] { utils.GetMaxPages(-1, -2147483647 - 1); }), 6);
+  // clang-format off
+  check({{u"GetMaxPages", {{u"10|0", "0"}, {u"10|1", "1"}, {u"4|10", "3"}, {u"4|12", "3"}, {u"4|14", "4"},
+          {u"10|-15", "-2"},
+          {u"-10|15", "-2"}, {u"1|16777217", "16777216"}, {u"2|33554435", "16777216"}, {u"1|2147483520", "2147483520"},
+          {u"0|0", "error 11"}, {u"1|2147483647", "error 6"}, {u"-1|-2147483648", "error 6"}}}});
+  // clang-format on
 }
 
 TEST_F(Forms, FormsArePrinted) {
@@ -258,13 +231,8 @@ TEST_F(Forms, FormsArePrinted) {
 TEST_F(Forms, TextIsDrawnIntoARectangle) {
   library.start();
   library.settings().DrawTextPictureBox = control;
-  control->values = {{"FontBold", Boolean(false)},
-                     {"ForeColor", std::int32_t{5}},
-                     {"TextWidth(\"abc\")", 300.0F},
-                     {"TextHeight(\"abc\")", 200.0F},
-                     {"hDC", std::int32_t{99}},
-                     {"CurrentX", 0.0F},
-                     {"CurrentY", 0.0F}};
+  control->values = {{"FontBold", Boolean(false)}, {"ForeColor", 5}, {"hDC", 99}, {"CurrentX", 0}, {"CurrentY", 0}};
+  control->values.insert({{"TextWidth(\"abc\")", 300}, {"TextHeight(\"abc\")", 200}});
   control->methods = {"Print"};
   const auto draw = [&](std::int16_t right, std::int16_t justify, bool wraps = false) {
     uses();
@@ -276,11 +244,9 @@ TEST_F(Forms, TextIsDrawnIntoARectangle) {
             (Uses{"FontBold", "ForeColor", "put FontBold = True", "put ForeColor = 255&", "TextWidth(\"abc\")",
                   "TextHeight(\"abc\")", "put CurrentX = 150!", "put CurrentY = 350!", "call Print(\"abc\")",
                   "put ForeColor = 5&", "put FontBold = False"}));
-  const auto place = [&](std::int16_t justify) { return draw(50, justify)[6]; };
-  EXPECT_EQ(place(-2), "put CurrentX = 150!");
-  EXPECT_EQ(place(-1), "put CurrentX = 150!");
-  EXPECT_EQ(place(0), "put CurrentX = 300!");
-  EXPECT_EQ(place(1), "put CurrentX = 450!");
+  for (const auto& [justify, left] : {std::pair(-2, "150!"), {-1, "150!"}, {0, "300!"}, {1, "450!"}}) {
+    EXPECT_EQ(draw(50, static_cast<std::int16_t>(justify))[6], std::string("put CurrentX = ") + left);
+  }
   EXPECT_EQ(draw(29, -2)[8], "call Print(\"abc\")") << "runs over the edge";
   EXPECT_EQ(draw(29, -1)[5], "hDC");
   draw(29, 1, true);
@@ -303,11 +269,8 @@ struct MovableControl : Forms {
 
   MovableControl() {
     form->values = {{"ScaleWidth", 1000.0F}, {"ScaleHeight", 800.0F}};
-    control->values = {{"Container", ObjectRef(std::make_shared<RecordingControl>())},
-                       {"left", 100.0F},
-                       {"Top", 100.0F},
-                       {"Width", 300.0F},
-                       {"Height", 200.0F}};
+    control->values = {{"left", 100.0F}, {"Top", 100.0F}, {"Width", 300.0F}, {"Height", 200.0F}};
+    control->values["Container"] = ObjectRef(std::make_shared<RecordingControl>());
     control->methods = {"Move"};
     position.DragStartX = 10;
     position.DragStartY = 20;
@@ -359,9 +322,7 @@ TEST_F(MovableControl, PositionsAreRemembered) {
   position.DefaultTop = 30;
   position.Width = 7;
   position.GetControlPosition();
-  EXPECT_EQ(position.left, 15);
-  EXPECT_EQ(position.Top, 30);
-  EXPECT_EQ(position.Width, 7) << "only places have defaults";
+  EXPECT_EQ(std::tuple(position.left, position.Top, position.Width), std::tuple(15, 30, 7)) << "places have defaults";
 
   position.left = 0;
   position.Top = 480;
