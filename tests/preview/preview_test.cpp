@@ -1,7 +1,5 @@
 #include <gmock/gmock.h>
 
-#include <random>
-
 #include "controls/grid.hpp"
 #include "controls/print_control.hpp"
 #include "preview/frm_print_preview.hpp"
@@ -54,14 +52,19 @@ struct Builders : Preview {
     utils.GridPrintPreview(100, 1, u"Sales", u"C:\\x", holder, from, to, u"Cap");
     return to_utf8(print->values["Header"].to_text(plain_numbers));
   }
+
+  /// How the print control was used since the last time.
+  std::string uses() {
+    std::string all;
+    for (const std::string& use : std::exchange(print->uses, {})) all += use + '|';
+    return all;
+  }
 };
 
-const Uses fixed_settings{"put #34 = False", "put #60 = 1%", "put #152 = True", "put #126 = True", "put #57 = 100%"};
-
-Uses joined(std::initializer_list<Uses> parts) {
-  Uses all;
-  for (const Uses& part : parts) all.insert(all.end(), part.begin(), part.end());
-  return all;
+/// How a preview is set up, whatever comes before and after.
+std::string uses_around(const std::string& before, const std::string& after) {
+  return before + "|put #34 = False|put #60 = 1%|put #152 = True|put #126 = True|put #57 = 100%|" + after +
+         "|call EndDoc|CurrentPage|PageCount|CurrentPage|put CurrentPage = 1%|CurrentPage|PageCount|shown|";
 }
 
 TEST_F(Builders, SetThePrintControlUpInOrder) {
@@ -69,36 +72,23 @@ TEST_F(Builders, SetThePrintControlUpInOrder) {
   library.settings().sGridPaperSize = u"A3";
   platform.preview.user = [&](PreviewEvents&) { print->uses.emplace_back("shown"); };
   utils.GridPrintPreview(75, 2, u"Sales", u"C:\\x", holder, Variant(), Variant(), u"Cap");
-  const Uses browsing{"CurrentPage", "PageCount", "CurrentPage", "put CurrentPage = 1%",
-                      "CurrentPage", "PageCount", "shown"};
-  EXPECT_EQ(print->uses, joined({{"put HeaderFontName = \"Courier New\"", "put FontName = \"Courier New\"",
-                                  "put Zoom = 75#", "put Duplex = 3%", "put PaperSize = 8%"},
-                                 fixed_settings,
-                                 {"put Orientation = 1%", "put Header = \"  Sales\"", "call StartDoc",
-                                  "put RenderControl = 77&", "call EndDoc"},
-                                 browsing}));
-  print->uses.clear();
+  EXPECT_EQ(uses(), uses_around("put HeaderFontName = \"Courier New\"|put FontName = \"Courier New\"|put Zoom = 75#|"
+                                "put Duplex = 3%|put PaperSize = 8%",
+                                "put Orientation = 1%|put Header = \"  Sales\"|call StartDoc|put RenderControl = 77&"));
+  // Texts in another case set nothing, nor do other directions.
   library.settings().sGridPaperDuplex = u"horizontal";
   library.settings().sGridPaperSize = u"a4";
   utils.GridPrintPreview(75, 0, u"Sales", u"C:\\x", holder, Variant(), Variant(), u"");
-  EXPECT_EQ(print->uses[3], "put #34 = False") << "texts in another case set nothing";
-  EXPECT_EQ(print->uses[8], "put Header = \"  Sales\"") << "nor do other directions";
-
-  print->uses.clear();
+  EXPECT_EQ(uses(), uses_around("put HeaderFontName = \"Courier New\"|put FontName = \"Courier New\"|put Zoom = 75#",
+                                "put Header = \"  Sales\"|call StartDoc|put RenderControl = 77&"));
   source->values["Text"] = u"words";
   utils.TextBoxPrintPreview(50, 1, u"Notes", u"C:\\x", holder);
-  EXPECT_EQ(print->uses, joined({{"put Zoom = 50#", "put PaperSize = 9%"},
-                                 fixed_settings,
-                                 {"put Orientation = 0%", "put Header = \"  Notes\"", "call StartDoc",
-                                  "put Text = \"words\"", "call EndDoc"},
-                                 browsing}));
-  print->uses.clear();
+  EXPECT_EQ(uses(), uses_around("put Zoom = 50#|put PaperSize = 9%",
+                                "put Orientation = 0%|put Header = \"  Notes\"|call StartDoc|put Text = \"words\""));
   source->values = {{"ListCount", 3}, {"List(0&)", u"a"}, {"List(1&)", u"b"}, {"List(2&)", u"c"}};
   utils.ListBoxPrintPreview(50, 0, u"Notes", u"C:\\x", holder);
-  const auto first = std::ranges::find(print->uses, "call TextBox(\"a\", 100&, 100&, 9800&, 567&)");
-  ASSERT_NE(first, print->uses.end());
-  EXPECT_EQ(first[1], "call TextBox(\"b\", 100&, 780&, 9800&, 567&)");
-  EXPECT_EQ(first[2], "call TextBox(\"c\", 100&, 1460&, 9800&, 567&)");
+  EXPECT_THAT(uses(), HasSubstr("|call TextBox(\"a\", 100&, 100&, 9800&, 567&)|call TextBox(\"b\", 100&, 780&, 9800&, "
+                                "567&)|call TextBox(\"c\", 100&, 1460&, 9800&, 567&)|"));
 }
 
 TEST_F(Builders, DatesStandInTheHeader) {
@@ -185,15 +175,12 @@ TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
     platform.prints = false;
     events.key_down(120);
     ASSERT_EQ(platform.print_jobs.size(), 1U);
-    EXPECT_EQ(platform.print_jobs[0].paper_size, 8);
-    EXPECT_EQ(platform.print_jobs[0].duplex, 2);
-    EXPECT_TRUE(platform.print_jobs[0].shows_dialog);
+    const PrintSettings& job = platform.print_jobs[0];
+    EXPECT_EQ(std::tuple(job.paper_size, job.duplex, job.shows_dialog), std::tuple(8, 2, true));
 
     events.resized();
-    EXPECT_EQ(view.width, 9000) << "600 pixels at least";
-    EXPECT_EQ(view.height, 4800) << "400 pixels";
-    EXPECT_EQ(view.pages_width, 9000 - 300 - 150);
-    EXPECT_EQ(view.pages_height, 4800 - 300 - 120);
+    EXPECT_EQ(std::pair(view.width, view.height), std::pair(9000.0F, 4800.0F)) << "600 by 400 pixels at least";
+    EXPECT_EQ(std::pair(view.pages_width, view.pages_height), std::pair(8550.0F, 4380.0F));
     view.state = 1;
     events.resized();
     EXPECT_EQ(view.state, 0);
@@ -245,11 +232,24 @@ TEST_F(Builders, ErrorsOfPagingReachTheCallerOthersNobody) {
 struct Pages : Preview {
   std::shared_ptr<PrintControl> print = std::make_shared<PrintControl>(library.platform());
 
-  const Document& document_of(const Text& text) {
+  testing::Generator generator;
+
+  /// The document that a job makes of a print control.
+  template <class Job>
+  const Document& made_by(const Job& job) {
     print->StartDoc();
-    print->put_Text(text);
+    job();
     print->EndDoc();
     return print->document();
+  }
+  const Document& document_of(const Text& text) {
+    return made_by([&] { print->put_Text(text); });
+  }
+  const Document& document_of(const std::shared_ptr<Grid>& grid) {
+    return made_by([&] {
+      print->RenderObject = ObjectRef(grid);
+      print->put_RenderControl(1);
+    });
   }
 };
 
@@ -276,16 +276,14 @@ TEST_F(Pages, TextFlowsAndBreaks) {
 }
 
 TEST_F(Pages, WordsBreakWhereANaiveBreakerBreaksThem) {
-  std::mt19937 random(7);
-  const auto from_to = [&](int least, int most) { return std::uniform_int_distribution<int>(least, most)(random); };
   for (int run = 0; run < 200; ++run) {
-    const auto room = static_cast<std::size_t>(from_to(10, 30));
+    const auto room = static_cast<std::size_t>(generator.whole(10, 30));
     // Letters of Courier in 10 points are 120 twips wide.
     print->MarginRight = print->PageWidth() - print->MarginLeft - static_cast<std::int32_t>(room) * 120;
     Text text;
     std::vector<Text> expected(1);
-    for (int words = from_to(5, 40); words > 0; --words) {
-      Text word(static_cast<std::size_t>(from_to(1, 12)), static_cast<char16_t>(u'a' + from_to(0, 25)));
+    for (int words = generator.whole(5, 40); words > 0; --words) {
+      Text word(static_cast<std::size_t>(generator.whole(1, 12)), generator.one_of(TextView(u"abcdefghijklm")));
       text += (text.empty() ? u"" : u" ") + word;
       if (!expected.back().empty() && expected.back().size() + 1 + word.size() > room) expected.emplace_back();
       for (; word.size() > room; word.erase(0, room)) expected.insert(expected.end() - 1, word.substr(0, room));
@@ -301,7 +299,6 @@ TEST_F(Pages, WordsBreakWhereANaiveBreakerBreaksThem) {
 }
 
 TEST_F(Pages, RowsFillEveryPageToItsEnd) {
-  std::mt19937 random(7);
   print->MarginBottom = print->PageHeight() - print->MarginTop - 14400;
   for (int run = 0; run < 50; ++run) {
     const auto grid = std::make_shared<Grid>(library.platform());
@@ -309,7 +306,7 @@ TEST_F(Pages, RowsFillEveryPageToItsEnd) {
     std::vector<std::string> expected(1);
     std::int32_t used = 0;
     for (std::int32_t row = 0; row < 60; ++row) {
-      const std::int32_t height = 240 * std::uniform_int_distribution<std::int32_t>(1, 10)(random);
+      const std::int32_t height = 240 * generator.whole(1, 10);
       grid->AddItem(u"r" + number_to_text(row), -1);
       grid->put_RowHeight(row, height);
       if (used + height > 14400) {
@@ -319,12 +316,8 @@ TEST_F(Pages, RowsFillEveryPageToItsEnd) {
       used += height;
       expected.back() += "r" + std::to_string(row) + ' ';
     }
-    print->StartDoc();
-    print->RenderObject = ObjectRef(grid);
-    print->put_RenderControl(1);
-    print->EndDoc();
     std::vector<std::string> shown;
-    for (const Page& page : print->document().pages) {
+    for (const Page& page : document_of(grid).pages) {
       shown.emplace_back();
       for (const PageItem& item : page.items) {
         const auto* const text = std::get_if<TextRun>(&item);
@@ -341,21 +334,20 @@ TEST_F(Pages, PositionsCountFromThePaperOrTheMargins) {
   print->MarginRight = 3000;
   print->MarginBottom = 4000;
   for (const bool from_paper : {true, false}) {
-    print->StartDoc();
-    print->PhysicalPage = Boolean(from_paper);
-    print->TextBox(u"x", 100, 200, 1300, 567);
-    print->EndDoc();
-    EXPECT_THAT(runs_of(print->document().pages[0]), ::testing::StartsWith(from_paper ? "100,200 x" : "1100,2200 x"));
+    const Document& document = made_by([&] {
+      print->PhysicalPage = Boolean(from_paper);
+      print->TextBox(u"x", 100, 200, 1300, 567);
+    });
+    EXPECT_THAT(runs_of(document.pages[0]), ::testing::StartsWith(from_paper ? "100,200 x" : "1100,2200 x"));
   }
 }
 
 TEST_F(Pages, ListsRunOffThePage) {
-  print->StartDoc();
-  for (std::int32_t i = 0; i < 1000; ++i)
-    print->TextBox(u"a long entry that is cut off", 1134, 1134 + i * 680, 1300, 567);
-  print->EndDoc();
-  EXPECT_EQ(print->document().pages.size(), 1U);
-  EXPECT_THAT(runs_of(print->document().pages[0]),
+  const Document& document = made_by([&] {
+    for (int i = 0; i < 1000; ++i) print->TextBox(u"a long entry that is cut off", 1134, 1134 + i * 680, 1300, 567);
+  });
+  EXPECT_EQ(document.pages.size(), 1U);
+  EXPECT_THAT(runs_of(document.pages[0]),
               ::testing::StartsWith("1134,1134 a long\n1134,1374 entry that\n1134,1814 a long\n"));
 }
 
@@ -390,11 +382,7 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   grid->put_ColDataType(3, 11);
   grid->put_ColWidth(0, 600);
   grid->put_ColWidth(4, 9000);
-  print->StartDoc();
-  print->RenderObject = ObjectRef(grid);
-  print->put_RenderControl(1);
-  print->EndDoc();
-  const Document& document = print->document();
+  const Document& document = document_of(grid);
   ASSERT_EQ(document.pages.size(), 4U) << "two pages down, twice across";
   // Courier of 8 points: 96 twips a letter, rows of 252.
   const std::string first = runs_of(document.pages[0]);
@@ -407,11 +395,7 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   // Long texts go on in the next line where the grid shows them so; a row's own height cuts them off.
   const auto small = std::make_shared<Grid>(library.platform());
   const auto runs_of_small = [&] {
-    print->StartDoc();
-    print->RenderObject = ObjectRef(small);
-    print->put_RenderControl(1);
-    print->EndDoc();
-    const std::string runs = runs_of(print->document().pages[0]);
+    const std::string runs = runs_of(document_of(small).pages[0]);
     return runs.substr(0, runs.find("1134,15944"));
   };
   small->put_Cols(2);
@@ -427,29 +411,25 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   small->FontName = u"Times New Roman";
   small->FontSize = 20;
   small->GridLines = 0;
-  (void)runs_of_small();
-  const auto& items = print->document().pages[0].items;
-  const auto* const run = std::get_if<TextRun>(&items[0]);
+  const auto* const run = std::get_if<TextRun>(&document_of(small).pages[0].items[0]);
   ASSERT_NE(run, nullptr) << "no lines";
   EXPECT_EQ(run->font, (FontStyle{FontFamily::times, false, 20}));
 
   // A grid that fails in the middle leaves the document as it was.
   const auto broken = std::make_shared<RecordingControl>();
   broken->values = {{"Rows", 2}, {"Cols", 1}, {"TextMatrix(0&, 0&)", u"a"}};
-  print->StartDoc();
-  print->put_Text(u"before");
-  print->RenderObject = ObjectRef(broken);
-  EXPECT_EQ(error_of([&] { print->put_RenderControl(1); }), 9);
-  print->put_Text(u"after");
-  print->EndDoc();
-  EXPECT_THAT(runs_of(print->document().pages[0]), ::testing::StartsWith("1134,1134 before\n1134,1374 after\n"));
+  const Document& whole = made_by([&] {
+    print->put_Text(u"before");
+    print->RenderObject = ObjectRef(broken);
+    EXPECT_EQ(error_of([&] { print->put_RenderControl(1); }), 9);
+    print->put_Text(u"after");
+  });
+  EXPECT_THAT(runs_of(whole.pages[0]), ::testing::StartsWith("1134,1134 before\n1134,1374 after\n"));
 
   // What answers for nothing but its window is a picture.
-  print->StartDoc();
-  print->put_RenderControl(42);
-  print->EndDoc();
+  const Document& drawn = made_by([&] { print->put_RenderControl(42); });
   EXPECT_THAT(platform.drawn, ElementsAre("image of 42"));
-  const auto* const picture = std::get_if<Picture>(&print->document().pages[0].items[0]);
+  const auto* const picture = std::get_if<Picture>(&drawn.pages[0].items[0]);
   ASSERT_NE(picture, nullptr);
   EXPECT_EQ(picture->place, (TwipsRectangle{1134, 1134, 30, 15}));
 }
