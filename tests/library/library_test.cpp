@@ -26,9 +26,10 @@ TEST_F(LibraryTest, StartUpLoadsTheComponentsWindowAndReadsTheScreen) {
   EXPECT_EQ(library.settings().ComputerName, u"");
   library.start();
   EXPECT_EQ(platform.window_captions, std::vector<Text>{u"Form1"});
-  EXPECT_EQ(library.settings().ComputerName, u"FAKEPC");
-  EXPECT_EQ(library.settings().ScreenTwipsPerPixelX, 14);
-  EXPECT_EQ(library.settings().ScreenTwipsPerPixelY, 16);
+  const SharedSettings& settings = library.settings();
+  const auto twips = std::pair(settings.ScreenTwipsPerPixelX, settings.ScreenTwipsPerPixelY);
+  EXPECT_EQ(settings.ComputerName, u"FAKEPC");
+  EXPECT_EQ(twips, std::pair(14, 16));
   const std::vector<Text> in_order = {
       u"PolarCryptoLibCtl.Crypto",   u"MSComDlg.CommonDialog",     u"MSComDlg.CommonDialog",  u"VSFlex8Ctl.VSFlexGrid",
       u"SystemInfoControl.MSysInfo", u"DUZACTXLibCtl.duzactxctrl", u"DZACTXLibCtl.dzactxctrl"};
@@ -71,22 +72,18 @@ TEST_F(LibraryTest, ObjectPropertiesKeepObjectsOfTheirKindUntilTheNextPut) {
   const auto box = std::make_shared<RecordingControl>();
   form->values = {{"hwnd", 1}};
   box->values = {{"ScaleMode", 1}, {"ScaleX", 1.0F}};
-  const struct {
-    TextView property;
-    std::shared_ptr<RecordingControl> fits;
-    std::shared_ptr<RecordingControl> does_not;
-  } rows[] = {{u"FolderBrowseForm", form, box}, {u"SplashForm", form, box}, {u"DrawTextPictureBox", box, form}};
-  for (const auto& row : rows) {
-    const auto put = [&](const Variant& value) { late(row.property, Access::put, {value}); };
-    const auto references = row.fits.use_count();
-    put(ObjectRef(row.fits));
-    for (const Variant& other : {Variant(ObjectRef(row.does_not)), Variant(u"a text"), Variant()}) {
+  for (const TextView property : {u"FolderBrowseForm", u"SplashForm", u"DrawTextPictureBox"}) {
+    const auto& fits = property == u"DrawTextPictureBox" ? box : form;
+    const auto put = [&](const Variant& value) { late(property, Access::put, {value}); };
+    const auto references = fits.use_count();
+    put(ObjectRef(fits));
+    for (const Variant& other : {Variant(ObjectRef(fits == box ? form : box)), Variant(u"a text"), Variant()}) {
       EXPECT_EQ(error_of([&] { put(other); }), 13);
     }
-    EXPECT_EQ(row.fits.use_count(), references + 1) << "kept, once";
-    EXPECT_THAT(row.fits->uses, ::testing::IsEmpty()) << "asked for names alone";
+    EXPECT_EQ(fits.use_count(), references + 1) << "kept, once";
+    EXPECT_THAT(fits->uses, ::testing::IsEmpty()) << "asked for names alone";
     put(ObjectRef());
-    EXPECT_EQ(row.fits.use_count(), references);
+    EXPECT_EQ(fits.use_count(), references);
   }
 }
 
@@ -143,17 +140,13 @@ TEST_F(LibraryTest, DatabaseErrorReport) {
 // Hosts that are bound early have these positions in their programs. Slots count from 0 after the first seven.
 TEST(InterfaceTable, SlotsStandWhereHostsWereBound) {
   using enum Access;
-  const testing::Rows<std::size_t, Access> rows = {{"AutomatedEndOfMonth", 0, get},
-                                                   {"BookingScreenDate", 17, put},
-                                                   {"VersionMajor", 21, put},
-                                                   {"VersionMajor", 24, get},
-                                                   {"bNewZealand", 39, put},
-                                                   {"ComputerName", 43, get},
-                                                   {"Terminate", 90, Access::call},
-                                                   {"StringReplaceWord", 203, Access::call},
-                                                   {"WriteServerPerformanceFile", 204, get},
-                                                   {"GetIpAddrTable", 214, Access::call},
-                                                   {"VerifyMemField", 215, Access::call}};
+  // clang-format off
+  const testing::Rows<std::size_t, Access> rows = {
+      {"AutomatedEndOfMonth", 0, get}, {"BookingScreenDate", 17, put}, {"VersionMajor", 21, put},
+      {"VersionMajor", 24, get}, {"bNewZealand", 39, put}, {"ComputerName", 43, get}, {"Terminate", 90, Access::call},
+      {"StringReplaceWord", 203, Access::call}, {"WriteServerPerformanceFile", 204, get},
+      {"GetIpAddrTable", 214, Access::call}, {"VerifyMemField", 215, Access::call}};
+  // clang-format on
   const auto& members = described<ORVUtils>;
   ASSERT_EQ(members.size(), 216U);
   for (const auto& [name, slot, access] : rows) {

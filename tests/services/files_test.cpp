@@ -19,9 +19,11 @@ TEST_F(FileMembers, FindFilesAndFolders) {
        {u"\"C:\\D\\a.txtX", "True"}, {u"\"", "False"}, {u"\"\"", "False"}, {u"C:\\D\\*.txt", "True"},
        {u"C:\\D\\hidden.txt", "False"}, {u"C:\\D\\system.txt", "False"}, {u"C:\\D\\sub", "False"},
        {u"C:\\D\\", "True"}, {u"C:\\D\\c.txt", "False"}}},
-      {u"PathExists", {{u"", "False"}, {u"C:\\D\\a.txt", "False"}, {u"\"", "False"}, {u"\"\"", "False"}, {u"c:\\d\\SUB", "True"},
+      {u"PathExists", {{u"", "False"}, {u"C:\\D\\a.txt", "False"}, {u"\"", "False"}, {u"\"\"", "False"},
+       {u"c:\\d\\SUB", "True"},
        {u"\"C:\\D\\sub\"", "True"}, {u"\"C:\\D\\subX", "True"}, {u"C:\\D\\sub\\", "True"}, {u"C:\\D\\c.txt", "False"}}},
-      {u"GetFileList", {{u",|C:\\D\\|", "A.TXT,B.HTM"}, {u", |C:\\D\\|", "A.TXT, B.HTM, "}, {u",|C:\\D\\|*.htm", "B.HTM"},
+      {u"GetFileList", {{u",|C:\\D\\|", "A.TXT,B.HTM"}, {u", |C:\\D\\|", "A.TXT, B.HTM, "},
+       {u",|C:\\D\\|*.htm", "B.HTM"},
        {u"|C:\\D\\|", "A.TXTB.HTM"}, {u",|C:\\D\\sub\\|", ""}, {u"|C:\\D\\sub\\|", "error 5"}, {u",|C:\\D|", ""}}},
       {u"GetFileCount", {{u"C:\\D\\|", "2"}, {u"C:\\D\\|*.htm", "1"}, {u"C:\\D\\sub\\|", "0"}, {u"C:\\D|", "0"}}},
   });

@@ -12,7 +12,8 @@ TEST_F(RegistryTest, ReadsTextsAndNumbersOfTheUser) {
       {u"number", {4, std::string("\xD6\xFF\xFF\xFF", 4)}}, {u"binary", {3, "xy"}}, {u"long", {4, "123456"}}};
   check({{u"REGISTRY_QueryValue", {{u"Key|text", "0"}, {u"Key|empty", "0"}, {u"Key|nothing", "0"}, {u"Key|number", "0"},
           {u"Key|binary", "-1"}, {u"Key|long", "234"}, {u"Key|missing", "2"}, {u"Missing|text", "6"}}},
-         {u"REGISTRY_ReturnValue", {{u"Key|text", "abc"}, {u"Key|empty", ""}, {u"Key|nothing", ""}, {u"Key|number", "-42"},
+         {u"REGISTRY_ReturnValue", {{u"Key|text", "abc"}, {u"Key|empty", ""}, {u"Key|nothing", ""},
+          {u"Key|number", "-42"},
           {u"Key|binary", ""}, {u"Key|long", ""}, {u"Key|missing", ""}, {u"Missing|text", ""}}}});
   // clang-format on
   EXPECT_EQ(platform.registry.calls[0], u"open 1 Key");

@@ -1,11 +1,9 @@
-#include <gtest/gtest.h>
-
-#include "tests/fakes/utils_test.hpp"
+#include "tests/library/answers.hpp"
 
 namespace talutil::testing {
 namespace {
 
-struct TextFiles : UtilsTest {
+struct TextFiles : AnsweringMembers {
   const Text path = u"C:\\a.txt";
 };
 
@@ -61,12 +59,10 @@ TEST_F(TextFiles, BlankLinesAndMissingFiles) {
     EXPECT_EQ(list, after);
   });
   TextArray list = old;
-  EXPECT_EQ(utils.OpenFile(u"C:\\missing", list, 0), 0);
-  EXPECT_EQ(utils.OpenBigFile(u"C:\\missing", list, 0), 0);
-  EXPECT_EQ(utils.LoadTextBox(u"C:\\missing"), u"");
+  EXPECT_EQ(utils.OpenFile(u"C:\\missing", list, 0) + utils.OpenBigFile(u"C:\\missing", list, 0), 0);
   EXPECT_EQ(list, old);
   // A pattern exists where a file matches, but is none to be opened.
-  EXPECT_EQ(error_of([&] { (void)utils.OpenFile(u"C:\\*.txt", list, 0); }), 53);
+  check({{u"LoadTextBox", {{u"C:\\missing", ""}, {u"C:\\*.txt", "error 53"}}}});
   library.settings().CounterVerifyText = 2147483646;
   platform.files.put(path, "a\r\nb\r\n");
   list = {};
@@ -94,12 +90,9 @@ TEST_F(TextFiles, Writing) {
   }
   platform.files.put(path, "old");
   platform.files.failures[u"write"] = ErrorNumber::disk_full;
-  EXPECT_EQ(error_of([&] { utils.SaveTextBox(u"x", path); }), 61);
-  EXPECT_EQ(platform.files.bytes(path), "old");
+  check({{u"SaveTextBox", {{u"x|C:\\a.txt", "error 61"}}}, {u"LoadTextBox", {{path, "old"}}}});
   platform.files.failures.clear();
-  utils.SaveTextBox(u"x", path);
-  utils.SaveTextBox(utils.LoadTextBox(path), path);
-  EXPECT_EQ(utils.LoadTextBox(path), u"x\r\n\r\n");
+  check({{u"SaveTextBox", {{u"x\r\n|C:\\a.txt", "Empty"}}}, {u"LoadTextBox", {{path, "x\r\n\r\n"}}}});
 }
 
 TEST_F(TextFiles, CopyFileToBackupFile) {
@@ -126,24 +119,20 @@ TEST_F(TextFiles, EventLog) {
   EXPECT_EQ(platform.files.bytes(log), "(no file)");
 
   settings.EventLog = 5;
-  const struct {
-    Text user;
-    DateParts time;
-    Text event;
-  } rows[] = {{u"anne", {2026, 11, 15, 9, 7, 3}, u"Booking saved"},
-              {u"", {2026, 1, 2, 0, 0, 0}, u"a:b\r\nc"},
-              {u"J\u00FCrgen", {2026, 12, 31, 23, 59, 59}, u""}};
-  for (const auto& row : rows) {
-    settings.sUserName = row.user;
-    platform.current_time = date_from_parts(row.time).value();
-    utils.AppendEventLog(row.event, u"frmBooking");
+  const std::tuple<Text, DateParts, Text> rows[] = {{u"anne", {2026, 11, 15, 9, 7, 3}, u"Booking saved"},
+                                                    {u"", {2026, 1, 2, 0, 0, 0}, u"a:b\r\nc"},
+                                                    {u"J\u00FCrgen", {2026, 12, 31, 23, 59, 59}, u""}};
+  for (const auto& [user, time, event] : rows) {
+    settings.sUserName = user;
+    platform.current_time = date_from_parts(time).value();
+    utils.AppendEventLog(event, u"frmBooking");
   }
   EXPECT_EQ(platform.files.bytes(log),
             "anne:15112026090703:Booking saved:frmBooking\r\n"
             ":02012026000000:a:b\r\nc:frmBooking\r\n"
             "J\xFCrgen:31122026235959::frmBooking\r\n");
   platform.files.failures[u"append"] = ErrorNumber::path_not_found;
-  EXPECT_EQ(error_of([&] { utils.AppendEventLog(u"e", u"f"); }), 76);
+  check({{u"AppendEventLog", {{u"e|f", "error 76"}}}});
 }
 
 }  // namespace

@@ -82,25 +82,20 @@ TEST_F(ZipFilesTest, TellsTheControlsInTheirOrder) {
 }
 
 TEST_F(ZipFilesTest, CodesAreExplained) {
-  const struct {
-    std::int16_t code;
-    const char* text;  ///< What the message has after its opening; null where there is none.
-  } rows[] = {
-      {-1, nullptr},
-      {0, nullptr},
+  constexpr std::pair<std::int16_t, const char*> rows[] = {
       {1, "ZE_BUSY  Busy, can 't enter now - You tried"},
       {12, "ZE_NONE      Nothing to do - The ItemList that you specified doesn't match any files to be zipped.  If"},
       {21, "ZE_MVUSAGE   Improper use"},
       {22, "  If this error occurred during a backup operation, your data is safe.  The data is copied"}};
-  for (const auto& row : rows) {
-    platform.messages.clear();
-    ModZipFiles::show_result(row.code, platform);
-    ASSERT_EQ(platform.messages.size(), row.text != nullptr ? 1U : 0U) << row.code;
-    if (row.text == nullptr) continue;
-    EXPECT_THAT(to_utf8(platform.messages[0].text),
-                ::testing::StartsWith(std::string("ORV Zipping Error: ") + row.text));
-    EXPECT_EQ(platform.messages[0].title, u"") << row.code;
+  for (const std::int16_t well : {std::int16_t{-1}, std::int16_t{0}}) ModZipFiles::show_result(well, platform);
+  EXPECT_TRUE(platform.messages.empty());
+  for (const auto& [code, text] : rows) {
+    ModZipFiles::show_result(code, platform);
+    EXPECT_THAT(to_utf8(platform.messages.back().text),
+                ::testing::StartsWith(std::string("ORV Zipping Error: ") + text));
+    EXPECT_EQ(platform.messages.back().title, u"") << code;
   }
+  EXPECT_EQ(platform.messages.size(), std::size(rows));
 }
 
 TEST_F(ZipFilesTest, BacksUpAndRestores) {
@@ -128,9 +123,7 @@ struct Handler final : Object {
   int calls = 0;
   std::int32_t member_id(TextView /*name*/) override { return default_member; }
   Variant invoke(std::int32_t member, Access access, std::span<const Variant> arguments) override {
-    EXPECT_EQ(member, default_member);
-    EXPECT_EQ(access, Access::call);
-    EXPECT_EQ(arguments.size(), 3U);
+    EXPECT_EQ(std::tuple(member, access, arguments.size()), std::tuple(default_member, Access::call, 3U));
     ++calls;
     return work();
   }
