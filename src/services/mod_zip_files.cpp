@@ -121,8 +121,7 @@ void ModZipFiles::show_result(std::int16_t code, MessageBoxes& boxes) {
 }
 
 void ModZipFiles::zip(const Control& control, MessageBoxes& boxes, const Text& archive, const Text& items,
-                      std::int16_t multi_volume, const Text& password) {
-  password_ = password;
+                      std::int16_t multi_volume) const {
   reset_zip(control, password_);
   if (multi_volume == 1) control.put(ZipControl::multi_volume, 1);
   control.put(ZipControl::archive_name, archive);
@@ -149,9 +148,11 @@ void ModZipFiles::unzip(const Control& control, MessageBoxes& boxes, const Text&
 
 void ORVUtils::CallZIPFiles(const Text& sZipName, const Text& sItems, const std::int16_t& iMultiVolume,
                             const Text& sEncryptionPassword, const Boolean& /*bUseFilePath*/) {
+  auto& zip_files = library_.part<ModZipFiles>();
+  // First, so that it is kept even if there is no control.
+  zip_files.set_password(sEncryptionPassword);
   const Control control(library_.components().control(u"ZipCtrl"), locale());
-  library_.part<ModZipFiles>().zip(control, library_.platform().message_boxes, sZipName, sItems, iMultiVolume,
-                                   sEncryptionPassword);
+  zip_files.zip(control, library_.platform().message_boxes, sZipName, sItems, iMultiVolume);
 }
 
 void ORVUtils::CallUnZIPFiles(const Text& sUnZipName, const Text& sDestPath, const Text& sItems,

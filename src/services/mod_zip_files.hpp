@@ -12,9 +12,12 @@ class Control;
 /// action is kept for the unzip actions that follow.
 class ModZipFiles final : public LibraryPart {
  public:
-  /// Resets the control's settings, sets the password, packs, and shows the result.
+  /// The password of the zip actions that follow, and of the unzip actions after them.
+  void set_password(const Text& password) { password_ = password; }
+
+  /// Resets the control's settings, packs, and shows the result.
   void zip(const Control& control, MessageBoxes& boxes, const Text& archive, const Text& items,
-           std::int16_t multi_volume, const Text& password);
+           std::int16_t multi_volume) const;
 
   /// Resets the control's settings and inspects the archive; extracts only if that succeeded. Shows the result.
   void unzip(const Control& control, MessageBoxes& boxes, const Text& archive, const Text& destination,

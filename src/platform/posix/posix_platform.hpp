@@ -121,7 +121,7 @@ struct PosixPlatform {
   PosixProfiles profiles{files};
   Hive hive{Hive::default_path()};
   PosixSettingsStore settings_store{hive};
-  PosixRegistry registry{hive};
+  PosixRegistry registry{hive, *code_page};
   PosixNetwork network;
   PosixFileDialogs file_dialogs;
   PosixDrawing drawing;

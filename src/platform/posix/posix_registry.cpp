@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <array>
 
+#include "automation/run_time_error.hpp"
+
 namespace talutil::posix {
 
 namespace {
@@ -29,12 +31,14 @@ Text full_name(Registry::Handle root, TextView path) {
   return path.empty() ? name : name + u"\\" + Text(path);
 }
 
-/// A stored value as it is returned to callers.
-std::string handed_out(const Hive::Value& value) {
-  if (value.type != Registry::text) return value.data;
-  std::string bytes = to_ansi(from_utf16_bytes(value.data));
-  bytes += '\0';
-  return bytes;
+/// The status of some work on the hive, whose own failures raise errors.
+template <class Work>
+std::int32_t status_of(Work work) {
+  try {
+    return work();
+  } catch (const RunTimeError&) {
+    return PosixRegistry::unavailable;
+  }
 }
 
 }  // namespace
@@ -47,18 +51,22 @@ Registry::Handle PosixRegistry::add(Text path) {
 std::int32_t PosixRegistry::open(Handle root, const Text& path, std::uint32_t /*access*/, Handle& key) {
   Text name = full_name(root, path);
   if (name.empty()) return invalid_handle;
-  const bool is_root = name.find(u'\\') == Text::npos;
-  if (!is_root && !hive_.has_key(name)) return not_found;
-  key = add(std::move(name));
-  return ok;
+  return status_of([&] {
+    const bool is_root = name.find(u'\\') == Text::npos;
+    if (!is_root && !hive_.has_key(name)) return not_found;
+    key = add(std::move(name));
+    return ok;
+  });
 }
 
 std::int32_t PosixRegistry::create(Handle root, const Text& path, Handle& key) {
   Text name = full_name(root, path);
   if (name.empty()) return invalid_handle;
-  hive_.add_key(name);
-  key = add(std::move(name));
-  return ok;
+  return status_of([&] {
+    hive_.add_key(name);
+    key = add(std::move(name));
+    return ok;
+  });
 }
 
 void PosixRegistry::close(Handle key) { opened_.erase(key); }
@@ -67,15 +75,18 @@ std::int32_t PosixRegistry::query(Handle key, const Text& name, std::uint32_t& t
                                   std::span<char> buffer) {
   const auto path = opened_.find(key);
   if (path == opened_.end()) return invalid_handle;
-  const auto value = hive_.value(path->second, up_to_nul(name));
-  if (!value) return not_found;
-  const std::string bytes = handed_out(*value);
-  type = value->type;
-  size = static_cast<std::uint32_t>(bytes.size());
-  if (buffer.empty()) return ok;
-  if (buffer.size() < bytes.size()) return more_data;
-  std::ranges::copy(bytes, buffer.begin());
-  return ok;
+  return status_of([&] {
+    const auto value = hive_.value(path->second, up_to_nul(name));
+    if (!value) return not_found;
+    const bool is_text = value->type == text;
+    const std::string bytes = is_text ? code_page_.bytes_of(from_utf16_bytes(value->data)) + '\0' : value->data;
+    type = value->type;
+    size = static_cast<std::uint32_t>(bytes.size());
+    if (buffer.empty()) return ok;
+    if (buffer.size() < bytes.size()) return more_data;
+    std::ranges::copy(bytes, buffer.begin());
+    return ok;
+  });
 }
 
 std::int32_t PosixRegistry::set(Handle key, const Text& name, std::uint32_t type, std::string_view data) {
@@ -83,11 +94,14 @@ std::int32_t PosixRegistry::set(Handle key, const Text& name, std::uint32_t type
   if (path == opened_.end()) return invalid_handle;
   Hive::Value value{type, std::string(data)};
   if (type == text) {
-    data = data.substr(0, data.find('\0'));
-    value.data = to_utf16_bytes(from_ansi(data));
+    // The last NUL ends the text; others are part of it.
+    if (data.ends_with('\0')) data.remove_suffix(1);
+    value.data = to_utf16_bytes(code_page_.text_of(data));
   }
-  hive_.put(path->second, up_to_nul(name), value);
-  return ok;
+  return status_of([&] {
+    hive_.put(path->second, up_to_nul(name), value);
+    return ok;
+  });
 }
 
 }  // namespace talutil::posix

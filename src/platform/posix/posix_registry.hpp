@@ -2,6 +2,7 @@
 
 #include <map>
 
+#include "platform/code_page.hpp"
 #include "platform/network.hpp"
 #include "platform/posix/hive.hpp"
 #include "platform/registry.hpp"
@@ -9,10 +10,13 @@
 namespace talutil::posix {
 
 /// The registry in the user's hive file. Texts are stored in the same form as by the settings store, so that each can
-/// read what the other wrote, and returned in code page 1252 with a terminating NUL.
+/// read what the other wrote, and returned in the ANSI code page with a terminating NUL. A hive
+/// that cannot be used is a status, `unavailable`, as any other failure.
 class PosixRegistry final : public Registry {
  public:
-  explicit PosixRegistry(Hive& hive) noexcept : hive_(hive) {}
+  static constexpr std::int32_t unavailable = 1009;  ///< ERROR_BADDB
+
+  PosixRegistry(Hive& hive, CodePage& code_page) noexcept : hive_(hive), code_page_(code_page) {}
 
   std::int32_t open(Handle root, const Text& path, std::uint32_t access, Handle& key) override;
   std::int32_t create(Handle root, const Text& path, Handle& key) override;
@@ -25,6 +29,7 @@ class PosixRegistry final : public Registry {
   Handle add(Text path);
 
   Hive& hive_;
+  CodePage& code_page_;
   std::map<Handle, Text> opened_;
   Handle next_ = 1;
 };

@@ -24,10 +24,13 @@ struct SettingsFiles : ::testing::Test {
 TEST_F(SettingsFiles, TheRegistryAndTheSettingsShareTheirTexts) {
   Hive hive(folder / "new/folders/hive.db");
   PosixSettingsStore store(hive);
-  PosixRegistry registry(hive);
+  WesternCodePage code_page;
+  PosixRegistry registry(hive, code_page);
   Registry::Handle key = 0;
   ASSERT_EQ(registry.create(Registry::current_user, u"Software\\TALUtil\\Settings\\A\\S", key), Registry::ok);
   EXPECT_EQ(registry.set(key, u"k", Registry::text, std::string("\xE9\x80\0", 3)), Registry::ok);
+  Hive none("/proc/none/hive.db");
+  EXPECT_EQ(PosixRegistry(none, code_page).open(Registry::current_user, u"A", 0, key), PosixRegistry::unavailable);
   EXPECT_EQ(store.value(u"A", u"S", u"K"), u"\u00E9\u20AC");
   EXPECT_EQ(registry.set(key, u"k", Registry::number, "1234"), Registry::ok);
   EXPECT_EQ(store.value(u"A", u"S", u"k"), std::nullopt) << "a value of another type is no text";

@@ -72,7 +72,15 @@ std::unique_ptr<Folders> real_folders() {
 
 std::unique_ptr<CodePage> real_code_page(std::uint32_t number) { return posix::make_code_page(number); }
 std::shared_ptr<Profiles> real_profiles() { return make_within<posix::PosixProfiles, posix::PosixFiles>(); }
-std::shared_ptr<Registry> real_registry() { return make_within<posix::PosixRegistry, posix::Hive>(own_hive()); }
+std::shared_ptr<Registry> real_registry() {
+  struct Both {
+    posix::Hive hive{own_hive()};
+    WesternCodePage code_page;
+    posix::PosixRegistry registry{hive, code_page};
+  };
+  const auto both = std::make_shared<Both>();
+  return {both, &both->registry};
+}
 std::shared_ptr<SettingsStore> real_settings_store() {
   return make_within<posix::PosixSettingsStore, posix::Hive>(own_hive());
 }
