@@ -41,8 +41,10 @@ Variant result_of(const VARIANT& value) {
   if constexpr (std::is_same_v<T, Text>) {
     return Text(win32::view(value.bstrVal, SysStringLen(value.bstrVal)));
   } else {
+    // Our types hold their number alone, in the platform's form.
+    static_assert(std::is_trivially_copyable_v<T>);
     T result;
-    std::memcpy(&result, &value.llVal, sizeof result);
+    std::memcpy(static_cast<void*>(&result), &value.llVal, sizeof result);
     return result;
   }
 }
