@@ -14,6 +14,7 @@ TEST_F(TextFiles, AreReadByteByByte) {
   for (int i = 0; i < 240; ++i) {
     // One file in ten reaches across the end of a buffer, in the middle of a line or of its end.
     std::string bytes(i % 10 == 0 ? static_cast<std::size_t>(generator.whole(buffer - 5, buffer + 1)) : 0, 'x');
+    if (i % 20 == 0) bytes += '\x1A';
     for (int left = generator.whole(0, 12); left > 0; --left) bytes += generator.one_of(bytes_of_files);
     const std::string all = bytes.substr(0, bytes.find('\x1A'));
     std::vector<Text> expected;
