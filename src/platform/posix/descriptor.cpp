@@ -96,4 +96,17 @@ void write_all(const Descriptor& file, std::string_view bytes) {
   }
 }
 
+void flush_folder(const Descriptor& folder) noexcept {
+  // The folder may only be open for its path.
+  const Descriptor readable(openat(folder.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+  static_cast<void>(fsync(readable.get()) == 0);
+}
+
+const dirent* next_entry(const FolderListing& listing) {
+  errno = 0;
+  const dirent* const entry = readdir(listing.get());
+  if (entry == nullptr && errno != 0) raise_for(errno, {});
+  return entry;
+}
+
 }  // namespace talutil::posix

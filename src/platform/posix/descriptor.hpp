@@ -1,5 +1,8 @@
 #pragma once
 
+#include <dirent.h>
+
+#include <memory>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -39,6 +42,19 @@ void lock(const Descriptor& file, int operation);
 
 /// Writes all bytes. Raises 61 or 57.
 void write_all(const Descriptor& file, std::string_view bytes);
+
+/// Flushes the names in a folder, as far as its file system can.
+void flush_folder(const Descriptor& folder) noexcept;
+
+struct CloseListing {
+  void operator()(DIR* listing) const noexcept { closedir(listing); }
+};
+
+/// A folder open for listing; the destructor closes it.
+using FolderListing = std::unique_ptr<DIR, CloseListing>;
+
+/// The next entry, null at the end. Raises 57 if the folder cannot be read on, since its end would hide entries.
+[[nodiscard]] const dirent* next_entry(const FolderListing& listing);
 
 /// Raises the run-time error for a system error code concerning a path.
 [[noreturn]] void raise_for(int code, const std::string& path);

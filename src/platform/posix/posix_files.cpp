@@ -64,7 +64,8 @@ class PosixInputFile final : public InputFile {
  public:
   PosixInputFile(Descriptor file, const PosixFiles::Progress& progress) : file_(std::move(file)), progress_(progress) {
     struct stat status {};
-    if (fstat(file_.get(), &status) == 0) size_ = static_cast<std::uint64_t>(status.st_size);
+    if (fstat(file_.get(), &status) != 0) raise_for(errno, {});
+    size_ = static_cast<std::uint64_t>(status.st_size);
     lock(file_, LOCK_SH);
     posix_fadvise(file_.get(), 0, 0, POSIX_FADV_SEQUENTIAL);
   }
@@ -144,10 +145,10 @@ void PosixFiles::search(const Text& pattern, std::uint32_t mask, const std::func
     if (!error.is(ErrorNumber::path_not_found)) throw;
     return;
   }
-  const std::unique_ptr<DIR, int (*)(DIR*)> listing(opendir(native_folder.c_str()), &closedir);
-  while (listing) {
-    const dirent* const entry = readdir(listing.get());
-    if (entry == nullptr) return;
+  const FolderListing listing(opendir(native_folder.c_str()));
+  const bool is_missing = errno == ENOENT || errno == ENOTDIR || errno == EACCES;
+  if (!listing && !is_missing) raise_for(errno, native_folder);
+  while (const dirent* const entry = listing ? next_entry(listing) : nullptr) {
     const Text entry_name = from_utf8(entry->d_name);
     if (!name_matches(entry_name, name) || !is_searched_for(native_folder + "/" + entry->d_name, mask)) continue;
     if (!found(entry_name)) return;

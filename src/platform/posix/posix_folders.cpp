@@ -1,6 +1,5 @@
 #include "platform/posix/posix_folders.hpp"
 
-#include <dirent.h>
 #include <errno.h>
 #include <fcntl.h>
 #include <stdio.h>
@@ -131,9 +130,9 @@ class PosixFolder final : public Folder {
 
   void list(const std::function<void(TextView name, const FileFacts& facts)>& found) override {
     const int copy = openat(folder_.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-    const std::unique_ptr<DIR, int (*)(DIR*)> listing(copy < 0 ? nullptr : fdopendir(copy), &closedir);
+    const FolderListing listing(copy < 0 ? nullptr : fdopendir(copy));
     if (!listing) raise_for(errno, {});
-    while (const dirent* const entry = readdir(listing.get())) {
+    while (const dirent* const entry = next_entry(listing)) {
       const std::string_view name = entry->d_name;
       if (name == "." || name == "..") continue;
       // An entry that has vanished in the meantime is skipped.
@@ -164,7 +163,7 @@ class PosixFolder final : public Folder {
 
   [[nodiscard]] std::unique_ptr<Folder> folder(TextView name, bool make_missing) override {
     const std::string native = to_utf8(name);
-    if (make_missing && mkdirat(folder_.get(), native.c_str(), rights) != 0 && errno != EEXIST) raise_for(errno, {});
+    if (make_missing) make(native);
     Descriptor opened(openat(folder_.get(), native.c_str(), O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
     if (opened.get() < 0) raise_for(errno == ENOTDIR ? ELOOP : errno, {});
     return std::make_unique<PosixFolder>(std::move(opened));
@@ -182,9 +181,17 @@ class PosixFolder final : public Folder {
   }
 
  private:
+  void make(const std::string& name) {
+    if (mkdirat(folder_.get(), name.c_str(), rights) == 0) return flush_folder(folder_);
+    if (errno != EEXIST) raise_for(errno, {});
+  }
+
   [[nodiscard]] std::optional<FileFacts> native_facts(const char* name) const {
     struct stat status {};
-    if (fstatat(folder_.get(), name, &status, AT_SYMLINK_NOFOLLOW) != 0) return std::nullopt;
+    if (fstatat(folder_.get(), name, &status, AT_SYMLINK_NOFOLLOW) != 0) {
+      if (errno == ENOENT || errno == ENAMETOOLONG) return std::nullopt;
+      raise_for(errno, {});
+    }
     struct stat target {};
     if (S_ISLNK(status.st_mode) && fstatat(folder_.get(), name, &target, 0) == 0 && S_ISREG(target.st_mode)) {
       status = target;
