@@ -10,6 +10,8 @@
 #include <unistd.h>
 
 #include <array>
+#include <filesystem>
+#include <utility>
 
 #include "platform/folders.hpp"
 
@@ -45,17 +47,19 @@ bool is_forbidden(int code) noexcept { return code == EACCES || code == EPERM ||
 Replacement::Replacement(Descriptor folder, std::string name, int access)
     : folder_(std::move(folder)), name_(std::move(name)) {
   // First the turn among the writers, then the target: the writer before may just have replaced it.
-  const int refusal = open_temporary();
   try {
+    const int refusal = open_temporary();
     // Problems with the target are reported now, not after everything has been written.
     open_target(access);
     if (refusal == 0) return;
     // A folder that does not allow new files may still allow overwriting this one.
     if (!is_forbidden(refusal) || target_.get() < 0) raise_for(refusal, name_);
-    std::string path = "/tmp/talutil-XXXXXX";
+    std::error_code ignored;  // Making the file will fail as well.
+    std::string path = std::filesystem::temp_directory_path(ignored) / (to_utf8(temporary_prefix) + "XXXXXX");
     file_ = Descriptor(mkostemp(path.data(), O_CLOEXEC));
     if (file_.get() < 0) raise_for(errno, path);
-    unlink(path.c_str());
+    temporary_ = path;
+    is_elsewhere_ = true;
   } catch (...) {
     discard();
     throw;
@@ -90,9 +94,9 @@ int Replacement::open_temporary() {
     lock(file, LOCK_EX);
     // Whoever held the lock before may have given the file its name.
     if (!is_named(file, folder_, temporary)) continue;
+    temporary_ = temporary;
     if (ftruncate(file.get(), 0) != 0) raise_for(errno, {});
     file_ = std::move(file);
-    temporary_ = temporary;
     return 0;
   }
 }
@@ -114,20 +118,34 @@ void Replacement::keep_rights() const {
 }
 
 void Replacement::take_name(const std::string& name) {
-  if (temporary_.empty()) return overwrite_target();
+  if (is_elsewhere_) return overwrite_target();
   flush(file_);
   if (renameat(folder_.get(), temporary_.c_str(), folder_.get(), name.c_str()) != 0) {
     if (!is_forbidden(errno) || target_.get() < 0 || name != name_) raise_for(errno, {});
     return overwrite_target();
   }
   temporary_.clear();
-  // Without this, a power cut could undo the renaming. Some file systems cannot flush a folder.
-  const Descriptor folder(openat(folder_.get(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-  static_cast<void>(fsync(folder.get()) == 0);
+  // Without this, a power cut could undo the renaming.
+  flush_folder(folder_);
 }
 
-/// The one step that is not atomic: for targets that this user may write, in folders where files cannot be replaced.
+/// The one step that is not atomic: for targets that this user may write, in folders where files cannot be replaced. If
+/// it fails, the new version stays where it is, because it could be the only copy.
 void Replacement::overwrite_target() {
+  try {
+    copy_to_target();
+  } catch (const RunTimeError& error) {
+    std::error_code ignored;
+    const std::string folder = "/proc/self/fd/" + std::to_string(folder_.get());
+    const std::string target = std::filesystem::read_symlink(folder, ignored).string() + "/";
+    const std::string kept = (is_elsewhere_ ? "" : target) + std::exchange(temporary_, {});
+    throw RunTimeError(error.number(), error.description() + u": " + from_utf8(target + name_) +
+                                           u"; its new contents are in " + from_utf8(kept));
+  }
+  discard();
+}
+
+void Replacement::copy_to_target() const {
   if (lseek(file_.get(), 0, SEEK_SET) != 0 || lseek(target_.get(), 0, SEEK_SET) != 0) raise_for(errno, {});
   std::array<char, 1U << 16U> buffer;
   off_t length = 0;
@@ -142,7 +160,6 @@ void Replacement::overwrite_target() {
   // Cut off at the end and not at the beginning, so that the old contents remain as long as possible.
   if (ftruncate(target_.get(), length) != 0) raise_for(errno, {});
   flush(target_);
-  discard();
 }
 
 void Replacement::discard() noexcept {

@@ -33,7 +33,8 @@ class Replacement {
   void keep_rights() const;
 
   /// Flushes the new version and gives it a name in the folder, the target's unless another is given. If the folder
-  /// does not allow that, overwrites the target in place.
+  /// does not allow that, overwrites the target in place; if that fails too, the error names the file that has the new
+  /// contents.
   void take_name(const std::string& name);
   void take_name() { take_name(name_); }
 
@@ -44,10 +45,12 @@ class Replacement {
   [[nodiscard]] int open_temporary();
   void open_target(int access);
   void overwrite_target();
+  void copy_to_target() const;
 
   Descriptor folder_;
   std::string name_;
-  std::string temporary_;  ///< Empty once it has got its name.
+  std::string temporary_;      ///< Empty once it has got its name.
+  bool is_elsewhere_ = false;  ///< Whether the temporary file is in another folder; its name is a full path then.
   Descriptor file_;
   Descriptor target_;
 };
