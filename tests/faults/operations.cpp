@@ -1,0 +1,172 @@
+#include "tests/faults/operations.hpp"
+
+#include <stdlib.h>
+
+#include "controls/grid.hpp"
+
+namespace talutil::testing {
+
+namespace {
+
+Platform on_this_machine(FakePlatform& fake, posix::PosixPlatform& real) {
+  const Platform made_up = fake.platform();
+  return {made_up.message_boxes,
+          made_up.screen,
+          made_up.computer,
+          made_up.clock,
+          made_up.form_windows,
+          made_up.control_makers,
+          made_up.message_pump,
+          made_up.random_source,
+          made_up.cryptography,
+          real.profiles,
+          real.settings_store,
+          made_up.time_conversions,
+          real.files,
+          made_up.folder_picker,
+          made_up.guids,
+          real.folders,
+          made_up.input_boxes,
+          real.registry,
+          made_up.network,
+          made_up.file_dialogs,
+          made_up.drawing,
+          made_up.window_printing,
+          made_up.font_files,
+          made_up.printers,
+          made_up.machine,
+          *real.code_page};
+}
+
+/// Selects the folder as this machine's drives before the platform is made, which looks for them once.
+const std::string& with_drives(const std::string& root) {
+  setenv("TALUTIL_DRIVES", root.c_str(), 1);
+  setenv("TALUTIL_HIVE", (root + "/c/hive.db").c_str(), 1);
+  return root;
+}
+
+Text long_text(std::size_t size, char16_t filling) {
+  Text text;
+  while (text.size() < size) text += Text(70, filling) + u"\r\n";
+  return text;
+}
+
+void save(Host& host, const Text& path, const Text& text) { host.utils.SaveTextBox(text, path); }
+
+void save_item(Host& host, TextView item, TextView value) {
+  Text output(value);
+  host.utils.SaveCfgFileData(u"Section", Text(item), output, u"C:\\host.ini", Boolean(true));
+}
+
+void save_setting(Host& host, TextView value) {
+  Text output(value);
+  host.utils.SaveCfgFileData(u"Section", u"item", output, u"", Boolean(false));
+}
+
+void zip(Host& host, const Text& items, std::int16_t multi_volume = 0) {
+  host.utils.CallZIPFiles(u"C:\\a.zip", items, multi_volume, u"", Boolean(false));
+}
+
+void make_data(Host& host) {
+  host.utils.VerifyFilePath(u"C:\\data\\sub\\");
+  save(host, u"C:\\data\\one.txt", long_text(5000, u'1'));
+  save(host, u"C:\\data\\sub\\two.txt", u"two");
+}
+
+void log_to(Host& host, TextView event) {
+  host.library.settings().EventLog = 1;
+  host.library.settings().sORVPath = u"C:\\";
+  host.utils.AppendEventLog(Text(event), u"form");
+}
+
+void report(Host& host, TextView text) {
+  const auto grid = std::make_shared<Grid>(host.library.platform());
+  grid->put_Cols(2);
+  for (int row = 0; row < 50; ++row) grid->AddItem(Text(text) + u'\t' + number_to_text(row), -1);
+  host.fake.chosen_files = {u"C:\\grid.csv"};
+  host.utils.ExportGridData(ObjectRef(grid), 0, Boolean(true), u"Sales");
+}
+
+const Text key = u"Software\\Host\\Key";
+const auto current_user = static_cast<std::int32_t>(Registry::current_user);
+
+/// A month end, which shows no window.
+void write_report(Host& host) {
+  host.library.settings().AutomatedEndOfMonth = Boolean(true);
+  const auto grid = std::make_shared<Grid>(host.library.platform());
+  grid->put_Cols(1);
+  grid->AddItem(u"line", -1);
+  host.utils.GridPrintPreview(100, 1, u"Sales", u"", ObjectRef(grid), {}, {}, u"SalesReport");
+}
+
+void nothing(Host& /*host*/) {}
+
+}  // namespace
+
+Host::Host(const std::string& root) : real((with_drives(root), 1252)), library(on_this_machine(fake, real)) {}
+
+const std::vector<Operation>& operations() {
+  static const std::vector<Operation> all = {
+      {"SaveTextBox, new", Promise::whole, nothing, [](Host& host) { save(host, u"C:\\text.txt", u"text"); }},
+      {"SaveTextBox, over another", Promise::whole,
+       [](Host& host) { save(host, u"C:\\text.txt", long_text(1000, u'o')); },
+       [](Host& host) { save(host, u"C:\\text.txt", long_text(300'000, u'n')); }},
+      {"SaveBigFile", Promise::whole, [](Host& host) { save(host, u"C:\\list.txt", u"old"); },
+       [](Host& host) {
+         host.utils.SaveBigFile({.items = {u"a", long_text(270'000, u'b')}, .allocated = true}, u"C:\\list.txt");
+       }},
+      {"CopyFileToBackupFile", Promise::whole,
+       [](Host& host) {
+         save(host, u"C:\\source.txt", long_text(3000, u's'));
+         save(host, u"C:\\backup.txt", u"old");
+       },
+       [](Host& host) { host.utils.CopyFileToBackupFile(u"C:\\source.txt", u"C:\\backup.txt"); }},
+      {"SaveCfgFileData, a file's item", Promise::silent, [](Host& host) { save_item(host, u"first", u"1"); },
+       [](Host& host) { save_item(host, u"second", u"2"); }},
+      {"SaveCfgFileData, a setting", Promise::unflushed, [](Host& host) { save_setting(host, u"old"); },
+       [](Host& host) { save_setting(host, u"new"); }},
+      {"AppendEventLog", Promise::unflushed, [](Host& host) { log_to(host, u"first"); },
+       [](Host& host) { log_to(host, u"second"); }},
+      {"REGISTRY_SetKeyValue", Promise::silent,
+       [](Host& host) {
+         host.utils.REGISTRY_CreateNewKey(key, current_user);
+         host.utils.REGISTRY_SetKeyValue(key, u"other", u"kept", 1);
+       },
+       [](Host& host) { host.utils.REGISTRY_SetKeyValue(key, u"name", u"value", 1); }},
+      {"REGISTRY_CreateNewKey", Promise::silent, nothing,
+       [](Host& host) { host.utils.REGISTRY_CreateNewKey(key, current_user); }},
+      {"CallZIPFiles, a new archive", Promise::whole, make_data, [](Host& host) { zip(host, u"C:\\data\\*.*"); }},
+      {"CallZIPFiles, more files", Promise::whole,
+       [](Host& host) {
+         make_data(host);
+         save(host, u"C:\\three.txt", long_text(100'000, u'3'));
+         zip(host, u"C:\\data\\*.*");
+       },
+       [](Host& host) { zip(host, u"C:\\three.txt"); }},
+      {"CallUnZIPFiles", Promise::whole,
+       [](Host& host) {
+         make_data(host);
+         zip(host, u"C:\\data\\*.*");
+         host.utils.VerifyFilePath(u"C:\\out\\");
+         save(host, u"C:\\out\\one.txt", u"old");
+       },
+       [](Host& host) { host.utils.CallUnZIPFiles(u"C:\\a.zip", u"C:\\out\\", u"", Boolean(true)); }},
+      {"ExportGridData", Promise::silent, [](Host& host) { report(host, u"old"); },
+       [](Host& host) { report(host, u"new"); }},
+      {"GridPrintPreview at the end of a month", Promise::silent,
+       [](Host& host) { host.utils.VerifyFilePath(u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\"); }, write_report},
+      {"VerifyFilePath", Promise::silent, nothing,
+       [](Host& host) { host.utils.VerifyFilePath(u"C:\\made\\for\\reports\\"); }},
+      {"DeleteFiles", Promise::silent,
+       [](Host& host) {
+         save(host, u"C:\\one.tmp", u"1");
+         save(host, u"C:\\two.tmp", u"2");
+       },
+       [](Host& host) { host.utils.DeleteFiles(u"C:\\*.tmp"); }},
+      {"LoadTextBox", Promise::silent, [](Host& host) { save(host, u"C:\\text.txt", long_text(300'000, u't')); },
+       [](Host& host) { static_cast<void>(host.utils.LoadTextBox(u"C:\\text.txt")); }},
+  };
+  return all;
+}
+
+}  // namespace talutil::testing
