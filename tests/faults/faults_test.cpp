@@ -3,6 +3,7 @@
 #include <filesystem>
 
 #include "platform/posix/hive.hpp"
+#include "tests/faults/allocations.hpp"
 #include "tests/faults/operations.hpp"
 #include "tests/faults/system_calls.hpp"
 
@@ -18,8 +19,11 @@ bool is_whole() { return getenv("TALUTIL_WHOLE") != nullptr; }
 
 /// Reports how much was tried, which no check can.
 struct Counts final : ::testing::Environment {
-  void TearDown() override { std::printf("%zu failing calls, %zu power cuts\n", failures, cuts); }
+  void TearDown() override {
+    std::printf("%zu failing calls, %zu failing allocations, %zu power cuts\n", failures, allocations, cuts);
+  }
   static inline std::size_t failures = 0;
+  static inline std::size_t allocations = 0;
   static inline std::size_t cuts = 0;
 };
 const auto* const counts = ::testing::AddGlobalTestEnvironment(new Counts);
@@ -53,6 +57,8 @@ struct Faults : ::testing::TestWithParam<Operation> {
       EXPECT_FALSE(error.description().empty());
       last_message = to_utf8(error.description());
       return true;
+    } catch (const std::bad_alloc&) {
+      return true;
     }
     for (const auto& message : host.fake.messages) last_message = to_utf8(message.text);
     return !host.fake.messages.empty();
@@ -80,6 +86,11 @@ struct Faults : ::testing::TestWithParam<Operation> {
       if (may_leave_temporaries && path.find("/.talutil-") != std::string::npos) continue;
       EXPECT_TRUE(same(path, found, old_contents) || same(path, found, new_contents)) << path << " is neither";
     }
+  }
+
+  /// What was to be done has been done.
+  void expect_new(const Files& found) const {
+    for (const auto& [path, bytes] : new_contents) EXPECT_TRUE(same(path, found, new_contents)) << path;
   }
 
   /// Does what is tested while a call fails. Returns what has failed; nothing if the call has no such way of failing.
@@ -120,9 +131,7 @@ struct Faults : ::testing::TestWithParam<Operation> {
           << last_message;
       std::filesystem::remove(root + kept->first);
     }
-    if (!has_reported && GetParam().promise != Promise::silent) {
-      for (const auto& [path, bytes] : new_contents) EXPECT_TRUE(same(path, found, new_contents)) << path;
-    }
+    if (!has_reported && GetParam().promise != Promise::silent) expect_new(found);
     expect_next_call_works(allowed != Allowed::everything && cannot_remove);
     return what;
   }
@@ -183,6 +192,33 @@ TEST_P(Faults, ACallThatFailsLosesNothing) {
   }
 }
 
+TEST_P(Faults, AnAllocationThatFailsLosesNothing) {
+  for (std::size_t number = 0;; ++number) {
+    write_tree(root, old_files);
+    bool is_reached_now = false;
+    const std::size_t descriptors = open_descriptors();
+    const bool has_reported = in_a_host([&](Host& host) {
+      const FailingAllocation failing(number);
+      try {
+        GetParam().act(host);
+      } catch (...) {
+        is_reached_now = true;
+        throw;
+      }
+      is_reached_now = FailingAllocation::is_reached();
+    });
+    if (!is_reached_now) return;
+    ++Counts::allocations;
+    SCOPED_TRACE("allocation " + std::to_string(number));
+    EXPECT_EQ(open_descriptors(), descriptors);
+    const Files found = contents();
+    expect_whole(found, false);
+    if (!has_reported && GetParam().promise != Promise::silent) expect_new(found);
+    expect_next_call_works(false);
+    if (HasFailure()) return;
+  }
+}
+
 TEST_P(Faults, APowerCutLosesNothing) {
   write_tree(root, old_files);
   RecordedDisk disk(root);
@@ -207,9 +243,7 @@ TEST_P(Faults, APowerCutLosesNothing) {
       SCOPED_TRACE("cut before step " + std::to_string(step) + " of " + std::to_string(disk.steps()));
       const Files left = contents();
       expect_whole(left, true);
-      if (step == disk.steps() && GetParam().promise == Promise::whole) {
-        for (const auto& [path, bytes] : new_contents) EXPECT_TRUE(same(path, left, new_contents)) << path;
-      }
+      if (step == disk.steps() && GetParam().promise == Promise::whole) expect_new(left);
       expect_next_call_works(false);
       if (HasFailure()) return;
     }

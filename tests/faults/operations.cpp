@@ -110,10 +110,10 @@ const std::vector<Operation>& operations() {
       {"SaveTextBox, new", Promise::whole, nothing, [](Host& host) { save(host, u"C:\\text.txt", u"text"); }},
       {"SaveTextBox, over another", Promise::whole,
        [](Host& host) { save(host, u"C:\\text.txt", long_text(1000, u'o')); },
-       [](Host& host) { save(host, u"C:\\text.txt", long_text(300'000, u'n')); }},
+       [text = long_text(300'000, u'n')](Host& host) { save(host, u"C:\\text.txt", text); }},
       {"SaveBigFile", Promise::whole, [](Host& host) { save(host, u"C:\\list.txt", u"old"); },
-       [](Host& host) {
-         host.utils.SaveBigFile({.items = {u"a", long_text(270'000, u'b')}, .allocated = true}, u"C:\\list.txt");
+       [list = TextArray{.items = {u"a", long_text(270'000, u'b')}, .allocated = true}](Host& host) {
+         host.utils.SaveBigFile(list, u"C:\\list.txt");
        }},
       {"CopyFileToBackupFile", Promise::whole,
        [](Host& host) {

@@ -347,7 +347,7 @@ ssize_t pwrite(int file, const void* bytes, std::size_t count, off_t offset) {
   static const auto real = next<ssize_t(int, const void*, std::size_t, off_t)>("pwrite");
   return for_bytes("pwrite", count, {ENOSPC, EIO, EINTR, half}, [&](std::size_t part) {
     const ssize_t written = real(file, bytes, part, offset);
-    if (written > 0) {
+    if (disk != nullptr && written > 0) {
       record(file, Kind::write, static_cast<std::size_t>(offset),
              std::string(static_cast<const char*>(bytes), static_cast<std::size_t>(written)));
     }

@@ -58,7 +58,7 @@ Replacement::Replacement(Descriptor folder, std::string name, int access)
     std::string path = std::filesystem::temp_directory_path(ignored) / (to_utf8(temporary_prefix) + "XXXXXX");
     file_ = Descriptor(mkostemp(path.data(), O_CLOEXEC));
     if (file_.get() < 0) raise_for(errno, path);
-    temporary_ = path;
+    temporary_ = std::move(path);
     is_elsewhere_ = true;
   } catch (...) {
     discard();
@@ -87,14 +87,14 @@ void Replacement::open_target(int access) {
 
 /// Returns the system's error code if there can be no temporary file.
 int Replacement::open_temporary() {
-  const std::string temporary = temporary_name(name_);
+  std::string temporary = temporary_name(name_);
   for (;;) {
     Descriptor file(openat(folder_.get(), temporary.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0600));
     if (file.get() < 0) return errno;
     lock(file, LOCK_EX);
     // Whoever held the lock before may have given the file its name.
     if (!is_named(file, folder_, temporary)) continue;
-    temporary_ = temporary;
+    temporary_ = std::move(temporary);
     if (ftruncate(file.get(), 0) != 0) raise_for(errno, {});
     file_ = std::move(file);
     return 0;
