@@ -21,19 +21,18 @@ void Form::unload() {
 
 void Form::show_modal() {
   FormView& view = load();
+  // A nested call leaves the window to the outer one, which closes it even if an error ends the showing.
   struct Call {
-    int& calls;
-    explicit Call(int& count) : calls(count) { ++calls; }
+    Form& form;
+    explicit Call(Form& shown) noexcept : form(shown) { ++form.modal_calls_; }
     Call(const Call&) = delete;
     Call& operator=(const Call&) = delete;
-    ~Call() { --calls; }
+    ~Call() {
+      if (--form.modal_calls_ == 0) form.view_.reset();
+    }
   };
-  {
-    const Call call(modal_calls_);
-    view.show_modal();
-  }
-  // A nested call leaves the window to the outer one.
-  if (modal_calls_ == 0) view_.reset();
+  const Call call(*this);
+  view.show_modal();
 }
 
 template <class Work>

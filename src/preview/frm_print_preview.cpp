@@ -86,15 +86,17 @@ void FrmPrintPreview::load() {
   dialog->put(u"DialogTitle", u"Save Data to PDF File");
   dialog->put(u"Filter", u"Adobe PDF Format *.pdf|*.pdf");
   pdf->put(u"Subject", u"ORV PDF Data");
-  view_ =
+  auto view =
       library_.platform().form_windows.make_preview(*this, dynamic_cast<const PreviewPages*>(print->object().get()));
+  auto form = std::make_shared<FormObject>(*view, locale);
+  utils_ = std::make_unique<ORVUtils>(library_);
   print_ = std::move(print);
   save_dialog_ = std::move(dialog);
   pdf_export_ = std::move(pdf);
-  form_ = std::make_shared<FormObject>(*view_, locale);
+  view_ = std::move(view);
+  form_ = std::move(form);
 
   is_loading_ = true;
-  utils_ = std::make_unique<ORVUtils>(library_);
   try {
     utils_->AppendEventLog(u"FormLoad", Text(form_name));
     utils_->LoadWindowState(form_, Text(settings_section));
