@@ -36,7 +36,7 @@ class Registry {
   /// Opens or creates a key; leaves the handle unchanged on failure.
   virtual std::int32_t open(Handle root, const Text& path, std::uint32_t access, Handle& key) = 0;
   virtual std::int32_t create(Handle root, const Text& path, Handle& key) = 0;
-  virtual void close(Handle key) = 0;
+  virtual void close(Handle key) noexcept = 0;
 
   /// Reads the type and size of a value and, if there is a buffer, its bytes.
   virtual std::int32_t query(Handle key, const Text& name, std::uint32_t& type, std::uint32_t& size,

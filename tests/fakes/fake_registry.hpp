@@ -23,18 +23,20 @@ struct FakeRegistry final : Registry {
   Handle next = 100;
 
   std::int32_t open(Handle /*root*/, const Text& path, std::uint32_t access, Handle& key) override {
+    calls.reserve(calls.size() + 2);  // For "close", which cannot fail, too.
     calls.push_back(u"open " + Text(1, static_cast<char16_t>(u'0' + access)) + u" " + path);
     if (!keys.contains(path)) return not_found;
     opened[key = next++] = path;
     return ok;
   }
   std::int32_t create(Handle root, const Text& path, Handle& key) override {
+    calls.reserve(calls.size() + 2);
     calls.push_back(Text(u"create ") + (root == current_user ? u"user " : u"other ") + path);
     keys[path];
     opened[key = next++] = path;
     return ok;
   }
-  void close(Handle key) override {
+  void close(Handle key) noexcept override {
     calls.push_back(u"close");
     opened.erase(key);
   }

@@ -69,7 +69,7 @@ std::int32_t PosixRegistry::create(Handle root, const Text& path, Handle& key) {
   });
 }
 
-void PosixRegistry::close(Handle key) { opened_.erase(key); }
+void PosixRegistry::close(Handle key) noexcept { opened_.erase(key); }
 
 std::int32_t PosixRegistry::query(Handle key, const Text& name, std::uint32_t& type, std::uint32_t& size,
                                   std::span<char> buffer) {

@@ -26,7 +26,7 @@ std::int32_t Win32Registry::create(Handle root, const Text& path, Handle& key) {
   return status;
 }
 
-void Win32Registry::close(Handle key) { RegCloseKey(native(key)); }
+void Win32Registry::close(Handle key) noexcept { RegCloseKey(native(key)); }
 
 std::int32_t Win32Registry::query(Handle key, const Text& name, std::uint32_t& type, std::uint32_t& size,
                                   std::span<char> buffer) {
