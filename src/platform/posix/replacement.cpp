@@ -54,8 +54,10 @@ Replacement::Replacement(Descriptor folder, std::string name, int access)
     if (refusal == 0) return;
     // A folder that does not allow new files may still allow overwriting this one.
     if (!is_forbidden(refusal) || target_.get() < 0) raise_for(refusal, name_);
-    std::error_code ignored;  // Making the file will fail as well.
-    std::string path = std::filesystem::temp_directory_path(ignored) / (to_utf8(temporary_prefix) + "XXXXXX");
+    std::error_code error;
+    const std::filesystem::path elsewhere = std::filesystem::temp_directory_path(error);
+    if (error) raise_for(error.value(), {});
+    std::string path = elsewhere / (to_utf8(temporary_prefix) + "XXXXXX");
     file_ = Descriptor(mkostemp(path.data(), O_CLOEXEC));
     if (file_.get() < 0) raise_for(errno, path);
     temporary_ = std::move(path);
