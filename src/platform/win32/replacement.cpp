@@ -8,6 +8,7 @@
 #include "automation/run_time_error.hpp"
 #include "platform/folders.hpp"
 #include "platform/win32/last_error.hpp"
+#include "platform/win32/stored_files.hpp"
 
 namespace talutil::win32 {
 
@@ -19,11 +20,48 @@ bool has_lost_target(DWORD code) noexcept {
   return code == ERROR_UNABLE_TO_MOVE_REPLACEMENT || code == ERROR_UNABLE_TO_MOVE_REPLACEMENT_2;
 }
 
+/// The beginning of the names of this machine's temporary files: shares have those of others, too.
+const Text& machine_prefix() {
+  static const Text prefix = [] {
+    std::array<wchar_t, MAX_COMPUTERNAME_LENGTH + 1> name{};
+    DWORD length = static_cast<DWORD>(name.size());
+    if (GetComputerNameW(name.data(), &length) == 0) length = 0;
+    std::uint32_t hash = 0x811C9DC5;  // FNV-1a.
+    for (const char16_t unit : view(name.data(), length)) hash = (hash ^ unit) * 0x01000193;
+    return Text(temporary_prefix) + number_to_text(static_cast<std::int32_t>(hash >> 1U)) + u"-";
+  }();
+  return prefix;
+}
+
+bool is_running(DWORD process) {
+  const Owned<kind::KernelObject> opened(OpenProcess(PROCESS_QUERY_LIMITED_INFORMATION, FALSE, process));
+  DWORD code = STILL_ACTIVE;
+  // Any other reason than that there is none means that it cannot be looked at.
+  if (!opened) return GetLastError() != ERROR_INVALID_PARAMETER;
+  return GetExitCodeProcess(opened.get(), &code) == 0 || code == STILL_ACTIVE;
+}
+
+/// Whether nobody is going to name a temporary file any more: its process has ended, or it is older than a day.
+bool is_stale(const WIN32_FIND_DATAW& entry) {
+  const TextView name = view(entry.cFileName, wcslen(entry.cFileName));
+  if (name.starts_with(machine_prefix())) {
+    const DWORD process = wcstoul(entry.cFileName + machine_prefix().size(), nullptr, 10);
+    if (!is_running(process)) return true;
+  }
+  FILETIME now{};
+  GetSystemTimeAsFileTime(&now);
+  constexpr std::uint64_t day = 864'000'000'000;
+  return joined(entry.ftLastWriteTime.dwHighDateTime, entry.ftLastWriteTime.dwLowDateTime) + day <
+         joined(now.dwHighDateTime, now.dwLowDateTime);
+}
+
 }  // namespace
 
+bool is_in_use(DWORD code) noexcept { return code == ERROR_SHARING_VIOLATION || code == ERROR_LOCK_VIOLATION; }
+
 bool is_passing(DWORD code) noexcept {
-  return code == ERROR_ACCESS_DENIED || code == ERROR_SHARING_VIOLATION || code == ERROR_LOCK_VIOLATION ||
-         code == ERROR_DELETE_PENDING || code == ERROR_USER_MAPPED_FILE || code == ERROR_UNABLE_TO_REMOVE_REPLACED;
+  return is_in_use(code) || code == ERROR_ACCESS_DENIED || code == ERROR_DELETE_PENDING ||
+         code == ERROR_USER_MAPPED_FILE || code == ERROR_UNABLE_TO_REMOVE_REPLACED;
 }
 
 void write_all(const Owned<kind::File>& file, std::string_view bytes) {
@@ -41,8 +79,8 @@ Replacement::Replacement(Text folder) : folder_(std::move(folder)) {
   remove_stale();
   static std::atomic<std::int32_t> next{0};
   do {
-    temporary_ = folder_ + Text(temporary_prefix) + number_to_text(static_cast<std::int32_t>(GetCurrentProcessId())) +
-                 u"-" + number_to_text(next++);
+    temporary_ = folder_ + machine_prefix() + number_to_text(static_cast<std::int32_t>(GetCurrentProcessId())) + u"-" +
+                 number_to_text(next++);
     file_.reset(CreateFileW(wide(temporary_), GENERIC_READ | GENERIC_WRITE, FILE_SHARE_READ, nullptr, CREATE_NEW,
                             FILE_ATTRIBUTE_HIDDEN, nullptr));
   } while (!file_ && GetLastError() == ERROR_FILE_EXISTS);
@@ -53,21 +91,18 @@ Replacement::Replacement(Text folder) : folder_(std::move(folder)) {
 
 Replacement::~Replacement() {
   file_.reset();
-  if (!temporary_.empty()) DeleteFileW(wide(temporary_));
+  if (temporary_.empty()) return;
+  // If it cannot be removed, it is when this process has ended.
+  static_cast<void>(retried([&] { return DeleteFileW(wide(temporary_)); }));
 }
 
-/// Removes what killed processes have left. Only files older than a day, since others may be about to get their name.
+/// Removes what killed processes have left. Files that others are about to name stay.
 void Replacement::remove_stale() const {
-  FILETIME now{};
-  GetSystemTimeAsFileTime(&now);
-  const auto number = [](const FILETIME& time) { return ULARGE_INTEGER{{time.dwLowDateTime, time.dwHighDateTime}}; };
-  constexpr ULONGLONG day = 864'000'000'000;
   WIN32_FIND_DATAW entry;
   const Owned<kind::FileSearch> search(FindFirstFileW(wide(folder_ + Text(temporary_prefix) + u"*"), &entry));
   if (!search) return;
   do {
-    const bool is_old = number(entry.ftLastWriteTime).QuadPart + day < number(now).QuadPart;
-    if (is_old) DeleteFileW(wide(folder_ + Text(view(entry.cFileName, wcslen(entry.cFileName)))));
+    if (is_stale(entry)) DeleteFileW(wide(folder_ + Text(view(entry.cFileName, wcslen(entry.cFileName)))));
   } while (FindNextFileW(search.get(), &entry) != 0);
 }
 

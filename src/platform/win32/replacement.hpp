@@ -42,19 +42,23 @@ class Replacement {
 /// Writes all bytes at the file's position. Raises 61 or 57.
 void write_all(const Owned<kind::File>& file, std::string_view bytes);
 
-/// Whether a failure may be over in a moment, because another program has a file open.
+/// Whether another program has a file open in a way that excludes this one.
+[[nodiscard]] bool is_in_use(DWORD code) noexcept;
+
+/// Whether a failure may be over in a moment, because another program has a file open. A right that is denied may be
+/// one of these: it is reported, too, for a file that is about to be deleted.
 [[nodiscard]] bool is_passing(DWORD code) noexcept;
 
 /// Repeats an attempt for about a second while its failure may be over in a moment. Returns the last error code, 0 for
 /// success.
 template <class Attempt>
-[[nodiscard]] DWORD retried(Attempt attempt) {
+[[nodiscard]] DWORD retried(Attempt attempt, bool (*may_pass)(DWORD) noexcept = &is_passing) {
   constexpr DWORD pause = 50;  // Milliseconds.
   constexpr int most_attempts = 20;
   for (int attempts = 1;; ++attempts) {
     if (attempt() != FALSE) return 0;
     const DWORD code = GetLastError();
-    if (!is_passing(code) || attempts == most_attempts) return code;
+    if (!may_pass(code) || attempts == most_attempts) return code;
     Sleep(pause);
   }
 }

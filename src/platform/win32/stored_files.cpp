@@ -114,6 +114,12 @@ class Win32NewFile final : public NewFile {
 
 }  // namespace
 
+bool find_next(const Owned<kind::FileSearch>& search, WIN32_FIND_DATAW& entry) {
+  if (FindNextFileW(search.get(), &entry) != 0) return true;
+  if (GetLastError() != ERROR_NO_MORE_FILES) raise_last_error();
+  return false;
+}
+
 std::int64_t seconds_of(const FILETIME& time) noexcept {
   return (static_cast<std::int64_t>(joined(time.dwHighDateTime, time.dwLowDateTime)) - epoch) / ticks_a_second;
 }

@@ -3,7 +3,7 @@
 #include <memory>
 
 #include "platform/folders.hpp"
-#include "platform/win32/windows.hpp"
+#include "platform/win32/handle.hpp"
 
 /// The files in open folders, and what is recorded about them besides their contents.
 namespace talutil::win32 {
@@ -15,6 +15,10 @@ constexpr DWORD kept_attributes =
 [[nodiscard]] constexpr std::uint64_t joined(DWORD high, DWORD low) noexcept {
   return static_cast<std::uint64_t>(high) << 32U | low;
 }
+
+/// The next entry of a search; false at the end. Raises an error if the folder cannot be read on, since its end would
+/// hide entries.
+[[nodiscard]] bool find_next(const Owned<kind::FileSearch>& search, WIN32_FIND_DATAW& entry);
 
 /// Conversion to and from seconds since 1970.
 [[nodiscard]] std::int64_t seconds_of(const FILETIME& time) noexcept;

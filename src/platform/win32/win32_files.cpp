@@ -9,6 +9,7 @@
 #include "platform/win32/handle.hpp"
 #include "platform/win32/last_error.hpp"
 #include "platform/win32/replacement.hpp"
+#include "platform/win32/stored_files.hpp"
 
 namespace talutil::win32 {
 
@@ -87,8 +88,13 @@ class Win32OutputFile final : public OutputFile {
   /// Whether there is a target. Problems with it are reported now, not after everything has been written.
   [[nodiscard]] static bool is_there(const Text& path) {
     require_usable(path, true);
-    const Owned<kind::File> target(CreateFileW(wide(path), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
-    const DWORD reason = GetLastError();
+    Owned<kind::File> target;
+    const auto open = [&] {
+      target.reset(CreateFileW(wide(path), GENERIC_WRITE, shared, nullptr, OPEN_EXISTING, 0, nullptr));
+      return target ? TRUE : FALSE;
+    };
+    // A missing right is not waited for.
+    const DWORD reason = retried(open, &is_in_use);
     if (!target && (reason != ERROR_FILE_NOT_FOUND || drive_is_missing(path))) raise_for_path(reason, path);
     return static_cast<bool>(target);
   }
@@ -147,7 +153,7 @@ void Win32Files::search(const Text& pattern, std::uint32_t mask, const std::func
   do {
     if ((entry.dwFileAttributes & passed_over & ~mask) != 0) continue;
     if (!found(view(entry.cFileName, wcslen(entry.cFileName)))) return;
-  } while (FindNextFileW(search.get(), &entry) != 0);
+  } while (find_next(search, entry));
 }
 
 std::uint32_t Win32Files::attributes(const Text& path) {

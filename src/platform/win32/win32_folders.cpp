@@ -47,7 +47,7 @@ class Win32Folder final : public Folder {
     do {
       const TextView name = view(entry.cFileName, wcslen(entry.cFileName));
       if (name != u"." && name != u"..") found(name, facts_of(entry));
-    } while (FindNextFileW(search.get(), &entry) != 0);
+    } while (find_next(search, entry));
   }
 
   [[nodiscard]] std::optional<FileFacts> facts(TextView name) override {
