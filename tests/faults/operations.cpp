@@ -1,48 +1,20 @@
 #include "tests/faults/operations.hpp"
 
-#include <stdlib.h>
-
 #include "controls/grid.hpp"
 
 namespace talutil::testing {
 
 namespace {
 
-Platform on_this_machine(FakePlatform& fake, posix::PosixPlatform& real) {
+Platform on_this_machine(FakePlatform& fake, RealParts& real) {
   const Platform made_up = fake.platform();
-  return {made_up.message_boxes,
-          made_up.screen,
-          made_up.computer,
-          made_up.clock,
-          made_up.form_windows,
-          made_up.control_makers,
-          made_up.message_pump,
-          made_up.random_source,
-          made_up.cryptography,
-          real.profiles,
-          real.settings_store,
-          made_up.time_conversions,
-          real.files,
-          made_up.folder_picker,
-          made_up.guids,
-          real.folders,
-          made_up.input_boxes,
-          real.registry,
-          made_up.network,
-          made_up.file_dialogs,
-          made_up.drawing,
-          made_up.window_printing,
-          made_up.font_files,
-          made_up.printers,
-          made_up.machine,
-          *real.code_page};
-}
-
-/// Selects the folder as this machine's drives before the platform is made, which looks for them once.
-const std::string& with_drives(const std::string& root) {
-  setenv("TALUTIL_DRIVES", root.c_str(), 1);
-  setenv("TALUTIL_HIVE", (root + "/c/hive.db").c_str(), 1);
-  return root;
+  return {made_up.message_boxes, made_up.screen,          made_up.computer,      made_up.clock,
+          made_up.form_windows,  made_up.control_makers,  made_up.message_pump,  made_up.random_source,
+          made_up.cryptography,  real.profiles(),         real.settings_store(), made_up.time_conversions,
+          real.files(),          made_up.folder_picker,   made_up.guids,         real.folders(),
+          made_up.input_boxes,   real.registry(),         made_up.network,       made_up.file_dialogs,
+          made_up.drawing,       made_up.window_printing, made_up.font_files,    made_up.printers,
+          made_up.machine,       real.code_page()};
 }
 
 Text long_text(std::size_t size, char16_t filling) {
@@ -55,7 +27,7 @@ void save(Host& host, const Text& path, const Text& text) { host.utils.SaveTextB
 
 void save_item(Host& host, TextView item, TextView value) {
   Text output(value);
-  host.utils.SaveCfgFileData(u"Section", Text(item), output, u"C:\\host.ini", Boolean(true));
+  host.utils.SaveCfgFileData(u"Section", Text(item), output, host.path(u"host.ini"), Boolean(true));
 }
 
 void save_setting(Host& host, TextView value) {
@@ -64,18 +36,18 @@ void save_setting(Host& host, TextView value) {
 }
 
 void zip(Host& host, const Text& items, std::int16_t multi_volume = 0) {
-  host.utils.CallZIPFiles(u"C:\\a.zip", items, multi_volume, u"", Boolean(false));
+  host.utils.CallZIPFiles(host.path(u"a.zip"), items, multi_volume, u"", Boolean(false));
 }
 
 void make_data(Host& host) {
-  host.utils.VerifyFilePath(u"C:\\data\\sub\\");
-  save(host, u"C:\\data\\one.txt", long_text(5000, u'1'));
-  save(host, u"C:\\data\\sub\\two.txt", u"two");
+  host.utils.VerifyFilePath(host.path(u"data\\sub\\"));
+  save(host, host.path(u"data\\one.txt"), long_text(5000, u'1'));
+  save(host, host.path(u"data\\sub\\two.txt"), u"two");
 }
 
 void log_to(Host& host, TextView event) {
   host.library.settings().EventLog = 1;
-  host.library.settings().sORVPath = u"C:\\";
+  host.library.settings().sORVPath = host.path(u"");
   host.utils.AppendEventLog(Text(event), u"form");
 }
 
@@ -83,7 +55,7 @@ void report(Host& host, TextView text) {
   const auto grid = std::make_shared<Grid>(host.library.platform());
   grid->put_Cols(2);
   for (int row = 0; row < 50; ++row) grid->AddItem(Text(text) + u'\t' + number_to_text(row), -1);
-  host.fake.chosen_files = {u"C:\\grid.csv"};
+  host.fake.chosen_files = {host.path(u"grid.csv")};
   host.utils.ExportGridData(ObjectRef(grid), 0, Boolean(true), u"Sales");
 }
 
@@ -103,69 +75,79 @@ void nothing(Host& /*host*/) {}
 
 }  // namespace
 
-Host::Host(const std::string& root) : real((with_drives(root), 1252)), library(on_this_machine(fake, real)) {}
+Host::Host(const std::filesystem::path& root) : real(real_parts(root)), library(on_this_machine(fake, *real)) {}
 
 const std::vector<Operation>& operations() {
-  static const std::vector<Operation> all = {
-      {"SaveTextBox, new", Promise::whole, nothing, [](Host& host) { save(host, u"C:\\text.txt", u"text"); }},
-      {"SaveTextBox, over another", Promise::whole,
-       [](Host& host) { save(host, u"C:\\text.txt", long_text(1000, u'o')); },
-       [text = long_text(300'000, u'n')](Host& host) { save(host, u"C:\\text.txt", text); }},
-      {"SaveBigFile", Promise::whole, [](Host& host) { save(host, u"C:\\list.txt", u"old"); },
-       [list = TextArray{.items = {u"a", long_text(270'000, u'b')}, .allocated = true}](Host& host) {
-         host.utils.SaveBigFile(list, u"C:\\list.txt");
-       }},
-      {"CopyFileToBackupFile", Promise::whole,
-       [](Host& host) {
-         save(host, u"C:\\source.txt", long_text(3000, u's'));
-         save(host, u"C:\\backup.txt", u"old");
-       },
-       [](Host& host) { host.utils.CopyFileToBackupFile(u"C:\\source.txt", u"C:\\backup.txt"); }},
-      {"SaveCfgFileData, a file's item", Promise::silent, [](Host& host) { save_item(host, u"first", u"1"); },
-       [](Host& host) { save_item(host, u"second", u"2"); }},
-      {"SaveCfgFileData, a setting", Promise::unflushed, [](Host& host) { save_setting(host, u"old"); },
-       [](Host& host) { save_setting(host, u"new"); }},
-      {"AppendEventLog", Promise::unflushed, [](Host& host) { log_to(host, u"first"); },
-       [](Host& host) { log_to(host, u"second"); }},
-      {"REGISTRY_SetKeyValue", Promise::silent,
-       [](Host& host) {
-         host.utils.REGISTRY_CreateNewKey(key, current_user);
-         host.utils.REGISTRY_SetKeyValue(key, u"other", u"kept", 1);
-       },
-       [](Host& host) { host.utils.REGISTRY_SetKeyValue(key, u"name", u"value", 1); }},
-      {"REGISTRY_CreateNewKey", Promise::silent, nothing,
-       [](Host& host) { host.utils.REGISTRY_CreateNewKey(key, current_user); }},
-      {"CallZIPFiles, a new archive", Promise::whole, make_data, [](Host& host) { zip(host, u"C:\\data\\*.*"); }},
-      {"CallZIPFiles, more files", Promise::whole,
-       [](Host& host) {
-         make_data(host);
-         save(host, u"C:\\three.txt", long_text(100'000, u'3'));
-         zip(host, u"C:\\data\\*.*");
-       },
-       [](Host& host) { zip(host, u"C:\\three.txt"); }},
-      {"CallUnZIPFiles", Promise::whole,
-       [](Host& host) {
-         make_data(host);
-         zip(host, u"C:\\data\\*.*");
-         host.utils.VerifyFilePath(u"C:\\out\\");
-         save(host, u"C:\\out\\one.txt", u"old");
-       },
-       [](Host& host) { host.utils.CallUnZIPFiles(u"C:\\a.zip", u"C:\\out\\", u"", Boolean(true)); }},
-      {"ExportGridData", Promise::silent, [](Host& host) { report(host, u"old"); },
-       [](Host& host) { report(host, u"new"); }},
-      {"GridPrintPreview at the end of a month", Promise::silent,
-       [](Host& host) { host.utils.VerifyFilePath(u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\"); }, write_report},
-      {"VerifyFilePath", Promise::silent, nothing,
-       [](Host& host) { host.utils.VerifyFilePath(u"C:\\made\\for\\reports\\"); }},
-      {"DeleteFiles", Promise::silent,
-       [](Host& host) {
-         save(host, u"C:\\one.tmp", u"1");
-         save(host, u"C:\\two.tmp", u"2");
-       },
-       [](Host& host) { host.utils.DeleteFiles(u"C:\\*.tmp"); }},
-      {"LoadTextBox", Promise::silent, [](Host& host) { save(host, u"C:\\text.txt", long_text(300'000, u't')); },
-       [](Host& host) { static_cast<void>(host.utils.LoadTextBox(u"C:\\text.txt")); }},
-  };
+  static const std::vector<Operation> all = [] {
+    std::vector<Operation> some = {
+        {"SaveTextBox, new", Promise::whole, nothing, [](Host& host) { save(host, host.path(u"text.txt"), u"text"); }},
+        {"SaveTextBox, over another", Promise::whole,
+         [](Host& host) { save(host, host.path(u"text.txt"), long_text(1000, u'o')); },
+         [text = long_text(300'000, u'n')](Host& host) { save(host, host.path(u"text.txt"), text); }},
+        {"SaveBigFile", Promise::whole, [](Host& host) { save(host, host.path(u"list.txt"), u"old"); },
+         [list = TextArray{.items = {u"a", long_text(270'000, u'b')}, .allocated = true}](Host& host) {
+           host.utils.SaveBigFile(list, host.path(u"list.txt"));
+         }},
+        {"CopyFileToBackupFile", Promise::whole,
+         [](Host& host) {
+           save(host, host.path(u"source.txt"), long_text(3000, u's'));
+           save(host, host.path(u"backup.txt"), u"old");
+         },
+         [](Host& host) { host.utils.CopyFileToBackupFile(host.path(u"source.txt"), host.path(u"backup.txt")); }},
+        {"SaveCfgFileData, a file's item", Promise::silent, [](Host& host) { save_item(host, u"first", u"1"); },
+         [](Host& host) { save_item(host, u"second", u"2"); }},
+        {"AppendEventLog", Promise::unflushed, [](Host& host) { log_to(host, u"first"); },
+         [](Host& host) { log_to(host, u"second"); }},
+        {"CallZIPFiles, a new archive", Promise::whole, make_data,
+         [](Host& host) { zip(host, host.path(u"data\\*.*")); }},
+        {"CallZIPFiles, more files", Promise::whole,
+         [](Host& host) {
+           make_data(host);
+           save(host, host.path(u"three.txt"), long_text(100'000, u'3'));
+           zip(host, host.path(u"data\\*.*"));
+         },
+         [](Host& host) { zip(host, host.path(u"three.txt")); }},
+        {"CallUnZIPFiles", Promise::whole,
+         [](Host& host) {
+           make_data(host);
+           zip(host, host.path(u"data\\*.*"));
+           host.utils.VerifyFilePath(host.path(u"out\\"));
+           save(host, host.path(u"out\\one.txt"), u"old");
+         },
+         [](Host& host) { host.utils.CallUnZIPFiles(host.path(u"a.zip"), host.path(u"out\\"), u"", Boolean(true)); }},
+        {"ExportGridData", Promise::silent, [](Host& host) { report(host, u"old"); },
+         [](Host& host) { report(host, u"new"); }},
+        {"VerifyFilePath", Promise::silent, nothing,
+         [](Host& host) { host.utils.VerifyFilePath(host.path(u"made\\for\\reports\\")); }},
+        {"DeleteFiles", Promise::silent,
+         [](Host& host) {
+           save(host, host.path(u"one.tmp"), u"1");
+           save(host, host.path(u"two.tmp"), u"2");
+         },
+         [](Host& host) { host.utils.DeleteFiles(host.path(u"*.tmp")); }},
+        {"LoadTextBox", Promise::silent,
+         [](Host& host) { save(host, host.path(u"text.txt"), long_text(300'000, u't')); },
+         [](Host& host) { static_cast<void>(host.utils.LoadTextBox(host.path(u"text.txt"))); }},
+    };
+    if (!has_own_settings()) return some;
+    some.insert(
+        some.end(),
+        {
+            {"SaveCfgFileData, a setting", Promise::unflushed, [](Host& host) { save_setting(host, u"old"); },
+             [](Host& host) { save_setting(host, u"new"); }},
+            {"REGISTRY_SetKeyValue", Promise::silent,
+             [](Host& host) {
+               host.utils.REGISTRY_CreateNewKey(key, current_user);
+               host.utils.REGISTRY_SetKeyValue(key, u"other", u"kept", 1);
+             },
+             [](Host& host) { host.utils.REGISTRY_SetKeyValue(key, u"name", u"value", 1); }},
+            {"REGISTRY_CreateNewKey", Promise::silent, nothing,
+             [](Host& host) { host.utils.REGISTRY_CreateNewKey(key, current_user); }},
+            {"GridPrintPreview at the end of a month", Promise::silent,
+             [](Host& host) { host.utils.VerifyFilePath(u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\"); }, write_report},
+        });
+    return some;
+  }();
   return all;
 }
 

@@ -6,20 +6,22 @@
 #include <vector>
 
 #include "library/orv_utils.hpp"
-#include "platform/posix/posix_platform.hpp"
 #include "tests/fakes/fake_platform.hpp"
+#include "tests/faults/machine.hpp"
 
 /// What a host does with files, for the tests in which something goes wrong meanwhile.
 namespace talutil::testing {
 
-/// A library on this machine's files, settings and registry, all of them in one folder: drive C:. The rest is made up,
-/// so that everything always happens in the same way.
+/// A library on this machine's files, settings and registry. The rest is made up, so that everything always happens in
+/// the same way.
 class Host {
  public:
-  explicit Host(const std::string& root);
+  explicit Host(const std::filesystem::path& root);
+
+  [[nodiscard]] Text path(TextView name) const { return real->folder() + Text(name); }
 
   FakePlatform fake;
-  posix::PosixPlatform real;
+  std::unique_ptr<RealParts> real;
   Library library;
   ORVUtils utils{library};
 };

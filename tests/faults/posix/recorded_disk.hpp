@@ -8,36 +8,13 @@
 #include <string_view>
 #include <vector>
 
-/// This program's system calls on files. They are watched below the C library's functions, so that the databases and
-/// the standard library are covered as well.
+#include "tests/faults/machine.hpp"
+
 namespace talutil::testing {
-
-/// What the folders of a test's files allow.
-enum class Allowed { everything, no_replacing, no_new_files };
-
-/// Lets one call fail, the way the system may let that call fail.
-class FailingCall {
- public:
-  /// @param number counted from 0
-  /// @param way one of the call's possible failures, counted from 0
-  /// @param goes_on whether every later call fails as well, as with a disk that is gone
-  FailingCall(std::size_t number, std::size_t way, bool goes_on, Allowed allowed);
-  FailingCall(const FailingCall&) = delete;
-  FailingCall& operator=(const FailingCall&) = delete;
-  ~FailingCall();
-
-  /// Whether there was a call with that number.
-  [[nodiscard]] bool is_reached() const noexcept;
-
-  /// What failed ("write: No space left on device"); empty if the call has no such way of failing.
-  [[nodiscard]] static std::string what();
-};
 
 /// A file system as its disk has it: what was flushed is there; of everything else, any part may be.
 class RecordedDisk {
  public:
-  using Files = std::map<std::string, std::string>;  ///< Contents by path; a folder's path ends in "/".
-
   /// Records from now on what happens below a folder, whose contents count as flushed.
   explicit RecordedDisk(std::string root);
   RecordedDisk(const RecordedDisk&) = delete;
@@ -51,7 +28,7 @@ class RecordedDisk {
   enum class Lost { everything, contents, names, nothing, at_random };
 
   /// What is found after a power cut before a step.
-  [[nodiscard]] Files after_cut(std::size_t step, Lost lost, unsigned seed) const;
+  [[nodiscard]] Contents after_cut(std::size_t step, Lost lost, unsigned seed) const;
 
   struct Step {
     enum class Kind { create, make_folder, rename, remove, write, truncate, flush_file, flush_folder };
@@ -73,17 +50,11 @@ class RecordedDisk {
   [[nodiscard]] bool is_flushed(std::size_t step, std::size_t end) const;
 
   std::string root_;
-  Files before_;
+  Contents before_;
   std::map<ino_t, std::size_t> numbers_;
   std::map<std::string, std::size_t> named_before_;
   std::size_t next_ = 1;
   std::vector<Step> steps_;
 };
-
-/// Everything in a folder.
-[[nodiscard]] RecordedDisk::Files read_tree(const std::string& root);
-
-/// Makes a folder hold exactly these files, all of one time.
-void write_tree(const std::string& root, const RecordedDisk::Files& files);
 
 }  // namespace talutil::testing

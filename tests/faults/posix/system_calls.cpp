@@ -1,4 +1,4 @@
-#include "tests/faults/system_calls.hpp"
+#include "tests/faults/posix/recorded_disk.hpp"
 
 #include <dirent.h>
 #include <dlfcn.h>
@@ -11,9 +11,7 @@
 
 #include <cstring>
 #include <filesystem>
-#include <fstream>
 #include <random>
-#include <sstream>
 #include <utility>
 
 namespace talutil::testing {
@@ -169,9 +167,11 @@ FailingCall::FailingCall(std::size_t number, std::size_t way, bool goes_on, Allo
 
 FailingCall::~FailingCall() { failing = nullptr; }
 
-bool FailingCall::is_reached() const noexcept { return failing->calls > failing->number; }
+bool FailingCall::is_reached() noexcept { return failing->calls > failing->number; }
 
 std::string FailingCall::what() { return failing->what; }
+
+bool is_removal(std::string_view what) noexcept { return what.starts_with("unlink"); }
 
 RecordedDisk::RecordedDisk(std::string root) : root_(std::move(root)), before_(read_tree(root_)) {
   for (const auto& [path, bytes] : before_) {
@@ -204,11 +204,11 @@ bool RecordedDisk::is_flushed(std::size_t step, std::size_t end) const {
   return false;
 }
 
-RecordedDisk::Files RecordedDisk::after_cut(std::size_t end, Lost lost, unsigned seed) const {
+Contents RecordedDisk::after_cut(std::size_t end, Lost lost, unsigned seed) const {
   std::mt19937 random(seed);
   std::map<std::string, std::size_t> names;
   std::map<std::size_t, std::string> contents;
-  Files found;
+  Contents found;
   for (const auto& [path, bytes] : before_) {
     if (path.ends_with('/'))
       found[path];
@@ -254,37 +254,6 @@ RecordedDisk::Files RecordedDisk::after_cut(std::size_t end, Lost lost, unsigned
     if (folder == "/" || found.contains(folder + "/")) found[inside] = contents[file];
   }
   return found;
-}
-
-RecordedDisk::Files read_tree(const std::string& root) {
-  RecordedDisk::Files files;
-  for (const auto& entry : std::filesystem::recursive_directory_iterator(root)) {
-    const std::string path = entry.path().string().substr(root.size());
-    if (entry.is_directory()) {
-      files[path + "/"];
-    } else {
-      std::stringstream bytes;
-      bytes << std::ifstream(entry.path(), std::ios::binary).rdbuf();
-      files[path] = bytes.str();
-    }
-  }
-  return files;
-}
-
-void write_tree(const std::string& root, const RecordedDisk::Files& files) {
-  std::filesystem::remove_all(root);
-  std::filesystem::create_directories(root);
-  for (const auto& [path, bytes] : files) {
-    if (path.ends_with('/')) {
-      std::filesystem::create_directories(root + path);
-      continue;
-    }
-    std::ofstream(root + path, std::ios::binary) << bytes;
-  }
-  // Archives record the times.
-  for (const auto& entry : std::filesystem::recursive_directory_iterator(root)) {
-    std::filesystem::last_write_time(entry.path(), {});
-  }
 }
 
 }  // namespace talutil::testing

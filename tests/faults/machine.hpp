@@ -1,0 +1,85 @@
+#pragma once
+
+#include <filesystem>
+#include <map>
+#include <memory>
+#include <string>
+
+#include "platform/code_page.hpp"
+#include "platform/files.hpp"
+#include "platform/folders.hpp"
+#include "platform/registry.hpp"
+#include "platform/settings.hpp"
+
+/// What the tests in which something goes wrong need from the platform.
+namespace talutil::testing {
+
+using Contents = std::map<std::string, std::string>;  ///< Contents by path from a root on; a folder's ends in "/".
+
+/// Everything in a folder.
+[[nodiscard]] Contents read_tree(const std::filesystem::path& root);
+
+/// Makes a folder hold exactly these files, all of one time.
+void write_tree(const std::filesystem::path& root, const Contents& files);
+
+/// The platform's own parts for files and settings, which lie in one folder as far as the platform allows.
+struct RealParts {
+  virtual ~RealParts() = default;
+  [[nodiscard]] virtual Text folder() const = 0;  ///< As a library calls it, with a separator at its end.
+  [[nodiscard]] virtual Files& files() = 0;
+  [[nodiscard]] virtual Folders& folders() = 0;
+  [[nodiscard]] virtual Profiles& profiles() = 0;
+  [[nodiscard]] virtual SettingsStore& settings_store() = 0;
+  [[nodiscard]] virtual Registry& registry() = 0;
+  [[nodiscard]] virtual CodePage& code_page() = 0;
+};
+
+/// A new folder for files, empty.
+[[nodiscard]] std::filesystem::path make_root();
+
+[[nodiscard]] std::unique_ptr<RealParts> real_parts(const std::filesystem::path& root);
+
+/// Whether settings and the registry lie in the folder, so that they can be put back.
+[[nodiscard]] bool has_own_settings() noexcept;
+
+/// Whether the next writer removes at once what an earlier one could not, or only after that one's process has ended.
+[[nodiscard]] bool clears_at_once() noexcept;
+
+/// The short form of the tests lets every such call fail.
+[[nodiscard]] std::size_t stride_of_short_form() noexcept;
+
+/// Sets the time of a file or folder to the same moment always.
+void set_time(const std::filesystem::path& path);
+
+/// Everything in the folder, with the settings' and the registry's values in the place of their files.
+[[nodiscard]] Contents contents_of(const std::filesystem::path& root);
+
+/// How many files and the like this process has open.
+[[nodiscard]] std::size_t open_handles();
+
+/// What the folders of a test's files allow.
+enum class Allowed { everything, no_replacing, no_new_files };
+
+/// Lets one of this program's system calls on files fail, in a way in which the system may let that call fail. The
+/// calls are watched below the platform's code; natively those of the databases and the standard library are, too.
+class FailingCall {
+ public:
+  /// @param number counted from 0
+  /// @param way one of the call's possible failures, counted from 0
+  /// @param goes_on whether every later call fails as well, as with a disk that is gone
+  FailingCall(std::size_t number, std::size_t way, bool goes_on, Allowed allowed);
+  FailingCall(const FailingCall&) = delete;
+  FailingCall& operator=(const FailingCall&) = delete;
+  ~FailingCall();
+
+  /// Whether there was a call with that number.
+  [[nodiscard]] static bool is_reached() noexcept;
+
+  /// The name of the function that failed and how; empty if it has no such way of failing.
+  [[nodiscard]] static std::string what();
+};
+
+/// Whether what failed removes files, so that they cannot but be left.
+[[nodiscard]] bool is_removal(std::string_view what) noexcept;
+
+}  // namespace talutil::testing

@@ -1,0 +1,43 @@
+#include "tests/faults/fixture.hpp"
+#include "tests/faults/posix/recorded_disk.hpp"
+
+namespace talutil::testing {
+namespace {
+
+struct PowerCuts : Faults {};
+
+TEST_P(PowerCuts, LoseNothing) {
+  write_tree(root, old_files);
+  RecordedDisk disk(root);
+  in_a_host(GetParam().act);
+  disk.stop();
+  const unsigned seeds = is_whole() ? 200 : 8;
+  for (std::size_t step = 0; step <= disk.steps(); ++step) {
+    std::vector<Contents> found;
+    for (const auto lost : {RecordedDisk::Lost::everything, RecordedDisk::Lost::contents, RecordedDisk::Lost::names,
+                            RecordedDisk::Lost::nothing}) {
+      found.push_back(disk.after_cut(step, lost, 0));
+    }
+    for (unsigned seed = 0; seed < seeds; ++seed) {
+      found.push_back(disk.after_cut(step, RecordedDisk::Lost::at_random, seed));
+    }
+    std::ranges::sort(found);
+    const auto same_ones = std::ranges::unique(found);
+    found.erase(same_ones.begin(), same_ones.end());
+    for (const Contents& files : found) {
+      ++Counts::cuts;
+      write_tree(root, files);
+      SCOPED_TRACE("cut before step " + std::to_string(step) + " of " + std::to_string(disk.steps()));
+      const Contents left = contents();
+      expect_whole(left, true);
+      if (step == disk.steps() && GetParam().promise == Promise::whole) expect_new(left);
+      expect_next_call_works(false);
+      if (HasFailure()) return;
+    }
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(All, PowerCuts, ::testing::ValuesIn(operations()), &name_of);
+
+}  // namespace
+}  // namespace talutil::testing

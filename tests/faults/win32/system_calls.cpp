@@ -1,0 +1,214 @@
+#include "platform/win32/windows.hpp"
+#include "tests/faults/machine.hpp"
+#include "tests/faults/win32/scripted_calls.hpp"
+
+// The system's functions on files, in the place of the imported ones: calls go through pointers, which the linker takes
+// from here rather than from the import libraries.
+
+namespace talutil::testing {
+
+namespace {
+
+struct Failing {
+  std::size_t calls = 0;
+  std::size_t number = 0;
+  std::size_t way = 0;
+  bool goes_on = false;
+  Allowed allowed = Allowed::everything;
+  std::string what;
+};
+
+constinit Failing* failing = nullptr;
+constinit ScriptedCalls* script = nullptr;
+
+struct Call {
+  const char* name;
+  std::initializer_list<DWORD> codes;  ///< What it can fail with, as documented.
+};
+
+constexpr Call calls[] = {
+    {"CreateFileW", {ERROR_ACCESS_DENIED, ERROR_TOO_MANY_OPEN_FILES, ERROR_SHARING_VIOLATION}},
+    {"ReadFile", {ERROR_CRC, ERROR_LOCK_VIOLATION}},
+    {"WriteFile", {ERROR_DISK_FULL, ERROR_WRITE_FAULT}},
+    {"FlushFileBuffers", {ERROR_DISK_FULL, ERROR_IO_DEVICE}},
+    {"MoveFileExW", {ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION, ERROR_IO_DEVICE}},
+    {"ReplaceFileW", {ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION, ERROR_UNABLE_TO_REMOVE_REPLACED, ERROR_IO_DEVICE}},
+    {"DeleteFileW", {ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION}},
+    {"CreateDirectoryW", {ERROR_ACCESS_DENIED, ERROR_DISK_FULL}},
+    {"GetFileSizeEx", {ERROR_IO_DEVICE}},
+    {"SetFilePointerEx", {ERROR_IO_DEVICE}},
+    {"SetEndOfFile", {ERROR_DISK_FULL}},
+    {"SetFileTime", {ERROR_ACCESS_DENIED}},
+    {"FindFirstFileW", {ERROR_ACCESS_DENIED, ERROR_NOT_READY}},
+    {"FindNextFileW", {ERROR_IO_DEVICE}},
+    {"LockFileEx", {ERROR_LOCK_VIOLATION, ERROR_NOT_SUPPORTED}},
+};
+
+/// The code that a call is to fail with; 0 if it is to be made.
+DWORD failure(const Call& call) {
+  if (failing == nullptr) return 0;
+  const std::size_t number = failing->calls++;
+  const bool is_first = number == failing->number;
+  if (!is_first && (number < failing->number || !failing->goes_on)) return 0;
+  if (!is_first) return ERROR_IO_DEVICE;
+  if (failing->way >= call.codes.size()) {
+    failing->goes_on = false;
+    return 0;
+  }
+  const DWORD code = call.codes.begin()[failing->way];
+  failing->what = call.name + std::string(": ") + std::to_string(code);
+  return code;
+}
+
+template <class Result>
+Result failed() {
+  if constexpr (std::is_same_v<Result, HANDLE>)
+    return INVALID_HANDLE_VALUE;
+  else
+    return Result{};
+}
+
+template <class Function>
+Function* real(const char* name) {
+  return reinterpret_cast<Function*>(reinterpret_cast<void*>(GetProcAddress(GetModuleHandleW(L"kernel32.dll"), name)));
+}
+
+/// Whether a call is refused whenever it is made.
+template <class... Arguments>
+bool is_refused(std::string_view name, const Arguments&... arguments) {
+  if (failing == nullptr) return false;
+  if (failing->allowed == Allowed::no_replacing) return name == "MoveFileExW" || name == "ReplaceFileW";
+  if constexpr (sizeof...(Arguments) == 7) {  // CreateFileW.
+    return failing->allowed == Allowed::no_new_files && std::get<4>(std::tie(arguments...)) == CREATE_NEW;
+  }
+  return false;
+}
+
+template <class Function, std::size_t number>
+struct Watched;
+
+template <class Result, class... Arguments, std::size_t number>
+struct Watched<Result(Arguments...), number> {
+  static Result call(Arguments... arguments) {
+    static auto* const actual = real<Result(Arguments...)>(calls[number].name);
+    const std::string_view name = calls[number].name;
+    DWORD code = failure(calls[number]);
+    if (code == 0 && is_refused(name, arguments...)) code = ERROR_ACCESS_DENIED;
+    if (script != nullptr) code = follow_script(name, arguments...);
+    if (code != 0) {
+      SetLastError(code);
+      return failed<Result>();
+    }
+    const Result result = actual(arguments...);
+    if constexpr (std::is_same_v<std::tuple_element_t<sizeof...(Arguments) - 1, std::tuple<Arguments...>>,
+                                 WIN32_FIND_DATAW*>) {
+      if (script != nullptr) tag(*std::get<sizeof...(Arguments) - 1>(std::tie(arguments...)));
+    }
+    return result;
+  }
+
+ private:
+  /// Notes a call. Returns the code that it is to fail with.
+  static DWORD follow_script(std::string_view name, const Arguments&... arguments) {
+    const auto all = std::tie(arguments...);
+    std::string flags;
+    constexpr bool is_replacing =  // ReplaceFileW; LockFileEx has as many arguments.
+        sizeof...(Arguments) == 6 && std::is_same_v<std::tuple_element_t<0, std::tuple<Arguments...>>, LPCWSTR>;
+    if constexpr (is_replacing) flags = "(" + std::to_string(std::get<3>(all)) + ")";
+    if constexpr (std::is_same_v<std::tuple<Arguments...>, std::tuple<LPCWSTR, LPCWSTR, DWORD>>) {
+      flags = "(" + std::to_string(std::get<2>(all)) + ")";
+    }
+    if constexpr (sizeof...(Arguments) == 7) {
+      if (std::get<4>(all) == CREATE_NEW) script->created.emplace_back(std::get<0>(all));
+    }
+    const DWORD code = script->next_code(std::string(name));
+    if (name == "FlushFileBuffers" || name == "ReplaceFileW" || name == "MoveFileExW") {
+      script->note(std::string(name) + flags + (code == 0 ? "" : "!"));
+    }
+    // As documented: the old file has lost its name, or has another.
+    if constexpr (is_replacing) {
+      if (code == ERROR_UNABLE_TO_MOVE_REPLACEMENT) real<decltype(DeleteFileW)>("DeleteFileW")(std::get<0>(all));
+      if (code == ERROR_UNABLE_TO_MOVE_REPLACEMENT_2) {
+        real<decltype(MoveFileExW)>("MoveFileExW")(std::get<0>(all), (std::wstring(std::get<0>(all)) + L".old").c_str(),
+                                                   0);
+      }
+    }
+    return code;
+  }
+
+  static void tag(WIN32_FIND_DATAW& entry) {
+    const auto found = script->tags.find(entry.cFileName);
+    if (found == script->tags.end()) return;
+    entry.dwFileAttributes |= FILE_ATTRIBUTE_REPARSE_POINT;
+    entry.dwReserved0 = found->second;
+  }
+};
+
+/// The pauses between attempts, which need not be waited for.
+void WINAPI no_sleep(DWORD milliseconds) {
+  if (script != nullptr) script->note("Sleep(" + std::to_string(milliseconds) + ")");
+}
+
+}  // namespace
+
+FailingCall::FailingCall(std::size_t number, std::size_t way, bool goes_on, Allowed allowed) {
+  static Failing state;
+  state = {0, number, way, goes_on, allowed, {}};
+  failing = &state;
+}
+
+FailingCall::~FailingCall() { failing = nullptr; }
+
+bool FailingCall::is_reached() noexcept { return failing->calls > failing->number; }
+
+std::string FailingCall::what() { return failing->what; }
+
+ScriptedCalls::ScriptedCalls(Codes codes) : codes_(std::move(codes)) { script = this; }
+
+ScriptedCalls::~ScriptedCalls() { script = nullptr; }
+
+DWORD ScriptedCalls::next_code(const std::string& name) {
+  std::vector<DWORD>& codes = codes_[name];
+  if (codes.empty()) return 0;
+  const DWORD code = codes.front();
+  codes.erase(codes.begin());
+  return code;
+}
+
+std::string ScriptedCalls::log() const {
+  std::string log;
+  for (std::size_t i = 0; i < calls_.size(); ++i) {
+    std::size_t count = 1;
+    while (i + 1 < calls_.size() && calls_[i + 1] == calls_[i]) ++i, ++count;
+    log += (log.empty() ? "" : " ") + calls_[i] + (count == 1 ? "" : "x" + std::to_string(count));
+  }
+  return log;
+}
+
+bool is_removal(std::string_view what) noexcept { return what.starts_with("DeleteFileW"); }
+
+}  // namespace talutil::testing
+
+// Some code of the run-time library calls the imported functions directly, through a jump that stands here as well.
+#define IMPORTED_AS(name, pointer)                                                             \
+  __attribute__((used)) auto* watched_##name asm("__imp_" #name) = &talutil::testing::pointer; \
+  asm(".text\n.globl " #name "\n" #name ": jmp *__imp_" #name "(%rip)\n")
+#define WATCHED(name, number) IMPORTED_AS(name, Watched<decltype(name) COMMA number>::call)
+#define COMMA ,
+
+WATCHED(CreateFileW, 0);
+WATCHED(ReadFile, 1);
+WATCHED(WriteFile, 2);
+WATCHED(FlushFileBuffers, 3);
+WATCHED(MoveFileExW, 4);
+WATCHED(ReplaceFileW, 5);
+WATCHED(DeleteFileW, 6);
+WATCHED(CreateDirectoryW, 7);
+WATCHED(GetFileSizeEx, 8);
+WATCHED(SetFilePointerEx, 9);
+WATCHED(SetEndOfFile, 10);
+WATCHED(SetFileTime, 11);
+WATCHED(FindFirstFileW, 12);
+WATCHED(FindNextFileW, 13);
+WATCHED(LockFileEx, 14);
+IMPORTED_AS(Sleep, no_sleep);
