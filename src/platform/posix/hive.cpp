@@ -1,11 +1,14 @@
 #include "platform/posix/hive.hpp"
 
+#include <fcntl.h>
 #include <sqlite3.h>
+#include <sys/stat.h>
 
 #include <filesystem>
 
 #include "automation/run_time_error.hpp"
 #include "platform/posix/data_folder.hpp"
+#include "platform/posix/descriptor.hpp"
 
 namespace talutil::posix {
 
@@ -73,6 +76,8 @@ void Hive::open() {
   if (database_) return;
   std::error_code ignored;  // If this fails, SQLite reports below that it cannot open the file.
   std::filesystem::create_directories(std::filesystem::path(path_).parent_path(), ignored);
+  // Only for the user, unlike other files; SQLite gives its own files the same rights.
+  static_cast<void>(Descriptor(::open(path_.c_str(), O_RDWR | O_CREAT | O_CLOEXEC, S_IRUSR | S_IWUSR)));
   sqlite3* handle = nullptr;
   const int status = sqlite3_open(path_.c_str(), &handle);
   database_.reset(handle);

@@ -29,6 +29,7 @@ TEST_F(SettingsFiles, TheRegistryAndTheSettingsShareTheirTexts) {
   Registry::Handle key = 0;
   ASSERT_EQ(registry.create(Registry::current_user, u"Software\\TALUtil\\Settings\\A\\S", key), Registry::ok);
   EXPECT_EQ(registry.set(key, u"k", Registry::text, std::string("\xE9\x80\0", 3)), Registry::ok);
+  EXPECT_EQ(std::filesystem::status(hive.path()).permissions(), std::filesystem::perms(0600)) << "the user's alone";
   Hive none("/proc/none/hive.db");
   EXPECT_EQ(PosixRegistry(none, code_page).open(Registry::current_user, u"A", 0, key), PosixRegistry::unavailable);
   EXPECT_EQ(store.value(u"A", u"S", u"K"), u"\u00E9\u20AC");
