@@ -158,15 +158,25 @@ else
   failed=$((failed + 1))
 fi
 
-# The system's code page is that of the locale in which Wine's server begins.
+# The system's code page is that of the locale in which Wine's server begins; a manifest makes it UTF-8.
 mkdir -p "$talutil_build/locales"
-localedef -i ru_RU -f UTF-8 "$talutil_build/locales/ru_RU.UTF-8"
-export WINE_LANG=ru_RU.UTF-8 WINE_LOCPATH
 WINE_LOCPATH=$(build_below_wine)/locales
-restart_wine
-elsewhere 206-1-15-1-1-1-1-1 code_page
+for page in ru_RU:1251 ja_JP:932; do
+  localedef -i "${page%:*}" -f UTF-8 "$talutil_build/locales/${page%:*}.UTF-8" 2>/dev/null
+  export WINE_LANG=${page%:*}.UTF-8 WINE_LOCPATH
+  restart_wine
+  client code_page "${page#*:}"
+done
 unset WINE_LANG WINE_LOCPATH
 restart_wine
+programs_folder=$talutil_build/$folder/tests/hosts
+cp "$programs_folder/code_page_client.exe" "$programs_folder/utf8_client.exe"
+cat >"$programs_folder/utf8_client.exe.manifest" <<'X'
+<assembly xmlns="urn:schemas-microsoft-com:asm.v1" manifestVersion="1.0"><application><windowsSettings>
+<activeCodePage xmlns="http://schemas.microsoft.com/SMI/2019/WindowsSettings">UTF-8</activeCodePage>
+</windowsSettings></application></assembly>
+X
+client utf8 65001
 
 # A cipher text made on one side opens on the other.
 talutil=$talutil_build/asan/talutil
