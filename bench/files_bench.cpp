@@ -14,6 +14,7 @@
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "platform/posix/posix_files.hpp"
+#include "platform/posix/posix_platform.hpp"
 #include "services/sequential_file.hpp"
 #include "tests/fakes/fake_platform.hpp"
 
@@ -124,6 +125,30 @@ void fresh_process(benchmark::State& state) {
   }
 }
 BENCHMARK(fresh_process)->Iterations(1)->Repetitions(5)->ReportAggregatesOnly();
+
+// ---- a small text, and the least that makes it last through a power cut
+
+const std::string small_text(2000, 'x');
+
+/// Written over the old one and flushed: not safe, since a power cut may leave a part of it.
+void bare_write(benchmark::State& state) {
+  const std::string path = scratch().folder + "/bare.txt";
+  for (auto _ : state) {
+    const int file = open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0666);
+    if (write(file, small_text.data(), small_text.size()) < 0 || fsync(file) != 0) state.SkipWithError("cannot write");
+    close(file);
+  }
+}
+
+void save_text_box(benchmark::State& state) {
+  Toolkit toolkit;
+  const Text text = from_utf8(small_text);
+  const Text path = from_utf8(scratch().folder + "/small.txt");
+  for (auto _ : state) toolkit.utils.SaveTextBox(text, path);
+}
+
+BENCHMARK(bare_write)->UseRealTime();
+BENCHMARK(save_text_box)->UseRealTime();
 
 // ---- lines: one at a time, and all of them kept
 
