@@ -56,10 +56,12 @@ Text FrmInputBox::ask(const Question& question) {
   if (question.is_unclosable) view.set_visible(cmdOK, false);
   if (!question.has_entry) view.set_visible(txtUserInput, false);
   view.fit();
-  if (is_notice)
+  if (is_notice) {
+    view.keep_open();
     view.show();
-  else
+  } else {
     show_modal();
+  }
   return result_;
 }
 

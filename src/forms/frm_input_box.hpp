@@ -31,10 +31,6 @@ class FrmInputBox final : public Form {
   /// text.
   [[nodiscard]] Text ask(const Question& question);
 
-  void close_notice() override {
-    if (!is_shown_modal()) unload();
-  }
-
  protected:
   void fill(FormView& view) override;
   void on_click(std::uint8_t part) override;

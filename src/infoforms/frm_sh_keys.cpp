@@ -21,11 +21,11 @@ constexpr FormPart parts[] = {
      .place = {60, 5, 50, 14},
      .caption = u"Cross",
      .tip = u"Cancel changes and exit"},
-    {.id = Keys::keys_label, .kind = PartKind::label, .place = {120, 8, 80, 9}, .caption = u"Shortcut &keys:"},
-    {.id = Keys::Text1, .kind = PartKind::rich_text, .follows = width | height, .place = {7, 24, 306, 199}},
+    {.id = Keys::keys_label, .kind = PartKind::label, .place = {7, 23, 80, 9}, .caption = u"Shortcut &keys:"},
+    {.id = Keys::Text1, .kind = PartKind::rich_text, .follows = width | height, .place = {7, 34, 346, 270}},
 };
 
-constexpr FormDescription description{.parts = parts, .width = 320, .height = 230, .is_resizable = true};
+constexpr FormDescription description{.parts = parts, .width = 360, .height = 311, .is_resizable = true};
 
 }  // namespace
 

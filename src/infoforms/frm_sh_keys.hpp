@@ -26,8 +26,6 @@ class FrmShKeys final : public Form {
   /// Sets the result to 0 and unloads the window.
   void close();
 
-  void close_notice() override { unload(); }
-
   [[nodiscard]] std::int16_t result() const noexcept { return result_; }
 
  protected:

@@ -19,9 +19,6 @@ class LibraryPart {
   LibraryPart(const LibraryPart&) = delete;
   LibraryPart& operator=(const LibraryPart&) = delete;
   virtual ~LibraryPart() = default;
-
-  /// Closes a window that no call is waiting for.
-  virtual void close_notice() {}
 };
 
 /// A loaded library: the shared settings, the platform, the components window and the parts that members add. The DLL
@@ -57,9 +54,6 @@ class Library {
     parts_.push_back(std::move(made));
     return result;
   }
-
-  /// Closes the windows that no call is waiting for.
-  void close_notices();
 
   /// The user's separators and the current year.
   [[nodiscard]] Locale locale() const;

@@ -94,6 +94,9 @@ class FormView {
   /// Keeps the window above all others, without moving or resizing it.
   virtual void keep_on_top() = 0;
 
+  /// Takes the ways to close the window from its user; programs can still close it.
+  virtual void keep_open() = 0;
+
   /// Makes growing labels as high as their texts, closes the gaps of hidden parts, and resizes the window to match. A
   /// text that is too high for the screen can be scrolled.
   virtual void fit() = 0;

@@ -25,11 +25,6 @@ void Library::start() {
   settings_.ScreenTwipsPerPixelY = round_to<std::int32_t>(platform_.screen.twips_per_pixel_y());
 }
 
-void Library::close_notices() {
-  // By index, because closing a window may create another part.
-  for (std::size_t i = 0; i < parts_.size(); ++i) parts_[i]->close_notice();
-}
-
 Locale Library::locale() const {
   Locale locale = platform_.computer.locale();
   locale.current_year = parts_of(platform_.clock.now()).year;
@@ -45,7 +40,6 @@ void ORVUtils::Terminate() {
   if (settings().DebugMode == 1) {
     library_.platform().message_boxes.show(u"Closing ORVUtils Components form", MessageButtons::ok, {});
   }
-  library_.close_notices();
   library_.components().unload();
 }
 

@@ -162,7 +162,10 @@ void notices_stay(_ORVUtils* u) {
   take_picture(L"notice");
   u->put_DebugMode(0);
   u->Terminate();
-  check(IsWindow(window) == FALSE, "Terminate does");
+  SendMessageW(window, WM_SYSCOMMAND, SC_CLOSE, 0);
+  check(IsWindow(window) != FALSE, "neither Terminate nor Alt+F4 closes it");
+  SendMessageW(window, WM_CLOSE, 0, 0);
+  check(IsWindow(window) == FALSE, "the host does");
 }
 
 void keys_are_listed(_ORVUtils* u) {

@@ -27,6 +27,7 @@ class TerminalForm final : public FormView {
   void set_colour(std::int32_t /*colour*/) override {}
   void remove_frame() override {}
   void keep_on_top() override {}
+  void keep_open() override {}
   void fit() override {}
   void set_tabs(std::uint8_t /*part*/, std::span<const TextView> /*captions*/) override {}
   void set_table(std::uint8_t /*part*/, TableSource& /*table*/, std::int32_t /*bar_column*/) override {}

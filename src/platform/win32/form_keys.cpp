@@ -66,9 +66,13 @@ void FormKeys::focus(HWND control) {
 
 void FormKeys::return_focus() {
   if (focused_ != nullptr && IsChild(window_, focused_) != FALSE) return focus(focused_);
+  // A text to be read comes before the buttons above it, which Space would press.
+  auto first = std::ranges::find_if(parts_, [](const PlacedPart& placed) { return placed.is(PartKind::rich_text); });
   // Never a prompt, even if it can be scrolled.
-  const auto first = std::ranges::find_if(
-      parts_, [](const PlacedPart& placed) { return placed.is_visible && !placed.is(PartKind::label); });
+  if (first == parts_.end()) {
+    first = std::ranges::find_if(
+        parts_, [](const PlacedPart& placed) { return placed.is_visible && !placed.is(PartKind::label); });
+  }
   focus(first == parts_.end() ? nullptr : first->window);
 }
 

@@ -1,19 +1,17 @@
 #include "platform/win32/form_layout.hpp"
 
 #include <algorithm>
+#include <utility>
+
+#include "platform/win32/dots.hpp"
+#include "platform/win32/modality.hpp"
 
 namespace talutil::win32 {
 
 namespace {
 
-/// The primary screen without the task bar.
-RECT work_area() {
-  RECT work{};
-  SystemParametersInfoW(SPI_GETWORKAREA, 0, &work, 0);
-  return work;
-}
-
-/// Moves a part to its position in a window that has grown by `across` and `down`.
+/// Moves a part to its position in a window that has grown by `across` and `down`. What it showed is not copied along:
+/// another part may have painted over it already.
 void move(const PlacedPart& placed, int across, int down) {
   RECT place = placed.place;
   const std::uint8_t follows = placed.part->follows;
@@ -23,7 +21,7 @@ void move(const PlacedPart& placed, int across, int down) {
   if ((follows & part_follows::height) != 0) place.bottom += down;
   SetWindowPos(placed.window, nullptr, static_cast<int>(place.left), static_cast<int>(place.top),
                static_cast<int>(place.right - place.left), static_cast<int>(place.bottom - place.top),
-               SWP_NOZORDER | SWP_NOACTIVATE);
+               SWP_NOZORDER | SWP_NOACTIVATE | SWP_NOCOPYBITS);
 }
 
 }  // namespace
@@ -33,15 +31,38 @@ FormLayout::FormLayout(HWND window, FormParts& parts, const FormDescription& des
       parts_(parts),
       description_(description),
       style_(style),
+      dots_(dots_per_inch(window)),
       inner_{parts.font().across(description.width), parts.font().down(description.height)} {
   size_to_inside();
   const SIZE size = outer_size();
-  if (description.is_resizable) smallest_ = {size.cx / 2, size.cy / 2};
+  if (description.is_resizable) smallest_ = {size.cx * 3 / 4, size.cy * 3 / 4};
 }
 
 void FormLayout::fit() {
+  stack();
+  size_to_inside();
+}
+
+void FormLayout::set_dots(int dots, const RECT& place) {
+  const int before = std::exchange(dots_, dots);
+  parts_.set_dots(dots);
+  inner_ = {parts_.font().across(description_.width), parts_.font().down(description_.height)};
+  smallest_ = {MulDiv(smallest_.cx, dots, before), MulDiv(smallest_.cy, dots, before)};
+  const bool is_stacked = std::ranges::any_of(parts_, [](const PlacedPart& placed) { return placed.part->is_growing; });
+  if (is_stacked)
+    stack();
+  else
+    for (const PlacedPart& placed : parts_) move(placed, 0, 0);
+  SetWindowPos(window_, nullptr, static_cast<int>(place.left), static_cast<int>(place.top),
+               static_cast<int>(place.right - place.left), static_cast<int>(place.bottom - place.top),
+               SWP_NOZORDER | SWP_NOACTIVATE);
+  if (!description_.is_resizable) size_to_inside();
+}
+
+/// Places the parts below each other.
+void FormLayout::stack() {
   const SystemFont& font = parts_.font();
-  const RECT work = work_area();
+  const RECT work = work_area_at(window_);
   const int most_height = static_cast<int>(work.bottom - work.top) * 2 / 3;
   int shift = 0;
   int bottom_before = 0;
@@ -65,7 +86,6 @@ void FormLayout::fit() {
     bottom_before = top + height;
   }
   inner_.cy = font.down(description_.height) + shift;
-  size_to_inside();
 }
 
 void FormLayout::follow() const {
@@ -78,7 +98,7 @@ void FormLayout::follow() const {
 }
 
 void FormLayout::centre() const {
-  const RECT work = work_area();
+  const RECT work = work_area_at(window_);
   SIZE size = outer_size();
   // A resizable window need not be larger than the screen.
   if (description_.is_resizable) {
@@ -99,7 +119,7 @@ void FormLayout::set_style(DWORD style) {
 
 void FormLayout::size_to_inside() const {
   RECT outer{0, 0, inner_.cx, inner_.cy};
-  AdjustWindowRectEx(&outer, style_, FALSE, WS_EX_CONTROLPARENT);
+  add_frame(outer, style_, WS_EX_CONTROLPARENT, dots_);
   SetWindowPos(window_, nullptr, 0, 0, static_cast<int>(outer.right - outer.left),
                static_cast<int>(outer.bottom - outer.top),
                SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE | SWP_FRAMECHANGED);

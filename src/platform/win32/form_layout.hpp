@@ -13,6 +13,10 @@ class FormLayout {
   /// Makes growing labels as high as their texts, closes the gaps of hidden parts, and resizes the window to match.
   void fit();
 
+  /// After the window has come to a monitor with other dots per inch: it moves to the place that the system suggests,
+  /// and everything on it is scaled.
+  void set_dots(int dots, const RECT& place);
+
   /// After the window was resized: parts follow its edges.
   void follow() const;
 
@@ -27,12 +31,14 @@ class FormLayout {
 
  private:
   void size_to_inside() const;
+  void stack();
   [[nodiscard]] SIZE outer_size() const;
 
   HWND window_;
   FormParts& parts_;
   const FormDescription& description_;
   DWORD style_;
+  int dots_;
   SIZE inner_;
   SIZE smallest_{};
 };

@@ -3,6 +3,8 @@
 #include <algorithm>
 
 #include "automation/run_time_error.hpp"
+#include "platform/win32/dots.hpp"
+#include "platform/win32/visual_styles.hpp"
 // After windows.h.
 #include <commctrl.h>
 #include <richedit.h>
@@ -55,7 +57,8 @@ DWORD CALLBACK read_rich_text(DWORD_PTR cookie, BYTE* buffer, LONG size, LONG* r
 
 }  // namespace
 
-FormParts::FormParts(HWND window, std::span<const FormPart> parts) : window_(window) {
+FormParts::FormParts(HWND window, std::span<const FormPart> parts) : window_(window), font_(dots_per_inch(window)) {
+  const VisualStyles styles;
   load_controls();
   for (const FormPart& part : parts) add(part);
   // Tabs are behind the parts on their pages.
@@ -79,9 +82,7 @@ HWND FormParts::make(const FormPart& part, const wchar_t* class_name, DWORD styl
 
 void FormParts::add(const FormPart& part) {
   const SystemControl kind = control_of(part);
-  const int left = font_.across(part.place.left);
-  const int top = font_.down(part.place.top);
-  const RECT place{left, top, left + font_.across(part.place.width), top + font_.down(part.place.height)};
+  const RECT place = place_of(part);
   const HWND control = make(part, kind.class_name, kind.style, kind.extended_style, place);
   parts_.push_back({&part, control, place, true, std::nullopt});
   if (part.kind == PartKind::table) {
@@ -91,6 +92,21 @@ void FormParts::add(const FormPart& part) {
   }
   if (part.kind == PartKind::entry) SendMessageW(control, EM_SETLIMITTEXT, 0, 0);
   if (!part.tip.empty()) add_tip(control, part.tip);
+}
+
+RECT FormParts::place_of(const FormPart& part) const {
+  const int left = font_.across(part.place.left);
+  const int top = font_.down(part.place.top);
+  return {left, top, left + font_.across(part.place.width), top + font_.down(part.place.height)};
+}
+
+void FormParts::set_dots(int dots) {
+  font_ = SystemFont(dots);
+  for (PlacedPart& placed : parts_) {
+    placed.place = place_of(*placed.part);
+    SendMessageW(placed.window, WM_SETFONT, reinterpret_cast<WPARAM>(font_.get()), FALSE);
+    if (placed.table) placed.table->follow_dots();
+  }
 }
 
 void FormParts::add_tip(HWND control, TextView tip) {
@@ -115,6 +131,10 @@ const PlacedPart& FormParts::of(std::uint8_t id) const {
 }
 
 PlacedPart& FormParts::of(std::uint8_t id) { return const_cast<PlacedPart&>(std::as_const(*this).of(id)); }
+
+bool FormParts::has_tabs() const noexcept {
+  return std::ranges::any_of(parts_, [](const PlacedPart& placed) { return placed.is(PartKind::tabs); });
+}
 
 PlacedPart* FormParts::find(HWND control) noexcept {
   const auto found = std::ranges::find(parts_, control, &PlacedPart::window);
@@ -158,6 +178,7 @@ Text FormParts::text(std::uint8_t id) const {
 }
 
 void FormParts::make_scrollable(PlacedPart& placed) {
+  const VisualStyles styles;
   Text broken;
   for (const char16_t unit : text(placed.part->id)) {
     if (unit == u'\n' && !broken.ends_with(u'\r')) broken += u'\r';

@@ -30,6 +30,8 @@ class FormParts {
   [[nodiscard]] auto begin() noexcept { return parts_.begin(); }
   [[nodiscard]] auto end() noexcept { return parts_.end(); }
 
+  [[nodiscard]] bool has_tabs() const noexcept;
+
   /// A part by its number. Raises 51 if there is no such part.
   [[nodiscard]] const PlacedPart& of(std::uint8_t id) const;
   [[nodiscard]] PlacedPart& of(std::uint8_t id);
@@ -49,6 +51,9 @@ class FormParts {
   void set_text(std::uint8_t id, TextView text);
   [[nodiscard]] Text text(std::uint8_t id) const;
 
+  /// Gives the parts the size and font of another number of dots per inch; the layout moves them then.
+  void set_dots(int dots);
+
   /// Replaces a label that is higher than the screen by a text that can be scrolled.
   void make_scrollable(PlacedPart& part);
 
@@ -56,6 +61,7 @@ class FormParts {
   [[nodiscard]] HWND make(const FormPart& part, const wchar_t* class_name, DWORD style, DWORD extended_style,
                           const RECT& place) const;
   void add(const FormPart& part);
+  [[nodiscard]] RECT place_of(const FormPart& part) const;
   void add_tip(HWND control, TextView tip);
 
   HWND window_;

@@ -4,6 +4,7 @@
 #include "platform/win32/colours.hpp"
 #include "platform/win32/form_keys.hpp"
 #include "platform/win32/form_layout.hpp"
+#include "platform/win32/modality.hpp"
 #include "platform/win32/win32_platform.hpp"
 #include "platform/win32/window.hpp"
 // After windows.h.
@@ -64,6 +65,7 @@ class FormWindow final : public TopWindow, public FormView {
     SetWindowPos(handle(), HWND_TOPMOST, 0, 0, 0, 0, SWP_NOSIZE | SWP_NOMOVE | SWP_NOACTIVATE);
   }
 
+  void keep_open() override { is_kept_open_ = true; }
   void fit() override { layout_->fit(); }
 
   void set_tabs(std::uint8_t part, std::span<const TextView> captions) override {
@@ -84,8 +86,9 @@ class FormWindow final : public TopWindow, public FormView {
 
   void show() override {
     if (!is_shown_) layout_->centre();
+    // A window that the user has made larger stays so.
+    show_window(handle(), !is_shown_ || IsIconic(handle()) != FALSE ? SW_SHOWNORMAL : SW_SHOW);
     is_shown_ = true;
-    ShowWindow(handle(), SW_SHOWNORMAL);
     SetForegroundWindow(handle());
     RedrawWindow(handle(), nullptr, nullptr, RDW_ERASE | RDW_INVALIDATE | RDW_UPDATENOW | RDW_ALLCHILDREN);
     // The host's message loop receives the keys of a modeless window.
@@ -99,12 +102,12 @@ class FormWindow final : public TopWindow, public FormView {
       return;
     }
     is_modal_ = true;
+    // Minimised, it would be a stub in the corner of the screen while its owner cannot be used.
+    SetWindowLongPtrW(handle(), GWL_STYLE, GetWindowLongPtrW(handle(), GWL_STYLE) & ~LONG_PTR{WS_MINIMIZEBOX});
     const WaitingWindows others(handle());
-    SetWindowLongPtrW(handle(), GWLP_HWNDPARENT, reinterpret_cast<LONG_PTR>(others.owner()));
     show();
     hook_.reset();
     wait_until_closed();
-    if (handle() != nullptr) ShowWindow(handle(), SW_HIDE);
   }
 
   [[nodiscard]] bool is_open() const override { return !is_closed(); }
@@ -112,7 +115,7 @@ class FormWindow final : public TopWindow, public FormView {
   void close(CloseMode mode) override {
     if (is_closed()) return;
     end_showing(mode);
-    // A modal window is hidden by `show_modal`.
+    // A modal window is hidden when `show_modal` ends.
     if (!is_modal_) destroy();
   }
 
@@ -142,7 +145,7 @@ class FormWindow final : public TopWindow, public FormView {
         return 0;
       case WM_CTLCOLORSTATIC:
       case WM_CTLCOLORBTN:
-        return colour_part(reinterpret_cast<HDC>(what));
+        return colour_part(reinterpret_cast<HDC>(what), reinterpret_cast<HWND>(value));
       case WM_ERASEBKGND: {
         if (!brush_) return std::nullopt;
         const RECT inside = inner();
@@ -151,6 +154,10 @@ class FormWindow final : public TopWindow, public FormView {
       }
       case WM_SIZE:
         layout_->follow();
+        return 0;
+      case wm_dpi_changed:
+        layout_->set_dots(LOWORD(what), *reinterpret_cast<const RECT*>(value));
+        InvalidateRect(handle(), nullptr, TRUE);
         return 0;
       case WM_GETMINMAXINFO:
         if (layout_->smallest().cx == 0) return std::nullopt;
@@ -162,6 +169,10 @@ class FormWindow final : public TopWindow, public FormView {
       case WM_SETFOCUS:
         keys_->return_focus();
         return 0;
+      case WM_SYSCOMMAND:
+        // The lowest four bits are the system's own.
+        if ((what & 0xFFF0U) == SC_CLOSE && is_kept_open_) return 0;
+        return std::nullopt;
       case WM_CLOSE:
         close(CloseMode::control_menu);
         return 0;
@@ -212,7 +223,13 @@ class FormWindow final : public TopWindow, public FormView {
     return 0;
   }
 
-  [[nodiscard]] std::optional<LRESULT> colour_part(HDC device) const {
+  [[nodiscard]] std::optional<LRESULT> colour_part(HDC device, HWND control) {
+    // A label on the page of a tab, which may be white, must not have the buttons' background.
+    const PlacedPart* const placed = parts_->find(control);
+    if (!brush_ && placed != nullptr && placed->is(PartKind::label) && parts_->has_tabs()) {
+      SetBkMode(device, TRANSPARENT);
+      return reinterpret_cast<LRESULT>(GetStockObject(NULL_BRUSH));
+    }
     if (!brush_) return std::nullopt;
     SetBkMode(device, TRANSPARENT);
     SetTextColor(device, readable_on(colour_));
@@ -231,6 +248,7 @@ class FormWindow final : public TopWindow, public FormView {
   COLORREF colour_ = 0;
   bool is_shown_ = false;
   bool is_modal_ = false;
+  bool is_kept_open_ = false;
 };
 
 }  // namespace

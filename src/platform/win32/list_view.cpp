@@ -77,6 +77,7 @@ void ListView::draw_bar(HDC device, std::int32_t row) const {
   send(window_, LVM_GETSUBITEMRECT, row, &place);
   FillRect(device, &place, GetSysColorBrush(COLOR_WINDOW));
   if (text.empty()) return;
+  const RECT cell = place;
   InflateRect(&place, -3, -2);
   FrameRect(device, &place, GetSysColorBrush(COLOR_BTNSHADOW));
   InflateRect(&place, -1, -1);
@@ -84,18 +85,19 @@ void ListView::draw_bar(HDC device, std::int32_t row) const {
   RECT bar = place;
   bar.right = bar.left + std::lround(static_cast<double>(place.right - place.left) *
                                      std::min(leading_number(text), whole) / whole);
-  const auto draw_text = [&](const RECT& part, int colour) {
+  // The text may be higher than the bar, and lies across both its parts in their colours.
+  const auto draw_text = [&](LONG left, LONG right, int colour) {
     const Owned<kind::SavedState> saved = save_state(device);
-    IntersectClipRect(device, static_cast<int>(part.left), static_cast<int>(part.top), static_cast<int>(part.right),
-                      static_cast<int>(part.bottom));
+    IntersectClipRect(device, static_cast<int>(left), static_cast<int>(cell.top), static_cast<int>(right),
+                      static_cast<int>(cell.bottom));
     SetBkMode(device, TRANSPARENT);
     SetTextColor(device, GetSysColor(colour));
-    RECT whole_place = place;
-    DrawTextW(device, wide(text), -1, &whole_place, DT_CENTER | DT_VCENTER | DT_SINGLELINE | DT_NOPREFIX);
+    RECT whole_cell = cell;
+    DrawTextW(device, wide(text), -1, &whole_cell, DT_CENTER | DT_VCENTER | DT_SINGLELINE | DT_NOPREFIX);
   };
   FillRect(device, &bar, GetSysColorBrush(COLOR_HIGHLIGHT));
-  draw_text(bar, COLOR_HIGHLIGHTTEXT);
-  draw_text({bar.right, place.top, place.right, place.bottom}, COLOR_WINDOWTEXT);
+  draw_text(bar.left, bar.right, COLOR_HIGHLIGHTTEXT);
+  draw_text(bar.right, place.right, COLOR_WINDOWTEXT);
 }
 
 std::optional<LRESULT> ListView::answer(NMHDR& notice) const {

@@ -16,6 +16,11 @@ class ListView {
   /// @param bar_column a column of percentages to be drawn as bars; -1 for none
   void show(TableSource& table, std::int32_t bar_column);
 
+  /// Scales the columns after the window has come to a monitor with other dots per inch.
+  void follow_dots() {
+    if (table_ != nullptr) show(*table_, bar_column_);
+  }
+
   /// The window is about to close; notifies the table.
   void close();
 

@@ -12,11 +12,12 @@ namespace talutil::win32 {
 
 namespace {
 
-// In pixels.
-constexpr int line = 24;
-constexpr int largest = 1 << 20;
-constexpr int gap = 12;
-constexpr int shadow = 4;
+// In pixels at 96 dots per inch.
+constexpr int usual_line = 24;
+constexpr int usual_gap = 12;
+constexpr int usual_shadow = 4;
+
+constexpr int largest = 1 << 20;  ///< In pixels: more than any page has.
 
 }  // namespace
 
@@ -34,6 +35,7 @@ void PagesWindow::show() {
 }
 
 bool PagesWindow::take_key(WPARAM key) {
+  const int line = scaled(usual_line, handle());
   switch (key) {
     case VK_NEXT:
       events_.chosen(PreviewMenu::mnuNext);
@@ -63,7 +65,7 @@ void PagesWindow::wheel(WPARAM what) {
   if ((LOWORD(what) & MK_CONTROL) != 0)
     events_.zoom_step(distance > 0);
   else
-    scroll_by(vertical_, -distance * 3 * line / WHEEL_DELTA);
+    scroll_by(vertical_, -distance * 3 * scaled(usual_line, handle()) / WHEEL_DELTA);
 }
 
 double PagesWindow::scale() const {
@@ -73,6 +75,7 @@ double PagesWindow::scale() const {
 void PagesWindow::place_bars() {
   const Page* const shown = page();
   const RECT room = inner();
+  const int gap = scaled(usual_gap, handle());
   const auto place = [&](Bar& bar, std::int32_t twips, LONG pixels) {
     const int size = shown == nullptr ? 0 : static_cast<int>(std::lround(twips * scale())) + 2 * gap;
     bar.last = std::max(0, size - static_cast<int>(pixels));
@@ -100,6 +103,7 @@ void PagesWindow::scroll(Bar& bar, WORD what) {
   SCROLLINFO information{sizeof information, SIF_ALL, 0, 0, 0, 0, 0};
   GetScrollInfo(handle(), bar.direction, &information);
   const auto room = static_cast<int>(information.nPage);
+  const int line = scaled(usual_line, handle());
   switch (what) {
     case SB_LINEUP:
       return scroll_by(bar, -line);
@@ -126,6 +130,8 @@ void PagesWindow::draw(HDC device, const RECT& room) const {
   const Page* const shown = page();
   if (shown == nullptr) return;
   const double pixels = scale();
+  const int gap = scaled(usual_gap, handle());
+  const int shadow = scaled(usual_shadow, handle());
   const auto to_pixels = [pixels](std::int32_t twips) { return static_cast<int>(std::lround(twips * pixels)); };
   const int width = to_pixels(shown->width);
   const int height = to_pixels(shown->height);

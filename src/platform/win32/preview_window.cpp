@@ -3,6 +3,7 @@
 #include <cmath>
 
 #include "automation/run_time_error.hpp"
+#include "platform/win32/modality.hpp"
 #include "platform/win32/pages_window.hpp"
 #include "platform/win32/win32_platform.hpp"
 
@@ -37,6 +38,7 @@ class PreviewWindow final : public TopWindow, public PreviewView {
   PreviewWindow(PreviewEvents& events, const PreviewPages* pages)
       : TopWindow(L"TALUtilPreview", COLOR_APPWORKSPACE), events_(events) {
     constexpr DWORD style = WS_OVERLAPPEDWINDOW | WS_CLIPCHILDREN;
+    // In pixels at 96 dots per inch.
     constexpr int usual_width = 800;
     constexpr int usual_height = 600;
     make(style, 0, nullptr, L"", make_menu());
@@ -46,7 +48,7 @@ class PreviewWindow final : public TopWindow, public PreviewView {
       has_desktop_ = false;
     }
     if (handle() == nullptr) raise(ErrorNumber::internal_error);
-    resize(usual_width, usual_height);
+    resize(scaled(usual_width, handle()), scaled(usual_height, handle()));
     pages_.emplace(handle(), events, pages);
     attach();
   }
@@ -88,13 +90,12 @@ class PreviewWindow final : public TopWindow, public PreviewView {
     if (!has_desktop_) throw RunTimeError(ErrorNumber::action_not_supported, Text(no_screen));
     const WaitingWindows others(handle());
     is_shown_ = true;
-    ShowWindow(handle(), command());
+    show_window(handle(), command());
     SetForegroundWindow(handle());
     events_.resized();
     events_.activated();
     pages_->show();
     wait_until_closed();
-    ShowWindow(handle(), SW_HIDE);
   }
 
   void close() override {
@@ -107,18 +108,31 @@ class PreviewWindow final : public TopWindow, public PreviewView {
  protected:
   void close_by_code() override { close(); }
 
-  std::optional<LRESULT> answer(UINT message, WPARAM what, LPARAM /*value*/) override {
+  std::optional<LRESULT> answer(UINT message, WPARAM what, LPARAM value) override {
     switch (message) {
       case WM_COMMAND:
         if (LOWORD(what) < first_command) return std::nullopt;
         events_.chosen(static_cast<PreviewMenu>(LOWORD(what) - first_command));
         return 0;
+      // Keys with Alt come as messages of their own; Alt alone, and F10, open the menus.
+      case WM_SYSKEYDOWN:
+        if (what == VK_MENU || what == VK_F10 || what == VK_F4) return std::nullopt;
+        if (!is_our_key(what)) return std::nullopt;
+        [[fallthrough]];
       case WM_KEYDOWN:
         if (!pages_->take_key(what)) events_.key_down(static_cast<std::int32_t>(what));
         return 0;
       case WM_MOUSEWHEEL:
         pages_->wheel(what);
         return 0;
+      case wm_dpi_changed: {
+        const RECT& place = *reinterpret_cast<const RECT*>(value);
+        SetWindowPos(handle(), nullptr, static_cast<int>(place.left), static_cast<int>(place.top),
+                     static_cast<int>(place.right - place.left), static_cast<int>(place.bottom - place.top),
+                     SWP_NOZORDER | SWP_NOACTIVATE);
+        pages_->show();
+        return 0;
+      }
       case WM_SIZE:
         if (is_shown_) events_.resized();
         return 0;
@@ -151,6 +165,10 @@ class PreviewWindow final : public TopWindow, public PreviewView {
     constexpr LONG most = 32000;
     SetWindowPos(handle(), nullptr, 0, 0, static_cast<int>(std::clamp<LONG>(width, 0, most)),
                  static_cast<int>(std::clamp<LONG>(height, 0, most)), SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE);
+  }
+
+  [[nodiscard]] static bool is_our_key(WPARAM key) noexcept {
+    return key == VK_F2 || key == VK_F3 || key == VK_F9 || key == VK_ESCAPE;
   }
 
   PreviewEvents& events_;

@@ -1,13 +1,12 @@
 #include "platform/win32/system_font.hpp"
 
+#include "platform/win32/dots.hpp"
+
 namespace talutil::win32 {
 
-SystemFont::SystemFont() {
-  NONCLIENTMETRICSW metrics{};
-  metrics.cbSize = sizeof metrics;
-  if (SystemParametersInfoW(SPI_GETNONCLIENTMETRICS, sizeof metrics, &metrics, 0) != FALSE) {
-    font_.reset(CreateFontIndirectW(&metrics.lfMessageFont));
-  }
+SystemFont::SystemFont(int dots) {
+  const NONCLIENTMETRICSW metrics = window_metrics(dots);
+  font_.reset(CreateFontIndirectW(&metrics.lfMessageFont));
   const Owned<kind::WindowDevice> context = device_of(nullptr);
   const Owned<kind::Selection> selected = select(context.get(), get());
   constexpr wchar_t letters[] = L"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz";

@@ -7,7 +7,8 @@ namespace talutil::win32 {
 /// The system's font for windows, with the sizes on which dialog units are based.
 class SystemFont {
  public:
-  SystemFont();
+  /// The font at a number of dots per inch.
+  explicit SystemFont(int dots);
 
   [[nodiscard]] HGDIOBJ get() const noexcept { return font_ ? font_.get() : GetStockObject(DEFAULT_GUI_FONT); }
 

@@ -4,6 +4,7 @@
 
 #include "automation/run_time_error.hpp"
 #include "platform/win32/handle.hpp"
+#include "platform/win32/visual_styles.hpp"
 // After windows.h.
 #include <cderr.h>
 #include <commdlg.h>
@@ -48,6 +49,7 @@ std::optional<ChosenFile> Win32FileDialogs::choose(const FileDialog& dialog) {
   native.lpstrTitle = dialog.title.empty() ? nullptr : wide(dialog.title);
   native.lpstrDefExt = dialog.default_extension.empty() ? nullptr : wide(dialog.default_extension);
   native.Flags = (static_cast<std::uint32_t>(dialog.flags) & ~unusable_flags) | OFN_EXPLORER | OFN_NOCHANGEDIR;
+  const VisualStyles styles;
   if (show(&native) == FALSE) {
     if (last_error() == FNERR_INVALIDFILENAME) raise(ErrorNumber::bad_file_name_or_number);
     return std::nullopt;

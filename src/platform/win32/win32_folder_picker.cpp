@@ -2,6 +2,8 @@
 
 #include "automation/run_time_error.hpp"
 #include "platform/win32/handle.hpp"
+#include "platform/win32/modality.hpp"
+#include "platform/win32/visual_styles.hpp"
 // After windows.h.
 #include <shlobj.h>
 
@@ -27,6 +29,9 @@ std::optional<Text> Win32FolderPicker::choose(TextView title, std::intptr_t owne
   BROWSEINFOW dialog{};
   dialog.hwndOwner = reinterpret_cast<HWND>(owner);  // NOLINT(performance-no-int-to-ptr): the seam passes integers.
   dialog.lpszTitle = wide(caption);
+  // Its owner is a hidden window, so that the others would stay usable.
+  const WaitingWindows others(nullptr);
+  const VisualStyles styles;
   const Owned<ItemList> items(browse(&dialog));
   if (!items) return std::nullopt;
   // Blanks, which remain if the chosen item is not a folder of the file system.

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "automation/run_time_error.hpp"
+#include "platform/win32/visual_styles.hpp"
 #include "platform/win32/windows.hpp"
 
 namespace talutil::win32 {
@@ -108,6 +109,7 @@ std::optional<Text> Win32InputBoxes::ask(TextView prompt, TextView title, Entry 
   box.add_item(WS_TABSTOP | BS_DEFPUSHBUTTON, {buttons_left, margin, button_width, 14}, IDOK, button_class, u"OK");
   box.add_item(WS_TABSTOP, {buttons_left, margin + 17, button_width, 14}, IDCANCEL, button_class, u"Cancel");
   Text answer;
+  const VisualStyles styles;
   const INT_PTR end = DialogBoxIndirectParamW(GetModuleHandleW(nullptr), box.get(), GetActiveWindow(), &handle,
                                               reinterpret_cast<LPARAM>(&answer));
   return end == IDOK ? std::optional(std::move(answer)) : std::nullopt;

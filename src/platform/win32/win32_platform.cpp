@@ -5,6 +5,7 @@
 #include "automation/run_time_error.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/module_path.hpp"
+#include "platform/win32/visual_styles.hpp"
 
 namespace talutil::win32 {
 
@@ -69,8 +70,12 @@ char16_t user_character(LCTYPE setting, char16_t otherwise) {
 
 MessageAnswer Win32MessageBoxes::show(TextView text, MessageButtons buttons, TextView title) {
   const Text caption = title.empty() ? host_title() : Text(title);
-  const UINT style = buttons == MessageButtons::ok ? MB_OK : MB_YESNO;
-  switch (MessageBoxW(GetActiveWindow(), wide(Text(text)), wide(caption), style | MB_TASKMODAL)) {
+  const HWND owner = GetActiveWindow();
+  UINT style = (buttons == MessageButtons::ok ? MB_OK : MB_YESNO) | MB_TASKMODAL;
+  // Scripts have no window whose place in front the box could take.
+  if (owner == nullptr) style |= MB_SETFOREGROUND;
+  const VisualStyles styles;
+  switch (MessageBoxW(owner, wide(Text(text)), wide(caption), style)) {
     case IDOK:
       return MessageAnswer::ok;
     case IDYES:

@@ -1,5 +1,7 @@
 #include "platform/win32/window.hpp"
 
+#include "platform/win32/visual_styles.hpp"
+
 namespace talutil::win32 {
 
 namespace {
@@ -10,19 +12,7 @@ HICON host_icon() {
   return icon != nullptr ? icon : LoadIconW(nullptr, IDI_APPLICATION);
 }
 
-BOOL CALLBACK collect(HWND found, LPARAM list) {
-  if (IsWindowVisible(found) != FALSE && IsWindowEnabled(found) != FALSE) {
-    reinterpret_cast<std::vector<HWND>*>(list)->push_back(found);
-  }
-  return TRUE;
-}
-
 }  // namespace
-
-int dots_per_inch(HWND window) {
-  const Owned<kind::WindowDevice> device = device_of(window);
-  return GetDeviceCaps(device.get(), LOGPIXELSX);
-}
 
 OwnWindow::OwnWindow(const wchar_t* class_name, int background) : class_name_(class_name), class_(class_name) {
   WNDCLASSW description{};
@@ -46,6 +36,7 @@ OwnWindow* OwnWindow::of(HWND window) noexcept {
 }
 
 void OwnWindow::make(DWORD style, DWORD extended_style, HWND parent, const wchar_t* caption, Owned<kind::Menu> menu) {
+  const VisualStyles styles;
   window_.reset(CreateWindowExW(extended_style, class_name_, caption, style, CW_USEDEFAULT, CW_USEDEFAULT, 0, 0, parent,
                                 menu.get(), own_module(), nullptr));
   // A window destroys its menu itself.
@@ -100,17 +91,5 @@ void TopWindow::wait_until_closed() {
 }
 
 void TopWindow::wake() noexcept { PostThreadMessageW(GetCurrentThreadId(), WM_NULL, 0, 0); }
-
-WaitingWindows::WaitingWindows(HWND window) : owner_(GetActiveWindow()) {
-  if (owner_ == window) owner_ = nullptr;
-  EnumThreadWindows(GetCurrentThreadId(), &collect, reinterpret_cast<LPARAM>(&windows_));
-  std::erase(windows_, window);
-  for (const HWND other : windows_) EnableWindow(other, FALSE);
-}
-
-WaitingWindows::~WaitingWindows() {
-  for (const HWND other : windows_) EnableWindow(other, TRUE);
-  if (owner_ != nullptr) SetForegroundWindow(owner_);
-}
 
 }  // namespace talutil::win32

@@ -1,8 +1,8 @@
 #pragma once
 
 #include <optional>
-#include <vector>
 
+#include "platform/win32/dots.hpp"
 #include "platform/win32/handle.hpp"
 
 /// What our windows share: a class, a procedure, and, for top-level windows, waiting until one is closed.
@@ -19,8 +19,6 @@ struct WindowClass {
 };
 
 }  // namespace kind
-
-[[nodiscard]] int dots_per_inch(HWND window);
 
 /// A window whose messages are handled by this object while both exist. Several windows may share a class; the last one
 /// unregisters it.
@@ -90,22 +88,6 @@ class TopWindow : public OwnWindow {
 
  private:
   bool is_closed_ = false;
-};
-
-/// Disables the other windows of this thread while a modal window is shown.
-class WaitingWindows {
- public:
-  explicit WaitingWindows(HWND window);
-  WaitingWindows(const WaitingWindows&) = delete;
-  WaitingWindows& operator=(const WaitingWindows&) = delete;
-  ~WaitingWindows();
-
-  /// The window that was active before; null if none was.
-  [[nodiscard]] HWND owner() const noexcept { return owner_; }
-
- private:
-  HWND owner_;
-  std::vector<HWND> windows_;
 };
 
 }  // namespace talutil::win32
