@@ -6,6 +6,7 @@
 #include "automation/numbers.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/last_error.hpp"
+#include "platform/win32/windows_version.hpp"
 
 namespace talutil::win32 {
 
@@ -31,21 +32,67 @@ Text kind_of(const Text& root) {
   }
 }
 
-Text registry_text(const wchar_t* key, const wchar_t* value) {
+/// A key of the machine as 64-bit programs see it: to others the system shows values of its own.
+Owned<kind::RegistryKey> machine_key(const wchar_t* path) {
+  Owned<kind::RegistryKey> key;
+  RegOpenKeyExW(HKEY_LOCAL_MACHINE, path, 0, KEY_QUERY_VALUE | KEY_WOW64_64KEY, key.receive());
+  return key;
+}
+
+Text text_of(const Owned<kind::RegistryKey>& key, const wchar_t* value) {
   std::array<wchar_t, 256> text{};
   DWORD size = sizeof text - sizeof(wchar_t);
-  if (RegGetValueW(HKEY_LOCAL_MACHINE, key, value, RRF_RT_REG_SZ, nullptr, text.data(), &size) != ERROR_SUCCESS) {
-    return {};
-  }
+  if (RegGetValueW(key.get(), nullptr, value, RRF_RT_REG_SZ, nullptr, text.data(), &size) != ERROR_SUCCESS) return {};
   return Text(trim_blanks(up_to_nul(view(text.data(), text.size()))));
 }
 
-std::int32_t registry_number(const wchar_t* key, const wchar_t* value) {
+std::int32_t number_of(const Owned<kind::RegistryKey>& key, const wchar_t* value) {
   DWORD number = 0;
   DWORD size = sizeof number;
-  RegGetValueW(HKEY_LOCAL_MACHINE, key, value, RRF_RT_REG_DWORD, nullptr, &number, &size);
+  RegGetValueW(key.get(), nullptr, value, RRF_RT_REG_DWORD, nullptr, &number, &size);
   return static_cast<std::int32_t>(number);
 }
+
+/// The machine's own architecture, also where it emulates this program's.
+WORD native_architecture() {
+  using Ask = BOOL(WINAPI*)(HANDLE, USHORT*, USHORT*);
+  constexpr USHORT arm64 = 0xAA64;  // IMAGE_FILE_MACHINE_ARM64
+  USHORT process = 0;
+  USHORT machine = 0;
+  const auto ask = late_function<Ask>(L"kernel32.dll", "IsWow64Process2");
+  if (ask != nullptr && ask(GetCurrentProcess(), &process, &machine) != FALSE && machine == arm64) {
+    return PROCESSOR_ARCHITECTURE_ARM64;
+  }
+  SYSTEM_INFO system{};
+  GetNativeSystemInfo(&system);
+  return system.wProcessorArchitecture;
+}
+
+/// Adds up the page files; the other figures of the system count memory as well.
+struct PageFiles {
+  std::uint64_t total = 0;
+  std::uint64_t used = 0;
+
+  PageFiles() {
+    struct File {  // ENUM_PAGE_FILE_INFORMATION
+      DWORD size, reserved;
+      SIZE_T total, used, most_used;
+    };
+    using Add = BOOL(CALLBACK*)(void*, File*, const wchar_t*);
+    const auto enumerate = late_function<BOOL(WINAPI*)(Add, void*)>(L"psapi.dll", "EnumPageFilesW");
+    if (enumerate == nullptr) return;
+    const Add add = [](void* sums, File* file, const wchar_t* /*name*/) -> BOOL {
+      static_cast<PageFiles*>(sums)->total += file->total;
+      static_cast<PageFiles*>(sums)->used += file->used;
+      return TRUE;
+    };
+    enumerate(add, this);
+    SYSTEM_INFO system{};
+    GetSystemInfo(&system);
+    total *= system.dwPageSize;
+    used *= system.dwPageSize;
+  }
+};
 
 Text architecture_words(WORD architecture) {
   switch (architecture) {
@@ -61,10 +108,11 @@ Text architecture_words(WORD architecture) {
 }
 
 std::optional<Date> local_date(const FILETIME& time) {
-  FILETIME local{};
+  SYSTEMTIME utc{};
   SYSTEMTIME parts{};
-  if ((time.dwLowDateTime | time.dwHighDateTime) == 0 || FileTimeToLocalFileTime(&time, &local) == FALSE ||
-      FileTimeToSystemTime(&local, &parts) == FALSE) {
+  // By the daylight saving time of that day, not of today.
+  if ((time.dwLowDateTime | time.dwHighDateTime) == 0 || FileTimeToSystemTime(&time, &utc) == FALSE ||
+      SystemTimeToTzSpecificLocalTime(nullptr, &utc, &parts) == FALSE) {
     return std::nullopt;
   }
   return date_from_parts({parts.wYear, parts.wMonth, parts.wDay, parts.wHour, parts.wMinute, parts.wSecond});
@@ -75,7 +123,8 @@ std::optional<Date> local_date(const FILETIME& time) {
 std::vector<DriveFacts> Win32Machine::drives() {
   std::vector<DriveFacts> drives;
   // Suppresses the box that asks for a disk to be inserted.
-  const UINT before = SetErrorMode(SEM_FAILCRITICALERRORS);
+  DWORD before = 0;
+  SetThreadErrorMode(SEM_FAILCRITICALERRORS, &before);
   const DWORD present = GetLogicalDrives();
   for (int letter = 0; letter < 26; ++letter) {
     if ((present >> letter & 1) == 0) continue;
@@ -97,7 +146,7 @@ std::vector<DriveFacts> Win32Machine::drives() {
     drive.total = total.QuadPart;
     drive.free = available.QuadPart;
   }
-  SetErrorMode(before);
+  SetThreadErrorMode(before, nullptr);
   return drives;
 }
 
@@ -105,17 +154,16 @@ MemoryFacts Win32Machine::memory() {
   MEMORYSTATUSEX status{};
   status.dwLength = sizeof status;
   GlobalMemoryStatusEx(&status);
-  // The platform includes physical memory in its page file figures.
-  const auto beyond = [](DWORDLONG pages, DWORDLONG memory) { return pages - std::min(pages, memory); };
-  return {status.ullTotalPhys, status.ullAvailPhys, beyond(status.ullTotalPageFile, status.ullTotalPhys),
-          beyond(status.ullAvailPageFile, status.ullAvailPhys)};
+  const PageFiles files;
+  return {status.ullTotalPhys, status.ullAvailPhys, files.total, files.total - std::min(files.total, files.used)};
 }
 
 ProcessorFacts Win32Machine::processor() {
   SYSTEM_INFO system{};
   GetNativeSystemInfo(&system);
-  return {registry_text(processor_key, L"ProcessorNameString"), architecture_words(system.wProcessorArchitecture),
-          static_cast<std::int32_t>(system.dwNumberOfProcessors), registry_number(processor_key, L"~MHz")};
+  const Owned<kind::RegistryKey> key = machine_key(processor_key);
+  return {text_of(key, L"ProcessorNameString"), architecture_words(native_architecture()),
+          static_cast<std::int32_t>(system.dwNumberOfProcessors), number_of(key, L"~MHz")};
 }
 
 OperatingSystemFacts Win32Machine::operating_system() {
@@ -127,14 +175,17 @@ OperatingSystemFacts Win32Machine::operating_system() {
   GetUserNameW(user.data(), &user_size);
   std::array<wchar_t, MAX_PATH> folder{};
   GetWindowsDirectoryW(folder.data(), static_cast<UINT>(folder.size()));
-  Text version = registry_text(system_key, L"CurrentVersion");
-  if (const Text build = registry_text(system_key, L"CurrentBuildNumber"); !build.empty())
-    version += u", build " + build;
-  if (const Text service_pack = registry_text(system_key, L"CSDVersion"); !service_pack.empty()) {
-    version += u", " + service_pack;
-  }
-  return {registry_text(system_key, L"ProductName"),
-          version,
+  const Owned<kind::RegistryKey> key = machine_key(system_key);
+  const RegisteredVersion registered{.product = text_of(key, L"ProductName"),
+                                     .version = text_of(key, L"CurrentVersion"),
+                                     .major = number_of(key, L"CurrentMajorVersionNumber"),
+                                     .minor = number_of(key, L"CurrentMinorVersionNumber"),
+                                     .build = text_of(key, L"CurrentBuildNumber"),
+                                     .revision = number_of(key, L"UBR"),
+                                     .release = text_of(key, L"DisplayVersion"),
+                                     .service_pack = text_of(key, L"CSDVersion")};
+  return {windows_name(registered),
+          windows_version(registered),
           Text(up_to_nul(view(computer.data(), computer.size()))),
           Text(up_to_nul(view(user.data(), user.size()))),
           Text(up_to_nul(view(folder.data(), folder.size()))),

@@ -1,10 +1,14 @@
 #include "platform/win32/win32_printers.hpp"
 
 #include <algorithm>
+#include <string>
+#include <vector>
 
 #include "automation/run_time_error.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/page_renderer.hpp"
+#include "platform/win32/visual_styles.hpp"
+#include "platform/win32/wait_pointer.hpp"
 // After windows.h.
 #include <cderr.h>
 #include <commdlg.h>
@@ -35,6 +39,8 @@ class PrintDialog {
     const Owned<kind::LockedMemory> locked = lock(mode_.get());
     if (!locked) return;
     auto* const mode = static_cast<DEVMODEW*>(locked.get());
+    // Many drivers prefer a form's name, or its lengths, to the number of the paper.
+    mode->dmFields &= ~DWORD{DM_FORMNAME | DM_PAPERLENGTH | DM_PAPERWIDTH};
     mode->dmFields |= DM_ORIENTATION | DM_PAPERSIZE;
     mode->dmOrientation = settings.orientation == 1 ? DMORIENT_LANDSCAPE : DMORIENT_PORTRAIT;
     mode->dmPaperSize = static_cast<short>(settings.paper_size);
@@ -42,6 +48,7 @@ class PrintDialog {
       mode->dmFields |= DM_DUPLEX;
       mode->dmDuplex = static_cast<short>(settings.duplex);
     }
+    let_driver_adjust(*mode);
   }
 
   /// Lets the user choose the pages. Returns false if the dialog is cancelled.
@@ -51,7 +58,9 @@ class PrintDialog {
     native_.nMaxPage = native_.nToPage = static_cast<WORD>(std::min<std::size_t>(pages, 0xFFFF));
     native_.nCopies = 1;
     if (show()) return true;
-    if (last_error_() != 0) raise_printer_error(u"the printer dialog failed");
+    const DWORD reason = last_error_();
+    // Left over from the search for a default printer on some systems; the dialog itself was cancelled.
+    if (reason != 0 && reason != PDERR_NODEFAULTPRN) raise_printer_error(u"the printer dialog failed");
     return false;
   }
 
@@ -79,10 +88,34 @@ class PrintDialog {
   using Show = BOOL(WINAPI*)(PRINTDLGW*);
   using LastError = DWORD(WINAPI*)();
 
+  /// Lets the driver make the rest of its settings fit those that were changed (DocumentProperties with DM_IN_BUFFER
+  /// and DM_OUT_BUFFER). If it cannot, they stay as they are.
+  void let_driver_adjust(DEVMODEW& mode) const {
+    using Open = BOOL(WINAPI*)(wchar_t*, HANDLE*, void*);
+    using Close = BOOL(WINAPI*)(HANDLE);
+    using Adjust = LONG(WINAPI*)(HWND, HANDLE, wchar_t*, DEVMODEW*, DEVMODEW*, DWORD);
+    const auto open = late_function<Open>(L"winspool.drv", "OpenPrinterW");
+    const auto close = late_function<Close>(L"winspool.drv", "ClosePrinter");
+    const auto adjust = late_function<Adjust>(L"winspool.drv", "DocumentPropertiesW");
+    const Owned<kind::LockedMemory> locked = lock(names_.get());
+    if (open == nullptr || close == nullptr || adjust == nullptr || !locked) return;
+    const auto* const names = static_cast<const DEVNAMES*>(locked.get());
+    std::wstring device = static_cast<const wchar_t*>(locked.get()) + names->wDeviceOffset;
+    HANDLE printer = nullptr;
+    if (open(device.data(), &printer, nullptr) == FALSE) return;
+    std::vector<BYTE> before(mode.dmSize + mode.dmDriverExtra);
+    std::copy_n(reinterpret_cast<const BYTE*>(&mode), before.size(), before.begin());
+    const LONG answer = adjust(nullptr, printer, device.data(), &mode, reinterpret_cast<DEVMODEW*>(before.data()),
+                               DM_IN_BUFFER | DM_OUT_BUFFER);
+    if (answer != IDOK) std::ranges::copy(before, reinterpret_cast<BYTE*>(&mode));
+    close(printer);
+  }
+
   /// The dialog takes the memory that it returned before, and may return different memory.
   [[nodiscard]] bool show() noexcept {
     native_.hDevMode = mode_.release();
     native_.hDevNames = names_.release();
+    const VisualStyles styles;
     const BOOL is_answered = show_(&native_);
     mode_.reset(native_.hDevMode);
     names_.reset(native_.hDevNames);
@@ -101,14 +134,21 @@ class PrintDialog {
 /// A print job; cancelled unless it is complete.
 class PrintJob {
  public:
-  PrintJob(HDC device, const Text& title) : device_(device) {
-    DOCINFOW information{sizeof information, wide(title), nullptr, nullptr, 0};
-    if (StartDocW(device, &information) <= 0) raise_printer_error(u"the document could not be started");
-  }
+  explicit PrintJob(HDC device) : device_(device) {}
   PrintJob(const PrintJob&) = delete;
   PrintJob& operator=(const PrintJob&) = delete;
   ~PrintJob() {
     if (!is_complete_) AbortDoc(device_);
+  }
+
+  /// Returns false if the user cancels a dialog of the printer's own, such as that of a printer that makes files.
+  [[nodiscard]] bool start(const Text& title) {
+    DOCINFOW information{sizeof information, wide(title), nullptr, nullptr, 0};
+    if (StartDocW(device_, &information) > 0) return true;
+    const DWORD reason = GetLastError();
+    is_complete_ = true;
+    if (reason == ERROR_CANCELLED || reason == ERROR_PRINT_CANCELLED) return false;
+    raise_printer_error(u"the document could not be started");
   }
 
   void add(const Page& page) const {
@@ -130,9 +170,30 @@ class PrintJob {
   bool is_complete_ = false;
 };
 
+/// Whether the user of this program holds Esc, which ends the printing.
+bool is_escape_pressed() noexcept {
+  DWORD process = 0;
+  GetWindowThreadProcessId(GetForegroundWindow(), &process);
+  return process == GetCurrentProcessId() && GetAsyncKeyState(VK_ESCAPE) < 0;
+}
+
+/// Forgets the keys that were pressed while a dialog or the printing kept the user waiting: they would ask for the same
+/// again, or close the window that is behind.
+struct ForgottenKeys {
+  ForgottenKeys() = default;
+  ForgottenKeys(const ForgottenKeys&) = delete;
+  ForgottenKeys& operator=(const ForgottenKeys&) = delete;
+  ~ForgottenKeys() {
+    MSG message;
+    while (PeekMessageW(&message, nullptr, WM_KEYFIRST, WM_KEYLAST, PM_REMOVE) != FALSE) {
+    }
+  }
+};
+
 }  // namespace
 
 bool Win32Printers::print(const Document& document, const PrintSettings& settings) {
+  const ForgottenKeys keys;
   PrintDialog dialog;
   dialog.prepare(settings);
   if (!settings.shows_dialog)
@@ -140,9 +201,14 @@ bool Win32Printers::print(const Document& document, const PrintSettings& setting
   else if (!dialog.ask(document.pages.size()))
     return false;
   if (dialog.device() == nullptr) raise_printer_error(u"the printer does not answer");
-  PrintJob job(dialog.device(), settings.title);
+  PrintJob job(dialog.device());
+  if (!job.start(settings.title)) return false;
+  const WaitPointer waiting;
   const auto [first, end] = dialog.range(document.pages.size());
-  for (std::size_t page = first; page < end; ++page) job.add(document.pages[page]);
+  for (std::size_t page = first; page < end; ++page) {
+    if (is_escape_pressed()) return false;
+    job.add(document.pages[page]);
+  }
   job.complete();
   return true;
 }
