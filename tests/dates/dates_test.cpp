@@ -1,11 +1,11 @@
 #include "dates/week_tables.hpp"
+#include "tests/fakes/late_members.hpp"
 #include "tests/fakes/recording_control.hpp"
-#include "tests/library/answers.hpp"
 
 namespace talutil::testing {
 namespace {
 
-using DateMembers = AnsweringMembers;
+using DateMembers = LateMembers;
 
 // clang-format off
 TEST_F(DateMembers, Calendar) {

@@ -9,12 +9,12 @@
 
 namespace talutil::testing {
 
-/// A call as a table writes it: a member, its arguments parted by "|", where "@null", "@empty", "@missing" and "@error"
-/// are those values, "#5/3/2009#" a date, "=1.5" a number and everything else a text, and the answer, which is the
-/// result in the same form and then each argument that was written back.
-struct LateRow {
-  TextView member, arguments;
-  std::string_view answer;
+/// A member, and what it answers to arguments. Those are parted by "|", where "@null", "@empty", "@missing" and
+/// "@error" are those values, "#5/3/2009#" a date, "=1.5" a number and everything else a text; the answer is the result
+/// in the same form and then each argument that was written back.
+struct Answers {
+  TextView member;
+  std::vector<std::pair<TextView, std::string_view>> rows;
 };
 
 inline Variant late_value(TextView written) {
@@ -63,9 +63,11 @@ class LateMembers : public UtilsTest {
     return members.call(static_cast<ORVUtils*>(&utils), slot, arguments, utils.locale());
   }
 
-  void check(std::span<const LateRow> rows) {
-    for (const auto& [member, arguments, answer] : rows) {
-      EXPECT_EQ(call(member, arguments), answer) << to_utf8(member) << '(' << to_utf8(arguments) << ')';
+  void check(const std::vector<Answers>& members) {
+    for (const auto& [member, rows] : members) {
+      for (const auto& [arguments, answer] : rows) {
+        EXPECT_EQ(call(member, arguments), answer) << to_utf8(member) << '(' << to_utf8(arguments) << ')';
+      }
     }
   }
 };

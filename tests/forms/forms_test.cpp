@@ -1,8 +1,8 @@
 #include <gmock/gmock.h>
 
 #include "library/c_control_position.hpp"
+#include "tests/fakes/late_members.hpp"
 #include "tests/fakes/recording_control.hpp"
-#include "tests/library/answers.hpp"
 
 namespace talutil {
 
@@ -14,7 +14,7 @@ using ::testing::IsEmpty;
 using testing::RecordingControl;
 using Uses = std::vector<std::string>;
 
-struct Forms : testing::AnsweringMembers {
+struct Forms : testing::LateMembers {
   std::shared_ptr<RecordingControl> control = std::make_shared<RecordingControl>();
   Variant holder{ObjectRef(control)};
 

@@ -1,9 +1,9 @@
-#include "tests/library/answers.hpp"
+#include "tests/fakes/late_members.hpp"
 
 namespace talutil::testing {
 namespace {
 
-struct Configuration : AnsweringMembers {
+struct Configuration : LateMembers {
   Configuration() {
     settings.sDatabaseName = u"Main";
     settings.sUserName = u"anne";

@@ -1,9 +1,9 @@
-#include "tests/library/answers.hpp"
+#include "tests/fakes/late_members.hpp"
 
 namespace talutil::testing {
 namespace {
 
-struct FileMembers : AnsweringMembers {
+struct FileMembers : LateMembers {
   std::vector<Text>& calls = platform.files.calls;
 };
 

@@ -1,9 +1,9 @@
-#include "tests/library/answers.hpp"
+#include "tests/fakes/late_members.hpp"
 
 namespace talutil::testing {
 namespace {
 
-using RegistryTest = AnsweringMembers;
+using RegistryTest = LateMembers;
 
 TEST_F(RegistryTest, ReadsTextsAndNumbersOfTheUser) {
   // clang-format off

@@ -1,9 +1,9 @@
-#include "tests/library/answers.hpp"
+#include "tests/fakes/late_members.hpp"
 
 namespace talutil::testing {
 namespace {
 
-struct TextFiles : AnsweringMembers {
+struct TextFiles : LateMembers {
   const Text path = u"C:\\a.txt";
 };
 

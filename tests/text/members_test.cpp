@@ -1,12 +1,12 @@
 // The members for texts and lists: compared with loops over their characters, and the answers that no loop explains.
 #include <algorithm>
 
-#include "tests/library/answers.hpp"
+#include "tests/fakes/late_members.hpp"
 
 namespace talutil::testing {
 namespace {
 
-class TextMembers : public AnsweringMembers {
+class TextMembers : public LateMembers {
  protected:
   /// The characters whose code answers yes.
   template <class Predicate>

@@ -1,12 +1,12 @@
 #include <cmath>
 #include <map>
 
-#include "tests/library/answers.hpp"
+#include "tests/fakes/late_members.hpp"
 
 namespace talutil::testing {
 namespace {
 
-using Passwords = AnsweringMembers;
+using Passwords = LateMembers;
 
 // How often each character follows each other one, against the odds: both ends of a mix have half the weight of the
 // rest, and the one before is left out. A row of k characters has k - 2 degrees of freedom.

@@ -1,13 +1,13 @@
 #include <limits>
 
+#include "tests/fakes/late_members.hpp"
 #include "tests/fakes/recording_control.hpp"
-#include "tests/library/answers.hpp"
 
 namespace talutil::testing {
 namespace {
 
 using namespace std::string_view_literals;
-using Sanitising = AnsweringMembers;
+using Sanitising = LateMembers;
 
 constexpr std::int32_t counter_maximum = std::numeric_limits<std::int32_t>::max();
 
