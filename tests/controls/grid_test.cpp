@@ -211,9 +211,9 @@ TEST_F(Grids, ExportsReadTheGridInOrder) {
                     {"RowSel", 1}};
   platform.chosen_files = {u"C:\\a.txt"};
   utils.ExportGridData(ObjectRef(source), 1, Boolean(true), u"Sales");
-  EXPECT_EQ(source->uses, (std::vector<std::string>{"Cols", "ColHidden(0&)", "ColHidden(1&)", "Rows", "RowHidden(1&)",
-                                                    "RowHidden(2&)", "Cols", "ColHidden(0&)", "ColHidden(1&)",
-                                                    "TextMatrix(2&, 1&)"}));
+  EXPECT_EQ(source->taken_uses(),
+            "Cols|ColHidden(0&)|ColHidden(1&)|Rows|RowHidden(1&)|RowHidden(2&)|Cols|ColHidden(0&)|ColHidden(1&)|"
+            "TextMatrix(2&, 1&)");
   EXPECT_EQ(file(u"C:\\a.txt"), "7\r\n");
   EXPECT_EQ(source->look_ups.size(), 5) << "one a member";
 

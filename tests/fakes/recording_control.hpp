@@ -4,6 +4,7 @@
 #include <functional>
 #include <map>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "automation/run_time_error.hpp"
@@ -44,6 +45,13 @@ class RecordingControl : public Object {
   std::vector<std::string> uses;
   std::vector<std::string> look_ups;
   std::function<void(const std::string& use)> before;  ///< Called before each use, and may throw.
+
+  /// The uses since the last time, with bars between them.
+  std::string taken_uses() {
+    std::string all;
+    for (const std::string& use : std::exchange(uses, {})) all += (all.empty() ? "" : "|") + use;
+    return all;
+  }
 
   std::int32_t member_id(TextView name) override {
     const std::string member = to_utf8(name);
