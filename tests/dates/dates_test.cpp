@@ -186,9 +186,6 @@ TEST_F(DateMembers, SystemTimes) {
   EXPECT_EQ(time, (SystemTime{2009, 3, 77, 5, 13, 45, 30, 88}));
   const Rows<SystemTime, std::string> rows = {
       {"parts as they are", time, "05/03/2009 13:45:30"},
-      {"month 13", SystemTime{2009, 13, 0, 5}, "05/01/2010"},
-      {"month 0", SystemTime{2009, 0, 0, 5}, "05/12/2008"},
-      {"day 0", SystemTime{2009, 3, 0, 0}, "28/02/2009"},
       {"beyond the year 9999 and back", SystemTime{9999, 25, 0, -5033}, "22/03/9987"},
       {"hours beyond the day", SystemTime{2009, 12, 0, 31, 25, -1, 61}, "01/01/2010 01:00:01"},
       {"before day 0", SystemTime{1800, 1, 0, 1, 1, 30}, "01/01/1800 01:30"},
