@@ -13,13 +13,6 @@ namespace talutil::testing {
 constexpr LCID british_english = 0x0809;
 constexpr Locale british{.currency_symbol = {u'\u00A3'}};
 
-inline Variant to_value(Variant value) { return value; }
-inline Variant to_value(BSTR value) {
-  const Text text(win32::view(value, SysStringLen(value)));
-  SysFreeString(value);
-  return text;
-}
-
 /// What a platform function with a result of type T answers; `mismatch` stands for its type mismatch.
 template <class T, class Call>
 std::string platform_outcome(const Call& call, const char* mismatch = "none") {
@@ -27,7 +20,7 @@ std::string platform_outcome(const Call& call, const char* mismatch = "none") {
   const HRESULT status = call(&result);
   if (status == DISP_E_OVERFLOW) return "error 6";
   if (status != S_OK) return status == DISP_E_TYPEMISMATCH ? mismatch : "status " + std::to_string(status);
-  return outcome([&] { return to_value(result); });
+  return outcome([&] { return result; });
 }
 
 /// The headers of this tool chain want texts that may be written, which no conversion does.
