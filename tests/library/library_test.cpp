@@ -87,14 +87,6 @@ TEST_F(LibraryTest, ObjectPropertiesKeepObjectsOfTheirKindUntilTheNextPut) {
   }
 }
 
-TEST_F(LibraryTest, AThirdPartyControlTakesItsPlace) {
-  const auto theirs = std::make_shared<testing::RecordingControl>();
-  theirs->values = {{"#1745027088", u"THEIRS"}};  // It knows its identifiers and nothing else.
-  platform.controls[u"SystemInfoControl.MSysInfo"] = theirs;
-  library.start();
-  EXPECT_EQ(library.settings().ComputerName, u"THEIRS");
-}
-
 TEST_F(LibraryTest, AControlThatFailsLeavesNoHalfWindow) {
   platform.controls[u"DZACTXLibCtl.dzactxctrl"] = nullptr;
   EXPECT_EQ(error_of([&] { library.start(); }), 429) << "one that cannot be made";
@@ -103,23 +95,11 @@ TEST_F(LibraryTest, AControlThatFailsLeavesNoHalfWindow) {
   platform.controls[u"SystemInfoControl.MSysInfo"] = std::make_shared<testing::RecordingControl>();
   EXPECT_EQ(error_of([&] { library.start(); }), 438) << "one without a computer's name";
   EXPECT_EQ(platform.open_windows, 0);
-  platform.controls.clear();
+  const auto theirs = std::make_shared<testing::RecordingControl>();
+  theirs->values = {{"#1745027088", u"THEIRS"}};  // It knows its identifiers and nothing else.
+  platform.controls[u"SystemInfoControl.MSysInfo"] = theirs;
   library.start();
-  EXPECT_EQ(library.settings().ComputerName, u"FAKEPC");
-}
-
-TEST_F(LibraryTest, ControlsOfTheComponentsWindow) {
-  auto& form = dynamic_cast<FrmComponents&>(library.components());
-  EXPECT_EQ(Control(form.control(u"dlgSave2"), plain_numbers).get<Text>(u"dialogtitle"), u"Save Data to File");
-  EXPECT_EQ(Control(form.control(u"dlgSave2"), plain_numbers).get<Text>(u"Filter"),
-            u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");
-  EXPECT_EQ(Control(form.control(u"Open1"), plain_numbers).get<Text>(u"Filter"), u"");
-  EXPECT_EQ(Control(form.control(u"MSysInfo1"), plain_numbers).get<Text>(u"ComputerName"), u"FAKEPC");
-  for (const TextView name : {u"Crypto1", u"Grid1", u"UnZipCtrl", u"ZipCtrl"}) {
-    EXPECT_EQ(error_of([&] { Control(form.control(name), plain_numbers).call(u"Anything"); }), 438) << to_utf8(name);
-  }
-  EXPECT_EQ(error_of([&] { static_cast<void>(form.control(u"Label1")); }), 438);
-  EXPECT_EQ(form.owner_handle(), platform.window_handle);
+  EXPECT_EQ(library.settings().ComputerName, u"THEIRS") << "a third-party control in the place of ours";
 }
 
 TEST_F(LibraryTest, DatabaseErrorReport) {
