@@ -93,9 +93,9 @@ inline Code pack_files(const Text& archive, TextView items, const PackingOptions
 
 inline Code unpack_files(const Text& archive, const Text& destination, const UnpackingOptions& options = {},
                          const PasswordQuestion& ask = {}, Progress progress = Progress()) {
-  const auto folders = real_folders();
-  const auto files = real_files();
-  return code_of([&] { Archive(archive, *folders).extract(destination, options, *folders, *files, ask, progress); });
+  Folders& folders = *real_folders();
+  return code_of(
+      [&] { Archive(archive, folders).extract(destination, options, folders, *real_files(), ask, progress); });
 }
 
 inline Code test_file(const Text& archive, const UnpackingOptions& options = {}, const PasswordQuestion& ask = {}) {

@@ -105,14 +105,6 @@ struct FakePlatform : MessageBoxes,
   Registry* used_registry = &registry;
   Network* used_network = &network;
   CodePage* used_code_page = &code_page;
-  std::vector<std::shared_ptr<void>> kept;
-
-  /// Puts a real part in the place of a fake one, for as long as this platform lives.
-  template <class Part>
-  void use(Part* FakePlatform::*place, std::shared_ptr<std::type_identity_t<Part>> part) {
-    this->*place = part.get();
-    kept.push_back(std::move(part));
-  }
 
   FakePlatform() = default;
   FakePlatform(const FakePlatform&) = delete;

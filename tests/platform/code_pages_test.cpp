@@ -10,7 +10,7 @@ namespace {
 /// A toolkit on a fake platform that has one of the real code pages.
 struct Toolkit {
   explicit Toolkit(std::uint32_t number)
-      : library((platform.use(&FakePlatform::used_code_page, real_code_page(number)), platform.platform())) {}
+      : library((platform.used_code_page = real_code_page(number), platform.platform())) {}
 
   FakePlatform platform;
   Library library;

@@ -29,7 +29,7 @@ class RealFiles : public ::testing::Test {
     return result;
   }
 
-  std::unique_ptr<Files> files = real_files();
+  Files* files = real_files();
   Text folder = scratch_folder();
 };
 

@@ -16,17 +16,16 @@
 /// The platform's own parts, for the tests that hold for both platforms.
 namespace talutil::testing {
 
-[[nodiscard]] std::unique_ptr<Files> real_files();
-[[nodiscard]] std::unique_ptr<Folders> real_folders();
-[[nodiscard]] std::unique_ptr<CodePage> real_code_page(std::uint32_t number);
-[[nodiscard]] std::shared_ptr<Profiles> real_profiles();
-[[nodiscard]] std::shared_ptr<SettingsStore> real_settings_store();
-[[nodiscard]] std::unique_ptr<TimeConversions> real_time_conversions();
+[[nodiscard]] Files* real_files();
+[[nodiscard]] Folders* real_folders();
+[[nodiscard]] CodePage* real_code_page(std::uint32_t number);
+[[nodiscard]] Profiles* real_profiles();
+[[nodiscard]] SettingsStore* real_settings_store();
+[[nodiscard]] TimeConversions* real_time_conversions();
+[[nodiscard]] Network* real_network();
 
 /// Without the user's key "Software\TALUtil\Test".
-[[nodiscard]] std::shared_ptr<Registry> real_registry();
-
-[[nodiscard]] std::unique_ptr<Network> real_network();
+[[nodiscard]] Registry* real_registry();
 
 /// The addresses of this machine by another function of the system, in ascending order.
 [[nodiscard]] std::vector<Text> machine_addresses();
@@ -54,15 +53,13 @@ void set_read_only(const Text& path, bool read_only);
 
 /// The whole of a file, which is put in place at once, or which was there.
 inline void write_bytes(const Text& path, std::string_view bytes) {
-  const auto files = real_files();
-  const auto file = files->open_output(path);
+  const auto file = real_files()->open_output(path);
   file->write(bytes);
   file->close();
 }
 
 inline std::string read_bytes(const Text& path) {
-  const auto files = real_files();
-  const auto file = files->open_input(path);
+  const auto file = real_files()->open_input(path);
   std::string bytes;
   char buffer[5];
   while (const std::size_t count = file->read(buffer)) bytes.append(buffer, count);

@@ -18,8 +18,8 @@ using testing::RecordingControl;
 struct ZipFilesTest : testing::UtilsTest {
   ZipFilesTest()
       : UtilsTest([](auto& fake) {
-          fake.use(&testing::FakePlatform::used_files, testing::real_files());
-          fake.use(&testing::FakePlatform::used_folders, testing::real_folders());
+          fake.used_files = testing::real_files();
+          fake.used_folders = testing::real_folders();
         }) {}
 
   /// A third-party control in the place of ours, whose result is 0.

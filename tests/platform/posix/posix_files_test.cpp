@@ -21,9 +21,8 @@ namespace talutil::testing {
 namespace {
 
 struct PosixFilesTest : ::testing::Test {
-  std::unique_ptr<Files> drives = real_files();
-  posix::PosixFiles files;
   Text folder = scratch_folder();
+  posix::PosixFiles files;
   std::string native = files.native(folder);
 };
 

@@ -13,21 +13,17 @@
 #include <array>
 #include <cstring>
 #include <filesystem>
+#include <map>
 #include <set>
 
 #include "platform/posix/descriptor.hpp"
-#include "platform/posix/posix_code_page.hpp"
-#include "platform/posix/posix_files.hpp"
-#include "platform/posix/posix_folders.hpp"
-#include "platform/posix/posix_registry.hpp"
-#include "platform/posix/posix_settings.hpp"
-#include "platform/posix/posix_time_conversions.hpp"
+#include "platform/posix/posix_platform.hpp"
 
 namespace talutil::testing {
 
 namespace {
 
-/// Drive T: is a temporary folder, removed when the program ends.
+/// Drive T: and the registry are in a temporary folder, removed when the program ends.
 struct TemporaryDrives {
   std::string root = [] {
     std::string pattern = (std::filesystem::temp_directory_path() / "talutil-drives-XXXXXX").string();
@@ -36,6 +32,7 @@ struct TemporaryDrives {
   TemporaryDrives() {
     std::filesystem::create_directory(root + "/t");
     setenv("TALUTIL_DRIVES", root.c_str(), 1);
+    setenv("TALUTIL_HIVE", (root + "/hive.db").c_str(), 1);
   }
   TemporaryDrives(const TemporaryDrives&) = delete;
   TemporaryDrives& operator=(const TemporaryDrives&) = delete;
@@ -44,49 +41,26 @@ struct TemporaryDrives {
 
 std::string native(const Text& path) { return posix::DrivePaths().native(path); }
 
-/// A part with what it lies in, of its own.
-template <class Part, class Base, class... Arguments>
-std::shared_ptr<Part> make_within(const Arguments&... arguments) {
-  struct Both {
-    explicit Both(const Arguments&... given) : base(given...) {}
-    Base base;
-    Part part{base};
-  };
-  const auto both = std::make_shared<Both>(arguments...);
-  return {both, &both->part};
+posix::PosixPlatform& parts() {
+  static const TemporaryDrives drives;
+  static posix::PosixPlatform platform(1252);
+  return platform;
 }
-
-std::string own_hive() { return native(scratch_folder() + u"hive.db"); }
 
 }  // namespace
 
-std::unique_ptr<Files> real_files() {
-  static const TemporaryDrives drives;
-  return std::make_unique<posix::PosixFiles>();
-}
+Files* real_files() { return &parts().files; }
+Folders* real_folders() { return &parts().folders; }
+Profiles* real_profiles() { return &parts().profiles; }
+SettingsStore* real_settings_store() { return &parts().settings_store; }
+TimeConversions* real_time_conversions() { return &parts().time_conversions; }
+Registry* real_registry() { return &parts().registry; }
+Network* real_network() { return &parts().network; }
 
-std::unique_ptr<Folders> real_folders() {
-  static_cast<void>(real_files());  // Makes the drives.
-  return std::make_unique<posix::PosixFolders>();
+CodePage* real_code_page(std::uint32_t number) {
+  static std::map<std::uint32_t, std::unique_ptr<CodePage>> pages;
+  return pages.try_emplace(number, posix::make_code_page(number)).first->second.get();
 }
-
-std::unique_ptr<CodePage> real_code_page(std::uint32_t number) { return posix::make_code_page(number); }
-std::shared_ptr<Profiles> real_profiles() { return make_within<posix::PosixProfiles, posix::PosixFiles>(); }
-std::shared_ptr<Registry> real_registry() {
-  struct Both {
-    posix::Hive hive{own_hive()};
-    WesternCodePage code_page;
-    posix::PosixRegistry registry{hive, code_page};
-  };
-  const auto both = std::make_shared<Both>();
-  return {both, &both->registry};
-}
-std::shared_ptr<SettingsStore> real_settings_store() {
-  return make_within<posix::PosixSettingsStore, posix::Hive>(own_hive());
-}
-std::unique_ptr<TimeConversions> real_time_conversions() { return std::make_unique<posix::PosixTimeConversions>(); }
-
-std::unique_ptr<Network> real_network() { return std::make_unique<posix::PosixNetwork>(); }
 
 std::vector<Text> machine_addresses() {
   std::array<ifreq, 100> interfaces{};

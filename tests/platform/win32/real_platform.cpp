@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <array>
+#include <map>
 
 #include "platform/win32/handle.hpp"
 #include "platform/win32/win32_code_page.hpp"
@@ -14,26 +15,39 @@
 
 namespace talutil::testing {
 
-std::unique_ptr<Files> real_files() {
+namespace {
+
+template <class Part>
+Part* only() {
+  static Part part;
+  return &part;
+}
+
+}  // namespace
+
+Files* real_files() {
   // Deleting is done by an automation object.
   static const HRESULT apartment = CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
   EXPECT_TRUE(SUCCEEDED(apartment));
-  return std::make_unique<win32::Win32Files>();
+  return only<win32::Win32Files>();
 }
 
-std::unique_ptr<Folders> real_folders() { return std::make_unique<win32::Win32Folders>(); }
-std::unique_ptr<CodePage> real_code_page(std::uint32_t page) { return std::make_unique<win32::Win32CodePage>(page); }
-std::shared_ptr<Profiles> real_profiles() { return std::make_unique<win32::Win32Profiles>(); }
-std::shared_ptr<SettingsStore> real_settings_store() { return std::make_unique<win32::Win32SettingsStore>(); }
-std::unique_ptr<TimeConversions> real_time_conversions() { return std::make_unique<win32::Win32TimeConversions>(); }
+Folders* real_folders() { return only<win32::Win32Folders>(); }
+Profiles* real_profiles() { return only<win32::Win32Profiles>(); }
+SettingsStore* real_settings_store() { return only<win32::Win32SettingsStore>(); }
+TimeConversions* real_time_conversions() { return only<win32::Win32TimeConversions>(); }
+Network* real_network() { return only<win32::Win32Network>(); }
 
-std::shared_ptr<Registry> real_registry() {
+Registry* real_registry() {
   RegDeleteKeyW(HKEY_CURRENT_USER, L"Software\\TALUtil\\Test\\Below");
   RegDeleteKeyW(HKEY_CURRENT_USER, L"Software\\TALUtil\\Test");
-  return std::make_unique<win32::Win32Registry>();
+  return only<win32::Win32Registry>();
 }
 
-std::unique_ptr<Network> real_network() { return std::make_unique<win32::Win32Network>(); }
+CodePage* real_code_page(std::uint32_t number) {
+  static std::map<std::uint32_t, win32::Win32CodePage> pages;
+  return &pages.try_emplace(number, number).first->second;
+}
 
 std::vector<Text> machine_addresses() {
   using Function = DWORD(WINAPI*)(void*, ULONG*, BOOL);
