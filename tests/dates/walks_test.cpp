@@ -1,4 +1,6 @@
-// What the members compute directly, compared with the walks that define it, step for step.
+// What the members compute directly, compared with the walks that define it, step for step, and with the calendar.
+#include <chrono>
+
 #include "automation/checked.hpp"
 #include "tests/fakes/utils_test.hpp"
 
@@ -60,34 +62,21 @@ TEST_F(Walks, DaysAndMonthsInAPeriod) {
 }
 
 TEST_F(Walks, DaysAndMonthsLater) {
+  using namespace std::chrono;
   for (int i = 0; i < pairs; ++i) {
     const Date start = any_day();
     const std::int32_t most = generator.whole(0, 99) == 0 ? 32767 : 1200;
     const auto count = static_cast<std::int16_t>(generator.whole(-most, most));
-    const DateParts parts = parts_of(start);
-    const auto length = [this](std::int32_t month, std::int32_t year) {
-      return utils.GetDaysThisMonth(static_cast<std::int16_t>(month), static_cast<std::int16_t>(year));
+    const sys_days first = sys_days(1899y / December / 30) + days(static_cast<int>(start.days));
+    const year_month_day date(first);
+    const auto check = [&](const Variant& later, const year_month_day& expected) {
+      EXPECT_EQ(to_utf8(later.to_text(plain_numbers)),
+                text_of(int(unsigned(expected.day())), int(unsigned(expected.month())), int(expected.year())))
+          << to_utf8(date_to_text(start)) << ' ' << count;
     };
-    std::int32_t day = parts.day;
-    std::int32_t month = parts.month;
-    std::int32_t year = parts.year;
-    const auto month_on = [&] { month < 12 ? ++month : (++year, month = 1); };
-    const auto month_back = [&] { month > 1 ? --month : (--year, month = 12); };
-    for (std::int32_t n = 0; n < count; ++n) {
-      if (++day > length(month, year)) day = 1, month_on();
-    }
-    for (std::int32_t n = 0; n > count; --n) {
-      if (--day < 1) month_back(), day = length(month, year);
-    }
-    EXPECT_EQ(to_utf8(utils.IncDay(start, count).to_text(plain_numbers)), text_of(day, month, year))
-        << to_utf8(date_to_text(start)) << ' ' << count;
-
-    day = parts.day, month = parts.month, year = parts.year;
-    for (std::int32_t n = 0; n < count; ++n) month_on();
-    for (std::int32_t n = 0; n > count; --n) month_back();
-    day = std::min<std::int32_t>(day, length(month, year));
-    EXPECT_EQ(to_utf8(utils.IncMonth(start, count).to_text(plain_numbers)), text_of(day, month, year))
-        << to_utf8(date_to_text(start)) << ' ' << count;
+    check(utils.IncDay(start, count), first + days(count));
+    const year_month month = date.year() / date.month() + months(count);
+    check(utils.IncMonth(start, count), month / std::min(date.day(), (month / last).day()));
   }
 }
 
