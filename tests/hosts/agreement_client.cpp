@@ -1,7 +1,8 @@
 // Calls every member that the type library describes: agreement_client FOLDER [CALLS [SEED]]. First random calls, early
 // and late with the same arguments, of every kind of variant, by value, by reference and in variables, also one
 // variable for two parameters: error, result and everything that was written back must be the same, and memory must
-// stay flat. Then what nobody should send: null pointers, wrong numbers of arguments, and hostile values in each place.
+// stay flat. Then properties, put and got. Then what nobody should send: null pointers, wrong numbers of arguments, and
+// hostile values in each place.
 #include <random>
 
 #include "examples/host/window_objects.hpp"
@@ -72,8 +73,19 @@ std::wstring shown_value(const VARIANT& value) {
 }
 
 /// Values of the typed parameters: usual ones and the ends of their ranges. Those at 2 suit most members.
-constexpr std::wstring_view texts[] = {L"",      L"A",  L"a,b,", L"12",        L" 4 5", L"10/3/2024",       L"9:00",
-                                       L"1.75 ", L"x;", L",",    L"\xD800\0b", L"Name", L"30/12/1899 01:30"};
+constexpr std::wstring_view texts[] = {L"",
+                                       L"A",
+                                       L"a,b,",
+                                       L"12",
+                                       L" 4 5",
+                                       L"10/3/2024",
+                                       L"9:00",
+                                       L"1.75 ",
+                                       L"x;",
+                                       L",",
+                                       {L"\xD800\0b", 3},
+                                       L"Name",
+                                       L"30/12/1899 01:30"};
 constexpr short shorts[] = {0, 1, 2, 3, 4, 5, -1, 12, 60, 2009, 32767, -32768};
 constexpr LONG longs[] = {0, 1, 2, 3, -1, 70000, 2147483647, -2147483647 - 1};
 constexpr double doubles[] = {45361.25, 0, -1.75, 2958465.99, 2, 0.5, 1e300};
@@ -320,6 +332,33 @@ void both_ways_agree(IDispatch* u, unsigned seed, long wanted) {
   DestroyWindow(box);
 }
 
+/// What is put in one way is got in the other, by a second object too where both share one block of settings.
+void properties_keep_what_they_are_given(IDispatch* object, IDispatch* second, bool is_shared) {
+  const std::vector<Slot> slots = slots_of(object);
+  for (const Slot& put : slots) {
+    const auto get = std::ranges::find_if(
+        slots, [&](const Slot& slot) { return slot.kind == INVOKE_PROPERTYGET && slot.name == put.name; });
+    if (put.kind != INVOKE_PROPERTYPUT || get == slots.end()) continue;
+    const Choice nothing(*get);
+    // The last of them switches no box on.
+    for (const std::uint32_t draw : {0U, 20U, 23U, 10U, 5U, 1U}) {
+      Choice choice(put);
+      choice.draws = {draw};
+      Arguments given(choice);
+      Arguments none(nothing);
+      const bool is_early = draw % 2 == 0;
+      const auto got = [&](IDispatch* from) {
+        return shown_value((is_early ? call_late : call_early)(from, *get, none).result.get());
+      };
+      const std::wstring before = got(second);
+      check_equal(S_OK, (is_early ? call_early : call_late)(object, put, given).error, narrow(put.name));
+      const std::wstring expected = shown_value(typed_value(put.parameters[0].bare(), draw).get());
+      check_equal(expected, got(object), narrow(put.name));
+      check_equal(is_shared ? expected : before, got(second), narrow(put.name) + " of a second object");
+    }
+  }
+}
+
 /// Calls each slot with usual values, once for each of its pointers with that one null.
 void null_pointers_are_refused(IDispatch* object) {
   for (const Slot& slot : slots_of(object)) {
@@ -391,7 +430,11 @@ int wmain(int count, wchar_t** arguments) {
     const Pointer<_ORVUtils> object = create_object();
     both_ways_agree(object.get(), seed, wanted);
     null_pointers_are_refused(object.get());
-    null_pointers_are_refused(create_object<_cControlPosition>(CLSID_cControlPosition, IID__cControlPosition).get());
+    const auto position = create_object<_cControlPosition>(CLSID_cControlPosition, IID__cControlPosition);
+    null_pointers_are_refused(position.get());
+    properties_keep_what_they_are_given(object.get(), create_object().get(), true);
+    properties_keep_what_they_are_given(
+        position.get(), create_object<_cControlPosition>(CLSID_cControlPosition, IID__cControlPosition).get(), false);
     hostile_values_do_no_harm(object.get());
   });
 }
