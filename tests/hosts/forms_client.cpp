@@ -42,6 +42,12 @@ std::wstring ask(_ORVUtils* u, const Question& question, const std::function<voi
   return result;
 }
 
+/// Shows a window that waits for its user.
+void show(_ORVUtils* u, HRESULT (STDMETHODCALLTYPE _ORVUtils::*member)(), const std::function<void(HWND)>& user) {
+  const auto action = [&] { check_equal(S_OK, (u->*member)(), "a window"); };
+  check_equal(1, with_user(form_class, action, user), "windows that were shown");
+}
+
 std::wstring prompt_of(HWND window) { return text_of(controls(window, L"Static").at(0)); }
 
 LONG height_of(HWND window) {
@@ -306,19 +312,12 @@ void nothing_is_left(_ORVUtils* u, int openings) {
     u->ShowShortCutKeys();
     close(only_form());
   };
-  const auto switches = [u] {
-    with_user(
-        form_class, [u] { u->ShowCmdLineHelp(); }, close);
-  };
-  const auto system = [u] {
-    with_user(
-        form_class, [u] { u->ShowSysInfo(); }, close);
-  };
-  const std::pair<const char*, std::function<void()>> windows[] = {{"the input box", [u] { ask(u, {}, close); }},
-                                                                   {"the list of keys", keys},
-                                                                   {"the switches", switches},
-                                                                   {"the system", system},
-                                                                   {"the preview", [u] { preview(u, L"x", close); }}};
+  const std::pair<const char*, std::function<void()>> windows[] = {
+      {"the input box", [u] { ask(u, {}, close); }},
+      {"the list of keys", keys},
+      {"the switches", [u] { show(u, &_ORVUtils::ShowCmdLineHelp, close); }},
+      {"the system", [u] { show(u, &_ORVUtils::ShowSysInfo, close); }},
+      {"the preview", [u] { preview(u, L"x", close); }}};
   const auto count = [](DWORD kind) { return static_cast<int>(GetGuiResources(GetCurrentProcess(), kind)); };
   for (const auto& [name, open] : windows) {
     for (int i = 0; i < 5; ++i) open();
@@ -339,13 +338,8 @@ int wmain(int count, wchar_t** arguments) {
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();
     boxes_take_texts(u);
-    const std::pair<HRESULT (STDMETHODCALLTYPE _ORVUtils::*)(), void (*)(HWND)> members[] = {
-        {&_ORVUtils::ShowCmdLineHelp, switches_are_explained}, {&_ORVUtils::ShowSysInfo, system_is_described}};
-    for (const auto& [show, user] : members) {
-      const int shown = with_user(
-          form_class, [&, call = show] { check_equal(S_OK, (u->*call)(), "a window"); }, user);
-      check_equal(1, shown, "windows that were shown");
-    }
+    show(u, &_ORVUtils::ShowCmdLineHelp, switches_are_explained);
+    show(u, &_ORVUtils::ShowSysInfo, system_is_described);
     keys_are_listed(u);
     if (count <= 3) {
       std::wstring pages;
