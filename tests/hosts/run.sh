@@ -83,6 +83,7 @@ take_pictures &
 pictures_pid=$!
 client boxes
 client forms
+client modality
 # The same windows on a screen with larger dots, for the looks.
 dots() { wine reg.exe add 'HKCU\Control Panel\Desktop' /v LogPixels /t REG_DWORD /d "$1" /f >/dev/null 2>&1; }
 dots 144

@@ -105,7 +105,7 @@ void FormParts::set_dots(int dots) {
   for (PlacedPart& placed : parts_) {
     placed.place = place_of(*placed.part);
     SendMessageW(placed.window, WM_SETFONT, reinterpret_cast<WPARAM>(font_.get()), FALSE);
-    if (placed.table) placed.table->follow_dots();
+    if (placed.table) placed.table->follow_dots(dots);
   }
 }
 

@@ -25,7 +25,6 @@ void ListView::show(TableSource& table, std::int32_t bar_column) {
   table.set_window(static_cast<std::int32_t>(reinterpret_cast<LONG_PTR>(window_)));
   while (send(window_, LVM_DELETECOLUMN, 0) != 0) {
   }
-  const int dots = dots_per_inch(window_);
   RECT room{};
   GetClientRect(window_, &room);
   int rest = static_cast<int>(room.right) - GetSystemMetrics(SM_CXVSCROLL);
@@ -34,7 +33,7 @@ void ListView::show(TableSource& table, std::int32_t bar_column) {
     Text heading = table.heading(c);
     LVCOLUMNW column{};
     column.mask = LVCF_TEXT | LVCF_WIDTH | LVCF_SUBITEM;
-    column.cx = static_cast<int>(std::lround(table.column_width(c) * dots / twips_per_inch));
+    column.cx = static_cast<int>(std::lround(table.column_width(c) * dots_ / twips_per_inch));
     rest -= column.cx;
     // The last column takes the remaining width.
     if (c + 1 == columns && rest > 0) column.cx += rest;

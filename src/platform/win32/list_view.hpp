@@ -3,6 +3,7 @@
 #include <optional>
 
 #include "platform/table_source.hpp"
+#include "platform/win32/dots.hpp"
 #include "platform/win32/windows.hpp"
 
 namespace talutil::win32 {
@@ -10,14 +11,15 @@ namespace talutil::win32 {
 /// A table on a window: the system's list view, which asks a table source for the visible cells.
 class ListView {
  public:
-  explicit ListView(HWND window) noexcept : window_(window) {}
+  explicit ListView(HWND window) : window_(window), dots_(dots_per_inch(window)) {}
 
   /// Shows a table instead of the previous one.
   /// @param bar_column a column of percentages to be drawn as bars; -1 for none
   void show(TableSource& table, std::int32_t bar_column);
 
   /// Scales the columns after the window has come to a monitor with other dots per inch.
-  void follow_dots() {
+  void follow_dots(int dots) {
+    dots_ = dots;
     if (table_ != nullptr) show(*table_, bar_column_);
   }
 
@@ -36,6 +38,7 @@ class ListView {
   void draw_bar(HDC device, std::int32_t row) const;
 
   HWND window_;
+  int dots_;
   TableSource* table_ = nullptr;
   std::int32_t bar_column_ = -1;
 };

@@ -1,0 +1,185 @@
+// A host whose windows stand beside those of another program: modality_client FOLDER. While it waits for one of the
+// library's windows, and when that is closed, nobody else comes to the front. It has no manifest and does not scale.
+#include <filesystem>
+
+#include "windows.hpp"
+
+using namespace talutil::hosts;
+
+namespace {
+
+constexpr const wchar_t* form_class = L"TALUtilForm";
+constexpr UINT dpi_changed = 0x02E0;
+
+std::vector<std::string> events;  ///< What the host's window was told, in order.
+
+LRESULT CALLBACK note(HWND window, UINT message, WPARAM what, LPARAM value) {
+  if (message == WM_ENABLE) events.emplace_back(what != 0 ? "enabled" : "disabled");
+  if (message == WM_ACTIVATE) events.emplace_back(LOWORD(what) != WA_INACTIVE ? "active" : "inactive");
+  if (message == WM_ACTIVATEAPP) events.emplace_back(what != 0 ? "program to the front" : "program to the back");
+  return DefWindowProcW(window, message, what, value);
+}
+
+HWND make_host_window() {
+  WNDCLASSW description{};
+  description.lpfnWndProc = &note;
+  description.hInstance = GetModuleHandleW(nullptr);
+  description.lpszClassName = L"ModalityHost";
+  description.hbrBackground = reinterpret_cast<HBRUSH>(COLOR_WINDOW + 1);
+  RegisterClassW(&description);
+  return CreateWindowW(L"ModalityHost", L"The host", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 300, 200, 500, 300, nullptr,
+                       nullptr, nullptr, nullptr);
+}
+
+/// This program again, which shows a window until it is ended.
+class OtherProgram {
+ public:
+  explicit OtherProgram(const std::wstring& folder) {
+    std::array<wchar_t, MAX_PATH> program{};
+    GetModuleFileNameW(nullptr, program.data(), static_cast<DWORD>(program.size()));
+    std::wstring line = L'"' + std::wstring(program.data()) + L"\" \"" + folder + L"\" other";
+    STARTUPINFOW start{};
+    start.cb = sizeof start;
+    check(
+        CreateProcessW(nullptr, line.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &start, &process_) != FALSE,
+        "another program");
+    const auto is_in_front = [] {
+      const HWND window = FindWindowW(L"ModalityOther", nullptr);
+      return window != nullptr && GetForegroundWindow() == window;
+    };
+    check(wait_until(is_in_front), "its window");
+  }
+  OtherProgram(const OtherProgram&) = delete;
+  OtherProgram& operator=(const OtherProgram&) = delete;
+  ~OtherProgram() {
+    TerminateProcess(process_.hProcess, 0);
+    CloseHandle(process_.hProcess);
+    CloseHandle(process_.hThread);
+  }
+
+ private:
+  PROCESS_INFORMATION process_{};
+};
+
+void be_another_program() {
+  WNDCLASSW description{};
+  description.lpfnWndProc = &DefWindowProcW;
+  description.hInstance = GetModuleHandleW(nullptr);
+  description.lpszClassName = L"ModalityOther";
+  RegisterClassW(&description);
+  CreateWindowW(L"ModalityOther", L"Another program", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 400, 300, nullptr,
+                nullptr, nullptr, nullptr);
+  MSG message;
+  while (GetMessageW(&message, nullptr, 0, 0) > 0) DispatchMessageW(&message);
+}
+
+struct Shown {
+  const char* name;
+  const wchar_t* window_class;
+  std::function<void()> show;
+};
+
+void nobody_else_comes_to_the_front(const Shown& shown, HWND host) {
+  SetForegroundWindow(host);
+  check(messages_until([&] { return GetForegroundWindow() == host; }), "the host is in front");
+  events.clear();
+  const auto look = [&](HWND window) {
+    const std::string what = shown.name;
+    check(GetWindow(window, GW_OWNER) == host, what + ": the host owns it");
+    check(IsWindowEnabled(host) == FALSE, what + ": the host waits");
+    check(!has_style(window, GWL_STYLE, WS_MINIMIZEBOX) || shown.window_class == preview_class,
+          what + ": it cannot be minimised into a corner");
+    Sleep(100);
+    PostMessageW(window, WM_CLOSE, 0, 0);
+  };
+  check_equal(1, with_user(shown.window_class, shown.show, look), std::string(shown.name) + ": windows");
+  handle_messages();
+  std::string all;
+  for (const std::string& event : events) all += event + ' ';
+  check_equal("disabled inactive enabled active ", all, std::string(shown.name) + ": what the host was told");
+  check(GetForegroundWindow() == host, std::string(shown.name) + ": the host is in front again");
+}
+
+/// The module that has a control's procedure.
+std::filesystem::path module_of(HWND control) {
+  HMODULE module = nullptr;
+  GetModuleHandleExW(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_UNCHANGED_REFCOUNT,
+                     reinterpret_cast<const wchar_t*>(GetWindowLongPtrW(control, GWLP_WNDPROC)), &module);
+  std::array<wchar_t, MAX_PATH> path{};
+  GetModuleFileNameW(module, path.data(), static_cast<DWORD>(path.size()));
+  return path.data();
+}
+
+/// The window and everything on it grow to one and a half times their sizes.
+void windows_follow_dots(HWND window, const char* name) {
+  RECT before{};
+  GetWindowRect(window, &before);
+  const std::vector<HWND> parts = controls(window);
+  RECT part_before{};
+  GetWindowRect(parts.back(), &part_before);
+  const LONG width = before.right - before.left;
+  const LONG height = before.bottom - before.top;
+  const RECT suggested{before.left, before.top, before.left + width * 3 / 2, before.top + height * 3 / 2};
+  SendMessageW(window, dpi_changed, MAKEWPARAM(144, 144), reinterpret_cast<LPARAM>(&suggested));
+  RECT after{};
+  RECT part_after{};
+  GetWindowRect(window, &after);
+  GetWindowRect(parts.back(), &part_after);
+  check(after.right - after.left > width * 5 / 4, std::string(name) + ": wider at 144 dots");
+  check(part_after.bottom - part_after.top >= part_before.bottom - part_before.top,
+        std::string(name) + ": its parts as well");
+  take_picture(L"moved-" + std::wstring(name, name + std::strlen(name)));
+}
+
+void looks_are_those_of_the_system(_ORVUtils* u) {
+  const auto look = [&](HWND window) {
+    const auto lists = controls(window, L"SysListView32");
+    if (check(!lists.empty(), "a table")) {
+      const std::wstring module = module_of(lists[0]).wstring();
+      check(module.find(L"common-controls") != std::wstring::npos, "the later controls, from " + narrow(module));
+    }
+    ShowWindow(window, SW_MAXIMIZE);
+    take_picture(L"maximised-system");
+    ShowWindow(window, SW_RESTORE);
+    windows_follow_dots(window, "system");
+    PostMessageW(window, WM_CLOSE, 0, 0);
+  };
+  check_equal(1,
+              with_user(
+                  form_class, [&] { check_equal(S_OK, u->ShowSysInfo(), "ShowSysInfo"); }, look),
+              "windows");
+}
+
+}  // namespace
+
+int wmain(int count, wchar_t** arguments) {
+  enter_desktop();
+  if (count > 2) {
+    be_another_program();
+    return 0;
+  }
+  return run_checks([&] {
+    pictures = std::wstring(count > 1 ? arguments[1] : L".") + L"\\..\\screenshots\\";
+    const Pointer<_ORVUtils> u = create_object();
+    const HWND host = make_host_window();
+    const OtherProgram other(count > 1 ? arguments[1] : L".");
+    HostObject box({L"Text"}, [](const Use& use) { return use.answer(std::wstring_view(L"A page")); });
+    Value holder(&box);
+    const Shown windows[] = {
+        {"MyInputBox", form_class,
+         [&] {
+           Text answer;
+           u->MyInputBox(Text(L"Who?"), Text(L"What is your name?"), Number<VARIANT_BOOL>{VARIANT_FALSE},
+                         Number<VARIANT_BOOL>{VARIANT_TRUE}, Number<VARIANT_BOOL>{VARIANT_FALSE},
+                         Number<VARIANT_BOOL>{VARIANT_FALSE}, Number<LONG>{0xC0E0FF}, answer);
+         }},
+        {"ShowSysInfo", form_class, [&] { u->ShowSysInfo(); }},
+        {"ShowCmdLineHelp", form_class, [&] { u->ShowCmdLineHelp(); }},
+        {"the preview", preview_class,
+         [&] { u->TextBoxPrintPreview(Short{100}, Short{1}, Text(L"Notes"), Text(L"C:\\"), holder); }},
+    };
+    for (const Shown& shown : windows) nobody_else_comes_to_the_front(shown, host);
+    looks_are_those_of_the_system(u.get());
+    DestroyWindow(host);
+  });
+}
