@@ -390,8 +390,8 @@ class ORVUtils {
   /// bits of minutes.
   virtual Variant DateTimeToDuration(Variant& vDate);
 
-  /// Converts a duration given as a time of day ("1:30") to the stored form: 01/01/1800 01:30. Raises 13 if it is not a
-  /// time of day, and so for 24 hours and more.
+  /// Converts a duration given as a time of day or as "hours:minutes" ("1:30", "26:0") to the stored form: 01/01/1800
+  /// 01:30. Raises 13 if it is neither.
   virtual Variant DurationToDateTime(const Variant& vDuration);
 
   /// A time of day as decimal hours; minutes other than 15, 30 and 45 are ignored, and 0 hours become 1.5. "-" is read
@@ -400,7 +400,7 @@ class ORVUtils {
 
   /// Converts decimal hours in a text ("1.5", ".25") to a stored duration. The fractions 5, 25 and 75 are quarters of
   /// an hour; any other is taken as minutes: "1.50" is 1 hour 50. The text is written back trimmed. Raises 13 if the
-  /// result is not a time of day.
+  /// result is not "hours:minutes".
   virtual Variant DurToTime(Text& sDuration);
 
   /// A stored duration as decimal hours in a text ("0.25"); minutes other than 15, 30 and 45 are ignored, 0 becomes
@@ -408,8 +408,7 @@ class ORVUtils {
   /// vDuration is not a date, 6 beyond 32 bits of minutes.
   virtual Text ConvertDatabaseDurationToNumber(Variant& vDuration);
 
-  /// Converts minutes, 0 to 1439, to a stored duration. Others are reported in a message box and return the text
-  /// "1/1/1800 00:00".
+  /// Converts minutes to a stored duration. Errors are reported in a message box and return the text "1/1/1800 00:00".
   virtual Variant ConvertNumberToDatabaseDuration(const std::int16_t& iMinutes);
 
   /// A stored duration in minutes. Writes back and raises the same as ConvertDatabaseDurationToNumber.
