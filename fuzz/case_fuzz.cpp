@@ -2,10 +2,8 @@
 #include <algorithm>
 
 #include "controls/name_case.hpp"
+#include "fuzz/host.hpp"
 #include "fuzz/input.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/fake_platform.hpp"
 
 namespace talutil {
 namespace {
@@ -24,10 +22,9 @@ void check(fuzz::Input input) {
   require(name_case(upper_case(text)) == name_case(lower_case(upper_case(text))),
           "the case of the input plays no part");
 
-  testing::FakePlatform platform;
-  Library library(platform.platform());
-  ORVUtils utils(library);
-  library.settings().iCharactercase = library.settings().iCharacterCaseSuburbs = style;
+  static fuzz::Host host;
+  ORVUtils& utils = host.utils();
+  host.settings().iCharactercase = host.settings().iCharacterCaseSuburbs = style;
   const Text cleaned = utils.VerifyTextData(0, 0, text);
   const Variant suburb = utils.ConvertCaseSuburbs(text);
   const bool is_cased = !cleaned.empty() && (style == 1 || style == 3);

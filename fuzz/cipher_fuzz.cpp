@@ -2,10 +2,8 @@
 #include <optional>
 
 #include "automation/run_time_error.hpp"
+#include "fuzz/host.hpp"
 #include "fuzz/input.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/fake_platform.hpp"
 
 namespace talutil {
 namespace {
@@ -24,9 +22,8 @@ std::optional<Text> decrypted(ORVUtils& utils, const Text& cipher) {
 
 void check(fuzz::Input input) {
   // One for all runs, as in a host: the key is derived once.
-  static testing::FakePlatform platform;
-  static Library library(platform.platform());
-  static ORVUtils utils(library);
+  static fuzz::Host host;
+  ORVUtils& utils = host.utils();
 
   const std::size_t place = input.byte() | input.byte() << 8;
   const Text change = input.text(4);

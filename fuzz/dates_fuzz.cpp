@@ -1,24 +1,19 @@
-// Checks what must hold for any text that is read as a date. Build with clang and run:
-//   dates_fuzz -max_len=40 -runs=10000000
+// Checks what must hold for any text that is read as a date or duration: dates_fuzz -max_len=40 -runs=10000000
 
 #include <algorithm>
 #include <cmath>
-#include <cstdint>
-#include <cstdio>
-#include <cstdlib>
 
 #include "automation/date.hpp"
+#include "automation/run_time_error.hpp"
+#include "fuzz/host.hpp"
+#include "fuzz/input.hpp"
 
 namespace talutil {
 namespace {
 
 constexpr std::int32_t current_year = 2009;
 
-void require(bool holds, const char* what) {
-  if (holds) return;
-  std::fprintf(stderr, "broken: %s\n", what);
-  std::abort();
-}
+using fuzz::require;
 
 /// Maps most bytes to elements of dates, including whole words, so that many texts are dates.
 Text text_of(const std::uint8_t* data, std::size_t size) {
@@ -54,10 +49,47 @@ void check(const Text& text) {
   require(day_of_year(*date) >= 28 * (parts.month - 1) + parts.day, "its day of the year");
 }
 
+/// Calls a member; returns nothing if it raises one of the errors of conversions.
+template <class Call>
+std::optional<Variant> answer_of(Call call) {
+  try {
+    return Variant(call());
+  } catch (const RunTimeError& error) {
+    require(error.number() == 5 || error.number() == 6 || error.number() == 13, "an error of conversions");
+    return std::nullopt;
+  }
+}
+
+void check_durations(const Text& text) {
+  static fuzz::Host host;
+  ORVUtils& utils = host.utils();
+  const auto time = answer_of([&] { return utils.DurationToDateTime(text); });
+  if (time) {
+    Variant stored = *time;
+    const std::int32_t minutes = utils.ConvertDatabaseDurationToMinutes(stored);
+    const std::int32_t minutes_of_day = utils.ConvertTimeToMinutes(*time);
+    require((minutes - minutes_of_day) % 1440 == 0, "a duration has its minutes");
+    const Variant words = utils.DateTimeToDuration(stored);
+    if (minutes == minutes_of_day) require(utils.DurationToDateTime(words) == *time, "within a day it comes back");
+  }
+  const float hours = utils.ConvertDurationToNumber(text);
+  require(hours >= 0 && hours < 24, "hours of a day");
+  Text typed = text;
+  (void)answer_of([&] { return utils.DurToTime(typed); });
+  require(typed == trim_blanks(text), "a duration is written back trimmed");
+  for (Variant value : {Variant(text), Variant(text_to_date(text, current_year).value_or(Date{}))}) {
+    (void)answer_of([&] { return utils.DateTimeToDuration(value); });
+    (void)answer_of([&] { return utils.ConvertDatabaseDurationToNumber(value); });
+    (void)answer_of([&] { return utils.ConvertDatabaseDurationToMinutes(value); });
+  }
+}
+
 }  // namespace
 }  // namespace talutil
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  talutil::check(talutil::text_of(data, size));
+  const talutil::Text text = talutil::text_of(data, size);
+  talutil::check(text);
+  talutil::check_durations(text);
   return 0;
 }

@@ -1,23 +1,20 @@
-// Checks what must hold for any bytes of a text file and any pattern. Build with clang and run:
-//   files_fuzz -max_len=512 -max_total_time=60
+// Checks what must hold for any bytes of a text file, any pattern and any name: files_fuzz -max_len=512 -runs=1000000
 
-#include <cstdint>
-#include <cstdio>
-#include <cstdlib>
+#include <algorithm>
+#include <filesystem>
 
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
+#include "archives/entry_names.hpp"
+#include "archives/item_list.hpp"
+#include "automation/run_time_error.hpp"
+#include "fuzz/host.hpp"
+#include "fuzz/input.hpp"
 #include "platform/file_names.hpp"
-#include "tests/fakes/fake_platform.hpp"
+#include "platform/posix/drive_paths.hpp"
 
 namespace talutil {
 namespace {
 
-void require(bool holds, const char* what) {
-  if (holds) return;
-  std::fprintf(stderr, "broken: %s\n", what);
-  std::abort();
-}
+using fuzz::require;
 
 /// Splits lines by a naive implementation of the rule.
 std::vector<Text> naive_lines(std::string bytes) {
@@ -42,11 +39,10 @@ bool naive_match(TextView name, TextView pattern) {
 }
 
 void check_lines(const std::string& bytes) {
-  testing::FakePlatform platform;
-  Library library(platform.platform());
-  ORVUtils utils(library);
+  static fuzz::Host host;
+  ORVUtils& utils = host.utils();
   const Text path = u"C:\\a.txt";
-  platform.files.put(path, bytes);
+  host.put_file(path, bytes);
   TextArray list;
   const auto count = static_cast<std::size_t>(utils.OpenFile(path, list, 0));
   const std::vector<Text> expected = naive_lines(bytes);
@@ -71,6 +67,35 @@ void check_pattern(const std::string& bytes) {
   (void)name_matches(any, any);
 }
 
+/// A path is read below its drive, and an archive's entry goes below its folder, whatever they are called.
+void check_names(const Text& text) {
+  static const std::string root = [] {
+    std::string folder = (std::filesystem::temp_directory_path() / "talutil-fuzz-XXXXXX").string();
+    require(mkdtemp(folder.data()) != nullptr, "a folder is made");
+    std::filesystem::create_directories(folder + "/c/a");
+    setenv("TALUTIL_DRIVES", folder.c_str(), 1);
+    return folder;
+  }();
+  try {
+    const std::string native = posix::DrivePaths().native(u"C:\\" + text);
+    require(std::filesystem::path(native).lexically_normal().string().starts_with(root + "/c"), "a path on its drive");
+  } catch (const RunTimeError&) {
+  }
+
+  const auto parts = archives::safe_parts(text);
+  if (!parts) return;
+  Text joined;
+  for (const Text& part : *parts) {
+    require(!part.empty() && part != u".." && part != u"." && part.find_first_of(TextView(u"/\\:\0", 4)) == Text::npos,
+            "a part stays in its folder");
+    require(!is_device_name(part), "a part is no device");
+    joined += (joined.empty() ? u"" : u"/") + part;
+  }
+  require(archives::safe_parts(joined) == parts, "a safe name stays");
+  if (text.find(u'"') != Text::npos) return;
+  require(archives::EntryFilter(u"\"" + joined + u"\"").matches(*parts), "an entry is found by its name");
+}
+
 }  // namespace
 }  // namespace talutil
 
@@ -78,5 +103,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   const std::string bytes(reinterpret_cast<const char*>(data), size);
   talutil::check_lines(bytes);
   talutil::check_pattern(bytes);
+  talutil::check_names(talutil::from_utf8(bytes));
   return 0;
 }

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <string_view>
 
 #include "automation/text.hpp"
 
@@ -29,6 +30,11 @@ class Input {
       text += choice < 128 ? common_[choice % common_.size()] : static_cast<char16_t>(byte() << 8 | byte());
     }
     return text;
+  }
+
+  /// All bytes that have not been used yet.
+  [[nodiscard]] std::string_view rest() const {
+    return {reinterpret_cast<const char*>(at_), static_cast<std::size_t>(end_ - at_)};
   }
 
  private:

@@ -6,10 +6,8 @@
 #include <vector>
 
 #include "automation/run_time_error.hpp"
+#include "fuzz/host.hpp"
 #include "fuzz/input.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
-#include "tests/fakes/fake_platform.hpp"
 
 namespace talutil {
 namespace {
@@ -79,9 +77,8 @@ void check_list(ORVUtils& utils, const Text& text) {
 }
 
 void check(fuzz::Input input) {
-  testing::FakePlatform platform;
-  Library library(platform.platform());
-  ORVUtils utils(library);
+  static fuzz::Host host;
+  ORVUtils& utils = host.utils();
 
   const auto extras = static_cast<std::int16_t>(input.byte() % 6);
   const auto width = static_cast<std::int16_t>(input.byte() % 64 - 16);
