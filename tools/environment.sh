@@ -8,6 +8,7 @@ talutil_cache=${XDG_CACHE_HOME:-$HOME/.cache}/talutil
 
 native_packages="build-essential zlib1g-dev cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata"
 exchange_packages="zip unzip p7zip-full python3 poppler-utils qpdf fonts-dejavu-core"
+fuzz_packages="clang"
 windows_packages="binutils libz-mingw-w64-dev debootstrap debian-archive-keyring g++-mingw-w64-i686-posix mingw-w64-tools xvfb xauth"
 windows64_packages="libz-mingw-w64-dev g++-mingw-w64-x86-64-posix mingw-w64-tools wine64 xvfb xauth"
 
