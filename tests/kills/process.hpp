@@ -25,7 +25,8 @@ class Process {
     path.resize(GetModuleFileNameW(nullptr, path.data(), MAX_PATH));
     std::wstring line = L'"' + path + L'"';
     for (const std::string& argument : arguments) line += L" \"" + std::filesystem::path(argument).wstring() + L'"';
-    STARTUPINFOW startup{.cb = sizeof startup};
+    STARTUPINFOW startup{};
+    startup.cb = sizeof startup;
     PROCESS_INFORMATION made{};
     if (CreateProcessW(path.c_str(), line.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &startup, &made) == 0) {
       return;
