@@ -12,6 +12,7 @@ function(talutil_notice library file)
 endfunction()
 
 talutil_notice("libzip (archives)" ${third_party}/licences/libzip)
+talutil_notice("bzip2 (archives)" ${third_party}/licences/bzip2)
 talutil_notice("libdeflate (archives)" ${third_party}/licences/libdeflate)
 talutil_notice("libharu (PDF documents)" ${third_party}/licences/libharu)
 if(WIN32)

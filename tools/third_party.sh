@@ -53,6 +53,16 @@ keep_licence() { cp "$work/$1/$2" "$made/licences/$1"; }
 
 apply() { patch --quiet --directory "$work/$1" --strip=1 --input "$talutil_top/cmake/patches/$2" >&2; }
 
+# For reading entries that others have packed with it. Of its own build files, only what the library consists of.
+build_bzip2() {
+  local source sources=(blocksort huffman crctable randtable compress decompress bzlib)
+  for source in "${sources[@]}"; do
+    "$cc" $flags -w -c "$work/bzip2/$source.c" -o "$work/bzip2/$source.o" >&2
+  done
+  "$ar" rcs "$made/lib/libbz2.a" "$work"/bzip2/*.o
+  cp "$work/bzip2/bzlib.h" "$made/include/"
+}
+
 build_libzip() {
   local crypto=(-DENABLE_OPENSSL=ON -DENABLE_WINDOWS_CRYPTO=OFF) system=() extra=""
   if [ "$flavour" = windows ] || [ "$flavour" = windows64 ]; then
@@ -65,7 +75,8 @@ build_libzip() {
   cmake -S "$work/libzip" -B "$work/libzip/build" -G Ninja -DCMAKE_BUILD_TYPE=None -DCMAKE_C_COMPILER="$cc" \
     "${system[@]}" "${crypto[@]}" -DCMAKE_C_FLAGS="$flags$extra" -DCMAKE_INSTALL_PREFIX="$made" \
     -DCMAKE_INSTALL_LIBDIR=lib -DBUILD_SHARED_LIBS=OFF -DENABLE_COMMONCRYPTO=OFF -DENABLE_GNUTLS=OFF \
-    -DENABLE_MBEDTLS=OFF -DENABLE_BZIP2=OFF -DENABLE_LZMA=OFF -DBUILD_TOOLS=OFF -DBUILD_REGRESS=OFF \
+    -DENABLE_MBEDTLS=OFF -DENABLE_LZMA=OFF -DENABLE_BZIP2=ON -DBZIP2_INCLUDE_DIR="$made/include" \
+    -DBZIP2_LIBRARIES="$made/lib/libbz2.a" -DBUILD_TOOLS=OFF -DBUILD_REGRESS=OFF \
     -DBUILD_EXAMPLES=OFF -DBUILD_DOC=OFF >&2
   cmake --build "$work/libzip/build" --target install >&2
 }
@@ -96,7 +107,7 @@ if [ -z "$is_asked_only" ] && [ ! -d "$prefix" ]; then
     need_packages $native_packages
     [ "$flavour" != windows ] || need_packages $windows_packages
     [ "$flavour" != windows64 ] || need_packages $windows64_packages
-    [ "$flavour" != fuzz ] || need_packages clang
+    [ "$flavour" != fuzz ] || need_packages $fuzz_packages
     say "building the $flavour libraries for archives and documents (once, half a minute)"
   } >&2
   work=$(mktemp -d)
@@ -108,10 +119,11 @@ if [ -z "$is_asked_only" ] && [ ! -d "$prefix" ]; then
     -o "Dir::State::lists=$work/lists" -o "Dir::Cache::pkgcache=" -o "Dir::Cache::srcpkgcache="
     -o APT::Sandbox::User=root)
   apt-get "${options[@]}" update >&2
-  for package in libzip libdeflate libharu; do
+  for package in bzip2 libzip libdeflate libharu; do
     fetch "$package"
     "build_$package" >"$work/$package.log" 2>&1 || { tail -30 "$work/$package.log" >&2; fail "could not build $package"; }
   done
+  keep_licence bzip2 LICENSE
   keep_licence libzip LICENSE
   keep_licence libdeflate COPYING
   # It has no file of its own for it.

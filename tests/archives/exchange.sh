@@ -91,6 +91,7 @@ read_theirs() {
 read_theirs "zip" zip.zip zip -qr zip.zip data
 "$talutil" unzip zip.zip --to kept
 check "times and rights of zip's" same kept
+read_theirs "zip, BZip2" zip-b.zip zip -qr -Z bzip2 zip-b.zip data
 read_theirs "zip -P" zip-p.zip zip -qr -P secret zip-p.zip data
 read_theirs "zip, zip64" zip-64.zip zip -qr -fz zip-64.zip data
 read_theirs "zip -s" zip-s.zip zip -qr -s 70k zip-s.zip data
