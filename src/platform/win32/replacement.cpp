@@ -2,7 +2,9 @@
 
 #include <array>
 #include <atomic>
+#include <cstddef>
 #include <utility>
+#include <vector>
 
 #include "automation/numbers.hpp"
 #include "automation/run_time_error.hpp"
@@ -13,12 +15,6 @@
 namespace talutil::win32 {
 
 namespace {
-
-/// Documented at ReplaceFile: after these, the old file has lost its name, and the new one still has its temporary
-/// name.
-bool has_lost_target(DWORD code) noexcept {
-  return code == ERROR_UNABLE_TO_MOVE_REPLACEMENT || code == ERROR_UNABLE_TO_MOVE_REPLACEMENT_2;
-}
 
 /// The beginning of the names of this machine's temporary files: shares have those of others, too.
 const Text& machine_prefix() {
@@ -106,32 +102,30 @@ void Replacement::remove_stale() const {
   } while (FindNextFileW(search.get(), &entry) != 0);
 }
 
+/// Gives the new version the attributes and the rights of the old one; the latter only if this user may change them.
+///
+/// ReplaceFile would do so too, but takes the name from the old file before it gives it to the new one, so that a
+/// process that is killed in between leaves no file of that name.
+void Replacement::keep_properties(const Text& target) const {
+  std::vector<std::byte> rights;
+  DWORD size = 0;
+  GetFileSecurityW(wide(target), DACL_SECURITY_INFORMATION, nullptr, 0, &size);
+  rights.resize(size);
+  if (GetFileSecurityW(wide(target), DACL_SECURITY_INFORMATION, rights.data(), size, &size) != 0) {
+    SetFileSecurityW(wide(temporary_), DACL_SECURITY_INFORMATION, rights.data());
+  }
+  const DWORD attributes = GetFileAttributesW(wide(target));
+  if (attributes != INVALID_FILE_ATTRIBUTES) SetFileAttributesW(wide(temporary_), attributes);
+}
+
 void Replacement::take_name(const Text& name, DWORD attributes, bool replaces, Keep keep) {
   const Text target = folder_ + name;
   if (FlushFileBuffers(file_.get()) == 0) raise_last_error();
   file_.reset();
   SetFileAttributesW(wide(temporary_), attributes == 0 ? FILE_ATTRIBUTE_NORMAL : attributes);
+  if (replaces && keep == Keep::attributes_and_rights) keep_properties(target);
   const DWORD how = MOVEFILE_WRITE_THROUGH | (replaces ? MOVEFILE_REPLACE_EXISTING : 0);
-  const auto move = [&] { return MoveFileExW(wide(temporary_), wide(target), how); };
-  const auto replace = [&] {
-    // Without the right to change permissions, the new version has those of the folder.
-    constexpr DWORD flags = REPLACEFILE_IGNORE_MERGE_ERRORS | REPLACEFILE_IGNORE_ACL_ERRORS;
-    return ReplaceFileW(wide(target), wide(temporary_), nullptr, flags, nullptr, nullptr);
-  };
-  DWORD code = 0;
-  if (replaces && keep == Keep::attributes_and_rights) {
-    code = retried(replace);
-    if (has_lost_target(code)) {
-      code = retried(move);
-      if (code != 0) {
-        const Text kept = std::exchange(temporary_, {});
-        throw RunTimeError(
-            ErrorNumber::path_file_access,
-            u"Path/File access error: " + target + u" could not be replaced; its new contents are in " + kept);
-      }
-    }
-  }
-  if (code != 0 || !replaces || keep == Keep::nothing) code = retried(move);
+  const DWORD code = retried([&] { return MoveFileExW(wide(temporary_), wide(target), how); });
   if (code == ERROR_ALREADY_EXISTS || code == ERROR_FILE_EXISTS) raise(ErrorNumber::permission_denied);
   if (code != 0 && replaces && is_passing(code)) return overwrite(target);
   if (code != 0) raise_for(code);

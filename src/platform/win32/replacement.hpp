@@ -32,6 +32,7 @@ class Replacement {
 
  private:
   void remove_stale() const;
+  void keep_properties(const Text& target) const;
   void overwrite(const Text& target);
 
   Text folder_;
