@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "automation/numbers.hpp"
 #include "automation/run_time_error.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/last_error.hpp"
@@ -56,7 +57,7 @@ class Win32StoredFile final : public StoredFile {
 class Win32NewFile final : public NewFile {
  public:
   Win32NewFile(const Text& folder, TextView name)
-      : name_(name), replaced_(open_replaced(folder + name_)), replacement_(folder) {}
+      : name_(name), turn_(take_turn(folder, name)), replaced_(open_replaced(folder + name_)), replacement_(folder) {}
 
   [[nodiscard]] StoredFile* replaced() noexcept override { return replaced_.get(); }
   [[nodiscard]] std::uint64_t size() const noexcept override { return size_; }
@@ -79,7 +80,7 @@ class Win32NewFile final : public NewFile {
 
   using NewFile::take_name;
   void take_name(TextView other_name) override {
-    // The lock on the old file ends here: the system replaces no file that is open.
+    // The system replaces no file that is open.
     const bool replaces = replaced_ != nullptr || !other_name.empty();
     replaced_.reset();
     replacement_.take_name(other_name.empty() ? name_ : Text(other_name), attributes_, replaces,
@@ -87,7 +88,24 @@ class Win32NewFile final : public NewFile {
   }
 
  private:
-  /// Opened for writing too where that is allowed, so that a second writer is refused at once.
+  /// Writers of one file take turns, from before they open the old version until the new one has its name: in between,
+  /// the old one is neither open nor replaced for a moment, and whoever read it then would undo the other's changes.
+  /// The lock is a file that nobody else can open and that goes with its handle.
+  [[nodiscard]] static Owned<kind::File> take_turn(const Text& folder, TextView name) {
+    std::uint32_t hash = 0x811C9DC5;  // FNV-1a; the name itself could become too long.
+    for (const char16_t unit : upper_case(name)) hash = (hash ^ unit) * 0x01000193;
+    const Text path = folder + Text(temporary_prefix) + u"lock" + number_to_text(static_cast<std::int32_t>(hash));
+    Owned<kind::File> file;
+    const DWORD code = retried([&] {
+      file.reset(CreateFileW(wide(path), GENERIC_WRITE, 0, nullptr, OPEN_ALWAYS,
+                             FILE_ATTRIBUTE_HIDDEN | FILE_FLAG_DELETE_ON_CLOSE, nullptr));
+      return file ? TRUE : FALSE;
+    });
+    if (code != 0) raise_for(code);
+    return file;
+  }
+
+  /// Opened for writing too where that is allowed, so that programs that write in place are noticed.
   [[nodiscard]] static std::unique_ptr<Win32StoredFile> open_replaced(const Text& path) {
     const DWORD attributes = GetFileAttributesW(wide(path));
     if (attributes == INVALID_FILE_ATTRIBUTES) return nullptr;
@@ -106,6 +124,7 @@ class Win32NewFile final : public NewFile {
   }
 
   Text name_;
+  Owned<kind::File> turn_;
   std::unique_ptr<Win32StoredFile> replaced_;
   Replacement replacement_;
   DWORD attributes_ = 0;
