@@ -18,6 +18,7 @@
 #include <optional>
 #include <random>
 #include <set>
+#include <span>
 #include <thread>
 
 #include "archives/packing.hpp"
@@ -47,17 +48,18 @@ struct NoControls final : ControlMakers {
 
 /// The library on the real platform.
 struct Host {
-  explicit Host(const fs::path& native_folder) : native(native_folder) {
+  explicit Host(const fs::path& native_folder) : native(prepared(native_folder)) {
 #ifdef _WIN32
     folder = Text(native.u16string()) + u"\\";
 #else
     folder = u"Z:" + from_utf8(native.string()) + u"/";
-    setenv("TALUTIL_HIVE", (native / "hive.db").c_str(), 1);
 #endif
     utils.settings().EventLog = 1;
     utils.settings().sORVPath = folder.substr(0, folder.size() - 1);
   }
 
+  fs::path native;
+  Text folder;
 #ifdef _WIN32
   NoControls controls;
   HRESULT apartment = CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
@@ -67,8 +69,15 @@ struct Host {
 #endif
   Library library{platform.platform()};
   ORVUtils utils{library};
-  fs::path native;
-  Text folder;
+
+ private:
+  /// The platform looks for its settings when it is made.
+  static fs::path prepared(const fs::path& folder) {
+#ifndef _WIN32
+    setenv("TALUTIL_HIVE", (folder / "hive.db").c_str(), 1);
+#endif
+    return folder;
+  }
 };
 
 std::string key_of(int worker, std::uintmax_t number) {
@@ -101,12 +110,12 @@ std::string read_bytes(const fs::path& path) {
   return {std::istreambuf_iterator<char>(file), {}};
 }
 
-fs::path acknowledgements(const fs::path& folder, const char* kind, int worker) {
-  return folder / (std::string("done-") + kind + "-" + std::to_string(worker));
+fs::path acknowledgements(const fs::path& folder, const std::string& kind, int worker) {
+  return folder / ("done-" + kind + "-" + std::to_string(worker));
 }
 
 /// How many operations a worker has acknowledged; they are numbered from 1.
-std::uintmax_t acknowledged(const fs::path& folder, const char* kind, int worker) {
+std::uintmax_t acknowledged(const fs::path& folder, const std::string& kind, int worker) {
   std::error_code is_missing;
   const std::uintmax_t count = fs::file_size(acknowledgements(folder, kind, worker), is_missing);
   return is_missing ? 0 : count;
@@ -120,9 +129,9 @@ void fault(const std::string& what) {
 }
 
 /// Of a key that a worker writes in turn: the last acknowledged operation, or the one that the kill came upon.
-void check_value(const char* kind, int worker, std::uintmax_t key, std::uintmax_t last,
+void check_value(const std::string& kind, int worker, std::uintmax_t key, std::uintmax_t last,
                  const std::optional<std::string>& found) {
-  const std::string what = std::string(kind) + " " + key_of(worker, key);
+  const std::string what = kind + " " + key_of(worker, key);
   std::uintmax_t least = last;
   while (least > 0 && least % keys != key) --least;
   if (!found) return least == 0 ? void() : fault(what + ": lost");
@@ -135,7 +144,7 @@ void check_value(const char* kind, int worker, std::uintmax_t key, std::uintmax_
 }
 
 template <class Read>
-void check_values(const Host& host, const char* kind, Read read) {
+void check_values(const Host& host, const std::string& kind, Read read) {
   for (int worker = 0; worker < workers; ++worker) {
     const std::uintmax_t last = acknowledged(host.native, kind, worker);
     for (std::uintmax_t key = 0; key < keys; ++key) check_value(kind, worker, key, last, read(key_of(worker, key)));
@@ -247,21 +256,25 @@ void check_archive(Host& host) {
 }
 
 struct Kind {
-  const char* name;
+  std::string name;
   void (*write)(Host& host, int worker, std::uintmax_t number);
   void (*check)(Host& host);
 };
 
-constexpr Kind kinds[] = {
+const Kind all_kinds[] = {
     {"log", &write_log, &check_log},
     {"settings", &write_setting, &check_settings},
-#ifndef _WIN32
-    // On Windows, the system itself writes profile files.
-    {"profile", &write_profile, &check_profile},
-#endif
     {"texts", &write_texts, &check_texts},
     {"archive", &write_archive, &check_archive},
+    {"profile", &write_profile, &check_profile},
 };
+
+// On Windows, the system itself writes profile files.
+#ifdef _WIN32
+const std::span<const Kind> kinds = std::span(all_kinds).first<4>();
+#else
+const std::span<const Kind> kinds = all_kinds;
+#endif
 
 /// Calls a writer until it succeeds: that another has locked the file is no fault, but cannot last.
 bool write(const Kind& kind, Host& host, int worker, std::uintmax_t number) {
@@ -274,18 +287,22 @@ bool write(const Kind& kind, Host& host, int worker, std::uintmax_t number) {
       reason = error.what();
     }
   }
-  std::printf("%s: worker %d cannot write: %s\n", kind.name, worker, reason.c_str());
+  std::printf("%s: worker %d cannot write: %s\n", kind.name.c_str(), worker, reason.c_str());
   return false;
 }
 
-/// Goes on from the last acknowledged operation until it is killed.
+/// Goes on from the last acknowledged operation until it is killed. It is not, where the driver lags behind, so it
+/// waits after some operations, lest the fast kinds take the time of the others.
 int work(const Kind& kind, int worker, const fs::path& folder) {
   Host host(folder);
   std::FILE* const done = std::fopen(acknowledgements(folder, kind.name, worker).string().c_str(), "ab");
   if (done == nullptr) return 1;
-  for (std::uintmax_t number = acknowledged(folder, kind.name, worker) + 1;; ++number) {
+  constexpr std::uintmax_t most_at_once = 20;
+  const std::uintmax_t first = acknowledged(folder, kind.name, worker) + 1;
+  for (std::uintmax_t number = first;; ++number) {
     if (!write(kind, host, worker, number)) return 1;
     if (std::fputc('x', done) == EOF || std::fflush(done) != 0) return 1;
+    if (number - first == most_at_once) std::this_thread::sleep_for(std::chrono::hours(1));
   }
 }
 
@@ -294,6 +311,8 @@ std::uintmax_t total_of(const Kind& kind, const fs::path& folder) {
   for (int worker = 0; worker < workers; ++worker) total += acknowledged(folder, kind.name, worker);
   return total;
 }
+
+using Clock = std::chrono::steady_clock;
 
 /// A process, and after how many operations it is killed.
 struct Victim {
@@ -305,6 +324,8 @@ struct Victim {
   const Kind* kind;
   Process process;
   std::uintmax_t goal;
+  Clock::time_point start = Clock::now();
+  std::optional<Clock::time_point> end;
 };
 
 class Driver {
@@ -315,16 +336,14 @@ class Driver {
   /// Returns how many it has killed.
   int run() {
     std::array<std::unique_ptr<Victim>, workers> victims;
-    auto last_progress = std::chrono::steady_clock::now();
+    auto last_progress = Clock::now();
     std::uintmax_t total_before = 0;
     for (;;) {
       for (int worker = 0; worker < workers; ++worker) {
         auto& victim = victims[static_cast<std::size_t>(worker)];
         if (victim && !victim->process.runs()) return fault("a worker has ended by itself"), kills_;
-        if (victim && acknowledged(folder_, victim->kind->name, worker) < victim->goal) continue;
+        if (victim && !is_due(*victim, worker)) continue;
         if (victim) {
-          // At any moment of the operation that follows.
-          std::this_thread::sleep_for(std::chrono::microseconds(up_to(3000)));
           victim.reset();
           ++kills_;
         }
@@ -333,7 +352,7 @@ class Driver {
         victim = std::make_unique<Victim>(*kind, worker, folder_, up_to(2 * average_life));
       }
       const std::uintmax_t total = total_of_all();
-      const auto now = std::chrono::steady_clock::now();
+      const auto now = Clock::now();
       if (total != total_before) last_progress = now;
       total_before = total;
       if (now - last_progress > std::chrono::seconds(60)) return fault("no progress for a minute"), kills_;
@@ -343,6 +362,16 @@ class Driver {
 
  private:
   static constexpr unsigned average_life = 2;  ///< Operations.
+
+  /// Once it has reached its goal, at any moment of the operation that follows.
+  bool is_due(Victim& victim, int worker) {
+    const auto now = Clock::now();
+    if (!victim.end && acknowledged(folder_, victim.kind->name, worker) >= victim.goal) {
+      const auto lived = std::chrono::duration_cast<std::chrono::microseconds>(now - victim.start).count();
+      victim.end = now + std::chrono::microseconds(up_to(static_cast<unsigned>(lived + 2000)));
+    }
+    return victim.end && now >= *victim.end;
+  }
 
   std::uintmax_t up_to(unsigned highest) { return std::uniform_int_distribution<unsigned>(0, highest)(random_); }
 
@@ -381,7 +410,7 @@ void write_again(Host& host) {
     for (int worker = 0; worker < workers; ++worker) {
       const std::uintmax_t last = acknowledged(host.native, kind.name, worker);
       for (std::uintmax_t next = 1; next <= keys; ++next) {
-        if (!write(kind, host, worker, last + next)) fault(std::string(kind.name) + ": cannot be written any more");
+        if (!write(kind, host, worker, last + next)) fault(kind.name + ": cannot be written any more");
       }
     }
   }
@@ -405,10 +434,10 @@ int drive(std::uintmax_t operations, const fs::path& folder, unsigned seed) {
   RegDeleteTreeW(HKEY_CURRENT_USER, win32::wide(u"Software\\TALUtil\\Settings\\" + Text(application)));
 #endif
   for (const Kind& kind : kinds) {
-    std::printf("%s: %ju operations\n", kind.name, total_of(kind, folder));
+    std::printf("%s: %ju operations\n", kind.name.c_str(), total_of(kind, folder));
   }
   std::printf("%d processes killed, %zu temporary files left by them\n", kills, left.size());
-  const int kinds_checked = static_cast<int>(std::size(kinds));
+  const int kinds_checked = static_cast<int>(kinds.size());
   std::printf("%d passed, %d failed\n", faults == 0 ? kinds_checked : 0, faults);
   return faults == 0 ? 0 : 1;
 }
@@ -419,9 +448,8 @@ int drive(std::uintmax_t operations, const fs::path& folder, unsigned seed) {
 int main(int count, char** arguments) {
   using namespace talutil::testing;
   if (count == 5 && std::strcmp(arguments[1], "--work") == 0) {
-    const auto* const kind = std::find_if(std::begin(kinds), std::end(kinds),
-                                          [&](const Kind& each) { return arguments[2] == std::string(each.name); });
-    return kind == std::end(kinds) ? 2 : work(*kind, std::atoi(arguments[3]), arguments[4]);
+    const auto kind = std::ranges::find_if(kinds, [&](const Kind& each) { return arguments[2] == each.name; });
+    return kind == kinds.end() ? 2 : work(*kind, std::atoi(arguments[3]), arguments[4]);
   }
   if (count < 3) {
     std::fputs("usage: kills OPERATIONS FOLDER [SEED]\n", stderr);
