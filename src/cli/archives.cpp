@@ -3,12 +3,16 @@
 #include <iomanip>
 #include <iostream>
 
+#include "archives/archive_error.hpp"
+#include "archives/entry_names.hpp"
+#include "archives/item_list.hpp"
 #include "archives/packing.hpp"
 #include "archives/unpacking.hpp"
 #include "automation/date.hpp"
 #include "cli/commands.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
+#include "cli/json.hpp"
 #include "platform/posix/posix_platform.hpp"
 
 namespace talutil::cli {
@@ -98,6 +102,40 @@ void on_archive(const std::string& archive, Work work) {
   }
 }
 
+Text joined(const std::vector<Text>& parts) {
+  Text name;
+  for (const Text& part : parts) name += (name.empty() ? u"" : u"/") + part;
+  return name;
+}
+
+/// The name of an entry without the separators and dots that have no meaning.
+Text meant_name(TextView stored) {
+  Text name(stored.substr(0, stored.starts_with(u'/') ? 1 : 0));
+  while (!stored.empty()) {
+    const TextView part = stored.substr(0, stored.find(u'/'));
+    stored.remove_prefix(std::min(part.size() + 1, stored.size()));
+    if (part.empty() || part == u".") continue;
+    if (!name.empty() && name.back() != u'/') name += u'/';
+    name += part;
+  }
+  return name;
+}
+
+/// Reports the entries that are unpacked under a name that is safe on every system, but not their own.
+void report_changed_names(const archives::Archive& archive, const Text& items, bool keep_folders) {
+  const archives::EntryFilter filter(items);
+  for (std::uint64_t i = 0; i < archive.count(); ++i) {
+    const Text stored = archive.entry(i).name;
+    const auto parts = archives::safe_parts(stored);
+    if (!parts || !filter.matches(archives::parts_of(stored))) continue;
+    if (!keep_folders && stored.ends_with(u'/')) continue;
+    Text meant = meant_name(stored);
+    if (!keep_folders) meant.erase(0, meant.find_last_of(u'/') + 1);
+    const Text made = keep_folders ? joined(*parts) : parts->back();
+    if (made != meant) std::cerr << "talutil: " << json::text(stored) << " is unpacked as " << json::text(made) << '\n';
+  }
+}
+
 void print_entries(const archives::Archive& archive) {
   constexpr std::int64_t seconds_a_day = 86400;
   constexpr double epoch = 25569;  // 1 January 1970 as an automation date
@@ -142,9 +180,17 @@ void zip(const ZipOptions& options) {
       throw usage_failure("--aes wants a password: give --encrypt or --password-file");
     }
     if (options.volume_size != 0) packing.volume_size = options.volume_size;
-    ProgressBar bar("packing");
-    Progress progress = bar.progress();
-    archives::pack(text_of(options.archive), item_list(options.items), packing, platform.folders, progress);
+    const Text name = text_of(options.archive);
+    const auto report = [&] { report_changed_names(archives::Archive(name, platform.folders), {}, true); };
+    try {
+      ProgressBar bar("packing");
+      Progress progress = bar.progress();
+      archives::pack(name, item_list(options.items), packing, platform.folders, progress);
+    } catch (const archives::Error& error) {
+      if (error.code() == archives::Code::incomplete) report();
+      throw;
+    }
+    report();
   });
 }
 
@@ -158,6 +204,7 @@ void unzip(const UnzipOptions& options) {
     unpacking.password = read_password(options.password_file);
     unpacking.overwrite = options.overwrite;
     unpacking.keep_folders = !options.no_folders;
+    report_changed_names(archive, unpacking.items, unpacking.keep_folders);
     ProgressBar bar("unpacking");
     Progress progress = bar.progress();
     archive.extract(text_of(options.destination), unpacking, platform.folders, platform.files,

@@ -198,6 +198,11 @@ expect 'zip --test' 0 'a.zip: 2 entries, all well' zip --test a.zip --password-f
 expect 'zip --test without the password' 1 'talutil: a.zip: archived/one.txt: no password was given (code 9)' zip --test a.zip
 expect_part 'unzip --list' 0 ' *archived/one.txt' unzip --list a.zip
 expect 'unzip' 0 '' unzip a.zip --to unpacked --password-file key.txt
+mkdir odd && touch odd/aux.c odd/plain
+expect 'zip of a name that changes' 0 'talutil: "odd/aux.c" is unpacked as "odd/_aux.c"' zip odd.zip odd
+expect 'unzip of it' 0 'talutil: "odd/aux.c" is unpacked as "odd/_aux.c"' unzip odd.zip --to unpacked
+expect 'unzip of it alone' 0 'talutil: "odd/aux.c" is unpacked as "_aux.c"' unzip odd.zip aux.c --to unpacked --no-folders
+expect 'unzip of another' 0 '' unzip odd.zip odd/plain --to unpacked
 expect_part 'zip without items' 2 'name what is to be packed' zip a.zip
 expect_part 'AES without a password' 2 'give --encrypt or --password-file' zip a.zip archived --aes
 verdict 'unpacked' '' "$(diff -r archived unpacked/archived 2>&1)"
