@@ -225,7 +225,8 @@ std::uint64_t prefix_length(StoredFile& archive) {
     const std::uint64_t place = end.position - records;
     return place > end.zip64_offset && has(place, zip64_end_signature) ? place - end.zip64_offset : 0;
   }
-  if (end.entries == 0 || end.size > end.position || has(end.offset, central_signature)) return 0;
+  if (end.entries == 0 || end.size > end.position) return 0;
+  // Before the end record and not where it says: the bytes before may be an archive too, with a directory there.
   const std::uint64_t place = end.position - end.size;
   return place > end.offset && has(place, central_signature) ? place - end.offset : 0;
 }
