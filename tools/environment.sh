@@ -7,7 +7,7 @@ talutil_build=${TALUTIL_BUILD:-$talutil_top/build}
 talutil_cache=${XDG_CACHE_HOME:-$HOME/.cache}/talutil
 
 native_packages="build-essential zlib1g-dev cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata"
-exchange_packages="zip unzip p7zip-full python3 poppler-utils qpdf fonts-dejavu-core"
+exchange_packages="zip unzip p7zip-full libarchive-tools advancecomp python3 poppler-utils qpdf fonts-dejavu-core"
 fuzz_packages="clang"
 windows_packages="binutils libz-mingw-w64-dev debootstrap debian-archive-keyring g++-mingw-w64-i686-posix mingw-w64-tools xvfb xauth"
 windows64_packages="libz-mingw-w64-dev g++-mingw-w64-x86-64-posix mingw-w64-tools wine64 xvfb xauth"
@@ -38,6 +38,14 @@ need_packages() {
 
 # The variant of the third-party libraries that a preset uses.
 flavour_of() { case $1 in windows* | fuzz) echo "$1" ;; *) echo native ;; esac; }
+
+# Builds a preset, or a target of it, with its libraries; prints only what has failed: build PRESET [TARGET]
+build() {
+  tools/third_party.sh "$(flavour_of "$1")" >/dev/null
+  cmake --preset "$1" >"$talutil_build/$1-configure.log" 2>&1 || { cat "$talutil_build/$1-configure.log"; return 1; }
+  cmake --build --preset "$1" ${2:+--target "$2"} >"$talutil_build/$1-build.log" 2>&1 ||
+    { grep -E -A8 'error|FAILED' "$talutil_build/$1-build.log" | head -60; return 1; }
+}
 
 # The Wine root is a small i386 Debian, because 32-bit Wine cannot be installed alongside the 64-bit packages. Its
 # folder is named by a hash of the recipe, so that all checkouts on the machine share it and a changed recipe creates a
