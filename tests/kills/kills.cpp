@@ -19,6 +19,7 @@
 #include <random>
 #include <set>
 #include <span>
+#include <stdexcept>
 #include <thread>
 
 #include "archives/packing.hpp"
@@ -193,10 +194,15 @@ void check_settings(Host& host) {
   });
 }
 
-/// All in one file.
+/// All in one file. That a value could not be written, for the wait for others took too long, is not reported, so it is
+/// read back.
 void write_profile(Host& host, int worker, std::uintmax_t number) {
   Text value = from_utf8(content(worker, number));
-  host.utils.SaveCfgFileData(u"a", from_utf8(key_of(worker, number)), value, host.folder + u"p.ini", Boolean(true));
+  const Text key = from_utf8(key_of(worker, number));
+  host.utils.SaveCfgFileData(u"a", key, value, host.folder + u"p.ini", Boolean(true));
+  if (host.platform.profiles.value(host.folder + u"p.ini", u"a", key) != value) {
+    throw std::runtime_error("the value is not in the file");
+  }
 }
 
 void check_profile(Host& host) {
