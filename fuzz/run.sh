@@ -21,7 +21,8 @@ run() {
   mkdir -p "$fuzzers/corpus/$name"
   # Leaks are looked for once, at the end. The limits allow for a machine that is busy with something else.
   timeout $((seconds + 300)) "$fuzzers/$name" -seed=1 -max_total_time="$seconds" -max_len=$longest -timeout=60 \
-    -detect_leaks=0 -print_final_stats=1 -artifact_prefix="$fuzzers/broken/$name-" "$fuzzers/corpus/$name" >"$fuzzers/$name.log" 2>&1
+    -detect_leaks=0 -print_final_stats=1 -artifact_prefix="$fuzzers/broken/$name-" "$fuzzers/corpus/$name" \
+    >"$fuzzers/$name.log" 2>&1
 }
 export -f run
 export fuzzers seconds
