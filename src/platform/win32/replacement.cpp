@@ -22,9 +22,7 @@ const Text& machine_prefix() {
     std::array<wchar_t, MAX_COMPUTERNAME_LENGTH + 1> name{};
     DWORD length = static_cast<DWORD>(name.size());
     if (GetComputerNameW(name.data(), &length) == 0) length = 0;
-    std::uint32_t hash = 0x811C9DC5;  // FNV-1a.
-    for (const char16_t unit : view(name.data(), length)) hash = (hash ^ unit) * 0x01000193;
-    return Text(temporary_prefix) + number_to_text(static_cast<std::int32_t>(hash >> 1U)) + u"-";
+    return Text(temporary_prefix) + short_name_of(view(name.data(), length)) + u"-";
   }();
   return prefix;
 }
@@ -52,6 +50,12 @@ bool is_stale(const WIN32_FIND_DATAW& entry) {
 }
 
 }  // namespace
+
+Text short_name_of(TextView name) {
+  std::uint32_t hash = 0x811C9DC5;  // FNV-1a.
+  for (const char16_t unit : name) hash = (hash ^ unit) * 0x01000193;
+  return number_to_text(static_cast<std::int32_t>(hash >> 1U));
+}
 
 bool is_in_use(DWORD code) noexcept { return code == ERROR_SHARING_VIOLATION || code == ERROR_LOCK_VIOLATION; }
 
@@ -102,7 +106,8 @@ void Replacement::remove_stale() const {
   } while (FindNextFileW(search.get(), &entry) != 0);
 }
 
-/// Gives the new version the attributes and the rights of the old one; the latter only if this user may change them.
+/// Gives the new version the time of creation, the attributes and the rights of the old one; the latter only if this
+/// user may change them.
 ///
 /// ReplaceFile would do so too, but takes the name from the old file before it gives it to the new one, so that a
 /// process that is killed in between leaves no file of that name.
@@ -114,8 +119,12 @@ void Replacement::keep_properties(const Text& target) const {
   if (GetFileSecurityW(wide(target), DACL_SECURITY_INFORMATION, rights.data(), size, &size) != 0) {
     SetFileSecurityW(wide(temporary_), DACL_SECURITY_INFORMATION, rights.data());
   }
-  const DWORD attributes = GetFileAttributesW(wide(target));
-  if (attributes != INVALID_FILE_ATTRIBUTES) SetFileAttributesW(wide(temporary_), attributes);
+  WIN32_FILE_ATTRIBUTE_DATA facts{};
+  if (GetFileAttributesExW(wide(target), GetFileExInfoStandard, &facts) == 0) return;
+  const Owned<kind::File> file(CreateFileW(wide(temporary_), FILE_WRITE_ATTRIBUTES, FILE_SHARE_READ | FILE_SHARE_WRITE,
+                                           nullptr, OPEN_EXISTING, 0, nullptr));
+  if (file) SetFileTime(file.get(), &facts.ftCreationTime, nullptr, nullptr);
+  SetFileAttributesW(wide(temporary_), facts.dwFileAttributes);
 }
 
 void Replacement::take_name(const Text& name, DWORD attributes, bool replaces, Keep keep) {

@@ -40,6 +40,9 @@ class Replacement {
   Owned<kind::File> file_;
 };
 
+/// A short name for a longer one, which differs for others in all likelihood.
+[[nodiscard]] Text short_name_of(TextView name);
+
 /// Writes all bytes at the file's position. Raises 61 or 57.
 void write_all(const Owned<kind::File>& file, std::string_view bytes);
 

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 
-#include "automation/numbers.hpp"
 #include "automation/run_time_error.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/last_error.hpp"
@@ -92,9 +91,7 @@ class Win32NewFile final : public NewFile {
   /// the old one is neither open nor replaced for a moment, and whoever read it then would undo the other's changes.
   /// The lock is a file that nobody else can open and that goes with its handle.
   [[nodiscard]] static Owned<kind::File> take_turn(const Text& folder, TextView name) {
-    std::uint32_t hash = 0x811C9DC5;  // FNV-1a; the name itself could become too long.
-    for (const char16_t unit : upper_case(name)) hash = (hash ^ unit) * 0x01000193;
-    const Text path = folder + Text(temporary_prefix) + u"lock" + number_to_text(static_cast<std::int32_t>(hash));
+    const Text path = folder + Text(temporary_prefix) + u"lock" + short_name_of(upper_case(name));
     Owned<kind::File> file;
     const DWORD code = retried([&] {
       file.reset(CreateFileW(wide(path), GENERIC_WRITE, 0, nullptr, OPEN_ALWAYS,

@@ -20,7 +20,7 @@ class ScriptedCalls {
   ScriptedCalls& operator=(const ScriptedCalls&) = delete;
   ~ScriptedCalls();
 
-  /// The calls of FlushFileBuffers, ReplaceFileW and MoveFileExW with their flags, and of Sleep, each with "!" if it
+  /// The calls of FlushFileBuffers, of MoveFileExW with its flags, and of Sleep, each with "!" if it
   /// failed; like ones in a row are counted.
   [[nodiscard]] std::string log() const;
 

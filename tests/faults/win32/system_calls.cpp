@@ -32,7 +32,6 @@ constexpr Call calls[] = {
     {"WriteFile", {ERROR_DISK_FULL, ERROR_WRITE_FAULT}},
     {"FlushFileBuffers", {ERROR_DISK_FULL, ERROR_IO_DEVICE}},
     {"MoveFileExW", {ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION, ERROR_IO_DEVICE}},
-    {"ReplaceFileW", {ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION, ERROR_UNABLE_TO_REMOVE_REPLACED, ERROR_IO_DEVICE}},
     {"DeleteFileW", {ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION}},
     {"CreateDirectoryW", {ERROR_ACCESS_DENIED, ERROR_DISK_FULL}},
     {"GetFileSizeEx", {ERROR_IO_DEVICE}},
@@ -77,7 +76,7 @@ Function* real(const char* name) {
 template <class... Arguments>
 bool is_refused(std::string_view name, const Arguments&... arguments) {
   if (failing == nullptr) return false;
-  if (failing->allowed == Allowed::no_replacing) return name == "MoveFileExW" || name == "ReplaceFileW";
+  if (failing->allowed == Allowed::no_replacing) return name == "MoveFileExW";
   if constexpr (sizeof...(Arguments) == 7) {  // CreateFileW.
     return failing->allowed == Allowed::no_new_files && std::get<4>(std::tie(arguments...)) == CREATE_NEW;
   }
@@ -112,9 +111,6 @@ struct Watched<Result(Arguments...), number> {
   static DWORD follow_script(std::string_view name, const Arguments&... arguments) {
     const auto all = std::tie(arguments...);
     std::string flags;
-    constexpr bool is_replacing =  // ReplaceFileW; LockFileEx has as many arguments.
-        sizeof...(Arguments) == 6 && std::is_same_v<std::tuple_element_t<0, std::tuple<Arguments...>>, LPCWSTR>;
-    if constexpr (is_replacing) flags = "(" + std::to_string(std::get<3>(all)) + ")";
     if constexpr (std::is_same_v<std::tuple<Arguments...>, std::tuple<LPCWSTR, LPCWSTR, DWORD>>) {
       flags = "(" + std::to_string(std::get<2>(all)) + ")";
     }
@@ -122,16 +118,8 @@ struct Watched<Result(Arguments...), number> {
       if (std::get<4>(all) == CREATE_NEW) script->created.emplace_back(std::get<0>(all));
     }
     const DWORD code = script->next_code(std::string(name));
-    if (name == "FlushFileBuffers" || name == "ReplaceFileW" || name == "MoveFileExW") {
+    if (name == "FlushFileBuffers" || name == "MoveFileExW") {
       script->note(std::string(name) + flags + (code == 0 ? "" : "!"));
-    }
-    // As documented: the old file has lost its name, or has another.
-    if constexpr (is_replacing) {
-      if (code == ERROR_UNABLE_TO_MOVE_REPLACEMENT) real<decltype(DeleteFileW)>("DeleteFileW")(std::get<0>(all));
-      if (code == ERROR_UNABLE_TO_MOVE_REPLACEMENT_2) {
-        real<decltype(MoveFileExW)>("MoveFileExW")(std::get<0>(all), (std::wstring(std::get<0>(all)) + L".old").c_str(),
-                                                   0);
-      }
     }
     return code;
   }
@@ -201,14 +189,13 @@ WATCHED(ReadFile, 1);
 WATCHED(WriteFile, 2);
 WATCHED(FlushFileBuffers, 3);
 WATCHED(MoveFileExW, 4);
-WATCHED(ReplaceFileW, 5);
-WATCHED(DeleteFileW, 6);
-WATCHED(CreateDirectoryW, 7);
-WATCHED(GetFileSizeEx, 8);
-WATCHED(SetFilePointerEx, 9);
-WATCHED(SetEndOfFile, 10);
-WATCHED(SetFileTime, 11);
-WATCHED(FindFirstFileW, 12);
-WATCHED(FindNextFileW, 13);
-WATCHED(LockFileEx, 14);
+WATCHED(DeleteFileW, 5);
+WATCHED(CreateDirectoryW, 6);
+WATCHED(GetFileSizeEx, 7);
+WATCHED(SetFilePointerEx, 8);
+WATCHED(SetEndOfFile, 9);
+WATCHED(SetFileTime, 10);
+WATCHED(FindFirstFileW, 11);
+WATCHED(FindNextFileW, 12);
+WATCHED(LockFileEx, 13);
 IMPORTED_AS(Sleep, no_sleep);
