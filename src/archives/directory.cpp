@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <limits>
+#include <map>
 #include <optional>
 
 #include "archives/archive_error.hpp"
@@ -18,6 +19,7 @@ constexpr std::uint64_t longest_comment = 0xFFFF;
 constexpr std::uint32_t full32 = 0xFFFFFFFF;
 constexpr std::uint16_t full16 = 0xFFFF;
 constexpr std::uint16_t descriptor_flag = 8;
+constexpr std::uint16_t utf8_flag = 0x800;
 
 /// The contents of the end record and its zip64 form.
 struct End {
@@ -246,6 +248,79 @@ std::unique_ptr<StoredFile> without_prefix(std::unique_ptr<StoredFile> archive) 
   };
   const std::uint64_t start = prefix_length(*archive);
   return start == 0 ? std::move(archive) : std::make_unique<Rest>(std::move(archive), start);
+}
+
+namespace {
+
+/// Bytes that are to be read in the place of others.
+using Patches = std::map<std::uint64_t, std::string>;
+
+bool is_readable_utf8(std::string_view name) {
+  const bool has_control = std::ranges::any_of(name, [](unsigned char byte) { return byte < 0x20; });
+  return !has_control && to_utf8(from_utf8(name)) == name;
+}
+
+void add_patches(const DirectoryEntry& entry, std::uint64_t place, Patches& patches) {
+  const std::string_view header = entry.header;
+  const std::string_view name = header.substr(central_header_size, entry.name_length());
+  const auto flags = number_at<std::uint16_t>(header, 8);
+  if ((flags & utf8_flag) != 0 && !is_readable_utf8(name)) {
+    patches[place + 8] = {header[8], static_cast<char>(header[9] & ~(utf8_flag >> 8U))};
+  }
+  std::size_t at = central_header_size + entry.name_length();
+  const std::size_t end = at + entry.extra_length();
+  while (end - at >= 4) {
+    const std::size_t rest = end - at - 4;
+    const std::size_t length = number_at<std::uint16_t>(header, at + 2);
+    if (length > rest) {
+      patches[place + at] = {'\xFE', '\xFF', static_cast<char>(rest & 0xFFU), static_cast<char>(rest >> 8U)};
+      return;
+    }
+    at += 4 + length;
+  }
+  if (at < end) patches[place + at] = std::string(end - at, '\0');
+}
+
+/// A file in which some bytes are others.
+class PatchedFile final : public StoredFile {
+ public:
+  PatchedFile(std::unique_ptr<StoredFile> whole, Patches patches)
+      : whole_(std::move(whole)), patches_(std::move(patches)) {}
+  [[nodiscard]] std::uint64_t size() const noexcept override { return whole_->size(); }
+  std::size_t read_at(std::uint64_t offset, std::span<char> buffer) override {
+    constexpr std::uint64_t longest = 4;
+    const std::size_t count = whole_->read_at(offset, buffer);
+    for (auto patch = patches_.lower_bound(offset - std::min(offset, longest));
+         patch != patches_.end() && patch->first < offset + count; ++patch) {
+      for (std::size_t i = 0; i < patch->second.size(); ++i) {
+        const std::uint64_t at = patch->first + i;
+        if (at >= offset && at < offset + count) buffer[static_cast<std::size_t>(at - offset)] = patch->second[i];
+      }
+    }
+    return count;
+  }
+
+ private:
+  std::unique_ptr<StoredFile> whole_;
+  Patches patches_;
+};
+
+}  // namespace
+
+std::unique_ptr<StoredFile> with_readable_headers(std::unique_ptr<StoredFile> archive) {
+  Patches patches;
+  try {
+    const std::uint64_t start = 0;
+    const Directory directory = read_directory(*archive, {&start, 1});
+    std::uint64_t place = directory.start;
+    for (const DirectoryEntry& entry : directory.entries) {
+      add_patches(entry, place, patches);
+      place += entry.header.size();
+    }
+  } catch (const Error&) {
+    return archive;  // It is reported when it is opened.
+  }
+  return patches.empty() ? std::move(archive) : std::make_unique<PatchedFile>(std::move(archive), std::move(patches));
 }
 
 std::uint32_t volumes_before(StoredFile& last_volume) {

@@ -62,6 +62,12 @@ void require_matching_headers(StoredFile& archive, const Directory& directory);
 /// The archive without such bytes.
 [[nodiscard]] std::unique_ptr<StoredFile> without_prefix(std::unique_ptr<StoredFile> archive);
 
+/// The archive as the container library accepts it. Where one entry has extra fields that do not fit into their place,
+/// or a name that is said to be UTF-8 and is not, the library would refuse all others as well: such fields are given
+/// the length of the rest, stray bytes after them are zero, and such names count as code page 437. An archive in
+/// pieces, or one whose directory cannot be read, is returned as it is.
+[[nodiscard]] std::unique_ptr<StoredFile> with_readable_headers(std::unique_ptr<StoredFile> archive);
+
 /// Reads exactly `count` bytes. Fails with unexpected_end if the file is shorter.
 [[nodiscard]] std::string read_exactly(StoredFile& file, std::uint64_t offset, std::uint64_t count);
 

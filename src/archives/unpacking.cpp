@@ -55,7 +55,7 @@ struct WrongPassword {};
 class Archive::Reader {
  public:
   explicit Reader(std::unique_ptr<StoredFile> file)
-      : file_(without_prefix(std::move(file))), container_(checked(*file_), fault_) {}
+      : file_(with_readable_headers(without_prefix(std::move(file)))), container_(checked(*file_), fault_) {}
 
   [[nodiscard]] zip_t* get() const noexcept { return container_.get(); }
   [[nodiscard]] std::uint64_t size() const noexcept { return file_->size(); }
