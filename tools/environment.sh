@@ -6,6 +6,10 @@ talutil_top=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)
 talutil_build=${TALUTIL_BUILD:-$talutil_top/build}
 talutil_cache=${XDG_CACHE_HOME:-$HOME/.cache}/talutil
 
+# Where small files are made by the thousand.
+memory_folder=/tmp
+[ ! -w /dev/shm ] || memory_folder=/dev/shm
+
 native_packages="build-essential zlib1g-dev cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata"
 exchange_packages="zip unzip p7zip-full libarchive-tools advancecomp python3 poppler-utils qpdf fonts-dejavu-core"
 fuzz_packages="clang"
@@ -142,7 +146,7 @@ build_below_wine() { [ $wine_bits = 64 ] && echo "$talutil_build" || echo /build
 # The environment of programs in Wine. A test may choose another locale for them.
 wine_environment() {
   printf '%s\n' PATH=/usr/bin:/bin:/usr/sbin:/sbin USER=root "LANG=${WINE_LANG:-C.UTF-8}" \
-    ${WINE_LANG:+"LC_ALL=$WINE_LANG"} ${WINE_LOCPATH:+"LOCPATH=$WINE_LOCPATH"} ${DISPLAY:+"DISPLAY=$DISPLAY"} \
+    ${WINE_LANG:+"LC_ALL=$WINE_LANG"} ${WINE_LOCPATH:+"LOCPATH=$WINE_LOCPATH"} ${TALUTIL_WHOLE:+"TALUTIL_WHOLE=1"} ${DISPLAY:+"DISPLAY=$DISPLAY"} \
     "WINEDEBUG=${WINEDEBUG:--all}" 'WINEDLLOVERRIDES=winedbg.exe=d;mscoree=d;mshtml=d'
 }
 

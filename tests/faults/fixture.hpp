@@ -18,7 +18,9 @@ inline std::size_t stride() { return is_whole() ? 1 : stride_of_short_form(); }
 /// Reports how much was tried, which no check can.
 struct Counts final : ::testing::Environment {
   void TearDown() override {
-    std::printf("%zu failing calls, %zu failing allocations, %zu power cuts\n", failures, allocations, cuts);
+    const ::testing::UnitTest& tests = *::testing::UnitTest::GetInstance();
+    std::printf("%zu failing calls, %zu failing allocations, %zu power cuts\n%d passed, %d failed\n", failures,
+                allocations, cuts, tests.successful_test_count(), tests.failed_test_count());
   }
   static inline std::size_t failures = 0;
   static inline std::size_t allocations = 0;
