@@ -145,7 +145,7 @@ void FrmSysInfo::on_click(std::uint8_t part) {
       if (const Text typed = view.text(path); is_item_shown() && !typed.empty()) show_item(view, typed);
       break;
     case choose_folder:
-      if (const auto folder = platform.folder_picker.choose(u"Folder", library().components().owner_handle())) {
+      if (const auto folder = platform.folder_picker.choose(u"Folder", view.dialog_owner())) {
         show_item(view, *folder);
       }
       break;

@@ -106,6 +106,9 @@ class FormView {
   /// @param bar_column a column of percentages to be drawn as bars; -1 for none
   virtual void set_table(std::uint8_t part, TableSource& table, std::int32_t bar_column) = 0;
 
+  /// The window as an owner of the system's dialogs; 0 where there are no windows.
+  [[nodiscard]] virtual std::intptr_t dialog_owner() const = 0;
+
   /// Copies a text to the clipboard.
   virtual void copy(TextView text) = 0;
 

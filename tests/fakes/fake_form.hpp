@@ -50,6 +50,7 @@ class FakeForm final : public FormView {
   void set_colour(std::int32_t colour) override { state_.colour = colour; }
   void remove_frame() override { state_.has_frame = false; }
   void keep_on_top() override { state_.uses.emplace_back("on top"); }
+  [[nodiscard]] std::intptr_t dialog_owner() const override { return 0x5678; }
   void keep_open() override { state_.uses.emplace_back("kept open"); }
   void fit() override {}
   void set_tabs(std::uint8_t /*part*/, std::span<const TextView> captions) override {

@@ -282,7 +282,7 @@ void pages_are_shown(HWND window) {
   std::array<wchar_t, 40> item{};
   GetMenuStringW(GetSubMenu(GetSubMenu(GetMenu(window), 2), 1), 0, item.data(), static_cast<int>(item.size()),
                  MF_BYPOSITION);
-  check_equal(L"Vertcial", std::wstring(item.data()), "the spelling that users know");
+  check_equal(L"&Vertcial", std::wstring(item.data()), "the spelling that users know, with a letter");
   key(VK_ESCAPE);
 }
 

@@ -28,6 +28,7 @@ class TerminalForm final : public FormView {
   void remove_frame() override {}
   void keep_on_top() override {}
   void keep_open() override {}
+  [[nodiscard]] std::intptr_t dialog_owner() const override { return 0; }
   void fit() override {}
   void set_tabs(std::uint8_t /*part*/, std::span<const TextView> /*captions*/) override {}
   void set_table(std::uint8_t /*part*/, TableSource& /*table*/, std::int32_t /*bar_column*/) override {}

@@ -82,6 +82,7 @@ class FormWindow final : public TopWindow, public FormView {
     if (auto& list = parts_->of(part).table) list->show(table, bar_column);
   }
 
+  [[nodiscard]] std::intptr_t dialog_owner() const override { return reinterpret_cast<std::intptr_t>(handle()); }
   void copy(TextView text) override { put_on_clipboard(handle(), text); }
 
   void show() override {

@@ -15,19 +15,36 @@ constexpr UINT first_command = 100;
 
 UINT command_of(PreviewMenu item) noexcept { return first_command + static_cast<UINT>(item); }
 
+/// A caption with a letter that Alt, or the letter alone in an open menu, chooses it by: the first one that no caption
+/// before it in the same menu has.
+Text with_letter(TextView caption, Text& taken) {
+  Text result(caption);
+  for (std::size_t i = 0; i < result.size(); ++i) {
+    const char16_t letter = upper_case(result[i]);
+    const bool is_usable = (letter >= u'A' && letter <= u'Z') || (letter >= u'0' && letter <= u'9');
+    if (!is_usable || taken.find(letter) != Text::npos) continue;
+    taken += letter;
+    return result.insert(i, 1, u'&');
+  }
+  return result;
+}
+
 Owned<kind::Menu> make_menu() {
   Owned<kind::Menu> menu(CreateMenu());
   HMENU levels[3] = {menu.get(), nullptr, nullptr};
+  Text taken[3];
   for (std::size_t i = 0; i < std::size(preview_menu); ++i) {
     const PreviewMenuItem& item = preview_menu[i];
     const bool opens = i + 1 < std::size(preview_menu) && preview_menu[i + 1].level > item.level;
+    const Text caption = with_letter(item.caption, taken[item.level]);
     if (opens) {
       Owned<kind::Menu> popup(CreatePopupMenu());
       const BOOL is_added =
-          AppendMenuW(levels[item.level], MF_POPUP, reinterpret_cast<UINT_PTR>(popup.get()), wide(Text(item.caption)));
+          AppendMenuW(levels[item.level], MF_POPUP, reinterpret_cast<UINT_PTR>(popup.get()), wide(caption));
+      taken[item.level + 1].clear();
       levels[item.level + 1] = is_added != FALSE ? popup.release() : nullptr;
     } else {
-      AppendMenuW(levels[item.level], MF_STRING, command_of(item.item), wide(Text(item.caption)));
+      AppendMenuW(levels[item.level], MF_STRING, command_of(item.item), wide(caption));
     }
   }
   return menu;
