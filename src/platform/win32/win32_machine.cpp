@@ -69,28 +69,32 @@ WORD native_architecture() {
 }
 
 /// Adds up the page files; the other figures of the system count memory as well.
-struct PageFiles {
+class PageFiles {
+ public:
   std::uint64_t total = 0;
   std::uint64_t used = 0;
 
   PageFiles() {
-    struct File {  // ENUM_PAGE_FILE_INFORMATION
-      DWORD size, reserved;
-      SIZE_T total, used, most_used;
-    };
-    using Add = BOOL(CALLBACK*)(void*, File*, const wchar_t*);
-    const auto enumerate = late_function<BOOL(WINAPI*)(Add, void*)>(L"psapi.dll", "EnumPageFilesW");
+    const auto enumerate = late_function<BOOL(WINAPI*)(BOOL(CALLBACK*)(void*, File*, const wchar_t*), void*)>(
+        L"psapi.dll", "EnumPageFilesW");
     if (enumerate == nullptr) return;
-    const Add add = [](void* sums, File* file, const wchar_t* /*name*/) -> BOOL {
-      static_cast<PageFiles*>(sums)->total += file->total;
-      static_cast<PageFiles*>(sums)->used += file->used;
-      return TRUE;
-    };
-    enumerate(add, this);
+    enumerate(&add, this);
     SYSTEM_INFO system{};
     GetSystemInfo(&system);
     total *= system.dwPageSize;
     used *= system.dwPageSize;
+  }
+
+ private:
+  struct File {  // ENUM_PAGE_FILE_INFORMATION
+    DWORD size, reserved;
+    SIZE_T total, used, most_used;
+  };
+
+  static BOOL CALLBACK add(void* sums, File* file, const wchar_t* /*name*/) {
+    static_cast<PageFiles*>(sums)->total += file->total;
+    static_cast<PageFiles*>(sums)->used += file->used;
+    return TRUE;
   }
 };
 
