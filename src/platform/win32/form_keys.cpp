@@ -66,12 +66,14 @@ void FormKeys::focus(HWND control) {
 
 void FormKeys::return_focus() {
   if (focused_ != nullptr && IsChild(window_, focused_) != FALSE) return focus(focused_);
-  // A text to be read comes before the buttons above it, which Space would press.
-  auto first = std::ranges::find_if(parts_, [](const PlacedPart& placed) { return placed.is(PartKind::rich_text); });
   // Never a prompt, even if it can be scrolled.
-  if (first == parts_.end()) {
-    first = std::ranges::find_if(
-        parts_, [](const PlacedPart& placed) { return placed.is_visible && !placed.is(PartKind::label); });
+  auto first = std::ranges::find_if(
+      parts_, [](const PlacedPart& placed) { return placed.is_visible && !placed.is(PartKind::label); });
+  // A text to be read comes before the buttons above it, which Space would press.
+  if (first != parts_.end() && first->is(PartKind::button)) {
+    const auto text =
+        std::ranges::find_if(parts_, [](const PlacedPart& placed) { return placed.is(PartKind::rich_text); });
+    if (text != parts_.end()) first = text;
   }
   focus(first == parts_.end() ? nullptr : first->window);
 }
