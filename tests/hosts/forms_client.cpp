@@ -334,6 +334,7 @@ void nothing_is_left(_ORVUtils* u, int openings) {
 }  // namespace
 
 int wmain(int count, wchar_t** arguments) {
+  SetProcessDPIAware();  // Otherwise the system scales its windows.
   enter_desktop();
   pictures = std::wstring(arguments[1]) + L"\\..\\screenshots\\" + (count > 3 ? arguments[3] : L"");
   return run_checks([&] {

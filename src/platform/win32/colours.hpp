@@ -16,4 +16,11 @@ inline COLORREF colour_of(std::int32_t colour) noexcept {
   return GetSysColor(index <= COLOR_MENUBAR ? index : COLOR_BTNFACE);
 }
 
+/// Black or white, whichever contrasts more with a colour.
+[[nodiscard]] inline COLORREF readable_on(COLORREF colour) noexcept {
+  constexpr int middle = 128'000;
+  const int brightness = GetRValue(colour) * 299 + GetGValue(colour) * 587 + GetBValue(colour) * 114;
+  return brightness < middle ? RGB(255, 255, 255) : RGB(0, 0, 0);
+}
+
 }  // namespace talutil::win32

@@ -132,8 +132,18 @@ const PlacedPart& FormParts::of(std::uint8_t id) const {
 
 PlacedPart& FormParts::of(std::uint8_t id) { return const_cast<PlacedPart&>(std::as_const(*this).of(id)); }
 
-bool FormParts::has_tabs() const noexcept {
-  return std::ranges::any_of(parts_, [](const PlacedPart& placed) { return placed.is(PartKind::tabs); });
+std::optional<LRESULT> FormParts::draw_page_behind(HWND control, HDC device) {
+  const PlacedPart* const label = find(control);
+  const auto tabs = std::ranges::find_if(parts_, [](const PlacedPart& placed) { return placed.is(PartKind::tabs); });
+  if (label == nullptr || !label->is(PartKind::label) || tabs == parts_.end()) return std::nullopt;
+  POINT place{};
+  POINT before{};
+  MapWindowPoints(control, tabs->window, &place, 1);
+  SetViewportOrgEx(device, static_cast<int>(-place.x), static_cast<int>(-place.y), &before);
+  SendMessageW(tabs->window, WM_PRINTCLIENT, reinterpret_cast<WPARAM>(device), PRF_CLIENT);
+  SetViewportOrgEx(device, static_cast<int>(before.x), static_cast<int>(before.y), nullptr);
+  SetBkMode(device, TRANSPARENT);
+  return reinterpret_cast<LRESULT>(GetStockObject(NULL_BRUSH));
 }
 
 PlacedPart* FormParts::find(HWND control) noexcept {

@@ -30,7 +30,9 @@ class FormParts {
   [[nodiscard]] auto begin() noexcept { return parts_.begin(); }
   [[nodiscard]] auto end() noexcept { return parts_.end(); }
 
-  [[nodiscard]] bool has_tabs() const noexcept;
+  /// Draws the page of a tab behind a label, instead of the buttons' background, which has another colour. Returns the
+  /// brush that is left for the label itself, or nothing if there are no tabs.
+  [[nodiscard]] std::optional<LRESULT> draw_page_behind(HWND control, HDC device);
 
   /// A part by its number. Raises 51 if there is no such part.
   [[nodiscard]] const PlacedPart& of(std::uint8_t id) const;

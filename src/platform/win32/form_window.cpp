@@ -18,13 +18,6 @@ constexpr DWORD window_style(const FormDescription& description) {
   return description.is_resizable ? WS_OVERLAPPEDWINDOW : WS_POPUP | WS_CAPTION | WS_SYSMENU;
 }
 
-/// Black or white, whichever contrasts more with a colour.
-COLORREF readable_on(COLORREF colour) noexcept {
-  constexpr int middle = 128'000;
-  const int brightness = GetRValue(colour) * 299 + GetGValue(colour) * 587 + GetBValue(colour) * 114;
-  return brightness < middle ? RGB(255, 255, 255) : RGB(0, 0, 0);
-}
-
 class FormWindow final : public TopWindow, public FormView {
  public:
   FormWindow(FormEvents& events, const FormDescription& description)
@@ -225,13 +218,7 @@ class FormWindow final : public TopWindow, public FormView {
   }
 
   [[nodiscard]] std::optional<LRESULT> colour_part(HDC device, HWND control) {
-    // A label on the page of a tab, which may be white, must not have the buttons' background.
-    const PlacedPart* const placed = parts_->find(control);
-    if (!brush_ && placed != nullptr && placed->is(PartKind::label) && parts_->has_tabs()) {
-      SetBkMode(device, TRANSPARENT);
-      return reinterpret_cast<LRESULT>(GetStockObject(NULL_BRUSH));
-    }
-    if (!brush_) return std::nullopt;
+    if (!brush_) return parts_->draw_page_behind(control, device);
     SetBkMode(device, TRANSPARENT);
     SetTextColor(device, readable_on(colour_));
     SetBkColor(device, colour_);
