@@ -138,10 +138,9 @@ void looks_are_those_of_the_system(_ORVUtils* u) {
       const std::wstring module = module_of(lists[0]).wstring();
       check(module.find(L"common-controls") != std::wstring::npos, "the later controls, from " + narrow(module));
     }
+    windows_follow_dots(window, "system");
     ShowWindow(window, SW_MAXIMIZE);
     take_picture(L"maximised-system");
-    ShowWindow(window, SW_RESTORE);
-    windows_follow_dots(window, "system");
     PostMessageW(window, WM_CLOSE, 0, 0);
   };
   check_equal(1,
