@@ -36,6 +36,7 @@ BUILDS = {
 CHECKS = {
     "native": {
         "unit tests": "build/asan/tests/unit_tests",
+        "tests/faults": "build/asan/tests/fault_tests",
         "tests/cli": "tests/cli/run.sh build/asan/talutil",
         "tests/archives/exchange": "tests/archives/exchange.sh build/asan/talutil",
         "docs/TALUtil.idl": "build/asan/talutil idl | diff docs/TALUtil.idl -",
