@@ -46,14 +46,16 @@ std::int32_t PrintControl::PageHeight() const noexcept {
   return orientation_ == landscape ? paper.width : paper.height;
 }
 
-std::int32_t PrintControl::PageCount() const noexcept { return static_cast<std::int32_t>(document_.pages.size()); }
+std::int32_t PrintControl::PageCount() const noexcept {
+  return document_ ? static_cast<std::int32_t>(document_->pages.size()) : 0;
+}
 
 void PrintControl::put_CurrentPage(std::int32_t page) {
   current_page_ = std::clamp(page, std::min(1, PageCount()), PageCount());
 }
 
 const Page* PrintControl::shown_page() const {
-  return current_page_ < 1 ? nullptr : &document_.pages[static_cast<std::size_t>(current_page_) - 1];
+  return current_page_ < 1 ? nullptr : &document_->pages[static_cast<std::size_t>(current_page_) - 1];
 }
 
 std::optional<TwipsRectangle> PrintControl::guides() const {
@@ -94,8 +96,7 @@ void PrintControl::StartDoc() {
   setup.has_rule = HeaderRule == 1;
   setup.footer = format_date(platform_.clock.now(), u"DD/MM/YYYY");
   setup.wraps_words = bool(WordWrap);
-  document_ = {};
-  current_page_ = 0;
+  discard();
   composer_.emplace(metrics_, std::move(setup));
   if (const TextView title = trim_blanks(Header); !title.empty()) composer_->begin_section(Text(title));
 }
@@ -130,26 +131,30 @@ void PrintControl::put_RenderControl(std::int32_t window) {
 }
 
 void PrintControl::EndDoc() {
-  document_ = composer().finish();
+  document_ = std::make_shared<const Document>(composer().finish());
   composer_.reset();
   put_CurrentPage(1);
 }
 
+void PrintControl::discard() noexcept {
+  document_.reset();
+  current_page_ = 0;
+}
+
 void PrintControl::PrintDoc(Boolean dialog) {
-  if (document_.pages.empty()) raise(ErrorNumber::invalid_procedure_call);
-  const PrintSettings settings{DocName.empty() ? document_.title : DocName, paper_size_, orientation_, duplex_,
+  const auto document = document_;
+  if (!document) raise(ErrorNumber::invalid_procedure_call);
+  const PrintSettings settings{DocName.empty() ? document->title : DocName, paper_size_, orientation_, duplex_,
                                bool(dialog)};
-  if (!platform_.printers.print(document_, settings)) {
-    raise(ErrorNumber::cancelled);
-  }
+  if (!platform_.printers.print(*document, settings)) raise(ErrorNumber::cancelled);
 }
 
 void PdfExport::ConvertDocument(const Variant& control, const Text& file) const {
   const auto* const object = control.get_if<ObjectRef>();
   const auto* const source = object == nullptr ? nullptr : dynamic_cast<PrintControl*>(object->get());
   if (source == nullptr) raise(ErrorNumber::type_mismatch);
-  const Document& document = source->document();
-  write_pdf(document, {Title.empty() ? document.title : Title, Author, Subject, Creator}, platform_.font_files,
+  const auto document = source->document() ? source->document() : std::make_shared<const Document>();
+  write_pdf(*document, {Title.empty() ? document->title : Title, Author, Subject, Creator}, platform_.font_files,
             platform_.files, file);
 }
 

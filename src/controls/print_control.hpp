@@ -87,7 +87,12 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   /// there is no printer or printing fails, 5 if there is no document.
   void PrintDoc(Boolean dialog);
 
-  [[nodiscard]] const Document& document() const noexcept { return document_; }
+  /// Discards the document.
+  void discard() noexcept;
+
+  /// Null before the first document and after it is discarded. Whoever uses it while messages are processed must hold
+  /// it, because a host may begin the next document meanwhile.
+  [[nodiscard]] const std::shared_ptr<const Document>& document() const noexcept { return document_; }
 
   [[nodiscard]] const Page* shown_page() const override;
   [[nodiscard]] float zoom_percent() const override { return zoom_; }
@@ -100,7 +105,7 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   const Platform& platform_;
   FontMetrics metrics_;
   std::optional<ReportComposer> composer_;
-  Document document_;
+  std::shared_ptr<const Document> document_;
   float zoom_ = 100;
   std::int32_t paper_size_ = 9;
   std::int32_t orientation_ = 0;

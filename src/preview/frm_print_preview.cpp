@@ -75,8 +75,13 @@ FrmPrintPreview::FrmPrintPreview(Library& library) : library_(library) {}
 
 FrmPrintPreview::~FrmPrintPreview() = default;
 
-void FrmPrintPreview::load() {
-  if (is_loaded()) return;
+FrmPrintPreview::Building::Building(FrmPrintPreview& form, bool unattended) : form_(form) {
+  if (form.is_building_ || (form.is_shown() && !unattended)) raise(ErrorNumber::form_already_displayed);
+  form.is_building_ = true;
+}
+
+void FrmPrintPreview::load_controls() {
+  if (print_) return;
   // Everything is created before anything is stored, so that a failure does not leave half a window.
   const ControlFactory& controls = library_.controls();
   const Locale locale = library_.locale();
@@ -86,20 +91,23 @@ void FrmPrintPreview::load() {
   dialog->put(u"DialogTitle", u"Save Data to PDF File");
   dialog->put(u"Filter", u"Adobe PDF Format *.pdf|*.pdf");
   pdf->put(u"Subject", u"ORV PDF Data");
-  auto view =
-      library_.platform().form_windows.make_preview(*this, dynamic_cast<const PreviewPages*>(print->object().get()));
-  auto form = std::make_shared<FormObject>(*view, locale);
-  utils_ = std::make_unique<ORVUtils>(library_);
   print_ = std::move(print);
   save_dialog_ = std::move(dialog);
   pdf_export_ = std::move(pdf);
-  view_ = std::move(view);
-  form_ = std::move(form);
+}
 
-  is_loading_ = true;
+void FrmPrintPreview::load() {
+  if (is_loaded()) return;
+  load_controls();
+  const auto window = std::make_shared<Window>();
+  window->view =
+      library_.platform().form_windows.make_preview(*this, dynamic_cast<const PreviewPages*>(print_->object().get()));
+  window->form = std::make_shared<FormObject>(*window->view, library_.locale());
+  window->utils = std::make_unique<ORVUtils>(library_);
+  window_ = window;
   try {
-    utils_->AppendEventLog(u"FormLoad", Text(form_name));
-    utils_->LoadWindowState(form_, Text(settings_section));
+    window->utils->AppendEventLog(u"FormLoad", Text(form_name));
+    window->utils->LoadWindowState(window->form, Text(settings_section));
     twips_x_ = library_.platform().screen.twips_per_pixel_x();
     twips_y_ = library_.platform().screen.twips_per_pixel_y();
   } catch (...) {
@@ -108,134 +116,138 @@ void FrmPrintPreview::load() {
   }
 }
 
-const Control& FrmPrintPreview::print_control() {
+Control FrmPrintPreview::print_control() {
   load();
   return *print_;
 }
 
 void FrmPrintPreview::query_unload() {
-  if (!utils_) return;
-  const auto utils = std::move(utils_);
-  utils->AppendEventLog(u"FormQueryUnLoad", Text(form_name));
-  utils->SaveWindowState(form_, Text(settings_section));
-}
-
-void FrmPrintPreview::unload() {
-  if (!is_loaded()) return;
   struct Dropped {
     FrmPrintPreview& form;
     ~Dropped() { form.drop(); }
   };
+  const auto window = window_;
   const Dropped dropped{*this};
+  const auto utils = std::move(window->utils);
+  utils->AppendEventLog(u"FormQueryUnLoad", Text(form_name));
+  utils->SaveWindowState(window->form, Text(settings_section));
+}
+
+void FrmPrintPreview::unload() {
+  if (!is_loaded()) return;
+  // The view reports the closing, which unloads. Only the waiting call drops the view, when its loop has ended.
+  if (is_shown()) return window_->view->close();
   query_unload();
 }
 
 void FrmPrintPreview::drop() noexcept {
-  utils_.reset();
-  form_.reset();
-  view_.reset();
-  print_.reset();
-  save_dialog_.reset();
-  pdf_export_.reset();
+  window_.reset();
+  // The control keeps its settings for the next report, but not the memory of this one's pages.
+  if (auto* const pages = dynamic_cast<PrintControl*>(print_->object().get())) pages->discard();
 }
 
 void FrmPrintPreview::show_modal() {
-  if (is_shown_) raise(ErrorNumber::form_already_displayed);
+  if (is_shown()) raise(ErrorNumber::form_already_displayed);
   load();
-  struct Shown {
-    bool& flag;
-    ~Shown() { flag = false; }
-  };
-  is_shown_ = true;
+  const auto window = window_;
   {
-    const Shown shown{is_shown_};
-    failure_ = nullptr;
-    view_->show_modal();
+    struct Shown {
+      bool& flag;
+      ~Shown() { flag = false; }
+    };
+    window->is_shown = true;
+    const Shown shown{window->is_shown};
+    window->view->show_modal();
   }
-  unload();
-  if (failure_) std::rethrow_exception(std::exchange(failure_, nullptr));
+  if (window_ == window) unload();
+  if (window->failure) std::rethrow_exception(window->failure);
 }
 
 /// An error of the control closes the window: its user could not do anything about it, but the caller of show_modal
 /// can.
 template <class Work>
 void FrmPrintPreview::guarded(Work work) noexcept {
+  const auto window = window_;
+  if (!window) return;
   try {
-    if (is_loaded()) work();
+    work(*window);
   } catch (...) {
-    failure_ = std::current_exception();
-    silently([this] { view_->close(); });
+    if (!window->failure) window->failure = std::current_exception();
+    silently([&] { window->view->close(); });
   }
 }
 
-void FrmPrintPreview::show_caption() {
+void FrmPrintPreview::show_caption(PreviewView& view) {
   const auto page = print_->get<std::int16_t>(u"CurrentPage");
   const auto count = print_->get<std::int16_t>(u"PageCount");
-  view_->set_caption((caption_text_.empty() ? report_name_ : caption_text_) + u"           Page " +
+  view.set_caption((caption_text_.empty() ? report_name_ : caption_text_) + u"           Page " +
                      number_to_text(std::int32_t{page}) + u" of " + number_to_text(std::int32_t{count}) +
                      u"      Press F9 to Print.");
 }
 
-void FrmPrintPreview::go_to(std::int32_t page) {
+void FrmPrintPreview::go_to(PreviewView& view, std::int32_t page) {
   print_->put(u"CurrentPage", static_cast<std::int16_t>(page));
-  view_->show_page();
-  show_caption();
+  view.show_page();
+  show_caption(view);
 }
 
 void FrmPrintPreview::activated() noexcept {
-  guarded([this] {
-    if (view_->window_state() == minimised) view_->set_window_state(normal);
-    show_caption();
-    do_chosen(PreviewMenu::mnuPrev);
-    is_loading_ = false;
+  guarded([this](Window& window) {
+    PreviewView& view = *window.view;
+    if (view.window_state() == minimised) view.set_window_state(normal);
+    show_caption(view);
+    do_chosen(window, PreviewMenu::mnuPrev);
+    window.is_loading = false;
   });
 }
 
 void FrmPrintPreview::resized() noexcept {
-  guarded([this] { keep_size(); });
+  guarded([this](Window& window) { keep_size(*window.view); });
 }
 
-void FrmPrintPreview::keep_size() {
+void FrmPrintPreview::keep_size(PreviewView& view) {
   constexpr float smallest_width = 600;  // In pixels, like the next two.
   constexpr float smallest_height = 400;
   constexpr float frame = 10;
   if (twips_x_ == 0) return;
-  if (view_->window_state() == minimised) view_->set_window_state(normal);
-  if (view_->inner_height() <= 0) return;
-  if (view_->width() < smallest_width * twips_x_) view_->set_width(smallest_width * twips_x_);
-  if (view_->height() < smallest_height * twips_y_) view_->set_height(smallest_height * twips_y_);
-  view_->size_pages(view_->inner_width() - frame * twips_x_, view_->inner_height() - frame * twips_y_);
+  if (view.window_state() == minimised) view.set_window_state(normal);
+  if (view.inner_height() <= 0) return;
+  if (view.width() < smallest_width * twips_x_) view.set_width(smallest_width * twips_x_);
+  if (view.height() < smallest_height * twips_y_) view.set_height(smallest_height * twips_y_);
+  view.size_pages(view.inner_width() - frame * twips_x_, view.inner_height() - frame * twips_y_);
 }
 
-void FrmPrintPreview::set_zoom(PreviewMenu chosen_item) {
+void FrmPrintPreview::set_zoom(PreviewView& view, PreviewMenu chosen_item) {
   const auto* const chosen = std::ranges::find(zoom_items, chosen_item, &ZoomItem::item);
   print_->put(u"Zoom", chosen->percent);
-  for (const ZoomItem& zoom : zoom_items) view_->check(zoom.item, false);
-  view_->check(chosen->item, true);
-  view_->show_page();
+  for (const ZoomItem& zoom : zoom_items) view.check(zoom.item, false);
+  view.check(chosen->item, true);
+  view.show_page();
 }
 
 void FrmPrintPreview::zoom_step(bool larger) noexcept {
-  guarded([&] {
+  guarded([&](Window& window) {
     const auto zoom = print_->get<double>(u"Zoom");
     if (larger) {
       const auto* const next =
           std::ranges::find_if(zoom_items, [&](const ZoomItem& item) { return item.percent > zoom; });
-      if (next != std::end(zoom_items)) set_zoom(next->item);
+      if (next != std::end(zoom_items)) set_zoom(*window.view, next->item);
     } else {
       const auto next = std::find_if(std::rbegin(zoom_items), std::rend(zoom_items),
                                      [&](const ZoomItem& item) { return item.percent < zoom; });
-      if (next != std::rend(zoom_items)) set_zoom(next->item);
+      if (next != std::rend(zoom_items)) set_zoom(*window.view, next->item);
     }
   });
 }
 
-void FrmPrintPreview::export_to_chosen_file() {
+void FrmPrintPreview::export_to_chosen_file(const Window& window) {
   save_dialog_->put(u"CancelError", Boolean(true));
   save_dialog_->put(u"InitDir", export_folder_);
-  utils_->VerifyFilePath(save_dialog_->get<Text>(u"InitDir"));
+  window.utils->VerifyFilePath(save_dialog_->get<Text>(u"InitDir"));
   save_dialog_->put(u"FileName", u"*.pdf");
   save_dialog_->call(u"ShowSave");
+  // The dialog processes messages, and a host's timer may have unloaded the window along with its document.
+  if (window_.get() != &window) return;
   const Text file = save_dialog_->get<Text>(u"FileName");
   if (!file.empty()) ExportToPDF(file, Boolean(false));
 }
@@ -245,27 +257,28 @@ void FrmPrintPreview::ExportToPDF(const Text& path, Boolean /*flag*/) {
     load();
     // A copy, because ExtractPathName changes its argument, but the export needs the path as the host passed it.
     Text whole = path;
-    library_.platform().files.make_path(utils_->ExtractPathName(whole));
+    library_.platform().files.make_path(window_->utils->ExtractPathName(whole));
     pdf_export_->call(u"ConvertDocument", {print_->object(), path});
   });
 }
 
-void FrmPrintPreview::do_chosen(PreviewMenu item) {
+void FrmPrintPreview::do_chosen(Window& window, PreviewMenu item) {
+  PreviewView& view = *window.view;
   switch (item) {
     case PreviewMenu::mnuPrinter:
       silently([this] { print_->call(u"PrintDoc", {Boolean(true)}); });
       break;
     case PreviewMenu::mnuExportPDF:
-      silently([this] { export_to_chosen_file(); });
+      silently([&] { export_to_chosen_file(window); });
       break;
     case PreviewMenu::mnuClose:
-      view_->close();
+      view.close();
       break;
     case PreviewMenu::mnuPrev:
-      go_to(std::max<std::int32_t>(1, print_->get<std::int16_t>(u"CurrentPage") - 1));
+      go_to(view, std::max<std::int32_t>(1, print_->get<std::int16_t>(u"CurrentPage") - 1));
       break;
     case PreviewMenu::mnuNext:
-      go_to(std::min<std::int32_t>(print_->get<std::int16_t>(u"PageCount"),
+      go_to(view, std::min<std::int32_t>(print_->get<std::int16_t>(u"PageCount"),
                                    print_->get<std::int16_t>(u"CurrentPage") + 1));
       break;
     case PreviewMenu::mnuA3:
@@ -284,17 +297,17 @@ void FrmPrintPreview::do_chosen(PreviewMenu item) {
       print_->put(u"Duplex", std::int16_t{3});
       break;
     default:
-      if (std::ranges::find(zoom_items, item, &ZoomItem::item) != std::end(zoom_items)) set_zoom(item);
+      if (std::ranges::find(zoom_items, item, &ZoomItem::item) != std::end(zoom_items)) set_zoom(view, item);
       break;
   }
 }
 
 void FrmPrintPreview::chosen(PreviewMenu item) noexcept {
-  guarded([&] { do_chosen(item); });
+  guarded([&](Window& window) { do_chosen(window, item); });
 }
 
 std::int32_t FrmPrintPreview::key_down(std::int32_t code) noexcept {
-  if (is_loading_ || !is_loaded() || code == key_alt) return code;
+  if (!is_loaded() || window_->is_loading || code == key_alt) return code;
   if (code == key_escape) chosen(PreviewMenu::mnuClose);
   if (code == key_f9) chosen(PreviewMenu::mnuPrinter);
   if (code == key_f2) chosen(PreviewMenu::mnuPrev);
@@ -304,7 +317,7 @@ std::int32_t FrmPrintPreview::key_down(std::int32_t code) noexcept {
 }
 
 void FrmPrintPreview::closing() noexcept {
-  guarded([this] { query_unload(); });
+  guarded([this](Window& /*window*/) { query_unload(); });
 }
 
 }  // namespace talutil

@@ -56,8 +56,9 @@ Text grid_header(const Text& report, const Variant& from, const Variant& to, con
 }
 
 /// Begins a report on A4 with its name as the header.
-const Control& begin_plain_report(FrmPrintPreview& form, std::int16_t zoom, const CommonSettings& settings) {
-  const Control& print = form.print_control();
+Control begin_plain_report(FrmPrintPreview& form, std::int16_t zoom, const CommonSettings& settings) {
+  form.set_caption_text({});
+  Control print = form.print_control();
   print.put(u"Zoom", static_cast<double>(zoom));
   print.put(u"PaperSize", paper_a4);
   set_up(form, print, settings);
@@ -72,28 +73,31 @@ void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16
                                 const Text& sReportName, const Text& sCsvName, const Variant& ctlGrid,
                                 const Variant& vStDate, const Variant& vEnDate, const Text& fWindowCaption) {
   FrmPrintPreview& form = library_.part<FrmPrintPreview>();
-  form.set_caption_text(fWindowCaption);
-  const Control& print = form.print_control();
-  print.put(u"HeaderFontName", u"Courier New");
-  print.put(u"FontName", u"Courier New");
-  print.put(u"Zoom", static_cast<double>(iZoomLevel));
-  // Any other text leaves the setting from the previous report.
-  if (settings().sGridPaperDuplex == u"Horizontal") print.put(u"Duplex", std::int16_t{3});
-  if (settings().sGridPaperDuplex == u"Simplex") print.put(u"Duplex", std::int16_t{1});
-  if (settings().sGridPaperDuplex == u"Vertical") print.put(u"Duplex", std::int16_t{2});
-  if (settings().sGridPaperSize == u"A3") print.put(u"PaperSize", paper_a3);
-  if (settings().sGridPaperSize == u"A4") print.put(u"PaperSize", paper_a4);
-  set_up(form, print, {iPrintDirection, sReportName, sCsvName});
-  print.put(u"Header", grid_header(sReportName, vStDate, vEnDate, locale()));
+  const bool is_unattended = settings().AutomatedEndOfMonth.is_exactly_true();
+  {
+    const FrmPrintPreview::Building building(form, is_unattended);
+    form.set_caption_text(fWindowCaption);
+    const Control print = form.print_control();
+    print.put(u"HeaderFontName", u"Courier New");
+    print.put(u"FontName", u"Courier New");
+    print.put(u"Zoom", static_cast<double>(iZoomLevel));
+    // Any other text leaves the setting from the previous report.
+    if (settings().sGridPaperDuplex == u"Horizontal") print.put(u"Duplex", std::int16_t{3});
+    if (settings().sGridPaperDuplex == u"Simplex") print.put(u"Duplex", std::int16_t{1});
+    if (settings().sGridPaperDuplex == u"Vertical") print.put(u"Duplex", std::int16_t{2});
+    if (settings().sGridPaperSize == u"A3") print.put(u"PaperSize", paper_a3);
+    if (settings().sGridPaperSize == u"A4") print.put(u"PaperSize", paper_a4);
+    set_up(form, print, {iPrintDirection, sReportName, sCsvName});
+    print.put(u"Header", grid_header(sReportName, vStDate, vEnDate, locale()));
 
-  const Control grid(ctlGrid, locale());
-  print.call(u"StartDoc");
-  // Our print control lays out the grid by querying it; a third-party one only gets its window.
-  if (print.answers(u"RenderObject")) print.put(u"RenderObject", grid.object());
-  print.put(u"RenderControl", grid.get<std::int32_t>(u"hwnd"));
-  print.call(u"EndDoc");
-
-  if (!settings().AutomatedEndOfMonth.is_exactly_true()) return form.show_modal();
+    const Control grid(ctlGrid, locale());
+    print.call(u"StartDoc");
+    // Our print control lays out the grid by querying it; a third-party one only gets its window.
+    if (print.answers(u"RenderObject")) print.put(u"RenderObject", grid.object());
+    print.put(u"RenderControl", grid.get<std::int32_t>(u"hwnd"));
+    print.call(u"EndDoc");
+  }
+  if (!is_unattended) return form.show_modal();
   for (const MonthEndReport& report : month_end_reports) {
     if (fWindowCaption == report.caption) form.ExportToPDF(Text(report.path), Boolean(false));
   }
@@ -103,9 +107,12 @@ void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16
 void ORVUtils::TextBoxPrintPreview(const std::int16_t& iZoomLevel, const std::int16_t& iPrintDirection,
                                    const Text& sReportName, const Text& sCsvName, const Variant& ctlTextBox) {
   FrmPrintPreview& form = library_.part<FrmPrintPreview>();
-  const Control& print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
-  print.put(u"Text", Control(ctlTextBox, locale()).get<Text>(u"Text"));
-  print.call(u"EndDoc");
+  {
+    const FrmPrintPreview::Building building(form, false);
+    const Control print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
+    print.put(u"Text", Control(ctlTextBox, locale()).get<Text>(u"Text"));
+    print.call(u"EndDoc");
+  }
   form.show_modal();
 }
 
@@ -114,19 +121,22 @@ void ORVUtils::ListBoxPrintPreview(const std::int16_t& iZoomLevel, const std::in
   constexpr std::int32_t height = 567;  // 1 cm.
   constexpr double pitch = 680.4;       // Fractions are lost by rounding at every line.
   FrmPrintPreview& form = library_.part<FrmPrintPreview>();
-  const Control& print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
-  const Control list(ctlListBox, locale());
-  const auto count = list.get<std::int32_t>(u"ListCount");
-  const auto left = print.get<std::int32_t>(u"MarginLeft");
-  const auto top = print.get<std::int32_t>(u"MarginTop");
-  const auto right = print.get<std::int32_t>(u"MarginRight");
-  const std::int32_t width = print.get<std::int32_t>(u"PageWidth") - (left + right);
-  std::int32_t y = 0;
-  for (std::int32_t i = 0; i < count; ++i) {
-    print.call(u"TextBox", {list.get<Text>(u"List", {i}), left, checked_add(top, y), width, height});
-    y = round_to<std::int32_t>(y + pitch);
+  {
+    const FrmPrintPreview::Building building(form, false);
+    const Control print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
+    const Control list(ctlListBox, locale());
+    const auto count = list.get<std::int32_t>(u"ListCount");
+    const auto left = print.get<std::int32_t>(u"MarginLeft");
+    const auto top = print.get<std::int32_t>(u"MarginTop");
+    const auto right = print.get<std::int32_t>(u"MarginRight");
+    const std::int32_t width = print.get<std::int32_t>(u"PageWidth") - (left + right);
+    std::int32_t y = 0;
+    for (std::int32_t i = 0; i < count; ++i) {
+      print.call(u"TextBox", {list.get<Text>(u"List", {i}), left, checked_add(top, y), width, height});
+      y = round_to<std::int32_t>(y + pitch);
+    }
+    print.call(u"EndDoc");
   }
-  print.call(u"EndDoc");
   form.show_modal();
 }
 

@@ -77,7 +77,8 @@ struct FakePlatform : MessageBoxes,
   std::vector<Message> input_boxes;
   std::deque<Text> chosen_files;  ///< What file dialogs answer; without one they are cancelled.
   std::vector<FileDialog> file_dialogs;
-  std::vector<std::string> drawn;  ///< What was drawn and printed, in words.
+  std::function<void()> during_dialogs;  ///< What a host's timer does while a file or printer dialog is open.
+  std::vector<std::string> drawn;        ///< What was drawn and printed, in words.
   std::int32_t pointer_resets = 0;
   FakePreviewState preview;  ///< What the preview window shows, and what its user does.
   FakeFormState form;        ///< What the other windows show.
@@ -155,6 +156,7 @@ struct FakePlatform : MessageBoxes,
 
   std::optional<ChosenFile> choose(const FileDialog& dialog) override {
     file_dialogs.push_back(dialog);
+    if (during_dialogs) during_dialogs();
     std::optional<Text> path = next_of(chosen_files);
     return path ? std::optional(ChosenFile{std::move(*path), dialog.filter_index}) : std::nullopt;
   }
@@ -178,6 +180,7 @@ struct FakePlatform : MessageBoxes,
   std::vector<std::uint8_t> wide_font(bool /*is_fixed_width*/) override { return {}; }
   bool print(const Document& document, const PrintSettings& settings) override {
     print_jobs.push_back(settings);
+    if (during_dialogs) during_dialogs();
     return prints && !document.pages.empty();
   }
 

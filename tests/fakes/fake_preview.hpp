@@ -3,6 +3,7 @@
 #include <functional>
 #include <set>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "platform/preview_view.hpp"
@@ -61,11 +62,14 @@ class FakePreview final : public PreviewView {
     if (state_.user) state_.user(events_);
     close();
   }
-  void close() override { events_.closing(); }
+  void close() override {
+    if (!std::exchange(is_closed_, true)) events_.closing();
+  }
 
  private:
   FakePreviewState& state_;
   PreviewEvents& events_;
+  bool is_closed_ = false;
 };
 
 }  // namespace talutil::testing

@@ -221,6 +221,109 @@ TEST_F(Builders, ErrorsOfPagingReachTheCallerOthersNobody) {
   EXPECT_FALSE(library.part<FrmPrintPreview>().is_loaded()) << "a log that cannot be written leaves no half window";
 }
 
+/// A host that calls builders at every opportunity.
+struct Meanwhile : Preview {
+  std::shared_ptr<RecordingControl> text = std::make_shared<RecordingControl>();
+  std::shared_ptr<RecordingControl> grid = std::make_shared<RecordingControl>();
+
+  Meanwhile() {
+    text->values["Text"] = u"one\ftwo";
+    grid->values = {{"hwnd", 1}, {"Rows", 1}, {"Cols", 1}, {"TextMatrix(0&, 0&)", u"cell"}};
+  }
+
+  std::int32_t show(const Text& name) {
+    library.settings().AutomatedEndOfMonth = Boolean(false);
+    return error_of([&] { utils.TextBoxPrintPreview(100, 1, name, u"C:\\" + name, ObjectRef(text)); });
+  }
+  std::int32_t write(const Text& caption) {
+    library.settings().AutomatedEndOfMonth = Boolean(true);
+    const Variant holder{ObjectRef(grid)};
+    return error_of([&] { utils.GridPrintPreview(50, 2, u"Month", u"", holder, Variant(), Variant(), caption); });
+  }
+  std::vector<std::int32_t> month_end() { return {write(u"BankSummaryReport"), write(u"SalesReport"), write(u"Other")}; }
+
+  [[nodiscard]] bool is_written(const Text& report) {
+    return platform.files.bytes(u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\" + report + u".pdf").starts_with("%PDF");
+  }
+  FrmPrintPreview& form = library.part<FrmPrintPreview>();
+};
+
+TEST_F(Meanwhile, AReportThatIsBeingBuiltOrShownIsNotTouched) {
+  std::vector<std::int32_t> errors;
+  const auto interfere = [&](const std::string& /*use*/) {
+    for (RecordingControl* const source : {text.get(), grid.get()}) source->before = {};
+    errors = {write(u"SalesReport"), show(u"Other")};
+  };
+  platform.preview.user = [&](PreviewEvents& events) {
+    EXPECT_EQ(platform.preview.captions.back(), u"Notes           Page 1 of 2      Press F9 to Print.");
+    EXPECT_EQ(show(u"Other"), 400);
+    EXPECT_EQ(form.print_control().get<double>(u"Zoom"), 100);
+    events.key_down(114);
+    EXPECT_EQ(platform.preview.captions.back(), u"Notes           Page 2 of 2      Press F9 to Print.");
+    platform.chosen_files = {u"C:\\a.pdf"};
+    events.chosen(PreviewMenu::mnuExportPDF);
+    EXPECT_EQ(platform.file_dialogs.back().folder, u"C:\\Notes");
+  };
+  text->before = interfere;
+  EXPECT_EQ(show(u"Notes"), 0);
+  EXPECT_THAT(errors, ElementsAre(400, 400));
+  EXPECT_FALSE(is_written(u"SalesReport"));
+  errors.clear();
+  grid->before = [&](const std::string& use) {
+    if (use.starts_with("TextMatrix")) interfere(use);
+  };
+  EXPECT_EQ(write(u"BankSummaryReport"), 0);
+  EXPECT_THAT(errors, ElementsAre(400, 400));
+  EXPECT_TRUE(is_written(u"BankSummaryReport"));
+  text->before = [](const std::string& /*use*/) { raise(ErrorNumber::permission_denied); };
+  EXPECT_EQ(show(u"Notes"), 70);
+  text->before = {};
+  EXPECT_EQ(show(u"Notes"), 0) << "a failed report does not block the next";
+  EXPECT_EQ(platform.preview.windows, 0);
+}
+
+TEST_F(Meanwhile, AMonthEndTakesThePlaceOfTheReportShown) {
+  library.settings().EventLog = 1;
+  library.settings().sORVPath = u"C:";
+  const testing::Rows<PreviewMenu> opportunities = {
+      {"a timer", PreviewMenu::mnuFile},
+      {"a timer while the printer dialog is open", PreviewMenu::mnuPrinter},
+      {"a timer while the file dialog is open", PreviewMenu::mnuExportPDF},
+  };
+  testing::check_rows(opportunities, [&](PreviewMenu item) {
+    platform.files.files.clear();
+    platform.preview.user = [&](PreviewEvents& events) {
+      platform.during_dialogs = [&] {
+        EXPECT_THAT(month_end(), ElementsAre(0, 0, 0));
+        EXPECT_FALSE(form.is_loaded());
+        EXPECT_EQ(platform.preview.windows, 1) << "the window outlives its loop";
+      };
+      platform.chosen_files = {u"C:\\chosen.pdf"};
+      if (item == PreviewMenu::mnuFile) platform.during_dialogs();
+      events.chosen(item);
+      platform.during_dialogs = {};
+      EXPECT_EQ(events.key_down(114), 114) << "it is nobody's window now";
+      events.resized();
+    };
+    EXPECT_EQ(show(u"Notes"), 0);
+    EXPECT_TRUE(is_written(u"BankSummaryReport") && is_written(u"SalesReport"));
+    EXPECT_EQ(platform.files.files.size(), 3U) << "and the log, but no month end under the name chosen for another";
+    EXPECT_EQ(platform.preview.windows, 0);
+    const std::string log = platform.files.bytes(u"C:\\EventLog.txt");
+    const std::string loaded = ":FormLoad:frmPrintPreview";
+    std::size_t loads = 0;
+    for (std::size_t at = log.find(loaded); at != std::string::npos; at = log.find(loaded, at + 1)) ++loads;
+    EXPECT_EQ(loads, 3U) << "the first report is built in the window shown, and each later one loads its own";
+  });
+  platform.preview.user = [&](PreviewEvents& /*events*/) {
+    EXPECT_THAT(month_end(), ElementsAre(0, 0, 0));
+    platform.preview.user = {};
+    EXPECT_EQ(show(u"Second"), 0) << "within the loop of the first";
+  };
+  EXPECT_EQ(show(u"First"), 0);
+  EXPECT_EQ(platform.preview.windows, 0);
+}
+
 struct Pages : Preview {
   std::shared_ptr<PrintControl> print = std::make_shared<PrintControl>(library.platform());
 
@@ -232,7 +335,7 @@ struct Pages : Preview {
     print->StartDoc();
     job();
     print->EndDoc();
-    return print->document();
+    return *print->document();
   }
   const Document& document_of(const Text& text) {
     return made_by([&] { print->put_Text(text); });
@@ -258,7 +361,7 @@ TEST_F(Pages, TextFlowsAndBreaks) {
   for (int i = 0; i < 61; ++i) lines += u"x\n";
   EXPECT_EQ(document_of(lines).pages.size(), 2U) << "60 lines of 240 twips";
   EXPECT_EQ(document_of(u"").pages.size(), 1U);
-  EXPECT_EQ(print->document().bookmarks.size(), 1U);
+  EXPECT_EQ(print->document()->bookmarks.size(), 1U);
   EXPECT_EQ(print->CurrentPage(), 1);
   print->MarginLeft = 12000;
   EXPECT_EQ(error_of([&] { print->StartDoc(); }), 5);
