@@ -9,6 +9,7 @@
 #include "controls/print_control.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
+#include "preview/paper_choices.hpp"
 
 namespace talutil {
 
@@ -281,22 +282,11 @@ void FrmPrintPreview::do_chosen(Window& window, PreviewMenu item) {
       go_to(view, std::min<std::int32_t>(print_->get<std::int16_t>(u"PageCount"),
                                    print_->get<std::int16_t>(u"CurrentPage") + 1));
       break;
-    case PreviewMenu::mnuA3:
-      print_->put(u"PaperSize", std::int16_t{8});
-      break;
-    case PreviewMenu::mnuA4:
-      print_->put(u"PaperSize", std::int16_t{9});
-      break;
-    case PreviewMenu::mnuSimplex:
-      print_->put(u"Duplex", std::int16_t{1});
-      break;
-    case PreviewMenu::mnuVertical:
-      print_->put(u"Duplex", std::int16_t{2});
-      break;
-    case PreviewMenu::mnuHorizontal:
-      print_->put(u"Duplex", std::int16_t{3});
-      break;
     default:
+      for (const auto& [property, choices] : {size_choices, duplex_choices}) {
+        const auto chosen = std::ranges::find(choices, item, &PaperChoice::item);
+        if (chosen != choices.end()) print_->put(property, chosen->code);
+      }
       if (std::ranges::find(zoom_items, item, &ZoomItem::item) != std::end(zoom_items)) set_zoom(view, item);
       break;
   }

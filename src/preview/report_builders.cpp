@@ -4,13 +4,11 @@
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "preview/frm_print_preview.hpp"
+#include "preview/paper_choices.hpp"
 
 namespace talutil {
 
 namespace {
-
-constexpr std::int16_t paper_a3 = 8;
-constexpr std::int16_t paper_a4 = 9;
 
 struct MonthEndReport {
   TextView caption;
@@ -26,6 +24,7 @@ constexpr MonthEndReport month_end_reports[] = {
 
 /// The settings that all reports share.
 struct CommonSettings {
+  TextView caption;
   std::int16_t direction;
   const Text& report_name;
   const Text& export_name;
@@ -39,8 +38,16 @@ void set_up(FrmPrintPreview& form, const Control& print, const CommonSettings& s
   print.put(PrintControl::text_scale_id, std::int16_t{100});
   if (settings.direction == 1) print.put(u"Orientation", std::int16_t{0});
   if (settings.direction == 2) print.put(u"Orientation", std::int16_t{1});
+  form.set_caption_text(Text(settings.caption));
   form.set_report_name(settings.report_name);
   form.set_export_folder(settings.export_name);
+}
+
+/// Any other text leaves the setting from the previous report.
+void choose(const Control& print, const PaperChoices& paper, const Text& setting) {
+  for (const PaperChoice& choice : paper.choices) {
+    if (setting == choice.setting) print.put(paper.property, choice.code);
+  }
 }
 
 bool is_unassigned(const Variant& value) { return value.is(Variant::Kind::empty); }
@@ -57,7 +64,6 @@ Text grid_header(const Text& report, const Variant& from, const Variant& to, con
 
 /// Begins a report on A4 with its name as the header.
 Control begin_plain_report(FrmPrintPreview& form, std::int16_t zoom, const CommonSettings& settings) {
-  form.set_caption_text({});
   Control print = form.print_control();
   print.put(u"Zoom", static_cast<double>(zoom));
   print.put(u"PaperSize", paper_a4);
@@ -76,18 +82,13 @@ void ORVUtils::GridPrintPreview(const std::int16_t& iZoomLevel, const std::int16
   const bool is_unattended = settings().AutomatedEndOfMonth.is_exactly_true();
   {
     const FrmPrintPreview::Building building(form, is_unattended);
-    form.set_caption_text(fWindowCaption);
     const Control print = form.print_control();
     print.put(u"HeaderFontName", u"Courier New");
     print.put(u"FontName", u"Courier New");
     print.put(u"Zoom", static_cast<double>(iZoomLevel));
-    // Any other text leaves the setting from the previous report.
-    if (settings().sGridPaperDuplex == u"Horizontal") print.put(u"Duplex", std::int16_t{3});
-    if (settings().sGridPaperDuplex == u"Simplex") print.put(u"Duplex", std::int16_t{1});
-    if (settings().sGridPaperDuplex == u"Vertical") print.put(u"Duplex", std::int16_t{2});
-    if (settings().sGridPaperSize == u"A3") print.put(u"PaperSize", paper_a3);
-    if (settings().sGridPaperSize == u"A4") print.put(u"PaperSize", paper_a4);
-    set_up(form, print, {iPrintDirection, sReportName, sCsvName});
+    choose(print, duplex_choices, settings().sGridPaperDuplex);
+    choose(print, size_choices, settings().sGridPaperSize);
+    set_up(form, print, {fWindowCaption, iPrintDirection, sReportName, sCsvName});
     print.put(u"Header", grid_header(sReportName, vStDate, vEnDate, locale()));
 
     const Control grid(ctlGrid, locale());
@@ -109,7 +110,7 @@ void ORVUtils::TextBoxPrintPreview(const std::int16_t& iZoomLevel, const std::in
   FrmPrintPreview& form = library_.part<FrmPrintPreview>();
   {
     const FrmPrintPreview::Building building(form, false);
-    const Control print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
+    const Control print = begin_plain_report(form, iZoomLevel, {{}, iPrintDirection, sReportName, sCsvName});
     print.put(u"Text", Control(ctlTextBox, locale()).get<Text>(u"Text"));
     print.call(u"EndDoc");
   }
@@ -123,7 +124,7 @@ void ORVUtils::ListBoxPrintPreview(const std::int16_t& iZoomLevel, const std::in
   FrmPrintPreview& form = library_.part<FrmPrintPreview>();
   {
     const FrmPrintPreview::Building building(form, false);
-    const Control print = begin_plain_report(form, iZoomLevel, {iPrintDirection, sReportName, sCsvName});
+    const Control print = begin_plain_report(form, iZoomLevel, {{}, iPrintDirection, sReportName, sCsvName});
     const Control list(ctlListBox, locale());
     const auto count = list.get<std::int32_t>(u"ListCount");
     const auto left = print.get<std::int32_t>(u"MarginLeft");

@@ -324,6 +324,26 @@ TEST_F(Meanwhile, AMonthEndTakesThePlaceOfTheReportShown) {
   EXPECT_EQ(platform.preview.windows, 0);
 }
 
+TEST_F(Meanwhile, PaperStaysForTheNextReportAndTheCaptionDoesNot) {
+  std::tuple<std::int32_t, std::int32_t, std::int32_t> paper;
+  platform.preview.user = [&](PreviewEvents& /*events*/) {
+    const Control print = form.print_control();
+    paper = {print.get<std::int32_t>(u"PaperSize"), print.get<std::int32_t>(u"Orientation"),
+             print.get<std::int32_t>(u"Duplex")};
+  };
+  library.settings().sGridPaperSize = u"A3";
+  library.settings().sGridPaperDuplex = u"Vertical";
+  EXPECT_EQ(write(u"Jobs"), 0);
+  library.settings().sGridPaperSize = library.settings().sGridPaperDuplex = u"unknown";
+  library.settings().AutomatedEndOfMonth = Boolean(false);
+  utils.GridPrintPreview(50, 7, u"Month", u"", ObjectRef(grid), Variant(), Variant(), u"Jobs");
+  EXPECT_EQ(paper, std::tuple(8, 1, 2));
+  EXPECT_THAT(to_utf8(platform.preview.captions.back()), ::testing::StartsWith("Jobs   "));
+  EXPECT_EQ(show(u"Notes"), 0);
+  EXPECT_EQ(paper, std::tuple(9, 0, 2));
+  EXPECT_THAT(to_utf8(platform.preview.captions.back()), ::testing::StartsWith("Notes   "));
+}
+
 struct Pages : Preview {
   std::shared_ptr<PrintControl> print = std::make_shared<PrintControl>(library.platform());
 
