@@ -91,6 +91,19 @@ TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
   EXPECT_GT(compared, 18U);
 }
 
+// In the embedded font, the letter is made of others, and the accented one is made of it.
+TEST_F(PdfTest, LettersMadeOfOthersAreWhole) {
+  const auto second_letter = [&](const Text& first) {
+    Document document;
+    Page& page = document.pages.emplace_back(Page{1440, 720, {}});
+    page.items.emplace_back(TextRun{0, 0, 400, {FontFamily::courier, false, 20}, true, 0, first});
+    page.items.emplace_back(TextRun{720, 0, 400, {FontFamily::courier, false, 20}, true, 0, u"\u03B5"});
+    write(document);
+    return output_of("pdftoppm -r 72 -gray -x 36 -y 0 -W 36 -H 36 " + path + " | od -An -tx1");
+  };
+  EXPECT_EQ(second_letter(u"\u03AD"), second_letter(u"\u03B5"));
+}
+
 TEST_F(PdfTest, BoxesHaveTheirColours) {
   Document document;
   Page& page = document.pages.emplace_back(Page{1440, 480, {}});
