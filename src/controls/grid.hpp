@@ -103,7 +103,11 @@ class Grid final : public TableObject<Grid>, public TableSource {
   Boolean WordWrap;            ///< Wraps long texts within their cells; otherwise they are cut off.
   std::int16_t GridLines = 1;  ///< 0 for none.
   std::int32_t GridColor = 0xC0C0C0;
-  std::int32_t BackColorFixed = 0xE8E8E8;  ///< Behind the fixed rows.
+  Boolean FontBold;
+  std::int32_t ForeColor = 0;
+  std::int32_t BackColor = 0xFFFFFF;
+  std::int32_t ForeColorFixed = 0;         ///< The letters of fixed rows and columns.
+  std::int32_t BackColorFixed = 0xE8E8E8;  ///< Behind them.
 
   /// The type of a column's values as an automation type: 11 is Boolean. 0 until it is set.
   [[nodiscard]] std::int16_t ColDataType(std::int32_t column) const { return at(column).data_type; }
@@ -213,7 +217,7 @@ constexpr auto members_of(std::type_identity<Grid>) {
       P::template property<&G::WordWrap>("WordWrap", "Long texts go on in the next line of their cell."),
       P::template property<&G::GridLines>("GridLines", "0 for no lines between the cells."),
       P::template property<&G::GridColor>("GridColor", "The colour of the lines."),
-      P::template property<&G::BackColorFixed>("BackColorFixed", "The colour behind the fixed rows."),
+      P::template property<&G::BackColorFixed>("BackColorFixed", "The colour behind fixed rows and columns."),
       P::template accessors<&G::Row, &G::put_Row>("Row", "The row where the selection begins."),
       P::template accessors<&G::RowSel, &G::put_RowSel>("RowSel", "The row where the selection ends."),
       P::template method<&G::Clear>("Clear", "Empties every cell."),
@@ -222,7 +226,11 @@ constexpr auto members_of(std::type_identity<Grid>) {
       P::template method<&G::SaveGrid>("SaveGrid", "Writes a file: 3 comma text, 4 tab text, 5 fixed text.", "FileName",
                                        "Format", optional("FixedCells", -1)),
       P::template method<&G::LoadGrid>("LoadGrid", "Reads such a file.", "FileName", "Format",
-                                       optional("FixedCells", -1)));
+                                       optional("FixedCells", -1)),
+      P::template property<&G::FontBold>("FontBold", "Its texts are bold."),
+      P::template property<&G::ForeColor>("ForeColor", "The colour of its texts."),
+      P::template property<&G::BackColor>("BackColor", "The colour behind them."),
+      P::template property<&G::ForeColorFixed>("ForeColorFixed", "The colour of the texts of fixed rows and columns."));
 }
 
 }  // namespace talutil

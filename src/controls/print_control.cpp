@@ -5,6 +5,7 @@
 
 #include "automation/checked.hpp"
 #include "automation/control.hpp"
+#include "documents/grid_contents.hpp"
 #include "documents/pdf_writer.hpp"
 
 namespace talutil {
@@ -98,7 +99,6 @@ void PrintControl::StartDoc() {
   setup.wraps_words = bool(WordWrap);
   discard();
   composer_.emplace(metrics_, std::move(setup));
-  if (const TextView title = trim_blanks(Header); !title.empty()) composer_->begin_section(Text(title));
 }
 
 void PrintControl::put_Text(const Text& text) { composer().add_text(text, text_font()); }
@@ -115,8 +115,9 @@ void PrintControl::put_RenderControl(std::int32_t window) {
   if (const auto* const object = source.get_if<ObjectRef>(); object != nullptr && *object) {
     const Control grid(*object, locale());
     if (grid.answers(u"Rows") && grid.answers(u"Cols") && grid.answers(u"TextMatrix")) {
-      composer().add_grid(grid, {family_of(FontName), false, 8});
-      return;
+      // Read before the composer is used: the host may start another document meanwhile.
+      const GridContents contents(grid, {family_of(FontName), false, 8});
+      return composer().add_grid(contents);
     }
   }
   WindowImage image = platform_.drawing.image_of(window);

@@ -2,7 +2,7 @@
 #include <algorithm>
 #include <cmath>
 
-#include "automation/control.hpp"
+#include "documents/grid_contents.hpp"
 #include "documents/report_composer.hpp"
 
 namespace talutil {
@@ -11,203 +11,182 @@ namespace {
 
 constexpr std::int32_t cell_padding = 60;
 constexpr std::int32_t hair_line = 10;
-constexpr double boolean_type = 11;
-constexpr std::int16_t check_box_setting = 5;
-constexpr std::uint32_t usual_heading_colour = 0x00E8E8E8;
-constexpr std::uint32_t usual_line_colour = 0x00C0C0C0;
 
-/// Reads a property that the grid may not have.
-template <class T>
-T answer_or(const Control& grid, TextView member, T otherwise) {
-  return grid.answers(member) ? grid.get<T>(member) : otherwise;
+using Contents = GridContents;
+
+std::int32_t height_of_lines(const Contents& grid, std::int32_t lines) noexcept {
+  return lines * line_height(grid.font) + cell_padding;
 }
 
-std::uint32_t colour_or(const Control& grid, TextView member, std::uint32_t otherwise) {
-  const auto colour = static_cast<std::uint32_t>(answer_or(grid, member, static_cast<std::int32_t>(otherwise)));
-  constexpr std::uint32_t system_colour = 0x80000000;
-  // A system colour depends on the user's screen, which has no place in a report.
-  return (colour & system_colour) != 0 ? otherwise : colour & 0xFFFFFF;
-}
-
-enum class Alignment : std::uint8_t { left, centre, right, general };
-
-/// Grid alignments come in threes (top, middle, bottom): left, centred, right. 9 is right for numbers, left for texts.
-Alignment alignment_of(std::int32_t code) noexcept {
-  return code < 0 || code > 8 ? Alignment::general : static_cast<Alignment>(code / 3);
+bool is_equal_heading(const Contents& grid, const Contents::Cell& one, const Contents::Cell& other) {
+  return !one.text.empty() && one.text == other.text && grid.look(one).background == grid.look(other).background;
 }
 
 }  // namespace
 
-/// The contents of a grid: read once, completely, before the first cell is laid out.
+/// How the columns and rows of a grid are divided among pages.
 struct ReportComposer::GridLayout {
-  struct Column {
-    std::int32_t index = 0;
-    std::int32_t width = 0;
-    bool is_boolean = false;
-    Alignment alignment = Alignment::general;
-  };
-  struct Cell {
-    Text text;
-    bool is_ticked = false;
+  /// A half-open range of columns that stand next to each other on a page, behind the repeated ones.
+  struct Part {
+    std::size_t first = 0;
+    std::size_t end = 0;
   };
 
-  FontStyle font;
-  std::uint32_t heading_colour = usual_heading_colour;
-  std::uint32_t line_colour = usual_line_colour;
-  bool has_lines = true;
-  bool wraps = false;
-  std::vector<Column> columns;
-  std::size_t heading_rows = 0;       ///< Among the rows that are shown.
-  std::vector<std::int32_t> heights;  ///< Of the rows that are shown; 0 for a row as high as its text.
-  std::vector<Cell> cells;            ///< Row by row.
+  const GridContents& grid;
+  std::vector<std::int32_t> widths;
+  std::vector<std::int32_t> heights;
+  std::size_t repeated = 0;  ///< The leading columns that stand on every page.
+  std::vector<Part> parts;
 
-  GridLayout(const Control& grid, const FontStyle& usual_font, std::int32_t room);
-
-  [[nodiscard]] std::size_t rows() const noexcept { return heights.size(); }
-  [[nodiscard]] const Cell& cell(std::size_t row, std::size_t column) const {
-    return cells[row * columns.size() + column];
-  }
-  [[nodiscard]] std::int32_t height_of_lines(std::int32_t lines) const noexcept {
-    return lines * line_height(font) + cell_padding;
+  /// Fixed columns are repeated unless they leave too little room for the others.
+  GridLayout(const GridContents& contents, std::int32_t room) : grid(contents) {
+    std::int32_t fixed_width = 0;
+    for (std::size_t c = 0; c < grid.columns.size(); ++c) {
+      widths.push_back(std::clamp(grid.columns[c].width, 2 * cell_padding, room));
+      if (c < grid.heading_columns) fixed_width = std::min(room, fixed_width + widths.back());
+    }
+    if (fixed_width <= room / 2) repeated = grid.heading_columns;
+    const std::int32_t left = room - (repeated == 0 ? 0 : fixed_width);
+    for (std::size_t first = repeated; first < widths.size();) {
+      Part part{first, first};
+      for (std::int32_t width = 0; part.end < widths.size(); ++part.end) {
+        std::int32_t& next = widths[part.end];
+        next = std::min(next, left);
+        if (part.end > first && width + next > left) break;
+        width += next;
+      }
+      first = part.end;
+      parts.push_back(part);
+    }
+    if (parts.empty() && repeated > 0) parts.push_back({repeated, repeated});
   }
 };
 
-ReportComposer::GridLayout::GridLayout(const Control& grid, const FontStyle& usual_font, std::int32_t room)
-    : font(usual_font),
-      heading_colour(colour_or(grid, u"BackColorFixed", usual_heading_colour)),
-      line_colour(colour_or(grid, u"GridColor", usual_line_colour)),
-      has_lines(answer_or<std::int32_t>(grid, u"GridLines", 1) != 0),
-      wraps(answer_or<Boolean>(grid, u"WordWrap", Boolean(false))) {
-  if (const Text name = answer_or<Text>(grid, u"FontName", {}); !name.empty()) font.family = family_of(name);
-  if (const auto size = answer_or<float>(grid, u"FontSize", font.points); size >= 4 && size <= 72) font.points = size;
-  const auto column_count = grid.get<std::int32_t>(u"Cols");
-  for (std::int32_t c = 0; c < column_count; ++c) {
-    if (grid.answers(u"ColHidden") && grid.get<Boolean>(u"ColHidden", {c})) continue;
-    const auto width = grid.answers(u"ColWidth") ? grid.get<std::int32_t>(u"ColWidth", {c}) : 1000;
-    if (width == 0) continue;
-    Column column{c, std::clamp(width, 2 * cell_padding, room), false, Alignment::general};
-    column.is_boolean =
-        grid.answers(u"ColDataType") && grid.get(u"ColDataType", {c}).equals_number(boolean_type, grid.locale());
-    if (grid.answers(u"ColAlignment")) column.alignment = alignment_of(grid.get<std::int32_t>(u"ColAlignment", {c}));
-    columns.push_back(column);
-  }
-
-  const auto row_count = grid.get<std::int32_t>(u"Rows");
-  const auto fixed_rows = answer_or<std::int32_t>(grid, u"FixedRows", 0);
-  const auto text = grid.repeated_get(u"TextMatrix", {0, 0});
-  for (std::int32_t r = 0; r < row_count; ++r) {
-    if (grid.answers(u"RowHidden") && grid.get<Boolean>(u"RowHidden", {r})) continue;
-    if (r < fixed_rows) ++heading_rows;
-    heights.push_back(grid.answers(u"RowHeight") ? std::max(0, grid.get<std::int32_t>(u"RowHeight", {r})) : 0);
-    text->set(0, r);
-    for (const Column& column : columns) {
-      Cell& cell = cells.emplace_back();
-      if (column.is_boolean && r >= fixed_rows) {
-        cell.is_ticked = grid.get(u"Cell", {check_box_setting, r, column.index}).equals_number(1, grid.locale());
-        continue;
-      }
-      text->set(1, column.index);
-      cell.text = text->run_text(grid.locale());
-    }
-  }
+void ReportComposer::add_check_box(bool is_ticked, const TwipsRectangle& place, const FontStyle& font) {
+  const std::int32_t size = line_height(font) * 3 / 5;
+  const TwipsRectangle box{place.left + (place.width - size) / 2, place.top + (place.height - size) / 2, size, size};
+  page().items.emplace_back(Box{.place = box, .fill = {}, .line_width = hair_line, .line_colour = 0});
+  if (!is_ticked) return;
+  const std::int32_t inset = size / 4;
+  page().items.emplace_back(
+      Box{.place = {box.left + inset, box.top + inset, size - 2 * inset, size - 2 * inset}, .fill = 0U});
 }
 
-void ReportComposer::add_cell(const GridLayout& layout, std::size_t row, std::size_t column_index,
+void ReportComposer::add_cell(const GridLayout& layout, std::size_t row, std::size_t column,
                               const TwipsRectangle& place) {
-  const GridLayout::Column& column = layout.columns[column_index];
-  const GridLayout::Cell& cell = layout.cell(row, column_index);
-  const bool is_heading = row < layout.heading_rows;
-  if (column.is_boolean && !is_heading) {
-    const std::int32_t size = line_height(layout.font) * 3 / 5;
-    const TwipsRectangle box{place.left + (place.width - size) / 2, place.top + (place.height - size) / 2, size, size};
-    page().items.emplace_back(Box{.place = box, .fill = {}, .line_width = hair_line, .line_colour = 0});
-    if (cell.is_ticked) {
-      const std::int32_t inset = size / 4;
-      page().items.emplace_back(
-          Box{.place = {box.left + inset, box.top + inset, size - 2 * inset, size - 2 * inset}, .fill = 0U});
-    }
-    return;
+  const GridContents& grid = layout.grid;
+  const GridContents::Cell& cell = grid.cell(row, column);
+  const CellLook& look = grid.look(cell);
+  const GridContents::Lines& lines = grid.is_heading(row, column) ? grid.heading_lines : grid.lines;
+  if (look.background || lines) {
+    page().items.emplace_back(Box{.place = place,
+                                  .fill = look.background,
+                                  .line_width = lines ? hair_line : 0,
+                                  .line_colour = lines.value_or(0)});
   }
-  Alignment alignment = column.alignment;
+  const FontStyle font = grid.font_of(cell);
+  if (grid.is_check_box(row, column)) return add_check_box(cell.is_ticked, place, font);
+  Alignment alignment = look.alignment;
   if (alignment == Alignment::general) {
-    const bool is_number = !is_heading && text_to_number(cell.text).has_value();
+    const bool is_number = row >= grid.heading_rows && text_to_number(cell.text).has_value();
     alignment = is_number ? Alignment::right : Alignment::left;
   }
   const std::int32_t room = place.width - 2 * cell_padding;
-  const std::int32_t height = line_height(layout.font);
+  const std::int32_t height = line_height(font);
   std::int32_t top = place.top + cell_padding / 2;
   TextView rest = cell.text;
   while (!rest.empty() && (top + height <= place.top + place.height || rest.size() == cell.text.size())) {
-    // Without wrapping only the first line is shown, cut off where the room ends.
-    const TextView line = layout.wraps ? take_line(rest, room, layout.font)
-                                       : fitting(rest.substr(0, rest.find_first_of(u"\r\n")), room, layout.font);
-    if (!layout.wraps) rest = {};
-    const auto spare = static_cast<std::int32_t>(std::max(0.0, room - metrics_.width(line, layout.font)));
+    // Without wrapping the text is cut off where the room ends.
+    const TextView line = grid.wraps ? take_line(rest, room, font) : fitting(rest, room, font);
+    if (!grid.wraps) rest = {};
+    const auto spare = static_cast<std::int32_t>(std::max(0.0, room - metrics_.width(line, font)));
     std::int32_t x = place.left + cell_padding;
     if (alignment == Alignment::centre) x += spare / 2;
     if (alignment == Alignment::right) x += spare;
-    add_runs(line, x, top, layout.font);
+    add_runs(line, x, top, font, look.letters);
     top += height;
   }
 }
 
-void ReportComposer::add_row(const GridLayout& layout, std::size_t row, std::int32_t height, std::size_t first,
-                             std::size_t end) {
-  const bool is_heading = row < layout.heading_rows;
+/// Adds the cells of a row, where equal headings of rows and columns that merge are a single cell.
+void ReportComposer::add_row(const GridLayout& layout, std::size_t row, std::size_t part) {
+  const GridContents& grid = layout.grid;
+  const bool is_heading = row < grid.heading_rows;
+  const auto continues_down = [&](std::size_t below, std::size_t column) {
+    return below > 0 && below < grid.heading_rows && grid.columns[column].merges &&
+           is_equal_heading(grid, grid.cell(below - 1, column), grid.cell(below, column));
+  };
   std::int32_t left = setup_.margin_left;
-  for (std::size_t c = first; c < end; ++c) {
-    const TwipsRectangle place{left, y_, layout.columns[c].width, height};
-    if (is_heading || layout.has_lines) {
-      page().items.emplace_back(Box{.place = place,
-                                    .fill = is_heading ? std::optional(layout.heading_colour) : std::nullopt,
-                                    .line_width = layout.has_lines ? hair_line : 0,
-                                    .line_colour = layout.line_colour});
+  const auto add = [&](std::size_t first, std::size_t end) {
+    for (std::size_t c = first; c < end;) {
+      TwipsRectangle place{left, y_, layout.widths[c], layout.heights[row]};
+      std::size_t next = c + 1;
+      for (; is_heading && grid.rows[row].merges && next < end &&
+             is_equal_heading(grid, grid.cell(row, c), grid.cell(row, next));
+           ++next) {
+        place.width += layout.widths[next];
+      }
+      left += place.width;
+      const bool is_single = next == c + 1;
+      for (std::size_t below = row + 1; is_single && continues_down(below, c); ++below) {
+        place.height += layout.heights[below];
+      }
+      if (!is_single || !continues_down(row, c)) add_cell(layout, row, c, place);
+      c = next;
     }
-    add_cell(layout, row, c, place);
-    left += place.width;
-  }
-  y_ += height;
+  };
+  add(0, layout.repeated);
+  add(layout.parts[part].first, layout.parts[part].end);
+  y_ += layout.heights[row];
 }
 
 /// The height of each row, the same on every page: as the grid specifies, or as its longest text needs.
-std::vector<std::int32_t> ReportComposer::row_heights(const GridLayout& layout) {
+void ReportComposer::set_row_heights(GridLayout& layout) {
+  const GridContents& grid = layout.grid;
   // A row higher than a page is cut off.
   const std::int32_t most = setup_.bottom() - setup_.margin_top;
-  std::vector<std::int32_t> heights(layout.rows());
-  for (std::size_t row = 0; row < heights.size(); ++row) {
+  for (std::size_t row = 0; row < grid.rows.size(); ++row) {
     std::int32_t most_lines = 1;
-    for (std::size_t c = 0; layout.wraps && layout.heights[row] == 0 && c < layout.columns.size(); ++c) {
+    for (std::size_t c = 0; grid.wraps && grid.rows[row].height == 0 && c < grid.columns.size(); ++c) {
+      const GridContents::Cell& cell = grid.cell(row, c);
       std::int32_t lines = 0;
-      for (TextView rest = layout.cell(row, c).text; !rest.empty() && layout.height_of_lines(lines) < most; ++lines) {
-        (void)take_line(rest, layout.columns[c].width - 2 * cell_padding, layout.font);
+      for (TextView rest = cell.text; !rest.empty() && height_of_lines(grid, lines) < most; ++lines) {
+        (void)take_line(rest, layout.widths[c] - 2 * cell_padding, grid.font_of(cell));
       }
       most_lines = std::max(most_lines, lines);
     }
-    heights[row] = std::min(most, layout.heights[row] > 0 ? layout.heights[row] : layout.height_of_lines(most_lines));
+    const std::int32_t height = grid.rows[row].height;
+    layout.heights.push_back(std::min(most, height > 0 ? height : height_of_lines(grid, most_lines)));
   }
-  return heights;
 }
 
-void ReportComposer::add_grid(const Control& grid, const FontStyle& font) {
-  const GridLayout layout(grid, font, setup_.room());
-  const std::vector<std::int32_t> heights = row_heights(layout);
-  for (std::size_t first = 0; first < layout.columns.size();) {
-    std::size_t end = first;
-    std::int32_t width = 0;
-    while (end < layout.columns.size() && (end == first || width + layout.columns[end].width <= setup_.room())) {
-      width += layout.columns[end++].width;
-    }
-    if (first > 0) begin_page();
-    const auto add = [&](std::size_t row) { add_row(layout, row, heights[row], first, end); };
-    for (std::size_t row = 0; row < layout.rows(); ++row) {
-      if (row >= layout.heading_rows && y_ + heights[row] > setup_.bottom() && y_ > setup_.margin_top) {
+/// From here on, pages show the columns of a part, which each of them says.
+void ReportComposer::begin_part(const GridLayout& layout, std::size_t part) {
+  const auto words = [](std::size_t number) { return number_to_text(static_cast<std::int32_t>(number)); };
+  const auto& [first, end] = layout.parts[part];
+  const Text columns =
+      end == first + 1 ? u"Column " + words(end) : u"Columns " + words(first + 1) + u" to " + words(end);
+  document_.bookmarks.push_back({columns, document_.pages.size() - 1, 1});
+  note_ = u"Part " + words(part + 1) + u" of " + words(layout.parts.size()) + u": c" + columns.substr(1) + u" of " +
+          words(layout.widths.size());
+  notes_.back() = note_;
+}
+
+void ReportComposer::add_grid(const GridContents& grid) {
+  GridLayout layout(grid, setup_.room());
+  set_row_heights(layout);
+  for (std::size_t part = 0; part < layout.parts.size(); ++part) {
+    if (part > 0) begin_page();
+    if (layout.parts.size() > 1) begin_part(layout, part);
+    for (std::size_t row = 0; row < grid.rows.size(); ++row) {
+      if (row >= grid.heading_rows && y_ + layout.heights[row] > setup_.bottom() && y_ > setup_.margin_top) {
         begin_page();
-        for (std::size_t heading = 0; heading < layout.heading_rows; ++heading) add(heading);
+        for (std::size_t heading = 0; heading < grid.heading_rows; ++heading) add_row(layout, heading, part);
       }
-      add(row);
+      add_row(layout, row, part);
     }
-    first = end;
   }
+  note_.clear();
 }
 
 }  // namespace talutil

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "documents/visible_text.hpp"
+
 namespace talutil {
 
 namespace {
@@ -16,20 +18,14 @@ Box rule(std::int32_t left, std::int32_t top, std::int32_t width) {
   return {.place = {left, top, width, 0}, .fill = {}, .line_width = hair_line, .line_colour = black};
 }
 
-bool is_control(char16_t unit) noexcept {
-  return (unit < u' ' && unit != u'\t' && unit != u'\r' && unit != u'\n') || unit == 0x7F;
-}
-
-/// Shows control characters in caret notation; those that end lines are kept.
+/// Shows control characters in flowing text, but keeps tabs, which have stops of their own there.
 Text with_visible_controls(TextView text) {
   Text result;
   for (const char16_t unit : text) {
-    if (is_control(unit)) {
-      result += u'^';
-      result += static_cast<char16_t>(unit ^ 0x40);
-    } else {
+    if (is_control(unit) && unit != u'\t')
+      append_visible(result, unit);
+    else
       result += unit;
-    }
   }
   return result;
 }
@@ -54,19 +50,20 @@ const PaperSize& paper_size(std::int32_t code) noexcept {
 }
 
 ReportComposer::ReportComposer(FontMetrics& metrics, PageSetup setup) : metrics_(metrics), setup_(std::move(setup)) {
+  const Text header = visible_line(setup_.header);
+  document_.title = trim_blanks(header);
   begin_page();
+  if (!document_.title.empty()) document_.bookmarks.push_back({document_.title});
 }
 
 void ReportComposer::begin_page() {
   document_.pages.push_back({setup_.width, setup_.height, {}});
+  notes_.push_back(note_);
   y_ = setup_.margin_top;
 }
 
-void ReportComposer::begin_section(Text title) {
-  document_.bookmarks.push_back({std::move(title), document_.pages.size() - 1});
-}
-
-std::int32_t ReportComposer::add_runs(TextView text, std::int32_t left, std::int32_t top, const FontStyle& font) {
+std::int32_t ReportComposer::add_runs(TextView text, std::int32_t left, std::int32_t top, const FontStyle& font,
+                                      std::uint32_t colour) {
   double x = left;
   for (std::size_t start = 0; start < text.size();) {
     const bool is_wide = FontMetrics::is_wide(text[start]);
@@ -74,7 +71,7 @@ std::int32_t ReportComposer::add_runs(TextView text, std::int32_t left, std::int
     while (end < text.size() && FontMetrics::is_wide(text[end]) == is_wide) ++end;
     const TextView run = text.substr(start, end - start);
     const double width = metrics_.width(run, font);
-    page().items.emplace_back(TextRun{rounded(x), top, rounded(width), font, is_wide, black, Text(run)});
+    page().items.emplace_back(TextRun{rounded(x), top, rounded(width), font, is_wide, colour, Text(run)});
     x += width;
     start = end;
   }
@@ -160,11 +157,11 @@ TextView ReportComposer::fitting(TextView text, double room, const FontStyle& fo
 /// Takes the next line of a text that is wrapped at a width: broken between words if possible, otherwise after a
 /// character. `text` becomes the rest after the break.
 TextView ReportComposer::take_line(TextView& text, double room, const FontStyle& font) {
-  const std::size_t line_end = std::min(text.find_first_of(u"\r\n"), text.size());
+  const std::size_t line_end = std::min(text.find(u'\n'), text.size());
   const TextView line = text.substr(0, line_end);
   std::size_t shown = fitting(line, room, font).size();
   if (shown == line.size()) {
-    text.remove_prefix(std::min(line_end + (text.substr(line_end).starts_with(u"\r\n") ? 2 : 1), text.size()));
+    text.remove_prefix(std::min(line_end + 1, text.size()));
     return line;
   }
   const std::size_t blank = line.find_last_of(u' ', shown);
@@ -177,7 +174,7 @@ TextView ReportComposer::take_line(TextView& text, double room, const FontStyle&
 
 void ReportComposer::add_text_box(TextView text, const TwipsRectangle& place, const FontStyle& font) {
   const std::int32_t height = line_height(font);
-  const Text shown = with_visible_controls(text);
+  const Text shown = visible_text(text);
   TextView rest = shown;
   for (std::int32_t top = place.top; !rest.empty() && top + height <= place.top + std::max(place.height, height);
        top += height) {
@@ -198,28 +195,74 @@ void ReportComposer::add_picture(Picture picture) {
   page().items.emplace_back(std::move(picture));
 }
 
-Document ReportComposer::finish() {
-  const std::size_t count = document_.pages.size();
-  const FontStyle& font = setup_.header_font;
-  const Text title(trim_blanks(setup_.header));
-  for (std::size_t i = 0; i < count; ++i) {
-    Page& target = document_.pages[i];
-    // Swapped with the last page, because that is the one being written to.
-    std::swap(target, document_.pages.back());
-    const std::int32_t header_top = setup_.margin_top - 2 * line_height(font);
-    add_runs(fitting(setup_.header, setup_.room(), font), setup_.margin_left, header_top, font);
-    if (setup_.has_rule && !title.empty()) {
-      page().items.emplace_back(
-          rule(setup_.margin_left, header_top + line_height(font) + line_height(font) / 4, setup_.room()));
+/// Wraps a text; all lines are indented like the first.
+std::vector<Text> ReportComposer::lines_of(TextView text, const FontStyle& font) {
+  constexpr std::size_t most_blanks = 8;
+  const Text indent(std::min({text.find_first_not_of(u' '), text.size(), most_blanks}), u' ');
+  const double room = setup_.room() - metrics_.width(indent, font);
+  std::vector<Text> lines;
+  for (text.remove_prefix(indent.size()); !text.empty();) lines.push_back(indent + Text(take_line(text, room, font)));
+  return lines;
+}
+
+ReportComposer::HeaderLines ReportComposer::header_lines() {
+  constexpr float smallest = 6;
+  constexpr std::int32_t edge = 360;  // Printers leave a quarter of an inch unprinted at the most.
+  const Text text = visible_text(setup_.header);
+  const std::int32_t room = setup_.margin_top - line_height(setup_.header_font) - edge;
+  HeaderLines header{setup_.header_font, lines_of(text, setup_.header_font)};
+  for (std::size_t kept = text.size();;) {
+    const auto most = static_cast<std::size_t>(std::max(1, room / line_height(header.font)));
+    if (header.lines.size() <= most) return header;
+    if (header.font.points > smallest) {
+      header.font.points -= 1;
+      header.lines = lines_of(text, header.font);
+    } else {
+      // The name of the report begins the header, and dates end it.
+      kept = kept * most / header.lines.size();
+      header.lines = lines_of(text.substr(0, kept / 2) + u" … " + text.substr(text.size() - kept / 2), header.font);
     }
-    const std::int32_t footer_top = setup_.bottom() + line_height(font);
-    add_runs(setup_.footer, setup_.margin_left, footer_top, font);
-    const Text number = u"Page " + number_to_text(static_cast<std::int32_t>(i + 1)) + u" of " +
-                        number_to_text(static_cast<std::int32_t>(count));
-    add_runs(number, setup_.width - setup_.margin_right - rounded(metrics_.width(number, font)), footer_top, font);
-    std::swap(target, document_.pages.back());
   }
-  document_.title = title;
+}
+
+void ReportComposer::add_header(const HeaderLines& header) {
+  const std::int32_t height = line_height(header.font);
+  const std::int32_t bottom = setup_.margin_top - line_height(setup_.header_font);
+  std::int32_t top = bottom - height * static_cast<std::int32_t>(header.lines.size());
+  for (const Text& line : header.lines) {
+    add_runs(line, setup_.margin_left, top, header.font);
+    top += height;
+  }
+  if (setup_.has_rule && !document_.title.empty()) {
+    page().items.emplace_back(rule(setup_.margin_left, bottom + line_height(setup_.header_font) / 4, setup_.room()));
+  }
+}
+
+void ReportComposer::add_footer(std::size_t page_index) {
+  const FontStyle& font = setup_.header_font;
+  const std::int32_t top = setup_.bottom() + line_height(font);
+  const std::int32_t date_end = add_runs(setup_.footer, setup_.margin_left, top, font);
+  const Text number = u"Page " + number_to_text(static_cast<std::int32_t>(page_index + 1)) + u" of " +
+                      number_to_text(static_cast<std::int32_t>(document_.pages.size()));
+  const std::int32_t number_left = setup_.width - setup_.margin_right - rounded(metrics_.width(number, font));
+  add_runs(number, number_left, top, font);
+  const Text& note = notes_[page_index];
+  const std::int32_t width = rounded(metrics_.width(note, font));
+  const std::int32_t left = setup_.margin_left + (setup_.room() - width) / 2;
+  const std::int32_t gap = line_height(font);
+  const bool fits = left > date_end + gap && left + width < number_left - gap;
+  add_runs(note, left, fits ? top : top + line_height(font), font);
+}
+
+Document ReportComposer::finish() {
+  const HeaderLines header = header_lines();
+  for (std::size_t i = 0; i < document_.pages.size(); ++i) {
+    // Swapped with the last page, because that is the one being written to.
+    std::swap(document_.pages[i], document_.pages.back());
+    add_header(header);
+    add_footer(i);
+    std::swap(document_.pages[i], document_.pages.back());
+  }
   return std::move(document_);
 }
 

@@ -1,10 +1,12 @@
 #pragma once
 
-#include "automation/control.hpp"
+#include "automation/numbers.hpp"
 #include "documents/font_metrics.hpp"
 #include "platform/page_model.hpp"
 
 namespace talutil {
+
+class GridContents;
 
 /// The paper, and what appears on every page. Lengths are in twips.
 struct PageSetup {
@@ -14,10 +16,14 @@ struct PageSetup {
   std::int32_t margin_top = 0;
   std::int32_t margin_right = 0;
   std::int32_t margin_bottom = 0;
-  Text header;  ///< Above the top margin, on every page.
+  /// Above the top margin, on every page. A long header takes more lines, then smaller letters; only if it does not fit
+  /// in letters of 6 points is its middle left out.
+  Text header;
   FontStyle header_font;
   bool has_rule = true;  ///< A rule below the header.
-  Text footer;           ///< On the left, below the bottom margin; the page number is on the right.
+  /// On the left, below the bottom margin; the page number is on the right, the columns of a divided grid in the
+  /// middle.
+  Text footer;
   bool wraps_words = true;
 
   [[nodiscard]] std::int32_t room() const noexcept { return width - margin_left - margin_right; }
@@ -45,15 +51,13 @@ class ReportComposer {
   /// Adds a text in a box, clipped at its edges. The box may be anywhere and never begins a new page.
   void add_text_box(TextView text, const TwipsRectangle& place, const FontStyle& font);
 
-  /// Adds a grid as it appears: visible rows and columns, widths and heights, and alignments, fonts and colours as far
-  /// as it supports those properties; long texts are wrapped if the grid wraps them, otherwise cut off. Fixed rows are
-  /// repeated on every page; columns that do not fit continue on separate pages.
-  void add_grid(const Control& grid, const FontStyle& font);
+  /// Adds a grid as it appears. Long texts are wrapped if the grid wraps them, otherwise cut off. Fixed rows are
+  /// repeated on every page. Columns that do not fit continue on separate pages after the last row, behind the fixed
+  /// columns; these pages say which columns they show.
+  void add_grid(const GridContents& grid);
 
   /// Adds a picture, reduced to fit on the page.
   void add_picture(Picture picture);
-
-  void begin_section(Text title);
 
   /// Adds headers and footers to every page and returns the document.
   [[nodiscard]] Document finish();
@@ -61,21 +65,36 @@ class ReportComposer {
  private:
   struct GridLayout;
 
+  /// The header as it fits above the top margin.
+  struct HeaderLines {
+    FontStyle font;
+    std::vector<Text> lines;
+  };
+
   Page& page() { return document_.pages.back(); }
   void begin_page();
+  void begin_part(const GridLayout& layout, std::size_t part);
   void add_line(TextView line, const FontStyle& font);
-  std::int32_t add_runs(TextView text, std::int32_t left, std::int32_t top, const FontStyle& font);
+  std::int32_t add_runs(TextView text, std::int32_t left, std::int32_t top, const FontStyle& font,
+                        std::uint32_t colour = 0);
   void add_paragraph(TextView text, const FontStyle& font);
   [[nodiscard]] double after_tab(double x, const FontStyle& font);
   [[nodiscard]] TextView fitting(TextView text, double room, const FontStyle& font);
   [[nodiscard]] TextView take_line(TextView& text, double room, const FontStyle& font);
+  [[nodiscard]] std::vector<Text> lines_of(TextView text, const FontStyle& font);
+  [[nodiscard]] HeaderLines header_lines();
+  void add_check_box(bool is_ticked, const TwipsRectangle& place, const FontStyle& font);
   void add_cell(const GridLayout& layout, std::size_t row, std::size_t column, const TwipsRectangle& place);
-  [[nodiscard]] std::vector<std::int32_t> row_heights(const GridLayout& layout);
-  void add_row(const GridLayout& layout, std::size_t row, std::int32_t height, std::size_t first, std::size_t end);
+  void set_row_heights(GridLayout& layout);
+  void add_row(const GridLayout& layout, std::size_t row, std::size_t part);
+  void add_header(const HeaderLines& header);
+  void add_footer(std::size_t page_index);
 
   FontMetrics& metrics_;
   PageSetup setup_;
   Document document_;
+  std::vector<Text> notes_;  ///< For the footer of each page.
+  Text note_;                ///< For the footers of pages that begin now.
   std::int32_t y_ = 0;
 };
 

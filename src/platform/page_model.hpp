@@ -80,10 +80,11 @@ struct Page {
   std::vector<PageItem> items;  ///< Later items are drawn over earlier ones.
 };
 
-/// The start of a section of a report.
+/// The start of a report or of a part of it.
 struct Bookmark {
   Text title;
   std::size_t page = 0;
+  std::uint8_t level = 0;  ///< 0 for a report, 1 for a part of it.
 };
 
 struct Document {

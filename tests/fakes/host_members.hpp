@@ -26,7 +26,9 @@ inline constexpr HostMember host_members[] = {
     // Grids.
     {"Rows", property}, {"Cols", property}, {"FixedRows", property}, {"Row", property}, {"RowSel", property},
     {"ColWidth", property}, {"ColHidden", property}, {"RowHidden", property}, {"ColDataType", property},
-    {"TextMatrix", property}, {"Cell", property},
+    {"TextMatrix", property}, {"Cell", property}, {"FixedCols", property}, {"BackColor", property},
+    {"ForeColorFixed", property}, {"BackColorFixed", property}, {"GridColor", property}, {"GridLinesFixed", property},
+    {"MergeCells", property}, {"MergeRow", property},
     // Windows and what lies on them.
     {"hwnd", readable}, {"WindowState", property}, {"left", property}, {"Top", property}, {"Width", property},
     {"Height", property}, {"Container", readable | set_by_reference}, {"Move", function}, {"Refresh", function},

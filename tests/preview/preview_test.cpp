@@ -1,5 +1,8 @@
 #include <gmock/gmock.h>
 
+#include <array>
+#include <cstdio>
+
 #include "controls/grid.hpp"
 #include "controls/print_control.hpp"
 #include "preview/frm_print_preview.hpp"
@@ -240,7 +243,9 @@ struct Meanwhile : Preview {
     const Variant holder{ObjectRef(grid)};
     return error_of([&] { utils.GridPrintPreview(50, 2, u"Month", u"", holder, Variant(), Variant(), caption); });
   }
-  std::vector<std::int32_t> month_end() { return {write(u"BankSummaryReport"), write(u"SalesReport"), write(u"Other")}; }
+  std::vector<std::int32_t> month_end() {
+    return {write(u"BankSummaryReport"), write(u"SalesReport"), write(u"Other")};
+  }
 
   [[nodiscard]] bool is_written(const Text& report) {
     return platform.files.bytes(u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\" + report + u".pdf").starts_with("%PDF");
@@ -526,6 +531,176 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   const auto* const picture = std::get_if<Picture>(&drawn.pages[0].items[0]);
   ASSERT_NE(picture, nullptr);
   EXPECT_EQ(picture->place, (TwipsRectangle{1134, 1134, 30, 15}));
+}
+
+/// The texts of a page that are at a height, from the left, without the space between them.
+std::string line_at(const Page& page, std::int32_t top) {
+  std::string line;
+  for (const PageItem& item : page.items) {
+    const auto* const run = std::get_if<TextRun>(&item);
+    if (run != nullptr && run->top == top) line += (line.empty() ? "" : "|") + to_utf8(run->text);
+  }
+  return line;
+}
+
+TEST_F(Pages, HeadersKeepTheirNameAndDates) {
+  const testing::Rows<std::size_t, std::size_t, bool> names = {
+      {"a short name", 20, 1, true},     {"two lines", 100, 2, true},
+      {"smaller letters", 300, 3, true}, {"more than there is room", 900, 3, false},
+      {"far more", 100'000, 3, false},
+  };
+  testing::check_rows(names, [&](std::size_t length, std::size_t lines, bool is_whole) {
+    Text name = u"Bookings";
+    while (name.size() < length) name += u" of customer";
+    print->Header = u"  " + name + u"  01/03/2009 To 31/03/2009";
+    Text shown;
+    std::size_t runs = 0;
+    const Document& document = document_of(u"text");
+    for (const PageItem& item : document.pages[0].items) {
+      const auto* const run = std::get_if<TextRun>(&item);
+      if (run == nullptr || run->top >= 1134) continue;
+      ++runs;
+      shown += run->text;
+      EXPECT_GE(run->top, 360);
+      EXPECT_LE(run->top + line_height(run->font), 1134 - 240);
+      EXPECT_LE(run->left + run->width, 11906 - 1134);
+      EXPECT_GE(run->font.points, 6);
+    }
+    std::erase(shown, u' ');
+    Text whole = name + u"01/03/2009To31/03/2009";
+    std::erase(whole, u' ');
+    EXPECT_EQ(runs, lines);
+    EXPECT_EQ(shown == whole, is_whole);
+    EXPECT_TRUE(shown.starts_with(u"Bookingsofcustomer") && shown.ends_with(u"01/03/2009To31/03/2009"));
+    EXPECT_EQ(document.bookmarks[0].title, document.title);
+  });
+}
+
+TEST_F(Pages, CharactersWithoutAShapeAreShownEverywhere) {
+  const Text text = u"a" + Text(1, u'\0') + u"b\tc\r\nd\u001B\u0085e\rf";
+  print->Header = text;
+  const auto grid = std::make_shared<Grid>(library.platform());
+  grid->put_Cols(1);
+  grid->AddItem(u"", -1);
+  grid->put_TextMatrix(0, 0, text);
+  grid->put_ColWidth(0, 5000);
+  const Document& line = document_of(grid);
+  EXPECT_EQ(line_at(line.pages[0], 1164), "a^@b    c d^[^\u00C5e f");
+  EXPECT_EQ(to_utf8(line.title), "a^@b    c d^[^\u00C5e f");
+  EXPECT_EQ(to_utf8(line.bookmarks[0].title), to_utf8(line.title));
+  EXPECT_EQ(line_at(line.pages[0], 390), "a^@b    c") << "a header has lines of its own";
+  EXPECT_EQ(line_at(line.pages[0], 390 + 168), "d^[^\u00C5e");
+  grid->WordWrap = Boolean(true);
+  const Document& lines = document_of(grid);
+  for (std::size_t i = 0; i < 3; ++i) {
+    const char* const expected[] = {"a^@b    c", "d^[^\u00C5e", "f"};
+    EXPECT_EQ(line_at(lines.pages[0], 1164 + 192 * static_cast<std::int32_t>(i)), expected[i]);
+  }
+  const Document& box = made_by([&] { print->TextBox(text, 0, 2000, 5000, 720); });
+  EXPECT_EQ(line_at(box.pages[0], 2240), "d^[^\u00C5e");
+}
+
+TEST_F(Pages, PartsOfAWideGridSayWhatTheyShow) {
+  const auto grid = std::make_shared<Grid>(library.platform());
+  grid->put_Cols(24);
+  grid->put_Rows(60);
+  grid->put_FixedCols(1);
+  for (std::int32_t r = 0; r < 60; ++r) {
+    for (std::int32_t c = 0; c < 24; ++c) grid->put_TextMatrix(r, c, number_to_text(r) + u"/" + number_to_text(c));
+  }
+  grid->put_ColWidth(23, 20000);
+  print->Header = u"Wide";
+  struct Expected {
+    std::size_t page;
+    const char* first_row;
+    const char* note;
+  };
+  // 9638 twips of room, of which the fixed column takes 1000; 57 rows on a page.
+  const Expected pages[] = {
+      {0, "0/0|0/1|0/2|0/3|0/4|0/5|0/6|0/7|0/8", "Part 1 of 4: columns 2 to 9 of 24"},
+      {1, "57/0|57/1|57/2|57/3|57/4|57/5|57/6|57/7|57/8", "Part 1 of 4: columns 2 to 9 of 24"},
+      {5, "57/0|57/17|57/18|57/19|57/20|57/21|57/22", "Part 3 of 4: columns 18 to 23 of 24"},
+      {6, "0/0|0/23", "Part 4 of 4: column 24 of 24"},
+  };
+  const Document& document = document_of(grid);
+  ASSERT_EQ(document.pages.size(), 8U);
+  for (const auto& [page, first_row, note] : pages) {
+    EXPECT_EQ(line_at(document.pages[page], 1164), first_row);
+    EXPECT_THAT(line_at(document.pages[page], 15944), HasSubstr("Page " + std::to_string(page + 1) + " of 8"));
+    EXPECT_THAT(line_at(document.pages[page], 15944), HasSubstr(note));
+    for (const PageItem& item : document.pages[page].items) {
+      const auto* const box = std::get_if<Box>(&item);
+      EXPECT_LE(box == nullptr ? 0 : box->place.left + box->place.width, 11906 - 1134);
+    }
+  }
+  std::vector<std::string> marks;
+  for (const Bookmark& mark : document.bookmarks) {
+    marks.push_back(std::to_string(mark.level) + ' ' + std::to_string(mark.page) + ' ' + to_utf8(mark.title));
+  }
+  EXPECT_THAT(marks, ElementsAre("0 0 Wide", "1 0 Columns 2 to 9", "1 2 Columns 10 to 17", "1 4 Columns 18 to 23",
+                                 "1 6 Column 24"));
+  grid->put_FixedCols(12);
+  EXPECT_EQ(line_at(document_of(grid).pages[2], 1164).substr(0, 4), "0/9|") << "too wide to be repeated";
+}
+
+/// What a cell's text and box look like: "text bold letters/background/line", without what is usual.
+TEST_F(Pages, CellsHaveTheirLooks) {
+  const auto grid = std::make_shared<RecordingControl>();
+  grid->values = {{"Rows", 3},
+                  {"Cols", 3},
+                  {"FixedRows", 1},
+                  {"FixedCols", 1},
+
+                  {"ForeColor", 0xFF},
+                  {"BackColor", 0xFFFF},
+                  {"ForeColorFixed", 0xFF0000},
+                  {"BackColorFixed", std::int32_t(0x8000000F)},
+                  {"GridColor", 0x123456},
+                  {"GridLinesFixed", 0},
+                  {"MergeCells", 1},
+                  {"MergeRow(0&)", Boolean(true)}};
+  const auto at = [](std::int32_t setting, std::int32_t row, std::int32_t column) {
+    return "Cell(" + std::to_string(setting) + "%, " + std::to_string(row) + "&, " + std::to_string(column) + "&)";
+  };
+  for (std::int32_t r = 0; r < 3; ++r) {
+    for (std::int32_t c = 0; c < 3; ++c) {
+      grid->values["TextMatrix(" + std::to_string(r) + "&, " + std::to_string(c) + "&)"] =
+          r == 0 && c > 0 ? Text(u"Both") : number_to_text(r) + number_to_text(c);
+      grid->values[at(6, r, c)] = grid->values[at(7, r, c)] = grid->values[at(2, r, c)] = 0;
+    }
+  }
+  grid->values[at(6, 1, 1)] = 0xFFFFFF;
+  grid->values[at(7, 1, 2)] = 0x00FF00;
+  grid->values[at(2, 2, 2)] = 4;
+  grid->values[at(13, 0, 0)] = Boolean(true);
+  const Document& document = made_by([&] {
+    print->RenderObject = ObjectRef(grid);
+    print->put_RenderControl(1);
+  });
+  std::string looks;
+  const Box* box = nullptr;
+  for (const PageItem& item : document.pages[0].items) {
+    if (const auto* const next = std::get_if<Box>(&item)) box = next;
+    const auto* const run = std::get_if<TextRun>(&item);
+    if (run == nullptr || box == nullptr || run->top < 1134 || run->top > 15000) continue;
+    std::array<char, 100> line{};
+    std::snprintf(line.data(), line.size(), "%s%s %06X on %06X, line %06X, %d wide, at %d\n",
+                  to_utf8(run->text).c_str(), run->font.is_bold ? " bold" : "", run->colour,
+                  box->fill.value_or(0xFFFFFF), box->line_width > 0 ? box->line_colour : 0, box->place.width,
+                  run->left - box->place.left);
+    looks += line.data();
+  }
+  EXPECT_EQ(looks,
+            "00 bold FF0000 on E8E8E8, line 000000, 1000 wide, at 60\n"
+            "Both FF0000 on E8E8E8, line 000000, 2000 wide, at 60\n"
+            "10 FF0000 on E8E8E8, line 000000, 1000 wide, at 748\n"
+            "11 0000FF on FFFFFF, line 123456, 1000 wide, at 748\n"
+            "12 00FF00 on 00FFFF, line 123456, 1000 wide, at 748\n"
+            "20 FF0000 on E8E8E8, line 000000, 1000 wide, at 748\n"
+            "21 0000FF on 00FFFF, line 123456, 1000 wide, at 748\n"
+            "22 0000FF on 00FFFF, line 123456, 1000 wide, at 404\n");
+  EXPECT_EQ(std::ranges::count_if(grid->uses, [](const std::string& use) { return use.starts_with("Cell(13%"); }), 2)
+      << "what a grid does not answer is not asked again";
 }
 
 }  // namespace
