@@ -1,5 +1,6 @@
 #include "documents/pdf_writer.hpp"
 
+#include <algorithm>
 #include <array>
 
 #include "automation/run_time_error.hpp"
@@ -21,6 +22,33 @@ struct Rgb {
 constexpr Rgb rgb_of(std::uint32_t colour) noexcept {
   const auto part = [colour](int shift) { return static_cast<float>((colour >> shift) & 0xFF) / 255; };
   return {part(0), part(8), part(16)};
+}
+
+/// What every report is written in, whatever its data.
+constexpr const char* language = "en-GB";
+
+/// The document's language and title bar, for which the PDF library has no functions. Failures show up in `check`.
+void set_catalog(PdfDocument& pdf) {
+  const HPDF_Doc document = pdf.get();
+  document->pdf_version = std::max(document->pdf_version, HPDF_VER_14);  // The first with languages and title bars.
+  HPDF_Dict_Add(document->catalog, "Lang", HPDF_String_New(document->mmgr, language, nullptr));
+  const HPDF_Dict preferences = HPDF_Dict_New(document->mmgr);
+  HPDF_Dict_AddBoolean(preferences, "DisplayDocTitle", HPDF_TRUE);
+  HPDF_Dict_Add(document->catalog, "ViewerPreferences", preferences);
+}
+
+/// Adds the bookmarks, parts below their report.
+void add_bookmarks(PdfDocument& pdf, const Document& document, const std::vector<HPDF_Page>& pages) {
+  const HPDF_Encoder utf8 = HPDF_GetEncoder(pdf.get(), "UTF-8");
+  HPDF_Outline report = nullptr;
+  for (const Bookmark& bookmark : document.bookmarks) {
+    if (bookmark.page >= pages.size()) continue;
+    const HPDF_Outline parent = bookmark.level == 0 ? nullptr : report;
+    const HPDF_Outline outline = HPDF_CreateOutline(pdf.get(), parent, to_utf8(bookmark.title).c_str(), utf8);
+    HPDF_Outline_SetDestination(outline, HPDF_Page_CreateDestination(pages[bookmark.page]));
+    if (bookmark.level == 0) report = outline;
+  }
+  if (document.bookmarks.size() > 1) HPDF_SetPageMode(pdf.get(), HPDF_PAGE_MODE_USE_OUTLINE);
 }
 
 /// Draws the items of one page, skipping those entirely outside it.
@@ -53,6 +81,13 @@ class PageWriter {
     HPDF_Page_SetRGBFill(target_, colour.red, colour.green, colour.blue);
     HPDF_Page_BeginText(target_);
     HPDF_Page_SetFontAndSize(target_, font, run.font.points);
+    // The embedded font has one weight: strokes along its outlines make it bold.
+    const bool is_stroked = is_wide && run.font.is_bold;
+    if (is_stroked) {
+      HPDF_Page_SetRGBStroke(target_, colour.red, colour.green, colour.blue);
+      HPDF_Page_SetLineWidth(target_, run.font.points / 30);
+    }
+    HPDF_Page_SetTextRenderingMode(target_, is_stroked ? HPDF_FILL_THEN_STROKE : HPDF_FILL);
     const std::string bytes = is_wide ? to_utf8(run.text) : to_ansi(run.text);
     HPDF_Page_TextOut(target_, points(run.left), y_of(run.top + baseline(run.font)), bytes.c_str());
     HPDF_Page_EndText(target_);
@@ -122,6 +157,7 @@ void write_pdf(const Document& document, const PdfInformation& information, Font
     if (!text.empty()) HPDF_SetInfoAttr(pdf.get(), type, to_utf8(text).c_str());
   };
   HPDF_SetCurrentEncoder(pdf.get(), "UTF-8");
+  set_catalog(pdf);
   inform(HPDF_INFO_TITLE, information.title);
   inform(HPDF_INFO_AUTHOR, information.author);
   inform(HPDF_INFO_SUBJECT, information.subject);
@@ -135,12 +171,7 @@ void write_pdf(const Document& document, const PdfInformation& information, Font
     pdf.check();
   }
   if (pages.empty()) HPDF_AddPage(pdf.get());
-  const HPDF_Encoder utf8 = HPDF_GetEncoder(pdf.get(), "UTF-8");
-  for (const Bookmark& bookmark : document.bookmarks) {
-    if (bookmark.page >= pages.size()) continue;
-    const HPDF_Outline outline = HPDF_CreateOutline(pdf.get(), nullptr, to_utf8(bookmark.title).c_str(), utf8);
-    HPDF_Outline_SetDestination(outline, HPDF_Page_CreateDestination(pages[bookmark.page]));
-  }
+  add_bookmarks(pdf, document, pages);
   save(pdf, *file);
   file->close();
 }

@@ -53,10 +53,16 @@ TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
   }
   composer.add_text(u"second page\f", {});
   composer.add_text(u"last", {});
-  const Document document = composer.finish();
+  Document document = composer.finish();
+  document.bookmarks.push_back({u"Columns 1 to 2", 1, 1});
   write(document);
   EXPECT_EQ(output_of("qpdf --check " + path + " 2>&1 | grep -c 'No syntax or stream encoding errors'"), "1\n");
   EXPECT_EQ(output_of("pdfinfo " + path + " | grep -c -E 'Title: +Title При €|Author: +Author|Pages: +2'"), "3\n");
+
+  EXPECT_EQ(output_of("qpdf --qdf --object-streams=disable " + path +
+                      " - | grep -a -c -E '/Lang .en-GB.|/DisplayDocTitle true|/PageMode /UseOutlines|/Count 1$'"),
+            "4\n")
+      << "the language, the title bar, the bookmarks opened, one of them below another";
 
   // Each run that is a single word, is a word of the file at the same place.
   struct Word {
