@@ -35,6 +35,8 @@ constexpr ZoomItem zoom_items[] = {
     {PreviewMenu::mnu125, 125}, {PreviewMenu::mnu150, 150}, {PreviewMenu::mnu200, 200},
 };
 
+constexpr TextView no_pages = u"The print control that is registered in place of ours has no pages to show";
+
 /// Runs an operation that fails silently.
 template <class Work>
 void silently(Work work) noexcept {
@@ -97,12 +99,13 @@ void FrmPrintPreview::load_controls() {
   pdf_export_ = std::move(pdf);
 }
 
+const PreviewPages* FrmPrintPreview::pages() const { return dynamic_cast<const PreviewPages*>(print_->object().get()); }
+
 void FrmPrintPreview::load() {
   if (is_loaded()) return;
   load_controls();
   const auto window = std::make_shared<Window>();
-  window->view =
-      library_.platform().form_windows.make_preview(*this, dynamic_cast<const PreviewPages*>(print_->object().get()));
+  window->view = library_.platform().form_windows.make_preview(*this, pages());
   window->form = std::make_shared<FormObject>(*window->view, library_.locale());
   window->utils = std::make_unique<ORVUtils>(library_);
   window_ = window;
@@ -150,6 +153,10 @@ void FrmPrintPreview::drop() noexcept {
 void FrmPrintPreview::show_modal() {
   if (is_shown()) raise(ErrorNumber::form_already_displayed);
   load();
+  if (pages() == nullptr) {
+    unload();
+    throw RunTimeError(ErrorNumber::action_not_supported, Text(no_pages));
+  }
   const auto window = window_;
   {
     struct Shown {
@@ -182,8 +189,8 @@ void FrmPrintPreview::show_caption(PreviewView& view) {
   const auto page = print_->get<std::int16_t>(u"CurrentPage");
   const auto count = print_->get<std::int16_t>(u"PageCount");
   view.set_caption((caption_text_.empty() ? report_name_ : caption_text_) + u"           Page " +
-                     number_to_text(std::int32_t{page}) + u" of " + number_to_text(std::int32_t{count}) +
-                     u"      Press F9 to Print.");
+                   number_to_text(std::int32_t{page}) + u" of " + number_to_text(std::int32_t{count}) +
+                   u"      Press F9 to Print.");
 }
 
 void FrmPrintPreview::go_to(PreviewView& view, std::int32_t page) {
@@ -280,7 +287,7 @@ void FrmPrintPreview::do_chosen(Window& window, PreviewMenu item) {
       break;
     case PreviewMenu::mnuNext:
       go_to(view, std::min<std::int32_t>(print_->get<std::int16_t>(u"PageCount"),
-                                   print_->get<std::int16_t>(u"CurrentPage") + 1));
+                                         print_->get<std::int16_t>(u"CurrentPage") + 1));
       break;
     default:
       for (const auto& [property, choices] : {size_choices, duplex_choices}) {

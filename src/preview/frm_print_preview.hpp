@@ -48,7 +48,8 @@ class FrmPrintPreview final : public PreviewEvents, public LibraryPart {
   /// Writes the document to a PDF file and creates its folder if necessary. The flag has no effect. Fails silently.
   void ExportToPDF(const Text& path, Boolean flag);
 
-  /// Shows the window until it is closed. Raises 400 if it is already on the screen. Errors during paging and zooming
+  /// Shows the window until it is closed. Raises 400 if it is already on the screen, 445 if there is no screen or a
+  /// third-party print control has no pages to show. Errors during paging and zooming
   /// close the window and are raised here; only printing and exporting fail silently.
   void show_modal();
 
@@ -81,6 +82,9 @@ class FrmPrintPreview final : public PreviewEvents, public LibraryPart {
 
   void load();
   void load_controls();
+
+  /// What the window shows; null for a third-party print control, which can only be driven.
+  [[nodiscard]] const PreviewPages* pages() const;
   /// Reports the closing, keeps the window's size and drops it, even if that fails.
   void query_unload();
   void drop() noexcept;

@@ -39,8 +39,14 @@ std::string runs_of(const Page& page) {
 struct Preview : testing::UtilsTest {};
 
 /// A print control that notes how builders drive it.
+struct RecordingPrintControl final : RecordingControl, PreviewPages {
+  [[nodiscard]] const Page* shown_page() const override { return nullptr; }
+  [[nodiscard]] float zoom_percent() const override { return 100; }
+  [[nodiscard]] std::optional<TwipsRectangle> guides() const override { return {}; }
+};
+
 struct Builders : Preview {
-  std::shared_ptr<RecordingControl> print = std::make_shared<RecordingControl>();
+  std::shared_ptr<RecordingControl> print = std::make_shared<RecordingPrintControl>();
   std::shared_ptr<RecordingControl> source = std::make_shared<RecordingControl>();
   Variant holder{ObjectRef(source)};
 
@@ -222,6 +228,17 @@ TEST_F(Builders, ErrorsOfPagingReachTheCallerOthersNobody) {
   platform.files.failures = {{u"append", ErrorNumber::permission_denied}};
   EXPECT_EQ(error_of([&] { utils.TextBoxPrintPreview(50, 1, u"Notes", u"C:\\x", holder); }), 70);
   EXPECT_FALSE(library.part<FrmPrintPreview>().is_loaded()) << "a log that cannot be written leaves no half window";
+}
+
+TEST_F(Builders, AThirdPartyPrintControlIsDrivenButNotShown) {
+  const auto other = std::make_shared<RecordingControl>();
+  other->values = print->values;
+  other->methods = print->methods;
+  platform.controls[u"VSPrinter8LibCtl.VSPrinter"] = other;
+  source->values["Text"] = u"words";
+  EXPECT_EQ(error_of([&] { utils.TextBoxPrintPreview(50, 1, u"Notes", u"C:\\x", holder); }), 445);
+  EXPECT_EQ(other->values["Text"], Variant(u"words"));
+  EXPECT_EQ(platform.preview.windows, 0);
 }
 
 /// A host that calls builders at every opportunity.
