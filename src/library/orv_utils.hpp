@@ -473,8 +473,9 @@ class ORVUtils {
   /// Asks for a text in a box that stays above all other windows. Returns the text in clear, even if bPassword shows
   /// asterisks; empty if the box was closed by its menu. Without an entry (bShowUserInput False), OK returns an empty
   /// text. With bNoFrame and bNonCloseable both True it is a notice: the call returns at once, with the result of the
-  /// box's last use, and the notice stays until the host closes its window. A long prompt makes the box higher. lBackColor is
-  /// 0x00BBGGRR, or a system colour. Raises 400 if the box is already on the screen, 445 where there is no screen.
+  /// box's last use, and the notice stays until the host closes its window. A long prompt makes the box higher.
+  /// lBackColor is 0x00BBGGRR, or a system colour. Raises 400 if the box is already on the screen, 445 where there is
+  /// no screen.
   virtual Text MyInputBox(const Text& sCaption, const Text& sPrompt, const Boolean& bPassword,
                           const Boolean& bShowUserInput, const Boolean& bNoFrame, const Boolean& bNonCloseable,
                           const std::int32_t& lBackColor);

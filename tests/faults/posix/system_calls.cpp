@@ -14,22 +14,14 @@
 #include <random>
 #include <utility>
 
+#include "tests/faults/failing.hpp"
+
 namespace talutil::testing {
 
 namespace {
 
 constexpr int half = -1;  ///< In the place of an error code: only half of the bytes are read or written.
 
-struct Failing {
-  std::size_t calls = 0;
-  std::size_t number = 0;
-  std::size_t way = 0;
-  bool goes_on = false;
-  Allowed allowed = Allowed::everything;
-  std::string what;
-};
-
-constinit Failing* failing = nullptr;
 constinit RecordedDisk* disk = nullptr;
 
 /// The next definition of a function: the C library's.
@@ -38,21 +30,9 @@ Function* next(const char* name) {
   return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
 }
 
-/// Codes that are not true, such as that of a missing file, are not among them: what follows would be right then.
-
-/// The error code a call is to fail with, `half`, or 0.
 int failure(const char* name, std::initializer_list<int> codes) {
-  if (failing == nullptr) return 0;
-  const std::size_t call = failing->calls++;
-  if (call < failing->number || (call > failing->number && !failing->goes_on)) return 0;
-  const bool is_first = call == failing->number;
-  if (is_first && failing->way >= codes.size()) {
-    failing->goes_on = false;
-    return 0;
-  }
-  const int code = is_first ? codes.begin()[failing->way] : EIO;
-  if (is_first) failing->what = std::string(name) + ": " + (code == half ? "half" : strerror(code));
-  return code;
+  return failure<int>(codes, EIO,
+                      [&](int code) { return std::string(name) + ": " + (code == half ? "half" : strerror(code)); });
 }
 
 template <class Call>
@@ -158,18 +138,6 @@ int named(const char* name, std::initializer_list<int> codes, Kind kind, int fol
 std::string parent_of(const std::string& path) { return std::filesystem::path(path).parent_path(); }
 
 }  // namespace
-
-FailingCall::FailingCall(std::size_t number, std::size_t way, bool goes_on, Allowed allowed) {
-  static Failing state;
-  state = {0, number, way, goes_on, allowed, {}};
-  failing = &state;
-}
-
-FailingCall::~FailingCall() { failing = nullptr; }
-
-bool FailingCall::is_reached() noexcept { return failing->calls > failing->number; }
-
-std::string FailingCall::what() { return failing->what; }
 
 bool is_removal(std::string_view what) noexcept { return what.starts_with("unlink"); }
 

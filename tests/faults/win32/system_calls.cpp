@@ -1,5 +1,5 @@
 #include "platform/win32/windows.hpp"
-#include "tests/faults/machine.hpp"
+#include "tests/faults/failing.hpp"
 #include "tests/faults/win32/scripted_calls.hpp"
 
 // The system's functions on files, in the place of the imported ones: calls go through pointers, which the linker takes
@@ -9,16 +9,6 @@ namespace talutil::testing {
 
 namespace {
 
-struct Failing {
-  std::size_t calls = 0;
-  std::size_t number = 0;
-  std::size_t way = 0;
-  bool goes_on = false;
-  Allowed allowed = Allowed::everything;
-  std::string what;
-};
-
-constinit Failing* failing = nullptr;
 constinit ScriptedCalls* script = nullptr;
 
 struct Call {
@@ -43,20 +33,9 @@ constexpr Call calls[] = {
     {"LockFileEx", {ERROR_LOCK_VIOLATION, ERROR_NOT_SUPPORTED}},
 };
 
-/// The code that a call is to fail with; 0 if it is to be made.
 DWORD failure(const Call& call) {
-  if (failing == nullptr) return 0;
-  const std::size_t number = failing->calls++;
-  const bool is_first = number == failing->number;
-  if (!is_first && (number < failing->number || !failing->goes_on)) return 0;
-  if (!is_first) return ERROR_IO_DEVICE;
-  if (failing->way >= call.codes.size()) {
-    failing->goes_on = false;
-    return 0;
-  }
-  const DWORD code = call.codes.begin()[failing->way];
-  failing->what = call.name + std::string(": ") + std::to_string(code);
-  return code;
+  return failure<DWORD>(call.codes, ERROR_IO_DEVICE,
+                        [&](DWORD code) { return call.name + std::string(": ") + std::to_string(code); });
 }
 
 template <class Result>
@@ -138,18 +117,6 @@ void WINAPI no_sleep(DWORD milliseconds) {
 }
 
 }  // namespace
-
-FailingCall::FailingCall(std::size_t number, std::size_t way, bool goes_on, Allowed allowed) {
-  static Failing state;
-  state = {0, number, way, goes_on, allowed, {}};
-  failing = &state;
-}
-
-FailingCall::~FailingCall() { failing = nullptr; }
-
-bool FailingCall::is_reached() noexcept { return failing->calls > failing->number; }
-
-std::string FailingCall::what() { return failing->what; }
 
 ScriptedCalls::ScriptedCalls(Codes codes) : codes_(std::move(codes)) { script = this; }
 

@@ -4,9 +4,9 @@
 #include <cmath>
 #include <map>
 
+#include "documents/report_composer.hpp"
 #include "platform/win32/page_renderer.hpp"
 #include "platform/win32/win32_drawing.hpp"
-#include "documents/report_composer.hpp"
 
 namespace talutil::win32 {
 namespace {
