@@ -73,7 +73,9 @@ class GridContents::CellLooks {
 
  private:
   enum Setting : std::size_t { alignment, background, letters, bold };
-  static constexpr std::int16_t codes[] = {2, 6, 7, 13};  // In the order of Setting.
+  // In the order of Setting. No host relies on them, unlike on the code of check boxes; a grid that has none of them
+  // answers an error, or 0, and is printed without looks of single cells.
+  static constexpr std::int16_t codes[] = {2, 6, 7, 13};
 
   std::int32_t ask(Setting setting, std::int32_t row, std::int32_t column) {
     auto& use = uses_[setting];

@@ -61,7 +61,7 @@ bool is_in_use(DWORD code) noexcept { return code == ERROR_SHARING_VIOLATION || 
 
 bool is_passing(DWORD code) noexcept {
   return is_in_use(code) || code == ERROR_ACCESS_DENIED || code == ERROR_DELETE_PENDING ||
-         code == ERROR_USER_MAPPED_FILE || code == ERROR_UNABLE_TO_REMOVE_REPLACED;
+         code == ERROR_USER_MAPPED_FILE;
 }
 
 void write_all(const Owned<kind::File>& file, std::string_view bytes) {

@@ -1,6 +1,7 @@
 #include "platform/win32/win32_printers.hpp"
 
 #include <algorithm>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -193,7 +194,9 @@ struct ForgottenKeys {
 }  // namespace
 
 bool Win32Printers::print(const Document& document, const PrintSettings& settings) {
-  const ForgottenKeys keys;
+  // Only where there is a dialog: otherwise they were meant for the host.
+  std::optional<ForgottenKeys> keys;
+  if (settings.shows_dialog) keys.emplace();
   PrintDialog dialog;
   dialog.prepare(settings);
   if (!settings.shows_dialog)

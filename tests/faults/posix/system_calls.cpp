@@ -31,8 +31,8 @@ Function* next(const char* name) {
 }
 
 int failure(const char* name, std::initializer_list<int> codes) {
-  return failure<int>(codes, EIO,
-                      [&](int code) { return std::string(name) + ": " + (code == half ? "half" : strerror(code)); });
+  return talutil::testing::failure<int>(
+      codes, EIO, [&](int code) { return std::string(name) + ": " + (code == half ? "half" : strerror(code)); });
 }
 
 template <class Call>

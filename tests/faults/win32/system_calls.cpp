@@ -34,8 +34,8 @@ constexpr Call calls[] = {
 };
 
 DWORD failure(const Call& call) {
-  return failure<DWORD>(call.codes, ERROR_IO_DEVICE,
-                        [&](DWORD code) { return call.name + std::string(": ") + std::to_string(code); });
+  return talutil::testing::failure<DWORD>(
+      call.codes, ERROR_IO_DEVICE, [&](DWORD code) { return call.name + std::string(": ") + std::to_string(code); });
 }
 
 template <class Result>
