@@ -150,13 +150,13 @@ void PrintControl::PrintDoc(Boolean dialog) {
   if (!platform_.printers.print(*document, settings)) raise(ErrorNumber::cancelled);
 }
 
-void PdfExport::ConvertDocument(const Variant& control, const Text& file) const {
+void PdfExport::convert(const Variant& control, const Text& file, const std::function<bool()>& is_given_up) const {
   const auto* const object = control.get_if<ObjectRef>();
   const auto* const source = object == nullptr ? nullptr : dynamic_cast<PrintControl*>(object->get());
   if (source == nullptr) raise(ErrorNumber::type_mismatch);
   const auto document = source->document() ? source->document() : std::make_shared<const Document>();
   write_pdf(*document, {Title.empty() ? document->title : Title, Author, Subject, Creator}, platform_.font_files,
-            platform_.files, file);
+            platform_.files, file, is_given_up);
 }
 
 }  // namespace talutil

@@ -125,7 +125,10 @@ class PdfExport final : public TableObject<PdfExport> {
 
   /// Writes the document of a print control to a file. If that fails, an existing file stays as it was. Raises 13 for
   /// another kind of object, and the errors of writing a file.
-  void ConvertDocument(const Variant& control, const Text& file) const;
+  void ConvertDocument(const Variant& control, const Text& file) const { convert(control, file, nullptr); }
+
+  /// Like ConvertDocument; raises 32755 if the user gives up, which is asked before each page.
+  void convert(const Variant& control, const Text& file, const std::function<bool()>& is_given_up) const;
 
  private:
   const Platform& platform_;

@@ -149,7 +149,7 @@ void save(PdfDocument& pdf, OutputFile& file) {
 }  // namespace
 
 void write_pdf(const Document& document, const PdfInformation& information, FontFiles& fonts, Files& files,
-               const Text& path) {
+               const Text& path, const std::function<bool()>& is_given_up) {
   // Problems with the file are reported now, not after the work is done.
   const auto file = files.open_output(path);
   PdfDocument pdf(fonts);
@@ -165,6 +165,7 @@ void write_pdf(const Document& document, const PdfInformation& information, Font
 
   std::vector<HPDF_Page> pages;
   for (const Page& page : document.pages) {
+    if (is_given_up && is_given_up()) raise(ErrorNumber::cancelled);
     PageWriter writer(pdf, page);
     writer.write();
     pages.push_back(writer.target());

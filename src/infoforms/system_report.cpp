@@ -30,12 +30,20 @@ Text percent(std::uint64_t part, std::uint64_t whole) {
   return number_words(static_cast<std::uint64_t>(std::lround(share))) + u"%";
 }
 
+/// For example "29 minutes" or "1 day, 0 hours, 5 minutes".
 Text time_words(std::uint64_t seconds) {
   constexpr std::uint64_t minute = 60;
   constexpr std::uint64_t hour = 60 * minute;
   constexpr std::uint64_t day = 24 * hour;
-  return number_words(seconds / day) + u" days, " + number_words(seconds % day / hour) + u" hours, " +
-         number_words(seconds % hour / minute) + u" minutes";
+  Text words;
+  const auto add = [&](std::uint64_t number, TextView unit) {
+    if (number == 0 && words.empty() && unit != u"minute") return;
+    words += (words.empty() ? u"" : u", ") + number_words(number) + u" " + Text(unit) + (number == 1 ? u"" : u"s");
+  };
+  add(seconds / day, u"day");
+  add(seconds % day / hour, u"hour");
+  add(seconds % hour / minute, u"minute");
+  return words;
 }
 
 Text date_words(const std::optional<Date>& date) {
@@ -48,30 +56,48 @@ FactTable fact_list(TextView title, std::vector<std::vector<Text>> rows) {
   return {title, {u"Fact", u"Value"}, std::move(rows)};
 }
 
-void count_into(Folder& folder, FolderCount& count) {
-  constexpr std::uint64_t most_entries = 100'000;
-  std::vector<Text> folders;
-  folder.list([&](TextView name, const FileFacts& facts) {
-    if (count.files + count.folders >= most_entries) {
-      count.is_complete = false;
-    } else if (facts.kind == FileKind::folder) {
-      ++count.folders;
-      folders.emplace_back(name);
-    } else {
-      ++count.files;
-      count.size += facts.size;
-    }
-  });
-  for (const Text& name : folders) {
-    if (count.files + count.folders >= most_entries) return;
-    try {
-      count_into(*folder.folder(name, false), count);
-    } catch (const RunTimeError&) {
-      // A folder that cannot be read.
-      count.is_complete = false;
+/// Counts a folder and everything below it, up to a number of entries or as long as its user waits.
+class Counting {
+ public:
+  Counting(FolderCount& count, const std::function<bool()>& is_given_up) : count_(count), is_given_up_(is_given_up) {}
+
+  void add(Folder& folder) {
+    std::vector<Text> folders;
+    folder.list([&](TextView name, const FileFacts& facts) {
+      if (is_over()) return;
+      if (facts.kind == FileKind::folder) {
+        ++count_.folders;
+        folders.emplace_back(name);
+      } else {
+        ++count_.files;
+        count_.size += facts.size;
+      }
+    });
+    for (const Text& name : folders) {
+      if (is_over()) return;
+      try {
+        add(*folder.folder(name, false));
+      } catch (const RunTimeError&) {
+        // A folder that cannot be read.
+        count_.is_complete = false;
+      }
     }
   }
-}
+
+ private:
+  bool is_over() {
+    constexpr std::uint64_t most_entries = 100'000;
+    constexpr std::uint64_t asked_every = 256;  // Asking for keys takes longer than counting.
+    const std::uint64_t entries = count_.files + count_.folders;
+    if (entries >= most_entries || (entries % asked_every == 0 && is_given_up_ && is_given_up_())) is_over_ = true;
+    if (is_over_) count_.is_complete = false;
+    return is_over_;
+  }
+
+  FolderCount& count_;
+  const std::function<bool()>& is_given_up_;
+  bool is_over_ = false;
+};
 
 }  // namespace
 
@@ -141,9 +167,9 @@ FactTable operating_system_table(Machine& machine) {
                                          {u"Running for", time_words(system.uptime)}});
 }
 
-FolderCount count_folder(Folders& folders, const Text& path) {
+FolderCount count_folder(Folders& folders, const Text& path, const std::function<bool()>& is_given_up) {
   FolderCount count;
-  count_into(*folders.open(path), count);
+  Counting(count, is_given_up).add(*folders.open(path));
   return count;
 }
 
@@ -151,7 +177,8 @@ FactTable item_table(const Platform& platform, const Text& path) {
   const ItemFacts item = platform.machine.item(path);
   std::vector<std::vector<Text>> rows{{u"Path", path}, {u"Kind", item.is_folder ? u"Folder" : u"File"}};
   if (item.is_folder) {
-    const FolderCount count = count_folder(platform.folders, path);
+    const auto hourglass = platform.form_windows.show_hourglass();
+    const FolderCount count = count_folder(platform.folders, path, [&] { return hourglass->is_given_up(); });
     const Text at_least = count.is_complete ? u"" : u"at least ";
     rows.push_back({u"Files", at_least + number_words(count.files)});
     rows.push_back({u"Folders", at_least + number_words(count.folders)});

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <span>
 #include <vector>
 
@@ -28,11 +29,13 @@ struct FolderCount {
 [[nodiscard]] FactTable processor_table(Machine& machine);
 [[nodiscard]] FactTable operating_system_table(Machine& machine);
 
-/// A file or folder. Raises the same errors as Machine::item.
+/// A file or folder. While a folder is counted, there is an hourglass, and its user may give up: then the numbers are
+/// "at least" what was found. Raises the same errors as Machine::item.
 [[nodiscard]] FactTable item_table(const Platform& platform, const Text& path);
 
-/// Links are not followed; counting stops at a hundred thousand entries.
-[[nodiscard]] FolderCount count_folder(Folders& folders, const Text& path);
+/// Links are not followed; counting stops at a hundred thousand entries, or when `is_given_up` says so.
+[[nodiscard]] FolderCount count_folder(Folders& folders, const Text& path,
+                                       const std::function<bool()>& is_given_up = nullptr);
 
 /// For example "read-only, hidden", or "none".
 [[nodiscard]] Text attribute_words(std::uint32_t attributes);

@@ -86,6 +86,18 @@ class PreviewEvents;
 class PreviewPages;
 class PreviewView;
 
+/// The time for which a user waits for something that takes long.
+class Waiting {
+ public:
+  Waiting() = default;
+  Waiting(const Waiting&) = delete;
+  Waiting& operator=(const Waiting&) = delete;
+  virtual ~Waiting() = default;
+
+  /// Whether the user gives up waiting, by the Esc key.
+  [[nodiscard]] virtual bool is_given_up() const = 0;
+};
+
 class FormWindows {
  public:
   virtual ~FormWindows() = default;
@@ -98,6 +110,9 @@ class FormWindows {
   /// Creates the preview window, which shows `pages`, or null if a third-party control displays its own pages. Both
   /// arguments must outlive the view.
   [[nodiscard]] virtual std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) = 0;
+
+  /// Shows the hourglass for as long as the result exists.
+  [[nodiscard]] virtual std::unique_ptr<Waiting> show_hourglass() = 0;
 };
 
 /// The messages waiting for the host's windows.

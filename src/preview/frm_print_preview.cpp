@@ -266,7 +266,13 @@ void FrmPrintPreview::ExportToPDF(const Text& path, Boolean /*flag*/) {
     // A copy, because ExtractPathName changes its argument, but the export needs the path as the host passed it.
     Text whole = path;
     library_.platform().files.make_path(window_->utils->ExtractPathName(whole));
-    pdf_export_->call(u"ConvertDocument", {print_->object(), path});
+    const auto hourglass = library_.platform().form_windows.show_hourglass();
+    // Only what somebody asked for and waits for can be given up.
+    const auto* const ours = dynamic_cast<const PdfExport*>(pdf_export_->object().get());
+    if (ours != nullptr && is_shown())
+      ours->convert(print_->object(), path, [&] { return hourglass->is_given_up(); });
+    else
+      pdf_export_->call(u"ConvertDocument", {print_->object(), path});
   });
 }
 

@@ -54,6 +54,7 @@ struct FakePlatform : MessageBoxes,
   std::int32_t open_windows = 0;
   std::int32_t messages_handled = 0;  ///< How often waiting messages were let in.
   std::int32_t waits = 0;
+  std::int32_t hourglasses = 0;  ///< Shown now.
 
   // What is answered. A box without a scripted answer is one that the user closed.
   std::deque<MessageAnswer> answers;
@@ -77,6 +78,7 @@ struct FakePlatform : MessageBoxes,
   std::vector<Message> input_boxes;
   std::deque<Text> chosen_files;  ///< What file dialogs answer; without one they are cancelled.
   std::vector<FileDialog> file_dialogs;
+  bool gives_up = false;                 ///< Esc, while there is an hourglass.
   std::function<void()> during_dialogs;  ///< What a host's timer does while a file or printer dialog is open.
   std::vector<std::string> drawn;        ///< What was drawn and printed, in words.
   std::int32_t pointer_resets = 0;
@@ -200,6 +202,16 @@ struct FakePlatform : MessageBoxes,
 
   std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) override {
     return std::make_unique<FakePreview>(preview, events, pages);
+  }
+
+  std::unique_ptr<Waiting> show_hourglass() override {
+    struct Shown final : Waiting {
+      explicit Shown(FakePlatform& shown_on) : platform(shown_on) { ++platform.hourglasses; }
+      ~Shown() override { --platform.hourglasses; }
+      [[nodiscard]] bool is_given_up() const override { return platform.gives_up; }
+      FakePlatform& platform;
+    };
+    return std::make_unique<Shown>(*this);
   }
 
   void fill(std::span<std::uint8_t> bytes) override {

@@ -208,7 +208,7 @@ TEST_F(Windows, TheSystemIsDescribed) {
             "  Version      10.0\r\n"
             "  Computer     FAKEPC\r\n"
             "  User         me\r\n"
-            "  Running for  1 days, 2 hours, 3 minutes\r\n"
+            "  Running for  1 day, 2 hours, 3 minutes\r\n"
             "\r\nFolder or file\r\n"
             "  Path        C:\\a.txt\r\n"
             "  Kind        File\r\n"

@@ -192,6 +192,11 @@ TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
     EXPECT_EQ(platform.file_dialogs.back().file_name, u"*.pdf");
     EXPECT_EQ(platform.file_dialogs.back().folder, u"C:\\exports\\");
     events.chosen(PreviewMenu::mnuExportPDF);
+    platform.chosen_files = {u"C:\\out\\b.pdf"};
+    platform.gives_up = true;
+    events.chosen(PreviewMenu::mnuExportPDF);
+    EXPECT_EQ(platform.files.bytes(u"C:\\out\\b.pdf"), "(no file)") << "given up";
+    EXPECT_EQ(platform.hourglasses, 0);
     EXPECT_TRUE(platform.messages.empty()) << "a cancelled dialog is nobody's business";
     EXPECT_EQ(error_of([&] { utils.TextBoxPrintPreview(1, 1, u"N", u"", ObjectRef(source)); }), 400);
     view.width = 12000;

@@ -99,6 +99,13 @@ Date PosixClock::now() {
 
 std::unique_ptr<HiddenWindow> PosixFormWindows::make_hidden(TextView /*caption*/) { return std::make_unique<Window>(); }
 
+std::unique_ptr<Waiting> PosixFormWindows::show_hourglass() {
+  struct Unseen final : Waiting {
+    [[nodiscard]] bool is_given_up() const override { return false; }
+  };
+  return std::make_unique<Unseen>();
+}
+
 bool PosixMessagePump::wait_and_handle() {
   pause();
   return false;

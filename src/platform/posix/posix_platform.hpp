@@ -61,6 +61,9 @@ class PosixFormWindows final : public FormWindows {
   /// A window that has a size and a state but cannot be shown.
   std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) override;
   std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) override;
+
+  /// Nothing is shown; at a terminal, Ctrl+C ends the whole program.
+  std::unique_ptr<Waiting> show_hourglass() override;
 };
 
 /// Third-party controls exist on Windows only.

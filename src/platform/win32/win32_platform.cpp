@@ -6,6 +6,7 @@
 #include "platform/win32/handle.hpp"
 #include "platform/win32/module_path.hpp"
 #include "platform/win32/visual_styles.hpp"
+#include "platform/win32/wait_pointer.hpp"
 
 namespace talutil::win32 {
 
@@ -118,6 +119,8 @@ Date Win32Clock::now() {
 std::unique_ptr<HiddenWindow> Win32FormWindows::make_hidden(TextView caption) {
   return std::make_unique<DialogOwner>(caption);
 }
+
+std::unique_ptr<Waiting> Win32FormWindows::show_hourglass() { return std::make_unique<WaitPointer>(); }
 
 bool Win32MessagePump::handle_waiting() {
   MSG message;

@@ -52,6 +52,7 @@ class Win32FormWindows final : public FormWindows {
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
   std::unique_ptr<FormView> make_form(FormEvents& events, const FormDescription& description) override;
   std::unique_ptr<PreviewView> make_preview(PreviewEvents& events, const PreviewPages* pages) override;
+  std::unique_ptr<Waiting> show_hourglass() override;
 };
 
 class Win32MessagePump final : public MessagePump {

@@ -171,13 +171,6 @@ class PrintJob {
   bool is_complete_ = false;
 };
 
-/// Whether the user of this program holds Esc, which ends the printing.
-bool is_escape_pressed() noexcept {
-  DWORD process = 0;
-  GetWindowThreadProcessId(GetForegroundWindow(), &process);
-  return process == GetCurrentProcessId() && GetAsyncKeyState(VK_ESCAPE) < 0;
-}
-
 /// Forgets the keys that were pressed while a dialog or the printing kept the user waiting: they would ask for the same
 /// again, or close the window that is behind.
 struct ForgottenKeys {
@@ -209,7 +202,7 @@ bool Win32Printers::print(const Document& document, const PrintSettings& setting
   const WaitPointer waiting;
   const auto [first, end] = dialog.range(document.pages.size());
   for (std::size_t page = first; page < end; ++page) {
-    if (is_escape_pressed()) return false;
+    if (waiting.is_given_up()) return false;
     job.add(document.pages[page]);
   }
   job.complete();
