@@ -129,6 +129,9 @@ class Grid final : public TableObject<Grid>, public TableSource {
     return FixedRows() > 0 ? TextMatrix(0, column) : Text();
   }
   [[nodiscard]] std::int32_t column_width(std::int32_t column) const override { return ColWidth(column); }
+  [[nodiscard]] bool is_right_aligned(std::int32_t column) const override {
+    return at(column).alignment >= 6 && at(column).alignment <= 8;
+  }
   [[nodiscard]] Text cell_text(std::int32_t row, std::int32_t column) const override {
     return TextMatrix(row + FixedRows(), column);
   }

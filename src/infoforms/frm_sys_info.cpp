@@ -72,6 +72,9 @@ constexpr std::int32_t item_tab = 4;
 void fill_grid(Grid& grid, const FactTable& table) {
   constexpr std::int32_t wide_columns[] = {2400, 5600};
   constexpr std::int32_t narrow_columns[] = {1300, 1100, 1300, 1150, 1050, 1050, 1100};
+  constexpr std::int16_t left = 1;
+  constexpr std::int16_t right = 7;
+  const auto is_size = [](TextView heading) { return heading == u"Total" || heading == u"Free"; };
   const bool is_list = table.columns.size() == 2;
   const std::span<const std::int32_t> widths =
       is_list ? std::span<const std::int32_t>(wide_columns) : std::span<const std::int32_t>(narrow_columns);
@@ -82,6 +85,7 @@ void fill_grid(Grid& grid, const FactTable& table) {
   for (std::size_t c = 0; c < table.columns.size(); ++c) {
     const auto column = static_cast<std::int32_t>(c);
     grid.put_ColWidth(column, widths[c]);
+    grid.put_ColAlignment(column, is_size(table.columns[c]) ? right : left);
     grid.put_cell(0, column, table.columns[c]);
     for (std::size_t r = 0; r < table.rows.size(); ++r) {
       grid.put_cell(static_cast<std::int32_t>(r + 1), column, table.rows[r][c]);

@@ -17,6 +17,7 @@ class TableSource {
   /// The heading of a column; empty if the table has none.
   [[nodiscard]] virtual Text heading(std::int32_t column) const = 0;
   [[nodiscard]] virtual std::int32_t column_width(std::int32_t column) const = 0;  ///< In twips.
+  [[nodiscard]] virtual bool is_right_aligned(std::int32_t column) const = 0;
   [[nodiscard]] virtual Text cell_text(std::int32_t row, std::int32_t column) const = 0;
 
   /// The window that now shows the table; 0 once it is closed.

@@ -25,24 +25,35 @@ void ListView::show(TableSource& table, std::int32_t bar_column) {
   table.set_window(static_cast<std::int32_t>(reinterpret_cast<LONG_PTR>(window_)));
   while (send(window_, LVM_DELETECOLUMN, 0) != 0) {
   }
-  RECT room{};
-  GetClientRect(window_, &room);
-  int rest = static_cast<int>(room.right) - GetSystemMetrics(SM_CXVSCROLL);
-  const std::int32_t columns = table.column_count();
-  for (std::int32_t c = 0; c < columns; ++c) {
+  for (std::int32_t c = 0; c < table.column_count(); ++c) {
     Text heading = table.heading(c);
     LVCOLUMNW column{};
-    column.mask = LVCF_TEXT | LVCF_WIDTH | LVCF_SUBITEM;
-    column.cx = static_cast<int>(std::lround(table.column_width(c) * dots_ / twips_per_inch));
-    rest -= column.cx;
-    // The last column takes the remaining width.
-    if (c + 1 == columns && rest > 0) column.cx += rest;
+    column.mask = LVCF_TEXT | LVCF_FMT | LVCF_WIDTH | LVCF_SUBITEM;
+    column.fmt = table.is_right_aligned(c) ? LVCFMT_RIGHT : LVCFMT_LEFT;
+    column.cx = dots_of(c);
     column.pszText = reinterpret_cast<wchar_t*>(heading.data());
     column.iSubItem = c;
     send(window_, LVM_INSERTCOLUMNW, c, &column);
   }
   send(window_, LVM_SETITEMCOUNT, table.row_count());
+  fill_width();
   InvalidateRect(window_, nullptr, TRUE);
+}
+
+int ListView::dots_of(std::int32_t column) const {
+  return static_cast<int>(std::lround(table_->column_width(column) * dots_ / twips_per_inch));
+}
+
+void ListView::fill_width() const {
+  if (table_ == nullptr || table_->column_count() == 0) return;
+  RECT room{};
+  GetClientRect(window_, &room);
+  const std::int32_t last = table_->column_count() - 1;
+  int rest = static_cast<int>(room.right);
+  if ((GetWindowLongPtrW(window_, GWL_STYLE) & WS_VSCROLL) == 0) rest -= GetSystemMetrics(SM_CXVSCROLL);
+  // The user may have changed the others.
+  for (std::int32_t c = 0; c < last; ++c) rest -= static_cast<int>(send(window_, LVM_GETCOLUMNWIDTH, c));
+  SendMessageW(window_, LVM_SETCOLUMNWIDTH, static_cast<WPARAM>(last), std::max(rest, dots_of(last)));
 }
 
 void ListView::close() {

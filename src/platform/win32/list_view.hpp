@@ -17,6 +17,9 @@ class ListView {
   /// @param bar_column a column of percentages to be drawn as bars; -1 for none
   void show(TableSource& table, std::int32_t bar_column);
 
+  /// Gives the width that the other columns leave to the last one.
+  void fill_width() const;
+
   /// Scales the columns after the window has come to a monitor with other dots per inch.
   void follow_dots(int dots) {
     dots_ = dots;
@@ -36,6 +39,7 @@ class ListView {
 
  private:
   void draw_bar(HDC device, std::int32_t row) const;
+  [[nodiscard]] int dots_of(std::int32_t column) const;
 
   HWND window_;
   int dots_;
