@@ -35,20 +35,6 @@ bool is_left_out(const Slot& slot) {
          std::ranges::any_of(slot.parameters, [](const auto& p) { return p.referenced == VT_USERDEFINED; });
 }
 
-/// The bytes in use on all heaps of the process. Without the platform's cache of texts, what stays there has leaked.
-std::size_t bytes_in_use() {
-  std::array<HANDLE, 32> heaps{};
-  const DWORD count = GetProcessHeaps(static_cast<DWORD>(heaps.size()), heaps.data());
-  std::size_t bytes = 0;
-  for (DWORD i = 0; i < count; ++i) {
-    PROCESS_HEAP_ENTRY entry{};
-    while (HeapWalk(heaps[i], &entry) != FALSE) {
-      if ((entry.wFlags & PROCESS_HEAP_ENTRY_BUSY) != 0) bytes += entry.cbData;
-    }
-  }
-  return bytes;
-}
-
 /// A type and a value in a line.
 std::wstring shown_value(const VARIANT& value) {
   const VARTYPE type = V_VT(&value);
