@@ -14,17 +14,17 @@ constexpr FormPart parts[] = {
     {.id = Help::Grid1,
      .kind = PartKind::table,
      .follows = width | height,
-     .place = {7, 7, 426, 122},
+     .place = {7, 7, 486, 122},
      .caption = u"Command line switches"},
     {.id = Help::examples_label,
      .kind = PartKind::label,
      .follows = bottom,
      .place = {7, 134, 80, 9},
      .caption = u"&Examples:"},
-    {.id = Help::rtbExamples, .kind = PartKind::rich_text, .follows = width | bottom, .place = {7, 145, 426, 68}},
+    {.id = Help::rtbExamples, .kind = PartKind::rich_text, .follows = width | bottom, .place = {7, 145, 486, 68}},
 };
 
-constexpr FormDescription description{.parts = parts, .width = 440, .height = 220, .is_resizable = true};
+constexpr FormDescription description{.parts = parts, .width = 500, .height = 220, .is_resizable = true};
 
 struct Switch {
   TextView command;
@@ -59,7 +59,7 @@ constexpr TextView examples =
 FrmCmdLineHelp::FrmCmdLineHelp(Library& library) : Form(library, description), grid_(library.platform()) {}
 
 void FrmCmdLineHelp::fill(FormView& view) {
-  constexpr std::int32_t command_width = 2900;
+  constexpr std::int32_t command_width = 3300;
   constexpr std::int32_t description_width = 6500;
   grid_.put_Cols(2);
   grid_.put_Rows(static_cast<std::int32_t>(std::size(rows)));
