@@ -57,69 +57,337 @@ class Grid final : public TableObject<Grid>, public TableSource {
   explicit Grid(const Platform& platform)
       : TableObject(platform), files_(platform.files), code_page_(platform.code_page) {}
 
-  /// The size of the table. Shrinking discards cells; new cells are empty. If fewer rows or columns remain than were
-  /// fixed, all of them are fixed. Raise 5 for a negative number and 7 beyond the limits above.
+  /// The number of rows, fixed ones included; more rows are empty, fewer discard the last ones. If fewer rows remain
+  /// than were fixed, all of them are fixed. A new grid has none.
+  /// @raises 5 if the number is negative
+  /// @raises 7 if it is above 5,000,000
+  /// @family grids
+  /// @see Cols, FixedRows, AddItem
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 2
+  ///     g.Rows = 3
+  ///     g.TextMatrix(2, 1) = "last"
+  ///     Print g.Rows & " " & g.TextMatrix(2, 1)
+  ///     ' 3 last
   [[nodiscard]] std::int32_t Rows() const noexcept { return static_cast<std::int32_t>(rows_.size()); }
   void put_Rows(std::int32_t rows);
+
+  /// The number of columns, fixed ones included; more columns are empty, fewer discard the last ones. If fewer columns
+  /// remain than were fixed, all of them are fixed. A new grid has none, so set it before AddItem.
+  /// @raises 5 if the number is negative
+  /// @raises 7 if it is above 32,767
+  /// @family grids
+  /// @see Rows, FixedCols
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 4
+  ///     Print g.Cols
+  ///     ' 4
   [[nodiscard]] std::int32_t Cols() const noexcept { return static_cast<std::int32_t>(columns_.size()); }
   void put_Cols(std::int32_t columns);
 
-  /// The number of leading rows and columns that are headings. Raise 5 for more than there are.
+  /// The number of rows at the top that are headings. Reports repeat them on each page; SelectGridRows and
+  /// CountGridSelectedRows leave them out.
+  /// @raises 5 if the number is negative or above Rows
+  /// @family grids
+  /// @see FixedCols, Rows, GridPrintPreview
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 2
+  ///     g.AddItem "Name" & vbTab & "Amount"
+  ///     g.AddItem "Smith" & vbTab & "120"
+  ///     g.FixedRows = 1
+  ///     Print g.FixedRows
+  ///     ' 1
   [[nodiscard]] std::int32_t FixedRows() const noexcept { return fixed_rows_; }
   void put_FixedRows(std::int32_t rows);
+
+  /// The number of columns on the left that are headings. Reports repeat them before the columns that continue on
+  /// further pages.
+  /// @raises 5 if the number is negative or above Cols
+  /// @family grids
+  /// @see FixedRows, Cols
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 3
+  ///     g.FixedCols = 1
+  ///     Print g.FixedCols
+  ///     ' 1
   [[nodiscard]] std::int32_t FixedCols() const noexcept { return fixed_columns_; }
   void put_FixedCols(std::int32_t columns);
 
-  /// The text of a cell. Values are stored as text.
+  /// The text of a cell; a value that is put is stored as text.
+  /// @param Row the row, counted from 0
+  /// @param Col the column, counted from 0
+  /// @raises 9 if there is no such row or column
+  /// @family grids
+  /// @see Cell
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Rows = 1
+  ///     g.Cols = 1
+  ///     g.TextMatrix(0, 0) = 1.5
+  ///     Print g.TextMatrix(0, 0) & " " & TypeName(g.TextMatrix(0, 0))
+  ///     ' 1.5 String
   [[nodiscard]] Text TextMatrix(std::int32_t row, std::int32_t column) const;
   void put_TextMatrix(std::int32_t row, std::int32_t column, const Text& value) { put_cell(row, column, value); }
   void put_cell(std::int32_t row, std::int32_t column, TextView text);
 
-  /// A setting of a cell: 0 is its text, 5 the state of the check box that cells in a column of type 11 have: 1 ticked
-  /// (the text is "True" or a nonzero number), 2 not ticked, 0 no check box. Raises 5 for another setting or state.
+  /// A setting of a cell: 0 its text, 5 the state of its check box. A cell has a check box if its column has the type
+  /// 11 (ColDataType). Putting a state stores the text "True" or "False".
+  /// @param Setting 0 the text; 5 the check box: 1 ticked (the text is "True" or a number other than 0), 2 not ticked,
+  ///   0 no check box
+  /// @param Row the row, counted from 0
+  /// @param Col the column, counted from 0
+  /// @raises 5 for another setting, and if the state that is put is neither 1 nor 2
+  /// @raises 9 if there is no such row or column
+  /// @family grids
+  /// @see TextMatrix, ColDataType, SelectGridRows
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Rows = 1
+  ///     g.Cols = 1
+  ///     g.ColDataType(0) = 11
+  ///     g.Cell(5, 0, 0) = 1
+  ///     Print g.Cell(5, 0, 0) & " " & g.Cell(0, 0, 0)
+  ///     ' 1 True
   [[nodiscard]] Variant Cell(std::int16_t setting, std::int32_t row, std::int32_t column) const;
   void put_Cell(std::int16_t setting, std::int32_t row, std::int32_t column, const Variant& value);
 
-  /// The width of a column in twips; a negative width means the default.
+  /// The width of a column, in twips: 1000 at first, and again if a negative width is put.
+  /// @param Col the column, counted from 0
+  /// @raises 9 if there is no such column
+  /// @family grids
+  /// @see ColHidden, LoadGridWidths, SaveGridWidths
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 1
+  ///     Print g.ColWidth(0)
+  ///     ' 1000
+  ///     g.ColWidth(0) = 2400
+  ///     Print g.ColWidth(0)
+  ///     ' 2400
   [[nodiscard]] std::int32_t ColWidth(std::int32_t column) const { return at(column).width; }
   void put_ColWidth(std::int32_t column, std::int32_t width) { at(column).width = width < 0 ? default_width : width; }
+
+  /// Whether a column is hidden: reports and exports leave it out.
+  /// @param Col the column, counted from 0
+  /// @raises 9 if there is no such column
+  /// @family grids
+  /// @see RowHidden, ExportGridData
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 2
+  ///     g.ColHidden(1) = True
+  ///     Print g.ColHidden(0) & " " & g.ColHidden(1)
+  ///     ' False True
   [[nodiscard]] Boolean ColHidden(std::int32_t column) const { return at(column).is_hidden; }
   void put_ColHidden(std::int32_t column, Boolean hidden) { at(column).is_hidden = Boolean(bool(hidden)); }
+
+  /// Whether a row is hidden: reports and exports leave it out, but ticking and counting include it.
+  /// @param Row the row, counted from 0
+  /// @raises 9 if there is no such row
+  /// @family grids
+  /// @see ColHidden, CountGridSelectedRows
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Rows = 2
+  ///     g.RowHidden(1) = True
+  ///     Print g.RowHidden(0) & " " & g.RowHidden(1)
+  ///     ' False True
   [[nodiscard]] Boolean RowHidden(std::int32_t row) const { return Boolean(rows_[index_in(rows_, row)].is_hidden); }
   void put_RowHidden(std::int32_t row, Boolean hidden) { rows_[index_in(rows_, row)].is_hidden = bool(hidden); }
 
-  /// The alignment of a column's texts, in threes (top, middle, bottom): 0 to 2 left, 3 to 5 centred, 6 to 8 right; 9
-  /// is right for numbers and left for texts.
+  /// The alignment of a column's texts in reports: 0 left, 3 centred, 6 right; 9, at first, numbers right and texts
+  /// left. The numbers go in threes, the second and third being the middle and the bottom of the cell: 0 to 2 left, 3
+  /// to 5 centred, 6 to 8 right.
+  /// @param Col the column, counted from 0
+  /// @raises 9 if there is no such column
+  /// @family grids
+  /// @see GridPrintPreview
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 1
+  ///     Print g.ColAlignment(0)
+  ///     ' 9
+  ///     g.ColAlignment(0) = 6
+  ///     Print g.ColAlignment(0)
+  ///     ' 6
   [[nodiscard]] std::int16_t ColAlignment(std::int32_t column) const { return at(column).alignment; }
   void put_ColAlignment(std::int32_t column, std::int16_t alignment) { at(column).alignment = alignment; }
 
-  /// The height of a row in twips; 0 or less for a row as high as its text.
+  /// The height of a row, in twips; 0, as at first, or less for a row as high as its text. With WordWrap, a report
+  /// shows as many lines of a text as the height has room for.
+  /// @param Row the row, counted from 0
+  /// @raises 9 if there is no such row
+  /// @family grids
+  /// @see WordWrap
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Rows = 1
+  ///     g.RowHeight(0) = 600
+  ///     Print g.RowHeight(0)
+  ///     ' 600
   [[nodiscard]] std::int32_t RowHeight(std::int32_t row) const { return rows_[index_in(rows_, row)].height; }
   void put_RowHeight(std::int32_t row, std::int32_t height) { rows_[index_in(rows_, row)].height = height; }
 
-  // The grid's appearance on a window or on pages. Colours are 0x00BBGGRR.
-  Text FontName;               ///< Empty, like a size of 0, for the default.
-  float FontSize = 0;          ///< In points.
-  Boolean WordWrap;            ///< Wraps long texts within their cells; otherwise they are cut off.
-  std::int16_t GridLines = 1;  ///< 0 for none.
-  std::int32_t GridColor = 0xC0C0C0;
-  Boolean FontBold;
-  std::int32_t ForeColor = 0;
-  std::int32_t BackColor = 0xFFFFFF;
-  std::int32_t ForeColorFixed = 0;         ///< The letters of fixed rows and columns.
-  std::int32_t BackColorFixed = 0xE8E8E8;  ///< Behind them.
+  // The grid's appearance on a window or on pages. Colours are 0x00BBGGRR: &HFF is red.
 
-  /// The type of a column's values as an automation type: 11 is Boolean. 0 until it is set.
+  /// The font of the texts in reports; empty, as at first, for the default, a fixed-width font.
+  /// @family grids
+  /// @see FontSize, GridPrintPreview
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.FontName = "Arial"
+  ///     Print g.FontName
+  ///     ' Arial
+  Text FontName;
+
+  /// The size of the texts in reports, in points; 0, as at first, for the default of 8.
+  /// @family grids
+  /// @see FontName, GridPrintPreview
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.FontSize = 10.5
+  ///     Print g.FontSize
+  ///     ' 10.5
+  float FontSize = 0;
+
+  /// Whether long texts continue on the next line of their cell in reports; otherwise they are cut off.
+  /// @family grids
+  /// @see RowHeight, GridPrintPreview
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.WordWrap = True
+  ///     Print g.WordWrap
+  ///     ' True
+  Boolean WordWrap;
+
+  /// Whether reports have lines between the cells: 0 for none, 1, as at first, for lines.
+  /// @family grids
+  /// @see GridColor, GridPrintPreview
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.GridLines = 0
+  ///     Print g.GridLines
+  ///     ' 0
+  std::int16_t GridLines = 1;
+
+  /// The colour of the lines, as 0x00BBGGRR; a light grey (12632256) at first.
+  /// @family grids
+  /// @see GridLines, GridPrintPreview
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.GridColor = 255
+  ///     Print g.GridColor
+  ///     ' 255
+  std::int32_t GridColor = 0xC0C0C0;
+
+  /// Whether the texts are bold in reports.
+  /// @family grids
+  /// @see FontName, GridPrintPreview
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.FontBold = True
+  ///     Print g.FontBold
+  ///     ' True
+  Boolean FontBold;
+
+  /// The colour of the texts, as 0x00BBGGRR; black (0) at first.
+  /// @family grids
+  /// @see BackColor, ForeColorFixed
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.ForeColor = 255
+  ///     Print g.ForeColor
+  ///     ' 255
+  std::int32_t ForeColor = 0;
+
+  /// The colour behind the texts, as 0x00BBGGRR; white (16777215) at first.
+  /// @family grids
+  /// @see ForeColor, BackColorFixed
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.BackColor = 65535
+  ///     Print g.BackColor
+  ///     ' 65535
+  std::int32_t BackColor = 0xFFFFFF;
+
+  /// The colour of the texts of fixed rows and columns, as 0x00BBGGRR; black (0) at first.
+  /// @family grids
+  /// @see ForeColor, BackColorFixed
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.ForeColorFixed = 16777215
+  ///     Print g.ForeColorFixed
+  ///     ' 16777215
+  std::int32_t ForeColorFixed = 0;
+
+  /// The colour behind fixed rows and columns, as 0x00BBGGRR; a pale grey (15263976) at first.
+  /// @family grids
+  /// @see BackColor, ForeColorFixed
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.BackColorFixed = 8388608
+  ///     Print g.BackColorFixed
+  ///     ' 8388608
+  std::int32_t BackColorFixed = 0xE8E8E8;
+
+  /// The type of a column's values, as an automation type: 11 is Boolean, which gives its cells check boxes; 0 at
+  /// first. Other types are kept for the host.
+  /// @param Col the column, counted from 0
+  /// @raises 9 if there is no such column
+  /// @family grids
+  /// @see Cell, SelectGridRows, CountGridSelectedRows
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Rows = 3
+  ///     g.Cols = 1
+  ///     g.ColDataType(0) = 11
+  ///     u.SelectGridRows 0, g, 1
+  ///     Print u.CountGridSelectedRows(0, g)
+  ///     ' 3
   [[nodiscard]] std::int16_t ColDataType(std::int32_t column) const { return at(column).data_type; }
   void put_ColDataType(std::int32_t column, std::int16_t type) { at(column).data_type = type; }
 
-  /// The first and last row of the selection. Setting the first also sets the last. -1 means no row.
+  /// The row where the selection begins, counted from 0; -1, as at first, for no selection. Putting it also sets RowSel
+  /// to the same row.
+  /// @raises 9 if there is no such row
+  /// @family grids
+  /// @see RowSel, ExportGridData
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Rows = 5
+  ///     g.Row = 1
+  ///     g.RowSel = 3
+  ///     Print g.Row & " to " & g.RowSel
+  ///     ' 1 to 3
   [[nodiscard]] std::int32_t Row() const noexcept { return row_; }
   void put_Row(std::int32_t row);
+
+  /// The row where the selection ends, counted from 0; it may be above Row. -1 for no selection.
+  /// @raises 9 if there is no such row
+  /// @family grids
+  /// @see Row, ExportGridData
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Rows = 5
+  ///     g.Row = 3
+  ///     g.RowSel = 1
+  ///     Print g.Row & " to " & g.RowSel
+  ///     ' 3 to 1
   [[nodiscard]] std::int32_t RowSel() const noexcept { return row_end_; }
   void put_RowSel(std::int32_t row);
 
-  /// The grid's window, which report builders ask for; 0 if the table is not shown.
+  /// The handle of the grid's window; 0 while it is not shown, as is every grid that a host creates. Report builders
+  /// ask for it, as they ask every grid.
+  /// @family grids
+  /// @see GridPrintPreview
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     Print g.hwnd
+  ///     ' 0
   [[nodiscard]] std::int32_t hwnd() const noexcept { return window_; }
 
   // As a table on a window: if the first row is fixed, it is the heading, and the others follow below.
@@ -137,26 +405,95 @@ class Grid final : public TableObject<Grid>, public TableSource {
   }
   void set_window(std::int32_t window) override { window_ = window; }
 
-  /// Clears every cell.
+  /// Empties every cell; rows, columns and their settings stay.
+  /// @family grids
+  /// @see RemoveItem
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 1
+  ///     g.AddItem "Smith"
+  ///     g.Clear
+  ///     Print g.Rows & " [" & g.TextMatrix(0, 0) & "]"
+  ///     ' 1 []
   void Clear();
 
-  /// Inserts a row before another one, or (-1) at the end, with the tab-separated cells of a text. Cells beyond the
-  /// last column are dropped. A row inserted before a fixed row is fixed too; the selection stays on its rows.
+  /// Adds a row, whose cells are separated by tabs in the text, at the end or before another row. Cells beyond the last
+  /// column are dropped, so set Cols first. A row added before a fixed one is fixed, too; the selection stays on its
+  /// rows.
+  /// @param Item the texts of the cells, separated by tabs
+  /// @param Index the row before which it is inserted; -1, or left out, for the end
+  /// @raises 9 if Index is neither -1 nor 0 to Rows
+  /// @raises 7 if the grid has 5,000,000 rows
+  /// @family grids
+  /// @see RemoveItem, Cols
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 2
+  ///     g.AddItem "Smith" & vbTab & "120"
+  ///     g.AddItem "Jones" & vbTab & "80", 0
+  ///     Print g.TextMatrix(0, 0) & " " & g.TextMatrix(1, 1)
+  ///     ' Jones 120
   void AddItem(const Text& item, std::int32_t index);
 
-  /// Removes a row. The other fixed rows stay fixed, and the selection stays on its rows; if a selected row is removed,
-  /// the next one takes its place.
+  /// Removes a row; the others move up. The other fixed rows stay fixed, and the selection stays on its rows; if a
+  /// selected row is removed, the next one takes its place.
+  /// @param Index the row, counted from 0
+  /// @raises 9 if there is no such row
+  /// @family grids
+  /// @see AddItem, Clear
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 1
+  ///     g.AddItem "Smith"
+  ///     g.AddItem "Jones"
+  ///     g.RemoveItem 0
+  ///     Print g.Rows & " " & g.TextMatrix(0, 0)
+  ///     ' 1 Jones
   void RemoveItem(std::int32_t index);
 
-  /// Writes the table to a file. Formats: 3 comma-separated and 4 tab-separated text, with cells quoted that contain a
-  /// separator, quote or line break; 5 columns of fixed width, two blanks apart, with line breaks as blanks. Code page
-  /// 1252, or UTF-8 with a byte order mark if the page lacks a character. Raises 5 for another format, and the errors
-  /// of writing a file; an existing file then stays as it was.
+  /// Writes the table to a file: 3 as comma-separated text, 4 as tab-separated text, 5 in columns of fixed width. Cells
+  /// that contain a separator, a quote or a line break are quoted. The columns of format 5 are two blanks apart, with
+  /// line breaks as blanks. The file is in the ANSI code page, or in UTF-8 with a byte order mark if that lacks a
+  /// character. Hidden rows and columns are written, too. If it fails, an existing file stays as it was.
+  /// @param FileName the path of the file
+  /// @param Format 3 comma-separated, 4 tab-separated, 5 fixed width
+  /// @param FixedCells True, or left out, writes the fixed rows and columns, too; False leaves them out
+  /// @raises 5 for another format
+  /// @raises 76 if the folder is missing
+  /// @raises 61 if the disk is full
+  /// @raises 70 if the file is locked
+  /// @raises 75 if the file may not be written
+  /// @family grids
+  /// @see LoadGrid, ExportGridData
+  /// @example
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.Cols = 2
+  ///     g.AddItem "Smith, John" & vbTab & "120"
+  ///     g.SaveGrid folder & "\customers.csv", 3
+  ///     Print Len(u.LoadTextBox(folder & "\customers.csv"))
+  ///     ' 19
   void SaveGrid(const Text& file, std::int16_t format, Boolean fixed_cells) const;
 
-  /// Reads such a file into the table, which takes the file's size. The numbers of fixed rows and columns stay the same
-  /// if the table is large enough. Without `fixed_cells`, fixed cells stay and the file's cells follow them. Widths,
-  /// types and hidden columns stay. Raises the same errors as SaveGrid, and then changes nothing.
+  /// Reads a file that SaveGrid or another program wrote; the table takes the file's size. The numbers of fixed rows
+  /// and columns stay the same if the table is large enough. Widths, types and hidden columns stay; heights and hidden
+  /// rows do not. Without FixedCells, fixed cells stay and the file's cells follow them. If it fails, nothing changes.
+  /// @param FileName the path of the file
+  /// @param Format 3 comma-separated, 4 tab-separated, 5 fixed width
+  /// @param FixedCells True, or left out, if the file has the fixed rows and columns, too
+  /// @raises 5 for another format
+  /// @raises 53 if the file is missing
+  /// @raises 76 if the folder is missing
+  /// @raises 70 if the file is locked
+  /// @raises 75 if the file may not be read
+  /// @family grids
+  /// @see SaveGrid
+  /// @example
+  ///     u.SaveTextBox "Name,Amount" & vbCrLf & """Smith, John"",120", folder & "\customers.csv"
+  ///     Set g = CreateObject("TALUtil.Grid")
+  ///     g.LoadGrid folder & "\customers.csv", 3
+  ///     g.FixedRows = 1
+  ///     Print g.Rows & " rows, " & g.Cols & " columns: " & g.TextMatrix(1, 0)
+  ///     ' 2 rows, 2 columns: Smith, John
   void LoadGrid(const Text& file, std::int16_t format, Boolean fixed_cells);
 
  private:
