@@ -1,11 +1,11 @@
 # The layers of the code. Each is a folder of src with its own target, which only sees the headers of the layers below
 # it: an include root contains a single folder, so that an include in the wrong direction does not compile.
 #
-#   talutil_layer(NAME [FOLDER folder] BELOW layer... [LIBRARIES library...])
+#   talutil_layer(NAME [FOLDER folder] BELOW layer... [LIBRARIES library...] [GENERATED source...])
 #
 # The folder has the layer's name by default; the libraries are visible to this layer only.
 function(talutil_layer name)
-  cmake_parse_arguments(PARSE_ARGV 1 layer "" "FOLDER" "BELOW;LIBRARIES")
+  cmake_parse_arguments(PARSE_ARGV 1 layer "" "FOLDER" "BELOW;LIBRARIES;GENERATED")
   if(NOT layer_FOLDER)
     set(layer_FOLDER ${name})
   endif()
@@ -18,11 +18,20 @@ function(talutil_layer name)
     get_filename_component(file ${header} NAME)
     file(CREATE_LINK ${header} ${root}/${layer_FOLDER}/${file} SYMBOLIC)
   endforeach()
-  add_library(layer_${name} OBJECT ${sources})
+  add_library(layer_${name} OBJECT ${sources} ${layer_GENERATED})
   target_include_directories(layer_${name} PUBLIC ${root})
   list(TRANSFORM layer_BELOW PREPEND layer_)
   target_link_libraries(layer_${name} PUBLIC talutil_options ${layer_BELOW} PRIVATE ${layer_LIBRARIES})
 endfunction()
+
+# The texts of all members, read from the doc comments of the headers. Nothing that the DLL needs refers to them.
+find_program(python python3 REQUIRED NO_CMAKE_FIND_ROOT_PATH)
+file(GLOB text_headers CONFIGURE_DEPENDS src/library/*.hpp src/controls/*.hpp)
+set(member_texts ${CMAKE_BINARY_DIR}/member_texts.cpp)
+add_custom_command(OUTPUT ${member_texts}
+  COMMAND ${python} ${CMAKE_SOURCE_DIR}/tools/member_texts.py ${member_texts}
+  DEPENDS tools/member_texts.py ${text_headers}
+  COMMENT "Reading the texts of the members")
 
 # From bottom to top: values, the seam to the platform, what is built on that, and the families of members. If a layer
 # is above two others, neither of these knows the other.
@@ -31,7 +40,8 @@ talutil_layer(platform BELOW automation)
 talutil_layer(documents BELOW platform LIBRARIES documents::pdf)
 talutil_layer(archives BELOW platform LIBRARIES archives::zip archives::deflate)
 talutil_layer(controls BELOW documents archives)
-talutil_layer(library BELOW controls)
+talutil_layer(texts GENERATED ${member_texts})
+talutil_layer(library BELOW controls texts)
 set(families text dates services forms preview)
 foreach(family ${families})
   talutil_layer(${family} BELOW library)
@@ -41,6 +51,6 @@ talutil_layer(startup BELOW ${families} infoforms)
 
 add_library(talutil_core STATIC)
 target_link_libraries(talutil_core
-  PUBLIC layer_automation layer_platform layer_documents layer_archives layer_controls layer_library layer_text
+  PUBLIC layer_automation layer_texts layer_platform layer_documents layer_archives layer_controls layer_library layer_text
          layer_dates layer_services layer_forms layer_preview layer_infoforms layer_startup
   PRIVATE archives::zip archives::deflate documents::pdf)

@@ -38,14 +38,16 @@ find_program(host_compiler NAMES c++ g++ REQUIRED NO_CMAKE_FIND_ROOT_PATH)
 find_program(idl_compiler ${talutil_tool_prefix}-widl REQUIRED NO_CMAKE_FIND_ROOT_PATH)
 set(generated ${CMAKE_BINARY_DIR}/generated)
 file(MAKE_DIRECTORY ${generated})
-file(GLOB table_headers CONFIGURE_DEPENDS src/automation/*.hpp src/library/*.hpp)
+file(GLOB table_headers CONFIGURE_DEPENDS src/automation/*.hpp src/library/*.hpp src/texts/*.hpp)
 set(host_compile ${host_compiler} -std=c++20 -O0 -I${CMAKE_SOURCE_DIR}/src)
 
 add_custom_command(
   OUTPUT ${generated}/write_idl
   COMMAND ${host_compile} ${CMAKE_SOURCE_DIR}/tools/write_idl.cpp
-          ${CMAKE_SOURCE_DIR}/src/library/interface_definition.cpp -o ${generated}/write_idl
-  DEPENDS tools/write_idl.cpp src/library/interface_definition.cpp ${table_headers})
+          ${CMAKE_SOURCE_DIR}/src/library/interface_definition.cpp ${CMAKE_SOURCE_DIR}/src/texts/member_texts.cpp
+          ${member_texts} -o ${generated}/write_idl
+  DEPENDS tools/write_idl.cpp src/library/interface_definition.cpp src/texts/member_texts.cpp ${member_texts}
+          ${table_headers})
 add_custom_command(
   OUTPUT ${generated}/mend_typelib
   COMMAND ${host_compile} ${CMAKE_SOURCE_DIR}/tools/mend_typelib.cpp -o ${generated}/mend_typelib

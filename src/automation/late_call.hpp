@@ -198,37 +198,37 @@ Variant late_put(void* target, std::span<Argument> arguments, const Locale& loca
 template <class Target>
 struct LateCalls {
   template <auto M>
-  static constexpr std::array<LateCall, 1> get_only(MemberName, const char*) {
+  static constexpr std::array<LateCall, 1> get_only(MemberName) {
     return {&detail::late_get<Target, M>};
   }
 
   template <auto M, ObjectKind Kind = any_object>
-  static constexpr std::array<LateCall, 1> put_only(MemberName, const char*) {
+  static constexpr std::array<LateCall, 1> put_only(MemberName) {
     return {&detail::late_put<Target, M, Kind>};
   }
 
   template <auto M>
-  static constexpr std::array<LateCall, 2> property(MemberName, const char*) {
+  static constexpr std::array<LateCall, 2> property(MemberName) {
     return {&detail::late_get<Target, M>, &detail::late_put<Target, M>};
   }
 
   template <auto M>
-  static constexpr std::array<LateCall, 2> property_put_first(MemberName, const char*) {
+  static constexpr std::array<LateCall, 2> property_put_first(MemberName) {
     return {&detail::late_put<Target, M>, &detail::late_get<Target, M>};
   }
 
   template <auto G, auto S, class... Names>
-  static constexpr std::array<LateCall, 2> accessors(MemberName, const char*, Names...) {
+  static constexpr std::array<LateCall, 2> accessors(MemberName, Names...) {
     return {&detail::late_method<Target, G>, &detail::late_method<Target, S>};
   }
 
   template <auto S, class... Names>
-  static constexpr std::array<LateCall, 1> setter(MemberName, const char*, Names...) {
+  static constexpr std::array<LateCall, 1> setter(MemberName, Names...) {
     return {&detail::late_method<Target, S>};
   }
 
   template <auto M, class... Names>
-  static constexpr std::array<LateCall, 1> method(MemberName, const char*, Names...) {
+  static constexpr std::array<LateCall, 1> method(MemberName, Names...) {
     return {&detail::late_method<Target, M>};
   }
 

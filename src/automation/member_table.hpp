@@ -16,8 +16,8 @@
 ///
 ///     template <class P>
 ///     constexpr auto members_of(std::type_identity<Thing>) {
-///       return P::rows(P::template property<&Thing::Width>("Width", "The width, in twips."),
-///                      P::template method<&Thing::Move>("Move", "Moves it.", "X", optional("Y", 0)));
+///       return P::rows(P::template property<&Thing::Width>("Width"),
+///                      P::template method<&Thing::Move>("Move", "X", optional("Y", 0)));
 ///     }
 ///
 /// A policy turns each row into something: Describe into names and types, LateCalls into the functions behind late
@@ -132,7 +132,6 @@ constexpr std::size_t most_parameters = 9;
 /// The description of one slot of an interface.
 struct Member {
   std::string_view name;
-  std::string_view help;
   std::int32_t identifier = 0;
   Access access = Access::call;
   ValueType result = ValueType::none;
@@ -196,13 +195,13 @@ using PropertyType = std::conditional_t<std::is_same_v<typename MemberTraits<M>:
 /// Describes each slot.
 struct Describe {
   template <auto M>
-  static constexpr std::array<Member, 1> get_only(MemberName name, const char* help) {
-    return {accessor(name, help, Access::get, value_type<PropertyType<M>>())};
+  static constexpr std::array<Member, 1> get_only(MemberName name) {
+    return {accessor(name, Access::get, value_type<PropertyType<M>>())};
   }
 
   template <auto M, ObjectKind = any_object>
-  static constexpr std::array<Member, 1> put_only(MemberName name, const char* help) {
-    Member member = accessor(name, help, Access::put, ValueType::none);
+  static constexpr std::array<Member, 1> put_only(MemberName name) {
+    Member member = accessor(name, Access::put, ValueType::none);
     member.parameter_count = 1;
     member.all_parameters[0].name = "value";
     member.all_parameters[0].type = value_type<PropertyType<M>>();
@@ -210,37 +209,37 @@ struct Describe {
   }
 
   template <auto M>
-  static constexpr std::array<Member, 2> property(MemberName name, const char* help) {
-    return {get_only<M>(name, help)[0], put_only<M>(name, help)[0]};
+  static constexpr std::array<Member, 2> property(MemberName name) {
+    return {get_only<M>(name)[0], put_only<M>(name)[0]};
   }
 
   template <auto M>
-  static constexpr std::array<Member, 2> property_put_first(MemberName name, const char* help) {
-    return {put_only<M>(name, help)[0], get_only<M>(name, help)[0]};
+  static constexpr std::array<Member, 2> property_put_first(MemberName name) {
+    return {put_only<M>(name)[0], get_only<M>(name)[0]};
   }
 
   /// A property implemented by functions, with or without indexes: G returns the value, S takes it after the indexes.
   /// Used by controls, not by interfaces.
   template <auto G, auto S, class... Names>
-  static constexpr std::array<Member, 2> accessors(MemberName name, const char* help, Names... names) {
-    std::array<Member, 2> slots{method<G>(name, help, names...)[0], setter<S>(name, help, names...)[0]};
+  static constexpr std::array<Member, 2> accessors(MemberName name, Names... names) {
+    std::array<Member, 2> slots{method<G>(name, names...)[0], setter<S>(name, names...)[0]};
     slots[0].access = Access::get;
     return slots;
   }
 
   /// A write-only property, with or without indexes: S takes the value after them.
   template <auto S, class... Names>
-  static constexpr std::array<Member, 1> setter(MemberName name, const char* help, Names... names) {
-    std::array<Member, 1> slot = method<S>(name, help, names..., "value");
+  static constexpr std::array<Member, 1> setter(MemberName name, Names... names) {
+    std::array<Member, 1> slot = method<S>(name, names..., "value");
     slot[0].access = Access::put;
     return slot;
   }
 
   template <auto M, class... Names>
-  static constexpr std::array<Member, 1> method(MemberName name, const char* help, Names... names) {
+  static constexpr std::array<Member, 1> method(MemberName name, Names... names) {
     using Traits = MemberTraits<M>;
     static_assert(sizeof...(Names) == Traits::arity, "a name for each parameter");
-    Member member = accessor(name, help, Access::call, value_type<typename Traits::Result>());
+    Member member = accessor(name, Access::call, value_type<typename Traits::Result>());
     const std::array<ParameterName, sizeof...(Names) + 1> given{ParameterName(names)..., ParameterName("")};
     Traits::with_arguments([&]<class... A>() {
       ((member.all_parameters[member.parameter_count] = parameter<A>(given[member.parameter_count]),
@@ -256,10 +255,9 @@ struct Describe {
   }
 
  private:
-  static constexpr Member accessor(MemberName name, const char* help, Access access, ValueType result) {
+  static constexpr Member accessor(MemberName name, Access access, ValueType result) {
     Member member;
     member.name = name.name;
-    member.help = help;
     member.identifier = name.identifier;
     member.access = access;
     member.result = result;

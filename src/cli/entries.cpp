@@ -121,6 +121,12 @@ std::string_view type_name(ValueType type) noexcept {
   return "";
 }
 
+std::span<const Parameter> parameters_of(const Entry& entry) noexcept {
+  if (entry.call != nullptr) return entry.call->parameters();
+  if (entry.get != nullptr) return entry.get->parameters();
+  return entry.put->parameters().first(entry.put->parameters().size() - 1);
+}
+
 std::string access_words(const Entry& entry) {
   if (entry.is_method()) return "call";
   if (entry.get != nullptr && entry.put != nullptr) return "get put";
@@ -129,10 +135,11 @@ std::string access_words(const Entry& entry) {
 
 std::string signature(const Entry& entry) {
   std::string words(entry.any().name);
-  if (entry.is_method()) {
+  const auto parameters = parameters_of(entry);
+  if (entry.is_method() || !parameters.empty()) {
     words += "(";
     std::string_view separator;
-    for (const Parameter& parameter : entry.call->parameters()) {
+    for (const Parameter& parameter : parameters) {
       words += separator;
       words += parameter_words(parameter);
       separator = ", ";

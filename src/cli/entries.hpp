@@ -21,7 +21,7 @@ struct Entry {
 
   /// The type of a property's value, or of a method's result.
   [[nodiscard]] ValueType type() const noexcept {
-    return get == nullptr && put != nullptr ? put->all_parameters[0].type : any().result;
+    return get == nullptr && put != nullptr ? put->parameters().back().type : any().result;
   }
 };
 
@@ -33,6 +33,9 @@ struct Entry {
 
 /// A type as hosts declare it.
 [[nodiscard]] std::string_view type_name(ValueType type) noexcept;
+
+/// The parameters of a method, or the indexes of a property.
+[[nodiscard]] std::span<const Parameter> parameters_of(const Entry& entry) noexcept;
 
 /// One of "get put", "get", "put" and "call".
 [[nodiscard]] std::string access_words(const Entry& entry);

@@ -5,6 +5,7 @@
 #include "cli/entries.hpp"
 #include "cli/json.hpp"
 #include "cli/session.hpp"
+#include "texts/member_texts.hpp"
 
 namespace talutil::cli {
 
@@ -21,13 +22,13 @@ std::string parameter_json(const Parameter& parameter) {
   return json::object(fields);
 }
 
-std::string entry_json(const Entry& entry) {
+std::string entry_json(const texts::ClassText& text, const Entry& entry) {
   const Member& member = entry.any();
   std::vector<json::Field> fields{{"name", json::text(member.name)},
                                   {"access", json::text(access_words(entry))},
                                   {"type", json::text(type_name(entry.type()))},
                                   {"signature", json::text(signature(entry))},
-                                  {"help", json::text(member.help)}};
+                                  {"help", json::text(texts::text_of(text, member.name).summary)}};
   if (entry.is_method()) {
     std::vector<std::string> parameters;
     std::ranges::transform(member.parameters(), std::back_inserter(parameters), parameter_json);
@@ -51,9 +52,10 @@ void list(const ListOptions& options) {
     for (const Entry& entry : entries) print_line(entry);
     return;
   }
+  const texts::ClassText& text = texts::text_of("ORVUtils");
   std::string separator = "[\n";
   for (const Entry& entry : entries) {
-    std::cout << separator << entry_json(entry);
+    std::cout << separator << entry_json(text, entry);
     separator = ",\n";
   }
   std::cout << (entries.empty() ? "[]\n" : "\n]\n");

@@ -294,28 +294,27 @@ constexpr SlotList<A..., B...> operator+(SlotList<A...>, SlotList<B...>) {
 template <class C>
 struct Vtable {
   template <auto M>
-  static constexpr SlotList<&PropertyThunk<C, M>::get> get_only(MemberName, const char*) {
+  static constexpr SlotList<&PropertyThunk<C, M>::get> get_only(MemberName) {
     return {};
   }
 
   template <auto M, ObjectKind Kind = any_object>
-  static constexpr SlotList<&PropertyThunk<C, M, Kind>::put> put_only(MemberName, const char*) {
+  static constexpr SlotList<&PropertyThunk<C, M, Kind>::put> put_only(MemberName) {
     return {};
   }
 
   template <auto M>
-  static constexpr SlotList<&PropertyThunk<C, M>::get, &PropertyThunk<C, M>::put> property(MemberName, const char*) {
+  static constexpr SlotList<&PropertyThunk<C, M>::get, &PropertyThunk<C, M>::put> property(MemberName) {
     return {};
   }
 
   template <auto M>
-  static constexpr SlotList<&PropertyThunk<C, M>::put, &PropertyThunk<C, M>::get> property_put_first(MemberName,
-                                                                                                     const char*) {
+  static constexpr SlotList<&PropertyThunk<C, M>::put, &PropertyThunk<C, M>::get> property_put_first(MemberName) {
     return {};
   }
 
   template <auto M, class... Names>
-  static constexpr SlotList<&MethodThunk<C, M>::call> method(MemberName, const char*, Names...) {
+  static constexpr SlotList<&MethodThunk<C, M>::call> method(MemberName, Names...) {
     return {};
   }
 

@@ -159,18 +159,12 @@ class CommonDialog final : public TableObject<CommonDialog> {
 template <class P>
 constexpr auto members_of(std::type_identity<CommonDialog>) {
   using C = CommonDialog;
-  return P::rows(
-      P::template property<&C::DialogTitle>("DialogTitle", "The title of the dialog."),
-      P::template property<&C::Filter>("Filter", "Names and patterns of the files in turn, with bars between."),
-      P::template property<&C::FilterIndex>("FilterIndex", "The chosen filter, counted from 1."),
-      P::template property<&C::InitDir>("InitDir", "The folder that the dialog starts in."),
-      P::template property<&C::FileName>("FileName", "The file: proposed before, chosen after."),
-      P::template property<&C::DefaultExt>("DefaultExt", "The extension of a name that has none."),
-      P::template property<&C::CancelError>("CancelError", "Cancelling raises 32755."),
-      P::template property<&C::Flags>("Flags", "2 asks before replacing, 2048 and 4096 want what exists."),
-      P::template get_only<&C::FileTitle>("FileTitle", "The file's name without its folder."),
-      P::template method<&C::ShowOpen>("ShowOpen", "Lets the user choose a file to open."),
-      P::template method<&C::ShowSave>("ShowSave", "Lets the user choose a file to save to."));
+  return P::rows(P::template property<&C::DialogTitle>("DialogTitle"), P::template property<&C::Filter>("Filter"),
+                 P::template property<&C::FilterIndex>("FilterIndex"), P::template property<&C::InitDir>("InitDir"),
+                 P::template property<&C::FileName>("FileName"), P::template property<&C::DefaultExt>("DefaultExt"),
+                 P::template property<&C::CancelError>("CancelError"), P::template property<&C::Flags>("Flags"),
+                 P::template get_only<&C::FileTitle>("FileTitle"), P::template method<&C::ShowOpen>("ShowOpen"),
+                 P::template method<&C::ShowSave>("ShowSave"));
 }
 
 }  // namespace talutil

@@ -73,26 +73,20 @@ class Crypto final : public TableObject<Crypto> {
 
 template <class P>
 constexpr auto members_of(std::type_identity<CryptoData>) {
-  return P::rows(
-      P::template method<&CryptoData::Read>("Read", "The data as text: 1 Base64, 3 the plain text.", "Format"));
+  return P::rows(P::template method<&CryptoData::Read>("Read", "Format"));
 }
 
 template <class P>
 constexpr auto members_of(std::type_identity<CryptoKey>) {
-  return P::rows(P::template property<&CryptoKey::Mode>("Mode", "The mode of operation: 1 Galois/counter mode."),
-                 P::template property<&CryptoKey::Padding>("Padding", "The padding: 2 none."),
-                 P::template method<&CryptoKey::Encrypt>("Encrypt", "Encrypts data; Algorithm 9 is AES.", "Algorithm",
-                                                         "Data", "Final"),
-                 P::template method<&CryptoKey::Decrypt>("Decrypt", "Decrypts data; Algorithm 9 is AES.", "Algorithm",
-                                                         "Data", "Final"));
+  return P::rows(P::template property<&CryptoKey::Mode>("Mode"), P::template property<&CryptoKey::Padding>("Padding"),
+                 P::template method<&CryptoKey::Encrypt>("Encrypt", "Algorithm", "Data", "Final"),
+                 P::template method<&CryptoKey::Decrypt>("Decrypt", "Algorithm", "Data", "Final"));
 }
 
 template <class P>
 constexpr auto members_of(std::type_identity<Crypto>) {
-  return P::rows(P::template method<&Crypto::CreateKey>("CreateKey", "A key object from a pass phrase.", "PassPhrase",
-                                                        "KeyBits", "Derivation"),
-                 P::template method<&Crypto::CreateData>(
-                     "CreateData", "A data object from a text: 1 Base64, 3 a plain text.", "Source", "Format"));
+  return P::rows(P::template method<&Crypto::CreateKey>("CreateKey", "PassPhrase", "KeyBits", "Derivation"),
+                 P::template method<&Crypto::CreateData>("CreateData", "Source", "Format"));
 }
 
 }  // namespace talutil

@@ -18,7 +18,7 @@ class NameCaseConverter final : public TableObject<NameCaseConverter> {
 
 template <class P>
 constexpr auto members_of(std::type_identity<NameCaseConverter>) {
-  return P::rows(P::template method<&NameCaseConverter::NameCase>("NameCase", "The text in name case.", "Name"));
+  return P::rows(P::template method<&NameCaseConverter::NameCase>("NameCase", "Name"));
 }
 
 }  // namespace talutil

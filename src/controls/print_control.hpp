@@ -138,48 +138,35 @@ template <class P>
 constexpr auto members_of(std::type_identity<PrintControl>) {
   using C = PrintControl;
   return P::rows(
-      P::template property<&C::HeaderFontName>("HeaderFontName", "The font of headers and footers."),
-      P::template property<&C::FontName>("FontName", "The font of texts."),
-      P::template property<&C::FontSize>("FontSize", "Its size, in points."),
-      P::template property<&C::Header>("Header", "The text above every page."),
-      P::template property<&C::DocName>("DocName", "The name of the print job."),
-      P::template property<&C::ShowGuides>({"ShowGuides", C::show_guides_id}, "The margins are drawn on the screen."),
-      P::template property<&C::HeaderRule>({"HeaderRule", C::header_rule_id}, "1 draws a rule below the header."),
-      P::template property<&C::PhysicalPage>({"PhysicalPage", C::physical_page_id},
-                                             "Positions count from the edge of the paper."),
-      P::template property<&C::WordWrap>({"WordWrap", C::word_wrap_id}, "Flowing text breaks between words."),
-      P::template property<&C::TextScale>({"TextScale", C::text_scale_id}, "The size of flowing text, percent."),
-      P::template property<&C::RenderObject>("RenderObject", "The grid that the next RenderControl shows."),
-      P::template accessors<&C::Zoom, &C::put_Zoom>("Zoom", "The page shown, percent of its size."),
-      P::template accessors<&C::PaperSize, &C::put_PaperSize>("PaperSize", "The code of the paper: 8 A3, 9 A4."),
-      P::template accessors<&C::Orientation, &C::put_Orientation>("Orientation", "0 portrait, 1 landscape."),
-      P::template accessors<&C::Duplex, &C::put_Duplex>("Duplex", "1 simplex, 2 vertical, 3 horizontal."),
-      P::template get_only<&C::PageWidth>("PageWidth", "The width of the paper as it lies, in twips."),
-      P::template get_only<&C::PageHeight>("PageHeight", "Its height."),
-      P::template property<&C::MarginLeft>("MarginLeft", "The left margin, in twips."),
-      P::template property<&C::MarginTop>("MarginTop", "The top margin."),
-      P::template property<&C::MarginRight>("MarginRight", "The right margin."),
-      P::template property<&C::MarginBottom>("MarginBottom", "The bottom margin."),
-      P::template accessors<&C::CurrentPage, &C::put_CurrentPage>("CurrentPage", "The page shown, from 1."),
-      P::template get_only<&C::PageCount>("PageCount", "The pages of the document."),
-      P::template method<&C::StartDoc>("StartDoc", "Begins a document."),
-      P::template setter<&C::put_Text>("Text", "Putting it adds flowing text."),
-      P::template method<&C::TextBox>("TextBox", "Adds a text in a box.", "Text", "Left", "Top", "Width", "Height"),
-      P::template setter<&C::put_RenderControl>("RenderControl",
-                                                "Putting the window of a control adds it to the pages."),
-      P::template method<&C::EndDoc>("EndDoc", "Ends the document and shows its first page."),
-      P::template method<&C::PrintDoc>("PrintDoc", "Prints the document.", optional("Dialog", 0)));
+      P::template property<&C::HeaderFontName>("HeaderFontName"), P::template property<&C::FontName>("FontName"),
+      P::template property<&C::FontSize>("FontSize"), P::template property<&C::Header>("Header"),
+      P::template property<&C::DocName>("DocName"),
+      P::template property<&C::ShowGuides>({"ShowGuides", C::show_guides_id}),
+      P::template property<&C::HeaderRule>({"HeaderRule", C::header_rule_id}),
+      P::template property<&C::PhysicalPage>({"PhysicalPage", C::physical_page_id}),
+      P::template property<&C::WordWrap>({"WordWrap", C::word_wrap_id}),
+      P::template property<&C::TextScale>({"TextScale", C::text_scale_id}),
+      P::template property<&C::RenderObject>("RenderObject"), P::template accessors<&C::Zoom, &C::put_Zoom>("Zoom"),
+      P::template accessors<&C::PaperSize, &C::put_PaperSize>("PaperSize"),
+      P::template accessors<&C::Orientation, &C::put_Orientation>("Orientation"),
+      P::template accessors<&C::Duplex, &C::put_Duplex>("Duplex"), P::template get_only<&C::PageWidth>("PageWidth"),
+      P::template get_only<&C::PageHeight>("PageHeight"), P::template property<&C::MarginLeft>("MarginLeft"),
+      P::template property<&C::MarginTop>("MarginTop"), P::template property<&C::MarginRight>("MarginRight"),
+      P::template property<&C::MarginBottom>("MarginBottom"),
+      P::template accessors<&C::CurrentPage, &C::put_CurrentPage>("CurrentPage"),
+      P::template get_only<&C::PageCount>("PageCount"), P::template method<&C::StartDoc>("StartDoc"),
+      P::template setter<&C::put_Text>("Text"),
+      P::template method<&C::TextBox>("TextBox", "Text", "Left", "Top", "Width", "Height"),
+      P::template setter<&C::put_RenderControl>("RenderControl"), P::template method<&C::EndDoc>("EndDoc"),
+      P::template method<&C::PrintDoc>("PrintDoc", optional("Dialog", 0)));
 }
 
 template <class P>
 constexpr auto members_of(std::type_identity<PdfExport>) {
   using C = PdfExport;
-  return P::rows(P::template property<&C::Title>("Title", "The title of the file."),
-                 P::template property<&C::Author>("Author", "Its author."),
-                 P::template property<&C::Subject>("Subject", "Its subject."),
-                 P::template property<&C::Creator>("Creator", "The program that made it."),
-                 P::template method<&C::ConvertDocument>("ConvertDocument", "Writes a print control's document.",
-                                                         "Control", "FileName"));
+  return P::rows(P::template property<&C::Title>("Title"), P::template property<&C::Author>("Author"),
+                 P::template property<&C::Subject>("Subject"), P::template property<&C::Creator>("Creator"),
+                 P::template method<&C::ConvertDocument>("ConvertDocument", "Control", "FileName"));
 }
 
 }  // namespace talutil

@@ -19,8 +19,7 @@ class SystemInformation final : public TableObject<SystemInformation> {
 template <class P>
 constexpr auto members_of(std::type_identity<SystemInformation>) {
   // Forms use this identifier rather than the name.
-  return P::rows(P::template get_only<&SystemInformation::computer_name>({"ComputerName", 0x68030010},
-                                                                         "The name of the computer."));
+  return P::rows(P::template get_only<&SystemInformation::computer_name>({"ComputerName", 0x68030010}));
 }
 
 }  // namespace talutil

@@ -506,48 +506,37 @@ class UnzipControl final : public TableObject<UnzipControl>, public ArchiveContr
 template <class P>
 constexpr auto members_of(std::type_identity<ZipControl>) {
   using C = ZipControl;
-  return P::rows(
-      P::template property<&C::ZIPFile>({"ZIPFile", C::archive_name}, "The path of the archive."),
-      P::template property<&C::ItemList>({"ItemList", C::item_list},
-                                         "What is packed: names and patterns between blanks, some in quotes."),
-      P::template property<&C::NoDirectoryNames>({"NoDirectoryNames", C::no_folders},
-                                                 "Entries are named without their folders."),
-      P::template property<&C::RecurseSubdirectories>({"RecurseSubdirectories", C::recurse},
-                                                      "Folders are packed with what is in them."),
-      P::template property<&C::CompressionLevel>({"CompressionLevel", C::level}, "0 stores, 1 is fast, 9 small."),
-      P::template property<&C::Comment>({"Comment", C::comment}, "The comment of the archive."),
-      P::template property<&C::Encrypt>({"Encrypt", C::encrypt}, "Entries are encrypted, where there is a password."),
-      P::template property<&C::Password>({"Password", C::password}, "The password."),
-      P::template property<&C::StrongEncryption>(
-          {"StrongEncryption", C::strong_encryption},
-          "Encrypts with AES-256; else in the traditional way, which every program reads."),
-      P::template property<&C::MultiVolume>({"MultiVolume", C::multi_volume}, "1 makes a split set."),
-      P::template property<&C::VolumeSize>({"VolumeSize", C::volume_size}, "Bytes of a volume, 65,536 or more."),
-      P::template property<&C::ErrorCode>({"ErrorCode", C::result}, "How the last action ended; 0 is well."),
-      P::template property<&C::Action>({"Action", C::action}, "Putting 4 packs the items."),
-      P::template get_only<&C::ErrorText>("ErrorText", "What was wrong, in words."),
-      P::template property<&C::OnProgress>("OnProgress", "An object that is called while an action works."));
+  return P::rows(P::template property<&C::ZIPFile>({"ZIPFile", C::archive_name}),
+                 P::template property<&C::ItemList>({"ItemList", C::item_list}),
+                 P::template property<&C::NoDirectoryNames>({"NoDirectoryNames", C::no_folders}),
+                 P::template property<&C::RecurseSubdirectories>({"RecurseSubdirectories", C::recurse}),
+                 P::template property<&C::CompressionLevel>({"CompressionLevel", C::level}),
+                 P::template property<&C::Comment>({"Comment", C::comment}),
+                 P::template property<&C::Encrypt>({"Encrypt", C::encrypt}),
+                 P::template property<&C::Password>({"Password", C::password}),
+                 P::template property<&C::StrongEncryption>({"StrongEncryption", C::strong_encryption}),
+                 P::template property<&C::MultiVolume>({"MultiVolume", C::multi_volume}),
+                 P::template property<&C::VolumeSize>({"VolumeSize", C::volume_size}),
+                 P::template property<&C::ErrorCode>({"ErrorCode", C::result}),
+                 P::template property<&C::Action>({"Action", C::action}),
+                 P::template get_only<&C::ErrorText>("ErrorText"), P::template property<&C::OnProgress>("OnProgress"));
 }
 
 template <class P>
 constexpr auto members_of(std::type_identity<UnzipControl>) {
   using C = UnzipControl;
-  return P::rows(
-      P::template property<&C::ZIPFile>({"ZIPFile", C::archive_name}, "The path of the archive."),
-      P::template property<&C::ItemList>({"ItemList", C::item_list}, "Which entries; empty or *.* for all."),
-      P::template property<&C::MaxRatio>({"MaxRatio", C::largest_ratio},
-                                         "How many times its own size an archive may unpack to, above a gibibyte."),
-      P::template property<&C::Destination>({"Destination", C::destination}, "The folder to unpack below."),
-      P::template property<&C::KeepDirectories>({"KeepDirectories", C::keep_folders},
-                                                "Entries are written into their folders."),
-      P::template property<&C::Overwrite>({"Overwrite", C::overwrite}, "Files that are there are replaced."),
-      P::template property<&C::Comment>({"Comment", C::comment}, "The comment of the archive that was looked at."),
-      P::template property<&C::ErrorCode>({"ErrorCode", C::result}, "How the last action ended; 0 is well."),
-      P::template property<&C::EntryCount>({"EntryCount", C::entry_count}, "The entries that were counted."),
-      P::template property<&C::Action>({"Action", C::action}, "Putting 1 looks, 7 tests, 8 extracts."),
-      P::template property<&C::Password>({"Password", C::password}, "The password that is tried first."),
-      P::template get_only<&C::ErrorText>("ErrorText", "What was wrong, in words."),
-      P::template property<&C::OnProgress>("OnProgress", "An object that is called while an action works."));
+  return P::rows(P::template property<&C::ZIPFile>({"ZIPFile", C::archive_name}),
+                 P::template property<&C::ItemList>({"ItemList", C::item_list}),
+                 P::template property<&C::MaxRatio>({"MaxRatio", C::largest_ratio}),
+                 P::template property<&C::Destination>({"Destination", C::destination}),
+                 P::template property<&C::KeepDirectories>({"KeepDirectories", C::keep_folders}),
+                 P::template property<&C::Overwrite>({"Overwrite", C::overwrite}),
+                 P::template property<&C::Comment>({"Comment", C::comment}),
+                 P::template property<&C::ErrorCode>({"ErrorCode", C::result}),
+                 P::template property<&C::EntryCount>({"EntryCount", C::entry_count}),
+                 P::template property<&C::Action>({"Action", C::action}),
+                 P::template property<&C::Password>({"Password", C::password}),
+                 P::template get_only<&C::ErrorText>("ErrorText"), P::template property<&C::OnProgress>("OnProgress"));
 }
 
 }  // namespace talutil

@@ -226,23 +226,16 @@ class cControlPosition {
 template <class P>
 constexpr auto members_of(std::type_identity<cControlPosition>) {
   using C = cControlPosition;
-  return P::rows(
-      P::template property<&C::Height>("Height", "The remembered height, in twips."),
-      P::template property<&C::Width>("Width", "The remembered width, in twips."),
-      P::template property<&C::Top>("Top", "The remembered top, in twips."),
-      P::template property<&C::left>("left", "The remembered left, in twips."),
-      P::template property<&C::DefaultTop>("DefaultTop", "The top to use when none is remembered."),
-      P::template property<&C::DefaultLeft>("DefaultLeft", "The left to use when none is remembered."),
-      P::template property<&C::ControlID>("ControlID", "The number of the control within its form."),
-      P::template property<&C::ControlName>("ControlName", "The settings section; an empty one saves nothing."),
-      P::template property<&C::DragStartY>("DragStartY", "Where the drag began, down."),
-      P::template property<&C::DragStartX>("DragStartX", "Where the drag began, across."),
-      P::template property<&C::Dragging>("Dragging", "A drag is in progress; kept for the host."),
-      P::template property<&C::Sizing>("Sizing", "A resize is in progress; kept for the host."),
-      P::template method<&C::DragControl>("DragControl", "Moves a control with the mouse, within its form.", "vForm",
-                                          "oCtrl", "X", "Y"),
-      P::template method<&C::GetControlPosition>("GetControlPosition", "Reads the remembered position."),
-      P::template method<&C::SaveControlPosition>("SaveControlPosition", "Remembers the position."));
+  return P::rows(P::template property<&C::Height>("Height"), P::template property<&C::Width>("Width"),
+                 P::template property<&C::Top>("Top"), P::template property<&C::left>("left"),
+                 P::template property<&C::DefaultTop>("DefaultTop"),
+                 P::template property<&C::DefaultLeft>("DefaultLeft"), P::template property<&C::ControlID>("ControlID"),
+                 P::template property<&C::ControlName>("ControlName"),
+                 P::template property<&C::DragStartY>("DragStartY"), P::template property<&C::DragStartX>("DragStartX"),
+                 P::template property<&C::Dragging>("Dragging"), P::template property<&C::Sizing>("Sizing"),
+                 P::template method<&C::DragControl>("DragControl", "vForm", "oCtrl", "X", "Y"),
+                 P::template method<&C::GetControlPosition>("GetControlPosition"),
+                 P::template method<&C::SaveControlPosition>("SaveControlPosition"));
 }
 
 }  // namespace talutil

@@ -5,6 +5,7 @@
 #include "library/c_control_position.hpp"
 #include "library/identity.hpp"
 #include "library/interface_table.hpp"
+#include "texts/member_texts.hpp"
 
 namespace talutil {
 
@@ -77,11 +78,11 @@ void write_parameter(std::string& out, const Parameter& parameter, Dialect diale
   out += parameter.name;
 }
 
-void write_member(std::string& out, const Member& member, Dialect dialect) {
+void write_member(std::string& out, const Member& member, std::string_view help, Dialect dialect) {
   out += "    [id(" + hexadecimal(member.identifier) + ")";
   if (member.access == Access::get) out += ", propget";
   if (member.access == Access::put) out += ", propput";
-  out += ", helpstring(" + quoted(member.help) + ")]\n    HRESULT ";
+  out += ", helpstring(" + quoted(help) + ")]\n    HRESULT ";
   out += member.name;
   out += "(";
   std::string_view separator;
@@ -101,7 +102,6 @@ void write_member(std::string& out, const Member& member, Dialect dialect) {
 
 struct DescribedClass {
   std::string_view name;
-  std::string_view help;
   std::string_view class_identifier;
   std::string_view interface_identifier;
   std::span<const Member> members;
@@ -113,10 +113,13 @@ void write_class(std::string& out, const DescribedClass& described_class, Dialec
   out += "), dual, oleautomation, hidden, nonextensible]\n  interface _";
   out += described_class.name;
   out += " : IDispatch {\n";
-  for (const Member& member : described_class.members) write_member(out, member, dialect);
+  const texts::ClassText& text = texts::text_of(described_class.name);
+  for (const Member& member : described_class.members) {
+    write_member(out, member, texts::text_of(text, member.name).summary, dialect);
+  }
   out += "  };\n\n  [uuid(";
   out += described_class.class_identifier;
-  out += "), helpstring(" + quoted(described_class.help) + ")]\n  coclass ";
+  out += "), helpstring(" + quoted(text.text.summary) + ")]\n  coclass ";
   out += described_class.name;
   out += " {\n    [default] interface _";
   out += described_class.name;
@@ -159,12 +162,11 @@ std::string interface_definition(Dialect dialect) {
                identity::guid_record, {"long Data1", "short Data2", "short Data3", "unsigned char Data4[8]"});
   write_record(out, "TRect", identity::rectangle_record, {"long left", "long Top", "long Right", "long Bottom"});
   write_class(out,
-              {"ORVUtils", "The common toolkit.", identity::orv_utils_class, identity::orv_utils_interface,
-               described<ORVUtils>},
+              {"ORVUtils", identity::orv_utils_class, identity::orv_utils_interface, described<ORVUtils>},
               dialect);
   write_class(out,
-              {"cControlPosition", "A control that can be moved at run time.", identity::control_position_class,
-               identity::control_position_interface, described<cControlPosition>},
+              {"cControlPosition", identity::control_position_class, identity::control_position_interface,
+               described<cControlPosition>},
               dialect);
   return out + "};\n";
 }

@@ -17,7 +17,8 @@ enum class Dialect { published, type_library, header };
 inline constexpr const char* guid_stand_in = "GYID";
 
 /// The interface definition (IDL) of the type library: both classes, their interfaces with a help string per member,
-/// and the published records. Generated from the interface tables alone.
+/// and the published records. Generated from the interface tables; the help strings are the first sentences of the
+/// members' texts.
 [[nodiscard]] std::string interface_definition(Dialect dialect = Dialect::published);
 
 }  // namespace talutil

@@ -461,10 +461,10 @@ struct SharedSettings {
   ///     ' Jobs
   Text sAliasName;
 
-  /// The case in which ConvertCase writes names: 1 name case, 2 lower case, 3 upper case; else it returns them
-  /// unchanged. docs/name-case.md has the rules of name case.
+  /// The case in which ConvertCase writes names: 1 name case, 2 lower case, 3 upper case; else they stay unchanged. The
+  /// rules of name case are on a page of their own.
   /// @family settings
-  /// @see ConvertCase, iCharacterCaseSuburbs
+  /// @see ConvertCase, iCharacterCaseSuburbs, docs/name-case.md
   /// @example
   ///     u.iCharactercase = 1
   ///     Print u.ConvertCase(0, "JOHN MCDONALD")

@@ -64,10 +64,9 @@ class FrmPrintPreview::FormObject final : public TableObject<FormObject> {
   template <class P>
   friend constexpr auto members_of(std::type_identity<FormObject>) {
     using F = FormObject;
-    return P::rows(
-        P::template accessors<&F::state, &F::set_state>("WindowState", "0 normal, 1 minimised, 2 maximised."),
-        P::template accessors<&F::width, &F::set_width>("Width", "The width, in twips."),
-        P::template accessors<&F::height, &F::set_height>("Height", "The height, in twips."));
+    return P::rows(P::template accessors<&F::state, &F::set_state>("WindowState"),
+                   P::template accessors<&F::width, &F::set_width>("Width"),
+                   P::template accessors<&F::height, &F::set_height>("Height"));
   }
 
  private:

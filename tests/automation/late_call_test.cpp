@@ -31,11 +31,11 @@ class Sample {
 
 template <class P>
 constexpr auto members_of(std::type_identity<Sample>) {
-  return P::rows(P::template property<&Sample::Size>("Size", ""), P::template put_only<&Sample::Picture>("Picture", ""),
-                 P::template get_only<&Sample::name>({"Name", 0x1234}, ""),
-                 P::template method<&Sample::Join>("Join", "", "first", "second", optional("separator", "-")),
-                 P::template method<&Sample::WriteThenFail>("WriteThenFail", "", "number"),
-                 P::template method<&Sample::Count>("Count", "", "list"));
+  return P::rows(P::template property<&Sample::Size>("Size"), P::template put_only<&Sample::Picture>("Picture"),
+                 P::template get_only<&Sample::name>({"Name", 0x1234}),
+                 P::template method<&Sample::Join>("Join", "first", "second", optional("separator", "-")),
+                 P::template method<&Sample::WriteThenFail>("WriteThenFail", "number"),
+                 P::template method<&Sample::Count>("Count", "list"));
 }
 
 Variant use(Sample& sample, TextView name, Access access, std::span<Argument> arguments) {
