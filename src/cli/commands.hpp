@@ -6,6 +6,10 @@
 #include <vector>
 
 /// The subcommands. Each prints to standard output and throws Failure if it cannot do its work.
+namespace CLI {
+class App;
+}
+
 namespace talutil::cli {
 
 struct ListOptions {
@@ -13,10 +17,17 @@ struct ListOptions {
 };
 void list(const ListOptions& options);
 
-void help(const std::string& member);
+/// Explains a class or a member.
+void help(const std::string& name);
 
-/// Prints the Markdown reference page.
+/// Prints the reference of all classes as a page in Markdown.
 void reference();
+
+/// Prints the same as JSON: an object with "families" and "classes".
+void reference_json();
+
+/// Prints the manual page of the command, in roff.
+void man_page(const CLI::App& app);
 
 struct CallOptions {
   std::string member;

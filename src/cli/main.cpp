@@ -18,6 +18,8 @@ using namespace talutil::cli;
 struct Request {
   ListOptions list;
   std::string help_member;
+  bool man = false;
+  bool reference_json = false;
   CallOptions call;
   CleanOptions clean;
   SecretOptions secret;
@@ -67,11 +69,14 @@ void add_list(CLI::App& app, Request& request) {
 }
 
 void add_help(CLI::App& app, Request& request) {
-  auto* const command = app.add_subcommand("help", "Explain a member, or this command");
-  command->add_option("MEMBER", request.help_member, "The member's name, in any case");
+  auto* const command = app.add_subcommand("help", "Explain a class, a member, or this command");
+  command->add_option("MEMBER", request.help_member, "A class, a member or Class.Member, in any case");
+  command->add_flag("--man", request.man, "Print the manual page, talutil.1");
   command->callback([&] {
     request.run = [&] {
-      if (request.help_member.empty())
+      if (request.man)
+        man_page(app);
+      else if (request.help_member.empty())
         std::cout << app.help();
       else
         help(request.help_member);
@@ -240,9 +245,9 @@ void add_printers(CLI::App& app, Request& request) {
   app.add_subcommand("idl", "Print the interface definition of the type library")->callback([&] {
     request.run = [] { std::cout << talutil::interface_definition(); };
   });
-  app.add_subcommand("reference", "Print the reference page of all members, in Markdown")->callback([&] {
-    request.run = [] { reference(); };
-  });
+  auto* const printing = app.add_subcommand("reference", "Print the reference of all classes, in Markdown");
+  printing->add_flag("--json", request.reference_json, "Print it as JSON, for programs");
+  printing->callback([&] { request.run = request.reference_json ? reference_json : reference; });
 }
 
 /// Fails if the first word is not a subcommand; lists the subcommands.
