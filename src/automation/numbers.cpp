@@ -3,35 +3,44 @@
 #include <array>
 #include <charconv>
 #include <cmath>
-#include <string_view>
+#include <cstdlib>
+#include <string>
 
+#include "automation/decimal_digits.hpp"
 #include "automation/run_time_error.hpp"
 
 namespace talutil {
 
 namespace {
 
-/// The number of significant digits of a fraction below 1 that is written without an exponent; 0 for other numbers.
-std::size_t digits_of_fraction(std::string_view number) noexcept {
-  if (number.starts_with('-')) number.remove_prefix(1);
-  return number.starts_with("0.") ? number.size() - number.find_first_of("123456789") : 0;
+/// Plain if it fits into the digits, with an exponent otherwise. Windows never writes more decimal places than digits:
+/// 3.5 / 42 is 8.33333333333333E-02.
+std::string plain_or_scientific(const DecimalDigits& number, int most_digits) {
+  constexpr int least_plain_exponent = -4;
+  const std::string& digits = number.digits;
+  const int count = static_cast<int>(digits.size());
+  const int exponent = number.exponent;
+  if (exponent >= 0 && exponent < most_digits) {
+    if (count <= exponent + 1) return digits + std::string(static_cast<std::size_t>(exponent + 1 - count), '0');
+    const auto whole = static_cast<std::size_t>(exponent + 1);
+    return digits.substr(0, whole) + "." + digits.substr(whole);
+  }
+  if (exponent < 0 && exponent >= least_plain_exponent && count - exponent - 1 <= most_digits) {
+    return "0." + std::string(static_cast<std::size_t>(-exponent - 1), '0') + digits;
+  }
+  const std::string size = std::to_string(std::abs(exponent));
+  return digits.substr(0, 1) + (count > 1 ? "." + digits.substr(1) : "") + (exponent < 0 ? "E-" : "E+") +
+         (size.size() < 2 ? "0" : "") + size;
 }
 
-template <class Number>
-Text to_significant_digits(Number value, int digits, const Locale& locale) {
+Text to_significant_digits(double value, int most_digits, const Locale& locale) {
   if (value == 0) return u"0";  // Drops the sign of a negative zero.
-  std::array<char, 32> buffer;
-  char* const end = buffer.data() + buffer.size();
-  auto written = std::to_chars(buffer.data(), end, value, std::chars_format::general, digits);
-  // Windows never writes more decimal places than digits: 3.5 / 42 is 8.33333333333333E-02.
-  const std::string_view plain(buffer.data(), written.ptr);
-  const std::size_t fraction_digits = digits_of_fraction(plain);
-  if (fraction_digits > 0 && plain.size() - plain.find('.') - 1 > static_cast<std::size_t>(digits)) {
-    const int places = static_cast<int>(fraction_digits) - 1;
-    written = std::to_chars(buffer.data(), end, value, std::chars_format::scientific, places);
+  Text text(std::signbit(value) ? u"-" : u"");
+  if (std::isnan(value)) return text + u"NAN";
+  if (std::isinf(value)) return text + u"INF";
+  for (const char c : plain_or_scientific(decimal_digits(std::abs(value), most_digits), most_digits)) {
+    text += c == '.' ? locale.decimal_separator : static_cast<char16_t>(c);
   }
-  Text text(buffer.data(), written.ptr);
-  for (char16_t& unit : text) unit = unit == u'.' ? locale.decimal_separator : upper_case(unit);
   return text;
 }
 

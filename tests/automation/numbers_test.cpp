@@ -2,11 +2,14 @@
 
 #include <gtest/gtest.h>
 
+#include <array>
 #include <cmath>
+#include <cstdio>
 #include <cstdlib>
 #include <limits>
 
 #include "automation/checked.hpp"
+#include "automation/decimal_digits.hpp"
 #include "tests/fakes/error_of.hpp"
 #include "tests/fakes/rows.hpp"
 
@@ -36,6 +39,27 @@ TEST(Numbers, AreReadAsTheCLibraryReadsThem) {
       continue;
     const bool is_whole = !bytes.empty() && *end == 0;
     EXPECT_EQ(outcome([&] { return text_to_number(text); }), is_whole ? expected : "none") << bytes;
+  }
+}
+
+// Numbers of every size, near powers of ten and half-way between two, have the digits that the C library writes.
+TEST(Numbers, AreRoundedAsTheCLibraryRoundsThem) {
+  testing::Generator generator;
+  for (int i = 0; i < 50'000; ++i) {
+    const std::int64_t whole = generator.whole(1, 99'999'999);
+    const double numbers[] = {std::ldexp(static_cast<double>(whole), static_cast<int>(generator.whole(-1070, 990))),
+                              static_cast<double>(whole) / 1000, static_cast<double>(whole) / 4096,
+                              std::nextafter(std::pow(10.0, static_cast<double>(generator.whole(-14, 17))), i % 2)};
+    const double number = generator.one_of(numbers);
+    const int count = i % 3 == 0 ? 15 : static_cast<int>(generator.whole(1, 17));
+    std::array<char, 40> expected{};
+    std::snprintf(expected.data(), expected.size(), "%.*e", count - 1, number);
+    const DecimalDigits digits = decimal_digits(number, count);
+    std::string written = digits.digits + std::string(static_cast<std::size_t>(count) - digits.digits.size(), '0');
+    if (count > 1) written.insert(1, ".");
+    std::array<char, 40> got{};
+    std::snprintf(got.data(), got.size(), "%se%+03d", written.c_str(), digits.exponent);
+    EXPECT_STREQ(got.data(), expected.data());
   }
 }
 
