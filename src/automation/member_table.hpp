@@ -136,10 +136,10 @@ struct Member {
   Access access = Access::call;
   ValueType result = ValueType::none;
   std::uint8_t parameter_count = 0;
-  std::array<Parameter, most_parameters> all_parameters{};
+  const Parameter* first_parameter = nullptr;
 
   [[nodiscard]] constexpr std::span<const Parameter> parameters() const noexcept {
-    return {all_parameters.data(), parameter_count};
+    return {first_parameter, parameter_count};
   }
 };
 
@@ -174,6 +174,12 @@ requires(!std::is_function_v<T>) struct MemberPointer<T C::*> {
   static constexpr bool is_function = false;
 };
 
+/// A slot together with its parameters, as its row describes it.
+struct DescribedSlot {
+  Member member;
+  std::array<Parameter, most_parameters> parameters{};
+};
+
 template <class T, std::size_t... N>
 constexpr auto join(const std::array<T, N>&... parts) {
   std::array<T, (N + ... + 0)> all{};
@@ -194,59 +200,60 @@ using PropertyType = std::conditional_t<std::is_same_v<typename MemberTraits<M>:
 
 /// Describes each slot.
 struct Describe {
+  using Slot = detail::DescribedSlot;
+
   template <auto M>
-  static constexpr std::array<Member, 1> get_only(MemberName name) {
+  static constexpr std::array<Slot, 1> get_only(MemberName name) {
     return {accessor(name, Access::get, value_type<PropertyType<M>>())};
   }
 
   template <auto M, ObjectKind = any_object>
-  static constexpr std::array<Member, 1> put_only(MemberName name) {
-    Member member = accessor(name, Access::put, ValueType::none);
-    member.parameter_count = 1;
-    member.all_parameters[0].name = "value";
-    member.all_parameters[0].type = value_type<PropertyType<M>>();
-    return {member};
+  static constexpr std::array<Slot, 1> put_only(MemberName name) {
+    Slot slot = accessor(name, Access::put, ValueType::none);
+    slot.member.parameter_count = 1;
+    slot.parameters[0].name = "value";
+    slot.parameters[0].type = value_type<PropertyType<M>>();
+    return {slot};
   }
 
   template <auto M>
-  static constexpr std::array<Member, 2> property(MemberName name) {
+  static constexpr std::array<Slot, 2> property(MemberName name) {
     return {get_only<M>(name)[0], put_only<M>(name)[0]};
   }
 
   template <auto M>
-  static constexpr std::array<Member, 2> property_put_first(MemberName name) {
+  static constexpr std::array<Slot, 2> property_put_first(MemberName name) {
     return {put_only<M>(name)[0], get_only<M>(name)[0]};
   }
 
   /// A property implemented by functions, with or without indexes: G returns the value, S takes it after the indexes.
   /// Used by controls, not by interfaces.
   template <auto G, auto S, class... Names>
-  static constexpr std::array<Member, 2> accessors(MemberName name, Names... names) {
-    std::array<Member, 2> slots{method<G>(name, names...)[0], setter<S>(name, names...)[0]};
-    slots[0].access = Access::get;
+  static constexpr std::array<Slot, 2> accessors(MemberName name, Names... names) {
+    std::array<Slot, 2> slots{method<G>(name, names...)[0], setter<S>(name, names...)[0]};
+    slots[0].member.access = Access::get;
     return slots;
   }
 
   /// A write-only property, with or without indexes: S takes the value after them.
   template <auto S, class... Names>
-  static constexpr std::array<Member, 1> setter(MemberName name, Names... names) {
-    std::array<Member, 1> slot = method<S>(name, names..., "value");
-    slot[0].access = Access::put;
+  static constexpr std::array<Slot, 1> setter(MemberName name, Names... names) {
+    std::array<Slot, 1> slot = method<S>(name, names..., "value");
+    slot[0].member.access = Access::put;
     return slot;
   }
 
   template <auto M, class... Names>
-  static constexpr std::array<Member, 1> method(MemberName name, Names... names) {
+  static constexpr std::array<Slot, 1> method(MemberName name, Names... names) {
     using Traits = MemberTraits<M>;
     static_assert(sizeof...(Names) == Traits::arity, "a name for each parameter");
-    Member member = accessor(name, Access::call, value_type<typename Traits::Result>());
+    Slot slot = accessor(name, Access::call, value_type<typename Traits::Result>());
     const std::array<ParameterName, sizeof...(Names) + 1> given{ParameterName(names)..., ParameterName("")};
     Traits::with_arguments([&]<class... A>() {
-      ((member.all_parameters[member.parameter_count] = parameter<A>(given[member.parameter_count]),
-        ++member.parameter_count),
-       ...);
+      std::uint8_t& count = slot.member.parameter_count;
+      ((slot.parameters[count] = parameter<A>(given[count]), ++count), ...);
     });
-    return {member};
+    return {slot};
   }
 
   template <class... Rows>
@@ -255,13 +262,13 @@ struct Describe {
   }
 
  private:
-  static constexpr Member accessor(MemberName name, Access access, ValueType result) {
-    Member member;
-    member.name = name.name;
-    member.identifier = name.identifier;
-    member.access = access;
-    member.result = result;
-    return member;
+  static constexpr Slot accessor(MemberName name, Access access, ValueType result) {
+    Slot slot;
+    slot.member.name = name.name;
+    slot.member.identifier = name.identifier;
+    slot.member.access = access;
+    slot.member.result = result;
+    return slot;
   }
 
   template <class A>
@@ -304,9 +311,50 @@ consteval std::array<Member, N> numbered(std::array<Member, N> members, std::int
   return members;
 }
 
+namespace detail {
+
+/// Only read by the compiler: the program contains the two tables below.
+template <class C>
+inline constexpr auto described_slots = members_of<Describe>(std::type_identity<C>{});
+
+template <std::size_t Count, std::size_t N>
+consteval std::array<Parameter, Count> all_parameters(const std::array<DescribedSlot, N>& slots) {
+  std::array<Parameter, Count> all{};
+  std::size_t next = 0;
+  for (const DescribedSlot& slot : slots) {
+    for (std::size_t i = 0; i < slot.member.parameter_count; ++i) all[next++] = slot.parameters[i];
+  }
+  return all;
+}
+
+template <std::size_t N>
+consteval std::size_t parameter_count(const std::array<DescribedSlot, N>& slots) {
+  std::size_t count = 0;
+  for (const DescribedSlot& slot : slots) count += slot.member.parameter_count;
+  return count;
+}
+
+/// The parameters of all slots of a class, one slot's after the other's.
+template <class C>
+inline constexpr auto described_parameters = all_parameters<parameter_count(described_slots<C>)>(described_slots<C>);
+
+template <std::size_t N>
+consteval std::array<Member, N> with_parameters(const std::array<DescribedSlot, N>& slots, const Parameter* next) {
+  std::array<Member, N> members{};
+  for (std::size_t i = 0; i < N; ++i) {
+    members[i] = slots[i].member;
+    members[i].first_parameter = next;
+    next += members[i].parameter_count;
+  }
+  return members;
+}
+
+}  // namespace detail
+
 /// The members of a class, slot by slot.
 template <class C>
-inline constexpr auto described = numbered(members_of<Describe>(std::type_identity<C>{}), 0x60030000);
+inline constexpr auto described =
+    numbered(detail::with_parameters(detail::described_slots<C>, detail::described_parameters<C>.data()), 0x60030000);
 
 /// Finds members by name with a single hash, so that a script's call does not search the table.
 template <std::size_t Slots>

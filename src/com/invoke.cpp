@@ -112,7 +112,7 @@ class Call {
 HRESULT check_required(const Member& member, const Invocation& invocation, const Placement& placement) {
   for (std::size_t i = 0; i < member.parameter_count; ++i) {
     const int at = placement.argument[i];
-    if (member.all_parameters[i].is_optional || (at >= 0 && !is_missing(invocation.parameters->rgvarg[at]))) continue;
+    if (member.parameters()[i].is_optional || (at >= 0 && !is_missing(invocation.parameters->rgvarg[at]))) continue;
     if (at >= 0 && invocation.bad_argument != nullptr) *invocation.bad_argument = static_cast<UINT>(at);
     return DISP_E_PARAMNOTOPTIONAL;
   }
