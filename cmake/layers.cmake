@@ -1,11 +1,12 @@
 # The layers of the code. Each is a folder of src with its own target, which only sees the headers of the layers below
 # it: an include root contains a single folder, so that an include in the wrong direction does not compile.
 #
-#   talutil_layer(NAME [FOLDER folder] BELOW layer... [LIBRARIES library...] [GENERATED source...])
+#   talutil_layer(NAME [FOLDER folder] BELOW layer... [LIBRARIES library...] [GENERATED source...] [FAST file...])
 #
-# The folder has the layer's name by default; the libraries are visible to this layer only.
+# The folder has the layer's name by default; the libraries are visible to this layer only. What hosts call in long loops
+# is compiled for speed: a whole layer with FAST ALL, or the files named; everything else for size.
 function(talutil_layer name)
-  cmake_parse_arguments(PARSE_ARGV 1 layer "" "FOLDER" "BELOW;LIBRARIES;GENERATED")
+  cmake_parse_arguments(PARSE_ARGV 1 layer "" "FOLDER" "BELOW;LIBRARIES;GENERATED;FAST")
   if(NOT layer_FOLDER)
     set(layer_FOLDER ${name})
   endif()
@@ -22,6 +23,12 @@ function(talutil_layer name)
   target_include_directories(layer_${name} PUBLIC ${root})
   list(TRANSFORM layer_BELOW PREPEND layer_)
   target_link_libraries(layer_${name} PUBLIC talutil_options ${layer_BELOW} PRIVATE ${layer_LIBRARIES})
+  if(NOT layer_FAST STREQUAL ALL)
+    target_compile_options(layer_${name} PRIVATE $<$<CONFIG:Release>:-Os>)
+    foreach(file ${layer_FAST})
+      set_property(SOURCE src/${layer_FOLDER}/${file} APPEND PROPERTY COMPILE_OPTIONS $<$<CONFIG:Release>:-O2>)
+    endforeach()
+  endif()
 endfunction()
 
 # The texts of all members, read from the doc comments of the headers. Nothing that the DLL needs refers to them.
@@ -35,17 +42,19 @@ add_custom_command(OUTPUT ${member_texts}
 
 # From bottom to top: values, the seam to the platform, what is built on that, and the families of members. If a layer
 # is above two others, neither of these knows the other.
-talutil_layer(automation)
+talutil_layer(automation FAST ALL)
 talutil_layer(platform BELOW automation)
-talutil_layer(documents BELOW platform LIBRARIES documents::pdf)
+talutil_layer(documents BELOW platform LIBRARIES documents::pdf FAST ALL)
 talutil_layer(archives BELOW platform LIBRARIES archives::zip archives::deflate)
-talutil_layer(controls BELOW documents archives)
+talutil_layer(controls BELOW documents archives FAST crypto.cpp delimited_text.cpp grid.cpp name_case.cpp)
 talutil_layer(texts GENERATED ${member_texts})
 talutil_layer(library BELOW controls texts)
+talutil_layer(text BELOW library FAST ALL)
+talutil_layer(dates BELOW library FAST ALL)
+talutil_layer(services BELOW library FAST sequential_file.cpp text_files.cpp)
+talutil_layer(forms BELOW library FAST grid_export.cpp grids.cpp)
+talutil_layer(preview BELOW library)
 set(families text dates services forms preview)
-foreach(family ${families})
-  talutil_layer(${family} BELOW library)
-endforeach()
 talutil_layer(infoforms BELOW forms)
 talutil_layer(startup BELOW ${families} infoforms)
 

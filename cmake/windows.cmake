@@ -1,7 +1,7 @@
 # The Windows side: the platform, the type library generated from the interface table, and TALUtil.dll.
 add_compile_definitions(UNICODE _UNICODE WINVER=0x0601 _WIN32_WINNT=0x0601)
 
-talutil_layer(win32 FOLDER platform/win32 BELOW platform)
+talutil_layer(win32 FOLDER platform/win32 BELOW platform FAST page_renderer.cpp stored_files.cpp win32_files.cpp)
 add_library(talutil_platform STATIC)
 # The system's cryptography is loaded on first use: most hosts never need it, and it is slow to load.
 if(CMAKE_SIZEOF_VOID_P EQUAL 8)
@@ -70,7 +70,7 @@ add_custom_command(
 enable_language(RC)
 configure_file(src/com/talutil.rc.in ${generated}/talutil.rc)
 set_source_files_properties(${generated}/talutil.rc PROPERTIES OBJECT_DEPENDS ${generated}/TALUtil.tlb)
-talutil_layer(com BELOW startup win32)
+talutil_layer(com BELOW startup win32 FAST dispatch_object.cpp invoke.cpp variant_bridge.cpp write_back.cpp)
 add_library(TALUtil SHARED src/com/talutil.def ${generated}/talutil.rc ${generated}/TALUtil.h)
 set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
 target_link_libraries(TALUtil PRIVATE layer_com talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)

@@ -17,6 +17,10 @@
 #include "platform/win32/module_path.hpp"
 #include "platform/win32/win32_platform.hpp"
 
+/// Ends the process where an exception finds no handler. The library's own function would first write the exception's
+/// name to a console that hosts do not have, with 50 KB of code to make it legible.
+void __gnu_cxx::__verbose_terminate_handler() { std::abort(); }
+
 namespace talutil::com {
 
 namespace {
