@@ -1,0 +1,136 @@
+#!/usr/bin/env bash
+# Checks that the guides tell the truth: each file of examples/guides stands in one page of docs/guides, letter by
+# letter, and prints what the page says.
+#
+#   run.sh native TALUTIL      compares all pages, and runs what runs here, with this command
+#   run.sh windows|windows64   runs what uses TALUtil.dll, which has to be built by that preset
+#
+# A page shows a file in the code block below "<!-- FILE -->", and what it prints below "<!-- output of FILE -->". Each
+# check that fails is a line; the last line is "N passed, N failed".
+set -euo pipefail
+. "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
+cd "$talutil_top"
+
+folder=${1:-native}
+work=$talutil_build/guides-$folder
+passed=0
+failed=0
+rm -rf "$work"
+mkdir -p "$work"
+
+expect_same() {  # what, the file with what is expected, the file with what there is
+  if diff -u "$2" "$3" >"$work/difference" 2>&1; then
+    passed=$((passed + 1))
+  else
+    printf 'FAILED %s: expected the first, got the second:\n' "$1"
+    head -20 "$work/difference"
+    failed=$((failed + 1))
+  fi
+}
+
+# The code block below a line of the guides.
+block_below() {
+  awk -v marker="<!-- $1 -->" '
+    $0 == marker { found = 1 }
+    found && /^```/ { if (inside) exit; inside = 1; next }
+    inside' docs/guides/*.md
+}
+
+compare_pages() {
+  local file
+  for file in examples/guides/*; do
+    block_below "$file" >"$work/shown"
+    expect_same "$file and the page that shows it" "$file" "$work/shown"
+  done
+}
+
+# Runs a program, and compares what it prints with what the guide of the file says.
+prints_as_said() {
+  local file=$1 status=0
+  shift
+  block_below "output of $file" >"$work/said"
+  "$@" >"$work/printed" 2>&1 || status=$?
+  [ $status = 0 ] || echo "(status $status)" >>"$work/printed"
+  sed -i 's/\r$//' "$work/printed"
+  expect_same "the output of $file" "$work/said" "$work/printed"
+}
+
+# In an empty folder, with settings of its own.
+in_empty_folder() (
+  rm -rf "$work/folder"
+  mkdir -p "$work/folder" "$work/bin"
+  ln -sf "$talutil" "$work/bin/talutil"
+  cd "$work/folder"
+  PATH=$work/bin:$PATH TALUTIL_HIVE=$work/hive.db "$@"
+)
+
+run_native() {
+  local file
+  compare_pages
+  for file in examples/guides/*.sh; do
+    prints_as_said "$file" in_empty_folder bash -eu "$talutil_top/$file"
+  done
+  file=examples/guides/python_command.py
+  prints_as_said "$file" in_empty_folder python3 "$talutil_top/$file"
+}
+
+compile_pascal() {
+  "$pascal/compiler" -n -ve -T"$(cat "$pascal/target")" -Fu"$pascal/units" -FU"$work" -Fu"$work" -FE"$work" "$1" \
+    >>"$work/compiler.log" 2>&1
+}
+
+run_pascal() {
+  local file here="Z:\\build\\guides-$folder"
+  if [ "${TALUTIL_WITHOUT_PASCAL:-}" = 1 ]; then
+    echo "left out: the Free Pascal guides, since TALUTIL_WITHOUT_PASCAL is 1"
+    return
+  fi
+  pascal=$(tools/pascal.sh "$folder")
+  # The early-bound program uses the unit that the importer makes of the type library.
+  compile_pascal tests/hosts/clients/import_unit.pas && wine "$here\\import_unit.exe" "$dll" "$here\\" >/dev/null || true
+  for file in examples/guides/*.pas; do
+    compile_pascal "$file" || true
+    prints_as_said "$file" wine "$here\\$(basename "$file" .pas).exe"
+  done
+}
+
+run_cpp() {
+  local file=examples/guides/cpp_early.cpp header=$talutil_build/$folder/generated/talutil.h compiler=i686
+  if [ ! -f "$header" ]; then
+    echo "left out: $file, since $folder has not generated talutil.h"
+    return
+  fi
+  [ "$folder" = windows ] || compiler=x86_64
+  "$compiler-w64-mingw32-g++-posix" -std=c++20 -Wall -Wextra -Werror -static -I"$(dirname "$header")" "$file" \
+    -o "$work/cpp_early.exe" -lole32 -loleaut32 >>"$work/compiler.log" 2>&1 || true
+  prints_as_said "$file" wine "Z:\\build\\guides-$folder\\cpp_early.exe"
+}
+
+run_windows() {
+  local file
+  # A server that is still there may believe in a screen that has gone.
+  wine_server -k
+  start_wine
+  wine regsvr32.exe /s "$dll" || fail "regsvr32 could not register $dll"
+  for file in examples/guides/*.{vbs,js}; do
+    prints_as_said "$file" wine cscript.exe //nologo "Z:\\checkout\\${file//\//\\}"
+  done
+  run_pascal
+  run_cpp
+  wine regsvr32.exe /s /u "$dll" || true
+}
+
+case $folder in
+  native)
+    talutil=$(realpath "$2")
+    run_native
+    ;;
+  windows | windows64)
+    [ "$folder" = windows ] || use_wine64
+    dll="Z:\\build\\$folder\\TALUtil.dll"
+    run_windows
+    ;;
+  *) fail "usage: $0 native TALUTIL|windows|windows64" ;;
+esac
+printf '%d passed, %d failed\n' "$passed" "$failed"
+[ "$failed" = 0 ]
