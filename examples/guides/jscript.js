@@ -21,7 +21,7 @@ WScript.Echo(u.IndexInList(automation_array(["Apple", "Banana"]), "ban"));
 
 // An array that is a result arrives as a VBArray.
 var addresses = new VBArray(u.GetIpAddrTable()).toArray();
-WScript.Echo(addresses.length > 0 ? "with a network" : "without a network");
+WScript.Echo(addresses instanceof Array ? "an array of addresses" : "no array");
 
 // A corrected argument is lost, too: ask for the value in another way, here by the date that belongs to the week.
 WScript.Echo(u.GetWeekNumber(u.WeekYearToDate(60, 2009, 1)));
