@@ -57,9 +57,10 @@ talutil_layer(preview BELOW library)
 set(families text dates services forms preview)
 talutil_layer(infoforms BELOW forms)
 talutil_layer(startup BELOW ${families} infoforms)
+talutil_layer(calling BELOW startup FAST ALL)
 
 add_library(talutil_core STATIC)
 target_link_libraries(talutil_core
-  PUBLIC layer_automation layer_texts layer_platform layer_documents layer_archives layer_controls layer_library layer_text
-         layer_dates layer_services layer_forms layer_preview layer_infoforms layer_startup
+  PUBLIC layer_automation layer_texts layer_platform layer_documents layer_archives layer_controls layer_library
+         layer_text layer_dates layer_services layer_forms layer_preview layer_infoforms layer_startup layer_calling
   PRIVATE archives::zip archives::deflate documents::pdf)

@@ -20,6 +20,8 @@ seed plans_fuzz forms '\0\0A GetData "a ""b"" c" @int:5 @num:1.5\nB IncDay @date
 seed profiles_fuzz ansi '\0\0\0; head\r\n[a]\r\nx = 1 \r\ny="2"\r\n\r\n[ b ]\r\nx\r\n[A]\nx=3'
 seed profiles_fuzz utf8 '\0\0\0\xEF\xBB\xBFt=0\r\n[\xC5\x82]\r\nx=\xC3\xA9\r\n'
 seed profiles_fuzz utf16 '\0\0\0\xFF\xFE[\0a\0]\0\n\0x\0=\0B\x01'
+seed json_fuzz value '{"list": ["a\\u0000\\ud800", {"date": "2009-03-31T10:20:30"}, 1.5e300], "from": 1}'
+seed json_fuzz request '{"create": "Grid", "set": {"Rows": 2}, "id": [true, null]}'
 seed tables_fuzz utf8 '\0\0\0\xEF\xBB\xBFa,"b ""c""",\xC5\x82\r\n'
 seed code_pages_fuzz utf8 '\0a\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80\xED\xA0\x80\xC0\x80'
 seed code_pages_fuzz double '\0\x82\xA0\x81\x40\xC4\xE3\xB0\xA1\xFF'
