@@ -4,6 +4,7 @@
 
 #include "automation/member_table.hpp"
 #include "cli/arguments.hpp"
+#include "cli/batch.hpp"
 #include "cli/commands.hpp"
 #include "cli/failure.hpp"
 #include "library/interface_definition.hpp"
@@ -280,6 +281,7 @@ int run(std::vector<std::string> words) {
   add_list(app, request);
   add_help(app, request);
   add_call(app, request);
+  add_batch(app, request.run);
   add_clean(app, request);
   add_secrets(app, request);
   add_config(app, request);

@@ -23,6 +23,7 @@ class Session {
   [[nodiscard]] static const LateInterface& members() { return late_interface<ORVUtils>(); }
   [[nodiscard]] ORVUtils& utils() noexcept { return utils_; }
   [[nodiscard]] posix::PosixPlatform& platform() noexcept { return platform_; }
+  [[nodiscard]] Library& library() noexcept { return library_; }
   [[nodiscard]] Locale locale() const { return library_.locale(); }
   [[nodiscard]] SharedSettings& settings() noexcept { return library_.settings(); }
 

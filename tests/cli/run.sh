@@ -57,6 +57,25 @@ expect 'JSON' 0 '{"result": "AB", "arguments": {"sCharacter": " "}}' call Remove
 expect 'JSON escapes' 0 '{"result": "\"\\\r\nü😀", "arguments": {}}' call --json StringRestoreCRLF '"\xxü😀' x
 expect 'JSON of no result' 0 '{"result": null, "arguments": {}}' call Terminate --json
 
+# ---- batch: state from line to line, errors, and lines of any length
+batch() { "$talutil" batch "$@" 2>&1; }
+verdict 'batch keeps settings' "0: {\"id\": 1, \"result\": {\"empty\": true}}$nl{\"result\": \"anne\"}" \
+  "$(printf '\xEF\xBB\xBF{"call": "sUserName", "args": ["anne"], "id": 1}\r\n\n{"call": "sUserName"}' | answer batch)"
+verdict 'batch goes on after a bad line' "1: refused$nl{\"result\": 0}${nl}talutil: standard input: 1 line was no call; its answer says why" \
+  "$(printf 'x\n{"call": "iBranchID"}\n' | answer batch | sed 's/{"error": .*, "line": 1}}/refused/')"
+verdict 'batch with 20 MB in a line' "20000000 x" \
+  "$({ printf '{"call": "StripNulls", "args": ["'; head -c 20000000 /dev/zero | tr '\0' x; echo '"]}'; } | batch |
+     tr -d -c x | sed -E 's/^(x*)$/\1/' | awk '{ print length($0), substr($0, 1, 1) }')"
+# It answers before its input ends.
+coproc waiting { "$talutil" batch 2>&1; }
+echo '{"call": "GetData", "args": ["A,B,", 0, 1]}' >&"${waiting[1]}"
+read -r -t 30 -u "${waiting[0]}" first
+eval "exec ${waiting[1]}>&-"
+wait "$waiting_PID"
+verdict 'batch answers at once' '{"result": "A"}' "$first"
+verdict 'batch in another code page' '{"result": "Ольга"}' \
+  "$(echo '{"call": "VerifyTextData", "args": [0, 0, "Ольга?"]}' | batch --code-page 1251)"
+
 # ---- call: written forms
 expect 'Null' 0 0 call VerifyIntData 1 @null
 expect 'Empty is not Null' 0 0 call VerifyIntData 0 @empty
@@ -114,7 +133,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
   call ReadCommaDelimStrToList 1 2 3 4
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, sysinfo, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, batch, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, sysinfo, idl, reference' lst
 expect_part 'no member' 2 ': MEMBER is required; see' call -- GetYear
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
