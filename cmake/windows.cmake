@@ -44,26 +44,22 @@ set(host_compile ${host_compiler} -std=c++20 -O0 -I${CMAKE_SOURCE_DIR}/src)
 add_custom_command(
   OUTPUT ${generated}/write_idl
   COMMAND ${host_compile} ${CMAKE_SOURCE_DIR}/tools/write_idl.cpp
-          ${CMAKE_SOURCE_DIR}/src/library/interface_definition.cpp ${CMAKE_SOURCE_DIR}/src/texts/member_texts.cpp
-          ${member_texts} -o ${generated}/write_idl
-  DEPENDS tools/write_idl.cpp src/library/interface_definition.cpp src/texts/member_texts.cpp ${member_texts}
-          ${table_headers})
+          ${CMAKE_SOURCE_DIR}/src/library/interface_definition.cpp ${CMAKE_SOURCE_DIR}/src/library/cpp_header.cpp
+          ${CMAKE_SOURCE_DIR}/src/texts/member_texts.cpp ${member_texts} -o ${generated}/write_idl
+  DEPENDS tools/write_idl.cpp src/library/interface_definition.cpp src/library/cpp_header.cpp
+          src/texts/member_texts.cpp ${member_texts} ${table_headers})
 add_custom_command(
   OUTPUT ${generated}/mend_typelib
   COMMAND ${host_compile} ${CMAKE_SOURCE_DIR}/tools/mend_typelib.cpp -o ${generated}/mend_typelib
   DEPENDS tools/mend_typelib.cpp ${table_headers})
 add_custom_command(
-  OUTPUT ${generated}/TALUtil.tlb ${generated}/TALUtil.h ${CMAKE_BINARY_DIR}/TALUtil.manifest
+  OUTPUT ${generated}/TALUtil.tlb ${generated}/talutil.h ${CMAKE_BINARY_DIR}/TALUtil.manifest
   COMMAND ${generated}/write_idl idl > ${generated}/TALUtil.idl
-  COMMAND ${generated}/write_idl header > ${generated}/TALUtil-header.idl
+  COMMAND ${generated}/write_idl header > ${generated}/talutil.h
   COMMAND ${generated}/write_idl ${manifest_kind} > ${CMAKE_BINARY_DIR}/TALUtil.manifest
   COMMAND ${idl_compiler} ${idl_flags} -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
           -t -o ${generated}/TALUtil.tlb ${generated}/TALUtil.idl
   COMMAND ${generated}/mend_typelib ${generated}/TALUtil.tlb
-  COMMAND ${idl_compiler} ${idl_flags} -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
-          -h -o ${generated}/TALUtil.h ${generated}/TALUtil-header.idl
-  # Clients use the platform's headers instead of our base types.
-  COMMAND sed -i /base.h/d ${generated}/TALUtil.h
   DEPENDS ${generated}/write_idl ${generated}/mend_typelib tools/base.idl
   COMMENT "Making the type library")
 
@@ -71,7 +67,7 @@ enable_language(RC)
 configure_file(src/com/talutil.rc.in ${generated}/talutil.rc)
 set_source_files_properties(${generated}/talutil.rc PROPERTIES OBJECT_DEPENDS ${generated}/TALUtil.tlb)
 talutil_layer(com BELOW startup win32 FAST dispatch_object.cpp invoke.cpp variant_bridge.cpp write_back.cpp)
-add_library(TALUtil SHARED src/com/talutil.def ${generated}/talutil.rc ${generated}/TALUtil.h)
+add_library(TALUtil SHARED src/com/talutil.def ${generated}/talutil.rc ${generated}/talutil.h)
 set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
 target_link_libraries(TALUtil PRIVATE layer_com talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)
 # Page-aligned sections are mapped; others are read and copied, which takes most of the loading time.

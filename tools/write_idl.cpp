@@ -1,10 +1,12 @@
-// Writes what the Windows build needs from the interface tables: "idl" and "header" print the interface definition as
-// the IDL compiler needs it for the type library and for the header, "manifest" prints the manifest for use without
-// registration. Built for the build machine, even when the library itself is built for Windows.
+// Writes what the Windows build needs from the interface tables: "idl" prints the interface definition as the IDL
+// compiler needs it for the type library, "header" the header for C++ programs, "manifest" and "manifest64" the
+// manifest for use without registration. Built for the build machine, even when the library itself is built for
+// Windows.
 #include <cstdio>
 #include <string>
 #include <string_view>
 
+#include "library/cpp_header.hpp"
 #include "library/identity.hpp"
 #include "library/interface_definition.hpp"
 #include "library/version.hpp"
@@ -47,10 +49,9 @@ std::string manifest(const std::string& processor) {
 
 int main(int argc, char** argv) {
   const std::string_view what = argc == 2 ? argv[1] : "";
-  const std::string_view import = "import \"base.idl\";\n\n";
   std::string text;
-  if (what == "idl") text = std::string(import) + interface_definition(Dialect::type_library);
-  if (what == "header") text = std::string(import) + interface_definition(Dialect::header);
+  if (what == "idl") text = "import \"base.idl\";\n\n" + interface_definition(Dialect::type_library);
+  if (what == "header") text = cpp_header();
   if (what == "manifest") text = manifest("x86");
   if (what == "manifest64") text = manifest("amd64");
   if (text.empty()) {

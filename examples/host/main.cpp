@@ -4,12 +4,11 @@
 // After windows.h.
 #include <commctrl.h>
 
-// Defines the identifiers that the header declares.
-#include <initguid.h>
-// After initguid.h.
-#include "TALUtil.h"
+#include "talutil.h"
 
 namespace {
+
+using namespace TALUtil;
 
 enum Command : int { find_branch = 100, tick_all, tick_none, count_ticks, export_table, print_window, table_id };
 

@@ -7,6 +7,7 @@
 #include "cli/batch.hpp"
 #include "cli/commands.hpp"
 #include "cli/failure.hpp"
+#include "library/cpp_header.hpp"
 #include "library/interface_definition.hpp"
 #include "library/version.hpp"
 #include "platform/posix/posix_code_page.hpp"
@@ -245,6 +246,9 @@ void add_system(CLI::App& app, Request& request) {
 void add_printers(CLI::App& app, Request& request) {
   app.add_subcommand("idl", "Print the interface definition of the type library")->callback([&] {
     request.run = [] { std::cout << talutil::interface_definition(); };
+  });
+  app.add_subcommand("header", "Print talutil.h, with which C++ programs are bound early")->callback([&] {
+    request.run = [] { std::cout << talutil::cpp_header(); };
   });
   auto* const printing = app.add_subcommand("reference", "Print the reference of all classes, in Markdown");
   printing->add_flag("--json", request.reference_json, "Print it as JSON, for programs");

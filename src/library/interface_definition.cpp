@@ -26,12 +26,7 @@ std::string hexadecimal(std::int32_t value) {
   return "0x" + std::string(digits.data(), end.ptr);
 }
 
-/// The platform's headers define records of the same names, so the header for C++ clients adds a prefix.
-std::string record_name(std::string_view name, Dialect dialect) {
-  return (dialect == Dialect::header ? "TALUtil_" : "") + std::string(name);
-}
-
-std::string type_name(ValueType type, Dialect dialect) {
+std::string type_name(ValueType type) {
   switch (type) {
     case ValueType::boolean:
       return "VARIANT_BOOL";
@@ -50,7 +45,7 @@ std::string type_name(ValueType type, Dialect dialect) {
     case ValueType::text_array:
       return "SAFEARRAY(BSTR)";
     case ValueType::system_time:
-      return record_name("SYSTEMTIME", dialect);
+      return "SYSTEMTIME";
     case ValueType::none:
     case ValueType::object:
       break;
@@ -58,9 +53,8 @@ std::string type_name(ValueType type, Dialect dialect) {
   return "void";
 }
 
-std::string default_value(const Parameter& parameter, Dialect dialect) {
+std::string default_value(const Parameter& parameter) {
   if (!parameter.is_optional) return {};
-  if (dialect == Dialect::header && parameter.type == ValueType::text) return ", optional";
   const std::string value =
       parameter.type == ValueType::text ? quoted(parameter.default_text) : std::to_string(parameter.default_number);
   return ", optional, defaultvalue(" + value + ")";
@@ -71,9 +65,9 @@ void write_parameter(std::string& out, const Parameter& parameter, Dialect diale
       dialect == Dialect::type_library && parameter.is_optional && parameter.type == ValueType::text;
   const bool by_value = parameter.passing == Passing::by_value || default_refused;
   out += by_value ? "[in" : "[in, out";
-  out += default_value(parameter, dialect);
+  out += default_value(parameter);
   out += "] ";
-  out += type_name(parameter.type, dialect);
+  out += type_name(parameter.type);
   out += by_value ? " " : "* ";
   out += parameter.name;
 }
@@ -94,7 +88,7 @@ void write_member(std::string& out, const Member& member, std::string_view help,
   if (member.result != ValueType::none) {
     out += separator;
     out += "[out, retval] ";
-    out += type_name(member.result, dialect);
+    out += type_name(member.result);
     out += "* result";
   }
   out += ");\n";
@@ -153,13 +147,12 @@ std::string interface_definition(Dialect dialect) {
          ")]\nlibrary ";
   out += identity::library_name;
   out += " {\n  importlib(\"stdole2.tlb\");\n";
-  write_record(out, record_name("SYSTEMTIME", dialect), identity::system_time_record,
+  write_record(out, "SYSTEMTIME", identity::system_time_record,
                {"short wYear", "short wMonth", "short wDayOfWeek", "short wDay", "short wHour", "short wMinute",
                 "short wSecond", "short wMilliseconds"});
-  write_record(out, record_name("FILETIME", dialect), identity::file_time_record,
-               {"long dwLowDateTime", "long dwHighDateTime"});
-  write_record(out, dialect == Dialect::type_library ? guid_stand_in : record_name("GUID", dialect),
-               identity::guid_record, {"long Data1", "short Data2", "short Data3", "unsigned char Data4[8]"});
+  write_record(out, "FILETIME", identity::file_time_record, {"long dwLowDateTime", "long dwHighDateTime"});
+  write_record(out, dialect == Dialect::type_library ? guid_stand_in : "GUID", identity::guid_record,
+               {"long Data1", "short Data2", "short Data3", "unsigned char Data4[8]"});
   write_record(out, "TRect", identity::rectangle_record, {"long left", "long Top", "long Right", "long Bottom"});
   write_class(out,
               {"ORVUtils", identity::orv_utils_class, identity::orv_utils_interface, described<ORVUtils>},

@@ -8,9 +8,8 @@ namespace talutil {
 ///
 /// The IDL compiler rejects a default value for a text passed by reference, and takes the name GUID for the platform's
 /// own record. Its input for the type library therefore differs in these places, and the build patches the library
-/// afterwards. Its input for the C++ header keeps the references but omits the defaults, and adds a prefix to the
-/// records, so that the header can be included together with the platform's.
-enum class Dialect { published, type_library, header };
+/// afterwards.
+enum class Dialect { published, type_library };
 
 /// The name that replaces GUID until the type library is patched. It has the same hash, so that the library's index of
 /// names stays valid.

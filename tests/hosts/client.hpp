@@ -19,16 +19,13 @@
 #include "../fakes/host_members.hpp"
 #include "com/pointer.hpp"
 #include "com/variant_bridge.hpp"
-
-// Defines the identifiers that the header declares.
-#include <initguid.h>
-// After initguid.h.
-#include "TALUtil.h"
+#include "talutil.h"
 
 /// What the client programs share: checks, of which those that fail are a line each and whose counts are the last line;
 /// owners of what is passed; and objects of a host's.
 namespace talutil::hosts {
 
+using namespace TALUtil;
 using com::Pointer;
 
 inline int passed = 0;

@@ -220,7 +220,7 @@ void records(IDispatch* u) {
     return invoke(u, identifier(u, member), DISPATCH_METHOD, list).error;
   };
   for (const VARTYPE type : std::initializer_list<VARTYPE>{VT_RECORD, VT_RECORD | VT_BYREF}) {
-    TALUtil_SYSTEMTIME time{1, 2, 77, 3, 4, 5, 6, 88};
+    SYSTEMTIME time{1, 2, 77, 3, 4, 5, 6, 88};
     VARIANT record{};
     V_VT(&record) = type;
     V_RECORD(&record) = &time;
