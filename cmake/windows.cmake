@@ -57,21 +57,37 @@ add_custom_command(
   COMMAND ${generated}/write_idl idl > ${generated}/TALUtil.idl
   COMMAND ${generated}/write_idl header > ${generated}/talutil.h
   COMMAND ${generated}/write_idl ${manifest_kind} > ${CMAKE_BINARY_DIR}/TALUtil.manifest
-  COMMAND ${idl_compiler} ${idl_flags} -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
+  # The library would otherwise contain the time at which it was made.
+  COMMAND ${CMAKE_COMMAND} -E env WIDL_TIME_OVERRIDE=0 ${idl_compiler} ${idl_flags} -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
           -t -o ${generated}/TALUtil.tlb ${generated}/TALUtil.idl
   COMMAND ${generated}/mend_typelib ${generated}/TALUtil.tlb
   DEPENDS ${generated}/write_idl ${generated}/mend_typelib tools/base.idl
   COMMENT "Making the type library")
 
+# Loaded at any address, data never run as code. Nothing depends on the time: the same sources give the same bytes.
+set(dll_link_options -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup -Wl,--no-insert-timestamp
+    -Wl,--dynamicbase -Wl,--nxcompat)
+if(CMAKE_SIZEOF_VOID_P EQUAL 8)
+  list(APPEND dll_link_options -Wl,--high-entropy-va)
+endif()
+
 enable_language(RC)
-configure_file(src/com/talutil.rc.in ${generated}/talutil.rc)
-set_source_files_properties(${generated}/talutil.rc PROPERTIES OBJECT_DEPENDS ${generated}/TALUtil.tlb)
+# Writes a DLL's version resource, and in front of it what else there is: NAME DESCRIPTION [CONTENTS]
+function(talutil_resources name description)
+  set(resource_name ${name})
+  set(resource_description ${description})
+  set(resource_contents "${ARGN}")
+  configure_file(src/com/version.rc.in ${generated}/${name}.rc)
+endfunction()
+talutil_resources(TALUtil "TALUtil common toolkit" "#include \"${CMAKE_SOURCE_DIR}/src/com/talutil.rc\"")
+talutil_resources(printhelper "TALUtil print helper")
+set_source_files_properties(${generated}/TALUtil.rc PROPERTIES OBJECT_DEPENDS ${generated}/TALUtil.tlb)
 talutil_layer(com BELOW startup win32 FAST dispatch_object.cpp invoke.cpp variant_bridge.cpp write_back.cpp)
-add_library(TALUtil SHARED src/com/talutil.def ${generated}/talutil.rc ${generated}/talutil.h)
+add_library(TALUtil SHARED src/com/talutil.def ${generated}/TALUtil.rc ${generated}/talutil.h)
 set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
 target_link_libraries(TALUtil PRIVATE layer_com talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)
 # Page-aligned sections are mapped; others are read and copied, which takes most of the loading time.
-target_link_options(TALUtil PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup -Wl,--file-alignment=4096)
+target_link_options(TALUtil PRIVATE ${dll_link_options} -Wl,--file-alignment=4096)
 
 # For our own clients of the DLL: headers only, no code.
 add_library(client_headers INTERFACE)
@@ -82,9 +98,9 @@ target_link_libraries(client_headers INTERFACE talutil_options)
 
 # In a separate folder: the library is to find it where a package would put it, beside the program or TALUtil.dll.
 add_library(printhelper SHARED src/printhelper/printhelper.cpp src/printhelper/printhelper.def
-            src/platform/win32/exception_frames.cpp)
+            src/platform/win32/exception_frames.cpp ${generated}/printhelper.rc)
 target_include_directories(printhelper PRIVATE src)
 set_target_properties(printhelper PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/printhelper)
-target_link_libraries(printhelper PRIVATE talutil_options gdi32 user32 winspool)
-target_link_options(printhelper PRIVATE -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup)
+target_link_libraries(printhelper PRIVATE talutil_options gdi32 user32)
+target_link_options(printhelper PRIVATE ${dll_link_options})
 install(TARGETS TALUtil printhelper RUNTIME DESTINATION .)

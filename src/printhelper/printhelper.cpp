@@ -16,9 +16,18 @@ namespace {
 using talutil::win32::Owned;
 namespace kind = talutil::win32::kind;
 
+/// A function of the spooler's library, which comes from the system folder only: an import would also find a library of
+/// its name in the folder of the program.
+template <class Function>
+Function spooler_function(const char* name) {
+  return talutil::win32::late_function<Function>(L"winspool.drv", name);
+}
+
 struct Printer {
   using Handle = HANDLE;
-  static void close(HANDLE printer) noexcept { ClosePrinter(printer); }
+  static void close(HANDLE printer) noexcept {
+    if (const auto close = spooler_function<decltype(&ClosePrinter)>("ClosePrinter")) close(printer);
+  }
 };
 
 /// The printer settings for a window, kept from ConfigurePrinter to SendToPrinter.
@@ -49,25 +58,28 @@ bool size_of(HWND window, Size& size) {
 bool prepare(HWND window, Setup& setup) {
   Size size;
   DWORD length = 0;
-  if (!size_of(window, size)) return false;
-  GetDefaultPrinterW(nullptr, &length);
+  const auto get_default = spooler_function<decltype(&GetDefaultPrinterW)>("GetDefaultPrinterW");
+  const auto open = spooler_function<decltype(&OpenPrinterW)>("OpenPrinterW");
+  const auto adjust = spooler_function<decltype(&DocumentPropertiesW)>("DocumentPropertiesW");
+  if (get_default == nullptr || open == nullptr || adjust == nullptr || !size_of(window, size)) return false;
+  get_default(nullptr, &length);
   if (length == 0) return false;
   setup.printer.resize(length);
-  if (GetDefaultPrinterW(setup.printer.data(), &length) == FALSE) return false;
+  if (get_default(setup.printer.data(), &length) == FALSE) return false;
 
   Owned<Printer> printer;
-  if (OpenPrinterW(setup.printer.data(), printer.receive(), nullptr) == FALSE) return false;
-  const LONG bytes = DocumentPropertiesW(nullptr, printer.get(), setup.printer.data(), nullptr, nullptr, 0);
+  if (open(setup.printer.data(), printer.receive(), nullptr) == FALSE) return false;
+  const LONG bytes = adjust(nullptr, printer.get(), setup.printer.data(), nullptr, nullptr, 0);
   bool is_ready = false;
   if (bytes > 0) {
     setup.settings.resize(static_cast<std::size_t>(bytes));
     DEVMODEW* const mode = setup.device_mode();
-    is_ready = DocumentPropertiesW(nullptr, printer.get(), setup.printer.data(), mode, nullptr, DM_OUT_BUFFER) == IDOK;
+    is_ready = adjust(nullptr, printer.get(), setup.printer.data(), mode, nullptr, DM_OUT_BUFFER) == IDOK;
     mode->dmFields |= DM_ORIENTATION;
     mode->dmOrientation = size.width > size.height ? DMORIENT_LANDSCAPE : DMORIENT_PORTRAIT;
     // Lets the driver adjust the rest of its settings.
-    is_ready = is_ready && DocumentPropertiesW(nullptr, printer.get(), setup.printer.data(), mode, mode,
-                                               DM_IN_BUFFER | DM_OUT_BUFFER) == IDOK;
+    is_ready = is_ready &&
+               adjust(nullptr, printer.get(), setup.printer.data(), mode, mode, DM_IN_BUFFER | DM_OUT_BUFFER) == IDOK;
   }
   setup.window = window;
   return is_ready;
