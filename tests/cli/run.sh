@@ -133,7 +133,7 @@ expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, 
   call ReadCommaDelimStrToList 1 2 3 4
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
 expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, batch, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, sysinfo, idl, reference' lst
+  'talutil: there is no subcommand "lst"; there are list, help, call, batch, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, sysinfo, idl, header, reference' lst
 expect_part 'no member' 2 ': MEMBER is required; see' call -- GetYear
 expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
 
