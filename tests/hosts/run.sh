@@ -4,6 +4,7 @@
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 . "$talutil_top/tests/hosts/screen.sh"
+. "$talutil_top/tests/equality/compare.sh"
 
 folder=${1:-windows}
 [ "$folder" != windows64 ] || use_wine64
@@ -186,6 +187,7 @@ rm -f "$talutil_build/cipher.txt"
 elsewhere -1 cipher "$("$talutil" encrypt <<<"$secret")" 'Z:\build\cipher.txt'
 expect_success "the command opens what the script host has encrypted" \
   test "$(tr -d '\r' <"$talutil_build/cipher.txt" | "$talutil" decrypt)" = "$secret"
+compare_artifacts "$folder"
 expect_success "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"
 
 printf '%d passed, %d failed\n' "$passed" "$failed"

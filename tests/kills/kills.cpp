@@ -25,14 +25,8 @@
 #include "archives/packing.hpp"
 #include "archives/unpacking.hpp"
 #include "automation/run_time_error.hpp"
-#include "library/library.hpp"
-#include "library/orv_utils.hpp"
 #include "tests/kills/process.hpp"
-#ifdef _WIN32
-#include "platform/win32/win32_platform.hpp"
-#else
-#include "platform/posix/posix_platform.hpp"
-#endif
+#include "tests/real_host.hpp"
 
 namespace talutil::testing {
 namespace {
@@ -42,44 +36,6 @@ namespace fs = std::filesystem;
 constexpr int workers = 8;
 constexpr std::uintmax_t keys = 5;  ///< Each worker writes so many items in turn.
 constexpr TextView application = u"TALUtil kills";
-
-struct NoControls final : ControlMakers {
-  ObjectRef create(TextView /*class_name*/) override { return nullptr; }
-};
-
-/// The library on the real platform.
-struct Host {
-  explicit Host(const fs::path& native_folder) : native(prepared(native_folder)) {
-#ifdef _WIN32
-    folder = Text(native.u16string()) + u"\\";
-#else
-    folder = u"Z:" + from_utf8(native.string()) + u"/";
-#endif
-    utils.settings().EventLog = 1;
-    utils.settings().sORVPath = folder.substr(0, folder.size() - 1);
-  }
-
-  fs::path native;
-  Text folder;
-#ifdef _WIN32
-  NoControls controls;
-  HRESULT apartment = CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
-  win32::Win32Platform platform{controls};
-#else
-  posix::PosixPlatform platform;
-#endif
-  Library library{platform.platform()};
-  ORVUtils utils{library};
-
- private:
-  /// The platform looks for its settings when it is made.
-  static fs::path prepared(const fs::path& folder) {
-#ifndef _WIN32
-    setenv("TALUTIL_HIVE", (folder / "hive.db").c_str(), 1);
-#endif
-    return folder;
-  }
-};
 
 std::string key_of(int worker, std::uintmax_t number) {
   return std::to_string(worker) + "-" + std::to_string(number % keys);
