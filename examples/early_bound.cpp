@@ -73,10 +73,11 @@ void split(TALUtil::_ORVUtils& toolkit) {
 }
 
 void fail(TALUtil::_ORVUtils& toolkit) {
+  Text word(L"a");
   Text empty;
   Text result;
   try {
-    check(toolkit.StringReplace(empty.reference(), empty.reference(), empty.reference(), result.reference()));
+    check(toolkit.StringReplace(word.reference(), empty.reference(), empty.reference(), result.reference()));
   } catch (const std::runtime_error& error) {
     std::printf("%s\n", error.what());
   }

@@ -43,11 +43,11 @@ need_packages() {
 # The variant of the third-party libraries that a preset uses.
 flavour_of() { case $1 in windows* | fuzz) echo "$1" ;; *) echo native ;; esac; }
 
-# Builds a preset, or a target of it, with its libraries; prints only what has failed: build PRESET [TARGET]
+# Builds a preset, or targets of it, with its libraries; prints only what has failed: build PRESET [TARGET...]
 build() {
   tools/third_party.sh "$(flavour_of "$1")" >/dev/null
   cmake --preset "$1" >"$talutil_build/$1-configure.log" 2>&1 || { cat "$talutil_build/$1-configure.log"; return 1; }
-  cmake --build --preset "$1" ${2:+--target "$2"} >"$talutil_build/$1-build.log" 2>&1 ||
+  cmake --build --preset "$1" ${2:+--target "${@:2}"} >"$talutil_build/$1-build.log" 2>&1 ||
     { grep -E -A8 'error|FAILED' "$talutil_build/$1-build.log" | head -60; return 1; }
 }
 
@@ -164,8 +164,9 @@ in_wine_root() {
     mount --bind "$build" "$root/build"
     mount --rbind /dev "$root/dev"
     mount -t proc proc "$root/proc"
-    exec chroot "$root" env -i HOME=/root WINEARCH=win32 WINEPREFIX=/build/wine-prefix "$@"
-  ' in_wine_root "$wine_root" "$talutil_top" "$talutil_build" "${variables[@]}" "$@"
+    exec chroot "$root" env -i HOME=/root WINEARCH=win32 "$@"
+  ' in_wine_root "$wine_root" "$talutil_top" "$talutil_build" "WINEPREFIX=/build/$(basename "$(wine_prefix)")" \
+    "${variables[@]}" "$@"
 }
 
 # The current folder must be on a drive, because programs look for it there.
