@@ -47,7 +47,8 @@ struct Module {
 Module module_state;
 
 /// Keeps the DLL in the process until that ends. Hosts may hold our objects, windows and timers in ways that no count
-/// reflects, and each unloading would leak a slot and some memory of the compiler's run time.
+/// reflects, and each unloading would leak a slot of thread storage and some memory of the compiler's run time, even if
+/// no object was made: after a thousand, 32-bit processes would have no slots left.
 void stay_loaded() noexcept {
   HMODULE module = nullptr;
   GetModuleHandleExW(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_PIN,
@@ -142,7 +143,6 @@ Library& module_library() {
   const Starting starting;
   auto loaded = std::make_unique<LoadedLibrary>();
   loaded->library.start();
-  stay_loaded();
   module_state.loaded = loaded.release();
   return module_state.loaded->library;
 }
@@ -165,9 +165,10 @@ using namespace talutil;
 using namespace talutil::com;
 
 extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, void* /*reserved*/) {
-  // Nothing else here, because the loader lock is held.
+  // Nothing else here, because the loader lock is held; none of these loads or waits for anything.
   if (reason == DLL_PROCESS_ATTACH) {
     module_state.handle = instance;
+    stay_loaded();
     DisableThreadLibraryCalls(instance);
     win32::register_exception_frames(instance);
   } else if (reason == DLL_PROCESS_DETACH) {
@@ -185,7 +186,7 @@ STDAPI DllGetClassObject(REFCLSID class_id, REFIID id, void** out) {
   return CLASS_E_CLASSNOTAVAILABLE;
 }
 
-// Once the library has been started, the DLL stays; if only class objects were requested, it may be unloaded.
+// The DLL stays in the process either way; this tells COM when it need not ask again.
 STDAPI DllCanUnloadNow() { return module_state.loaded == nullptr && module_state.references == 0 ? S_OK : S_FALSE; }
 
 STDAPI DllRegisterServer() { return register_library(RegistrationScope::machine); }

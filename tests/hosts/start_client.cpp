@@ -88,6 +88,19 @@ void class_objects_keep_the_library(HMODULE module) {
   check_equal(S_OK, can_unload(module), "after the last lock");
 }
 
+/// Hosts may look for the library again and again, which must not use up the process's slots of thread storage.
+void loading_again_costs_nothing(const std::wstring& path) {
+  const auto free_slot = [] {
+    const DWORD slot = TlsAlloc();
+    TlsFree(slot);
+    return slot;
+  };
+  FreeLibrary(LoadLibraryW(path.c_str()));
+  const DWORD before = free_slot();
+  for (int i = 0; i < 20; ++i) FreeLibrary(LoadLibraryW(path.c_str()));
+  check_equal(before, free_slot(), "the next slot after loading and freeing twenty times");
+}
+
 /// Creates an object, which fails for a control of the components window; the error names the parts.
 void creation_fails(std::initializer_list<const wchar_t*> parts) {
   Pointer<_ORVUtils> object;
@@ -198,7 +211,9 @@ void threads_see_whole_texts(COINIT apartment, LONG wanted) {
 int wmain(int count, wchar_t** arguments) {
   const LONG wanted = count > 2 ? wcstol(arguments[2], nullptr, 10) : 100'000;
   return run_checks([&] {
-    const HMODULE module = LoadLibraryW((std::wstring(arguments[1]) + L"\\TALUtil.dll").c_str());
+    const std::wstring path = std::wstring(arguments[1]) + L"\\TALUtil.dll";
+    loading_again_costs_nothing(path);
+    const HMODULE module = LoadLibraryW(path.c_str());
     class_objects_keep_the_library(module);
     {
       const Registry registry;
