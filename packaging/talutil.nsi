@@ -18,9 +18,14 @@ ManifestDPIAware true
 !define NAME TALUtil
 !define UNINSTALL_LIST "Software\Microsoft\Windows\CurrentVersion\Uninstall"
 !define UNINSTALL_KEY "${UNINSTALL_LIST}\${NAME}"
-!define USAGE "Options: /AllUsers or /CurrentUser; /S without windows; /log=FILE appends what was done to a file; /force \
-replaces a newer version; /D=FOLDER, last, chooses the folder.$\r$\nExit codes: 0 done, 1 cancelled, 2 failed and \
-taken back, 3 refused because a newer version is installed."
+!define LINE "$\r$\n"
+!define USAGE "${NAME}-${VERSION}-setup.exe [OPTION]...${LINE}${LINE}\
+/AllUsers, /CurrentUser: for whom to install${LINE}\
+/S: without windows${LINE}\
+/log=FILE: append what was done to a file${LINE}\
+/force: replace a newer version${LINE}\
+/D=FOLDER: the folder; must be the last option${LINE}${LINE}\
+Exit codes: 0 done, 1 cancelled, 2 failed and taken back, 3 refused because a newer version is installed."
 
 Name "${NAME} ${VERSION}"
 Caption "${NAME} ${VERSION} Setup"
