@@ -9,15 +9,38 @@
 #include "archives/packing.hpp"
 #include "archives/unpacking.hpp"
 #include "automation/date.hpp"
-#include "cli/commands.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
 #include "cli/json.hpp"
+#include "cli/options.hpp"
 #include "platform/posix/posix_platform.hpp"
 
 namespace talutil::cli {
 
 namespace {
+
+struct ZipOptions {
+  std::string archive;
+  std::vector<std::string> items;
+  std::string password_file;  ///< "-" for standard input; empty for none.
+  bool encrypt = false;       ///< Asks for the password at the terminal.
+  bool aes = false;
+  bool no_folders = false;
+  std::int32_t level = 6;
+  std::uint64_t volume_size = 0;  ///< 0 for a single archive.
+  std::string comment;
+  bool test = false;
+};
+
+struct UnzipOptions {
+  std::string archive;
+  std::vector<std::string> items;
+  std::string destination = ".";
+  std::string password_file;
+  bool overwrite = false;
+  bool no_folders = false;
+  bool list = false;
+};
 
 using archives::Progress;
 
@@ -162,9 +185,7 @@ void test_archive(const ZipOptions& options, posix::PosixPlatform& platform) {
   std::cout << options.archive << ": " << archive.count() << " entries, all well\n";
 }
 
-}  // namespace
-
-void zip(const ZipOptions& options) {
+void pack_archive(const ZipOptions& options) {
   posix::PosixPlatform platform;
   on_archive(options.archive, [&] {
     if (options.test) return test_archive(options, platform);
@@ -194,7 +215,7 @@ void zip(const ZipOptions& options) {
   });
 }
 
-void unzip(const UnzipOptions& options) {
+void unpack_archive(const UnzipOptions& options) {
   posix::PosixPlatform platform;
   on_archive(options.archive, [&] {
     archives::Archive archive(text_of(options.archive), platform.folders);
@@ -210,6 +231,42 @@ void unzip(const UnzipOptions& options) {
     archive.extract(text_of(options.destination), unpacking, platform.folders, platform.files,
                     question(platform.input_boxes), progress);
   });
+}
+
+}  // namespace
+
+void add_archives(CLI::App& app, Work& work) {
+  const auto packing = std::make_shared<ZipOptions>();
+  auto* const zip = app.add_subcommand("zip", "Pack files into an archive, add to an archive, or test it");
+  zip->add_option("ARCHIVE", packing->archive)->required();
+  zip->add_option("ITEM", packing->items, "Files, folders with all their contents, or patterns (\"C:\\DATA\\*.*\")");
+  zip->add_flag("--test", packing->test, "Read the archive, or the given entries, and check every byte; write nothing");
+  zip->add_flag("--encrypt", packing->encrypt, "Ask for a password and encrypt with it");
+  zip->add_option("--password-file", packing->password_file,
+                  "Read the password from the first line of this file; - is input");
+  zip->add_flag("--aes", packing->aes, "Encrypt with AES-256, which not every program can read");
+  zip->add_flag("--no-folders", packing->no_folders, "Store names without their folders");
+  zip->add_option("--level", packing->level, "0 stores, 1 is fast, 9 small")
+      ->check(CLI::Range(0, 9))
+      ->capture_default_str();
+  zip->add_option("--volumes", packing->volume_size, "Create a split set with volumes of this size (100000000, 650MB)")
+      ->transform(CLI::AsSizeValue(true));
+  zip->add_option("--comment", packing->comment, "The archive's comment");
+  zip->footer("  talutil password | tee key | talutil zip backup.zip DATA --password-file -");
+  choose(*zip, work, packing, &pack_archive);
+
+  const auto unpacking = std::make_shared<UnzipOptions>();
+  auto* const unzip = app.add_subcommand("unzip", "Unpack an archive, or the last volume of a split set");
+  unzip->add_option("ARCHIVE", unpacking->archive)->required();
+  unzip->add_option("ITEM", unpacking->items, "Entries, folders or patterns; default: all");
+  unzip->add_option("--to", unpacking->destination, "The folder to unpack to; created if missing")
+      ->capture_default_str();
+  unzip->add_option("--password-file", unpacking->password_file,
+                    "Read the password from its first line; - is standard input");
+  unzip->add_flag("--overwrite", unpacking->overwrite, "Replace existing files; by default they are kept");
+  unzip->add_flag("--no-folders", unpacking->no_folders, "Write all files into one folder");
+  unzip->add_flag("--list", unpacking->list, "List the entries instead: size, packed size, time (UTC), name");
+  choose(*unzip, work, unpacking, &unpack_archive);
 }
 
 }  // namespace talutil::cli

@@ -2,13 +2,13 @@
 
 #include <unistd.h>
 
-#include <CLI/CLI.hpp>
 #include <cerrno>
 #include <cstring>
 
 #include "calling/caller.hpp"
 #include "cli/failure.hpp"
 #include "cli/line_source.hpp"
+#include "cli/options.hpp"
 #include "cli/session.hpp"
 
 namespace talutil::cli {
@@ -66,18 +66,16 @@ void answer_calls(const BatchOptions& options) {
 
 }  // namespace
 
-void add_batch(CLI::App& app, std::function<void()>& run) {
+void add_batch(CLI::App& app, Work& work) {
   auto* const command = app.add_subcommand("batch", "Answer calls on standard input, one JSON object per line");
   const auto options = std::make_shared<BatchOptions>();
-  command->add_option("--code-page", options->code_page, "The ANSI code page used to compare characters")
-      ->check(CLI::IsMember(posix::code_page_numbers()))
-      ->type_name("NUMBER");
+  add_code_page(*command, options->code_page, "used to compare characters");
   command->footer(
       "  {\"call\": \"GetData\", \"args\": [\"A,B,\", 0, 1], \"set\": {\"sUserName\": \"anne\"}, \"id\": 7}\n"
       "is answered by\n"
       "  {\"id\": 7, \"result\": \"A\"}\n"
       "in the same process, so that settings last. docs/batch.md describes values, objects and errors.");
-  command->callback([&run, options] { run = [options] { answer_calls(*options); }; });
+  choose(*command, work, options, &answer_calls);
 }
 
 }  // namespace talutil::cli

@@ -1,14 +1,10 @@
 #pragma once
 
-#include <functional>
-
-namespace CLI {
-class App;
-}
+#include "cli/commands.hpp"
 
 namespace talutil::cli {
 
-/// Adds the subcommand "batch" to the command line; if it is chosen, `run` becomes its work.
-void add_batch(CLI::App& app, std::function<void()>& run);
+/// The subcommand that answers calls on standard input.
+void add_batch(CLI::App& app, Work& work);
 
 }  // namespace talutil::cli

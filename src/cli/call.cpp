@@ -1,14 +1,23 @@
 #include <iostream>
 
+#include "cli/arguments.hpp"
 #include "cli/calling.hpp"
-#include "cli/commands.hpp"
 #include "cli/entries.hpp"
 #include "cli/json.hpp"
+#include "cli/options.hpp"
 #include "cli/session.hpp"
 
 namespace talutil::cli {
 
 namespace {
+
+struct CallOptions {
+  std::string member;
+  std::vector<std::string> arguments;
+  std::vector<std::string> settings;  ///< NAME=VALUE, put in order before the call.
+  std::optional<std::uint32_t> code_page;
+  bool json = false;
+};
 
 /// A value for people to read: texts as they are, arrays with their texts in quotes.
 std::string plain(const Variant& value, const Locale& locale) {
@@ -50,8 +59,6 @@ void print_json(const Member& member, const Variant& result, const std::vector<A
             << '\n';
 }
 
-}  // namespace
-
 void call(const CallOptions& options) {
   Session session(options.code_page);
   const Entry entry = find_entry(Session::members().members, options.member);
@@ -62,6 +69,30 @@ void call(const CallOptions& options) {
   std::vector<Argument> arguments;
   const Variant result = call_slot(session, member, options.arguments, arguments);
   (options.json ? print_json : print_plain)(member, result, arguments, session.locale());
+}
+
+}  // namespace
+
+void add_call(CLI::App& app, Work& work, const std::vector<std::string>& verbatim) {
+  const auto options = std::make_shared<CallOptions>();
+  auto* const command = app.add_subcommand("call", "Call a method, or read or change a setting: MEMBER [ARGUMENT]...");
+  // Whatever is not one of our options is an argument, in order: "-1" and "-x" need no preceding "--".
+  command->allow_extras();
+  command->set_help_flag("--help", "Print this help message and exit");
+  command->add_option("MEMBER", options->member, "The member's name, in any case")->required();
+  add_settings(*command, options->settings, "Change a setting before the call; may be repeated");
+  add_code_page(*command, options->code_page, "used to compare characters");
+  command->add_flag("--json", options->json, "Print {\"result\": ..., \"arguments\": {...}}");
+  command->footer(
+      "Arguments are texts as typed, and are converted to the parameter's type. For values without a text form:\n" +
+      written_forms_help() +
+      "\n\"--\" ends the options: whatever follows is an argument, even --json.\n"
+      "Dates are typed and printed day first: talutil call IncMonth 31/03/2009 -1");
+  choose(*command, work, options, [command, &verbatim](CallOptions& chosen) {
+    chosen.arguments = command->remaining();
+    chosen.arguments.insert(chosen.arguments.end(), verbatim.begin(), verbatim.end());
+    call(chosen);
+  });
 }
 
 }  // namespace talutil::cli

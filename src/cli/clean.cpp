@@ -6,16 +6,25 @@
 
 #include "cli/calling.hpp"
 #include "cli/cleaner.hpp"
-#include "cli/commands.hpp"
 #include "cli/csv.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
 #include "cli/json.hpp"
+#include "cli/options.hpp"
 #include "cli/plan.hpp"
 
 namespace talutil::cli {
 
 namespace {
+
+struct CleanOptions {
+  std::string csv;
+  std::string plan;
+  std::string output;                      ///< If empty, the CSV file's name with .sql.
+  std::vector<std::string> settings;       ///< NAME=VALUE, put in order before the first row.
+  std::string table;                       ///< If empty, the CSV file's name without folder and extension.
+  std::optional<std::uint32_t> code_page;  ///< Also used for the files.
+};
 
 /// A column of the file, its steps, and statistics.
 struct Column {
@@ -129,8 +138,6 @@ void print_columns(const std::vector<Column>& columns) {
   }
 }
 
-}  // namespace
-
 void clean(const CleanOptions& options) {
   const auto start = std::chrono::steady_clock::now();
   const std::filesystem::path csv_path(options.csv);
@@ -167,6 +174,28 @@ void clean(const CleanOptions& options) {
             << session.settings().CounterVerifyInt << '\n'
             << totals.sql.size() << " bytes of inserts to " << output << " in " << std::fixed << std::setprecision(3)
             << elapsed.count() << " s\n";
+}
+
+}  // namespace
+
+void add_clean(CLI::App& app, Work& work) {
+  const auto options = std::make_shared<CleanOptions>();
+  auto* const command = app.add_subcommand("clean", "Clean a CSV file field by field and write it as SQL inserts");
+  command->add_option("CSV", options->csv, "The file, with the columns' names in the first row")->required();
+  command->add_option("--plan", options->plan, "Which members clean which column (see below)")->required();
+  command->add_option("--output", options->output, "The SQL file; default: the CSV file's name with .sql");
+  command->add_option("--table", options->table, "The table; default: the CSV file's name");
+  add_settings(*command, options->settings, "Change a setting first, for example iCharactercase=1");
+  add_code_page(*command, options->code_page, "of both files, also used to compare characters");
+  command->footer(
+      "A plan has one line per column: its name, a member and the member's arguments before the value.\n"
+      "\"|\" passes the result to another member, \"list\" cleans each element of a comma-separated list,\n"
+      "\"*\" stands for the value if it is not the last argument, and \"#\" begins a comment:\n"
+      "  Name    VerifyTextData 40 0\n"
+      "  Amount  VerifyTextData 0 1 | VerifyIntData 1\n"
+      "  Tags    list VerifyTextData 20 1\n"
+      "  Code    AddZeros * 6 -1");
+  choose(*command, work, options, &clean);
 }
 
 }  // namespace talutil::cli

@@ -2,10 +2,10 @@
 #include <iostream>
 #include <optional>
 
-#include "cli/commands.hpp"
 #include "cli/escapes.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
+#include "cli/options.hpp"
 #include "cli/session.hpp"
 #include "platform/profile_document.hpp"
 #include "services/settings_groups.hpp"
@@ -13,6 +13,19 @@
 namespace talutil::cli {
 
 namespace {
+
+/// The location of settings: a profile file, or a group of the user's store.
+struct ConfigOptions {
+  std::string file;
+  std::string group = "user";
+  std::string database;
+  std::string user;
+  std::string section;
+  std::string item;
+  std::string value;
+  std::string profile;  ///< The file that export writes and import reads.
+  bool force = false;
+};
 
 using Setting = posix::PosixSettingsStore::Setting;
 
@@ -78,8 +91,6 @@ std::vector<Setting> settings_in(const std::string& profile) {
   }
   return settings;
 }
-
-}  // namespace
 
 void config_get(const ConfigOptions& options) {
   ConfigSession session(options);
@@ -173,6 +184,42 @@ void config_import(const ConfigOptions& options) {
   std::cout << added << " settings added, " << same << " the same, " << differing
             << (options.force ? " replaced" : " kept as they were") << '\n';
   if (differing > 0 && !options.force) std::cerr << "talutil: --force replaces settings that differ\n";
+}
+
+}  // namespace
+
+void add_config(CLI::App& app, Work& work) {
+  auto* const config = app.add_subcommand("config", "Read and write settings in a profile file or the user's store");
+  config->require_subcommand(1);
+  const auto options = std::make_shared<ConfigOptions>();
+  const auto add = [&](const char* name, const char* help, void (*function)(const ConfigOptions&)) {
+    auto* const command = config->add_subcommand(name, help);
+    command->add_option("--database", options->database, "The database of the settings (sDatabaseName)");
+    command->add_option("--user", options->user, "The user of the settings (sUserName)");
+    choose(*command, work, options, function);
+    return command;
+  };
+  const auto add_place = [&](CLI::App* command) {
+    command->add_option("--file", options->file, "A profile file instead of the store");
+    command->add_option("--group", options->group, "The group of the store: user, database, previous or code")
+        ->capture_default_str();
+    return command;
+  };
+  auto* const get = add_place(add("get", "Print a setting", &config_get));
+  auto* const set =
+      add_place(add("set", "Write a setting; a user's setting also to the database's group", &config_set));
+  for (CLI::App* const command : {get, set}) {
+    command->add_option("SECTION", options->section)->required();
+    command->add_option("ITEM", options->item)->required();
+  }
+  set->add_option("VALUE", options->value)->required();
+  add_place(add("list", "Print all settings, or those in a section", &config_list))
+      ->add_option("SECTION", options->section);
+  auto* const exporting = add("export", "Write a user's settings to a profile file", &config_export);
+  auto* const importing = add("import", "Read a user's settings from a file written by export", &config_import);
+  exporting->add_flag("--force", options->force, "Replace an existing file");
+  importing->add_flag("--force", options->force, "Replace settings that differ");
+  for (CLI::App* const command : {exporting, importing}) command->add_option("FILE", options->profile)->required();
 }
 
 }  // namespace talutil::cli

@@ -1,9 +1,9 @@
 #include <charconv>
 
 #include "automation/control.hpp"
-#include "cli/commands.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
+#include "cli/options.hpp"
 #include "controls/grid.hpp"
 #include "forms/grid_export.hpp"
 #include "platform/posix/posix_platform.hpp"
@@ -11,6 +11,13 @@
 namespace talutil::cli {
 
 namespace {
+
+struct ExportOptions {
+  std::string table;                ///< A comma-separated file; its first line is row 0.
+  std::vector<std::string> hidden;  ///< Columns, counted from 1.
+  std::string rows;                 ///< "3-7" or "3"; empty for all.
+  std::string output;
+};
 
 /// A word as a whole number.
 std::int32_t number_of(std::string_view word, const std::string& option) {
@@ -56,8 +63,6 @@ void on_file(const std::string& path, Work work) {
   }
 }
 
-}  // namespace
-
 void export_table(const ExportOptions& options) {
   constexpr auto comma_text = static_cast<std::int16_t>(Grid::Format::comma_text);
   posix::PosixPlatform platform;
@@ -76,6 +81,24 @@ void export_table(const ExportOptions& options) {
       work.copy_selected_rows();
     work.save(utf8_text(options.output, "the file's name"), true);
   });
+}
+
+}  // namespace
+
+void add_export(CLI::App& app, Work& work) {
+  const auto options = std::make_shared<ExportOptions>();
+  auto* const command = app.add_subcommand("export", "Write the visible rows and columns of a table, as a grid does");
+  command->add_option("--from", options->table, "The table, comma-separated; its first line, the header, is row 0")
+      ->required()
+      ->type_name("FILE");
+  command->add_option("--hide", options->hidden, "Columns to leave out, counted from 1: 2,5")
+      ->delimiter(',')
+      ->allow_extra_args(false)
+      ->type_name("COLUMNS");
+  command->add_option("--rows", options->rows, "The rows to write, for example 3-7; default: all")
+      ->type_name("FIRST-LAST");
+  command->add_option("FILE", options->output, "The file to write, comma-separated")->required();
+  choose(*command, work, options, &export_table);
 }
 
 }  // namespace talutil::cli

@@ -1,15 +1,19 @@
 #include <algorithm>
 #include <iostream>
 
-#include "cli/commands.hpp"
 #include "cli/entries.hpp"
 #include "cli/json.hpp"
+#include "cli/options.hpp"
 #include "cli/session.hpp"
 #include "texts/member_texts.hpp"
 
 namespace talutil::cli {
 
 namespace {
+
+struct ListOptions {
+  bool json = false;
+};
 
 std::string flag(bool value) { return value ? "true" : "false"; }
 
@@ -44,8 +48,6 @@ void print_line(const Entry& entry) {
   std::cout << line << signature(entry) << '\n';
 }
 
-}  // namespace
-
 void list(const ListOptions& options) {
   const std::vector<Entry> entries = entries_of(Session::members().members);
   if (!options.json) {
@@ -59,6 +61,15 @@ void list(const ListOptions& options) {
     separator = ",\n";
   }
   std::cout << (entries.empty() ? "[]\n" : "\n]\n");
+}
+
+}  // namespace
+
+void add_list(CLI::App& app, Work& work) {
+  const auto options = std::make_shared<ListOptions>();
+  auto* const command = app.add_subcommand("list", "List every member with its access and signature");
+  command->add_flag("--json", options->json, "As a JSON array");
+  choose(*command, work, options, &list);
 }
 
 }  // namespace talutil::cli

@@ -6,14 +6,20 @@
 #include <iostream>
 #include <thread>
 
-#include "cli/commands.hpp"
 #include "cli/failure.hpp"
+#include "cli/options.hpp"
 #include "platform/posix/descriptor.hpp"
 #include "platform/posix/posix_files.hpp"
 
 namespace talutil::cli {
 
 namespace {
+
+struct LogTailOptions {
+  std::string path;  ///< The event log, or its folder.
+  std::int64_t lines = 10;
+  bool follow = false;
+};
 
 /// Reads part of a file.
 std::string read_part(const posix::Descriptor& file, std::int64_t begin, std::int64_t end) {
@@ -80,8 +86,6 @@ Text log_path(const std::string& given) {
   return is_folder() ? path + u"/EventLog.txt" : path;
 }
 
-}  // namespace
-
 void log_tail(const LogTailOptions& options) {
   if (options.lines < 1) throw usage_failure("--lines " + std::to_string(options.lines) + ": write 1 or more");
   const Text path = log_path(options.path);
@@ -94,6 +98,19 @@ void log_tail(const LogTailOptions& options) {
   const std::int64_t size = size_of(file);
   print_lines(read_part(file, begin_of_last_lines(file, size, options.lines), size));
   if (options.follow) follow(file, size);
+}
+
+}  // namespace
+
+void add_log(CLI::App& app, Work& work) {
+  const auto options = std::make_shared<LogTailOptions>();
+  auto* const command = app.add_subcommand("log", "Show an event log");
+  command->require_subcommand(1);
+  auto* const tail = command->add_subcommand("tail", "Print the last events, oldest first");
+  tail->add_option("PATH", options->path, "EventLog.txt, or its folder (C:\\TAL\\ORV3)")->required();
+  tail->add_option("-n,--lines", options->lines, "How many lines; default: 10");
+  tail->add_flag("-f,--follow", options->follow, "Continue with new events as they are added");
+  choose(*tail, work, options, &log_tail);
 }
 
 }  // namespace talutil::cli

@@ -1,9 +1,9 @@
 #include <algorithm>
 #include <filesystem>
 
-#include "cli/commands.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
+#include "cli/options.hpp"
 #include "controls/grid.hpp"
 #include "controls/print_control.hpp"
 #include "platform/posix/posix_platform.hpp"
@@ -11,6 +11,14 @@
 namespace talutil::cli {
 
 namespace {
+
+struct ReportOptions {
+  std::string file;  ///< A table (.csv), or a text.
+  std::string title;
+  std::string paper = "A4";
+  bool landscape = false;
+  std::string pdf;  ///< If empty, the file's name with .pdf.
+};
 
 constexpr std::int16_t comma_text = 3;
 
@@ -43,8 +51,6 @@ void add_table(PrintControl& print, const Platform& platform, const std::string&
   print.put_RenderControl(0);
 }
 
-}  // namespace
-
 void report(const ReportOptions& options) {
   posix::PosixPlatform posix_platform;
   const Platform platform = posix_platform.platform();
@@ -73,6 +79,21 @@ void report(const ReportOptions& options) {
   } catch (const RunTimeError& error) {
     throw run_time_failure(output + ": " + error_words(error));
   }
+}
+
+}  // namespace
+
+void add_report(CLI::App& app, Work& work) {
+  const auto options = std::make_shared<ReportOptions>();
+  auto* const command = app.add_subcommand("report", "Lay out a table or a text on pages and write them as PDF");
+  command
+      ->add_option("FILE", options->file, "A comma-separated table (.csv, with headings in the first line) or a text")
+      ->required();
+  command->add_option("--title", options->title, "The header of every page; default: the file's name");
+  command->add_option("--paper", options->paper, "A4 or A3")->check(CLI::IsMember({"A4", "A3"}));
+  command->add_flag("--landscape", options->landscape, "Use landscape orientation");
+  command->add_option("--pdf", options->pdf, "The file to write; default: FILE with .pdf");
+  choose(*command, work, options, &report);
 }
 
 }  // namespace talutil::cli

@@ -1,13 +1,23 @@
 #include <iostream>
 
-#include "cli/commands.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
+#include "cli/options.hpp"
 #include "cli/session.hpp"
 
 namespace talutil::cli {
 
 namespace {
+
+struct SecretOptions {
+  bool exact = false;  ///< The text is read or printed exactly, without removing or adding a line break.
+};
+
+struct PasswordOptions {
+  std::int16_t length = 16;
+  std::string mix = "all";
+  int count = 1;
+};
 
 /// Standard input without the final line break that echo and here-documents add.
 std::string read_input(bool is_exact) {
@@ -18,8 +28,6 @@ std::string read_input(bool is_exact) {
 }
 
 void print(const Text& text, bool is_exact) { std::cout << to_utf8(text) << (is_exact ? "" : "\n"); }
-
-}  // namespace
 
 void encrypt(const SecretOptions& options) {
   Session session;
@@ -54,6 +62,29 @@ void password(const PasswordOptions& options) {
     return;
   }
   throw usage_failure("--mix " + options.mix + ": there is no such mix; there are digits, letters, all and hex");
+}
+
+}  // namespace
+
+void add_secrets(CLI::App& app, Work& work) {
+  const auto secret = std::make_shared<SecretOptions>();
+  auto* const encrypting = app.add_subcommand("encrypt", "Encrypt the text on standard input, as hosts do");
+  encrypting->add_flag("--exact", secret->exact, "Treat a final line break as part of the text");
+  encrypting->footer("  printf %s \"$secret\" | talutil encrypt");
+  choose(*encrypting, work, secret, &encrypt);
+  auto* const decrypting = app.add_subcommand("decrypt", "Decrypt the cipher text on standard input");
+  decrypting->add_flag("--exact", secret->exact, "Print no line break after the text");
+  choose(*decrypting, work, secret, &decrypt);
+
+  const auto options = std::make_shared<PasswordOptions>();
+  auto* const making = app.add_subcommand("password", "Print a random password");
+  making->add_option("--length", options->length, "Its length")->check(CLI::Range(1, 32767))->capture_default_str();
+  making->add_option("--mix", options->mix, "The characters: digits, letters (and symbols), all or hex")
+      ->capture_default_str();
+  making->add_option("--count", options->count, "How many, one per line")
+      ->check(CLI::Range(1, 1'000'000))
+      ->capture_default_str();
+  choose(*making, work, options, &password);
 }
 
 }  // namespace talutil::cli

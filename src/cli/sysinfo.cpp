@@ -1,16 +1,21 @@
 #include <array>
 #include <iostream>
 
-#include "cli/commands.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
 #include "cli/json.hpp"
+#include "cli/options.hpp"
 #include "infoforms/system_report.hpp"
 #include "platform/posix/posix_platform.hpp"
 
 namespace talutil::cli {
 
 namespace {
+
+struct SystemOptions {
+  bool json = false;
+  std::string item;  ///< A file or folder to show details of; empty for none.
+};
 
 std::string date_json(const std::optional<Date>& date) {
   return date ? json::text(format_date(*date, u"YYYY-MM-DD HH:MM")) : "null";
@@ -68,8 +73,6 @@ std::string machine_json(const Platform& platform, const Text& item) {
   return json::object(fields);
 }
 
-}  // namespace
-
 void system_information(const SystemOptions& options) {
   posix::PosixPlatform posix_platform;
   const Platform platform = posix_platform.platform();
@@ -88,6 +91,17 @@ void system_information(const SystemOptions& options) {
   } catch (const RunTimeError& error) {
     throw run_time_failure(options.item + ": " + error_words(error));
   }
+}
+
+}  // namespace
+
+void add_system(CLI::App& app, Work& work) {
+  const auto options = std::make_shared<SystemOptions>();
+  auto* const command =
+      app.add_subcommand("sysinfo", "Print information about the machine, and about a file or folder if given");
+  command->add_option("PATH", options->item, "A file or folder (C:\\TAL, /var/log)");
+  command->add_flag("--json", options->json, "Print JSON, with sizes in bytes and times in seconds");
+  choose(*command, work, options, &system_information);
 }
 
 }  // namespace talutil::cli

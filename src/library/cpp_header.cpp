@@ -7,6 +7,7 @@
 #include "library/identity.hpp"
 #include "library/interface_table.hpp"
 #include "library/version.hpp"
+#include "texts/member_texts.hpp"
 
 namespace talutil {
 
@@ -71,8 +72,8 @@ std::string sentence(std::string_view heading, const Member& member, Condition c
 }
 
 /// The help, with what the types do not say: which arguments a call changes, and what late-bound callers may leave out.
-std::string description(const Member& member) {
-  std::string text(member.help);
+std::string description(const Member& member, std::string_view summary) {
+  std::string text(summary);
   text += sentence("Changes", member, [](const Parameter& p) { return p.passing == Passing::written_back; });
   for (const Parameter& parameter : member.parameters()) {
     if (!parameter.is_optional) continue;
@@ -127,11 +128,14 @@ void write_identifier(std::string& out, std::string_view name, std::string_view 
   out += "}};\n";
 }
 
-void write_interface(std::string& out, std::string_view name, std::string_view help, std::span<const Member> members) {
-  out += "\n/// " + std::string(help) + "\nstruct _" + std::string(name) + " : IDispatch {\n";
+void write_interface(std::string& out, std::string_view name, std::span<const Member> members) {
+  const texts::ClassText& text = texts::text_of(name);
+  out += '\n';
+  write_lines(out, "/// ", text.text.summary);
+  out += "struct _" + std::string(name) + " : IDispatch {\n";
   for (const Member& member : members) {
     if (&member != members.data()) out += '\n';
-    write_lines(out, "  /// ", description(member));
+    write_lines(out, "  /// ", description(member, texts::text_of(text, member.name).summary));
     write_function(out, member);
   }
   out += "};\n";
@@ -162,9 +166,8 @@ std::string cpp_header() {
   out +=
       "\n/// A rectangle. The library's other records are the platform's own: SYSTEMTIME, FILETIME and GUID.\n"
       "struct TRect {\n  long left;\n  long Top;\n  long Right;\n  long Bottom;\n};\n";
-  write_interface(out, "ORVUtils", "The common toolkit. All objects of a process share their settings.",
-                  described<ORVUtils>);
-  write_interface(out, "cControlPosition", "A control that can be moved at run time.", described<cControlPosition>);
+  write_interface(out, "ORVUtils", described<ORVUtils>);
+  write_interface(out, "cControlPosition", described<cControlPosition>);
   return out + "\n}  // namespace TALUtil\n";
 }
 
