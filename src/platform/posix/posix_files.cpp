@@ -17,6 +17,7 @@
 #include "platform/file_names.hpp"
 #include "platform/posix/descriptor.hpp"
 #include "platform/posix/replacement.hpp"
+#include "platform/posix/streams.hpp"
 
 namespace talutil::posix {
 
@@ -120,6 +121,18 @@ class PosixOutputFile final : public OutputFile {
   Replacement replacement_;
 };
 
+/// What is no file cannot be replaced, only written to.
+class StreamOutput final : public OutputFile {
+ public:
+  explicit StreamOutput(Descriptor stream) : stream_(std::move(stream)) {}
+
+  void write(std::string_view bytes) override { write_all(stream_, bytes); }
+  void close() override {}
+
+ private:
+  Descriptor stream_;
+};
+
 }  // namespace
 
 std::uint32_t attributes_by_status(std::string_view name, const struct stat& status) {
@@ -205,7 +218,13 @@ std::unique_ptr<InputFile> PosixFiles::open_input(const Text& path) {
 
 std::unique_ptr<OutputFile> PosixFiles::open_output(const Text& path) {
   require_file_name(path);
-  return std::make_unique<PosixOutputFile>(paths_.native(path));
+  const std::string native_path = paths_.native(path);
+  if (allows_streams_) {
+    if (Descriptor stream = open_stream(native_path); stream.get() >= 0) {
+      return std::make_unique<StreamOutput>(std::move(stream));
+    }
+  }
+  return std::make_unique<PosixOutputFile>(native_path);
 }
 
 void PosixFiles::append(const Text& path, std::string_view bytes) {

@@ -18,6 +18,10 @@ class PosixFiles final : public Files {
   using Progress = std::function<void(std::uint64_t done, std::uint64_t total)>;
   void set_progress(Progress progress) { progress_ = std::move(progress); }
 
+  /// Lets output go to pipes, devices and the process's own streams as it comes; see open_stream. Members of the
+  /// library refuse them, as they refuse the platform's devices.
+  void allow_streams() noexcept { allows_streams_ = true; }
+
   [[nodiscard]] std::string native(const Text& path) const { return paths_.native(path); }
 
   void search(const Text& pattern, std::uint32_t mask, const std::function<bool(TextView name)>& found) override;
@@ -32,6 +36,7 @@ class PosixFiles final : public Files {
  private:
   DrivePaths paths_;
   Progress progress_;
+  bool allows_streams_ = false;
 };
 
 }  // namespace talutil::posix
