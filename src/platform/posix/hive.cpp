@@ -3,6 +3,7 @@
 #include <fcntl.h>
 #include <sqlite3.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <filesystem>
 
@@ -74,6 +75,7 @@ void Hive::bind_tree(const Statement& statement, TextView key) const {
 
 void Hive::open() {
   if (database_) return;
+  if (access(path_.c_str(), R_OK) == 0 && access(path_.c_str(), W_OK) != 0) return open_read_only();
   std::error_code ignored;  // If this fails, SQLite reports below that it cannot open the file.
   std::filesystem::create_directories(std::filesystem::path(path_).parent_path(), ignored);
   // Only for the user, unlike other files; SQLite gives its own files the same rights.
@@ -94,6 +96,34 @@ void Hive::open() {
           PRIMARY KEY (folded_key, folded_name)) WITHOUT ROWID;
         CREATE TABLE IF NOT EXISTS hive_keys (folded_key BLOB PRIMARY KEY, key BLOB) WITHOUT ROWID;)";
     require(sqlite3_exec(handle, preparation, nullptr, nullptr, nullptr), SQLITE_OK);
+  } catch (...) {
+    database_.reset();
+    throw;
+  }
+}
+
+/// A store that this user may only read. Where its folder does not allow the write-ahead log's index either, nobody who
+/// writes can be noticed, and the file is taken as it is.
+void Hive::open_read_only() {
+  const std::string folder = std::filesystem::path(path_).parent_path().string();
+  const bool allows_index = access(folder.empty() ? "." : folder.c_str(), W_OK) == 0;
+  std::string name = "file:";
+  for (const char c : path_) {
+    constexpr std::string_view special = "?#%";
+    constexpr std::string_view digits = "0123456789ABCDEF";
+    const auto code = static_cast<unsigned char>(c);
+    if (special.find(c) == std::string_view::npos)
+      name += c;
+    else
+      name.append(1, '%').append(1, digits[code >> 4U]).append(1, digits[code & 15U]);
+  }
+  name += allows_index ? "?mode=ro" : "?immutable=1";
+  sqlite3* handle = nullptr;
+  const int status = sqlite3_open_v2(name.c_str(), &handle, SQLITE_OPEN_READONLY | SQLITE_OPEN_URI, nullptr);
+  database_.reset(handle);
+  try {
+    require(status, SQLITE_OK);
+    sqlite3_busy_timeout(handle, longest_wait_in_milliseconds);
   } catch (...) {
     database_.reset();
     throw;
@@ -136,6 +166,15 @@ void Hive::put(TextView key, TextView name, const Value& value) {
   // The reset discards the error message, so check first.
   require(status, SQLITE_DONE);
   sqlite3_reset(row);
+}
+
+bool Hive::remove(TextView key, TextView name) {
+  open();
+  const Statement statement = prepare("DELETE FROM hive_values WHERE folded_key = ?1 AND folded_name = ?2");
+  bind(statement, 1, folded(key));
+  bind(statement, 2, folded(name));
+  require(sqlite3_step(statement.get()), SQLITE_DONE);
+  return sqlite3_changes(database_.get()) > 0;
 }
 
 std::vector<Hive::NamedValue> Hive::values_below(TextView key) {

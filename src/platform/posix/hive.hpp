@@ -39,6 +39,9 @@ class Hive {
   [[nodiscard]] std::optional<Value> value(TextView key, TextView name);
   void put(TextView key, TextView name, const Value& value);
 
+  /// Returns whether there was such a value.
+  bool remove(TextView key, TextView name);
+
   /// All values of a key and of the keys below it, sorted by key and name.
   [[nodiscard]] std::vector<NamedValue> values_below(TextView key);
 
@@ -63,6 +66,7 @@ class Hive {
   using Statement = std::unique_ptr<sqlite3_stmt, Finalize>;
 
   void open();
+  void open_read_only();
   [[noreturn]] void fail() const;
   void require(int status, int expected) const;
   [[nodiscard]] Statement prepare(const char* sql) const;

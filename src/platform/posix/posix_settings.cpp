@@ -96,6 +96,10 @@ void PosixProfiles::put(const Text& file, const Text& section, const Text& item,
   }
 }
 
+bool PosixSettingsStore::remove(const Text& application, const Text& section, const Text& key) {
+  return hive_.remove(key_of(application, section), up_to_nul(key));
+}
+
 std::optional<Text> PosixSettingsStore::value(const Text& application, const Text& section, const Text& key) {
   const auto found = hive_.value(key_of(application, section), up_to_nul(key));
   if (!found || found->type != text_type) return std::nullopt;

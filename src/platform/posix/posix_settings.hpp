@@ -36,6 +36,9 @@ class PosixSettingsStore final : public SettingsStore {
   std::optional<Text> value(const Text& application, const Text& section, const Text& key) override;
   void put(const Text& application, const Text& section, const Text& key, const Text& value) override;
 
+  /// Removes a setting; returns whether there was one.
+  bool remove(const Text& application, const Text& section, const Text& key);
+
   /// All settings of an application, by section and key.
   [[nodiscard]] std::vector<Setting> settings_of(const Text& application);
 
