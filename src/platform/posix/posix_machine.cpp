@@ -72,6 +72,8 @@ std::vector<DriveFacts> PosixMachine::drives() {
   struct mntent entry {};
   std::array<char, 4096> buffer{};
   while (getmntent_r(table.get(), &entry, buffer.data(), static_cast<int>(buffer.size())) != nullptr) {
+    const std::string_view type = entry.mnt_type;
+    if (type == "tmpfs" || type == "devtmpfs" || type == "ramfs" || type == "efivarfs") continue;  // Memory.
     struct statvfs status {};
     // File systems without blocks are virtual; one that is mounted twice is listed once.
     if (statvfs(entry.mnt_dir, &status) != 0 || status.f_blocks == 0) continue;
@@ -119,7 +121,9 @@ ItemFacts PosixMachine::item(const Text& path) {
   facts.is_folder = S_ISDIR(status.stx_mode);
   facts.size = facts.is_folder ? 0 : status.stx_size;
   facts.attributes = PosixFiles().attributes(path);
-  if ((status.stx_mask & STATX_BTIME) != 0) facts.created = local_date(status.stx_btime);
+  // Some file systems have the field, but nothing in it.
+  if ((status.stx_mask & STATX_BTIME) != 0 && status.stx_btime.tv_sec != 0)
+    facts.created = local_date(status.stx_btime);
   facts.modified = local_date(status.stx_mtime);
   facts.accessed = local_date(status.stx_atime);
   return facts;
