@@ -23,7 +23,7 @@ Text without_separators_at_end(Text path) {
 
 }  // namespace
 
-void Collection::add(const Text& item, bool recurse, bool keep_folders) {
+bool Collection::add(const Text& item, bool recurse, bool keep_folders) {
   const Text path = without_separators_at_end(item);
   TextView pattern = last_part(path);
   const Text folder_path = path.substr(0, path.size() - pattern.size());
@@ -32,11 +32,13 @@ void Collection::add(const Text& item, bool recurse, bool keep_folders) {
   places_.push_back({0, is_nameless ? path : folder_path, true});
   const std::size_t place = places_.size() - 1;
   if (is_nameless) pattern = u"*.*";
+  bool has_matched = false;
   try {
     opened_ = open(place);
     opened_place_ = place;
     const auto found = [&](TextView name, const FileFacts& facts) {
       if (name_matches(name, pattern) && !is_archive(*opened_, name)) {
+        has_matched = true;
         add_entry(place, name, facts, {}, recurse, keep_folders);
       }
     };
@@ -48,10 +50,11 @@ void Collection::add(const Text& item, bool recurse, bool keep_folders) {
     }
   } catch (const RunTimeError& error) {
     // A missing path simply matches nothing.
-    if (!is_missing(error)) throw Error(Code::cannot_read, error.what());
-    return;
+    if (!is_missing(error)) throw Error(Code::cannot_read, to_utf8(item) + ": " + error.what());
+    return false;
   }
   walk(keep_folders);
+  return has_matched;
 }
 
 void Collection::add_entry(std::size_t folder, TextView name, const FileFacts& facts, const std::string& prefix,
@@ -74,7 +77,7 @@ void Collection::walk(bool keep_folders) {
   while (!pending_.empty()) {
     const Pending next = std::move(pending_.back());
     pending_.pop_back();
-    with_code(Code::cannot_read, [&] {
+    with_code(Code::cannot_read, from_utf8(next.prefix), [&] {
       const std::unique_ptr<Folder> folder = open(next.folder);
       folder->list([&](TextView name, const FileFacts& facts) {
         if (!is_archive(*folder, name)) add_entry(next.folder, name, facts, next.prefix, true, keep_folders);

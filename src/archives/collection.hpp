@@ -31,8 +31,8 @@ class Collection {
   /// Adds what an item refers to: a file; a folder with its tree, stored under the folder's own name; or, with
   /// wildcards in its last part, the matching files (and folders if `recurse` is set), stored relative to the folder
   /// before the wildcards. With `keep_folders` false, entries have no folder part in their names and folders get no
-  /// entries.
-  void add(const Text& item, bool recurse, bool keep_folders);
+  /// entries. Returns whether anything matched.
+  bool add(const Text& item, bool recurse, bool keep_folders);
 
   [[nodiscard]] const std::vector<Item>& items() const noexcept { return items_; }
 

@@ -4,6 +4,7 @@
 
 #include "archives/archive_error.hpp"
 #include "automation/run_time_error.hpp"
+#include "automation/text.hpp"
 
 namespace talutil::archives {
 
@@ -18,6 +19,16 @@ decltype(auto) with_code(Code code, Work&& work) {
     if (number == ErrorNumber::disk_full) code = Code::cannot_write;
     if (number == ErrorNumber::out_of_memory) code = Code::out_of_memory;
     throw Error(code, error.what());
+  }
+}
+
+/// The same; the error names the file that the operations are on.
+template <class Work>
+decltype(auto) with_code(Code code, TextView file, Work&& work) {
+  try {
+    return with_code(code, std::forward<Work>(work));
+  } catch (const Error& error) {
+    throw Error(error.code(), to_utf8(file) + ": " + error.what());
   }
 }
 

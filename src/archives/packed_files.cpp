@@ -40,10 +40,10 @@ zip_int64_t PackedFiles::serve(void* self, void* data, zip_uint64_t length, zip_
 zip_int64_t PackedFiles::serve(Source& source, void* data, zip_uint64_t length, zip_source_cmd_t command) {
   switch (command) {
     case ZIP_SOURCE_OPEN:
-      with_code(Code::cannot_read, [&] { open(source); });
+      with_code(Code::cannot_read, from_utf8(source.item->entry), [&] { open(source); });
       return 0;
     case ZIP_SOURCE_READ:
-      return with_code(Code::cannot_read, [&] {
+      return with_code(Code::cannot_read, entry_, [&] {
         return read(source, {static_cast<char*>(data), static_cast<std::size_t>(length)});
       });
     case ZIP_SOURCE_CLOSE:

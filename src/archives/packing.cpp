@@ -164,7 +164,11 @@ void pack(const Text& archive, TextView items, const PackingOptions& options, Fo
   if (options.volume_size) require_volume_size(*options.volume_size);
   Target target = open_target(archive, folders);
   Collection collection(folders, {target.folder->path(), target.name});
-  for (const Text& item : read_item_list(items)) collection.add(item, options.recurse, options.keep_folders);
+  for (const Text& item : read_item_list(items)) {
+    const bool has_matched = collection.add(item, options.recurse, options.keep_folders);
+    if (has_matched || !options.needs_every_item) continue;
+    throw Error(Code::nothing_to_do, "there is no \"" + to_utf8(item) + "\"; nothing was packed");
+  }
   if (collection.items().empty()) collection.left_out().throw_if_any();
   if (collection.items().empty()) throw Error(Code::nothing_to_do, "no item matches");
   collection.drop_repeated();

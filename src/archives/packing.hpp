@@ -14,6 +14,7 @@ struct PackingOptions {
   std::int32_t level = 6;                      ///< 0 stores, 1 is fastest, 9 smallest.
   Text password{};                             ///< Empty for none. Its UTF-8 bytes are what other programs need.
   Text comment{};                              ///< The archive's comment, as UTF-8.
+  bool needs_every_item = false;               ///< Packs nothing if an item matches nothing.
   std::optional<std::uint64_t> volume_size{};  ///< Makes a split set.
 };
 

@@ -176,7 +176,7 @@ std::vector<std::unique_ptr<StoredFile>> open_pieces(Folder& folder, const Text&
   for (std::uint32_t number = 1;; ++number) {
     const Text piece = Text(stem_of(name)) + u"." + number_text(number, 3);
     if (!folder.facts(piece)) return pieces;
-    pieces.push_back(with_code(Code::bad_media, [&] { return folder.open(piece); }));
+    pieces.push_back(with_code(Code::bad_media, piece, [&] { return folder.open(piece); }));
   }
 }
 
@@ -360,7 +360,8 @@ std::unique_ptr<StoredFile> open_archive(Folder& folder, const Text& name) {
   if (before == 0) return last;
   std::vector<std::unique_ptr<StoredFile>> volumes;
   for (std::uint32_t number = 1; number <= before; ++number) {
-    volumes.push_back(with_code(Code::bad_media, [&] { return folder.open(volume_name(name, number)); }));
+    const Text volume = volume_name(name, number);
+    volumes.push_back(with_code(Code::bad_media, volume, [&] { return folder.open(volume); }));
   }
   volumes.push_back(std::move(last));
   return std::make_unique<WholeSet>(std::move(volumes));

@@ -231,10 +231,14 @@ class Password {
 
  private:
   void ask(const Text& entry, bool was_wrong) {
-    if (!ask_ || questions_ == most_questions) throw Error(Code::bad_parameters, "the password is missing or wrong");
+    if (!ask_ || questions_ == most_questions)
+      throw Error(Code::bad_parameters, to_utf8(entry) + ": the password is missing or wrong");
     ++questions_;
     const std::optional<Text> answer = ask_(entry, was_wrong);
-    if (!answer) throw Error(Code::cancelled, "no password was given");
+    if (!answer) {
+      throw Error(Code::cancelled,
+                  to_utf8(entry) + (was_wrong ? ": the password is wrong" : ": no password was given"));
+    }
     bytes_ = to_utf8(*answer);
   }
 
@@ -300,20 +304,28 @@ void Archive::extract(const Text& destination, const UnpackingOptions& options, 
   Destination target(folders, files, destination);
   Password password(options.password, ask);
   PassedOver passed_over;
+  const auto pass_over = [&](const Text& name, const char* reason, Code code = Code::incomplete) {
+    passed_over.add(name, code, reason);
+    if (options.notice) options.notice(name, Fate::left_out, reason);
+  };
   for_each_entry(*this, reader_->size(), options, progress, [&](std::uint64_t index, const Entry& entry) {
     if (is_destination(entry.name)) return;
     auto parts = safe_parts(entry.name);
-    if (!parts || entry.facts.kind == FileKind::link) return passed_over.add(entry.name);
+    if (!parts) return pass_over(entry.name, "no file here can have this name");
+    if (entry.facts.kind == FileKind::link) return pass_over(entry.name, "links are not unpacked");
     // One bad entry is no reason to lose the others.
     try {
       if (entry.facts.kind == FileKind::folder) {
-        if (options.keep_folders && !target.make_folder(*parts, entry.facts)) passed_over.add(entry.name);
+        if (options.keep_folders && !target.make_folder(*parts, entry.facts)) {
+          pass_over(entry.name, "a file or a link is in its place");
+        }
         return;
       }
       if (!options.keep_folders) parts->erase(parts->begin(), parts->end() - 1);
       std::unique_ptr<NewFile> file;
       const auto answer = target.create(*parts, options.overwrite, file);
-      if (answer == Destination::Answer::refused) passed_over.add(entry.name);
+      if (answer == Destination::Answer::refused) pass_over(entry.name, "something else is in its place");
+      if (answer == Destination::Answer::kept && options.notice) options.notice(entry.name, Fate::kept, {});
       if (answer != Destination::Answer::made) return;
       password.with(entry, [&](const std::string& bytes) {
         std::uint64_t place = 0;
@@ -329,7 +341,7 @@ void Archive::extract(const Text& destination, const UnpackingOptions& options, 
       });
     } catch (const Error& error) {
       if (!concerns_one_entry(error.code())) throw;
-      passed_over.add(entry.name, error.code(), error.what());
+      pass_over(entry.name, error.what(), error.code());
     }
   });
   target.finish_folders();
@@ -350,7 +362,11 @@ void Archive::test(const UnpackingOptions& options, const PasswordQuestion& ask,
       });
     } catch (const Error& error) {
       const bool is_damage = error.code() == Code::bad_structure || error.code() == Code::unexpected_end;
-      throw Error(is_damage ? Code::bad_test : error.code(), to_utf8(entry.name) + ": " + error.what());
+      // The question about the password names the entry already.
+      const std::string name = to_utf8(entry.name) + ": ";
+      const std::string_view reason = error.what();
+      throw Error(is_damage ? Code::bad_test : error.code(),
+                  (reason.starts_with(name) ? "" : name) + std::string(reason));
     }
   });
 }

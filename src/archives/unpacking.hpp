@@ -12,6 +12,12 @@ namespace talutil::archives {
 /// the user cancelled.
 using PasswordQuestion = std::function<std::optional<Text>(const Text& entry, bool was_wrong)>;
 
+/// What became of an entry that was not unpacked.
+enum class Fate : std::uint8_t { kept, left_out };
+
+/// Is told of each entry that is not unpacked: because a file of its name is kept, or for the given reason.
+using UnpackingNotice = std::function<void(const Text& entry, Fate fate, std::string_view reason)>;
+
 struct UnpackingOptions {
   Text items{};  ///< Selects entries; see EntryFilter.
   Text password{};
@@ -21,6 +27,7 @@ struct UnpackingOptions {
   /// archive's own size. Deflate cannot exceed the usual multiple, so that only claims that are not true do.
   std::uint64_t largest_total = 0;
   std::uint32_t largest_ratio = 1100;
+  UnpackingNotice notice{};
 };
 
 /// An archive, or a split set (given by its last volume), open for reading. Throws Error.
