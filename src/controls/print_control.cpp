@@ -77,7 +77,7 @@ ReportComposer& PrintControl::composer() {
 }
 
 void PrintControl::StartDoc() {
-  constexpr float header_points = 10;
+  constexpr float largest_footer = 10;
   constexpr std::int32_t smallest_room = 720;
   PageSetup setup;
   setup.width = PageWidth();
@@ -93,7 +93,8 @@ void PrintControl::StartDoc() {
     raise(ErrorNumber::invalid_procedure_call);
   }
   setup.header = Header;
-  setup.header_font = {family_of(HeaderFontName), false, header_points};
+  setup.header_font = {family_of(HeaderFontName), is_header_bold_, header_points_};
+  setup.footer_font = FontStyle{family_of(HeaderFontName), false, std::min(header_points_, largest_footer)};
   setup.has_rule = HeaderRule == 1;
   setup.footer = format_date(platform_.clock.now(), u"DD/MM/YYYY");
   setup.wraps_words = bool(WordWrap);

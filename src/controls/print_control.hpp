@@ -94,6 +94,15 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   /// it, because a host may begin the next document meanwhile.
   [[nodiscard]] const std::shared_ptr<const Document>& document() const noexcept { return document_; }
 
+  /// The size and weight of the next document's header; footers have 10 points or less.
+  void set_header_style(float points, bool is_bold) noexcept {
+    header_points_ = points;
+    is_header_bold_ = is_bold;
+  }
+
+  /// The widths of characters that its documents are laid out with.
+  [[nodiscard]] FontMetrics& metrics() noexcept { return metrics_; }
+
   [[nodiscard]] const Page* shown_page() const override;
   [[nodiscard]] float zoom_percent() const override { return zoom_; }
   [[nodiscard]] std::optional<TwipsRectangle> guides() const override;
@@ -106,6 +115,8 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   FontMetrics metrics_;
   std::optional<ReportComposer> composer_;
   std::shared_ptr<const Document> document_;
+  float header_points_ = 10;
+  bool is_header_bold_ = false;
   float zoom_ = 100;
   std::int32_t paper_size_ = 9;
   std::int32_t orientation_ = 0;

@@ -18,8 +18,6 @@ FontMetrics::~FontMetrics() = default;
 bool FontMetrics::is_wide(char16_t unit) noexcept { return unit >= 0x80 && chr(ansi_code(unit)).front() != unit; }
 
 std::int32_t FontMetrics::width(char16_t unit, const FontStyle& font) {
-  constexpr bool is_fixed = true;
-  constexpr std::int32_t missing_character = 600;
   if (!library_) library_ = std::make_unique<Library>(files_);
   if (unit < 0x80 || !is_wide(unit)) {
     auto& widths = widths_[font_index(font.family, font.is_bold)];
@@ -32,14 +30,35 @@ std::int32_t FontMetrics::width(char16_t unit, const FontStyle& font) {
     }
     return widths[ansi_code(unit)];
   }
-  const bool fixed = font.family == FontFamily::courier ? is_fixed : !is_fixed;
-  auto& known = wide_widths_[fixed ? 1 : 0];
-  const auto found = known.find(unit);
-  if (found != known.end()) return found->second;
-  const HPDF_Font wide = library_->document.wide_font(fixed);
-  const std::int32_t width =
-      wide == nullptr ? missing_character : static_cast<std::int32_t>(HPDF_Font_GetUnicodeWidth(wide, unit));
-  return known[unit] = std::max(width, 0);
+  return wide(unit, font).width;
+}
+
+const FontMetrics::Wide& FontMetrics::wide(char16_t unit, const FontStyle& font) {
+  constexpr std::int32_t missing_character = 600;
+  auto& known = wide_[static_cast<std::size_t>(font.family)];
+  if (const auto found = known.find(unit); found != known.end()) return found->second;
+  if (!library_) library_ = std::make_unique<Library>(files_);
+  PdfDocument& document = library_->document;
+  Wide wide{.family = font.family};
+  const bool is_fixed = font.family == FontFamily::courier;
+  const WideFont first = is_fixed ? WideFont::fixed : WideFont::proportional;
+  const WideFont second = is_fixed ? WideFont::proportional : WideFont::fixed;
+  WideFont which = first;
+  if (!document.has_shape(first, unit)) {
+    if (document.has_shape(second, unit)) {
+      which = second;
+      wide.family = is_fixed ? FontFamily::helvetica : FontFamily::courier;
+    } else if (document.has_shape(WideFont::named, unit)) {
+      which = WideFont::named;
+      wide.is_named_font = true;
+    } else {
+      wide.is_missing = true;
+    }
+  }
+  const HPDF_Font embedded = document.wide_font(which);
+  wide.width = embedded == nullptr ? missing_character
+                                   : std::max(0, static_cast<std::int32_t>(HPDF_Font_GetUnicodeWidth(embedded, unit)));
+  return known[unit] = wide;
 }
 
 double FontMetrics::width(TextView text, const FontStyle& font) {

@@ -24,8 +24,18 @@ class FontMetrics {
   /// The width of a text on one line, in twips.
   [[nodiscard]] double width(TextView text, const FontStyle& font);
 
-  /// Whether a character needs the embedded font.
+  /// Whether a character needs an embedded font.
   [[nodiscard]] static bool is_wide(char16_t unit) noexcept;
+
+  /// How such a character is drawn: in the embedded font that fits the style if that has it, otherwise in the other
+  /// one, otherwise in the font that was named for it. If none has it, the first shows a box.
+  struct Wide {
+    FontFamily family = FontFamily::courier;
+    bool is_named_font = false;
+    bool is_missing = false;
+    std::int32_t width = 0;
+  };
+  [[nodiscard]] const Wide& wide(char16_t unit, const FontStyle& font);
 
  private:
   struct Library;
@@ -33,7 +43,7 @@ class FontMetrics {
   FontFiles& files_;
   std::unique_ptr<Library> library_;
   std::array<std::array<std::uint16_t, 256>, 6> widths_{};  ///< By code, per family and weight.
-  std::unordered_map<char16_t, std::int32_t> wide_widths_[2];
+  std::unordered_map<char16_t, Wide> wide_[3];              ///< By family.
 };
 
 /// The substitute for a named font: Courier for fixed width, Times for serifs, otherwise Helvetica.

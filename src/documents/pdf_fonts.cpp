@@ -19,11 +19,11 @@ HPDF_Font PdfDocument::standard_font(FontFamily family, bool is_bold) {
   return standard_[index];
 }
 
-HPDF_Font PdfDocument::wide_font(bool is_fixed_width) {
-  WideFont& wide = wide_[is_fixed_width ? 1 : 0];
+HPDF_Font PdfDocument::wide_font(WideFont which) {
+  Embedded& wide = wide_[static_cast<std::size_t>(which)];
   if (wide.is_sought) return wide.font;
   wide.is_sought = true;
-  const auto bytes = files_.wide_font(is_fixed_width);
+  const auto bytes = which == WideFont::named ? files_.named_font() : files_.wide_font(which == WideFont::fixed);
   if (bytes.empty()) return nullptr;
   const char* const name =
       HPDF_LoadTTFontFromMem(document_, bytes.data(), static_cast<HPDF_UINT>(bytes.size()), HPDF_TRUE);
@@ -31,6 +31,12 @@ HPDF_Font PdfDocument::wide_font(bool is_fixed_width) {
   // Treat a font that is unusable, or already loaded under that name, as missing.
   if (wide.font == nullptr) HPDF_ResetError(document_);
   return wide.font;
+}
+
+bool PdfDocument::has_shape(WideFont which, char16_t unit) {
+  const HPDF_Font font = wide_font(which);
+  if (font == nullptr) return false;
+  return HPDF_TTFontDef_GetGlyphid(static_cast<HPDF_FontAttr>(font->attr)->fontdef, unit) != 0;
 }
 
 void PdfDocument::check() const {

@@ -9,6 +9,9 @@
 
 namespace talutil {
 
+/// The embedded fonts, for characters that code page 1252 lacks.
+enum class WideFont : std::uint8_t { proportional, fixed, named };
+
 /// A document of the PDF library and the fonts used in it.
 class PdfDocument {
  public:
@@ -24,13 +27,16 @@ class PdfDocument {
   [[nodiscard]] HPDF_Font standard_font(FontFamily family, bool is_bold);
 
   /// An embedded font for all other characters, for text in UTF-8; null if the platform has none.
-  [[nodiscard]] HPDF_Font wide_font(bool is_fixed_width);
+  [[nodiscard]] HPDF_Font wide_font(WideFont which);
+
+  /// Whether an embedded font has a shape for a character.
+  [[nodiscard]] bool has_shape(WideFont which, char16_t unit);
 
   /// Raises 7 or 51 if the library has failed in the meantime.
   void check() const;
 
  private:
-  struct WideFont {
+  struct Embedded {
     bool is_sought = false;
     HPDF_Font font = nullptr;
   };
@@ -38,7 +44,7 @@ class PdfDocument {
   FontFiles& files_;
   HPDF_Doc document_;
   std::array<HPDF_Font, 6> standard_{};
-  std::array<WideFont, 2> wide_;
+  std::array<Embedded, 3> wide_;
 };
 
 /// The index of a family and weight among the six standard fonts.

@@ -24,6 +24,11 @@ constexpr Rgb rgb_of(std::uint32_t colour) noexcept {
   return {part(0), part(8), part(16)};
 }
 
+WideFont wide_font_of(const TextRun& run) noexcept {
+  if (run.is_named_font) return WideFont::named;
+  return run.font.family == FontFamily::courier ? WideFont::fixed : WideFont::proportional;
+}
+
 /// What every report is written in, whatever its data.
 constexpr const char* language = "en-GB";
 
@@ -74,7 +79,7 @@ class PageWriter {
   void draw(const TextRun& run) {
     if (is_outside(run.left, run.top)) return;
     HPDF_Font font = nullptr;
-    if (run.is_wide) font = pdf_.wide_font(run.font.family == FontFamily::courier);
+    if (run.is_wide) font = pdf_.wide_font(wide_font_of(run));
     const bool is_wide = font != nullptr;
     if (!is_wide) font = pdf_.standard_font(run.font.family, run.font.is_bold);
     const Rgb colour = rgb_of(run.colour);

@@ -67,11 +67,21 @@ std::int32_t ReportComposer::add_runs(TextView text, std::int32_t left, std::int
   double x = left;
   for (std::size_t start = 0; start < text.size();) {
     const bool is_wide = FontMetrics::is_wide(text[start]);
+    const auto first = is_wide ? metrics_.wide(text[start], font) : FontMetrics::Wide{.family = font.family};
+    const auto continues = [&](char16_t unit) {
+      if (FontMetrics::is_wide(unit) != is_wide) return false;
+      if (!is_wide) return true;
+      const auto& next = metrics_.wide(unit, font);
+      return next.family == first.family && next.is_named_font == first.is_named_font;
+    };
     std::size_t end = start + 1;
-    while (end < text.size() && FontMetrics::is_wide(text[end]) == is_wide) ++end;
+    while (end < text.size() && continues(text[end])) ++end;
     const TextView run = text.substr(start, end - start);
     const double width = metrics_.width(run, font);
-    page().items.emplace_back(TextRun{rounded(x), top, rounded(width), font, is_wide, colour, Text(run)});
+    FontStyle style = font;
+    style.family = first.family;
+    page().items.emplace_back(
+        TextRun{rounded(x), top, rounded(width), style, is_wide, colour, Text(run), first.is_named_font});
     x += width;
     start = end;
   }
@@ -239,7 +249,7 @@ void ReportComposer::add_header(const HeaderLines& header) {
 }
 
 void ReportComposer::add_footer(std::size_t page_index) {
-  const FontStyle& font = setup_.header_font;
+  const FontStyle font = setup_.footer_font.value_or(setup_.header_font);
   const std::int32_t top = setup_.bottom() + line_height(font);
   const std::int32_t date_end = add_runs(setup_.footer, setup_.margin_left, top, font);
   const Text number = u"Page " + number_to_text(static_cast<std::int32_t>(page_index + 1)) + u" of " +

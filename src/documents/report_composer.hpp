@@ -1,5 +1,7 @@
 #pragma once
 
+#include <optional>
+
 #include "automation/numbers.hpp"
 #include "documents/font_metrics.hpp"
 #include "platform/page_model.hpp"
@@ -20,7 +22,8 @@ struct PageSetup {
   /// in letters of 6 points is its middle left out.
   Text header;
   FontStyle header_font;
-  bool has_rule = true;  ///< A rule below the header.
+  std::optional<FontStyle> footer_font;  ///< If none, that of the header.
+  bool has_rule = true;                  ///< A rule below the header.
   /// On the left, below the bottom margin; the page number is on the right, the columns of a divided grid in the
   /// middle.
   Text footer;

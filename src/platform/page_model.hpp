@@ -55,6 +55,7 @@ struct TextRun {
   bool is_wide = false;  ///< Has characters that code page 1252 lacks, drawn in another font.
   std::uint32_t colour = 0;
   Text text;
+  bool is_named_font = false;  ///< A wide run in the font that was named for it; see FontFiles.
 };
 
 /// A filled area, a frame, or both; with zero height or width, a rule.

@@ -91,6 +91,13 @@ class PosixDrawing final : public Drawing {
 class PosixFontFiles final : public FontFiles {
  public:
   [[nodiscard]] std::vector<std::uint8_t> wide_font(bool is_fixed_width) override;
+  [[nodiscard]] std::vector<std::uint8_t> named_font() override { return named_; }
+
+  /// Names a font for the characters that the system's lack, by its contents.
+  void name_font(std::vector<std::uint8_t> bytes) { named_ = std::move(bytes); }
+
+ private:
+  std::vector<std::uint8_t> named_;
 };
 
 /// The library that prints windows exists on Windows only.
