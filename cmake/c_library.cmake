@@ -1,9 +1,9 @@
 # libtalutil.so: the core for C and whatever can call C. Its typed functions are generated from the interface table.
 include(GNUInstallDirs)
 
-add_executable(write_c_interface tools/write_c_interface.cpp)
+add_executable(write_c_interface tools/write_c_interface.cpp src/texts/member_texts.cpp ${member_texts})
 target_link_libraries(write_c_interface PRIVATE talutil_options)
-foreach(layer library controls documents archives platform automation)
+foreach(layer library controls documents archives platform texts automation)
   target_include_directories(write_c_interface PRIVATE ${CMAKE_BINARY_DIR}/layers/${layer})
 endforeach()
 set(c_interface ${CMAKE_BINARY_DIR}/generated)
@@ -15,7 +15,7 @@ add_custom_command(
   DEPENDS write_c_interface
   COMMENT "Writing the typed functions of the C library")
 
-talutil_layer(capi BELOW calling posix)
+talutil_layer(capi BELOW calling posix FAST ALL)
 target_include_directories(layer_capi PRIVATE ${c_interface} src/capi)
 target_sources(layer_capi PRIVATE ${c_interface}/talutil_members.cpp ${c_interface}/talutil_members.h)
 add_library(talutil_c SHARED)

@@ -6,6 +6,7 @@
 #include <string_view>
 
 #include "library/interface_table.hpp"
+#include "texts/member_texts.hpp"
 
 namespace {
 
@@ -62,7 +63,7 @@ std::string default_of(const Parameter& parameter) {
 }
 
 std::string comment(const Member& member) {
-  std::string text = "/* " + std::string(member.help);
+  std::string text = "/* " + std::string(texts::text_of(texts::text_of("ORVUtils"), member.name).summary);
   for (const Parameter& parameter : member.parameters()) {
     if (parameter.is_optional)
       text += " By default, " + std::string(parameter.name) + " is " + default_of(parameter) + ".";

@@ -142,7 +142,7 @@ expect_part 'list: property' 0 "${nl}get put  sUserName As String${nl}" list
 expect_part 'list: method' 0 \
   "${nl}call     ReadCommaDelimStrToList(sTemp As String, ByRef sFList As String(), [sDelimiter As String = \",\"]) As Long${nl}" list
 verdict 'each name once' '' "$("$talutil" list | cut -c10- | sed 's/[( ].*//' | sort | uniq -d)"
-expect_part 'help: written back, default' 0 'sDelimiter  String; "," when left out' help readcommadelimstrtolist
+expect_part 'help: written back, default' 0 'sDelimiter  the delimiter, one character (String; "," when left out)' help readcommadelimstrtolist
 if command -v python3 >/dev/null; then
   verdict 'list --json is JSON' "$("$talutil" list | wc -l)" \
     "$("$talutil" list --json | python3 -c 'import json, sys; print(len(json.load(sys.stdin)))')"

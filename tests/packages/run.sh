@@ -38,9 +38,11 @@ counts() {
 cmake --install "$build" --prefix "$work/usr" >"$work/log" 2>&1 || cat "$work/log"
 library=$(find "$work/usr" -name libtalutil.so.1)
 folder=$(dirname "$library")
-# A library built with sanitizers needs their run-time first.
+# A library built with sanitizers needs their run-time first, and that the C++ library, which Python does not load.
 instrumented=
-if grep -q '^TALUTIL_SANITIZE:BOOL=ON' "$build/CMakeCache.txt"; then instrumented=$(cc -print-file-name=libasan.so); fi
+if grep -q '^TALUTIL_SANITIZE:BOOL=ON' "$build/CMakeCache.txt"; then
+  instrumented="$(cc -print-file-name=libasan.so) $(cc -print-file-name=libstdc++.so)"
+fi
 run() { env LD_LIBRARY_PATH="$folder" LD_PRELOAD="$instrumented" ASAN_OPTIONS="${leaks:-}" "$@"; }
 
 verdict 'the name that programs are linked with' libtalutil.so.1 \
