@@ -208,6 +208,12 @@ def read_example(first, lines, place):
     words = first.split(None, 1)
     shows_window = bool(words) and words[0] == "windows"
     title = " ".join(words[1:]) if shows_window else first
+    for number, line in enumerate(lines, place[1] + 1):
+        if line.endswith("\\"):
+            complain((place[0], number),
+                     f'the line "{line.strip()}" ends with a backslash, and so goes on in the next line for C++')
+        if line.strip() and not line.startswith("     "):
+            complain((place[0], number), f'the line "{line.strip()}" of the example is not indented by four blanks')
     code = [line.rstrip() for line in lines]
     while code and not code[0].strip():
         code.pop(0)
@@ -216,11 +222,6 @@ def read_example(first, lines, place):
     if not code:
         complain(place, "the example is empty")
         return Example(title, "", shows_window)
-    for line in code:
-        if line.endswith("\\"):
-            complain(place, f'the line "{line.strip()}" ends with a backslash, and so goes on in the next line for C++')
-        if line.strip() and not line.startswith("     "):
-            complain(place, f'the line "{line.strip()}" of the example is not indented by four blanks')
     return Example(title, "\n".join(line[5:] for line in code), shows_window)
 
 
@@ -300,7 +301,7 @@ def check_member(row, text):
         complain(place, f"the first sentence of {row.name} has {len(text.summary)} characters; "
                         f"{LONGEST_SUMMARY} fit a help string")
     if not text.summary.isascii():
-        complain(place, f"the first sentence of {row.name} has characters that the type library's compiler does not know")
+        complain(place, f"the first sentence of {row.name} has characters that a help string cannot have")
     if not text.family:
         complain(place, f"{row.name} has no @family")
     if not text.examples:
@@ -358,7 +359,7 @@ def check_references(classes):
                 for i, (item, place) in enumerate(getattr(member, kind)):
                     full = resolved(item, text.name, names)
                     if not full or full in names and kind != "see":
-                        complain(place, f'"@{kind} {item}" leads nowhere; name a member, Class.Member, or a page (docs/...)')
+                        complain(place, f'"@{kind} {item}" leads nowhere; name a member, Class.Member or a page')
                     getattr(member, kind)[i] = (full or item, place)
 
 

@@ -103,7 +103,8 @@ class ORVUtils {
   ///     ' [ ]
   virtual Text RemoveStringsFromNumber(const std::int16_t& iOption, const Text& sTemp, Text& sCharacter);
 
-  /// Replaces each occurrence of one character by a text. Compared is the character's code in the system's code page.
+  /// Replaces each occurrence of one character by a text. Characters are compared by their codes in the system's code
+  /// page.
   /// @param sSrc the text to search; an empty one is returned as it is
   /// @param sChr its first character is replaced
   /// @param sReplace what takes its place; may be empty
@@ -142,14 +143,14 @@ class ORVUtils {
   ///     ' 0809
   virtual Text GetFinancialYearStr(const Variant& vDate);
 
-  /// True if a week's date is in a range, or on the near side of either end. It is False only for a range that runs
-  /// backwards around that date, because the two ends are not both tested: it is True if vFromDate is on or before the
-  /// date, or if vToDate is on or after it. The date is what WeekYearToDate gives for the week with iDay 0.
+  /// True if vFromDate is on or before a week's date, or vToDate is on or after it. So it is False only for a range
+  /// that runs backwards around that date. The date is what WeekYearToDate gives for the week with iDay 0: the first
+  /// day of the following week.
   /// @param vFromDate the first date
   /// @param vToDate the last date
   /// @param iWeek 1 to 52; any other number becomes the nearest of these. Written back.
   /// @param iYear the year of the week
-  /// @raises 13 if a date is none, or the year is not valid
+  /// @raises 13 if vFromDate or vToDate is not a date, or the year is not valid
   /// @raises 94 for Null
   /// @family weeks
   /// @see WeekYearToDate
@@ -240,7 +241,7 @@ class ORVUtils {
   ///     week = 10
   ///     Print u.WeekYearToDate(week, 2009, 0)
   ///     ' 12/03/2009
-  /// @example A week that is none
+  /// @example A week beyond the last
   ///     week = 60
   ///     Print u.GetMonth(u.WeekYearToDate(week, 2009, 2))
   ///     ' 12
@@ -513,7 +514,7 @@ class ORVUtils {
   /// The number of days between two dates, in either order, ignoring times of day; -1 if either is empty.
   /// @param vStartDate a date or the text of one
   /// @param vEndDate another
-  /// @raises 13 if an argument is not a date; Null is none
+  /// @raises 13 if an argument is not a date, or is Null
   /// @raises 6 if one of two different dates is 31/12/9999
   /// @family periods
   /// @see GetMonthsInPeriod
@@ -527,7 +528,7 @@ class ORVUtils {
   /// The number of month boundaries between two dates, in either order; -1 for equal dates, and if either is empty.
   /// @param vStartDate a date or the text of one
   /// @param vEndDate another
-  /// @raises 13 if an argument is not a date; Null is none
+  /// @raises 13 if an argument is not a date, or is Null
   /// @raises 6 if one of two different dates is 31/12/9999
   /// @family periods
   /// @see GetDaysInPeriod
@@ -590,7 +591,7 @@ class ORVUtils {
   /// other word gives "30/12/1899", without an error
   /// @param vIncrement the number of years, months, weeks or days, as a 16-bit integer
   /// @raises 6 if the increment is beyond 16 bits, and as IncYear, IncMonth, IncWeek and IncDay do
-  /// @raises 13 if the date or the increment is none
+  /// @raises 13 if vStartDate is not a date, or vIncrement not a number
   /// @raises 94 if the increment is Null
   /// @family stepping
   /// @see IncYear, IncMonth, IncWeek, IncDay
@@ -1062,7 +1063,7 @@ class ORVUtils {
   /// is shown with its time instead
   /// @param vEnDate the last date
   /// @param fWindowCaption the title of the window; empty for the report's name
-  /// @raises 13 if a date is none
+  /// @raises 13 if vStDate or vEnDate is not a date
   /// @raises 400 if the window is already open, or a report is being built
   /// @raises 438 if the grid has no hwnd; also the grid's errors
   /// @raises 445 where there is no screen
@@ -1148,12 +1149,12 @@ class ORVUtils {
   /// @family combo boxes
   /// @see SearchComboEx, GetComboListIndex
   /// @example
+  ///     cboBranch.Text = ""
+  ///     Print u.SearchCombo(cboBranch, 2)
+  ///     ' 0
   ///     cboBranch.Text = "So"
   ///     Print u.SearchCombo(cboBranch, 2)
   ///     ' 1
-  ///     cboBranch.Text = "Nowhere"
-  ///     Print u.SearchCombo(cboBranch, 2)
-  ///     ' -1
   virtual std::int32_t SearchCombo(const Variant& cboCombo, const std::int16_t& msgFlag);
 
   /// Makes a list-combo control search for a given text. The result is -1 if it is not found, and otherwise the
@@ -1167,9 +1168,9 @@ class ORVUtils {
   /// @family combo boxes
   /// @see SearchCombo, GetComboListIndex
   /// @example
-  ///     Print u.SearchComboEx(cboBranch, "West", 2, 2)
-  ///     ' 2
-  ///     Print u.SearchComboEx(cboBranch, "West", 2, 0)
+  ///     Print u.SearchComboEx(cboBranch, "South", 2, 2)
+  ///     ' 1
+  ///     Print u.SearchComboEx(cboBranch, "South", 2, 0)
   ///     ' 0
   virtual std::int32_t SearchComboEx(const Variant& cboCombo, const Text& sFind, const std::int32_t& SearchMethod,
                                      const std::int16_t& msgFlag);
@@ -1706,8 +1707,9 @@ class ORVUtils {
   /// addresses, or more than 21.
   /// @family network
   /// @example
-  ///     Print TypeName(u.GetIpAddrTable())
-  ///     ' String()
+  ///     addresses = u.GetIpAddrTable()
+  ///     Print UBound(addresses) + 1 > 0
+  ///     ' True
   virtual Variant GetIpAddrTable();
 
   /// Cleans a memo of several lines for a field of the database. Every line feed becomes a blank; then runs of 2, 3 and

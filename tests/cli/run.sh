@@ -142,7 +142,15 @@ expect_part 'list: property' 0 "${nl}get put  sUserName As String${nl}" list
 expect_part 'list: method' 0 \
   "${nl}call     ReadCommaDelimStrToList(sTemp As String, ByRef sFList As String(), [sDelimiter As String = \",\"]) As Long${nl}" list
 verdict 'each name once' '' "$("$talutil" list | cut -c10- | sed 's/[( ].*//' | sort | uniq -d)"
-expect_part 'help: written back, default' 0 'sDelimiter  the delimiter, one character (String; "," when left out)' help readcommadelimstrtolist
+expect_part 'help: default' 0 'sDelimiter  the delimiter, one character (String; "," when left out)' \
+  help readcommadelimstrtolist
+expect_part 'help of an indexed property' 0 'Grid.TextMatrix(Row As Long, Col As Long) As String' help grid.textmatrix
+expect_part 'help of a class' 0 'Created by CreateObject("TALUtil.ZipControl").' help TALUtil.ZipControl
+expect 'help of a name that classes share' 2 \
+  'talutil: "errorcode" is a member of several classes; write one of ZipControl.ErrorCode, UnzipControl.ErrorCode' \
+  help errorcode
+verdict 'help is wrapped' '' "$(for name in CallZIPFiles SaveCfgFileData MyDrawText; do
+  "$talutil" help $name | sed 1d | grep -E '.{81}'; done)"
 if command -v python3 >/dev/null; then
   verdict 'list --json is JSON' "$("$talutil" list | wc -l)" \
     "$("$talutil" list --json | python3 -c 'import json, sys; print(len(json.load(sys.stdin)))')"

@@ -5,6 +5,7 @@ set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 . "$talutil_top/tests/hosts/screen.sh"
 . "$talutil_top/tests/equality/compare.sh"
+. "$talutil_top/tests/examples/through_dll.sh"
 
 folder=${1:-windows}
 [ "$folder" != windows64 ] || use_wine64
@@ -13,7 +14,7 @@ pictures=$talutil_build/screenshots
 passed=0
 failed=0
 
-need_packages xvfb imagemagick ghostscript locales
+need_packages python3 xvfb imagemagick ghostscript locales
 mkdir -p "$pictures"
 rm -f "$pictures"/*.wanted
 
@@ -90,6 +91,7 @@ dots() { wine reg.exe add 'HKCU\Control Panel\Desktop' /v LogPixels /t REG_DWORD
 dots 144
 run forms-144 wine "Z:\\build\\$folder\\tests\\hosts\\forms_client.exe" "Z:\\build\\$folder" 0 144-
 dots 96
+run examples run_examples "$folder" "$talutil_build/asan/talutil"
 rm -f "$talutil_build"/printed_*.ps
 client printing "$(build_below_wine)"
 printed() {  # what, the pattern of its words

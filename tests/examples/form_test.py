@@ -1,0 +1,65 @@
+#!/usr/bin/env python3
+"""Whether tools/member_texts.py refuses doc comments that do not have the form, naming file and line. The last line is
+"N passed, N failed"."""
+import os
+import shutil
+import subprocess
+import sys
+import tempfile
+
+TOP = os.path.join(os.path.dirname(os.path.abspath(__file__)), "..", "..")
+HEADER = "src/library/orv_utils.hpp"
+
+# What is replaced in the header, by what, and the complaint.
+ROWS = [
+    ("no parameter", "  /// @param s the text\n", "", 'the @param of StripNulls are (); the table has (s)'),
+    ("another parameter", "@param s the text", "@param t the text", 'are (t); the table has (s)'),
+    ("a parameter without a meaning", "@param s the text", "@param s", '@param s does not say what it means'),
+    ("an unknown tag", "  /// @param s the text\n", "  /// @param s the text\n  /// @returns a text\n",
+     'there is no tag "@returns"'),
+    ("no number of an error", "@raises 5 if sChr", "@raises Five if sChr", '@raises begins with "Five"'),
+    ("an unknown family", "/// @family strings", "/// @family string", 'there is no family "string"'),
+    ("a member that is none", "@see RemoveStringsFromNumber,", "@see Remove,", '"@see Remove" leads nowhere'),
+    ("a setting that is none", "@reads DebugMode", "@reads Debug", '"@reads Debug" leads nowhere'),
+    ("no example", "  /// @example\n  ///     u.Terminate\n", "", "Terminate has no @example"),
+    ("an example that is not indented", "  ///     u.Terminate\n", "  /// u.Terminate\n", "is not indented"),
+    ("a backslash at the end", "  ///     u.Terminate\n", "  ///     u.Terminate \\\n", "ends with a backslash"),
+    ("a long sentence", "  /// Ends the host's use of the library:", "  /// " + "Long " * 20 + "ends the library:",
+     "characters; 120 fit a help string"),
+    ("no text", "  /// True, whatever the address is: the test is disabled.\n", "",
+     "the text of PingSite does not begin with a sentence"),
+]
+
+
+def complaints(original, before, after):
+    """What the tool says of a changed header, with the number of the first changed line."""
+    assert original.count(before) >= 1, before
+    with tempfile.TemporaryDirectory() as folder:
+        for name in ("src/library", "src/controls", "tools", "docs"):
+            shutil.copytree(os.path.join(TOP, name), os.path.join(folder, name))
+        with open(os.path.join(folder, HEADER), "w", encoding="utf-8") as header:
+            header.write(original.replace(before, after, 1))
+        tool = os.path.join(folder, "tools/member_texts.py")
+        done = subprocess.run([tool, "--check"], capture_output=True, text=True)
+        return done.returncode, done.stderr
+
+
+def main():
+    with open(os.path.join(TOP, HEADER), encoding="utf-8") as header:
+        original = header.read()
+    failed = 0
+    for name, before, after, complaint in ROWS:
+        status, said = complaints(original, before, after)
+        lines = [line for line in said.splitlines() if complaint in line]
+        line = original[:original.index(before)].count("\n") + 1
+        # A complaint about a whole member names its declaration, which follows.
+        near = any(line <= int(found.split(":")[1]) <= line + 30 and found.startswith(HEADER) for found in lines)
+        if status != 1 or not near:
+            failed += 1
+            print(f"FAILED {name}: expected {complaint!r} at line {line} or soon after, got {status}: {said}")
+    print(f"{len(ROWS) - failed} passed, {failed} failed")
+    return 1 if failed else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())

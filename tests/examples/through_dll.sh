@@ -1,0 +1,18 @@
+# Runs the examples in the members' texts through TALUtil.dll, which must be registered. Sourced by tests/hosts/run.sh.
+
+# All those without windows are one script; each of the others has a user. Their settings begin empty.
+run_examples() {  # the preset, the command
+  local made=$talutil_build/$1-examples name actions
+  rm -rf "$made"
+  mkdir -p "$made"
+  wine reg.exe delete 'HKCU\Software\TALUtil\Settings' /f >/dev/null 2>&1 || true
+  "$talutil_top/tests/examples/run.py" script "$2" "$made/all.vbs"
+  WINE_TIMEOUT=300 wine cscript.exe //nologo "Z:\\build\\$1-examples\\all.vbs" >"$made/all.out"
+  "$talutil_top/tests/examples/run.py" windows "$2" "$made" >"$made/windows.txt"
+  while IFS=$'\t' read -r name actions; do
+    IFS=$'\t' read -ra actions <<<"$actions"
+    wine "Z:\\build\\$1\\tests\\hosts\\user.exe" "Z:\\build\\$1-examples\\$name" "${actions[@]}" \
+      >"$made/${name%.vbs}.out" </dev/null || echo "FAILED $name: its user could not end it"
+  done <"$made/windows.txt"
+  "$talutil_top/tests/examples/run.py" compare "$2" "$made"/*.out
+}
