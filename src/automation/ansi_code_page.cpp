@@ -1,5 +1,7 @@
 #include <algorithm>
 #include <array>
+#include <bit>
+#include <cstring>
 
 #include "automation/run_time_error.hpp"
 #include "automation/text.hpp"
@@ -213,6 +215,32 @@ void append_ansi(Text& text, std::string_view bytes) {
     text.append(units.data(), piece.size());
     bytes.remove_prefix(piece.size());
   }
+}
+
+bool widen_ascii(std::string_view bytes, char16_t* units) noexcept {
+  // Blocks of eight, of which the last may overlap the one before: how many bytes are left over cannot be predicted.
+  using Bytes [[gnu::vector_size(8)]] = std::uint8_t;
+  using Units [[gnu::vector_size(16)]] = char16_t;
+  constexpr std::size_t step = sizeof(Bytes);
+  constexpr std::uint64_t not_ascii = 0x8080808080808080;
+  std::uint64_t all = 0;
+  const auto widen = [&](std::size_t at) {
+    std::uint64_t block = 0;
+    std::memcpy(&block, bytes.data() + at, step);
+    all |= block;
+    const Units wide = __builtin_convertvector(std::bit_cast<Bytes>(block), Units);
+    std::memcpy(units + at, &wide, sizeof wide);
+  };
+  if (bytes.size() >= step) {
+    for (std::size_t at = 0; at + step < bytes.size(); at += step) widen(at);
+    widen(bytes.size() - step);
+  } else {
+    for (std::size_t i = 0; i < bytes.size(); ++i) {
+      units[i] = static_cast<std::uint8_t>(bytes[i]);
+      all |= static_cast<std::uint8_t>(bytes[i]);
+    }
+  }
+  return (all & not_ascii) == 0;
 }
 
 Text from_ansi(std::string_view bytes) {

@@ -40,6 +40,9 @@ using TextView = std::u16string_view;
 [[nodiscard]] Text from_ansi(std::string_view bytes);
 void append_ansi(Text& text, std::string_view bytes);
 
+/// Writes a unit for each byte, if all are ASCII. Otherwise returns false, and what was written has no meaning.
+[[nodiscard]] bool widen_ascii(std::string_view bytes, char16_t* units) noexcept;
+
 /// Upper and lower case, code unit by code unit, from the platform's table (no locale and no one-to-many mappings: the
 /// sharp s stays). See letter_case.cpp.
 [[nodiscard]] char16_t upper_case(char16_t unit) noexcept;

@@ -32,7 +32,6 @@ bool SequentialInput::at_end() {
 
 void SequentialInput::read_line(Text& line) {
   if (at_end()) raise(ErrorNumber::input_past_end_of_file);
-  line.clear();
   while (!at_end()) {
     const std::size_t length = pending().find('\r');
     // Only whole lines are converted, because a character may have several bytes.
@@ -42,17 +41,26 @@ void SequentialInput::read_line(Text& line) {
       continue;
     }
     if (carried_.empty()) {
-      code_page_.append_text(line, pending().substr(0, length));
+      convert(pending().substr(0, length), line);
     } else {
       carried_ += pending().substr(0, length);
-      break_off(line);
+      convert(carried_, line);
+      carried_.clear();
     }
     begin_ += length + 1;
     // The line feed may be the first byte of the next buffer.
     if (!at_end() && pending().front() == '\n') ++begin_;
     return;
   }
-  break_off(line);
+  convert(carried_, line);
+  carried_.clear();
+}
+
+void SequentialInput::convert(std::string_view bytes, Text& line) {
+  line.resize(bytes.size());
+  if (widen_ascii(bytes, line.data())) return;
+  line.clear();
+  code_page_.append_text(line, bytes);
 }
 
 /// Converts what was carried over from earlier buffers.

@@ -28,6 +28,9 @@ class SequentialInput {
   /// Bytes that were read from the file but not consumed yet.
   [[nodiscard]] std::string_view pending() const noexcept { return {buffer_.data() + begin_, end_ - begin_}; }
   void fill();
+
+  /// Makes a line of its bytes.
+  void convert(std::string_view bytes, Text& line);
   void break_off(Text& text);
 
   CodePage& code_page_;
