@@ -11,7 +11,7 @@ if [ -z "${SOURCE_DATE_EPOCH:-}" ]; then
     fail "this folder is not a checkout: set SOURCE_DATE_EPOCH to the seconds since 1970 of the packages' files"
   [ -z "$(git status --porcelain)" ] || say "note: there are changes that are not committed; the packages have them"
 fi
-export SOURCE_DATE_EPOCH LC_ALL=C TZ=UTC
+export SOURCE_DATE_EPOCH
 umask 022
 
 # Gives files below a folder the time of the release and the same rights on every machine.

@@ -71,6 +71,7 @@ package_windows() {
   say "packing $name-setup.exe and $name.zip"
   make_setup "$version" "$stage/libraries" "$output/$name-setup.exe"
   stage_archive "$stage/$name"
-  # Sorted, and without the times and owners that -X leaves out.
-  (cd "$stage" && rm -f "$name.zip" && find "$name" -type f | sort | zip -q -X -9 "$name.zip" -@ && mv "$name.zip" "$output")
+  # In the same order and time zone everywhere, and without the times and owners that -X leaves out.
+  (cd "$stage" && rm -f "$name.zip" && find "$name" -type f | LC_ALL=C sort | TZ=UTC zip -q -X -9 "$name.zip" -@ &&
+    mv "$name.zip" "$output")
 }
