@@ -58,8 +58,8 @@ add_custom_command(
   COMMAND ${generated}/write_idl header > ${generated}/talutil.h
   COMMAND ${generated}/write_idl ${manifest_kind} > ${CMAKE_BINARY_DIR}/TALUtil.manifest
   # The library would otherwise contain the time at which it was made.
-  COMMAND ${CMAKE_COMMAND} -E env WIDL_TIME_OVERRIDE=0 ${idl_compiler} ${idl_flags} -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR}
-          -t -o ${generated}/TALUtil.tlb ${generated}/TALUtil.idl
+  COMMAND ${CMAKE_COMMAND} -E env WIDL_TIME_OVERRIDE=0
+          ${idl_compiler} ${idl_flags} -I${CMAKE_SOURCE_DIR}/tools -L${TALUTIL_STDOLE_DIR} -t -o ${generated}/TALUtil.tlb ${generated}/TALUtil.idl
   COMMAND ${generated}/mend_typelib ${generated}/TALUtil.tlb
   DEPENDS ${generated}/write_idl ${generated}/mend_typelib tools/base.idl
   COMMENT "Making the type library")
@@ -81,7 +81,8 @@ function(talutil_resources name description)
 endfunction()
 talutil_resources(TALUtil "TALUtil common toolkit" "#include \"${CMAKE_SOURCE_DIR}/src/com/talutil.rc\"")
 talutil_resources(printhelper "TALUtil print helper")
-set_source_files_properties(${generated}/TALUtil.rc PROPERTIES OBJECT_DEPENDS ${generated}/TALUtil.tlb)
+set_source_files_properties(${generated}/TALUtil.rc PROPERTIES
+                            OBJECT_DEPENDS "${generated}/TALUtil.tlb;${CMAKE_SOURCE_DIR}/src/com/talutil.rc")
 talutil_layer(com BELOW startup win32 FAST dispatch_object.cpp invoke.cpp variant_bridge.cpp write_back.cpp)
 add_library(TALUtil SHARED src/com/talutil.def ${generated}/TALUtil.rc ${generated}/talutil.h)
 set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})

@@ -48,7 +48,6 @@ check_library() {
   local file=$1 tool=$2 flags
   flags=$("$tool" -p "$file" | grep -oE 'HIGH_ENTROPY_VA|DYNAMIC_BASE|NX_COMPAT' | sort | xargs)
   expect "the flags of $file" "$3" "$flags"
-  # Sections of the header: bit 31 is written, bit 29 is run.
   expect "sections of $file that are both written and run" "" \
     "$("$tool" -x "$file" | awk '/^ +[0-9]+ /{ name = $2 } /CONTENTS|ALLOC/ && /CODE/ && !/READONLY/ { print name }')"
   expect "libraries that $file does not take from the system" "" \
