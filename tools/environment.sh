@@ -146,7 +146,7 @@ build_below_wine() { [ $wine_bits = 64 ] && echo "$talutil_build" || echo /build
 # The environment of programs in Wine. A test may choose another locale for them.
 wine_environment() {
   printf '%s\n' PATH=/usr/bin:/bin:/usr/sbin:/sbin USER=root "LANG=${WINE_LANG:-C.UTF-8}" \
-    ${WINE_LANG:+"LC_ALL=$WINE_LANG"} ${WINE_LOCPATH:+"LOCPATH=$WINE_LOCPATH"} ${TALUTIL_WHOLE:+"TALUTIL_WHOLE=1"} ${DISPLAY:+"DISPLAY=$DISPLAY"} \
+    ${WINE_LANG:+"LC_ALL=$WINE_LANG"} ${WINE_LOCPATH:+"LOCPATH=$WINE_LOCPATH"} ${TALUTIL_WHOLE:+"TALUTIL_WHOLE=1"} ${TALUTIL_RECORD:+"TALUTIL_RECORD=$TALUTIL_RECORD"} ${DISPLAY:+"DISPLAY=$DISPLAY"} \
     "WINEDEBUG=${WINEDEBUG:--all}" 'WINEDLLOVERRIDES=winedbg.exe=d;mscoree=d;mshtml=d'
 }
 

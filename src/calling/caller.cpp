@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "calling/call_record.hpp"
 #include "calling/json_writer.hpp"
 #include "library/identity.hpp"
 
@@ -42,16 +43,6 @@ Variant use_control(Object& control, TextView name, std::span<const Variant> arg
   return control.invoke(*member, arguments.empty() ? Access::get : Access::put, arguments);
 }
 
-/// An error as a value for "error", to be closed by the caller.
-void open_error(std::string& out, std::int32_t number, TextView description, TextView source) {
-  out += "\"error\": {\"number\": ";
-  append_number(out, number);
-  out += ", \"description\": ";
-  append_text(out, description);
-  out += ", \"source\": ";
-  append_text(out, source);
-}
-
 }  // namespace
 
 ObjectRef NumberedObjects::find(std::int32_t number) const {
@@ -65,6 +56,13 @@ void NumberedObjects::append(std::string& out, const ObjectRef& object) {
   out += "{\"object\": ";
   append_number(out, known->second);
   out += '}';
+}
+
+void NumberedObjects::put(std::int32_t number, ObjectRef object) {
+  release(number);
+  numbers_.emplace(object.get(), number);
+  objects_.emplace(number, std::move(object));
+  last_ = std::max(last_, number);
 }
 
 bool NumberedObjects::release(std::int32_t number) {
@@ -83,7 +81,9 @@ bool Caller::answer(std::string_view line, std::size_t number, std::string& out)
   const auto refuse = [&](ErrorNumber error, const char* message) {
     out.resize(start);
     append_opening(out);
-    open_error(out, static_cast<std::int32_t>(error), from_utf8(message), u"talutil");
+    append_error(out,
+                 RunTimeError(static_cast<std::int32_t>(error), from_utf8(message), ErrorOrigin{u"talutil", {}, 0}));
+    out.pop_back();
     out += ", \"line\": ";
     append_number(out, number);
     out += "}}";
@@ -106,9 +106,13 @@ bool Caller::answer(std::string_view line, std::size_t number, std::string& out)
     return refuse(refusal.number(), refusal.what());
   } catch (...) {
     out.resize(start);
-    append_error(out, current_error());
+    append_failure(out, current_error());
   }
   return true;
+}
+
+void Caller::create_as(std::int32_t number, TextView class_name) {
+  if (ObjectRef object = create(library_, class_name)) objects_.put(number, std::move(object));
 }
 
 ObjectRef Caller::target() const {
@@ -170,29 +174,12 @@ void Caller::append_opening(std::string& out) const {
 }
 
 void Caller::append_written_back(std::string& out) {
-  if (called_ == nullptr) return;
-  const std::size_t count = std::min<std::size_t>(request_.arguments.size(), called_->parameter_count);
-  std::string_view separator = ", \"arguments\": {";
-  for (std::size_t i = 0; i < count; ++i) {
-    const Parameter& parameter = called_->parameters()[i];
-    const Argument& argument = request_.arguments[i];
-    if (parameter.passing != Passing::written_back || argument.value == Variant(missing_argument)) continue;
-    const auto same = argument.same_variable_as;
-    out += separator;
-    append_name(out, parameter.name);
-    out += ": ";
-    append_declared(out, parameter.type,
-                    same < 0 ? argument.value : request_.arguments[static_cast<std::size_t>(same)].value, objects_);
-    separator = ", ";
-  }
-  if (separator == ", ") out += '}';
+  if (called_ != nullptr) calling::append_written_back(out, *called_, request_.arguments, objects_);
 }
 
-void Caller::append_error(std::string& out, const RunTimeError& error) {
+void Caller::append_failure(std::string& out, const RunTimeError& error) {
   append_opening(out);
-  const Text own_source = from_utf8(identity::classes[0].program_id);
-  open_error(out, error.number(), error.description(), error.origin() ? error.origin()->source : own_source);
-  out += '}';
+  append_error(out, error);
   append_written_back(out);
   out += '}';
 }

@@ -15,6 +15,9 @@ class NumberedObjects final : public ObjectNumbers {
   [[nodiscard]] ObjectRef find(std::int32_t number) const override;
   void append(std::string& out, const ObjectRef& object) override;
 
+  /// Gives an object a certain number, as in a recording.
+  void put(std::int32_t number, ObjectRef object);
+
   /// Releases an object; returns false if there is no such number.
   bool release(std::int32_t number);
 
@@ -34,6 +37,11 @@ class Caller {
   /// class or object; the answer, which then also has the line's number, says so.
   bool answer(std::string_view line, std::size_t number, std::string& out);
 
+  /// Objects under the numbers of a recording. An unknown class creates nothing.
+  void create_as(std::int32_t number, TextView class_name);
+  void release(std::int32_t number) { objects_.release(number); }
+  [[nodiscard]] bool has(std::int32_t number) const { return objects_.find(number) != nullptr; }
+
  private:
   Variant run();
   [[nodiscard]] ObjectRef target() const;
@@ -41,7 +49,7 @@ class Caller {
   Variant use(Object& target);
   void append_opening(std::string& out) const;
   void append_written_back(std::string& out);
-  void append_error(std::string& out, const RunTimeError& error);
+  void append_failure(std::string& out, const RunTimeError& error);
 
   Library& library_;
   ObjectRef toolkit_;

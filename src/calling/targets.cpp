@@ -102,6 +102,12 @@ const LateInterface* members_of_object(Object& object) {
   return nullptr;
 }
 
+const Member* member_of_object(Object& object, std::int32_t identifier, Access access) {
+  const LateInterface* const members = members_of_object(object);
+  const std::int32_t slot = members == nullptr ? -1 : members->slot_of(identifier, access);
+  return slot < 0 ? nullptr : &members->members[static_cast<std::size_t>(slot)];
+}
+
 std::optional<std::int32_t> slot_for(const LateInterface& members, TextView name, std::size_t arguments) {
   const std::int32_t first = members.find(name);
   if (first < 0) return {};

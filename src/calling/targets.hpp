@@ -37,6 +37,9 @@ class InterfaceObject : public Object {
 /// The members of an object of one of these classes; null for another.
 [[nodiscard]] const LateInterface* members_of_object(Object& object);
 
+/// The member that such an object's identifier and access lead to; null if there is none, or for another object.
+[[nodiscard]] const Member* member_of_object(Object& object, std::int32_t identifier, Access access);
+
 /// The slot that a call with this number of arguments uses: a property with fewer arguments than its value needs is
 /// read, otherwise put. -1 if the property allows only the other, nothing for an unknown name.
 [[nodiscard]] std::optional<std::int32_t> slot_for(const LateInterface& members, TextView name, std::size_t arguments);

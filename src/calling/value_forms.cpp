@@ -349,6 +349,12 @@ constexpr Form forms[] = {
     {u"object", &read_object},
 };
 
+/// Forms of recordings, which stand for what they do not contain.
+constexpr struct {
+  TextView name;
+  const char* reason;
+} unavailable_forms[] = {{u"masked", "a masked text"}, {u"host_object", "an object of the host"}};
+
 std::string names_of_forms() {
   std::string names;
   for (const Form& form : forms) names += to_utf8(form.name) + ", ";
@@ -358,6 +364,9 @@ std::string names_of_forms() {
 /// The rest of a form after its first key.
 Variant read_form(const Context& context, Text& key, Place place) {
   if (key == u"list" && place == Place::anywhere) return read_list(context, key);
+  for (const auto& [name, reason] : unavailable_forms) {
+    if (key == name) throw UnavailableValue(reason);
+  }
   const auto* const form = std::ranges::find(forms, key, &Form::name);
   if (form == std::end(forms)) {
     context.json.fail("a value's form before this: {\"" + to_utf8(key) + "\": ...} is none" +

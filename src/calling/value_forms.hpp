@@ -21,6 +21,13 @@ class ObjectNumbers {
   virtual void append(std::string& out, const ObjectRef& object) = 0;
 };
 
+/// Ends the reading of a value that a recording does not contain: {"masked": true} and {"host_object": 1}. The message
+/// says which of these it was.
+class UnavailableValue : public JsonError {
+ public:
+  using JsonError::JsonError;
+};
+
 void append_value(std::string& out, const Variant& value, ObjectNumbers& objects);
 
 /// The same for a value whose type the interface declares: an Integer or a Single of that type is a plain number.

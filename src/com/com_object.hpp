@@ -5,12 +5,16 @@
 #include "automation/late_call.hpp"
 #include "com/invoke.hpp"
 #include "com/module.hpp"
+#include "com/recorder.hpp"
 #include "platform/win32/windows.hpp"
 
 namespace talutil::com {
 
 /// A slot of a vtable, regardless of its signature.
 using Slot = void (*)();
+
+/// The slots before those of a class's own members.
+constexpr std::size_t own_slots = 7;
 
 /// The differences between the classes that hosts create.
 template <class C>
@@ -48,8 +52,10 @@ class ComObject {
 
   static ULONG STDMETHODCALLTYPE release(ComObject* self) noexcept {
     const ULONG left = --self->references_;
-    if (left == 0) delete self;
-    return left;
+    if (left != 0) return left;
+    if (Recorder* const recorder = module_recorder()) recorder->released(&self->object);
+    delete self;
+    return 0;
   }
 
   /// Keeps the object alive during a call: a member may show dialogs and let messages through, and a host that handles

@@ -6,9 +6,11 @@
 
 #include "automation/run_time_error.hpp"
 #include "automation/variant.hpp"
+#include "calling/targets.hpp"
 #include "com/boundary.hpp"
 #include "com/module.hpp"
 #include "com/pointer.hpp"
+#include "com/recorder.hpp"
 #include "com/variant_bridge.hpp"
 
 namespace talutil::com {
@@ -274,7 +276,7 @@ class OwnDispatch final : public IDispatch {
         access = Access::put;
       else if ((flags & DISPATCH_METHOD) == 0)
         access = Access::get;
-      OwnedVariant answer = native_from(object_->invoke(id, access, arguments), ArrayStyle::of_variants);
+      OwnedVariant answer = native_from(use(id, access, arguments), ArrayStyle::of_variants);
       if (result != nullptr) *result = answer.release();
       return S_OK;
     } catch (...) {
@@ -285,7 +287,20 @@ class OwnDispatch final : public IDispatch {
   [[nodiscard]] const ObjectRef& object() const noexcept { return object_; }
 
  private:
-  ~OwnDispatch() = default;
+  ~OwnDispatch() {
+    if (Recorder* const recorder = module_recorder()) recorder->released(this);
+  }
+
+  Variant use(DISPID id, Access access, std::span<const Variant> arguments) {
+    Recorder* const recorder = module_recorder();
+    const Member* const member = recorder == nullptr ? nullptr : calling::member_of_object(*object_, id, access);
+    if (member == nullptr) return object_->invoke(id, access, arguments);
+    recorder->give_number(this);
+    const std::vector<Argument> given(arguments.begin(), arguments.end());
+    return recorded(
+        recorder, this, *member, [&] { return std::span<const Argument>(given); },
+        [&] { return object_->invoke(id, access, arguments); });
+  }
 
   ObjectRef object_;
   std::atomic<ULONG> references_ = 1;
@@ -300,6 +315,11 @@ ObjectRef object_from(IUnknown* object) {
     return std::make_shared<HostObject>(std::move(dispatch));
   }
   return std::make_shared<UndrivenObject>();
+}
+
+const void* identity_of_host_object(const ObjectRef& object) noexcept {
+  const auto* const theirs = dynamic_cast<HostObject*>(object.get());
+  return theirs == nullptr ? nullptr : theirs->dispatch().get();
 }
 
 IDispatch* dispatch_from(const ObjectRef& object) {

@@ -15,4 +15,7 @@ namespace talutil::com {
 /// the reference. Raises 13 for a host's object that cannot be driven late-bound.
 [[nodiscard]] IDispatch* dispatch_from(const ObjectRef& object);
 
+/// The address by which a host knows its object; null for one of ours.
+[[nodiscard]] const void* identity_of_host_object(const ObjectRef& object) noexcept;
+
 }  // namespace talutil::com

@@ -7,6 +7,7 @@
 #include "com/dispatch_object.hpp"
 #include "com/module.hpp"
 #include "com/pointer.hpp"
+#include "com/recorder.hpp"
 #include "com/registered_controls.hpp"
 #include "com/registration.hpp"
 #include "controls/common_dialog.hpp"
@@ -41,6 +42,7 @@ struct Module {
   bool is_starting = false;
   // Neither is ever released: objects that hosts have put into the settings must not be released under the loader lock.
   LoadedLibrary* loaded = nullptr;
+  Recorder* recorder = nullptr;
   ITypeLib* type_library = nullptr;
 };
 
@@ -55,11 +57,20 @@ void stay_loaded() noexcept {
                      reinterpret_cast<const wchar_t*>(&module_state), &module);
 }
 
-template <class C>
+/// Records the creation of an object of the class with an index in identity::classes. Toolkits need no number, since
+/// all of them share their state.
+template <std::size_t Class>
+void record_creation(const void* identity) noexcept {
+  if (module_state.recorder == nullptr) return;
+  module_state.recorder->created(identity::classes[Class].program_id, identity);
+}
+
+template <class C, std::size_t Class>
 HRESULT create_object(REFIID id, void** out) noexcept {
   return guarded([&] {
     // NOLINTNEXTLINE(bugprone-unhandled-exception-at-new): the guard around it turns it into error 7.
     auto* const made = new ComObject<C>(module_library());
+    if constexpr (!std::is_same_v<C, ORVUtils>) record_creation<Class>(&made->object);
     const HRESULT result = ComObject<C>::query_interface(made, &id, out);
     ComObject<C>::release(made);
     if (FAILED(result)) throw system_error(result);
@@ -67,11 +78,12 @@ HRESULT create_object(REFIID id, void** out) noexcept {
 }
 
 /// Creates a control for a host. It is always our own, even if a third-party control is registered in its place.
-template <class C>
+template <class C, std::size_t Class>
 HRESULT create_control(REFIID id, void** out) noexcept {
   return guarded([&] {
     Pointer<IDispatch> made;
     *made.receive() = dispatch_from(std::make_shared<C>(module_library().platform()));
+    record_creation<Class>(made.get());
     const HRESULT result = made->QueryInterface(id, out);
     if (FAILED(result)) throw system_error(result);
   });
@@ -116,9 +128,9 @@ class ClassObject final : public IClassFactory {
 
 // In the order of identity::classes.
 ClassObject class_objects[] = {
-    ClassObject(&create_object<ORVUtils>),    ClassObject(&create_object<cControlPosition>),
-    ClassObject(&create_control<Grid>),       ClassObject(&create_control<CommonDialog>),
-    ClassObject(&create_control<ZipControl>), ClassObject(&create_control<UnzipControl>),
+    ClassObject(&create_object<ORVUtils, 0>),    ClassObject(&create_object<cControlPosition, 1>),
+    ClassObject(&create_control<Grid, 2>),       ClassObject(&create_control<CommonDialog, 3>),
+    ClassObject(&create_control<ZipControl, 4>), ClassObject(&create_control<UnzipControl, 5>),
 };
 static_assert(std::size(class_objects) == std::size(identity::classes));
 
@@ -144,8 +156,11 @@ Library& module_library() {
   auto loaded = std::make_unique<LoadedLibrary>();
   loaded->library.start();
   module_state.loaded = loaded.release();
+  module_state.recorder = Recorder::start().release();
   return module_state.loaded->library;
 }
+
+Recorder* module_recorder() noexcept { return module_state.recorder; }
 
 HRESULT type_information(const GUID& identifier, ITypeInfo** out) noexcept {
   return guarded([&] {

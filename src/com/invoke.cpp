@@ -5,6 +5,8 @@
 #include <optional>
 
 #include "com/boundary.hpp"
+#include "com/module.hpp"
+#include "com/recorder.hpp"
 #include "com/variant_bridge.hpp"
 #include "com/write_back.hpp"
 
@@ -173,7 +175,10 @@ HRESULT invoke(const LateInterface& table, void* target, const Locale& locale, c
     Call call(member, invocation, placement, locale);
     OwnedVariant answer;
     try {
-      answer = native_from(table.call(target, slot, call.arguments(), locale), ArrayStyle::of_variants);
+      answer = native_from(recorded(
+                               module_recorder(), target, member, [&] { return call.arguments(); },
+                               [&] { return table.call(target, slot, call.arguments(), locale); }),
+                           ArrayStyle::of_variants);
     } catch (...) {
       call.write_back();
       throw;

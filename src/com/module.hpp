@@ -13,6 +13,11 @@ namespace talutil::com {
 /// errors of the start-up, and tries again on the next call; raises 429 if called during the start-up.
 [[nodiscard]] Library& module_library();
 
+class Recorder;
+
+/// The recording of calls; null unless the user has switched it on.
+[[nodiscard]] Recorder* module_recorder() noexcept;
+
 /// The type information of an interface or class, from the type library in the DLL's resources, which is loaded once.
 [[nodiscard]] HRESULT type_information(const GUID& identifier, ITypeInfo** out) noexcept;
 

@@ -4,10 +4,12 @@
 #include <array>
 #include <optional>
 #include <tuple>
+#include <vector>
 
 #include "automation/member_table.hpp"
 #include "com/boundary.hpp"
 #include "com/com_object.hpp"
+#include "com/recorder.hpp"
 #include "com/variant_bridge.hpp"
 #include "com/write_back.hpp"
 
@@ -124,6 +126,18 @@ class WireCell {
     }
   }
 
+  /// The argument as a late call has it: its value, and the index of the earlier argument that is the same variable.
+  [[nodiscard]] Argument argument(std::int8_t same_variable_as) const {
+    Argument result(Variant{value_});
+    result.same_variable_as = same_variable_as;
+    return result;
+  }
+
+  [[nodiscard]] const void* shared() const noexcept {
+    if constexpr (is_variable) return first_;
+    return nullptr;
+  }
+
   void store() noexcept {
     if constexpr (is_written_back) {
       if (!native_) return;
@@ -194,6 +208,37 @@ auto run(std::tuple<WireCell<A>...>& cells, const Library& library, Function&& f
   }
 }
 
+/// The arguments of an early-bound call as a recording takes them.
+template <class... A>
+std::vector<Argument> arguments_of(const std::tuple<WireCell<A>...>& cells) {
+  std::vector<Argument> arguments;
+  std::vector<const void*> addresses;
+  const auto add = [&](const auto& cell) {
+    const auto first = std::ranges::find(addresses, cell.shared());
+    const bool is_shared = cell.shared() != nullptr && first != addresses.end();
+    arguments.push_back(cell.argument(static_cast<std::int8_t>(is_shared ? first - addresses.begin() : -1)));
+    addresses.push_back(&cell);
+  };
+  std::apply([&](const WireCell<A>&... cell) { (add(cell), ...); }, cells);
+  return arguments;
+}
+
+/// The member behind the function of a slot. Searches the slots: only recordings need it.
+template <class C, class Function>
+const Member& member_behind(Function function) noexcept {
+  const Slot* const first = vtable_of<C>() + own_slots;
+  const Slot* const found = std::find(first, first + described<C>.size(), reinterpret_cast<Slot>(function));
+  return described<C>[static_cast<std::size_t>(found - first)];
+}
+
+/// Records a use of a member, if calls are recorded.
+template <class C, class Function, class Arguments, class Use>
+auto recorded_use(ComObject<C>* self, Function function, const Arguments& arguments, const Use& use) {
+  Recorder* const recorder = module_recorder();
+  if (recorder == nullptr) return use();
+  return recorded(recorder, &self->object, member_behind<C>(function), arguments, use);
+}
+
 template <class A>
 constexpr bool is_null(const WireParameter<A>& given) noexcept {
   if constexpr (passing<A>() != Passing::by_value)
@@ -228,7 +273,9 @@ struct MethodThunk<C, M, R (Owner::*)(A...)> {
       const Library& library = self->object.library();
       std::tuple<WireCell<A>...> cells{WireCell<A>(given, library)...};
       auto answer = run(cells, library, [&] {
-        return std::apply([&](WireCell<A>&... cell) { return Wire<R>::to((self->object.*M)(cell.value()...)); }, cells);
+        return Wire<R>::to(recorded_use(
+            self, &call, [&] { return arguments_of(cells); },
+            [&] { return std::apply([&](auto&... cell) { return (self->object.*M)(cell.value()...); }, cells); }));
       });
       write_back(cells, library);
       Wire<R>::store(*result, std::move(answer));
@@ -244,8 +291,11 @@ struct MethodThunk<C, M, void (Owner::*)(A...)> {
     return guarded([&] {
       const Library& library = self->object.library();
       std::tuple<WireCell<A>...> cells{WireCell<A>(given, library)...};
-      run(cells, library,
-          [&] { std::apply([&](WireCell<A>&... cell) { (self->object.*M)(cell.value()...); }, cells); });
+      run(cells, library, [&] {
+        recorded_use(
+            self, &call, [&] { return arguments_of(cells); },
+            [&] { std::apply([&](auto&... cell) { (self->object.*M)(cell.value()...); }, cells); });
+      });
       write_back(cells, library);
     });
   }
@@ -263,6 +313,12 @@ struct PropertyThunk {
   static HRESULT STDMETHODCALLTYPE get(ComObject<C>* self, Type* result) noexcept {
     if (result == nullptr) return null_pointer();
     initialize(*result);
+    const auto none = [] { return std::span<const Argument>(); };
+    if (module_recorder() != nullptr) {
+      return guarded([&] {
+        Wire<Field>::store(*result, Wire<Field>::to(recorded_use(self, &get, none, [&] { return field(self); })));
+      });
+    }
     if constexpr (std::is_arithmetic_v<Type>) {
       *result = Wire<Field>::to(field(self));
       return S_OK;
@@ -273,10 +329,16 @@ struct PropertyThunk {
 
   static HRESULT STDMETHODCALLTYPE put(ComObject<C>* self, Type value) noexcept {
     return guarded([&] {
-      if constexpr (std::is_same_v<Field, ObjectRef>)
-        field(self) = object_of_kind(variant_from(value), Kind);
-      else
-        field(self) = Wire<Field>::from(value);
+      const auto store = [&] {
+        if constexpr (std::is_same_v<Field, ObjectRef>)
+          field(self) = object_of_kind(variant_from(value), Kind);
+        else
+          field(self) = Wire<Field>::from(value);
+      };
+      if (module_recorder() == nullptr) return store();
+      const std::array given{Argument(Variant(Wire<PropertyType<M>>::from(value)))};
+      recorded_use(
+          self, &put, [&] { return std::span<const Argument>(given); }, store);
     });
   }
 };
