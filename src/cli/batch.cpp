@@ -1,11 +1,12 @@
 #include "cli/batch.hpp"
 
+#include <fcntl.h>
 #include <unistd.h>
 
 #include <cerrno>
 #include <cstring>
 
-#include "calling/caller.hpp"
+#include "calling/comparison.hpp"
 #include "cli/failure.hpp"
 #include "cli/line_source.hpp"
 #include "cli/options.hpp"
@@ -16,6 +17,7 @@ namespace talutil::cli {
 namespace {
 
 struct BatchOptions {
+  std::string compared;  ///< The recording to repeat; empty to answer calls.
   std::optional<std::uint32_t> code_page;
 };
 
@@ -64,18 +66,79 @@ void answer_calls(const BatchOptions& options) {
       (refused == 1 ? " line was no call; its answer says" : " lines were no calls; their answers say") + " why");
 }
 
+/// The library of a recorded process, and the platform that it needs.
+std::shared_ptr<Library> start_library(std::optional<std::uint32_t> code_page) {
+  const auto session = std::make_shared<Session>(code_page);
+  return {session, &session->library()};
+}
+
+/// Opens a file for reading; "-" is standard input.
+class InputDescriptor {
+ public:
+  explicit InputDescriptor(const std::string& path)
+      : is_ours_(path != "-"), value_(is_ours_ ? ::open(path.c_str(), O_RDONLY | O_CLOEXEC) : STDIN_FILENO) {
+    if (value_ < 0) throw run_time_failure(path + ": " + std::strerror(errno));
+  }
+  InputDescriptor(const InputDescriptor&) = delete;
+  InputDescriptor& operator=(const InputDescriptor&) = delete;
+  ~InputDescriptor() {
+    if (is_ours_) ::close(value_);
+  }
+
+  [[nodiscard]] int value() const noexcept { return value_; }
+
+ private:
+  bool is_ours_;
+  int value_;
+};
+
+void print_summary(const calling::Comparison& comparison, std::string& out) {
+  out += std::to_string(comparison.compared()) + " calls compared, " + std::to_string(comparison.different()) +
+         " different\n";
+  for (const auto& [reason, count] : comparison.skipped()) {
+    out += std::to_string(count) + " skipped: " + reason + '\n';
+  }
+}
+
+void compare_calls(const BatchOptions& options) {
+  const InputDescriptor input(options.compared);
+  calling::Comparison comparison([&] { return start_library(options.code_page); });
+  Output output;
+  LineSource lines(input.value(), [&] { output.flush(); });
+  for (std::string_view line; lines.read(line);) {
+    if (is_blank(line)) continue;
+    const std::string place = options.compared + ": line " + std::to_string(lines.number());
+    std::string difference;
+    try {
+      difference = comparison.repeat(line);
+    } catch (const calling::JsonError& error) {
+      throw run_time_failure(place + ": " + error.what());
+    }
+    if (difference.empty()) continue;
+    output.buffer() += "line " + std::to_string(lines.number()) + ": " + difference + '\n';
+    output.flush_if_large();
+  }
+  print_summary(comparison, output.buffer());
+  output.flush();
+  if (comparison.different() != 0) throw run_time_failure(options.compared + ": there are differences");
+}
+
 }  // namespace
 
 void add_batch(CLI::App& app, Work& work) {
   auto* const command = app.add_subcommand("batch", "Answer calls on standard input, one JSON object per line");
   const auto options = std::make_shared<BatchOptions>();
   add_code_page(*command, options->code_page, "used to compare characters");
+  command->add_option("--compare", options->compared, "Repeat the calls of a recording and print what differs")
+      ->type_name("FILE");
   command->footer(
       "  {\"call\": \"GetData\", \"args\": [\"A,B,\", 0, 1], \"set\": {\"sUserName\": \"anne\"}, \"id\": 7}\n"
       "is answered by\n"
       "  {\"id\": 7, \"result\": \"A\"}\n"
       "in the same process, so that settings last. docs/batch.md describes values, objects and errors.");
-  choose(*command, work, options, &answer_calls);
+  choose(*command, work, options, [](const BatchOptions& chosen) {
+    chosen.compared.empty() ? answer_calls(chosen) : compare_calls(chosen);
+  });
 }
 
 }  // namespace talutil::cli

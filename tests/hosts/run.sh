@@ -80,6 +80,15 @@ client early
 client late
 client objects
 client agreement
+if [ "$folder" = windows64 ]; then
+  # What the DLL has answered, the native command answers as well; not for 32 bits, whose emulator may be slow.
+  recording=$talutil_build/recorded.jsonl
+  rm -f "$recording"
+  TALUTIL_RECORD='Z:\build\recorded.jsonl' \
+    run recorded wine "Z:\\build\\$folder\\tests\\hosts\\agreement_client.exe" "Z:\\build\\$folder" 1000 7
+  expect_success "recorded calls, and their answers here" "$talutil_build/asan/talutil" batch --compare "$recording"
+  expect_success "thousands of calls were recorded" test "$(wc -l <"$recording")" -gt 10000
+fi
 rm -f "$pictures"/*.png
 take_pictures &
 pictures_pid=$!
