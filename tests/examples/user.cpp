@@ -11,7 +11,7 @@
 
 namespace {
 
-constexpr DWORD patience_ms = 30'000;
+constexpr DWORD patience_ms = 60'000;
 
 /// Waits for the visible window that a process has opened last and that takes input; null if there is none in time.
 struct Search {
