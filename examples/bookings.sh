@@ -1,10 +1,11 @@
 #!/usr/bin/env bash
 # Books the jobs of bookings.vbs with the native command and prints the same lines: bookings.sh PATH_TO_TALUTIL JOBS
 set -euo pipefail
+[ $# = 2 ] || { echo "usage: bookings.sh PATH_TO_TALUTIL JOBS" >&2; exit 2; }
 talutil=$1
 
 # Prints the result of a member, without the arguments that are written back.
-use() { "$talutil" call "$@" | head -1; }
+use() { "$talutil" call --result "$@"; }
 
 minutes=0
 while IFS=, read -r name visit step count hours; do

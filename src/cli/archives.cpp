@@ -1,5 +1,3 @@
-#include <unistd.h>
-
 #include <iomanip>
 #include <iostream>
 
@@ -13,6 +11,7 @@
 #include "cli/files.hpp"
 #include "cli/json.hpp"
 #include "cli/options.hpp"
+#include "cli/progress.hpp"
 #include "platform/posix/posix_platform.hpp"
 
 namespace talutil::cli {
@@ -30,6 +29,7 @@ struct ZipOptions {
   std::uint64_t volume_size = 0;  ///< 0 for a single archive.
   std::string comment;
   bool test = false;
+  bool json = false;
 };
 
 struct UnzipOptions {
@@ -38,44 +38,28 @@ struct UnzipOptions {
   std::string destination = ".";
   std::string password_file;
   bool overwrite = false;
+  bool keep = false;  ///< Keeping existing files is what is wanted.
   bool no_folders = false;
   bool list = false;
+  bool json = false;
 };
 
 using archives::Progress;
 
-/// A progress bar on the terminal, which disappears when the work is done.
+/// Shows how far packing, testing or unpacking is.
 class ProgressBar {
  public:
-  explicit ProgressBar(const char* word) : word_(word), is_shown_(isatty(STDERR_FILENO) != 0) {}
-  ProgressBar(const ProgressBar&) = delete;
-  ProgressBar& operator=(const ProgressBar&) = delete;
-  ~ProgressBar() {
-    if (percent_ != none) std::cerr << "\r\033[K" << std::flush;
-  }
+  explicit ProgressBar(const char* word) : line_(word) {}
 
   [[nodiscard]] Progress progress() {
-    return Progress([this](std::uint64_t done, std::uint64_t total, TextView name) { return show(done, total, name); });
+    return Progress([this](std::uint64_t done, std::uint64_t total, TextView name) {
+      line_.show(done, total, to_utf8(name));
+      return true;
+    });
   }
 
  private:
-  static constexpr std::uint64_t none = 101;
-
-  bool show(std::uint64_t done, std::uint64_t total, TextView name) {
-    constexpr std::uint64_t whole = 100;
-    constexpr std::uint64_t step = 4;
-    const std::uint64_t percent = total == 0 ? whole : std::min(whole, done * whole / total);
-    if (!is_shown_ || percent == percent_) return true;
-    percent_ = percent;
-    const std::string bar = std::string(percent / step, '#') + std::string((whole - percent) / step, '.');
-    std::cerr << '\r' << word_ << " [" << bar << "] " << percent << " %  " << to_utf8(name.substr(0, 40)) << "\033[K"
-              << std::flush;
-    return true;
-  }
-
-  const char* word_;
-  bool is_shown_;
-  std::uint64_t percent_ = none;
+  ProgressLine line_;
 };
 
 Text text_of(const std::string& word) { return utf8_text(word, word); }
@@ -144,9 +128,10 @@ Text meant_name(TextView stored) {
   return name;
 }
 
-/// Reports the entries that are unpacked under a name that is safe on every system, but not their own.
-void report_changed_names(const archives::Archive& archive, const Text& items, bool keep_folders) {
+/// Warns of each entry that is unpacked under a name that is safe on every system, but not its own; returns how many.
+std::uint64_t report_changed_names(const archives::Archive& archive, const Text& items, bool keep_folders) {
   const archives::EntryFilter filter(items);
+  std::uint64_t changed = 0;
   for (std::uint64_t i = 0; i < archive.count(); ++i) {
     const Text stored = archive.entry(i).name;
     const auto parts = archives::safe_parts(stored);
@@ -155,21 +140,48 @@ void report_changed_names(const archives::Archive& archive, const Text& items, b
     Text meant = meant_name(stored);
     if (!keep_folders) meant.erase(0, meant.find_last_of(u'/') + 1);
     const Text made = keep_folders ? joined(*parts) : parts->back();
-    if (made != meant) std::cerr << "talutil: " << json::text(stored) << " is unpacked as " << json::text(made) << '\n';
+    if (made == meant) continue;
+    ++changed;
+    warn(json::text(stored) + " is unpacked as " + json::text(made));
+  }
+  return changed;
+}
+
+std::string time_words(const archives::Archive::Entry& entry, TextView pattern) {
+  constexpr std::int64_t seconds_a_day = 86400;
+  constexpr double epoch = 25569;  // 1 January 1970 as an automation date
+  return to_utf8(format_date({epoch + static_cast<double>(entry.facts.modified) / seconds_a_day}, pattern));
+}
+
+void print_entries_json(const archives::Archive& archive) {
+  for (std::uint64_t i = 0; i < archive.count(); ++i) {
+    const archives::Archive::Entry entry = archive.entry(i);
+    std::cout << json::object({{"name", json::text(entry.name)},
+                               {"size", std::to_string(entry.facts.size)},
+                               {"packed_size", std::to_string(entry.packed_size)},
+                               {"modified", json::text(time_words(entry, u"YYYY-MM-DDTHH:MM:SSZ"))},
+                               {"encrypted", entry.is_encrypted ? "true" : "false"}})
+              << '\n';
   }
 }
 
 void print_entries(const archives::Archive& archive) {
-  constexpr std::int64_t seconds_a_day = 86400;
-  constexpr double epoch = 25569;  // 1 January 1970 as an automation date
   for (std::uint64_t i = 0; i < archive.count(); ++i) {
     const archives::Archive::Entry entry = archive.entry(i);
-    const Date time{epoch + static_cast<double>(entry.facts.modified) / seconds_a_day};
     std::cout << std::setw(12) << entry.facts.size << std::setw(12) << entry.packed_size << "  "
-              << to_utf8(format_date(time, u"YYYY-MM-DD HH:MM:SS")) << (entry.is_encrypted ? " *" : "  ")
-              << to_utf8(entry.name) << '\n';
+              << time_words(entry, u"YYYY-MM-DD HH:MM:SS") << (entry.is_encrypted ? " *" : "  ") << to_utf8(entry.name)
+              << '\n';
   }
   if (const Text comment = archive.comment(); !comment.empty()) std::cout << to_utf8(comment) << '\n';
+}
+
+/// What was done, in numbers: a sentence on standard error, or an object on standard output.
+void print_summary(bool as_json, const std::string& archive,
+                   const std::vector<std::pair<std::string_view, std::uint64_t>>& numbers, const std::string& words) {
+  if (!as_json) return warn(archive + ": " + std::to_string(numbers.front().second) + " " + words);
+  std::vector<json::Field> fields{{"archive", json::text(std::string_view(archive))}};
+  for (const auto& [name, number] : numbers) fields.emplace_back(name, std::to_string(number));
+  std::cout << json::object(fields) << '\n';
 }
 
 void test_archive(const ZipOptions& options, posix::PosixPlatform& platform) {
@@ -182,11 +194,12 @@ void test_archive(const ZipOptions& options, posix::PosixPlatform& platform) {
     Progress progress = bar.progress();
     archive.test(unpacking, question(platform.input_boxes), progress);
   }
-  std::cout << options.archive << ": " << archive.count() << " entries, all well\n";
+  print_summary(options.json, options.archive, {{"entries", archive.count()}}, "entries tested, no damage");
 }
 
-void pack_archive(const ZipOptions& options) {
+int pack_archive(const ZipOptions& options) {
   posix::PosixPlatform platform;
+  std::uint64_t changed = 0;
   on_archive(options.archive, [&] {
     if (options.test) return test_archive(options, platform);
     if (options.items.empty()) throw usage_failure("zip: name what is to be packed: talutil zip ARCHIVE ITEM...");
@@ -195,14 +208,20 @@ void pack_archive(const ZipOptions& options) {
     packing.aes = options.aes;
     packing.level = options.level;
     packing.comment = text_of(options.comment);
+    packing.needs_every_item = true;
     packing.password = read_password(options.password_file);
-    if (options.encrypt) packing.password = ask_new_password(platform.input_boxes);
+    if (options.encrypt && packing.password.empty()) packing.password = ask_new_password(platform.input_boxes);
     if (options.aes && packing.password.empty()) {
       throw usage_failure("--aes wants a password: give --encrypt or --password-file");
     }
     if (options.volume_size != 0) packing.volume_size = options.volume_size;
     const Text name = text_of(options.archive);
-    const auto report = [&] { report_changed_names(archives::Archive(name, platform.folders), {}, true); };
+    std::uint64_t entries = 0;
+    const auto report = [&] {
+      const archives::Archive archive(name, platform.folders);
+      entries = archive.count();
+      changed = report_changed_names(archive, {}, true);
+    };
     try {
       ProgressBar bar("packing");
       Progress progress = bar.progress();
@@ -212,25 +231,68 @@ void pack_archive(const ZipOptions& options) {
       throw;
     }
     report();
+    print_summary(options.json, options.archive, {{"entries", entries}, {"renamed", changed}}, "entries");
   });
+  return changed == 0 ? 0 : partial_status;
 }
 
-void unpack_archive(const UnzipOptions& options) {
+/// How much of an unpacking was not done as stored.
+struct Remainder {
+  std::uint64_t chosen = 0;  ///< The entries that were to be unpacked.
+  std::uint64_t kept = 0;
+  std::uint64_t renamed = 0;
+};
+
+void extract(const UnzipOptions& options, archives::Archive& archive, posix::PosixPlatform& platform,
+             Remainder& remainder) {
+  archives::UnpackingOptions unpacking;
+  unpacking.items = item_list(options.items);
+  unpacking.password = read_password(options.password_file);
+  unpacking.overwrite = options.overwrite;
+  unpacking.keep_folders = !options.no_folders;
+  unpacking.notice = [&](const Text& entry, archives::Fate fate, std::string_view reason) {
+    if (fate == archives::Fate::kept) {
+      ++remainder.kept;
+      return;
+    }
+    warn(options.archive + ": " + json::text(entry) + " was left out: " + std::string(reason));
+  };
+  const archives::EntryFilter filter(unpacking.items);
+  for (std::uint64_t i = 0; i < archive.count(); ++i) {
+    if (filter.matches(archives::parts_of(archive.entry(i).name))) ++remainder.chosen;
+  }
+  remainder.renamed = report_changed_names(archive, unpacking.items, unpacking.keep_folders);
+  ProgressBar bar("unpacking");
+  Progress progress = bar.progress();
+  archive.extract(text_of(options.destination), unpacking, platform.folders, platform.files,
+                  question(platform.input_boxes), progress);
+}
+
+int unpack_archive(const UnzipOptions& options) {
   posix::PosixPlatform platform;
+  Remainder remainder;
   on_archive(options.archive, [&] {
     archives::Archive archive(text_of(options.archive), platform.folders);
-    if (options.list) return print_entries(archive);
-    archives::UnpackingOptions unpacking;
-    unpacking.items = item_list(options.items);
-    unpacking.password = read_password(options.password_file);
-    unpacking.overwrite = options.overwrite;
-    unpacking.keep_folders = !options.no_folders;
-    report_changed_names(archive, unpacking.items, unpacking.keep_folders);
-    ProgressBar bar("unpacking");
-    Progress progress = bar.progress();
-    archive.extract(text_of(options.destination), unpacking, platform.folders, platform.files,
-                    question(platform.input_boxes), progress);
+    if (options.list) return options.json ? print_entries_json(archive) : print_entries(archive);
+    const auto say_kept = [&] {
+      if (remainder.kept == 0 || options.keep) return;
+      warn(options.archive + ": " + std::to_string(remainder.kept) +
+           " existing files were kept; --overwrite replaces them, --keep keeps them silently");
+    };
+    try {
+      extract(options, archive, platform, remainder);
+    } catch (const archives::Error&) {
+      say_kept();
+      throw;
+    }
+    say_kept();
+    print_summary(
+        options.json, options.archive,
+        {{"unpacked", remainder.chosen - remainder.kept}, {"kept", remainder.kept}, {"renamed", remainder.renamed}},
+        "entries unpacked");
   });
+  const bool is_whole = remainder.renamed == 0 && (remainder.kept == 0 || options.keep);
+  return is_whole ? 0 : partial_status;
 }
 
 }  // namespace
@@ -253,6 +315,7 @@ void add_archives(CLI::App& app, Work& work) {
       ->transform(CLI::AsSizeValue(true));
   zip->add_option("--comment", packing->comment, "The archive's comment");
   zip->footer("  talutil password | tee key | talutil zip backup.zip DATA --password-file -");
+  add_json(*zip, packing->json, "Print what was done as JSON");
   choose(*zip, work, packing, &pack_archive);
 
   const auto unpacking = std::make_shared<UnzipOptions>();
@@ -263,9 +326,12 @@ void add_archives(CLI::App& app, Work& work) {
       ->capture_default_str();
   unzip->add_option("--password-file", unpacking->password_file,
                     "Read the password from its first line; - is standard input");
-  unzip->add_flag("--overwrite", unpacking->overwrite, "Replace existing files; by default they are kept");
+  auto* const overwrite = unzip->add_flag("--overwrite", unpacking->overwrite, "Replace existing files");
+  unzip->add_flag("--keep", unpacking->keep, "Keep existing files without a warning and with exit code 0")
+      ->excludes(overwrite);
   unzip->add_flag("--no-folders", unpacking->no_folders, "Write all files into one folder");
   unzip->add_flag("--list", unpacking->list, "List the entries instead: size, packed size, time (UTC), name");
+  add_json(*unzip, unpacking->json, "Print what was done, or with --list one object per entry, as JSON");
   choose(*unzip, work, unpacking, &unpack_archive);
 }
 

@@ -6,6 +6,7 @@
 #include "automation/late_call.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
+#include "controls/delimited_text.hpp"
 
 namespace talutil::cli {
 
@@ -26,10 +27,28 @@ struct WrittenForm {
 Variant read_list(std::string_view rest, const Locale& /*locale*/) {
   TextArray list;
   list.allocated = true;
+  if (rest.find('"') != std::string_view::npos) {
+    const auto rows = read_delimited(utf8_text(rest, "@list:"), u',');
+    list.items = rows.front();
+    return list;
+  }
   for (std::size_t start = 0; !rest.empty() && start <= rest.size();) {
     const std::size_t end = std::min(rest.find(',', start), rest.size());
     list.items.push_back(utf8_text(rest.substr(start, end - start), "@list:"));
     start = end + 1;
+  }
+  return list;
+}
+
+Variant read_lines(std::string_view rest, const Locale& /*locale*/) {
+  TextArray list;
+  list.allocated = true;
+  const Text text = utf8_text(read_bytes(std::string(rest)), std::string(rest));
+  for (TextView left = text; !left.empty();) {
+    TextView line = left.substr(0, left.find(u'\n'));
+    left.remove_prefix(std::min(line.size() + 1, left.size()));
+    if (line.ends_with(u'\r')) line.remove_suffix(1);
+    list.items.emplace_back(line);
   }
   return list;
 }
@@ -48,7 +67,10 @@ constexpr WrittenForm written_forms[] = {
      [](View rest, const Locale& locale) -> Variant { return Variant(typed_text(rest)).to_double(locale); }},
     {"@date:", "@date:31/03/2009", "a date and time, day first",
      [](View rest, const Locale& locale) -> Variant { return Variant(typed_text(rest)).to_date(locale); }},
-    {"@list:", "@list:A,B,C", "an array of texts, from index 0", &read_list},
+    {"@text:", "@text:5", "a text, even of digits",
+     [](View rest, const Locale&) -> Variant { return typed_text(rest); }},
+    {"@list:", "@list:A,B,C", "an array of texts, from index 0; a text with a comma in double quotes", &read_list},
+    {"@lines:", "@lines:PATH", "an array of the lines of a file in UTF-8", &read_lines},
     {"@file:", "@file:PATH", "the text of a file in UTF-8",
      [](View rest, const Locale&) -> Variant { return utf8_text(read_bytes(std::string(rest)), std::string(rest)); }},
     {"@-", "@-", "the text of standard input, in UTF-8",
@@ -76,6 +98,8 @@ TypeWords type_words(ValueType type) noexcept {
       return {"a date", "DD/MM/YYYY, DD/MM/YYYY HH:MM or HH:MM"};
     case ValueType::text:
       return {"a text", "the text itself, \"\" for an empty one"};
+    case ValueType::variant:
+      return {"a value", "a text, or a number; @text:5 for the text 5"};
     case ValueType::text_array:
       return {"a list", "@list:A,B,C, or @empty for an array that holds nothing yet"};
     default:
@@ -102,6 +126,23 @@ Variant converted(ValueType type, const Variant& value, const Locale& locale) {
       return convert<TextArray>(value, locale);
     default:
       return value;
+  }
+}
+
+/// What was typed for a parameter without a type: a number if it is written as the library writes that number, so that
+/// its text is the same, otherwise a text.
+Variant untyped(std::string_view typed, const Locale& locale) {
+  const bool may_be_number = !typed.empty() && typed.find_first_not_of("+-.0123456789") == std::string_view::npos;
+  Text text = typed_text(typed);
+  if (!may_be_number) return text;
+  try {
+    const Variant number = Variant(text).to_double(locale);
+    if (number.to_text(locale) != text) return text;
+    const double value = *number.get_if<double>();
+    const bool is_whole = typed.find('.') == std::string_view::npos && value >= -2147483648.0 && value <= 2147483647.0;
+    return is_whole ? Variant(static_cast<std::int32_t>(value)) : number;
+  } catch (const RunTimeError&) {
+    return text;
   }
 }
 
@@ -140,7 +181,8 @@ std::string written_forms_help() {
 std::string_view how_to_write(ValueType type) noexcept { return type_words(type).how; }
 
 Variant argument_for(const Parameter& parameter, std::string_view typed, const Locale& locale) {
-  Variant value = read_argument(typed, locale);
+  const bool is_untyped = parameter.type == ValueType::variant && !typed.starts_with('@');
+  Variant value = is_untyped ? untyped(typed, locale) : read_argument(typed, locale);
   if (value == Variant(missing_argument)) {
     if (!parameter.is_optional) throw run_time_failure("is not optional; write a value for it");
     return value;

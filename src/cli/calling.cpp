@@ -4,6 +4,7 @@
 
 #include "cli/arguments.hpp"
 #include "cli/failure.hpp"
+#include "cli/json.hpp"
 
 namespace talutil::cli {
 
@@ -22,6 +23,17 @@ std::string count_words(const Member& member) {
     separator = ", ";
   }
   return parameters.empty() ? words : words + ")";
+}
+
+/// What a member was called with, for the report of its error: "iSt = 2, iEn = 1".
+std::string called_with(const Member& member, const std::vector<std::string>& typed) {
+  constexpr std::size_t longest = 40;
+  std::string words;
+  for (std::size_t i = 0; i < typed.size(); ++i) {
+    words += (words.empty() ? "" : ", ") + std::string(member.parameters()[i].name) + " = ";
+    words += json::text(std::string_view(typed[i]).substr(0, longest)) + (typed[i].size() > longest ? "..." : "");
+  }
+  return words;
 }
 
 void put_setting(Session& session, const std::string& written) {
@@ -72,7 +84,10 @@ Variant call_slot(Session& session, const Member& member, const std::vector<std:
     }
     return session.call(member, arguments);
   } catch (const RunTimeError& error) {
-    throw run_time_failure(name + ": " + error_words(error));
+    const bool has_arguments = member.access == Access::call && !typed.empty();
+    throw Failure(run_time_status,
+                  name + ": " + error_words(error) + (has_arguments ? "; " + called_with(member, typed) : ""),
+                  error.number());
   }
 }
 

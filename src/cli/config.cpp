@@ -5,8 +5,10 @@
 #include "cli/escapes.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
+#include "cli/json.hpp"
 #include "cli/options.hpp"
 #include "cli/session.hpp"
+#include "platform/posix/data_folder.hpp"
 #include "platform/profile_document.hpp"
 #include "services/settings_groups.hpp"
 
@@ -25,6 +27,7 @@ struct ConfigOptions {
   std::string value;
   std::string profile;  ///< The file that export writes and import reads.
   bool force = false;
+  bool json = false;
 };
 
 using Setting = posix::PosixSettingsStore::Setting;
@@ -33,6 +36,9 @@ using Setting = posix::PosixSettingsStore::Setting;
 class ConfigSession {
  public:
   explicit ConfigSession(const ConfigOptions& options) : options_(options) {
+    if (!options.file.empty() && !(options.database.empty() && options.user.empty())) {
+      throw usage_failure("--file " + options.file + " has no database and no user; leave --database and --user out");
+    }
     session_.settings().sDatabaseName = text(options.database, "--database");
     session_.settings().sUserName = text(options.user, "--user");
   }
@@ -74,10 +80,17 @@ std::string place_of(const ConfigOptions& options) {
   return options.item + " in [" + options.section + "]" + (options.file.empty() ? "" : " of " + options.file);
 }
 
-void print_settings(const std::vector<Setting>& settings, const Text& only_section) {
+void print_settings(const std::vector<Setting>& settings, const Text& only_section, bool as_json) {
   std::optional<Text> section;
   for (const Setting& each : settings) {
     if (!only_section.empty() && !equals_without_case(each.section, only_section)) continue;
+    if (as_json) {
+      std::cout << json::object({{"section", json::text(each.section)},
+                                 {"item", json::text(each.key)},
+                                 {"value", json::text(each.value)}})
+                << '\n';
+      continue;
+    }
     if (section != each.section) std::cout << '[' << to_utf8(escapes::write(each.section)) << "]\n";
     section = each.section;
     std::cout << to_utf8(escapes::write(each.key)) << '=' << to_utf8(escapes::write(each.value)) << '\n';
@@ -105,7 +118,22 @@ void config_get(const ConfigOptions& options) {
     if (value->empty()) value.reset();  // an empty value of a file is a missing one
   }
   if (!value) throw run_time_failure("there is no " + place_of(options));
-  std::cout << to_utf8(*value) << '\n';
+  std::cout << (options.json ? json::object({{"value", json::text(*value)}}) : to_utf8(*value)) << '\n';
+}
+
+/// Removes a setting, a user's also from the database's group, as set writes both.
+void config_unset(const ConfigOptions& options) {
+  if (!options.file.empty()) {
+    throw usage_failure("unset: settings in a profile file cannot be removed; delete the line of " + options.item);
+  }
+  ConfigSession session(options);
+  const Text section = ConfigSession::text(options.section, "SECTION");
+  const Text item = ConfigSession::text(options.item, "ITEM");
+  bool was_there = session.store().remove(session.group(), section, item);
+  if (options.group == "user") {
+    was_there |= session.store().remove(settings_groups::database(session.settings()), section, item);
+  }
+  if (!was_there) throw run_time_failure("there is no " + place_of(options));
 }
 
 void config_set(const ConfigOptions& options) {
@@ -139,15 +167,17 @@ void config_set(const ConfigOptions& options) {
 void config_list(const ConfigOptions& options) {
   ConfigSession session(options);
   const Text section = ConfigSession::text(options.section, "SECTION");
-  if (options.file.empty()) return print_settings(session.store().settings_of(session.group()), section);
+  if (options.file.empty()) {
+    return print_settings(session.store().settings_of(session.group()), section, options.json);
+  }
   const Text file = ConfigSession::text(options.file, "--file");
-  print_settings(settings_in(session.platform().files.native(file)), section);
+  print_settings(settings_in(session.platform().files.native(file)), section, options.json);
 }
 
 void config_export(const ConfigOptions& options) {
   ConfigSession session(options);
   const std::vector<Setting> settings = session.store().settings_of(session.user_group());
-  if (!options.force && std::filesystem::exists(options.profile)) {
+  if (!options.force && std::filesystem::is_regular_file(options.profile)) {
     throw run_time_failure(options.profile + " is there already; --force replaces it");
   }
   std::string bytes = "\xEF\xBB\xBF; Settings of a user; talutil config import reads them\r\n";
@@ -160,10 +190,14 @@ void config_export(const ConfigOptions& options) {
     bytes += to_utf8(escapes::write(each.key)) + '=' + to_utf8(escapes::write(each.value)) + "\r\n";
   }
   write_bytes(options.profile, bytes);
-  std::cout << settings.size() << " settings written to " << options.profile << '\n';
+  const std::string count = std::to_string(settings.size());
+  if (options.json)
+    (options.profile == "-" ? std::cerr : std::cout) << json::object({{"settings", count}}) << '\n';
+  else
+    warn(count + " settings written to " + shown_output(options.profile));
 }
 
-void config_import(const ConfigOptions& options) {
+int config_import(const ConfigOptions& options) {
   ConfigSession session(options);
   const Text group = session.user_group();
   // Reads the whole file before writing anything.
@@ -173,6 +207,10 @@ void config_import(const ConfigOptions& options) {
       each = {escapes::read(each.section), escapes::read(each.key), escapes::read(each.value)};
     }
   });
+  if (settings.empty()) {
+    throw run_time_failure(shown_input(options.profile) +
+                           ": there is no setting in it; is it a file written by export?");
+  }
   std::size_t added = 0;
   std::size_t same = 0;
   std::size_t differing = 0;
@@ -181,9 +219,23 @@ void config_import(const ConfigOptions& options) {
     ++(!old ? added : *old == each.value ? same : differing);
     if (!old || (options.force && *old != each.value)) session.store().put(group, each.section, each.key, each.value);
   }
-  std::cout << added << " settings added, " << same << " the same, " << differing
-            << (options.force ? " replaced" : " kept as they were") << '\n';
-  if (differing > 0 && !options.force) std::cerr << "talutil: --force replaces settings that differ\n";
+  if (options.json) {
+    std::cout << json::object({{"added", std::to_string(added)},
+                               {"same", std::to_string(same)},
+                               {options.force ? "replaced" : "kept", std::to_string(differing)}})
+              << '\n';
+  } else {
+    warn(std::to_string(added) + " settings added, " + std::to_string(same) + " the same, " +
+         std::to_string(differing) + (options.force ? " replaced" : " kept as they were; --force replaces them"));
+  }
+  return differing == 0 || options.force ? 0 : partial_status;
+}
+
+/// Takes what the options leave out from the environment. A profile file has neither database nor user.
+void take_environment(ConfigOptions& options) {
+  if (!options.file.empty()) return;
+  if (options.database.empty()) options.database = posix::environment("TALUTIL_DATABASE");
+  if (options.user.empty()) options.user = posix::environment("TALUTIL_USER");
 }
 
 }  // namespace
@@ -192,11 +244,16 @@ void add_config(CLI::App& app, Work& work) {
   auto* const config = app.add_subcommand("config", "Read and write settings in a profile file or the user's store");
   config->require_subcommand(1);
   const auto options = std::make_shared<ConfigOptions>();
-  const auto add = [&](const char* name, const char* help, void (*function)(const ConfigOptions&)) {
+  const auto add = [&](const char* name, const char* help, auto function) {
     auto* const command = config->add_subcommand(name, help);
-    command->add_option("--database", options->database, "The database of the settings (sDatabaseName)");
-    command->add_option("--user", options->user, "The user of the settings (sUserName)");
-    choose(*command, work, options, function);
+    command->add_option("--database", options->database,
+                        "The database of the settings (sDatabaseName); default: TALUTIL_DATABASE");
+    command->add_option("--user", options->user, "The user of the settings (sUserName); default: TALUTIL_USER");
+    add_json(*command, options->json, "Print the answer as JSON");
+    choose(*command, work, options, [function](ConfigOptions& chosen) {
+      take_environment(chosen);
+      return function(chosen);
+    });
     return command;
   };
   const auto add_place = [&](CLI::App* command) {
@@ -208,7 +265,9 @@ void add_config(CLI::App& app, Work& work) {
   auto* const get = add_place(add("get", "Print a setting", &config_get));
   auto* const set =
       add_place(add("set", "Write a setting; a user's setting also to the database's group", &config_set));
-  for (CLI::App* const command : {get, set}) {
+  auto* const unset =
+      add_place(add("unset", "Remove a setting; a user's setting also from the database's group", &config_unset));
+  for (CLI::App* const command : {get, set, unset}) {
     command->add_option("SECTION", options->section)->required();
     command->add_option("ITEM", options->item)->required();
   }
@@ -219,7 +278,9 @@ void add_config(CLI::App& app, Work& work) {
   auto* const importing = add("import", "Read a user's settings from a file written by export", &config_import);
   exporting->add_flag("--force", options->force, "Replace an existing file");
   importing->add_flag("--force", options->force, "Replace settings that differ");
-  for (CLI::App* const command : {exporting, importing}) command->add_option("FILE", options->profile)->required();
+  for (CLI::App* const command : {exporting, importing}) {
+    command->add_option("FILE", options->profile, "- is standard input or output")->required();
+  }
 }
 
 }  // namespace talutil::cli

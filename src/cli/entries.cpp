@@ -1,67 +1,20 @@
 #include "cli/entries.hpp"
 
 #include <algorithm>
-#include <numeric>
 
 #include "cli/failure.hpp"
+#include "cli/near_names.hpp"
 
 namespace talutil::cli {
 
 namespace {
 
-/// The number of letters to insert, remove or change to turn one name into the other, ignoring case.
-std::size_t edit_distance(std::string_view a, std::string_view b) {
-  std::vector<std::size_t> row(b.size() + 1);
-  std::iota(row.begin(), row.end(), std::size_t{0});
-  for (std::size_t i = 0; i < a.size(); ++i) {
-    std::size_t diagonal = row[0];
-    row[0] = i + 1;
-    for (std::size_t j = 0; j < b.size(); ++j) {
-      const std::size_t changed = diagonal + (fold_case(a[i]) == fold_case(b[j]) ? 0 : 1);
-      diagonal = row[j + 1];
-      row[j + 1] = std::min({changed, row[j] + 1, diagonal + 1});
-    }
-  }
-  return row.back();
-}
-
-bool contains_without_case(std::string_view text, std::string_view part) {
-  const auto same = [](char a, char b) { return fold_case(a) == fold_case(b); };
-  return std::search(text.begin(), text.end(), part.begin(), part.end(), same) != text.end();
-}
-
-/// The names that were probably meant, the most likely first.
-std::vector<std::string_view> nearest_names(std::span<const Member> members, std::string_view typed) {
-  constexpr std::size_t most_names = 4;
-  constexpr std::size_t shortest_part = 3;
-  const std::size_t most_edits = 1 + typed.size() / 6;
-  std::vector<std::pair<std::size_t, std::string_view>> near;
-  for (const Entry& entry : entries_of(members)) {
-    const std::string_view name = entry.any().name;
-    std::size_t distance = edit_distance(typed, name);
-    // Part of a name also counts as near, but after every real typing error.
-    const bool is_part = typed.size() >= shortest_part && contains_without_case(name, typed);
-    if (distance > most_edits && !is_part) continue;
-    if (distance > most_edits) distance += typed.size();
-    near.emplace_back(distance, name);
-  }
-  std::ranges::stable_sort(near, {}, &std::pair<std::size_t, std::string_view>::first);
-  if (near.size() > most_names) near.resize(most_names);
-  std::vector<std::string_view> names;
-  std::ranges::transform(near, std::back_inserter(names), &std::pair<std::size_t, std::string_view>::second);
-  return names;
-}
-
 std::string unknown_member_message(std::span<const Member> members, std::string_view typed) {
-  std::string message = "there is no member \"" + std::string(typed) + "\"; ";
-  const auto names = nearest_names(members, typed);
-  if (names.empty()) return message + "\"talutil list\" shows all";
-  message += "did you mean ";
-  for (std::size_t i = 0; i < names.size(); ++i) {
-    if (i > 0) message += i + 1 == names.size() ? " or " : ", ";
-    message += names[i];
-  }
-  return message + "?";
+  const std::string message = "there is no member \"" + std::string(typed) + "\"; ";
+  std::vector<std::string_view> names;
+  for (const Entry& entry : entries_of(members)) names.push_back(entry.any().name);
+  const auto nearest = nearest_names(names, typed);
+  return message + (nearest.empty() ? "\"talutil list\" shows all" : did_you_mean(nearest));
 }
 
 std::string parameter_words(const Parameter& parameter) {

@@ -1,9 +1,12 @@
 #include <charconv>
+#include <iostream>
 
 #include "automation/control.hpp"
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
+#include "cli/json.hpp"
 #include "cli/options.hpp"
+#include "cli/table.hpp"
 #include "controls/grid.hpp"
 #include "forms/grid_export.hpp"
 #include "platform/posix/posix_platform.hpp"
@@ -17,6 +20,8 @@ struct ExportOptions {
   std::vector<std::string> hidden;  ///< Columns, counted from 1.
   std::string rows;                 ///< "3-7" or "3"; empty for all.
   std::string output;
+  InputEncoding encoding;
+  bool json = false;
 };
 
 /// A word as a whole number.
@@ -45,6 +50,7 @@ void select_rows(Grid& grid, const ExportOptions& options) {
   const std::size_t dash = options.rows.find('-');
   const std::int32_t first = number_of(options.rows.substr(0, dash), "--rows");
   const std::int32_t last = dash == std::string::npos ? first : number_of(options.rows.substr(dash + 1), "--rows");
+  if (first > last) throw usage_failure("--rows " + options.rows + ": the first row is after the last");
   if (first >= grid.Rows() || last >= grid.Rows()) {
     throw usage_failure("--rows: there is no row " + std::to_string(std::max(first, last)) + "; " + options.table +
                         " has rows 0 to " + std::to_string(grid.Rows() - 1));
@@ -53,21 +59,11 @@ void select_rows(Grid& grid, const ExportOptions& options) {
   grid.put_RowSel(last);
 }
 
-/// Does some work on a file; reports a run-time error with the file's name.
-template <class Work>
-void on_file(const std::string& path, Work work) {
-  try {
-    work();
-  } catch (const RunTimeError& error) {
-    throw run_time_failure(path + ": " + error_words(error));
-  }
-}
-
 void export_table(const ExportOptions& options) {
-  constexpr auto comma_text = static_cast<std::int16_t>(Grid::Format::comma_text);
   posix::PosixPlatform platform;
+  platform.files.allow_streams();
   const auto source = std::make_shared<Grid>(platform.platform());
-  on_file(options.table, [&] { source->LoadGrid(utf8_text(options.table, "--from"), comma_text, Boolean(true)); });
+  fill_grid(*source, read_table(options.table, options.encoding));
   hide_columns(*source, options);
   if (!options.rows.empty()) select_rows(*source, options);
 
@@ -79,8 +75,14 @@ void export_table(const ExportOptions& options) {
       work.copy_all_rows(0);
     else
       work.copy_selected_rows();
-    work.save(utf8_text(options.output, "the file's name"), true);
+    work.save(output_path(options.output), true);
   });
+  if (!options.json) return;
+  (options.output == "-" ? std::cerr : std::cout)
+      << json::object({{"rows", std::to_string(source->Rows())},
+                       {"columns", std::to_string(source->Cols())},
+                       {"output", json::text(std::string_view(options.output))}})
+      << '\n';
 }
 
 }  // namespace
@@ -88,7 +90,9 @@ void export_table(const ExportOptions& options) {
 void add_export(CLI::App& app, Work& work) {
   const auto options = std::make_shared<ExportOptions>();
   auto* const command = app.add_subcommand("export", "Write the visible rows and columns of a table, as a grid does");
-  command->add_option("--from", options->table, "The table, comma-separated; its first line, the header, is row 0")
+  command
+      ->add_option("--from", options->table,
+                   "The table, comma-separated; its first line, the header, is row 0; - is standard input")
       ->required()
       ->type_name("FILE");
   command->add_option("--hide", options->hidden, "Columns to leave out, counted from 1: 2,5")
@@ -97,7 +101,9 @@ void add_export(CLI::App& app, Work& work) {
       ->type_name("COLUMNS");
   command->add_option("--rows", options->rows, "The rows to write, for example 3-7; default: all")
       ->type_name("FIRST-LAST");
-  command->add_option("FILE", options->output, "The file to write, comma-separated")->required();
+  command->add_option("FILE", options->output, "The file to write, comma-separated; - is standard output")->required();
+  add_encoding(*command, options->encoding.name);
+  add_json(*command, options->json, "Print what was written as JSON");
   choose(*command, work, options, &export_table);
 }
 

@@ -1,37 +1,88 @@
 #include "cli/files.hpp"
 
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <array>
 #include <cerrno>
 #include <cstring>
-#include <fstream>
 #include <iostream>
-#include <iterator>
 
 #include "cli/failure.hpp"
+#include "platform/posix/posix_files.hpp"
 
 namespace talutil::cli {
 
-std::string read_bytes(const std::string& path) {
-  const auto all_of = [](std::istream& in) { return std::string(std::istreambuf_iterator<char>(in), {}); };
-  if (path == "-") return all_of(std::cin);
-  const auto failed = [&](const std::string& reason) {
-    return run_time_failure("cannot read \"" + path + "\": " + reason);
-  };
-  std::ifstream file(path, std::ios::binary);
-  if (!file) throw failed(std::strerror(errno));
-  try {
-    return all_of(file);
-  } catch (const std::ios_base::failure& error) {
-    // A folder can be opened but not read.
-    throw failed(error.code().message());
+std::string shown_input(const std::string& path) { return path == "-" ? "standard input" : path; }
+std::string shown_output(const std::string& path) { return path == "-" ? "standard output" : path; }
+
+Input::Input(const std::string& path)
+    : path_(shown_input(path)), file_(path == "-" ? STDIN_FILENO : open(path.c_str(), O_RDONLY | O_CLOEXEC)) {
+  struct stat status {};
+  const bool is_open = file_ >= 0 && fstat(file_, &status) == 0;
+  if (is_open && S_ISDIR(status.st_mode)) errno = EISDIR;
+  if (!is_open || S_ISDIR(status.st_mode)) {
+    throw run_time_failure("cannot read \"" + path_ + "\": " + std::strerror(errno));
+  }
+  if (S_ISREG(status.st_mode)) size_ = static_cast<std::uint64_t>(status.st_size);
+}
+
+Input::~Input() {
+  if (file_ > STDERR_FILENO) close(file_);
+}
+
+std::size_t Input::read(std::span<char> buffer) {
+  for (;;) {
+    const ssize_t count = ::read(file_, buffer.data(), buffer.size());
+    if (count < 0 && errno == EINTR) continue;
+    if (count < 0) throw run_time_failure("cannot read \"" + path_ + "\": " + std::strerror(errno));
+    done_ += static_cast<std::uint64_t>(count);
+    return static_cast<std::size_t>(count);
   }
 }
 
-void write_bytes(const std::string& path, std::string_view bytes) {
-  std::ofstream file(path, std::ios::binary | std::ios::trunc);
-  file.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
-  file.close();
-  if (!file) throw run_time_failure("cannot write \"" + path + "\": " + std::strerror(errno));
+Output::Output(std::string path) : path_(std::move(path)) {
+  on_file("cannot write \"" + shown_output(path_) + "\"", [&] {
+    // What was printed before stays before.
+    if (path_ == "-") std::cout.flush();
+    posix::PosixFiles files;
+    files.allow_streams();
+    file_ = files.open_output(output_path(path_));
+  });
 }
+
+void Output::write(std::string_view bytes) {
+  constexpr std::size_t enough = 1U << 18U;
+  bytes_ += bytes;
+  if (bytes_.size() >= enough) flush();
+}
+
+void Output::close() {
+  flush();
+  on_file("cannot write \"" + shown_output(path_) + "\"", [&] { file_->close(); });
+}
+
+void Output::flush() {
+  on_file("cannot write \"" + shown_output(path_) + "\"", [&] { file_->write(bytes_); });
+  bytes_.clear();
+}
+
+std::string read_bytes(const std::string& path) {
+  Input input(path);
+  std::string bytes;
+  std::array<char, 1U << 16U> buffer;
+  while (const std::size_t count = input.read(buffer)) bytes.append(buffer.data(), count);
+  return bytes;
+}
+
+void write_bytes(const std::string& path, std::string_view bytes) {
+  Output output(path);
+  output.write(bytes);
+  output.close();
+}
+
+Text output_path(const std::string& path) { return utf8_text(path == "-" ? "/dev/stdout" : path, "the file's name"); }
 
 Text utf8_text(std::string_view bytes, const std::string& what) {
   Text text = from_utf8(bytes);

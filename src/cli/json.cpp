@@ -2,6 +2,7 @@
 
 #include <array>
 #include <charconv>
+#include <cmath>
 #include <type_traits>
 
 namespace talutil::cli::json {
@@ -40,6 +41,22 @@ std::size_t plain_units(TextView text) {
   const char16_t unit = text.front();
   if (is_high_surrogate(unit)) return text.size() > 1 && is_low_surrogate(text[1]) ? 2 : 0;
   return unit < u' ' || unit == u'\x7F' || unit == u'"' || unit == u'\\' || is_low_surrogate(unit) ? 0 : 1;
+}
+
+/// What a value without a JSON form is.
+std::string_view kind_word(Variant::Kind kind) noexcept {
+  switch (kind) {
+    case Variant::Kind::empty:
+      return "empty";
+    case Variant::Kind::error:
+      return "error";
+    case Variant::Kind::object:
+      return "object";
+    case Variant::Kind::system_time:
+      return "SYSTEMTIME";
+    default:
+      return "array";
+  }
 }
 
 template <class Number>
@@ -82,6 +99,14 @@ std::string text(TextView value) {
 
 std::string text(std::string_view utf8) { return text(from_utf8(utf8)); }
 
+Text iso(const Date& date) {
+  const double day = std::trunc(date.days);
+  const bool has_time = date.days != day;
+  if (day == 0) return format_date(date, u"HH:MM:SS");
+  const Text words = format_date(date, u"YYYY-MM-DD");
+  return has_time ? words + u"T" + format_date(date, u"HH:MM:SS") : words;
+}
+
 std::string array(const std::vector<std::string>& values) {
   return joined('[', values, ']', [](const std::string& item) { return item; });
 }
@@ -98,12 +123,16 @@ std::string value(const Variant& value, const Locale& locale) {
       return held ? "true" : "false";
     else if constexpr (std::is_arithmetic_v<T>)
       return number(held);
-    else if constexpr (std::is_same_v<T, Date> || std::is_same_v<T, Currency>)
+    else if constexpr (std::is_same_v<T, Date>)
+      return text(iso(held));
+    else if constexpr (std::is_same_v<T, Currency>)
       return text(value.to_text(locale));
     else if constexpr (std::is_same_v<T, TextArray>)
       return texts(held);
-    else
+    else if constexpr (std::is_same_v<T, Null>)
       return "null";
+    else
+      return object({{"kind", text(kind_word(value.kind()))}});
   });
 }
 

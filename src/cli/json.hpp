@@ -20,8 +20,11 @@ using Field = std::pair<std::string_view, std::string>;
 [[nodiscard]] std::string array(const std::vector<std::string>& values);
 [[nodiscard]] std::string object(const std::vector<Field>& fields);
 
-/// Texts, numbers and Booleans as such, arrays as arrays, dates and currency as their texts; null for anything without
-/// a value (Null, Empty, an object, an array that was never allocated).
+/// A date in ISO form: "2009-03-31", "2009-03-31T13:45:00", or "13:45:00" for a time of day alone.
+[[nodiscard]] Text iso(const Date& date);
+
+/// Texts, numbers and Booleans as such, arrays of texts as arrays, dates in ISO form, currency as its text, Null as
+/// null. Anything else is an object that says what it is: {"kind": "empty"} for Empty.
 [[nodiscard]] std::string value(const Variant& value, const Locale& locale);
 
 }  // namespace talutil::cli::json

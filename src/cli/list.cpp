@@ -2,9 +2,12 @@
 #include <iostream>
 
 #include "cli/entries.hpp"
+#include "cli/failure.hpp"
+#include "cli/files.hpp"
 #include "cli/json.hpp"
 #include "cli/options.hpp"
 #include "cli/session.hpp"
+#include "platform/file_names.hpp"
 #include "texts/member_texts.hpp"
 
 namespace talutil::cli {
@@ -12,6 +15,7 @@ namespace talutil::cli {
 namespace {
 
 struct ListOptions {
+  std::string pattern;
   bool json = false;
 };
 
@@ -48,8 +52,18 @@ void print_line(const Entry& entry) {
   std::cout << line << signature(entry) << '\n';
 }
 
+/// Whether a name fits a pattern with * and ?; a pattern without them is a part of the name.
+bool fits(std::string_view name, const Text& pattern) {
+  if (pattern.empty()) return true;
+  const bool is_part = pattern.find_first_of(u"*?") == Text::npos;
+  return name_matches(from_utf8(name), is_part ? u"*" + pattern + u"*" : pattern);
+}
+
 void list(const ListOptions& options) {
-  const std::vector<Entry> entries = entries_of(Session::members().members);
+  std::vector<Entry> entries = entries_of(Session::members().members);
+  const Text pattern = utf8_text(options.pattern, "PATTERN");
+  std::erase_if(entries, [&](const Entry& entry) { return !fits(entry.any().name, pattern); });
+  if (entries.empty()) throw run_time_failure("no member's name fits \"" + options.pattern + "\"");
   if (!options.json) {
     for (const Entry& entry : entries) print_line(entry);
     return;
@@ -68,7 +82,8 @@ void list(const ListOptions& options) {
 void add_list(CLI::App& app, Work& work) {
   const auto options = std::make_shared<ListOptions>();
   auto* const command = app.add_subcommand("list", "List every member with its access and signature");
-  command->add_flag("--json", options->json, "As a JSON array");
+  command->add_option("PATTERN", options->pattern, "Part of the name, or a pattern with * and ?");
+  add_json(*command, options->json, "As a JSON array");
   choose(*command, work, options, &list);
 }
 

@@ -3,7 +3,12 @@
 
 #include "automation/member_table.hpp"
 #include "cli/batch.hpp"
+#include "cli/completion.hpp"
 #include "cli/failure.hpp"
+#include "cli/help_command.hpp"
+#include "cli/help_text.hpp"
+#include "cli/interruption.hpp"
+#include "cli/json.hpp"
 #include "cli/options.hpp"
 #include "library/cpp_header.hpp"
 #include "library/interface_definition.hpp"
@@ -25,36 +30,6 @@ void add_printers(CLI::App& app, Work& work) {
   choose(*printing, work, is_json, [](bool json) { json ? reference_json() : reference(); });
 }
 
-struct HelpOptions {
-  std::string name;
-  bool is_manual_page = false;
-};
-
-void add_help(CLI::App& app, Work& work) {
-  const auto options = std::make_shared<HelpOptions>();
-  auto* const command = app.add_subcommand("help", "Explain a class, a member, or this command");
-  command->add_option("MEMBER", options->name, "A class, a member or Class.Member, in any case");
-  command->add_flag("--man", options->is_manual_page, "Print the manual page, talutil.1");
-  choose(*command, work, options, [&app](const HelpOptions& chosen) {
-    if (chosen.is_manual_page)
-      man_page(app);
-    else if (chosen.name.empty())
-      std::cout << app.help();
-    else
-      help(chosen.name);
-  });
-}
-
-/// Fails if the first word is not a subcommand; lists the subcommands.
-void check_subcommand(const CLI::App& app, std::string_view word) {
-  std::string names;
-  for (const CLI::App* const command : app.get_subcommands({})) {
-    if (command->get_name() == word) return;
-    names += (names.empty() ? "" : ", ") + command->get_name();
-  }
-  throw usage_failure("there is no subcommand \"" + std::string(word) + "\"; there are " + names);
-}
-
 /// Removes what follows "--" from the command line: arguments of a call that must not be interpreted.
 std::vector<std::string> take_verbatim(std::vector<std::string>& words) {
   const auto mark = std::ranges::find(words, "--");
@@ -64,15 +39,12 @@ std::vector<std::string> take_verbatim(std::vector<std::string>& words) {
   return verbatim;
 }
 
-int run(std::vector<std::string> words) {
-  CLI::App app("TALUtil on the command line: its members listed, explained and called.", "talutil");
-  app.set_version_flag("--version", talutil::version_text);
+void add_all(CLI::App& app, Work& work, const std::vector<std::string>& verbatim) {
+  app.set_version_flag("-V,--version", talutil::version_text);
   app.require_subcommand(1);
-  app.footer(
-      "\"talutil help MEMBER\" explains a member, \"talutil call --help\" how arguments are written.\n"
-      "TALUTIL_CODE_PAGE sets the ANSI code page used to compare characters (1251, 932, 65001 ...); default: 1252.");
-  Work work;
-  std::vector<std::string> verbatim;
+  app.formatter(std::make_shared<HelpFormatter>());
+  app.footer("\"talutil help NAME\" explains a member, a subcommand, or one of: " + help_topics() +
+             ".\n\"talutil call --help\" shows how arguments are written.");
   add_list(app, work);
   add_help(app, work);
   add_call(app, work, verbatim);
@@ -86,37 +58,84 @@ int run(std::vector<std::string> words) {
   add_log(app, work);
   add_system(app, work);
   add_printers(app, work);
-  if (!words.empty() && !words.front().starts_with('-')) check_subcommand(app, words.front());
+  add_completion(app, work);
+}
+
+/// Fails if the first words are not subcommands.
+void check_subcommands(const CLI::App& app, const std::vector<std::string>& words) {
+  const CLI::App* command = &app;
+  for (const std::string& word : words) {
+    if (word.starts_with('-') || command->get_subcommands([](const CLI::App*) { return true; }).empty()) return;
+    check_subcommand(*command, word);
+    command = command->get_subcommand(word);
+  }
+}
+
+/// Help is asked for: that of a member, for "call GetData --help", otherwise of the subcommand.
+int show_help(const CLI::App& app, const CLI::Success& request) {
+  const CLI::App* const call = app.get_subcommand("call");
+  const CLI::Option* const member = call->get_option("MEMBER");
+  if (!call->parsed() || member->count() == 0) return app.exit(request);
+  help(member->results().front());
+  return 0;
+}
+
+int run(std::vector<std::string> words) {
+  CLI::App app("TALUtil on the command line: its members listed, explained and called.", "talutil");
+  Work work;
+  std::vector<std::string> verbatim;
+  add_all(app, work, verbatim);
+  check_subcommands(app, words);
   if (!words.empty() && words.front() == "call") verbatim = take_verbatim(words);
   std::ranges::reverse(words);  // the parser takes them from the back
   try {
     app.parse(words);
-  } catch (const CLI::Success& help_or_version) {
-    return app.exit(help_or_version);
+  } catch (const CLI::CallForHelp& request) {
+    return show_help(app, request);
+  } catch (const CLI::Success& version) {
+    return app.exit(version);
   } catch (const CLI::ParseError& error) {
     std::string message = error.what();
     // Keep a name in capitals, such as that of a missing argument.
     const bool is_name = message.size() > 1 && talutil::fold_case(message[1]) != message[1];
     if (!is_name) message.front() = talutil::fold_case(message.front());
-    throw usage_failure(message + "; see \"talutil --help\"");
+    throw usage_failure(message + "; see " + help_hint(app));
   }
   const int status = work();
   if (!std::cout.flush()) throw run_time_failure("cannot write the output");
   return status;
 }
 
+/// Whether the answer, and therefore an error, is wanted as JSON. Asked of the words themselves, because it must be
+/// known even if they cannot be parsed.
+bool wants_json(const std::vector<std::string>& words) {
+  return std::find(words.begin(), std::ranges::find(words, "--"), "--json") != std::ranges::find(words, "--");
+}
+
+int report_failure(const std::vector<std::string>& words, const Failure& failure) {
+  if (!wants_json(words)) {
+    std::cerr << "talutil: " << failure.what() << '\n';
+    return failure.status();
+  }
+  std::vector<json::Field> fields{{"status", std::to_string(failure.status())},
+                                  {"message", json::text(std::string_view(failure.what()))}};
+  if (failure.number() != 0) fields.emplace_back("number", std::to_string(failure.number()));
+  std::cerr << json::object({{"error", json::object(fields)}}) << '\n';
+  return failure.status();
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
+  const std::vector<std::string> words(argv + 1, argv + argc);
+  const Interruption interruption;
   try {
-    return run({argv + 1, argv + argc});
+    return run(words);
   } catch (const Failure& failure) {
-    std::cerr << "talutil: " << failure.what() << '\n';
-    return failure.status();
+    return report_failure(words, failure);
   } catch (const talutil::RunTimeError& error) {
-    std::cerr << "talutil: " << error_words(error) << '\n';
+    return report_failure(words, {run_time_status, error_words(error), error.number()});
   } catch (const std::exception& error) {
-    std::cerr << "talutil: " << error.what() << '\n';
+    return report_failure(words, run_time_failure(error.what()));
   }
-  return run_time_status;
 }

@@ -30,6 +30,12 @@ void choose(CLI::App& command, Work& work, std::shared_ptr<Options> options, Fun
 /// --set NAME=VALUE, which may be repeated.
 void add_settings(CLI::App& command, std::vector<std::string>& settings, const std::string& help);
 
+/// --json, by which answers and errors are JSON.
+void add_json(CLI::App& command, bool& is_json, const std::string& help);
+
+/// --encoding NAME, of an input.
+void add_encoding(CLI::App& command, std::string& name);
+
 /// --code-page NUMBER.
 void add_code_page(CLI::App& command, std::optional<std::uint32_t>& number, const std::string& use);
 

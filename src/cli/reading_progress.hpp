@@ -4,7 +4,7 @@
 
 namespace talutil::cli {
 
-/// Reports the progress of reading a file above 50 MB on standard error, if that is a terminal.
+/// Shows the progress of reading a file above 50 MB; see ProgressLine.
 [[nodiscard]] posix::PosixFiles::Progress reading_progress();
 
 }  // namespace talutil::cli

@@ -29,8 +29,13 @@ class Session {
 
   /// Raises the member's errors as RunTimeError.
   Variant call(const Member& member, std::span<Argument> arguments) {
+    return call(member, arguments, library_.locale());
+  }
+
+  /// The same for many calls: asking for the locale asks for the time.
+  Variant call(const Member& member, std::span<Argument> arguments, const Locale& locale) {
     const auto slot = static_cast<std::int32_t>(&member - members().members.data());
-    return members().call(&utils_, slot, arguments, library_.locale());
+    return members().call(&utils_, slot, arguments, locale);
   }
 
  private:

@@ -46,7 +46,7 @@ std::string item_json(const Platform& platform, const Text& path) {
                        {"attributes", json::text(attribute_words(item.attributes))}});
 }
 
-std::string machine_json(const Platform& platform, const Text& item) {
+std::string machine_json(const Platform& platform) {
   Machine& machine = platform.machine;
   std::vector<std::string> drives;
   for (const DriveFacts& drive : machine.drives()) drives.push_back(drive_json(drive));
@@ -69,7 +69,6 @@ std::string machine_json(const Platform& platform, const Text& item) {
                                          {"user", json::text(system.user)},
                                          {"folder", json::text(system.folder)},
                                          {"uptime", std::to_string(system.uptime)}})}};
-  if (!item.empty()) fields.emplace_back("item", item_json(platform, item));
   return json::object(fields);
 }
 
@@ -79,17 +78,21 @@ void system_information(const SystemOptions& options) {
   const Text item = utf8_text(options.item, "the path");
   try {
     if (options.json) {
-      std::cout << machine_json(platform, item) << '\n';
+      std::cout << (item.empty() ? machine_json(platform) : item_json(platform, item)) << '\n';
       return;
     }
-    std::vector<FactTable> tables{drive_table(platform.machine), memory_table(platform.machine),
-                                  processor_table(platform.machine), operating_system_table(platform.machine)};
-    if (!item.empty()) tables.push_back(item_table(platform, item));
+    std::vector<FactTable> tables;
+    if (item.empty()) {
+      tables = {drive_table(platform.machine), memory_table(platform.machine), processor_table(platform.machine),
+                operating_system_table(platform.machine)};
+    } else {
+      tables = {item_table(platform, item)};
+    }
     std::string text = to_utf8(as_text(tables));
     std::erase(text, '\r');
     std::cout << text;
   } catch (const RunTimeError& error) {
-    throw run_time_failure(options.item + ": " + error_words(error));
+    throw run_time_failure(options.item.empty() ? "this machine" : options.item, error);
   }
 }
 
@@ -97,10 +100,9 @@ void system_information(const SystemOptions& options) {
 
 void add_system(CLI::App& app, Work& work) {
   const auto options = std::make_shared<SystemOptions>();
-  auto* const command =
-      app.add_subcommand("sysinfo", "Print information about the machine, and about a file or folder if given");
+  auto* const command = app.add_subcommand("sysinfo", "Print information about the machine, or about a file or folder");
   command->add_option("PATH", options->item, "A file or folder (C:\\TAL, /var/log)");
-  command->add_flag("--json", options->json, "Print JSON, with sizes in bytes and times in seconds");
+  add_json(*command, options->json, "Print JSON, with sizes in bytes and times in seconds");
   choose(*command, work, options, &system_information);
 }
 

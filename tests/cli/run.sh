@@ -55,7 +55,14 @@ expect 'optional argument as missing' 0 "2${nl}sFList = [\"A\", \"\"]" call Read
 expect 'written back though unchanged' 0 "0${nl}sFList = [\"x\"]" call ReadCommaDelimStrToList '' @list:x
 expect 'JSON' 0 '{"result": "AB", "arguments": {"sCharacter": " "}}' call RemoveStringsFromNumber 2 'A B' '' --json
 expect 'JSON escapes' 0 '{"result": "\"\\\r\nü😀", "arguments": {}}' call --json StringRestoreCRLF '"\xxü😀' x
-expect 'JSON of no result' 0 '{"result": null, "arguments": {}}' call Terminate --json
+expect 'JSON of no result' 0 '{"arguments": {}}' call Terminate --json
+expect 'JSON of Null' 0 '{"result": null, "arguments": {}}' call ConvertCase 0 @null --json
+expect 'JSON of Empty' 0 '{"result": {"kind": "empty"}, "arguments": {}}' call ConvertCase 0 @empty --json
+TZ=Australia/Brisbane expect 'JSON of a date' 0 '{"result": "2009-03-05T03:45:30", "arguments": {}}' \
+  call LocalTimeToUTC '5/3/2009 13:45:30' --json
+expect 'the result alone' 0 31/12/2009 call WeekYearToDate 60 2009 2 --result
+expect 'a test that is False' 3 '' call GetMousePos 50 5 0 0 10 10 --test
+expect_part 'a test of no Boolean' 2 'does not answer True or False' call GetYear 1/1/2009 --test
 
 # ---- batch: state from line to line, errors, and lines of any length
 batch() { "$talutil" batch "$@" 2>&1; }
@@ -91,8 +98,15 @@ expect 'no date where one is due' 1 \
   call LocalTimeToUTC 31/2/2009
 TZ=Australia/Brisbane expect 'local time by the zone' 0 '05/03/2009 03:45:30' call LocalTimeToUTC '5/3/2009 13:45:30'
 expect 'list' 0 1 call IndexInList @list:Apple,Banana ban
+expect 'list with a comma in an element' 0 1 call IndexInList '@list:"a,b",Banana' ban
+printf 'Apple\r\nBanana\n' >"$work/lines"
+expect 'list from a file' 0 1 call IndexInList "@lines:$work/lines" ban
+expect_part 'standard input twice' 2 'can be read only once' call StringReplaceWord @- @- x
 expect 'two at signs' 0 @null call StripNulls @@null
 printf 'a\0bü' >"$work/bytes"
+expect 'numbers are numbers where anything is taken' 0 True call GetMousePos 5 5 0 0 10 10
+expect 'unless they are texts' 0 False call GetMousePos @text:5 @text:5 @text:0 @text:0 @text:10 @text:10
+expect 'or not written as numbers are' 0 007 call VerifyTextData 0 0 007
 expect 'file' 0 a call StripNulls "@file:$work/bytes"
 verdict 'control characters are raw' "61 00 62 c3 bc 0a" \
   "$("$talutil" call StringReplaceWord @- x y <"$work/bytes" | od -An -tx1 | sed 's/^ //')"
@@ -114,7 +128,7 @@ done < <(grep '^| `' "$top/docs/dates.md")
 # ---- call: settings
 expect 'put, then read' 0 anne call --set sUserName=x --set susername=anne sUserName
 expect 'value with an equals sign' 0 a=b call --set sUserName=a=b sUserName
-expect 'a put prints nothing' 0 '' call iBranchID 7
+expect_part 'a put says how long it lasts' 0 'iBranchID is set for this command only' call iBranchID 7
 expect 'read only' 2 'talutil: ComputerName can only be read; leave its value out' call ComputerName x
 expect 'put only' 2 'talutil: SplashForm can only be put; write its value after it' call SplashForm
 expect 'setting out of range' 1 'talutil: iBranchID: "70000" is out of range; write -32768 to 32767' \
@@ -124,7 +138,10 @@ expect 'setting without value' 2 'talutil: --set DebugMode: has no value; write 
 expect 'message box without a terminal' 0 'talutil: Closing ORVUtils Components form' call --set DebugMode=1 Terminate
 
 # ---- call: errors
-expect 'run-time error' 1 'talutil: GetData: error 5: Invalid procedure call or argument' call GetData A,B,C, 2 1
+expect 'run-time error' 1 'talutil: GetData: error 5: Invalid procedure call or argument; sSrcStr = "A,B,C,", iSt = "2", iEn = "1"' \
+  call GetData A,B,C, 2 1
+expect 'the same as JSON' 1 '{"error": {"status": 1, "message": "IncMonth: error 13: Type mismatch; vSrcDate = \"x\", iNum = \"1\"", "number": 13}}' \
+  call IncMonth x 1 --json
 expect 'a window without a screen' 1 'talutil: ShowSysInfo: error 445: There is no screen to show the window on' call ShowSysInfo
 expect_part 'an input box on the terminal' 0 'Name: Who are you?' call MyInputBox Name 'Who are you?'
 expect 'not a whole number' 1 \
@@ -132,15 +149,30 @@ expect 'not a whole number' 1 \
 expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, sDelimiter), not 4' \
   call ReadCommaDelimStrToList 1 2 3 4
 expect 'near names' 2 'talutil: there is no member "GetDate"; did you mean GetData, GetDay or GetDateFromString?' call GetDate
-expect 'no such subcommand' 2 \
-  'talutil: there is no subcommand "lst"; there are list, help, call, batch, clean, encrypt, decrypt, password, config, zip, unzip, export, report, log, sysinfo, idl, header, reference' lst
+expect 'no such subcommand' 2 'talutil: there is no subcommand "lst"; did you mean list?' lst
+expect 'no such subcommand below another' 2 'talutil: there is no subcommand "gte"; did you mean get?' config gte
+expect_part 'no subcommand that is near' 2 'there are list, help, call, batch, clean' xyzzy
 expect_part 'no member' 2 ': MEMBER is required; see' call -- GetYear
-expect_part 'no such option' 2 'was not expected: --jsn; see "talutil --help"' list --jsn
+expect_part 'no such option' 2 'was not expected: --jsn; see "talutil list --help"' list --jsn
 
 # ---- list, help
 expect_part 'list: property' 0 "${nl}get put  sUserName As String${nl}" list
 expect_part 'list: method' 0 \
   "${nl}call     ReadCommaDelimStrToList(sTemp As String, ByRef sFList As String(), [sDelimiter As String = \",\"]) As Long${nl}" list
+expect 'list: a pattern' 0 "call     AddZeros(sText As String, iExpLength As Integer, iJustify As Integer) As String" list '?dd*s'
+expect_part 'list: nothing fits' 1 "no member's name fits" list xyzzy
+expect_part 'help of a subcommand' 0 'talutil config unset [OPTIONS] SECTION ITEM' help config unset
+expect_part 'help of a member by its call' 0 'GetData(sSrcStr As String' call GetData --help
+verdict 'help fits the terminal' '' "$(for each in '' clean call report zip config; do COLUMNS=60 "$talutil" help $each; done |
+  grep -v '^ *[^ ]*$' | awk 'length > 60 && !/^  talutil|^  [A-Za-z"]+  /')"
+verdict 'docs/command.md has the pages of help' '' "$(for each in exit-codes environment; do "$talutil" help $each | tail -n +3; done |
+  sed -E 's/^ +([^ ]+) .*/\1/' | while read -r word; do grep -qF "$word" "$top/docs/command.md" || echo "$word"; done)"
+bash -n <("$talutil" completion bash)
+verdict 'completion for bash' 0 $?
+complete_line() { (. <("$talutil" completion bash); COMP_WORDS=("$@") COMP_CWORD=$(($# - 1)); _talutil; echo "${COMPREPLY[*]}"); }
+verdict 'completion of a subcommand, an option, a member' 'clean unset --group GetDaysInPeriod' \
+  "$(complete_line talutil cle) $(complete_line talutil config uns) $(complete_line talutil config get --gr) $(complete_line talutil call GetDaysInP)"
+verdict '-V' "$("$talutil" --version)" "$("$talutil" -V)"
 verdict 'each name once' '' "$("$talutil" list | cut -c10- | sed 's/[( ].*//' | sort | uniq -d)"
 expect_part 'help: default' 0 'sDelimiter  the delimiter, one character (String; "," when left out)' \
   help readcommadelimstrtolist
@@ -220,16 +252,27 @@ verdict 'a cipher text of another maker' '1: talutil: standard input: error 5: T
 [[ $("$talutil" password --length 12 --mix hex --count 2) =~ ^[0-9A-F]{12}$'\n'[0-9A-F]{12}$ ]]
 verdict 'passwords' 0 $?
 mkdir archived && echo one >archived/one.txt && echo key >key.txt
-expect 'zip' 0 '' zip a.zip archived --password-file key.txt --comment 'a comment'
-expect 'zip --test' 0 'a.zip: 2 entries, all well' zip --test a.zip --password-file key.txt
+expect 'zip' 0 'talutil: a.zip: 2 entries' zip a.zip archived --password-file key.txt --comment 'a comment'
+expect 'zip of what is not there' 1 'talutil: b.zip: there is no "nosuch"; nothing was packed (code 12)' zip b.zip archived nosuch
+expect 'zip --test' 0 'talutil: a.zip: 2 entries tested, no damage' zip --test a.zip --password-file key.txt
 expect 'zip --test without the password' 1 'talutil: a.zip: archived/one.txt: no password was given (code 9)' zip --test a.zip
 expect_part 'unzip --list' 0 ' *archived/one.txt' unzip --list a.zip
-expect 'unzip' 0 '' unzip a.zip --to unpacked --password-file key.txt
+echo wrong >wrong.txt
+expect 'a wrong password' 1 'talutil: a.zip: archived/one.txt: the password is wrong (code 9)' \
+  unzip a.zip --to unpacked --password-file wrong.txt
+expect 'unzip' 0 'talutil: a.zip: 2 entries unpacked' unzip a.zip --to unpacked --password-file key.txt
+expect 'unzip over existing files' 4 "talutil: a.zip: 1 existing files were kept; --overwrite replaces them, --keep keeps them silently${nl}talutil: a.zip: 1 entries unpacked" \
+  unzip a.zip --to unpacked --password-file key.txt
+mkdir links && ln -s /etc links/x && (cd links && zip -qy ../links.zip x)
+expect 'unzip of a link' 1 "talutil: links.zip: \"x\" was left out: links are not unpacked${nl}talutil: links.zip: 1 entries were passed over, such as x (code 17)" \
+  unzip links.zip --to unpacked
+expect 'unzip as JSON' 0 '{"archive": "a.zip", "unpacked": 1, "kept": 1, "renamed": 0}' \
+  unzip a.zip --to unpacked --password-file key.txt --keep --json
 mkdir odd && touch odd/aux.c odd/plain
-expect 'zip of a name that changes' 0 'talutil: "odd/aux.c" is unpacked as "odd/_aux.c"' zip odd.zip odd
-expect 'unzip of it' 0 'talutil: "odd/aux.c" is unpacked as "odd/_aux.c"' unzip odd.zip --to unpacked
-expect 'unzip of it alone' 0 'talutil: "odd/aux.c" is unpacked as "_aux.c"' unzip odd.zip aux.c --to unpacked --no-folders
-expect 'unzip of another' 0 '' unzip odd.zip odd/plain --to unpacked
+expect_part 'zip of a name that changes' 4 'talutil: "odd/aux.c" is unpacked as "odd/_aux.c"' zip odd.zip odd
+expect_part 'unzip of it' 4 'talutil: "odd/aux.c" is unpacked as "odd/_aux.c"' unzip odd.zip --to unpacked
+expect_part 'unzip of it alone' 4 'talutil: "odd/aux.c" is unpacked as "_aux.c"' unzip odd.zip aux.c --to unpacked --no-folders
+expect_part 'unzip of another' 0 '1 entries unpacked' unzip odd.zip odd/plain --to unpacked --overwrite
 expect_part 'zip without items' 2 'name what is to be packed' zip a.zip
 expect_part 'AES without a password' 2 'give --encrypt or --password-file' zip a.zip archived --aes
 verdict 'unpacked' '' "$(diff -r archived unpacked/archived 2>&1)"
@@ -240,13 +283,16 @@ expect 'export' 0 '' export --from table.csv --hide 2 --rows 1-2 shown.txt
 verdict 'the exported rows' $'Anne,"Cork, IE"\r\nBob,Kyle\r' "$(cat shown.txt)"
 expect 'export everything' 0 '' export --from table.csv all.txt
 verdict 'the whole table' '' "$(cmp table.csv all.txt 2>&1)"
+verdict 'export, streams' $'Name\r' "$(sed '1s/^/\xef\xbb\xbf/' table.csv | "$talutil" export --from - --hide 2,3 --rows 0 -)"
+verdict 'what is behind standard output stays' $'before\nName\r' \
+  "$(echo before >log; "$talutil" export --from table.csv --hide 2,3 --rows 0 /dev/stdout >>log; cat log)"
 expect 'report' 0 '' report table.csv --title 'Sales €' --landscape --pdf sales.pdf
 verdict 'the words of the report' "Anne 1 Cork, IE" "$(pdftotext -layout sales.pdf - | grep Anne | tr -s ' ' | sed 's/^ //')"
 expect 'report: a text' 0 '' report shown.txt
 expect_part 'system information' 0 'Operating system' sysinfo
 expect_part 'details of a file' 0 'Kind        File' sysinfo table.csv
 verdict 'system information in JSON' "file $(stat -c %s table.csv)" "$("$talutil" sysinfo --json table.csv |
-  python3 -c 'import json, sys; item = json.load(sys.stdin)["item"]; print(item["kind"], item["size"])')"
+  python3 -c 'import json, sys; item = json.load(sys.stdin); print(item["kind"], item["size"])')"
 expect 'report over its own file' 2 'talutil: sales.pdf: give --pdf another name' report sales.pdf
 expect 'export: no such column' 2 'talutil: --hide: there is no column 4; table.csv has columns 1 to 3' export --from table.csv --hide 1,4 x.txt
 
@@ -262,12 +308,15 @@ verdict 'a setting to the byte' $'a\\b\r\n x ' "$(main get s 'K=]')"
 verdict 'the database has it too' ' "q" ' "$("$talutil" config get --database Main --group database T name)"
 verdict 'list of a section' $'[T]\nname=\\u0020"q"\\u0020' "$(main list t)"
 verdict 'no such setting' '1: talutil: there is no x in [T]' "$(answer main get T x)"
-verdict 'export' '2 settings written to anne.ini' "$(main export anne.ini)"
+verdict 'a setting is removed' "1: talutil: there is no x in [S]" "$(main set S x 1; main unset s X; answer main get S x)"
+verdict 'export' 'talutil: 2 settings written to anne.ini' "$(main export anne.ini)"
 verdict 'export twice' '1: talutil: anne.ini is there already; --force replaces it' "$(answer main export anne.ini)"
 user=bob main set T name other
-verdict 'import keeps what differs' "1 settings added, 0 the same, 1 kept as they were${nl}talutil: --force replaces settings that differ" \
-  "$(user=bob main import anne.ini)"
-verdict 'import by force' '0 settings added, 1 the same, 1 replaced' "$(user=bob main import anne.ini --force)"
+verdict 'import keeps what differs' "4: talutil: 1 settings added, 0 the same, 1 kept as they were; --force replaces them" \
+  "$(user=bob answer main import anne.ini)"
+verdict 'through standard streams' 'talutil: 0 settings added, 2 the same, 0 kept as they were; --force replaces them' \
+  "$(main export - 2>log | main import - 2>&1)"
+verdict 'import by force' 'talutil: 0 settings added, 1 the same, 1 replaced' "$(user=bob main import anne.ini --force)"
 verdict 'all of it has moved' "$(main list)" "$(user=bob main list)"
 printf '[S]\nk=\\x\n' >bad.ini
 verdict 'a file that export did not write' '1: talutil: bad.ini: "\x" has a backslash that begins neither \\ nor \uXXXX' \
@@ -299,9 +348,13 @@ verdict 'and what they are' 'BinTemp Data Drawings Help Pictures Reports Templat
 for event in First Second "Third Jürgen"; do
   "$talutil" call --set EventLog=1 --set sUserName=anne --set 'sORVPath=C:\TAL\ORV3' AppendEventLog "$event" frm
 done
-stamps() { sed -E 's/:[0-9]{14}:/:STAMP:/'; }
+stamps() { sed -E "s/:[0-9]{14}:/:STAMP:/; s/$(date +%Y-%m-%d)([ T])[0-9:]{8}/DAY\1TIME/"; }
 verdict 'log tail, the folder given' "anne:STAMP:Second:frm${nl}anne:STAMP:Third Jürgen:frm" \
-  "$("$talutil" log tail -n 2 'C:\TAL\ORV3' | stamps)"
+  "$("$talutil" log tail --raw -n 2 'C:\TAL\ORV3' | stamps)"
+verdict 'log tail for people and programs' 'DAY TIME  anne  Third Jürgen  (frm) {"time": "DAYTTIME", "user": "anne", "text": "Third Jürgen", "form": "frm"}' \
+  "$("$talutil" log tail -n 1 drives/c/TAL/ORV3 | stamps) $("$talutil" log tail -n 1 drives/c/TAL/ORV3 --json | stamps)"
+verdict 'log tail ends with its reader' 'DAY' "$(timeout 20 "$talutil" log tail -f -n 1 drives/c/TAL/ORV3 | head -1 | stamps | cut -c1-3)"
+
 verdict 'log tail of fewer lines than asked for' 3 "$("$talutil" log tail drives/c/TAL/ORV3/EventLog.txt | wc -l)"
 expect_part 'log tail of no log' 1 'cannot read the event log "Q:\x": error 76: Path not found' log tail 'Q:\x'
 expect 'log tail of no lines' 2 'talutil: --lines 0: write 1 or more' log tail -n 0 drives

@@ -1,0 +1,188 @@
+#include "cli/completion.hpp"
+
+#include <functional>
+#include <iostream>
+
+#include "cli/entries.hpp"
+#include "cli/failure.hpp"
+#include "cli/options.hpp"
+#include "cli/session.hpp"
+
+namespace talutil::cli {
+
+namespace {
+
+struct CompletionOptions {
+  std::string shell;
+};
+
+/// A subcommand, or one below it, as it is typed: "config get".
+struct Command {
+  std::string words;
+  std::string help;
+  std::vector<const CLI::Option*> options;
+  std::vector<std::string> below;
+  bool takes_members = false;
+};
+
+std::vector<const CLI::Option*> options_of(const CLI::App& app) {
+  return app.get_options([](const CLI::Option* option) { return option->nonpositional(); });
+}
+
+void collect(const CLI::App& app, const std::string& words, std::vector<Command>& commands) {
+  Command command{words, app.get_description(), options_of(app), {}, words == "call" || words == "help"};
+  const auto below = app.get_subcommands([](const CLI::App*) { return true; });
+  for (const CLI::App* const each : below) command.below.push_back(each->get_name());
+  commands.push_back(std::move(command));
+  for (const CLI::App* const each : below) {
+    collect(*each, words.empty() ? each->get_name() : words + " " + each->get_name(), commands);
+  }
+}
+
+std::string joined(const std::vector<std::string>& words) {
+  std::string line;
+  for (const std::string& word : words) line += (line.empty() ? "" : " ") + word;
+  return line;
+}
+
+std::string members() {
+  std::vector<std::string> names;
+  for (const Entry& entry : entries_of(Session::members().members)) names.emplace_back(entry.any().name);
+  return joined(names);
+}
+
+std::string option_words(const Command& command) {
+  std::vector<std::string> words;
+  for (const CLI::Option* const option : command.options) {
+    for (const std::string& name : option->get_snames()) words.push_back("-" + name);
+    for (const std::string& name : option->get_lnames()) words.push_back("--" + name);
+  }
+  return joined(words);
+}
+
+/// The cases of a shell's `case` by the words of the subcommand, for bash and zsh.
+void print_cases(const std::vector<Command>& commands) {
+  for (const Command& command : commands) {
+    std::cout << "    '" << command.words << "') options='" << option_words(command) << "' words='"
+              << joined(command.below) << (command.takes_members ? " '\"$members\"" : "'") << " ;;\n";
+  }
+}
+
+/// The first words of the line that are subcommands are the key of the cases.
+void print_bash(const std::vector<Command>& commands) {
+  std::cout << "# Completion of talutil for bash: . <(talutil completion bash)\n"
+               "_talutil() {\n"
+               "  local members='"
+            << members()
+            << "'\n"
+               "  local current=${COMP_WORDS[COMP_CWORD]} key= options= words= i\n"
+               "  for ((i = 1; i < COMP_CWORD && i < 3; i++)); do\n"
+               "    [[ ${COMP_WORDS[i]} == -* ]] && break\n"
+               "    case \"${key:+$key }${COMP_WORDS[i]}\" in\n      ";
+  std::string_view separator;
+  for (const Command& command : commands) {
+    if (command.words.empty()) continue;
+    std::cout << separator << "'" << command.words << "'";
+    separator = " | ";
+  }
+  std::cout << ") key=${key:+$key }${COMP_WORDS[i]} ;;\n"
+               "      *) break ;;\n"
+               "    esac\n"
+               "  done\n"
+               "  case $key in\n";
+  print_cases(commands);
+  std::cout << "  esac\n"
+               "  [[ $current == -* ]] && words=$options\n"
+               "  COMPREPLY=($(compgen -W \"$words\" -- \"$current\"))\n"
+               "}\n"
+               "complete -o default -F _talutil talutil\n";
+}
+
+void print_zsh(const std::vector<Command>& commands) {
+  std::cout << "#compdef talutil\n"
+               "# Completion of talutil for zsh: talutil completion zsh >FOLDER-IN-FPATH/_talutil\n"
+               "_talutil() {\n"
+               "  local members='"
+            << members()
+            << "'\n"
+               "  local key= options= each\n"
+               "  local -a reply_words\n"
+               "  for each in ${words[2,CURRENT-1]}; do\n"
+               "    case \"${key:+$key }$each\" in\n      ";
+  std::string_view separator;
+  for (const Command& command : commands) {
+    if (command.words.empty()) continue;
+    std::cout << separator << "'" << command.words << "'";
+    separator = " | ";
+  }
+  std::cout << ") key=${key:+$key }$each ;;\n"
+               "      *) break ;;\n"
+               "    esac\n"
+               "  done\n"
+               "  local current=$words[CURRENT] words=\n"
+               "  case $key in\n";
+  print_cases(commands);
+  std::cout << "  esac\n"
+               "  [[ $current == -* ]] && words=$options\n"
+               "  reply_words=(${=words})\n"
+               "  (( $#reply_words )) && compadd -- $reply_words\n"
+               "  [[ $current == -* ]] || _files\n"
+               "}\n"
+               "if [ \"$funcstack[1]\" = _talutil ]; then _talutil \"$@\"; else compdef _talutil talutil; fi\n";
+}
+
+std::string in_quotes(std::string_view text) {
+  std::string result = "'";
+  for (const char c : text) result += c == '\'' ? std::string("\\'") : std::string(1, c);
+  return result + "'";
+}
+
+void print_fish(const std::vector<Command>& commands) {
+  std::cout << "# Completion of talutil for fish: talutil completion fish | source\n";
+  for (const Command& command : commands) {
+    const std::size_t blank = command.words.find(' ');
+    const std::string parent = blank == std::string::npos ? "" : command.words.substr(0, blank);
+    const std::string name = command.words.substr(blank == std::string::npos ? 0 : blank + 1);
+    if (command.words.empty()) {
+      for (const std::string& below : command.below) {
+        std::cout << "complete -c talutil -n __fish_use_subcommand -f -a " << below << '\n';
+      }
+      continue;
+    }
+    const std::string condition =
+        parent.empty() ? "'__fish_seen_subcommand_from " + name + "'"
+                       : "'__fish_seen_subcommand_from " + parent + "; and __fish_seen_subcommand_from " + name + "'";
+    for (const std::string& below : command.below) {
+      std::cout << "complete -c talutil -n " << condition << " -f -a " << below << '\n';
+    }
+    if (command.takes_members) std::cout << "complete -c talutil -n " << condition << " -a '" << members() << "'\n";
+    for (const CLI::Option* const option : command.options) {
+      std::cout << "complete -c talutil -n " << condition;
+      for (const std::string& short_name : option->get_snames()) std::cout << " -s " << short_name;
+      for (const std::string& long_name : option->get_lnames()) std::cout << " -l " << long_name;
+      if (option->get_type_size() != 0) std::cout << " -r";
+      std::cout << " -d " << in_quotes(option->get_description()) << '\n';
+    }
+  }
+}
+
+void print_completion(const CLI::App& app, const std::string& shell) {
+  std::vector<Command> commands;
+  collect(app, "", commands);
+  if (shell == "bash") return print_bash(commands);
+  if (shell == "zsh") return print_zsh(commands);
+  if (shell == "fish") return print_fish(commands);
+  throw usage_failure("completion: there is none for \"" + shell + "\"; there are bash, zsh and fish");
+}
+
+}  // namespace
+
+void add_completion(CLI::App& app, Work& work) {
+  const auto options = std::make_shared<CompletionOptions>();
+  auto* const command = app.add_subcommand("completion", "Print a script with which a shell completes this command");
+  command->add_option("SHELL", options->shell, "bash, zsh or fish")->required();
+  command->footer("  . <(talutil completion bash)");
+  choose(*command, work, options, [&app](const CompletionOptions& chosen) { print_completion(app, chosen.shell); });
+}
+
+}  // namespace talutil::cli
