@@ -6,55 +6,103 @@
 
 namespace talutil::cli {
 
-bool CsvReader::read(std::vector<std::string>& row) {
-  row.clear();
-  if (at_ == bytes_.size()) return false;
-  row_line_ = line_;
-  while (true) {
-    const bool is_quoted = at_ < bytes_.size() && bytes_[at_] == '"';
-    row.push_back(is_quoted ? quoted_field() : plain_field());
-    if (at_end_of_row()) break;
-    ++at_;  // the comma
-  }
-  at_ = std::min(bytes_.find('\n', at_), bytes_.size() - 1) + 1;
-  ++line_;
+bool CsvReader::fetch() {
+  if (!pieces_.fetch(start_, line_)) return false;
+  start_ = 0;
   return true;
 }
 
-std::string CsvReader::quoted_field() {
-  std::string field;
-  const std::size_t first_line = line_;
-  while (true) {
-    const std::size_t start = at_ + 1;
-    const std::size_t quote = bytes_.find('"', start);
-    if (quote == std::string_view::npos) {
-      throw run_time_failure("line " + std::to_string(first_line) +
-                             ": a quote is never closed; double the quotes "
-                             "inside a field and close it with one");
+bool CsvReader::read(std::vector<Text>& row) {
+  for (;;) {
+    if (start_ == pieces_.text().size()) {
+      if (!fetch()) return false;
+      continue;
     }
-    field += bytes_.substr(start, quote - start);
-    line_ += static_cast<std::size_t>(std::ranges::count(bytes_.substr(start, quote - start), '\n'));
-    at_ = quote + 1;
-    if (at_ == bytes_.size() || bytes_[at_] != '"') break;
-    field += '"';
+    row_line_ = line_;
+    if (parse(row) == Outcome::incomplete) {
+      fetch();
+    } else if (row_length_ > 0) {
+      return true;
+    }
   }
-  if (!at_end_of_row() && bytes_[at_] != ',') {
-    throw run_time_failure("line " + std::to_string(line_) +
-                           ": text after a closing quote; double the quotes inside "
-                           "a field");
-  }
-  return field;
 }
 
-std::string CsvReader::plain_field() {
-  const std::size_t start = at_;
-  while (!at_end_of_row() && bytes_[at_] != ',') ++at_;
-  return std::string(bytes_.substr(start, at_ - start));
+/// The length of the line end at a position: 0 if there is none, 1 or 2.
+std::size_t CsvReader::line_end_at(std::size_t at) const noexcept {
+  const Text& text = pieces_.text();
+  if (text[at] == u'\n') return 1;
+  if (text[at] != u'\r') return 0;
+  if (at + 1 == text.size()) return pieces_.has_ended() ? 1 : 0;
+  return text[at + 1] == u'\n' ? 2 : 0;
 }
 
-bool CsvReader::at_end_of_row() const noexcept {
-  const std::string_view rest = bytes_.substr(at_);
-  return rest.empty() || rest == "\r" || rest.starts_with('\n') || rest.starts_with("\r\n");
+std::size_t CsvReader::lines_between(std::size_t begin, std::size_t end) const {
+  return static_cast<std::size_t>(std::ranges::count(TextView(pieces_.text()).substr(begin, end - begin), u'\n'));
+}
+
+void CsvReader::finish_row(std::size_t end, std::size_t next) {
+  row_start_ = start_;
+  row_length_ = end - start_;
+  line_ += lines_between(start_, next);
+  start_ = next;
+}
+
+/// Ends a row that cannot be read at the first line end from a position on.
+void CsvReader::pass_over(std::size_t from) {
+  const Text& text = pieces_.text();
+  const std::size_t end = std::min(text.find(u'\n', from), text.size());
+  const bool has_return = end > start_ && text[end - 1] == u'\r';
+  finish_row(has_return ? end - 1 : end, std::min(end + 1, text.size()));
+}
+
+/// Reads the row at `start_`, which is incomplete if the text ends before it and more can follow.
+CsvReader::Outcome CsvReader::parse(std::vector<Text>& row) {
+  const Text& text = pieces_.text();
+  std::size_t count = 0;
+  for (std::size_t at = start_;; ++at) {
+    if (count == row.size()) row.emplace_back();
+    Text& field = row[count++];
+    if (at < text.size() && text[at] == u'"') {
+      if (quoted_field(field, at) == Outcome::incomplete) return Outcome::incomplete;
+    } else {
+      const std::size_t begin = at;
+      while (at < text.size() && text[at] != u',' && line_end_at(at) == 0) ++at;
+      field.assign(text, begin, at - begin);
+    }
+    if (at == text.size() && !pieces_.has_ended()) return Outcome::incomplete;
+    if (at < text.size() && text[at] == u',') continue;
+    row.resize(count);
+    finish_row(at, at == text.size() ? at : at + line_end_at(at));
+    return Outcome::row;
+  }
+}
+
+CsvReader::Outcome CsvReader::quoted_field(Text& field, std::size_t& at) {
+  const Text& text = pieces_.text();
+  const bool may_continue = !pieces_.has_ended();
+  field.clear();
+  for (;;) {
+    const std::size_t begin = at + 1;
+    const std::size_t quote = text.find(u'"', begin);
+    if (quote == Text::npos) {
+      if (may_continue) return Outcome::incomplete;
+      pass_over(start_);
+      throw run_time_failure("line " + std::to_string(row_line_) +
+                             ": a quote is never closed; double the quotes inside a field and close it with one");
+    }
+    field.append(text, begin, quote - begin);
+    at = quote + 1;
+    if (at == text.size() || text[at] != u'"') break;
+    field += u'"';
+  }
+  // Of a carriage return at the end of a piece, nobody knows yet whether it ends the line.
+  if (at + 1 >= text.size() && may_continue) return Outcome::incomplete;
+  if (at == text.size() || text[at] == u',' || line_end_at(at) != 0) return Outcome::row;
+  if (text.find(u'\n', at) == Text::npos && may_continue) return Outcome::incomplete;
+  const std::size_t line = row_line_ + lines_between(start_, at);
+  pass_over(at);
+  throw run_time_failure("line " + std::to_string(line) +
+                         ": text after a closing quote; double the quotes inside a field");
 }
 
 }  // namespace talutil::cli

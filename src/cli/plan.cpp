@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <span>
+#include <unordered_set>
 
 #include "cli/arguments.hpp"
 #include "cli/entries.hpp"
@@ -15,12 +16,12 @@ using Words = std::span<const std::string>;
 
 constexpr std::string_view blanks = " \t\r";
 
-/// Splits a line into words; quotes in a quoted word are doubled.
+/// Splits a line into words, up to a comment; quotes in a quoted word are doubled.
 std::vector<std::string> words_of(std::string_view line) {
   std::vector<std::string> words;
   while (true) {
     line.remove_prefix(std::min(line.find_first_not_of(blanks), line.size()));
-    if (line.empty()) return words;
+    if (line.empty() || line.front() == '#') return words;
     std::string& word = words.emplace_back();
     if (line.front() != '"') {
       word = line.substr(0, line.find_first_of(blanks));
@@ -83,13 +84,14 @@ PlanColumn read_column(Words words, std::span<const Member> members, const Local
 
 std::vector<PlanColumn> read_plan(std::string_view text, std::span<const Member> members, const Locale& locale) {
   std::vector<PlanColumn> plan;
+  std::unordered_set<std::string> names;
   for (std::size_t number = 1; !text.empty(); ++number) {
     const std::string_view line = text.substr(0, text.find('\n'));
     text.remove_prefix(std::min(line.size() + 1, text.size()));
     within("line " + std::to_string(number), [&] {
       const auto words = words_of(line);
-      if (words.empty() || words.front().starts_with('#')) return;
-      if (std::ranges::find(plan, words.front(), &PlanColumn::name) != plan.end()) {
+      if (words.empty()) return;
+      if (!names.insert(words.front()).second) {
         throw usage_failure("column \"" + words.front() + "\" stands twice");
       }
       plan.push_back(read_column(words, members, locale));

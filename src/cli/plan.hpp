@@ -23,8 +23,8 @@ struct PlanColumn {
 
 /// Reads a plan, with one line per column: the column's name, then its steps, separated by "|". A step is a member and
 /// its arguments as for "talutil call"; the value comes last, or in place of "*". "list" before a member cleans each
-/// element of a comma-separated list. Words with blanks are in double quotes; lines that begin with "#" are comments.
-/// Fails with the line number and the error.
+/// element of a comma-separated list. Words with blanks are in double quotes; a word that begins with "#" begins a
+/// comment. Fails with the line number and the error.
 [[nodiscard]] std::vector<PlanColumn> read_plan(std::string_view text, std::span<const Member> members,
                                                 const Locale& locale);
 

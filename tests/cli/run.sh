@@ -194,7 +194,7 @@ plan+="Code StripNulls | AddZeros * 3 -1${nl}"
 printf %s "$plan" >plan
 # The CSV text is a format, for its NULs and code page 1252.
 # shellcheck disable=SC2059
-clean() { printf "$1" >in.csv; "$talutil" clean in.csv --plan plan --output out.sql --table 't "x"' 2>&1; }
+clean() { printf "$1" >in.csv; "$talutil" clean in.csv --plan plan --output out.sql --output-encoding 1252 --table 't "x"' 2>&1; }
 inserts() { clean "$1" >log && iconv -f CP1252 out.sql | tr -d '\r'; }
 opening='INSERT INTO "t ""x""" (ID, Name, Tags, Code) VALUES '
 
@@ -203,9 +203,43 @@ verdict 'quotes, line breaks, NUL, code page 1252' "$opening('1', 'M´ü', 'a´,
 verdict 'line feeds alone, the last one missing, empty list' "$opening('0', '', '', 'abcd');$nl$opening('2', 'x', ',', '000');" \
   "$(inserts 'ID,Name,Tags,Code\n,,,abcd\n2,x,",",\r')"
 verdict 'apostrophes are doubled' "$opening('0', '', '', 'a''b');" "$(inserts "ID,Name,Tags,Code\n,,,a'b\n")"
-verdict 'the summary' 'Name      1  "#" -> ""' "$(clean 'ID,Name,Tags,Code\n0,#,,000\n' | sed -n 's/^  \(Name.*\)/\1/p')"
-verdict 'the counters' 'CounterVerifyText 3, CounterVerifyInt 1' \
+verdict 'the summary' 'Name        1  "#" -> ""' "$(clean 'ID,Name,Tags,Code\n0,#,,000\n' | sed -n 's/^  \(Name.*\)/\1/p')"
+verdict 'the counters' 'values cleaned: 3 texts (CounterVerifyText), 1 numbers (CounterVerifyInt)' \
   "$(clean 'ID,Name,Tags,Code\n0,x,"a,b",\n' | grep Counter)"
+
+# Standard input to standard output; the summary goes elsewhere.
+stream() { "$talutil" clean - --plan plan --table t --line-feeds "$@" 2>stream.log; }
+utf8_row='1,Zoë,a,"7"""'
+verdict 'UTF-8 in and out' "INSERT INTO t (ID, Name, Tags, Code) VALUES ('1', 'Zoë', 'a,', '07\"');" \
+  "$(printf 'ID,Name,Tags,Code\n%s\n' "$utf8_row" | stream)"
+verdict 'a mark is no part of the first name' 'ID,Name,Tags,Code
+1,Zoë,"a,","07"""' "$(printf '\xef\xbb\xbfID,Name,Tags,Code\n\n%s\n' "$utf8_row" | stream --format csv)"
+verdict 'UTF-16, JSON lines, numbers, empty values' '{"ID": 1, "Name": "Zoë", "Tags": "a,", "Code": "07\""}
+{"ID": 0, "Name": null, "Tags": null, "Code": "000"}' \
+  "$(printf 'ID,Name,Tags,Code\r\n%s\r\n,,,\r\n' "$utf8_row" | iconv -t UTF-16 | stream --format jsonl --numbers ID,Code --empty-null)"
+verdict 'JSON lines in' 'ID,Name,Tags,Code
+1,é,,0😀
+0,,,00b' "$(printf '%s\n' '{"ID": 1, "Name": "\u00e9", "Tags": null, "Code":"\ud83d\ude00"}' '' '{"Code": "b"}' |
+  stream --input-format jsonl --format csv)"
+verdict 'bad JSON lines' '1 talutil: standard input: line 2: has "X", which the first line has not' \
+  "$(printf '%s\n' '{"ID": 1, "Name": 2, "Tags": 3, "Code": 4}' '{"X": 1}' | stream --input-format jsonl >log; echo "$? $(cat stream.log)")"
+verdict 'UTF-16 out, in a transaction' "BEGIN;
+INSERT INTO t (ID, Name, Tags, Code) VALUES ('2', 'é', '', '000');
+COMMIT;" "$(printf 'ID,Name,Tags,Code\n2,é,,\n' | stream --output-encoding utf-16 --transaction | iconv -f UTF-16)"
+verdict 'a guess is said' 'talutil: standard input: line 2 is not in UTF-8; read as code page 1252 (--encoding names another encoding)' \
+  "$(printf 'ID,Name,Tags,Code\n2,\xe9,,\n' | stream >log; head -1 stream.log)"
+verdict 'neither UTF-8 nor a code page' \
+  '1 talutil: standard input: line 3 is not in UTF-8, although lines before it are; mend it, or name the encoding by --encoding' \
+  "$(printf 'ID,Name,Tags,Code\n1,é,,\n2,\xe9,,\n' | stream >log; echo "$? $(cat stream.log)")"
+# Rows that are longer than a piece of the input, and a quote that is never closed behind them.
+long=$(head -c 300000 /dev/zero | tr '\0' x)
+verdict 'bad rows are collected as they are' "4 $(printf 'ID,Name,Tags,Code\n1,"%s\n"y,,\n1,2\n3,"x,,\n' "$long" | cksum) 8" \
+  "$(printf 'ID,Name,Tags,Code\n1,"%s\n",,\n1,"%s\n"y,,\n1,2\n3,"x,,\n' "${long}x" "$long" |
+    stream --bad-rows bad.csv --format csv --set iCharactercase=0 >good.csv; echo "$? $(cksum <bad.csv) $(grep -o 'xx*' good.csv | tr -d '\n' | wc -c)")"
+verdict 'the summary as JSON' '1 3' "$(clean 'ID,Name,Tags,Code\n' >log; printf 'ID,Name,Tags,Code\n,#,,\n' >in.csv
+  "$talutil" clean in.csv --plan plan --output out.sql --json | python3 -c 'import json, sys; d = json.load(sys.stdin); print(d["rows"], sum(c["changed"] for c in d["columns"]))')"
+[ -c /dev/full ] && verdict 'a full disk' '1: talutil: cannot write "/dev/full": error 61: Disk full' \
+  "$(printf 'ID,Name,Tags,Code\n' >in.csv; answer "$talutil" clean in.csv --plan plan --transaction --output /dev/full)"
 
 # ---- the code page of texts
 expect 'by code page 1252' 0 'é 5' call VerifyTextData 0 0 'éЖ 5?'
@@ -218,7 +252,7 @@ TALUTIL_CODE_PAGE=1251x expect 'an unknown page in the environment' 1 \
   call VerifyTextData 0 0 x
 iconv -t CP1251 <<<"Имя${nl}Ольга?" >in.csv
 echo 'Имя VerifyTextData 0 0' >names
-"$talutil" clean in.csv --plan names --code-page 1251 --output out.sql >log 2>&1
+"$talutil" clean in.csv --plan names --code-page 1251 --output-encoding 1251 --output out.sql >log 2>&1
 verdict 'files in another code page' 'INSERT INTO in ("Имя") VALUES ('"'Ольга');" "$(iconv -f CP1251 out.sql | tr -d '\r')"
 
 refused() { verdict "$1" "1: talutil: in.csv: $2" "$(answer clean "$3")"; }  # name, message, CSV
@@ -231,7 +265,7 @@ refused 'column without plan' 'column "Fax" has no line in plan' 'ID,Fax,Name,Ta
 refused 'run-time error' \
   'line 2, column "ID": VerifyIntData: error 6: Overflow; the value is "1E999"' 'ID,Name,Tags,Code\n1E999,,,\n'
 verdict 'nothing is written on errors' 'none' "$(rm -f out.sql; clean 'ID\n' >log; cat out.sql 2>/dev/null || echo none)"
-verdict 'the CSV file is not overwritten' '2: talutil: --output ./in.csv is the CSV file itself; name another file' \
+verdict 'the CSV file is not overwritten' '2: talutil: --output ./in.csv is the input itself; name another file' \
   "$(printf 'ID\n' >in.csv; answer "$talutil" clean in.csv --plan plan --output ./in.csv)"
 
 bad_plan() {  # name, message, line
@@ -354,6 +388,25 @@ verdict 'log tail, the folder given' "anne:STAMP:Second:frm${nl}anne:STAMP:Third
 verdict 'log tail for people and programs' 'DAY TIME  anne  Third Jürgen  (frm) {"time": "DAYTTIME", "user": "anne", "text": "Third Jürgen", "form": "frm"}' \
   "$("$talutil" log tail -n 1 drives/c/TAL/ORV3 | stamps) $("$talutil" log tail -n 1 drives/c/TAL/ORV3 --json | stamps)"
 verdict 'log tail ends with its reader' 'DAY' "$(timeout 20 "$talutil" log tail -f -n 1 drives/c/TAL/ORV3 | head -1 | stamps | cut -c1-3)"
+
+# ---- interruption: no temporary files stay, and the old file does
+# Asynchronous commands ignore SIGINT unless somebody resets it.
+as_in_front='import os, signal, sys; signal.signal(signal.SIGINT, signal.SIG_DFL); os.execv(sys.argv[1], sys.argv[1:])'
+interrupted() {  # signal
+  rm -f pipe && mkfifo pipe && echo old >out.sql && echo 'ID VerifyIntData 0' >plan
+  python3 -c "$as_in_front" "$talutil" clean pipe --plan plan --output out.sql 2>log &
+  local command=$! status
+  exec 9>pipe
+  { echo ID && seq 50; } >&9
+  until compgen -G '.talutil-*' >log || ! kill -0 $command 2>/dev/null; do sleep 0.01; done
+  kill "-$1" $command
+  wait $command 2>/dev/null
+  status=$?
+  exec 9>&-
+  echo "$status $(cat out.sql)$(compgen -G '.talutil-*')"
+}
+verdict 'Ctrl-C' '130 old' "$(interrupted INT)"
+verdict 'SIGTERM' '143 old' "$(interrupted TERM)"
 
 verdict 'log tail of fewer lines than asked for' 3 "$("$talutil" log tail drives/c/TAL/ORV3/EventLog.txt | wc -l)"
 expect_part 'log tail of no log' 1 'cannot read the event log "Q:\x": error 76: Path not found' log tail 'Q:\x'
