@@ -320,9 +320,20 @@ verdict 'the whole table' '' "$(cmp table.csv all.txt 2>&1)"
 verdict 'export, streams' $'Name\r' "$(sed '1s/^/\xef\xbb\xbf/' table.csv | "$talutil" export --from - --hide 2,3 --rows 0 -)"
 verdict 'what is behind standard output stays' $'before\nName\r' \
   "$(echo before >log; "$talutil" export --from table.csv --hide 2,3 --rows 0 /dev/stdout >>log; cat log)"
-expect 'report' 0 '' report table.csv --title 'Sales €' --landscape --pdf sales.pdf
+expect 'report' 0 'talutil: sales.pdf: 1 page' report table.csv --title 'Sales €' --landscape --pdf sales.pdf
 verdict 'the words of the report' "Anne 1 Cork, IE" "$(pdftotext -layout sales.pdf - | grep Anne | tr -s ' ' | sed 's/^ //')"
-expect 'report: a text' 0 '' report shown.txt
+expect_part 'report: a text' 0 '1 page' report shown.txt
+words() { "$talutil" report "$@" --pdf - 2>report.log | pdftotext -layout - - | tr -s ' ' | sed 's/^ //' | grep -v '^$'; }
+printf 'Name,Sum,Ölpreis\nZoë Ольга,"1,200.50",x\nTrần,3,😀\n' >sums.csv
+verdict 'report: columns, total, period' 'April 2009,Sum Name,1,200.50 Zoë Ольга,3 Trần,1,203.50 Total' \
+  "$(words sums.csv --columns Sum,1 --total sum --period 'April 2009' | sed -n 2,6p | paste -sd,)"
+verdict 'report: what no font has' 'talutil: 1 characters are in no font and are shown as boxes: 😀; --font-file names a TrueType font that has them' \
+  "$(words sums.csv >log; head -1 report.log)"
+verdict 'report: a name in capitals is a table' 'Name Sum Ölpreis' "$(cp sums.csv S.CSV; words S.CSV --font fixed | sed -n 2p)"
+expect_part 'report: a program' 1 'is no text: ' report "$talutil" --pdf x.pdf --encoding 1252
+expect_part 'report: paper' 0 '1 page' report sums.csv --paper letter --pdf x.pdf
+expect 'report: no such column' 2 'talutil: --total: there is no column "x"; name one by its heading or by its number, 1 to 3' \
+  report sums.csv --total x --pdf x.pdf
 expect_part 'system information' 0 'Operating system' sysinfo
 expect_part 'details of a file' 0 'Kind        File' sysinfo table.csv
 verdict 'system information in JSON' "file $(stat -c %s table.csv)" "$("$talutil" sysinfo --json table.csv |
