@@ -63,7 +63,7 @@ std::string option_words(const Command& command) {
 /// The cases of a shell's `case` by the words of the subcommand, for bash and zsh.
 void print_cases(const std::vector<Command>& commands) {
   for (const Command& command : commands) {
-    std::cout << "    '" << command.words << "') options='" << option_words(command) << "' words='"
+    std::cout << "    '" << command.words << "') options='" << option_words(command) << "' below='"
               << joined(command.below) << (command.takes_members ? " '\"$members\"" : "'") << " ;;\n";
   }
 }
@@ -75,7 +75,7 @@ void print_bash(const std::vector<Command>& commands) {
                "  local members='"
             << members()
             << "'\n"
-               "  local current=${COMP_WORDS[COMP_CWORD]} key= options= words= i\n"
+               "  local current=${COMP_WORDS[COMP_CWORD]} key= options= below= i\n"
                "  for ((i = 1; i < COMP_CWORD && i < 3; i++)); do\n"
                "    [[ ${COMP_WORDS[i]} == -* ]] && break\n"
                "    case \"${key:+$key }${COMP_WORDS[i]}\" in\n      ";
@@ -92,8 +92,8 @@ void print_bash(const std::vector<Command>& commands) {
                "  case $key in\n";
   print_cases(commands);
   std::cout << "  esac\n"
-               "  [[ $current == -* ]] && words=$options\n"
-               "  COMPREPLY=($(compgen -W \"$words\" -- \"$current\"))\n"
+               "  [[ $current == -* ]] && below=$options\n"
+               "  COMPREPLY=($(compgen -W \"$below\" -- \"$current\"))\n"
                "}\n"
                "complete -o default -F _talutil talutil\n";
 }
@@ -105,7 +105,7 @@ void print_zsh(const std::vector<Command>& commands) {
                "  local members='"
             << members()
             << "'\n"
-               "  local key= options= each\n"
+               "  local key= options= below= each\n"
                "  local -a reply_words\n"
                "  for each in ${words[2,CURRENT-1]}; do\n"
                "    case \"${key:+$key }$each\" in\n      ";
@@ -119,12 +119,12 @@ void print_zsh(const std::vector<Command>& commands) {
                "      *) break ;;\n"
                "    esac\n"
                "  done\n"
-               "  local current=$words[CURRENT] words=\n"
+               "  local current=$words[CURRENT]\n"
                "  case $key in\n";
   print_cases(commands);
   std::cout << "  esac\n"
-               "  [[ $current == -* ]] && words=$options\n"
-               "  reply_words=(${=words})\n"
+               "  [[ $current == -* ]] && below=$options\n"
+               "  reply_words=(${=below})\n"
                "  (( $#reply_words )) && compadd -- $reply_words\n"
                "  [[ $current == -* ]] || _files\n"
                "}\n"

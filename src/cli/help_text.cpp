@@ -23,12 +23,12 @@ constexpr Topic topics[] = {
      "  1    failed: not done as asked\n"
      "  2    wrong use: an option, an argument or a name\n"
      "  3    the answer is False, with \"talutil call --test\"\n"
-     "  4    done, except for what is named on standard error: kept, renamed, or collected as bad\n"
+     "  4    done, except for what is named on standard error\n"
      "  130  interrupted by Ctrl-C (143 by SIGTERM); temporary files are removed\n"},
     {"encodings",
      "Encodings of files\n\n"
-     "An input is read by its byte order mark; without one as UTF-8 if it is that, otherwise in the code page\n"
-     "(--code-page, TALUTIL_CODE_PAGE, 1252), which is said on standard error. --encoding names it instead: utf-8,\n"
+     "An input is read by its byte order mark; without one as UTF-8 if it is that, otherwise in the code page "
+     "(--code-page, TALUTIL_CODE_PAGE, 1252), which is said on standard error. --encoding names it instead: utf-8, "
      "utf-16 or the number of a code page. SQL, CSV and JSON lines are written in UTF-8, or as --output-encoding "
      "says.\n"
      "\"-\" is standard input or output wherever a file is named.\n"},
@@ -96,9 +96,9 @@ std::string HelpFormatter::make_help(const CLI::App* app, std::string name, CLI:
   return wrapped(Formatter::make_help(app, std::move(name), mode), terminal_width());
 }
 
-std::string_view help_topic(std::string_view name) noexcept {
+std::string help_topic(std::string_view name) {
   const auto* const found = std::ranges::find(topics, name, &Topic::name);
-  return found == std::end(topics) ? std::string_view() : found->text;
+  return found == std::end(topics) ? std::string() : wrapped(found->text, terminal_width());
 }
 
 std::string help_topics() {

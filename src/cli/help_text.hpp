@@ -13,7 +13,7 @@ class HelpFormatter : public CLI::Formatter {
 };
 
 /// A help page that belongs to no subcommand, such as "exit-codes"; nothing if there is none of that name.
-[[nodiscard]] std::string_view help_topic(std::string_view name) noexcept;
+[[nodiscard]] std::string help_topic(std::string_view name);
 
 /// The names of these pages, separated by commas.
 [[nodiscard]] std::string help_topics();
