@@ -145,8 +145,8 @@ Function ${UN}Discard
 FunctionEnd
 
 ; The registering program of a kind: 32-bit programs see that of 32-bit libraries in the system folder and the other one
-; in Sysnative. A kind without one is left out, as on 32-bit systems and on servers without 32-bit support. On
-; Windows for ARM the program in Sysnative cannot load x64 libraries.
+; in Sysnative. A kind without one is left out, as on 32-bit systems and on servers without 32-bit support. On Windows
+; for ARM the program in Sysnative cannot load x64 libraries.
 Function ${UN}FindKinds
   !if "${TARGET}" == "amd64-unicode"
     StrCpy $Regsvr64 "$SYSDIR\regsvr32.exe"
