@@ -1,7 +1,5 @@
 #include "com/recorder.hpp"
 
-#include <array>
-
 #include "calling/json_writer.hpp"
 #include "com/dispatch_object.hpp"
 
@@ -118,37 +116,13 @@ void Recorder::append(std::string& out, const ObjectRef& object) {
   out += '}';
 }
 
-RecordedCall::RecordedCall(Recorder& recorder, const void* identity, const Member& member,
-                           std::span<const Argument> arguments) noexcept
-    : recorder_(recorder) {
-  try {
-    record_.emplace(calling::CallRecord::Origin{GetCurrentProcessId(), recorder.number_of(identity)}, member, arguments,
-                    recorder);
-  } catch (...) {
-    recorder.stop();
-  }
-  start_ = std::chrono::steady_clock::now();
+void RecordedCall::begin(const void* identity, const Member& member, std::span<const Argument> arguments) {
+  record_.emplace(calling::CallRecord::Origin{GetCurrentProcessId(), recorder_.number_of(identity)}, member, arguments,
+                  recorder_);
 }
 
-template <class Finish>
-void RecordedCall::finish(Finish finish) noexcept {
-  const auto time = std::chrono::steady_clock::now() - start_;
-  if (!record_) return;
-  try {
-    finish(*record_);
-    recorder_.write(std::move(*record_).line(std::chrono::duration_cast<std::chrono::microseconds>(time).count()));
-  } catch (...) {
-    recorder_.stop();
-  }
-}
-
-void RecordedCall::succeed(const Variant& result, std::span<const Argument> arguments) noexcept {
-  finish([&](calling::CallRecord& record) { record.succeed(result, arguments); });
-}
-
-void RecordedCall::fail(std::span<const Argument> arguments) noexcept {
-  const RunTimeError error = current_error();
-  finish([&](calling::CallRecord& record) { record.fail(error, arguments); });
+void RecordedCall::write(std::chrono::steady_clock::duration time) {
+  recorder_.write(std::move(*record_).line(std::chrono::duration_cast<std::chrono::microseconds>(time).count()));
 }
 
 }  // namespace talutil::com

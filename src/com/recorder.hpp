@@ -56,20 +56,42 @@ class Recorder final : public calling::ObjectNumbers {
   std::int32_t last_ = 0;
 };
 
-/// One call while it is recorded.
+/// One call while it is recorded. Arguments are asked for here, so that nothing that fails meanwhile reaches the host.
 class RecordedCall {
  public:
-  RecordedCall(Recorder& recorder, const void* identity, const Member& member,
-               std::span<const Argument> arguments) noexcept;
+  template <class Arguments>
+  RecordedCall(Recorder& recorder, const void* identity, const Member& member, const Arguments& arguments) noexcept
+      : recorder_(recorder) {
+    protect([&] { begin(identity, member, arguments()); });
+    start_ = std::chrono::steady_clock::now();
+  }
 
-  void succeed(const Variant& result, std::span<const Argument> arguments) noexcept;
+  template <class Arguments>
+  void succeed(const Variant& result, const Arguments& arguments) noexcept {
+    const auto time = std::chrono::steady_clock::now() - start_;
+    if (record_) protect([&] { record_->succeed(result, arguments()), write(time); });
+  }
 
   /// Takes the error that is being handled.
-  void fail(std::span<const Argument> arguments) noexcept;
+  template <class Arguments>
+  void fail(const Arguments& arguments) noexcept {
+    const auto time = std::chrono::steady_clock::now() - start_;
+    const RunTimeError error = current_error();
+    if (record_) protect([&] { record_->fail(error, arguments()), write(time); });
+  }
 
  private:
-  template <class Finish>
-  void finish(Finish finish) noexcept;
+  void begin(const void* identity, const Member& member, std::span<const Argument> arguments);
+  void write(std::chrono::steady_clock::duration time);
+
+  template <class Work>
+  void protect(const Work& work) noexcept {
+    try {
+      work();
+    } catch (...) {
+      recorder_.stop();
+    }
+  }
 
   Recorder& recorder_;
   std::optional<calling::CallRecord> record_;
@@ -82,18 +104,18 @@ auto recorded(Recorder* recorder, const void* identity, const Member& member, co
               const Use& use) -> decltype(use()) {
   if (recorder == nullptr) return use();
   using Result = decltype(use());
-  RecordedCall call(*recorder, identity, member, arguments());
+  RecordedCall call(*recorder, identity, member, arguments);
   try {
     if constexpr (std::is_void_v<Result>) {
       use();
-      call.succeed({}, arguments());
+      call.succeed({}, arguments);
     } else {
       Result result = use();
-      call.succeed(result, arguments());
+      call.succeed(result, arguments);
       return result;
     }
   } catch (...) {
-    call.fail(arguments());
+    call.fail(arguments);
     throw;
   }
 }
