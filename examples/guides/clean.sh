@@ -12,4 +12,4 @@ Amount  VerifyIntData 1
 PLAN
 talutil clean customers.csv --plan customers.plan --set iCharactercase=1 --set iCharacterCaseSuburbs=1 \
   --output customers.sql >summary.txt 2>&1
-iconv --from-code=CP1252 --to-code=UTF-8 customers.sql
+cat customers.sql
