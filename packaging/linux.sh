@@ -1,4 +1,4 @@
-# The package for Linux. Sourced by ./package, after tools/environment.sh.
+# The packages for Linux. Sourced by ./package, after tools/environment.sh.
 
 package_linux() {
   local name=talutil-$version log=$talutil_build/package-linux.log
@@ -15,4 +15,9 @@ package_linux() {
   tar --create --sort=name --format=ustar --owner=0 --group=0 --numeric-owner --directory="$stage" "$name" |
     gzip -n -9 >"$stage/$name.tar.gz"
   mv "$stage/$name.tar.gz" "$output/$name-linux-$(uname -m).tar.gz"
+}
+
+package_debian() {
+  rm -f "$output"/talutil_*.deb
+  packaging/debian.sh "$output"
 }

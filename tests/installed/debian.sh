@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Makes the Debian package twice and uses it from a folder that it is unpacked into: tests/packages/debian.sh
-# Takes a build of the preset "native", so ./test leaves it out. The last line is "N passed, N failed".
+# Makes the Debian package twice and uses it from a folder that it is unpacked into: tests/installed/debian.sh. The last
+# line is "N passed, N failed".
 set -uo pipefail
 top=$(cd "$(dirname "${BASH_SOURCE[0]}")/../.." && pwd)
 work=$(mktemp -d)
@@ -17,8 +17,8 @@ verdict() {  # name, expected, actual
   fi
 }
 
-package=$("$top/tools/package_linux.sh" "$work/first" | tail -1)
-again=$("$top/tools/package_linux.sh" "$work/second" | tail -1)
+package=$("$top/packaging/debian.sh" "$work/first" | tail -1)
+again=$("$top/packaging/debian.sh" "$work/second" | tail -1)
 verdict 'the same bytes twice' same "$(cmp "$package" "$again" && echo same)"
 dpkg -x "$package" "$work/root"
 dpkg -e "$package" "$work/root/DEBIAN"

@@ -1,12 +1,12 @@
 #!/usr/bin/env bash
 # Makes the Debian package of the command, the C library and the Python package, from the preset "native":
-#   tools/package_linux.sh [FOLDER]     by default build/packages
+#   packaging/debian.sh [FOLDER]     by default build/package; ./package debian does the same
 #
 # The same sources make the same bytes: times are that of the last commit, or SOURCE_DATE_EPOCH. Prints the file's name.
 set -euo pipefail
-. "$(dirname "${BASH_SOURCE[0]}")/environment.sh"
+. "$(dirname "${BASH_SOURCE[0]}")/../tools/environment.sh"
 cd "$talutil_top"
-folder=${1:-$talutil_build/packages}
+folder=${1:-$talutil_build/package}
 need_packages $native_packages python3 dpkg-dev
 build native >&2
 

@@ -1,8 +1,8 @@
 #!/usr/bin/env bash
-# Installs what a native build has made and uses it as others do: tests/packages/run.sh FOLDER_OF_THE_BUILD
+# Installs what a native build has made and uses it as others do: tests/installed/run.sh FOLDER_OF_THE_BUILD
 # The last line is "N passed, N failed".
 set -uo pipefail
-[ -f "${1:-}/CMakeCache.txt" ] || { echo "usage: tests/packages/run.sh FOLDER_OF_THE_BUILD" >&2; exit 2; }
+[ -f "${1:-}/CMakeCache.txt" ] || { echo "usage: tests/installed/run.sh FOLDER_OF_THE_BUILD" >&2; exit 2; }
 build=$(realpath "$1")
 here=$(cd "$(dirname "${BASH_SOURCE[0]}")" && pwd)
 work=$(mktemp -d)
