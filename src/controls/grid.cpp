@@ -59,11 +59,22 @@ void RowText::set(std::size_t column, TextView text, std::size_t columns) {
   } else {
     if (text.size() > std::numeric_limits<std::uint32_t>::max() - units_.size()) raise(ErrorNumber::out_of_memory);
     const auto start = static_cast<std::uint32_t>(units_.size());
+    make_room(text.size(), column + 1 == columns);
     units_ += text;
     unused_ += place.length;
     place = {start, static_cast<std::uint32_t>(text.size())};
   }
   if (unused_ > units_.size() / 2) tidy();
+}
+
+void RowText::make_room(std::size_t length, bool is_last) {
+  const std::size_t needed = units_.size() + length;
+  if (needed <= units_.capacity()) return;
+  // A string that grows by itself doubles its room. Most rows are filled from left to right, once.
+  Text larger;
+  larger.reserve(is_last ? needed : needed + needed / 8);
+  larger += units_;
+  units_ = std::move(larger);
 }
 
 void RowText::keep(std::size_t columns) {

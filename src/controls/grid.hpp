@@ -26,6 +26,9 @@ class RowText {
     std::uint32_t length = 0;
   };
 
+  /// Makes room for so many more code units: no more than that for the last cell of a row.
+  void make_room(std::size_t length, bool is_last);
+
   /// Removes text that no cell refers to any more.
   void tidy();
 
