@@ -136,9 +136,8 @@ void add_batch(CLI::App& app, Work& work) {
       "is answered by\n"
       "  {\"id\": 7, \"result\": \"A\"}\n"
       "in the same process, so that settings last. docs/batch.md describes values, objects and errors.");
-  choose(*command, work, options, [](const BatchOptions& chosen) {
-    chosen.compared.empty() ? answer_calls(chosen) : compare_calls(chosen);
-  });
+  choose(*command, work, options,
+         [](const BatchOptions& chosen) { chosen.compared.empty() ? answer_calls(chosen) : compare_calls(chosen); });
 }
 
 }  // namespace talutil::cli

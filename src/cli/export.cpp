@@ -89,7 +89,7 @@ void export_table(const ExportOptions& options) {
 
 void add_export(CLI::App& app, Work& work) {
   const auto options = std::make_shared<ExportOptions>();
-  auto* const command = app.add_subcommand("export", "Write the visible rows and columns of a table, as a grid does");
+  auto* const command = app.add_subcommand("export", "Write chosen rows and columns of a CSV file");
   command
       ->add_option("--from", options->table,
                    "The table, comma-separated; its first line, the header, is row 0; - is standard input")

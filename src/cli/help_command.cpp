@@ -78,7 +78,8 @@ std::string help_hint(const CLI::App& app) {
 void add_help(CLI::App& app, Work& work) {
   const auto options = std::make_shared<HelpOptions>();
   auto* const command = app.add_subcommand("help", "Explain a class, a member, a subcommand or a topic");
-  command->add_option("NAME", options->words, "A class or a member in any case, a subcommand, or one of: " + help_topics());
+  command->add_option("NAME", options->words,
+                      "A class or a member in any case, a subcommand, or one of: " + help_topics());
   command->add_flag("--man", options->is_manual_page, "Print the manual page, talutil.1");
   choose(*command, work, options, [&app](const HelpOptions& chosen) { print_help(app, chosen); });
 }

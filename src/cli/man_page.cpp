@@ -47,13 +47,14 @@ void print_option(const CLI::Option& option) {
 /// A subcommand with its options and what stands below its help, then its own subcommands.
 void print_command(const CLI::App& command, const std::string& before) {
   const std::string name = before + command.get_name();
-  std::cout << ".SS " << roff(name) << '\n' << roff(command.get_description())
-            << (command.get_description().ends_with('.') ? "\n" : ".\n");
+  std::cout << ".SS " << roff(name) << '\n'
+            << roff(command.get_description()) << (command.get_description().ends_with('.') ? "\n" : ".\n");
   for (const CLI::Option* const option : command.get_options()) {
     if (option != command.get_help_ptr()) print_option(*option);
   }
   // A subcommand without a footer inherits that of the command.
-  if (!command.get_footer().empty() && command.get_footer() != command.get_parent()->get_footer()) std::cout << ".PP\n.nf\n" << roff(command.get_footer()) << "\n.fi\n";
+  if (!command.get_footer().empty() && command.get_footer() != command.get_parent()->get_footer())
+    std::cout << ".PP\n.nf\n" << roff(command.get_footer()) << "\n.fi\n";
   for (const CLI::App* const part : command.get_subcommands({})) print_command(*part, name + " ");
 }
 

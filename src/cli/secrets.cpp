@@ -76,7 +76,7 @@ void password(const PasswordOptions& options) {
 
 void add_secrets(CLI::App& app, Work& work) {
   const auto secret = std::make_shared<SecretOptions>();
-  auto* const encrypting = app.add_subcommand("encrypt", "Encrypt the text on standard input, as hosts do");
+  auto* const encrypting = app.add_subcommand("encrypt", "Encrypt the text on standard input, in the library's format");
   encrypting->add_flag("--exact", secret->exact, "Treat a final line break as part of the text");
   encrypting->footer("  printf %s \"$secret\" | talutil encrypt");
   add_json(*encrypting, secret->json, "Print {\"text\": ...}");
