@@ -1,5 +1,12 @@
 #include "calling/json_writer.hpp"
 
+#include <algorithm>
+#include <cmath>
+#include <cstdlib>
+#include <limits>
+
+#include "automation/decimal_digits.hpp"
+
 namespace talutil::calling {
 
 namespace {
@@ -58,6 +65,64 @@ void append_text(std::string& out, TextView text) {
     }
   }
   out += '"';
+}
+
+namespace {
+
+void append_decimal(std::string& out, const DecimalDigits& number) {
+  constexpr int most_plain_digits = 16;
+  constexpr int least_plain_exponent = -4;
+  const std::string& digits = number.digits;
+  const int count = static_cast<int>(digits.size());
+  const int exponent = number.exponent;
+  const auto whole = static_cast<std::size_t>(std::max(exponent + 1, 0));
+  if (exponent >= least_plain_exponent && exponent < 0) {
+    out += "0." + std::string(static_cast<std::size_t>(-exponent - 1), '0') + digits;
+  } else if (exponent >= 0 && exponent < most_plain_digits) {
+    out.append(digits, 0, whole);
+    if (count > exponent + 1)
+      out.append(1, '.').append(digits, whole);
+    else
+      out.append(whole - digits.size(), '0');
+  } else {
+    out += digits.front();
+    if (count > 1) out.append(1, '.').append(digits, 1);
+    out += exponent < 0 ? "e-" : "e+";
+    if (std::abs(exponent) < 10) out += '0';
+    out += std::to_string(std::abs(exponent));
+  }
+}
+
+/// @param enough so many digits always read back as the same value
+template <class Number>
+void append_shortest(std::string& out, Number value, int enough) {
+  if (std::signbit(value)) out += '-';
+  value = std::abs(value);
+  if (value == 0) {
+    out += '0';
+    return;
+  }
+  std::string written;
+  // Up to these digits, all numbers can be read back, but not those that are too small to have all their bits.
+  const bool is_normal = value >= std::numeric_limits<Number>::min();
+  for (int count = is_normal ? std::numeric_limits<Number>::digits10 : 1; count <= enough; ++count) {
+    written.clear();
+    append_decimal(written, decimal_digits(value, count));
+    Number again = 0;
+    std::from_chars(written.data(), written.data() + written.size(), again);
+    if (again == value) break;
+  }
+  out += written;
+}
+
+}  // namespace
+
+void append_number(std::string& out, double value) {
+  append_shortest(out, value, std::numeric_limits<double>::max_digits10);
+}
+
+void append_number(std::string& out, float value) {
+  append_shortest(out, value, std::numeric_limits<float>::max_digits10);
 }
 
 }  // namespace talutil::calling

@@ -21,13 +21,15 @@ inline void append_name(std::string& out, std::string_view name) {
   out += '"';
 }
 
-/// The shortest number that reads back as the same value.
-template <class Number>
-requires std::integral<Number> || std::floating_point<Number>
+template <std::integral Number>
 void append_number(std::string& out, Number value) {
   std::array<char, 32> digits{};
   const auto end = std::to_chars(digits.data(), digits.data() + digits.size(), value);
   out.append(digits.data(), end.ptr);
 }
+
+/// The shortest number that reads back as the same value. (The C++ library's own conversion needs large tables.)
+void append_number(std::string& out, double value);
+void append_number(std::string& out, float value);
 
 }  // namespace talutil::calling

@@ -224,19 +224,35 @@ std::vector<Argument> arguments_of(const std::tuple<WireCell<A>...>& cells) {
 }
 
 /// The member behind the function of a slot. Searches the slots: only recordings need it.
-template <class C, class Function>
-const Member& member_behind(Function function) noexcept {
+template <class C>
+const Member& member_behind(Slot slot) noexcept {
   const Slot* const first = vtable_of<C>() + own_slots;
-  const Slot* const found = std::find(first, first + described<C>.size(), reinterpret_cast<Slot>(function));
+  const Slot* const found = std::find(first, first + described<C>.size(), slot);
   return described<C>[static_cast<std::size_t>(found - first)];
 }
 
 /// Records a use of a member, if calls are recorded.
-template <class C, class Function, class Arguments, class Use>
-auto recorded_use(ComObject<C>* self, Function function, const Arguments& arguments, const Use& use) {
+template <class C, class Arguments, class Use>
+auto recorded_use(ComObject<C>* self, Slot slot, const Arguments& arguments, const Use& use) {
   Recorder* const recorder = module_recorder();
   if (recorder == nullptr) return use();
-  return recorded(recorder, &self->object, member_behind<C>(function), arguments, use);
+  using Result = decltype(use());
+  const Member& member = member_behind<C>(slot);
+  if constexpr (std::is_void_v<Result>) {
+    const auto use_without_result = [&] {
+      use();
+      return Variant();
+    };
+    recorded_use(*recorder, &self->object, member, arguments, use_without_result);
+  } else {
+    std::optional<Result> result;
+    const auto keep = [&] {
+      result.emplace(use());
+      return Variant(*result);
+    };
+    recorded_use(*recorder, &self->object, member, arguments, keep);
+    return *std::move(result);
+  }
 }
 
 template <class A>
@@ -274,7 +290,7 @@ struct MethodThunk<C, M, R (Owner::*)(A...)> {
       std::tuple<WireCell<A>...> cells{WireCell<A>(given, library)...};
       auto answer = run(cells, library, [&] {
         return Wire<R>::to(recorded_use(
-            self, &call, [&] { return arguments_of(cells); },
+            self, reinterpret_cast<Slot>(&call), [&] { return arguments_of(cells); },
             [&] { return std::apply([&](auto&... cell) { return (self->object.*M)(cell.value()...); }, cells); }));
       });
       write_back(cells, library);
@@ -293,7 +309,7 @@ struct MethodThunk<C, M, void (Owner::*)(A...)> {
       std::tuple<WireCell<A>...> cells{WireCell<A>(given, library)...};
       run(cells, library, [&] {
         recorded_use(
-            self, &call, [&] { return arguments_of(cells); },
+            self, reinterpret_cast<Slot>(&call), [&] { return arguments_of(cells); },
             [&] { std::apply([&](auto&... cell) { (self->object.*M)(cell.value()...); }, cells); });
       });
       write_back(cells, library);
@@ -301,10 +317,47 @@ struct MethodThunk<C, M, void (Owner::*)(A...)> {
   }
 };
 
+/// The uses of all properties of a type: a property adds to them only its place and its slot.
+template <class C, class Field, class Type, ObjectKind Kind>
+struct FieldAccess {
+  [[gnu::noinline]] static HRESULT get(ComObject<C>* self, Slot slot, const Field& field, Type* result) noexcept {
+    const auto none = [] { return std::vector<Argument>(); };
+    return guarded(
+        [&] { Wire<Field>::store(*result, Wire<Field>::to(recorded_use(self, slot, none, [&] { return field; }))); });
+  }
+
+  [[gnu::noinline]] static HRESULT put(ComObject<C>* self, Slot slot, Field& field, Type value) noexcept {
+    return guarded([&] {
+      // A value that cannot be converted is the caller's error, and no call that could be recorded.
+      auto given = converted(value);
+      if (module_recorder() == nullptr) return store(field, std::move(given));
+      recorded_use(
+          self, slot, [&] { return std::vector<Argument>{Argument(Variant(given))}; }, [&] { store(field, given); });
+    });
+  }
+
+ private:
+  static auto converted(const Type& value) {
+    if constexpr (std::is_same_v<Field, ObjectRef>)
+      return variant_from(value);
+    else
+      return Wire<Field>::from(value);
+  }
+
+  template <class Given>
+  static void store(Field& field, Given given) {
+    if constexpr (std::is_same_v<Field, ObjectRef>)
+      field = object_of_kind(given, Kind);
+    else
+      field = std::move(given);
+  }
+};
+
 template <class C, auto M, ObjectKind Kind = any_object>
 struct PropertyThunk {
   using Field = typename MemberTraits<M>::Result;
   using Type = typename Wire<PropertyType<M>>::Type;
+  using Access = FieldAccess<C, Field, Type, Kind>;
 
   static Field& field(ComObject<C>* self) noexcept {
     return detail::part_of<typename MemberTraits<M>::Class>(self->object).*M;
@@ -313,33 +366,17 @@ struct PropertyThunk {
   static HRESULT STDMETHODCALLTYPE get(ComObject<C>* self, Type* result) noexcept {
     if (result == nullptr) return null_pointer();
     initialize(*result);
-    const auto none = [] { return std::span<const Argument>(); };
-    if (module_recorder() != nullptr) {
-      return guarded([&] {
-        Wire<Field>::store(*result, Wire<Field>::to(recorded_use(self, &get, none, [&] { return field(self); })));
-      });
-    }
     if constexpr (std::is_arithmetic_v<Type>) {
-      *result = Wire<Field>::to(field(self));
-      return S_OK;
-    } else {
-      return guarded([&] { Wire<Field>::store(*result, Wire<Field>::to(field(self))); });
+      if (module_recorder() == nullptr) {
+        *result = Wire<Field>::to(field(self));
+        return S_OK;
+      }
     }
+    return Access::get(self, reinterpret_cast<Slot>(&get), field(self), result);
   }
 
   static HRESULT STDMETHODCALLTYPE put(ComObject<C>* self, Type value) noexcept {
-    return guarded([&] {
-      const auto store = [&] {
-        if constexpr (std::is_same_v<Field, ObjectRef>)
-          field(self) = object_of_kind(variant_from(value), Kind);
-        else
-          field(self) = Wire<Field>::from(value);
-      };
-      if (module_recorder() == nullptr) return store();
-      const std::array given{Argument(Variant(Wire<PropertyType<M>>::from(value)))};
-      recorded_use(
-          self, &put, [&] { return std::span<const Argument>(given); }, store);
-    });
+    return Access::put(self, reinterpret_cast<Slot>(&put), field(self), value);
   }
 };
 
