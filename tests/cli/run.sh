@@ -10,17 +10,7 @@ trap 'rm -rf "$work"' EXIT
 cd "$work" || exit 2
 export LC_ALL=C.UTF-8
 
-passed=0
-failed=0
-
-verdict() {  # name, expected, actual
-  if [ "$2" == "$3" ]; then
-    passed=$((passed + 1))
-  else
-    failed=$((failed + 1))
-    printf 'FAILED: %s\n  expected: %q\n  actual:   %q\n' "$1" "$2" "$3"
-  fi
-}
+. "$top/tests/verdict.sh"
 
 # What a command line gives: the status, then everything printed. expect NAME STATUS OUTPUT ARGUMENT...
 expect() {
@@ -426,5 +416,4 @@ expect 'log tail of no lines' 2 'talutil: --lines 0: write 1 or more' log tail -
 cmp -s "$top/examples/data/customers.csv" <("${CXX:-g++}" -std=c++20 -o make "$top/tools/make_customers.cpp" && ./make)
 verdict 'customers.csv is what make_customers writes' 0 $?
 
-printf '%d passed, %d failed\n' "$passed" "$failed"
-[ "$failed" = 0 ]
+close_counts

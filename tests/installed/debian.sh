@@ -5,17 +5,7 @@ set -uo pipefail
 top=$(cd "$(dirname "${BASH_SOURCE[0]}")/../.." && pwd)
 work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
-passed=0
-failed=0
-
-verdict() {  # name, expected, actual
-  if [ "$2" == "$3" ]; then
-    passed=$((passed + 1))
-  else
-    failed=$((failed + 1))
-    printf 'FAILED: %s\n  expected: %q\n  actual:   %q\n' "$1" "$2" "$3"
-  fi
-}
+. "$top/tests/verdict.sh"
 
 package=$("$top/packaging/debian.sh" "$work/first" | tail -1)
 again=$("$top/packaging/debian.sh" "$work/second" | tail -1)
@@ -31,5 +21,4 @@ verdict 'its Python package' B "$(LD_LIBRARY_PATH=$library PYTHONPATH=$work/root
 verdict 'its dependencies are installed here' "" "$(dpkg-deb -f "$package" Depends | tr ',' '\n' |
   sed 's/ *(.*//; s/^ *//' | while read -r name; do dpkg-query -W "$name" >/dev/null 2>&1 || echo "$name"; done)"
 
-printf '%d passed, %d failed\n' "$passed" "$failed"
-[ "$failed" = 0 ]
+close_counts

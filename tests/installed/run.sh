@@ -7,17 +7,7 @@ build=$(realpath "$1")
 here=$(cd "$(dirname "${BASH_SOURCE[0]}")" && pwd)
 work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
-passed=0
-failed=0
-
-verdict() {  # name, expected, actual
-  if [ "$2" == "$3" ]; then
-    passed=$((passed + 1))
-  else
-    failed=$((failed + 1))
-    printf 'FAILED: %s\n  expected: %q\n  actual:   %q\n' "$1" "$2" "$3"
-  fi
-}
+. "$here/../verdict.sh"
 
 # Runs a program that ends with its counts.
 counts() {
@@ -63,5 +53,4 @@ counts 'the Python package' run python3 "$here/members.py"
 verdict 'its examples' 0 \
   "$(run python3 -c 'import doctest, talutil; print(doctest.testmod(talutil).failed)' 2>&1)"
 
-printf '%d passed, %d failed\n' "$passed" "$failed"
-[ "$failed" = 0 ]
+close_counts
