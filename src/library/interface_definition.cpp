@@ -154,8 +154,7 @@ std::string interface_definition(Dialect dialect) {
   write_record(out, dialect == Dialect::type_library ? guid_stand_in : "GUID", identity::guid_record,
                {"long Data1", "short Data2", "short Data3", "unsigned char Data4[8]"});
   write_record(out, "TRect", identity::rectangle_record, {"long left", "long Top", "long Right", "long Bottom"});
-  write_class(out,
-              {"ORVUtils", identity::orv_utils_class, identity::orv_utils_interface, described<ORVUtils>},
+  write_class(out, {"ORVUtils", identity::orv_utils_class, identity::orv_utils_interface, described<ORVUtils>},
               dialect);
   write_class(out,
               {"cControlPosition", identity::control_position_class, identity::control_position_interface,

@@ -3,9 +3,9 @@
 //   artifacts write FOLDER    from FOLDER/in: settings.ini, plain.zip, report.pdf, locked.zip and cipher.txt
 //   artifacts read FOLDER     decrypts cipher.txt to opened.txt, and unpacks locked.zip to unpacked
 //
-// Every build makes the same bytes of the first three, but for the date in the document and, in the archive, the order of
-// the folder's files and their rights; every build reads the others of every build. tests/equality/compare.sh looks at
-// that.
+// Every build makes the same bytes of the first three, but for the date in the document and, in the archive, the order
+// of the folder's files and their rights; every build reads the others of every build. tests/equality/compare.sh looks
+// at that.
 #include <cstdio>
 #include <cstring>
 #include <exception>
