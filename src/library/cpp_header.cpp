@@ -5,6 +5,7 @@
 
 #include "library/c_control_position.hpp"
 #include "library/identity.hpp"
+#include "library/interface_definition.hpp"
 #include "library/interface_table.hpp"
 #include "library/version.hpp"
 #include "texts/member_texts.hpp"
@@ -15,32 +16,7 @@ namespace {
 
 constexpr std::size_t line_length = 120;
 
-std::string_view type_name(ValueType type) {
-  switch (type) {
-    case ValueType::boolean:
-      return "VARIANT_BOOL";
-    case ValueType::int16:
-      return "short";
-    case ValueType::int32:
-      return "long";
-    case ValueType::single:
-      return "float";
-    case ValueType::date:
-      return "DATE";
-    case ValueType::text:
-      return "BSTR";
-    case ValueType::variant:
-      return "VARIANT";
-    case ValueType::text_array:
-      return "SAFEARRAY*";
-    case ValueType::system_time:
-      return "SYSTEMTIME";
-    case ValueType::none:
-    case ValueType::object:
-      break;
-  }
-  return "void";
-}
+std::string_view type_name(ValueType type) { return automation_type(type, "SAFEARRAY*"); }
 
 /// Text in lines that each begin with a prefix.
 void write_lines(std::string& out, std::string_view prefix, std::string_view text) {

@@ -26,32 +26,7 @@ std::string hexadecimal(std::int32_t value) {
   return "0x" + std::string(digits.data(), end.ptr);
 }
 
-std::string type_name(ValueType type) {
-  switch (type) {
-    case ValueType::boolean:
-      return "VARIANT_BOOL";
-    case ValueType::int16:
-      return "short";
-    case ValueType::int32:
-      return "long";
-    case ValueType::single:
-      return "float";
-    case ValueType::date:
-      return "DATE";
-    case ValueType::text:
-      return "BSTR";
-    case ValueType::variant:
-      return "VARIANT";
-    case ValueType::text_array:
-      return "SAFEARRAY(BSTR)";
-    case ValueType::system_time:
-      return "SYSTEMTIME";
-    case ValueType::none:
-    case ValueType::object:
-      break;
-  }
-  return "void";
-}
+std::string type_name(ValueType type) { return std::string(automation_type(type, "SAFEARRAY(BSTR)")); }
 
 std::string default_value(const Parameter& parameter) {
   if (!parameter.is_optional) return {};
@@ -138,6 +113,33 @@ void write_record(std::string& out, std::string_view name, std::string_view iden
 }
 
 }  // namespace
+
+std::string_view automation_type(ValueType type, std::string_view array) {
+  switch (type) {
+    case ValueType::boolean:
+      return "VARIANT_BOOL";
+    case ValueType::int16:
+      return "short";
+    case ValueType::int32:
+      return "long";
+    case ValueType::single:
+      return "float";
+    case ValueType::date:
+      return "DATE";
+    case ValueType::text:
+      return "BSTR";
+    case ValueType::variant:
+      return "VARIANT";
+    case ValueType::text_array:
+      return array;
+    case ValueType::system_time:
+      return "SYSTEMTIME";
+    case ValueType::none:
+    case ValueType::object:
+      break;
+  }
+  return "void";
+}
 
 std::string interface_definition(Dialect dialect) {
   std::string out = "[uuid(";

@@ -1,6 +1,9 @@
 #pragma once
 
 #include <string>
+#include <string_view>
+
+#include "automation/member_table.hpp"
 
 namespace talutil {
 
@@ -19,5 +22,9 @@ inline constexpr const char* guid_stand_in = "GYID";
 /// and the published records. Generated from the interface tables; the help strings are the first sentences of the
 /// members' texts.
 [[nodiscard]] std::string interface_definition(Dialect dialect = Dialect::published);
+
+/// What C calls a type of the interface; "void" for none.
+/// @param array what an array of texts is called, on which the languages differ
+[[nodiscard]] std::string_view automation_type(ValueType type, std::string_view array);
 
 }  // namespace talutil
