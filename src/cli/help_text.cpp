@@ -1,11 +1,9 @@
 #include "cli/help_text.hpp"
 
-#include <stdlib.h>
-#include <sys/ioctl.h>
-#include <unistd.h>
-
 #include <algorithm>
 #include <iterator>
+
+#include "cli/wrapping.hpp"
 
 namespace talutil::cli {
 
@@ -44,18 +42,6 @@ constexpr Topic topics[] = {
      "  TERM               \"dumb\" shows no progress\n"},
 };
 
-std::size_t terminal_width() {
-  constexpr std::size_t usual = 80;
-  constexpr std::size_t least = 40;
-  constexpr std::size_t most = 100;
-  const char* const columns = getenv("COLUMNS");
-  const long named = columns == nullptr ? 0 : atol(columns);
-  winsize size{};
-  if (named > 0) return std::clamp(static_cast<std::size_t>(named), least, most);
-  if (ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) != 0 || size.ws_col == 0) return usual;
-  return std::clamp<std::size_t>(size.ws_col, least, most);
-}
-
 /// Where the lines that continue a line begin: below the description of an option, otherwise as the line itself.
 std::size_t indent_of(std::string_view line) {
   constexpr std::size_t description = 30;
@@ -93,12 +79,12 @@ std::string wrapped(std::string_view text, std::size_t width) {
 }  // namespace
 
 std::string HelpFormatter::make_help(const CLI::App* app, std::string name, CLI::AppFormatMode mode) const {
-  return wrapped(Formatter::make_help(app, std::move(name), mode), terminal_width());
+  return wrapped(Formatter::make_help(app, std::move(name), mode), output_width());
 }
 
 std::string help_topic(std::string_view name) {
   const auto* const found = std::ranges::find(topics, name, &Topic::name);
-  return found == std::end(topics) ? std::string() : wrapped(found->text, terminal_width());
+  return found == std::end(topics) ? std::string() : wrapped(found->text, output_width());
 }
 
 std::string help_topics() {

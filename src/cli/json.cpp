@@ -1,47 +1,13 @@
 #include "cli/json.hpp"
 
-#include <array>
-#include <charconv>
 #include <cmath>
 #include <type_traits>
+
+#include "calling/json_writer.hpp"
 
 namespace talutil::cli::json {
 
 namespace {
-
-std::string unit_escape(char16_t unit) {
-  constexpr std::string_view digits = "0123456789abcdef";
-  std::string result = "\\u";
-  for (int shift = 12; shift >= 0; shift -= 4) result += digits[(unit >> shift) & 0xF];
-  return result;
-}
-
-std::string escape(char16_t unit) {
-  switch (unit) {
-    case u'"':
-      return "\\\"";
-    case u'\\':
-      return "\\\\";
-    case u'\n':
-      return "\\n";
-    case u'\r':
-      return "\\r";
-    case u'\t':
-      return "\\t";
-    default:
-      return unit_escape(unit);
-  }
-}
-
-constexpr bool is_high_surrogate(char16_t unit) noexcept { return (unit & 0xFC00) == 0xD800; }
-constexpr bool is_low_surrogate(char16_t unit) noexcept { return (unit & 0xFC00) == 0xDC00; }
-
-/// The number of units at the start of a text that need no escape; 0 if the first one does.
-std::size_t plain_units(TextView text) {
-  const char16_t unit = text.front();
-  if (is_high_surrogate(unit)) return text.size() > 1 && is_low_surrogate(text[1]) ? 2 : 0;
-  return unit < u' ' || unit == u'\x7F' || unit == u'"' || unit == u'\\' || is_low_surrogate(unit) ? 0 : 1;
-}
 
 /// What a value without a JSON form is.
 std::string_view kind_word(Variant::Kind kind) noexcept {
@@ -61,9 +27,9 @@ std::string_view kind_word(Variant::Kind kind) noexcept {
 
 template <class Number>
 std::string number(Number value) {
-  std::array<char, 32> digits{};
-  const auto end = std::to_chars(digits.data(), digits.data() + digits.size(), value);
-  return {digits.data(), end.ptr};
+  std::string result;
+  calling::append_number(result, value);
+  return result;
 }
 
 std::string texts(const TextArray& texts) {
@@ -88,13 +54,9 @@ std::string joined(char open, const Range& range, char close, Write write) {
 }  // namespace
 
 std::string text(TextView value) {
-  std::string result = "\"";
-  while (!value.empty()) {
-    const std::size_t plain = plain_units(value);
-    result += plain == 0 ? escape(value.front()) : to_utf8(value.substr(0, plain));
-    value.remove_prefix(plain == 0 ? 1 : plain);
-  }
-  return result + '"';
+  std::string result;
+  calling::append_text(result, value);
+  return result;
 }
 
 std::string text(std::string_view utf8) { return text(from_utf8(utf8)); }

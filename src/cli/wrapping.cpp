@@ -1,5 +1,6 @@
 #include "cli/wrapping.hpp"
 
+#include <stdlib.h>
 #include <sys/ioctl.h>
 #include <unistd.h>
 
@@ -45,7 +46,10 @@ void wrap_paragraph(std::string& out, std::string_view words, std::size_t width,
 std::size_t output_width() {
   constexpr std::size_t usual = 80;
   constexpr std::size_t narrowest = 40;
-  constexpr std::size_t widest = 120;
+  constexpr std::size_t widest = 100;
+  const char* const columns = getenv("COLUMNS");
+  const long named = columns == nullptr ? 0 : atol(columns);
+  if (named > 0) return std::clamp(static_cast<std::size_t>(named), narrowest, widest);
   winsize size{};
   if (ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) != 0 || size.ws_col == 0) return usual;
   return std::clamp<std::size_t>(size.ws_col, narrowest, widest);

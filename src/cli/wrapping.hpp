@@ -5,7 +5,7 @@
 
 namespace talutil::cli {
 
-/// The columns of the terminal on standard output, within what can be read; 80 if there is none.
+/// The columns that COLUMNS names, or those of the terminal on standard output, between 40 and 100; 80 without either.
 [[nodiscard]] std::size_t output_width();
 
 /// Paragraphs broken between words. Each line begins with `indent` blanks, the first with `first` instead. Words that
