@@ -101,6 +101,8 @@ FrmSysInfo::FrmSysInfo(Library& library)
 bool FrmSysInfo::is_item_shown() const noexcept { return tab_ == item_tab; }
 
 void FrmSysInfo::read() {
+  // Drives of a network that is gone take their time to say so.
+  const auto hourglass = library().platform().form_windows.show_hourglass();
   Machine& machine = library().platform().machine;
   tables_ = {drive_table(machine), memory_table(machine), processor_table(machine), operating_system_table(machine)};
 }
