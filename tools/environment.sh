@@ -34,10 +34,12 @@ need_packages() {
   done
   [ ${#missing[@]} -gt 0 ] || return 0
   [ "$(id -u)" = 0 ] || fail "missing packages: ${missing[*]}; install them or run as root"
+  mkdir -p "$talutil_cache"
   say "installing ${missing[*]}"
-  apt-get update -qq
-  DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null ||
-    fail "could not install: ${missing[*]}"
+  # One at a time: scripts that run side by side may both find something missing.
+  flock "$talutil_cache/packages.lock" bash -c 'apt-get update -qq &&
+    DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "$@" >/dev/null' \
+    install "${missing[@]}" || fail "could not install: ${missing[*]}"
 }
 
 # The variant of the third-party libraries that a preset uses.

@@ -29,34 +29,34 @@ X
 }
 
 have_equal_entries() {
-  entries "$1" >"$talutil_build/equality/entries" && entries "$2" | cmp - "$talutil_build/equality/entries"
+  entries "$1" >"$1.entries" && entries "$2" | cmp - "$1.entries"
 }
 
 without_dates() { LC_ALL=C sed -E 's/\(D:[0-9]{14}[^)]*\)/(D:)/g' "$1"; }
 
 compare_artifacts() {
-  local top=$talutil_build/equality program=$talutil_build/asan/tests/artifacts file
+  local top=$talutil_build/equality/$1 program=$talutil_build/asan/tests/artifacts file
   need_packages python3
   local windows_program="Z:\\build\\$1\\tests\\artifacts.exe"
   mkdir -p "$top"
   prepare_artifacts "$top/native"
-  prepare_artifacts "$top/$1"
+  prepare_artifacts "$top/windows"
   expect_success "the native artifacts" "$program" write "$top/native"
-  expect_success "the artifacts of $1" wine "$windows_program" write "Z:\\build\\equality\\$1"
-  expect_success "native settings.ini and that of $1 are equal" cmp "$top/native/settings.ini" "$top/$1/settings.ini"
+  expect_success "the artifacts of $1" wine "$windows_program" write "Z:\\build\\equality\\$1\\windows"
+  expect_success "native settings.ini and that of $1 are equal" cmp "$top/native/settings.ini" "$top/windows/settings.ini"
   expect_success "native plain.zip and that of $1 have equal entries" \
-    have_equal_entries "$top/native/plain.zip" "$top/$1/plain.zip"
+    have_equal_entries "$top/native/plain.zip" "$top/windows/plain.zip"
   expect_success "native report.pdf and that of $1 are equal but for dates" \
-    cmp <(without_dates "$top/native/report.pdf") <(without_dates "$top/$1/report.pdf")
+    cmp <(without_dates "$top/native/report.pdf") <(without_dates "$top/windows/report.pdf")
   # What is random by design: each reads the other's.
   for file in cipher.txt locked.zip; do
     mv "$top/native/$file" "$top/$file"
-    mv "$top/$1/$file" "$top/native/$file"
-    mv "$top/$file" "$top/$1/$file"
+    mv "$top/windows/$file" "$top/native/$file"
+    mv "$top/$file" "$top/windows/$file"
   done
   expect_success "reading natively what $1 has made" "$program" read "$top/native"
-  expect_success "reading in $1 what was made natively" wine "$windows_program" read "Z:\\build\\equality\\$1"
-  for file in native "$1"; do
+  expect_success "reading in $1 what was made natively" wine "$windows_program" read "Z:\\build\\equality\\$1\\windows"
+  for file in native windows; do
     expect_success "the text that was opened in $file" test "$(cat "$top/$file/opened.txt")" = "O´Neil, 5 €, Ольга"
     expect_success "the files that were unpacked in $file" diff -r "$top/$file/in" "$top/$file/unpacked/in"
   done

@@ -156,7 +156,7 @@ void components_window_is_hidden(_ORVUtils* u) {
 int wmain(int, wchar_t** arguments) {
   enter_desktop();
   const std::wstring folder = arguments[1];
-  pictures = folder + L"\\..\\screenshots\\";
+  pictures = folder + L"\\screenshots\\";
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();

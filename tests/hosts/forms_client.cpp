@@ -221,7 +221,8 @@ void keys_are_listed(_ORVUtils* u) {
 
 std::wstring clipboard() {
   std::wstring text;
-  if (OpenClipboard(nullptr) == FALSE) return text;
+  // The system's own clipboard manager has it open for a moment after every change.
+  if (!messages_until([] { return OpenClipboard(nullptr) != FALSE; })) return L"a clipboard that stays closed";
   if (const HANDLE block = GetClipboardData(CF_UNICODETEXT); block != nullptr) {
     text = static_cast<const wchar_t*>(GlobalLock(block));
     GlobalUnlock(block);
@@ -336,7 +337,7 @@ void nothing_is_left(_ORVUtils* u, int openings) {
 int wmain(int count, wchar_t** arguments) {
   SetProcessDPIAware();  // Otherwise the system scales its windows.
   enter_desktop();
-  pictures = std::wstring(arguments[1]) + L"\\..\\screenshots\\" + (count > 3 ? arguments[3] : L"");
+  pictures = std::wstring(arguments[1]) + L"\\screenshots\\" + (count > 3 ? arguments[3] : L"");
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();

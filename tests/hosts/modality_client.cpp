@@ -205,7 +205,7 @@ int wmain(int count, wchar_t** arguments) {
     return 0;
   }
   return run_checks([&] {
-    pictures = std::wstring(count > 1 ? arguments[1] : L".") + L"\\..\\screenshots\\";
+    pictures = std::wstring(count > 1 ? arguments[1] : L".") + L"\\screenshots\\";
     const Pointer<_ORVUtils> u = create_object();
     const HWND host = make_host_window();
     const OtherProgram other(count > 1 ? arguments[1] : L".");

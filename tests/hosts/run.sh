@@ -10,7 +10,7 @@ set -euo pipefail
 folder=${1:-windows}
 [ "$folder" != windows64 ] || use_wine64
 dll="Z:\\build\\$folder\\TALUtil.dll"
-pictures=$talutil_build/screenshots
+pictures=$talutil_build/$folder/screenshots
 passed=0
 failed=0
 
@@ -101,16 +101,16 @@ dots 144
 run forms-144 wine "Z:\\build\\$folder\\tests\\hosts\\forms_client.exe" "Z:\\build\\$folder" 0 144-
 dots 96
 run examples run_examples "$folder" "$talutil_build/asan/talutil"
-rm -f "$talutil_build"/printed_*.ps
-client printing "$(build_below_wine)"
+rm -f "$talutil_build/$folder"/printed_*.ps
+client printing "$(build_below_wine)/$folder"
 printed() {  # what, the pattern of its words
   local words
-  words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/printed_$1.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
+  words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/$folder/printed_$1.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
   expect_success "the words of the printed $1, which begin: ${words:0:100}" test "${words#$2}" != "$words"
 }
 printed report '*Notes The first page*Page 1 of 2*Notes The second page*Page 2 of 2'
 printed keys '*GENERAL Copy Text CTRL+C*Page 1 of 6*ORV Help PDF = F1*Telephone Contact = CTRL+T'
-expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
+expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/$folder/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
 restart_wine
 # A script's one line of answers.
@@ -157,8 +157,8 @@ for key in 'HKCU\Software\TALUtil\Settings' 'HKCU\Software\TALUtil Clients'; do
   wine reg.exe delete "$key" /f >/dev/null 2>&1 || true
 done
 run vbscript prints_expected vbscript script_host "$hosts\\members.vbs"
-{ cat "$sources/client.js" && awk -f "$sources/to_jscript.awk" "$sources/../members.vbs"; } >"$talutil_build/client.js"
-run jscript prints_expected jscript script_host 'Z:\build\client.js'
+{ cat "$sources/client.js" && awk -f "$sources/to_jscript.awk" "$sources/../members.vbs"; } >"$talutil_build/$folder/client.js"
+run jscript prints_expected jscript script_host "Z:\\build\\$folder\\client.js"
 run script_control prints_expected script_control script_host "$hosts\\clients\\script_control.vbs" "$hosts\\members.vbs"
 if [ "${TALUTIL_WITHOUT_PASCAL:-}" = 1 ]; then
   echo "left out: the Free Pascal clients, since TALUTIL_WITHOUT_PASCAL is 1"
@@ -172,10 +172,10 @@ else
 fi
 
 # The system's code page is that of the locale in which Wine's server begins; a manifest makes it UTF-8.
-mkdir -p "$talutil_build/locales"
-WINE_LOCPATH=$(build_below_wine)/locales
+mkdir -p "$talutil_build/$folder/locales"
+WINE_LOCPATH=$(build_below_wine)/$folder/locales
 for page in ru_RU:1251 ja_JP:932; do
-  localedef -i "${page%:*}" -f UTF-8 "$talutil_build/locales/${page%:*}.UTF-8" 2>/dev/null
+  localedef -i "${page%:*}" -f UTF-8 "$talutil_build/$folder/locales/${page%:*}.UTF-8" 2>/dev/null
   export WINE_LANG=${page%:*}.UTF-8 WINE_LOCPATH
   restart_wine
   client code_page "${page#*:}"
@@ -194,10 +194,10 @@ client utf8 65001
 # A cipher text made on one side opens on the other.
 talutil=$talutil_build/asan/talutil
 secret="O´Neil, 5 €"
-rm -f "$talutil_build/cipher.txt"
-elsewhere -1 cipher "$("$talutil" encrypt <<<"$secret")" 'Z:\build\cipher.txt'
+rm -f "$talutil_build/$folder/cipher.txt"
+elsewhere -1 cipher "$("$talutil" encrypt <<<"$secret")" "Z:\\build\\$folder\\cipher.txt"
 expect_success "the command opens what the script host has encrypted" \
-  test "$(tr -d '\r' <"$talutil_build/cipher.txt" | "$talutil" decrypt)" = "$secret"
+  test "$(tr -d '\r' <"$talutil_build/$folder/cipher.txt" | "$talutil" decrypt)" = "$secret"
 compare_artifacts "$folder"
 expect_success "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"
 
