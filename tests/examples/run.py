@@ -4,7 +4,7 @@
   run.py native TALUTIL                 runs them by `talutil batch`
   run.py script TALUTIL FILE.vbs        writes a script that runs them through the DLL, but for those with windows
   run.py windows TALUTIL FOLDER         writes a script for each example with a window, and prints a line for it: its
-                                        name and what the user does, tabs in between
+                                        name and, for each window, the keys of its user, blanks in between
   run.py compare TALUTIL OUTPUT...      compares what scripts have printed
 
 Whatever fails is a line; the last line is "N passed, N failed".
@@ -196,6 +196,13 @@ def script(talutil, path):
     return 0
 
 
+def keys_of(what, text):
+    """A key, or the letters of a text and the Return key, as user_client takes them."""
+    if what == "presses":
+        return {"Return": "{ENTER}", "Escape": "{ESC}"}[text]
+    return "".join(f"{{SHIFT+{letter}}}" if letter.isupper() else letter for letter in text) + "{ENTER}"
+
+
 def windows(talutil, folder):
     classes = read_reference(talutil)
     for example in examples_of(classes):
@@ -203,8 +210,7 @@ def windows(talutil, folder):
             continue
         name = f"example_{example.number}.vbs"
         write_script(os.path.join(folder, name), [example], classes)
-        keys = [("type " if what == "types" else "press ") + text.strip() for what, text in KEYS.findall(example.code)]
-        print("\t".join([name] + keys))
+        print(name, *(keys_of(what, text.strip()) for what, text in KEYS.findall(example.code)))
     return 0
 
 

@@ -2,7 +2,7 @@
 
 # All those without windows are one script; each of the others has a user. Their settings begin empty.
 run_examples() {  # the preset, the command
-  local made=$talutil_build/$1-examples name actions
+  local made=$talutil_build/$1-examples name keys
   rm -rf "$made"
   mkdir -p "$made"
   # Which the test of printing has put beside the library.
@@ -11,9 +11,9 @@ run_examples() {  # the preset, the command
   "$talutil_top/tests/examples/run.py" script "$2" "$made/all.vbs"
   WINE_TIMEOUT=300 wine cscript.exe //nologo "Z:\\build\\$1-examples\\all.vbs" >"$made/all.out"
   "$talutil_top/tests/examples/run.py" windows "$2" "$made" >"$made/windows.txt"
-  while IFS=$'\t' read -r name actions; do
-    IFS=$'\t' read -ra actions <<<"$actions"
-    wine "Z:\\build\\$1\\tests\\hosts\\user.exe" "Z:\\build\\$1-examples\\$name" "${actions[@]}" \
+  while read -r name keys; do
+    read -ra keys <<<"$keys"
+    wine "Z:\\build\\$1\\tests\\hosts\\user_client.exe" "Z:\\build\\$1-examples\\$name" "${keys[@]}" \
       >"$made/${name%.vbs}.out" </dev/null || echo "FAILED $name: its user could not end it"
   done <"$made/windows.txt"
   "$talutil_top/tests/examples/run.py" compare "$2" "$made"/*.out
