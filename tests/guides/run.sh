@@ -9,6 +9,7 @@
 # check that fails is a line; the last line is "N passed, N failed".
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
+. "$talutil_top/tests/hosts/pascal.sh"
 cd "$talutil_top"
 
 folder=${1:-native}
@@ -74,23 +75,16 @@ run_native() {
   prints_as_said "$file" in_empty_folder python3 "$talutil_top/$file"
 }
 
-compile_pascal() {
-  "$pascal/compiler" -n -ve -T"$(cat "$pascal/target")" -Fu"$pascal/units" -FU"$work" -Fu"$work" -FE"$work" "$1" \
-    >>"$work/compiler.log" 2>&1
-}
-
 run_pascal() {
-  local file here="Z:\\build\\guides-$folder"
+  local file
   if [ "${TALUTIL_WITHOUT_PASCAL:-}" = 1 ]; then
     echo "left out: the Free Pascal guides, since TALUTIL_WITHOUT_PASCAL is 1"
     return
   fi
-  pascal=$(tools/pascal.sh "$folder")
-  # The early-bound program uses the unit that the importer makes of the type library.
-  compile_pascal tests/hosts/clients/import_unit.pas && wine "$here\\import_unit.exe" "$dll" "$here\\" >/dev/null || true
+  prepare_pascal "$folder" "guides-$folder" >>"$work/compiler.log" 2>&1 || true
   for file in examples/guides/*.pas; do
-    compile_pascal "$file" || true
-    prints_as_said "$file" wine "$here\\$(basename "$file" .pas).exe"
+    compile_pascal "$file" >>"$work/compiler.log" 2>&1 || true
+    prints_as_said "$file" wine "Z:\\build\\guides-$folder\\$(basename "$file" .pas).exe"
   done
 }
 

@@ -4,6 +4,7 @@
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 . "$talutil_top/tests/hosts/screen.sh"
+. "$talutil_top/tests/hosts/pascal.sh"
 . "$talutil_top/tests/equality/compare.sh"
 . "$talutil_top/tests/examples/through_dll.sh"
 
@@ -124,51 +125,21 @@ no_screen='445 There is no screen to show the window on. '
 DISPLAY='' elsewhere "$no_screen$no_screen$no_screen" no_screen
 restart_wine
 
-# Third-party clients: script hosts, and a compiler with an importer of type libraries of its own. Each does the same
-# work and prints it. TALUTIL_WITHOUT_PASCAL=1 leaves the compiled ones out.
-hosts='Z:\checkout\tests\hosts'
-sources=$talutil_top/tests/hosts/clients
-programs=$talutil_build/$folder/tests/hosts/pascal
-
-prints_expected() {
-  local name=$1 output=$talutil_build/$folder-$1.txt status=0
-  shift
-  "$@" "$name" >"$output" || status=$?
-  awk -v client="$name" -v status="$status" -f "$sources/compare.awk" "$sources/../members.vbs" "$output"
-}
-
-compile() { "$pascal/compiler" -n -ve -T"$(cat "$pascal/target")" -Fu"$pascal/units" -FU"$1" -Fu"$1" -FE"$1" "${@:2}"; }
-
-# The type library's unit is made by the importer, so the early-bound client compiles only if that reads it right.
-compile_clients() {
-  pascal=$("$talutil_top/tools/pascal.sh" "$folder") || return 1
-  rm -rf "$programs"
-  mkdir -p "$programs/late" "$programs/early"
-  compile "$programs/late" "$sources/import_unit.pas" && compile "$programs/late" "$sources/client.pas" &&
-    wine "Z:\\build\\$folder\\tests\\hosts\\pascal\\late\\import_unit.exe" "$dll" \
-      "Z:\\build\\$folder\\tests\\hosts\\pascal\\early\\" &&
-    compile "$programs/early" -dearly "$sources/client.pas"
-}
-
-script_host() { wine cscript.exe //nologo "$@"; }
+# Third-party clients: script hosts, and a compiler with an importer of type libraries of its own.
 # Nothing that an earlier run has left may look like this one's work.
 rm -rf "$(wine_prefix)/drive_c/clients"
-for key in 'HKCU\Software\TALUtil\Settings' 'HKCU\Software\TALUtil Clients'; do
-  wine reg.exe delete "$key" /f >/dev/null 2>&1 || true
-done
-run vbscript prints_expected vbscript script_host "$hosts\\members.vbs"
-{ cat "$sources/client.js" && awk -f "$sources/to_jscript.awk" "$sources/../members.vbs"; } >"$talutil_build/$folder/client.js"
-run jscript prints_expected jscript script_host "Z:\\build\\$folder\\client.js"
-run script_control prints_expected script_control script_host "$hosts\\clients\\script_control.vbs" "$hosts\\members.vbs"
+wine reg.exe delete 'HKCU\Software\TALUtil\Settings' /f >/dev/null 2>&1 || true
+hosts='Z:\checkout\tests\hosts'
+run vbscript wine cscript.exe //nologo "$hosts\\members.vbs"
+run script_control wine cscript.exe //nologo "$hosts\\clients\\script_control.vbs" "$hosts\\members.vbs"
+run jscript wine cscript.exe //nologo "$hosts\\clients\\client.js"
 if [ "${TALUTIL_WITHOUT_PASCAL:-}" = 1 ]; then
-  echo "left out: the Free Pascal clients, since TALUTIL_WITHOUT_PASCAL is 1"
-elif compile_clients >"$talutil_build/$folder-pascal.log" 2>&1; then
-  run pascal_late prints_expected pascal_late wine "Z:\\build\\$folder\\tests\\hosts\\pascal\\late\\client.exe"
-  run pascal_early prints_expected pascal_early wine "Z:\\build\\$folder\\tests\\hosts\\pascal\\early\\client.exe"
+  echo "left out: the Free Pascal client, since TALUTIL_WITHOUT_PASCAL is 1"
 else
-  tail -5 "$talutil_build/$folder-pascal.log"
-  echo "FAILED the Free Pascal clients could not be built; TALUTIL_WITHOUT_PASCAL=1 leaves them out"
-  failed=$((failed + 1))
+  rm -rf "$talutil_build/$folder-pascal"
+  { prepare_pascal "$folder" "$folder-pascal" && compile_pascal "$talutil_top/tests/hosts/clients/client.pas"; } \
+    >"$talutil_build/$folder-pascal.log" 2>&1 || tail -5 "$talutil_build/$folder-pascal.log"
+  run pascal wine "Z:\\build\\$folder-pascal\\client.exe"
 fi
 
 # The system's code page is that of the locale in which Wine's server begins; a manifest makes it UTF-8.

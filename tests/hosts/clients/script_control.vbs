@@ -1,6 +1,6 @@
 ' A host that embeds scripts: hands its own object to a script control, which runs the script of members.vbs.
 '
-'   cscript //nologo script_control.vbs FILE CLIENT
+'   cscript //nologo script_control.vbs FILE
 Option Explicit
 
 Dim control
