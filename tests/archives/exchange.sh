@@ -4,28 +4,13 @@
 # Needs zip, unzip, 7z and python3. The last line is "N passed, N failed".
 set -uo pipefail
 [ -x "${1:-}" ] || { echo "usage: tests/archives/exchange.sh PATH_TO_TALUTIL" >&2; exit 2; }
+. "$(dirname "${BASH_SOURCE[0]}")/../verdict.sh"
 talutil=$(realpath "$1")
 work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
 cd "$work" || exit 2
 export LC_ALL=C.UTF-8
-
-passed=0
-failed=0
 log=$work/log
-
-# check NAME COMMAND...
-check() {
-  local name=$1
-  shift
-  if "$@" >"$log" 2>&1; then
-    passed=$((passed + 1))
-  else
-    failed=$((failed + 1))
-    printf 'FAILED: %s\n' "$name"
-    tail -5 "$log"
-  fi
-}
 
 mkdir -p data/sub/deep data/empty
 seq 1 20000 >data/numbers.txt
@@ -52,48 +37,47 @@ unpack_by_unzip() { unzip -q "$@" -d unzipped && same unzipped && rm -r unzipped
 pack() { "$talutil" zip "$@"; }
 for kind in plain "old --password-file password" "aes --aes --password-file password"; do
   read -r name options <<<"$kind"
-  check "pack $name" pack $name.zip data $options
-  check "7z reads our $name" 7z t -psecret $name.zip
+  succeeds "pack $name" pack $name.zip data $options
+  succeeds "7z reads our $name" 7z t -psecret $name.zip
   [ $name != aes ] || continue
-  check "unzip reads our $name" unpack_by_unzip -P secret $name.zip
-  check "Python reads our $name" read_by_python $name.zip
+  succeeds "unzip reads our $name" unpack_by_unzip -P secret $name.zip
+  succeeds "Python reads our $name" read_by_python $name.zip
 done
 for options in "65536" "65537" "100000" "150001" "70000 --aes --password-file password"; do
   rm -f set.z*
-  check "pack volumes of $options" pack set.zip data --volumes $options
-  check "7z reads our volumes of $options" 7z t -psecret set.zip
+  succeeds "pack volumes of $options" pack set.zip data --volumes $options
+  succeeds "7z reads our volumes of $options" 7z t -psecret set.zip
 done
 
 # Packs by another program and reads that: read_theirs NAME ARCHIVE COMMAND...
 read_theirs() {
   local name=$1 archive=$2
   shift 2
-  check "$name: made" "$@"
-  check "$name: tested" "$talutil" zip --test "$archive" --password-file password
-  check "$name: unpacked" "$talutil" unzip "$archive" --to out --password-file password
-  check "$name: the same" diff -r data out/data
+  succeeds "$name: made" "$@"
+  succeeds "$name: tested" "$talutil" zip --test "$archive" --password-file password
+  succeeds "$name: unpacked" "$talutil" unzip "$archive" --to out --password-file password
+  succeeds "$name: the same" diff -r data out/data
   rm -rf out
 }
 read_theirs "zip" zip.zip zip -qr zip.zip data
 "$talutil" unzip zip.zip --to kept
-check "times and rights of zip's" same kept
+succeeds "times and rights of zip's" same kept
 read_theirs "zip -s" zip-s.zip zip -qr -s 70k zip-s.zip data
 read_theirs "7z, AES" 7z-aes.zip 7z a -tzip -mem=AES256 -psecret 7z-aes.zip data
 read_theirs "7z, pieces" 7z-v.zip.001 7z a -tzip -v100k 7z-v.zip data
 
 # What is added to another's archive leaves the rest of it as it was.
 printf 'changed' >data/sub/deep/new.txt
-check "add to 7z's" pack 7z-aes.zip data/sub/deep --password-file password
-check "7z reads what was added to" 7z t -psecret 7z-aes.zip
+succeeds "add to 7z's" pack 7z-aes.zip data/sub/deep --password-file password
+succeeds "7z reads what was added to" 7z t -psecret 7z-aes.zip
 
 # A full disk, as a limit on the size of files: the old archive stays, and nothing else.
 cp plain.zip before.zip
 head -c 3000000 /dev/urandom >data/large.bin
 refused() { ! (trap '' XFSZ && ulimit -f 1000 && pack plain.zip data 2>refusal); }
-check "a full disk is told" refused
-check "and with its code" grep -q 'plain.zip: Disk full (code 14)' refusal
-check "and leaves the archive" cmp plain.zip before.zip
-check "and nothing else" sh -c '! ls -a | grep -q talutil-'
+succeeds "a full disk is told" refused
+succeeds "and with its code" grep -q 'plain.zip: Disk full (code 14)' refusal
+succeeds "and leaves the archive" cmp plain.zip before.zip
+succeeds "and nothing else" sh -c '! ls -a | grep -q talutil-'
 
-printf '%d passed, %d failed\n' $passed $failed
-[ $failed = 0 ]
+close_counts

@@ -40,24 +40,24 @@ compare_artifacts() {
   local windows_program="Z:\\build\\$1\\tests\\artifacts.exe"
   mkdir -p "$top"
   prepare_artifacts "$top/native"
-  prepare_artifacts "$top/windows"
-  expect_success "the native artifacts" "$program" write "$top/native"
-  expect_success "the artifacts of $1" wine "$windows_program" write "Z:\\build\\equality\\$1\\windows"
-  expect_success "native settings.ini and that of $1 are equal" cmp "$top/native/settings.ini" "$top/windows/settings.ini"
-  expect_success "native plain.zip and that of $1 have equal entries" \
-    have_equal_entries "$top/native/plain.zip" "$top/windows/plain.zip"
-  expect_success "native report.pdf and that of $1 are equal but for dates" \
-    cmp <(without_dates "$top/native/report.pdf") <(without_dates "$top/windows/report.pdf")
+  prepare_artifacts "$top/$1"
+  succeeds "the native artifacts" "$program" write "$top/native"
+  succeeds "the artifacts of $1" wine "$windows_program" write "Z:\\build\\equality\\$1"
+  succeeds "native settings.ini and that of $1 are equal" cmp "$top/native/settings.ini" "$top/$1/settings.ini"
+  succeeds "native plain.zip and that of $1 have equal entries" \
+    have_equal_entries "$top/native/plain.zip" "$top/$1/plain.zip"
+  succeeds "native report.pdf and that of $1 are equal but for dates" \
+    cmp <(without_dates "$top/native/report.pdf") <(without_dates "$top/$1/report.pdf")
   # What is random by design: each reads the other's.
   for file in cipher.txt locked.zip; do
     mv "$top/native/$file" "$top/$file"
     mv "$top/windows/$file" "$top/native/$file"
     mv "$top/$file" "$top/windows/$file"
   done
-  expect_success "reading natively what $1 has made" "$program" read "$top/native"
-  expect_success "reading in $1 what was made natively" wine "$windows_program" read "Z:\\build\\equality\\$1\\windows"
-  for file in native windows; do
-    expect_success "the text that was opened in $file" test "$(cat "$top/$file/opened.txt")" = "O´Neil, 5 €, Ольга"
-    expect_success "the files that were unpacked in $file" diff -r "$top/$file/in" "$top/$file/unpacked/in"
+  succeeds "reading natively what $1 has made" "$program" read "$top/native"
+  succeeds "reading in $1 what was made natively" wine "$windows_program" read "Z:\\build\\equality\\$1"
+  for file in native "$1"; do
+    succeeds "the text that was opened in $file" test "$(cat "$top/$file/opened.txt")" = "O´Neil, 5 €, Ольга"
+    succeeds "the files that were unpacked in $file" diff -r "$top/$file/in" "$top/$file/unpacked/in"
   done
 }

@@ -9,25 +9,14 @@
 # check that fails is a line; the last line is "N passed, N failed".
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
+. "$talutil_top/tests/verdict.sh"
 . "$talutil_top/tests/hosts/pascal.sh"
 cd "$talutil_top"
 
 folder=${1:-native}
 work=$talutil_build/guides-$folder
-passed=0
-failed=0
 rm -rf "$work"
 mkdir -p "$work"
-
-expect_same() {  # what, the file with what is expected, the file with what there is
-  if diff -u "$2" "$3" >"$work/difference" 2>&1; then
-    passed=$((passed + 1))
-  else
-    printf 'FAILED %s: expected the first, got the second:\n' "$1"
-    head -20 "$work/difference"
-    failed=$((failed + 1))
-  fi
-}
 
 # The code block below a line of the guides.
 block_below() {
@@ -41,7 +30,7 @@ compare_pages() {
   local file
   for file in examples/guides/*; do
     block_below "$file" >"$work/shown"
-    expect_same "$file and the page that shows it" "$file" "$work/shown"
+    same_files "$file and the page that shows it" "$file" "$work/shown"
   done
 }
 
@@ -53,7 +42,7 @@ prints_as_said() {
   "$@" >"$work/printed" 2>&1 || status=$?
   [ $status = 0 ] || echo "(status $status)" >>"$work/printed"
   sed -i 's/\r$//' "$work/printed"
-  expect_same "the output of $file" "$work/said" "$work/printed"
+  same_files "the output of $file" "$work/said" "$work/printed"
 }
 
 # In an empty folder, with settings of its own.
@@ -126,5 +115,4 @@ case $folder in
     ;;
   *) fail "usage: $0 native TALUTIL|windows|windows64" ;;
 esac
-printf '%d passed, %d failed\n' "$passed" "$failed"
-[ "$failed" = 0 ]
+close_counts

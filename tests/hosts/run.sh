@@ -3,6 +3,7 @@
 # Each check that fails is a line; the last line is "N passed, N failed". Needs that preset to be built.
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
+. "$talutil_top/tests/verdict.sh"
 . "$talutil_top/tests/hosts/screen.sh"
 . "$talutil_top/tests/hosts/pascal.sh"
 . "$talutil_top/tests/equality/compare.sh"
@@ -11,9 +12,7 @@ set -euo pipefail
 folder=${1:-windows}
 [ "$folder" != windows64 ] || use_wine64
 dll="Z:\\build\\$folder\\TALUtil.dll"
-pictures=$talutil_build/$folder/screenshots
-passed=0
-failed=0
+pictures=$talutil_build/screenshots
 
 need_packages python3 xvfb imagemagick ghostscript locales
 mkdir -p "$pictures"
@@ -21,38 +20,7 @@ rm -f "$pictures"/*.wanted
 
 start_screen
 
-# Runs one command; its own last line is its counts. Without them, or after them, it has died, which is one failure more.
-run() {
-  local name=$1 log=$talutil_build/$folder-$1.log counts status=0
-  shift
-  WINE_TIMEOUT=120 "$@" >"$log" 2>&1 || status=$?
-  tr -d '\r' <"$log" | grep '^FAILED' || true
-  counts=$(tr -d '\r' <"$log" | tail -1 | grep -oE '^[0-9]+ passed, [0-9]+ failed$') || counts=
-  if [ -z "$counts" ]; then
-    tail -5 "$log"
-    printf 'FAILED %s: expected to end with its counts, ended with status %s; see %s\n' "$name" "$status" "$log"
-    counts="0 passed, 1 failed"
-  elif [ "$status" != 0 ] && [ "${counts#*, }" = "0 failed" ]; then
-    printf 'FAILED %s: expected status 0 after its counts, got %s; see %s\n' "$name" "$status" "$log"
-    counts="${counts%%,*}, 1 failed"
-  fi
-  passed=$((passed + ${counts%% passed*}))
-  counts=${counts#*, }
-  failed=$((failed + ${counts%% failed*}))
-}
-
-# A command that needs nothing but to end well.
-expect_success() {
-  local what=$1 status=0
-  shift
-  WINE_TIMEOUT=60 "$@" >/dev/null 2>&1 || status=$?
-  if [ "$status" = 0 ]; then
-    passed=$((passed + 1))
-  else
-    printf 'FAILED %s: expected status 0, got %s\n' "$what" "$status"
-    failed=$((failed + 1))
-  fi
-}
+run() { counts "$1" "$talutil_build/$folder-$1.log" "${@:2}"; }
 
 # Takes a picture of the screen for each file NAME.wanted that a program makes, and removes the file after it.
 take_pictures() {
@@ -74,7 +42,7 @@ restart_wine() {
 }
 restart_wine
 client registration
-expect_success "regsvr32, for the machine and for the user" wine regsvr32.exe /s /i:user "$dll"
+succeeds "regsvr32, for the machine and for the user" wine regsvr32.exe /s /i:user "$dll"
 client type_library
 client start
 client early
@@ -87,8 +55,8 @@ if [ "$folder" = windows64 ]; then
   rm -f "$recording"
   TALUTIL_RECORD='Z:\build\recorded.jsonl' \
     run recorded wine "Z:\\build\\$folder\\tests\\hosts\\agreement_client.exe" "Z:\\build\\$folder" 1000 7
-  expect_success "recorded calls, and their answers here" "$talutil_build/asan/talutil" batch --compare "$recording"
-  expect_success "thousands of calls were recorded" test "$(wc -l <"$recording")" -gt 10000
+  succeeds "recorded calls, and their answers here" "$talutil_build/asan/talutil" batch --compare "$recording"
+  succeeds "thousands of calls were recorded" test "$(wc -l <"$recording")" -gt 10000
 fi
 rm -f "$pictures"/*.png
 take_pictures &
@@ -106,12 +74,12 @@ rm -f "$talutil_build/$folder"/printed_*.ps
 client printing "$(build_below_wine)/$folder"
 printed() {  # what, the pattern of its words
   local words
-  words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/$folder/printed_$1.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
-  expect_success "the words of the printed $1, which begin: ${words:0:100}" test "${words#$2}" != "$words"
+  words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/printed_$1.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
+  succeeds "the words of the printed $1, which begin: ${words:0:100}" test "${words#$2}" != "$words"
 }
 printed report '*Notes The first page*Page 1 of 2*Notes The second page*Page 2 of 2'
 printed keys '*GENERAL Copy Text CTRL+C*Page 1 of 6*ORV Help PDF = F1*Telephone Contact = CTRL+T'
-expect_success "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/$folder/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
+succeeds "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
 restart_wine
 # A script's one line of answers.
@@ -119,7 +87,7 @@ elsewhere() {
   local expected=$1 answers
   shift
   answers=$(wine cscript.exe //nologo 'Z:\checkout\tests\hosts\elsewhere.vbs' "$@" 2>/dev/null | tr -d '\r')
-  expect_success "elsewhere.vbs $1, which answered: $answers" test "$answers" = "$expected"
+  succeeds "elsewhere.vbs $1, which answered: $answers" test "$answers" = "$expected"
 }
 no_screen='445 There is no screen to show the window on. '
 DISPLAY='' elsewhere "$no_screen$no_screen$no_screen" no_screen
@@ -165,12 +133,11 @@ client utf8 65001
 # A cipher text made on one side opens on the other.
 talutil=$talutil_build/asan/talutil
 secret="O´Neil, 5 €"
-rm -f "$talutil_build/$folder/cipher.txt"
-elsewhere -1 cipher "$("$talutil" encrypt <<<"$secret")" "Z:\\build\\$folder\\cipher.txt"
-expect_success "the command opens what the script host has encrypted" \
-  test "$(tr -d '\r' <"$talutil_build/$folder/cipher.txt" | "$talutil" decrypt)" = "$secret"
+rm -f "$talutil_build/cipher.txt"
+elsewhere -1 cipher "$("$talutil" encrypt <<<"$secret")" 'Z:\build\cipher.txt'
+succeeds "the command opens what the script host has encrypted" \
+  test "$(tr -d '\r' <"$talutil_build/cipher.txt" | "$talutil" decrypt)" = "$secret"
 compare_artifacts "$folder"
-expect_success "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"
+succeeds "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"
 
-printf '%d passed, %d failed\n' "$passed" "$failed"
-[ "$failed" = 0 ]
+close_counts

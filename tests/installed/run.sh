@@ -9,22 +9,6 @@ work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
 . "$here/../verdict.sh"
 
-# Runs a program that ends with its counts.
-counts() {
-  local name=$1 output line
-  shift
-  output=$("$@" 2>&1)
-  line=$(tail -1 <<<"$output")
-  if [[ $line =~ ^([0-9]+)\ passed,\ ([0-9]+)\ failed$ ]]; then
-    passed=$((passed + BASH_REMATCH[1]))
-    failed=$((failed + BASH_REMATCH[2]))
-    [ "${BASH_REMATCH[2]}" = 0 ] || sed '$d' <<<"$output"
-  else
-    failed=$((failed + 1))
-    printf 'FAILED: %s ended without its counts:\n%s\n' "$name" "$output"
-  fi
-}
-
 cmake --install "$build" --prefix "$work/usr" >"$work/log" 2>&1 || cat "$work/log"
 library=$(find "$work/usr" -name libtalutil.so.1)
 folder=$(dirname "$library")
@@ -42,14 +26,14 @@ verdict 'nothing else is exported' "" \
 
 cmake -S "$here/client" -B "$work/client" -DCMAKE_PREFIX_PATH="$work/usr" >"$work/log" 2>&1 &&
   cmake --build "$work/client" >>"$work/log" 2>&1 || cat "$work/log"
-counts 'the C client, by find_package' run "$work/client/client"
+counts 'the C client, by find_package' "$work/log" run "$work/client/client"
 words=$(PKG_CONFIG_PATH=$folder/pkgconfig pkg-config --cflags --libs talutil) &&
   cc -std=c99 -Wall -Wextra -Wpedantic -Werror "$here/client/client.c" -o "$work/by_name" $words
-counts 'the C client, by pkg-config' run "$work/by_name"
+counts 'the C client, by pkg-config' "$work/log" run "$work/by_name"
 # Python itself does not release everything at its end.
 leaks=detect_leaks=0
 export PYTHONPATH=$work/usr/lib/python3/dist-packages PYTHONDONTWRITEBYTECODE=1
-counts 'the Python package' run python3 "$here/members.py"
+counts 'the Python package' "$work/log" run python3 "$here/members.py"
 verdict 'its examples' 0 \
   "$(run python3 -c 'import doctest, talutil; print(doctest.testmod(talutil).failed)' 2>&1)"
 

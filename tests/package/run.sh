@@ -5,13 +5,12 @@
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 cd "$talutil_top"
+. tests/verdict.sh
 . packaging/common.sh
 . packaging/windows.sh
 
 here=$talutil_top/tests/package
 work=$talutil_build/package-test
-passed=0
-failed=0
 small_drive=
 
 close() {
@@ -20,24 +19,8 @@ close() {
 }
 trap close EXIT
 
-pass() { passed=$((passed + 1)); }
-note_failure() {
-  printf 'FAILED %s%s\n' "${bits:+$bits-bit: }" "$*"
-  failed=$((failed + 1))
-}
-
-expect() {  # what, expected, got
-  if [ "$2" = "$3" ]; then pass; else note_failure "$1: expected \"$2\", got \"$3\""; fi
-}
-
-expect_same() {  # what, expected, got: files or folders
-  if diff -r "$2" "$3" >"$work/difference" 2>&1; then
-    pass
-  else
-    note_failure "$1 differ"
-    head -20 "$work/difference"
-  fi
-}
+expect() { verdict "${bits:+$bits-bit: }$1" "$2" "$3"; }  # what, expected, got
+expect_same() { same_files "${bits:+$bits-bit: }$1" "$2" "$3"; }
 
 # The libraries themselves.
 
@@ -115,7 +98,7 @@ drive() { echo "$(wine_prefix)/drive_c"; }
 wait_until() {
   local tries=0
   until "$@" 2>/dev/null; do
-    [ $((tries += 1)) -lt 400 ] || { note_failure "waited in vain: $*"; return 0; }
+    [ $((tries += 1)) -lt 400 ] || { note_failure "${bits:+$bits-bit: }waited in vain: $*"; return 0; }
     sleep 0.05
   done
 }
@@ -335,5 +318,4 @@ check_archive
 check_signing
 for kind in "$@"; do test_setup "$kind"; done
 
-printf '%d passed, %d failed\n' "$passed" "$failed"
-[ "$failed" = 0 ]
+close_counts
