@@ -1,5 +1,5 @@
 // A client that opens the library's own windows, and uses them by keys and the mouse as a user does: forms_client
-// FOLDER [OPENINGS [PICTURES]]. With PICTURES, a prefix of their names, it takes pictures alone.
+// FOLDER [PICTURES]. With PICTURES, a prefix of their names, it takes pictures alone.
 #include <filesystem>
 #include <fstream>
 
@@ -12,49 +12,15 @@ using namespace talutil::hosts;
 
 namespace {
 
-constexpr const wchar_t* form_class = L"TALUtilForm";
 constexpr VARIANT_BOOL yes = VARIANT_TRUE;
 constexpr VARIANT_BOOL no = VARIANT_FALSE;
-constexpr LONG usual_colour = 0xC0E0FF;
-
-struct Question {
-  std::wstring prompt = L"What is your name?";
-  VARIANT_BOOL is_masked = no;
-  VARIANT_BOOL has_entry = yes;
-  VARIANT_BOOL is_frameless = no;
-  VARIANT_BOOL is_unclosable = no;
-  LONG colour = usual_colour;
-};
-
-HRESULT ask(_ORVUtils* u, const Question& question, std::wstring& result) {
-  Text answer;
-  const HRESULT status =
-      u->MyInputBox(Text(L"Who?"), Text(question.prompt), Flag{question.is_masked}, Flag{question.has_entry},
-                    Flag{question.is_frameless}, Flag{question.is_unclosable}, Long{question.colour}, answer);
-  result = answer.view();
-  return status;
-}
-
-std::wstring ask(_ORVUtils* u, const Question& question, const std::function<void(HWND)>& user) {
-  std::wstring result;
-  const auto action = [&] { check_equal(S_OK, ask(u, question, result), "MyInputBox"); };
-  check_equal(1, with_user(form_class, action, user), "boxes for " + narrow(question.prompt.substr(0, 40)));
-  return result;
-}
-
-/// Shows a window that waits for its user.
-void show(_ORVUtils* u, HRESULT (STDMETHODCALLTYPE _ORVUtils::*member)(), const std::function<void(HWND)>& user) {
-  const auto action = [&] { check_equal(S_OK, (u->*member)(), "a window"); };
-  check_equal(1, with_user(form_class, action, user), "windows that were shown");
-}
 
 std::wstring prompt_of(HWND window) { return text_of(controls(window, L"Static").at(0)); }
 
-LONG height_of(HWND window) {
-  RECT place{};
-  GetWindowRect(window, &place);
+LONG height_on_screen(HWND window) {
+  const RECT place = place_of(window);
   check(place.top >= 0 && place.bottom <= GetSystemMetrics(SM_CYSCREEN), "it stands on the screen");
-  return place.bottom - place.top;
+  return height_of(window);
 }
 
 /// The one window of a form that is shown.
@@ -67,7 +33,7 @@ HWND only_form() {
 void boxes_take_texts(_ORVUtils* u) {
   LONG usual_height = 0;
   const auto looks_usual = [&](HWND window) {
-    usual_height = height_of(window);
+    usual_height = height_on_screen(window);
     check_equal(L"Who?|What is your name?|OK", words_of(window), "the texts");
     check(has_style(window, GWL_EXSTYLE, WS_EX_TOPMOST) && has_style(window, GWL_STYLE, WS_CAPTION), "a frame, on top");
     check(GetWindow(controls(window, L"Static").at(0), GW_HWNDNEXT) == controls(window, L"Edit").at(0),
@@ -77,8 +43,8 @@ void boxes_take_texts(_ORVUtils* u) {
     check(has_style(controls(box, L"Edit").at(0), GWL_STYLE, ES_PASSWORD), "mask");
   };
   const auto has_no_entry = [](HWND box) { check(controls(box, L"Edit").empty(), "no entry"); };
-  const auto has_grown = [&](HWND box) { check(height_of(box) > usual_height + 40, "grown with its prompt"); };
-  const auto is_high = [&](HWND box) { check(height_of(box) > 3 * usual_height, "an endless prompt"); };
+  const auto has_grown = [&](HWND box) { check(height_on_screen(box) > usual_height + 40, "grown with its prompt"); };
+  const auto is_high = [&](HWND box) { check(height_on_screen(box) > 3 * usual_height, "an endless prompt"); };
   const auto is_as_written = [](HWND box) { check_equal(L"{\\rtf1 rich}", prompt_of(box), "a rich prompt"); };
   const std::wstring several = L"one\r\ntwo\nthree\r\nfour\r\n\u05E9\u05DC\u05D5\u05DD \u4F60\u597D\r\n";
   std::wstring endless;
@@ -96,7 +62,7 @@ void boxes_take_texts(_ORVUtils* u) {
       {{}, looks_usual, "gone{ESC}", L""},
       {{.prompt = several + std::wstring(300, L'w')}, has_grown, "{picture input-box-long}{ENTER}", L""},
       {{.prompt = endless + L'\0' + L"after"}, is_high, "{picture input-box-endless}{ENTER}", L""},
-      {{.prompt = L"", .colour = static_cast<LONG>(0x800000FF)}, height_of, "{ENTER}", L""},
+      {{.prompt = L"", .colour = static_cast<LONG>(0x800000FF)}, height_on_screen, "{ENTER}", L""},
       {{.prompt = L"{\\rtf1 rich}", .colour = -1}, is_as_written, "{ENTER}", L""},
   };
   for (const auto& row : rows) {
@@ -163,7 +129,7 @@ void notices_stay(_ORVUtils* u) {
         "frameless, on top");
   check_equal(L"Who?|Please wait...", words_of(window), "nothing but its text");
   const HDC device = GetDC(window);
-  check_equal(static_cast<COLORREF>(usual_colour), GetPixel(device, 2, 2), "it is painted without a message handled");
+  check_equal(static_cast<COLORREF>(notice.colour), GetPixel(device, 2, 2), "it is painted without a message handled");
   ReleaseDC(window, device);
   take_picture(L"notice");
   u->put_DebugMode(0);
@@ -208,12 +174,9 @@ void keys_are_listed(_ORVUtils* u) {
   with_user(dialog_class, print_it, [&](HWND box) { is_told = PostMessageW(box, WM_COMMAND, IDOK, 0) != FALSE; });
   check(is_told, "a box tells that nothing can be printed");
   SetWindowPos(window, nullptr, 0, 0, 700, 600, SWP_NOMOVE | SWP_NOZORDER);
-  RECT inside{};
-  RECT place{};
-  GetClientRect(window, &inside);
-  GetWindowRect(list, &place);
-  MapWindowPoints(nullptr, window, reinterpret_cast<POINT*>(&place), 2);
-  check(inside.right - place.right < 30 && inside.bottom - place.bottom < 30, "the list grows with its window");
+  const RECT around = place_of(window);
+  const RECT inside = place_of(list);
+  check(around.right - inside.right < 40 && around.bottom - inside.bottom < 40, "the list grows with its window");
   SetFocus(list);
   press(VK_ESCAPE);
   check(messages_until([] { return top_windows(form_class).empty(); }), "Esc closes it");
@@ -279,9 +242,7 @@ void pages_are_shown(HWND window) {
   for (int i = 0; i < 5; ++i) turn(WHEEL_DELTA);
   take_picture(L"preview_200");
   SetWindowPos(window, nullptr, 0, 0, 200, 100, SWP_NOMOVE | SWP_NOZORDER);
-  RECT place{};
-  GetWindowRect(window, &place);
-  check(place.right - place.left == 600 && place.bottom - place.top == 400, "the smallest size");
+  check(width_of(window) == 600 && height_of(window) == 400, "the smallest size");
   std::array<wchar_t, 40> item{};
   GetMenuStringW(GetSubMenu(GetSubMenu(GetMenu(window), 2), 1), 0, item.data(), static_cast<int>(item.size()),
                  MF_BYPOSITION);
@@ -309,43 +270,22 @@ void unattended_reports_are_written(_ORVUtils* u) {
   DestroyWindow(report);
 }
 
-/// Opens and closes each window, and looks at what is left of it.
-void nothing_is_left(_ORVUtils* u, int openings) {
-  const auto keys = [u] {
-    u->ShowShortCutKeys();
-    close(only_form());
-  };
-  const std::pair<const char*, std::function<void()>> windows[] = {
-      {"the input box", [u] { ask(u, {}, close); }},
-      {"the list of keys", keys},
-      {"the switches", [u] { show(u, &_ORVUtils::ShowCmdLineHelp, close); }},
-      {"the system", [u] { show(u, &_ORVUtils::ShowSysInfo, close); }},
-      {"the preview", [u] { preview(u, L"x", close); }}};
-  const auto count = [](DWORD kind) { return static_cast<int>(GetGuiResources(GetCurrentProcess(), kind)); };
-  for (const auto& [name, open] : windows) {
-    for (int i = 0; i < 5; ++i) open();
-    const int before[] = {count(GR_GDIOBJECTS), count(GR_USEROBJECTS)};
-    for (int i = 0; i < openings; ++i) open();
-    const int more[] = {count(GR_GDIOBJECTS) - before[0], count(GR_USEROBJECTS) - before[1]};
-    const std::string numbers = std::to_string(more[0]) + " and " + std::to_string(more[1]);
-    check(more[0] <= 2 && more[1] <= 2, std::string(name) + " leaves handles: " + numbers);
-  }
-}
-
 }  // namespace
 
 int wmain(int count, wchar_t** arguments) {
   SetProcessDPIAware();  // Otherwise the system scales its windows.
   enter_desktop();
-  pictures = std::wstring(arguments[1]) + L"\\screenshots\\" + (count > 3 ? arguments[3] : L"");
+  pictures = std::wstring(arguments[1]) + L"\\..\\screenshots\\" + (count > 2 ? arguments[2] : L"");
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();
     boxes_take_texts(u);
-    show(u, &_ORVUtils::ShowCmdLineHelp, switches_are_explained);
-    show(u, &_ORVUtils::ShowSysInfo, system_is_described);
+    show(
+        form_class, [u] { return u->ShowCmdLineHelp(); }, switches_are_explained);
+    show(
+        form_class, [u] { return u->ShowSysInfo(); }, system_is_described);
     keys_are_listed(u);
-    if (count <= 3) {
+    if (count < 3) {
       std::wstring pages;
       for (int i = 1; i <= 150; ++i)
         pages +=
@@ -356,7 +296,6 @@ int wmain(int count, wchar_t** arguments) {
       check(is_asked_to_quit(7), "a host that quits gets its call back and hears of it");
       unattended_reports_are_written(u);
       boxes_are_entered_once(u);
-      nothing_is_left(u, count > 2 ? _wtoi(arguments[2]) : 20);
     }
     notices_stay(u);
   });

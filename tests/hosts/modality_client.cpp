@@ -1,4 +1,4 @@
-// A host whose windows stand beside those of another program: modality_client FOLDER [OPENINGS]. While it waits for one
+// A host whose windows stand beside those of another program: modality_client FOLDER. While it waits for one
 // of the library's windows, and when that is closed, nobody else comes to the front. It has no manifest and does not
 // scale.
 #include <filesystem>
@@ -9,7 +9,6 @@ using namespace talutil::hosts;
 
 namespace {
 
-constexpr const wchar_t* form_class = L"TALUtilForm";
 constexpr UINT dpi_changed = 0x02E0;
 
 std::vector<std::string> events;  ///< What the host's window was told, in order.
@@ -32,21 +31,20 @@ HWND make_host_window() {
                        nullptr, nullptr, nullptr);
 }
 
-/// This program again, which shows a window until it is ended.
+/// Another program, whose window comes to the front, until it is ended.
 class OtherProgram {
  public:
-  explicit OtherProgram(const std::wstring& folder) {
-    std::array<wchar_t, MAX_PATH> program{};
-    GetModuleFileNameW(nullptr, program.data(), static_cast<DWORD>(program.size()));
-    std::wstring line = L'"' + std::wstring(program.data()) + L"\" \"" + folder + L"\" other";
+  OtherProgram() {
+    std::wstring line = L"notepad.exe";
     STARTUPINFOW start{};
     start.cb = sizeof start;
     check(
         CreateProcessW(nullptr, line.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &start, &process_) != FALSE,
         "another program");
-    const auto is_in_front = [] {
-      const HWND window = FindWindowW(L"ModalityOther", nullptr);
-      return window != nullptr && GetForegroundWindow() == window;
+    const auto is_in_front = [this] {
+      DWORD process = 0;
+      GetWindowThreadProcessId(GetForegroundWindow(), &process);
+      return process == process_.dwProcessId;
     };
     check(wait_until(is_in_front), "its window");
   }
@@ -62,22 +60,10 @@ class OtherProgram {
   PROCESS_INFORMATION process_{};
 };
 
-void be_another_program() {
-  WNDCLASSW description{};
-  description.lpfnWndProc = &DefWindowProcW;
-  description.hInstance = GetModuleHandleW(nullptr);
-  description.lpszClassName = L"ModalityOther";
-  RegisterClassW(&description);
-  CreateWindowW(L"ModalityOther", L"Another program", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 400, 300, nullptr,
-                nullptr, nullptr, nullptr);
-  MSG message;
-  while (GetMessageW(&message, nullptr, 0, 0) > 0) DispatchMessageW(&message);
-}
-
 struct Shown {
   const char* name;
-  const wchar_t* window_class;
-  std::function<void()> show;
+  bool is_preview;
+  std::function<void(const User&)> show;
 };
 
 void nobody_else_comes_to_the_front(const Shown& shown, HWND host) {
@@ -88,12 +74,12 @@ void nobody_else_comes_to_the_front(const Shown& shown, HWND host) {
     const std::string what = shown.name;
     check(GetWindow(window, GW_OWNER) == host, what + ": the host owns it");
     check(IsWindowEnabled(host) == FALSE, what + ": the host waits");
-    check(!has_style(window, GWL_STYLE, WS_MINIMIZEBOX) || shown.window_class == preview_class,
+    check(!has_style(window, GWL_STYLE, WS_MINIMIZEBOX) || shown.is_preview,
           what + ": it cannot be minimised into a corner");
     Sleep(100);
     PostMessageW(window, WM_CLOSE, 0, 0);
   };
-  check_equal(1, with_user(shown.window_class, shown.show, look), std::string(shown.name) + ": windows");
+  shown.show(look);
   handle_messages();
   std::string all;
   for (const std::string& event : events) all += event + ' ';
@@ -112,24 +98,16 @@ std::filesystem::path module_of(HWND control) {
 }
 
 /// The window and everything on it grow to one and a half times their sizes.
-void windows_follow_dots(HWND window, const char* name) {
-  RECT before{};
-  GetWindowRect(window, &before);
-  const std::vector<HWND> parts = controls(window);
-  RECT part_before{};
-  GetWindowRect(parts.back(), &part_before);
-  const LONG width = before.right - before.left;
-  const LONG height = before.bottom - before.top;
-  const RECT suggested{before.left, before.top, before.left + width * 3 / 2, before.top + height * 3 / 2};
+void windows_follow_dots(HWND window) {
+  const RECT before = place_of(window);
+  const HWND part = controls(window).back();
+  const LONG width = width_of(window);
+  const LONG height_of_part = height_of(part);
+  const RECT suggested{before.left, before.top, before.left + width * 3 / 2, before.top + height_of(window) * 3 / 2};
   SendMessageW(window, dpi_changed, MAKEWPARAM(144, 144), reinterpret_cast<LPARAM>(&suggested));
-  RECT after{};
-  RECT part_after{};
-  GetWindowRect(window, &after);
-  GetWindowRect(parts.back(), &part_after);
-  check(after.right - after.left > width * 5 / 4, std::string(name) + ": wider at 144 dots");
-  check(part_after.bottom - part_after.top >= part_before.bottom - part_before.top,
-        std::string(name) + ": its parts as well");
-  take_picture(L"moved-" + std::wstring(name, name + std::strlen(name)));
+  check(width_of(window) > width * 5 / 4, "wider at 144 dots");
+  check(height_of(part) >= height_of_part, "its parts as well");
+  take_picture(L"moved-system");
 }
 
 void looks_are_those_of_the_system(_ORVUtils* u) {
@@ -139,15 +117,13 @@ void looks_are_those_of_the_system(_ORVUtils* u) {
       const std::wstring module = module_of(lists[0]).wstring();
       check(module.find(L"common-controls") != std::wstring::npos, "the later controls, from " + narrow(module));
     }
-    windows_follow_dots(window, "system");
+    windows_follow_dots(window);
     ShowWindow(window, SW_MAXIMIZE);
     take_picture(L"maximised-system");
     PostMessageW(window, WM_CLOSE, 0, 0);
   };
-  check_equal(1,
-              with_user(
-                  form_class, [&] { check_equal(S_OK, u->ShowSysInfo(), "ShowSysInfo"); }, look),
-              "windows");
+  show(
+      form_class, [u] { return u->ShowSysInfo(); }, look);
 }
 
 /// The highest of many new handles: it rises when handles are not given back. (Wine counts none of them.)
@@ -173,14 +149,15 @@ struct Holdings {
 };
 
 /// What a window takes is given back when it closes.
-void opening_holds_nothing(const Shown& shown, long openings) {
+void opening_holds_nothing(const Shown& shown) {
   const auto close = [](HWND window) { PostMessageW(window, WM_CLOSE, 0, 0); };
   const auto open = [&](long times) {
-    for (long i = 0; i < times; ++i) with_user(shown.window_class, shown.show, close);
+    for (long i = 0; i < times; ++i) shown.show(close);
     handle_messages();
     return Holdings();
   };
   constexpr long enough_to_settle = 3;
+  constexpr long openings = 10;
   constexpr std::size_t bytes_each = 400;  // Wine's labels do not free theirs; a lost window is larger.
   const Holdings before = open(enough_to_settle);
   const Holdings after = open(openings);
@@ -197,36 +174,31 @@ void opening_holds_nothing(const Shown& shown, long openings) {
 
 }  // namespace
 
-int wmain(int count, wchar_t** arguments) {
+int wmain(int, wchar_t** arguments) {
   enter_desktop();
-  const long openings = count > 2 ? std::wcstol(arguments[2], nullptr, 10) : 10;
-  if (openings == 0) {
-    be_another_program();
-    return 0;
-  }
   return run_checks([&] {
-    pictures = std::wstring(count > 1 ? arguments[1] : L".") + L"\\screenshots\\";
-    const Pointer<_ORVUtils> u = create_object();
+    pictures = arguments[1] + std::wstring(L"\\..\\screenshots\\");
+    const Pointer<_ORVUtils> object = create_object();
+    _ORVUtils* const u = object.get();
     const HWND host = make_host_window();
-    const OtherProgram other(count > 1 ? arguments[1] : L".");
-    HostObject box({L"Text"}, [](const Use& use) { return use.answer(std::wstring_view(L"A page")); });
-    Value holder(&box);
-    const Shown windows[] = {
-        {"MyInputBox", form_class,
-         [&] {
-           Text answer;
-           u->MyInputBox(Text(L"Who?"), Text(L"What is your name?"), Number<VARIANT_BOOL>{VARIANT_FALSE},
-                         Number<VARIANT_BOOL>{VARIANT_TRUE}, Number<VARIANT_BOOL>{VARIANT_FALSE},
-                         Number<VARIANT_BOOL>{VARIANT_FALSE}, Number<LONG>{0xC0E0FF}, answer);
-         }},
-        {"ShowSysInfo", form_class, [&] { u->ShowSysInfo(); }},
-        {"ShowCmdLineHelp", form_class, [&] { u->ShowCmdLineHelp(); }},
-        {"the preview", preview_class,
-         [&] { u->TextBoxPrintPreview(Short{100}, Short{1}, Text(L"Notes"), Text(L"C:\\"), holder); }},
+    const OtherProgram other;
+    const auto form = [](const std::function<HRESULT()>& open) {
+      return [open](const User& user) { show(form_class, open, user); };
     };
+    const Shown windows[] = {{"MyInputBox", false, [u](const User& user) { ask(u, {}, user); }},
+                             {"ShowSysInfo", false, form([u] { return u->ShowSysInfo(); })},
+                             {"ShowCmdLineHelp", false, form([u] { return u->ShowCmdLineHelp(); })},
+                             {"the preview", true, [u](const User& user) { preview(u, L"A page", user); }}};
     for (const Shown& shown : windows) nobody_else_comes_to_the_front(shown, host);
-    looks_are_those_of_the_system(u.get());
-    for (const Shown& shown : windows) opening_holds_nothing(shown, openings);
+    looks_are_those_of_the_system(u);
+    for (const Shown& shown : windows) opening_holds_nothing(shown);
+    const auto keys = [u](const User& user) {
+      u->ShowShortCutKeys();
+      const HWND window = top_windows(form_class).at(0);
+      user(window);
+      messages_until([window] { return IsWindow(window) == FALSE; });
+    };
+    opening_holds_nothing({"ShowShortCutKeys", false, keys});
     DestroyWindow(host);
   });
 }

@@ -67,7 +67,7 @@ client modality
 # The same windows on a screen with larger dots, for the looks.
 dots() { wine reg.exe add 'HKCU\Control Panel\Desktop' /v LogPixels /t REG_DWORD /d "$1" /f >/dev/null 2>&1; }
 dots 144
-run forms-144 wine "Z:\\build\\$folder\\tests\\hosts\\forms_client.exe" "Z:\\build\\$folder" 0 144-
+run forms-144 wine "Z:\\build\\$folder\\tests\\hosts\\forms_client.exe" "Z:\\build\\$folder" 144-
 dots 96
 run examples run_examples "$folder" "$talutil_build/asan/talutil"
 rm -f "$talutil_build/$folder"/printed_*.ps

@@ -138,9 +138,16 @@ inline void press(WORD key, std::initializer_list<WORD> held = {}) {
   Sleep(60);
 }
 
-inline void click(HWND control) {
+inline RECT place_of(HWND window) {
   RECT place{};
-  GetWindowRect(control, &place);
+  GetWindowRect(window, &place);
+  return place;
+}
+inline LONG width_of(HWND window) { return place_of(window).right - place_of(window).left; }
+inline LONG height_of(HWND window) { return place_of(window).bottom - place_of(window).top; }
+
+inline void click(HWND control) {
+  const RECT place = place_of(control);
   SetCursorPos(static_cast<int>(place.left + place.right) / 2, static_cast<int>(place.top + place.bottom) / 2);
   INPUT input{};
   input.type = INPUT_MOUSE;
@@ -165,6 +172,7 @@ inline void follow(HWND window, std::string_view script) {
   const auto wide_after = [](std::string_view text, std::size_t from) {
     return std::wstring(text.begin() + static_cast<std::ptrdiff_t>(from), text.end());
   };
+  wait_until([window] { return GetForegroundWindow() == window; });
   while (!script.empty()) {
     const std::size_t end = script[0] == '{' ? script.find('}') : 0;
     const std::string_view step = end == 0 ? script.substr(0, 1) : script.substr(1, end - 1);
@@ -193,16 +201,48 @@ bool messages_until(Condition&& condition) {
 inline void close(HWND window) { SendMessageW(window, WM_CLOSE, 0, 0); }
 
 constexpr const wchar_t* preview_class = L"TALUtilPreview";
+constexpr const wchar_t* form_class = L"TALUtilForm";
+using User = std::function<void(HWND)>;
+
+/// What opens one window of a class that waits for its user.
+inline void show(const wchar_t* window_class, const std::function<HRESULT()>& open, const User& user) {
+  const auto action = [&] { check_equal(S_OK, open(), "what opens a window"); };
+  check_equal(1, with_user(window_class, action, user), "windows of class " + narrow(window_class));
+}
+
+struct Question {
+  std::wstring prompt = L"What is your name?";
+  VARIANT_BOOL is_masked = VARIANT_FALSE;
+  VARIANT_BOOL has_entry = VARIANT_TRUE;
+  VARIANT_BOOL is_frameless = VARIANT_FALSE;
+  VARIANT_BOOL is_unclosable = VARIANT_FALSE;
+  LONG colour = 0xC0E0FF;
+};
+
+inline HRESULT ask(_ORVUtils* u, const Question& question, std::wstring& result) {
+  Text answer;
+  const HRESULT status =
+      u->MyInputBox(Text(L"Who?"), Text(question.prompt), Flag{question.is_masked}, Flag{question.has_entry},
+                    Flag{question.is_frameless}, Flag{question.is_unclosable}, Long{question.colour}, answer);
+  result = answer.view();
+  return status;
+}
+
+inline std::wstring ask(_ORVUtils* u, const Question& question, const User& user) {
+  std::wstring result;
+  show(
+      form_class, [&] { return ask(u, question, result); }, user);
+  return result;
+}
 
 /// Opens the preview of a text, the user doing what the function does; it must close the window.
-inline void preview(_ORVUtils* u, std::wstring_view text, const std::function<void(HWND)>& user) {
+inline void preview(_ORVUtils* u, std::wstring_view text, const User& user) {
   HostObject box({L"Text"}, [&](const Use& use) { return use.answer(text); });
   Value holder(&box);
   const auto open = [&] {
-    const HRESULT status = u->TextBoxPrintPreview(Short{100}, Short{1}, Text(L"Notes"), Text(L"C:\\exports\\"), holder);
-    check_equal(S_OK, status, "TextBoxPrintPreview");
+    return u->TextBoxPrintPreview(Short{100}, Short{1}, Text(L"Notes"), Text(L"C:\\exports\\"), holder);
   };
-  check_equal(1, with_user(preview_class, open, user), "preview windows");
+  show(preview_class, open, user);
   check(top_windows(preview_class).empty(), "the window is gone");
 }
 
