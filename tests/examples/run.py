@@ -64,12 +64,12 @@ def examples_of(classes):
 class Batch:
     """The members, natively."""
 
-    def __init__(self, talutil, classes, folder):
+    def __init__(self, talutil, classes, folder, **environment):
         self.parameters = {owner["name"]: {member["name"].lower(): member["parameters"] for member in owner["members"]}
                            for owner in classes}
         self.classes = {0: "ORVUtils"}
         environment = dict(os.environ, TALUTIL_HIVE=os.path.join(folder, "hive.db"),
-                           TALUTIL_DRIVES=os.path.join(folder, "drives"), TZ="UTC", LC_ALL="C.UTF-8")
+                           TALUTIL_DRIVES=os.path.join(folder, "drives"), LC_ALL="C.UTF-8", **environment)
         self.process = subprocess.Popen([talutil, "batch"], stdin=subprocess.PIPE, stdout=subprocess.PIPE, text=True,
                                         encoding="utf-8", env=environment)
 
@@ -112,13 +112,15 @@ class Verdicts:
     def __init__(self):
         self.passed = self.failed = 0
 
+    def check(self, name, holds, *lines):
+        self.passed += bool(holds)
+        self.failed += not holds
+        if not holds:
+            print(f"FAILED {name}", *lines, sep="\n  ")
+
     def note(self, example, expected, actual):
-        if expected == actual:
-            self.passed += 1
-        else:
-            self.failed += 1
-            print(f"FAILED the example of {example.name} (number {example.number}):\n"
-                  f"  expected: {expected}\n  actual:   {actual}")
+        self.check(f"the example of {example.name} (number {example.number})", expected == actual,
+                   f"expected: {expected}", f"actual:   {actual}")
 
     def close(self):
         print(f"{self.passed} passed, {self.failed} failed")
@@ -128,7 +130,7 @@ class Verdicts:
 def run_natively(talutil, classes, example):
     with tempfile.TemporaryDirectory() as folder:
         os.makedirs(os.path.join(folder, "drives", "c", "EXAMPLES", str(example.number)))
-        batch = Batch(talutil, classes, folder)
+        batch = Batch(talutil, classes, folder, TZ="UTC")
         interpreter = language.Interpreter(batch, {"u": {"object": 0}, "folder": example.folder})
         try:
             interpreter.run(language.read(example.code))
@@ -225,8 +227,7 @@ def compare(talutil, paths):
                 example = examples[int(number)]
                 verdicts.note(example, example.expected, text.split("\n")[:-1])
         if len(parts) < 2 or parts[-2] != "end":
-            print(f"FAILED {path}: the script ended early")
-            verdicts.failed += 1
+            verdicts.check(f"{path}: the script ended early", False)
     return verdicts.close()
 
 
