@@ -275,7 +275,7 @@ void unattended_reports_are_written(_ORVUtils* u) {
 int wmain(int count, wchar_t** arguments) {
   SetProcessDPIAware();  // Otherwise the system scales its windows.
   enter_desktop();
-  pictures = std::wstring(arguments[1]) + L"\\..\\screenshots\\" + (count > 2 ? arguments[2] : L"");
+  pictures = std::wstring(arguments[1]) + L"\\screenshots\\" + (count > 2 ? arguments[2] : L"");
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();

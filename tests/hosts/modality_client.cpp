@@ -177,7 +177,7 @@ void opening_holds_nothing(const Shown& shown) {
 int wmain(int, wchar_t** arguments) {
   enter_desktop();
   return run_checks([&] {
-    pictures = arguments[1] + std::wstring(L"\\..\\screenshots\\");
+    pictures = arguments[1] + std::wstring(L"\\screenshots\\");
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();
     const HWND host = make_host_window();

@@ -11,7 +11,7 @@ set -euo pipefail
 folder=${1:-windows}
 [ "$folder" != windows64 ] || use_wine64
 dll="Z:\\build\\$folder\\TALUtil.dll"
-pictures=$talutil_build/screenshots
+pictures=$talutil_build/$folder/screenshots
 
 need_packages python3 xvfb imagemagick ghostscript locales
 mkdir -p "$pictures"
@@ -73,12 +73,12 @@ rm -f "$talutil_build/$folder"/printed_*.ps
 client printing "$(build_below_wine)/$folder"
 printed() {  # what, the pattern of its words
   local words
-  words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/printed_$1.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
+  words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/$folder/printed_$1.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
   succeeds "the words of the printed $1, which begin: ${words:0:100}" test "${words#$2}" != "$words"
 }
 printed report '*Notes The first page*Page 1 of 2*Notes The second page*Page 2 of 2'
 printed keys '*GENERAL Copy Text CTRL+C*Page 1 of 6*ORV Help PDF = F1*Telephone Contact = CTRL+T'
-succeeds "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
+succeeds "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/$folder/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
 restart_wine
 # A script's one line of answers.
@@ -132,10 +132,10 @@ client utf8 65001
 # A cipher text made on one side opens on the other.
 talutil=$talutil_build/asan/talutil
 secret="O´Neil, 5 €"
-rm -f "$talutil_build/cipher.txt"
-elsewhere -1 cipher "$("$talutil" encrypt <<<"$secret")" 'Z:\build\cipher.txt'
+rm -f "$talutil_build/$folder/cipher.txt"
+elsewhere -1 cipher "$("$talutil" encrypt <<<"$secret")" "Z:\\build\\$folder\\cipher.txt"
 succeeds "the command opens what the script host has encrypted" \
-  test "$(tr -d '\r' <"$talutil_build/cipher.txt" | "$talutil" decrypt)" = "$secret"
+  test "$(tr -d '\r' <"$talutil_build/$folder/cipher.txt" | "$talutil" decrypt)" = "$secret"
 # What it writes is what the same calls write natively.
 artifacts() { "$talutil_top/tests/equality/compare.py" "$1" "$talutil" "$talutil_build/equality-$folder" "$(wine_prefix)/drive_c"; }
 rm -rf "$talutil_build/equality-$folder"
