@@ -87,7 +87,7 @@ class ORVUtils {
   /// other value gives an empty text
   /// @param sTemp the text
   /// @param sCharacter the character that option 2 removes; several characters remove nothing. With option 2, an empty
-  /// text becomes a blank. Written back.
+  /// text becomes a blank.
   /// @family strings
   /// @see RemoveNumberFromString, VerifyIntData
   /// @example
@@ -148,7 +148,7 @@ class ORVUtils {
   /// day of the following week.
   /// @param vFromDate the first date
   /// @param vToDate the last date
-  /// @param iWeek 1 to 52; any other number becomes the nearest of these. Written back.
+  /// @param iWeek 1 to 52; any other number becomes the nearest of these.
   /// @param iYear the year of the week
   /// @raises 13 if vFromDate or vToDate is not a date, or the year is not valid
   /// @raises 94 for Null
@@ -197,7 +197,7 @@ class ORVUtils {
   /// empty, except in modes 1 to 3.
   /// @param iFlag 1 shows 01/01/1980 during that day, 2 shows "DD/MM/YYYY HH:MM", 3 shows the current date and time
   /// during that day, 4 shows "DDMMYYYY"; anything else shows "DD/MM/YYYY"
-  /// @param vDate a date or the text of one; the text "00:00:00" becomes "01/01/1980". Written back.
+  /// @param vDate a date or the text of one; the text "00:00:00" becomes "01/01/1980".
   /// @raises 6 if CounterVerifyDate is at its maximum; nothing else is raised
   /// @changes CounterVerifyDate
   /// @family calendar
@@ -230,7 +230,7 @@ class ORVUtils {
 
   /// A date in a week: its first day, its last day, or the day after it. The first and last days are laid out by the
   /// calendar of the current year (common or leap), whatever iYear is.
-  /// @param iWeek 1 to 52; any other number becomes the nearest of these. Written back.
+  /// @param iWeek 1 to 52; any other number becomes the nearest of these.
   /// @param iYear the year
   /// @param iDay 1 gives the first day and 2 the last (of week 52, 31 December), as dates; 0 gives the first day of the
   /// following week, as text "DD/MM/YYYY", by the calendar of iYear; any other gives Empty
@@ -373,7 +373,7 @@ class ORVUtils {
   /// text behind the last delimiter is dropped. If there is no delimiter, or the list is empty, the result is 0 and the
   /// array stays as it was.
   /// @param sTemp the list
-  /// @param sFList receives the elements. Written back.
+  /// @param sFList receives the elements.
   /// @param sDelimiter the delimiter, one character
   /// @raises 9 for an array whose lower bound is above 0
   /// @family strings
@@ -479,10 +479,10 @@ class ORVUtils {
   /// The hours and minutes between two dates and times, as text "1:30"; both are negative if the second is earlier:
   /// "-1:-30". Days count only if the text of the end date sorts after that of the start date: 31/01/2024 to 01/02/2024
   /// counts none. The arguments are rewritten in their order, until one cannot be read.
-  /// @param vStDate the first date; becomes text "DD/MM/YYYY". Written back.
-  /// @param vEnDate the second date; becomes text "DD/MM/YYYY". Written back.
-  /// @param vStTime the first time; becomes text "HH:MM". Written back.
-  /// @param vEnTime the second time; becomes text "HH:MM". Written back.
+  /// @param vStDate the first date; becomes text "DD/MM/YYYY".
+  /// @param vEnDate the second date; becomes text "DD/MM/YYYY".
+  /// @param vStTime the first time; becomes text "HH:MM".
+  /// @param vEnTime the second time; becomes text "HH:MM".
   /// @raises 13 if an argument is not a date or time
   /// @raises 6 beyond 32 bits of minutes
   /// @family durations
@@ -723,7 +723,7 @@ class ORVUtils {
   virtual Boolean FileExists(Text sFilename);
 
   /// The part of a path after its last backslash, or after a drive's colon. Never fails.
-  /// @param vSpecIn the path; quotes around it are removed. Written back.
+  /// @param vSpecIn the path; quotes around it are removed.
   /// @param bIncludeExt False cuts the name at its first dot
   /// @family files
   /// @see ExtractPathName
@@ -800,7 +800,7 @@ class ORVUtils {
   /// Reads the lines of a text file into an array, from index 0, and returns their number. A missing or empty file
   /// gives 0 and leaves the array as it was.
   /// @param sFilename the file
-  /// @param sFList receives the lines. Written back.
+  /// @param sFList receives the lines.
   /// @param iEraseBlanks exactly 1 skips lines that are empty after VerifyTextData; the array may then have one element
   /// more than the result says
   /// @raises 9 for an array that does not start at 0
@@ -820,7 +820,7 @@ class ORVUtils {
   /// Reads the lines of a text file, up to a limit, into an array and returns their number. A missing or empty file
   /// gives 0 and leaves the array as it was.
   /// @param sFilename the file
-  /// @param sFList receives the lines, from index 0. Written back.
+  /// @param sFList receives the lines, from index 0.
   /// @param iRowLimit the most lines to read; 0 or less for all
   /// @raises 9 for an array that does not start at 0
   /// @raises 70 if the file is locked
@@ -848,7 +848,7 @@ class ORVUtils {
 
   /// The part of a path up to its last backslash; without one, the current folder of its drive or of the process. The
   /// result always ends in a backslash. Never fails.
-  /// @param vSpecIn the path; quotes around it are removed. Written back.
+  /// @param vSpecIn the path; quotes around it are removed.
   /// @family files
   /// @see ExtractFilename
   /// @example
@@ -927,7 +927,7 @@ class ORVUtils {
   /// @param sSection the section
   /// @param sItem the item in it
   /// @param sOutput the value; in a file, one that is empty or begins with a backslash becomes a single backslash.
-  /// Written back.
+  ///
   /// @param sFilename a profile file; for the store, a group: "PreviousDatabaseSettings" and "CodeCount" are written
   /// alone, anything else to the user's group and the database's
   /// @param bSaveToFile True writes to the file, False to the store
@@ -1260,7 +1260,7 @@ class ORVUtils {
   /// A stored duration as text "hours:minutes", in the shortest form: "1:30", "26:0". A stored duration is a date that
   /// is later than 1/1/1800 00:00 by the duration.
   /// @param vDate the stored duration. A bare time of day, the former way to store durations, becomes "1/1/1800 HH:MM";
-  /// a text counts as one if it begins with "30/12/1899". Written back.
+  /// a text counts as one if it begins with "30/12/1899".
   /// @raises 6 beyond 32 bits of minutes
   /// @raises 13 if vDate is not a date
   /// @raises 94 if vDate is Null
@@ -1302,7 +1302,7 @@ class ORVUtils {
 
   /// Converts decimal hours in a text ("1.5", ".25") to a stored duration. The fractions 5, 25 and 75 are quarters of
   /// an hour; any other is taken as minutes: "1.50" is 1 hour 50.
-  /// @param sDuration the hours; becomes the text without blanks at its ends. Written back.
+  /// @param sDuration the hours; becomes the text without blanks at its ends.
   /// @raises 13 if the result is not "hours:minutes"
   /// @family durations
   /// @see DurationToDateTime, ConvertDatabaseDurationToNumber
@@ -1317,7 +1317,7 @@ class ORVUtils {
 
   /// A stored duration as decimal hours, in a text ("0.25"). Minutes other than 15, 30 and 45 are ignored, 0 becomes
   /// "1.5", and more than 24 hours become "1".
-  /// @param vDuration the stored duration; a bare time of day becomes "1/1/1800 HH:MM". Written back.
+  /// @param vDuration the stored duration; a bare time of day becomes "1/1/1800 HH:MM".
   /// @raises 6 beyond 32 bits of minutes
   /// @raises 13 if vDuration is not a date
   /// @family durations
@@ -1340,7 +1340,7 @@ class ORVUtils {
   virtual Variant ConvertNumberToDatabaseDuration(const std::int16_t& iMinutes);
 
   /// A stored duration in minutes.
-  /// @param vDuration the stored duration; a bare time of day becomes "1/1/1800 HH:MM". Written back.
+  /// @param vDuration the stored duration; a bare time of day becomes "1/1/1800 HH:MM".
   /// @raises 6 beyond 32 bits of minutes
   /// @raises 13 if vDuration is not a date
   /// @family durations
@@ -1640,7 +1640,7 @@ class ORVUtils {
   /// Writes the year to second of a date to a system time record; its day of the week and milliseconds stay. Scripts
   /// have no such records: this member is for early-bound programs.
   /// @param the_date the date
-  /// @param system_time receives the date. Written back.
+  /// @param system_time receives the date.
   /// @raises 6 for a date out of range
   /// @raises 13 for anything but a record
   /// @family system time
@@ -1657,7 +1657,7 @@ class ORVUtils {
   /// last day of the previous month. Years 0 to 99 are 1930 to 2029. Scripts have no such records: this member is for
   /// early-bound programs.
   /// @param system_time the record
-  /// @param the_date receives the date. Written back.
+  /// @param the_date receives the date.
   /// @raises 5 if the result is not a date
   /// @raises 13 for anything but a record
   /// @family system time
