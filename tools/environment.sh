@@ -11,8 +11,9 @@ memory_folder=/tmp
 [ ! -w /dev/shm ] || memory_folder=/dev/shm
 
 native_packages="build-essential python3 zlib1g-dev cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata"
-exchange_packages="zip unzip p7zip-full libarchive-tools advancecomp python3 poppler-utils qpdf fonts-dejavu-core pkg-config"
+exchange_packages="zip unzip p7zip-full libarchive-tools advancecomp python3 poppler-utils qpdf fonts-dejavu-core pkg-config fish zsh"
 fuzz_packages="clang"
+bench_packages="mawk"
 windows_packages="binutils libz-mingw-w64-dev debootstrap debian-archive-keyring g++-mingw-w64-i686-posix mingw-w64-tools xvfb xauth"
 windows64_packages="libz-mingw-w64-dev g++-mingw-w64-x86-64-posix mingw-w64-tools wine64 xvfb xauth"
 

@@ -137,32 +137,36 @@ std::string in_quotes(std::string_view text) {
   return result + "'";
 }
 
+/// One candidate of fish: a subcommand with its help.
+void print_fish_subcommand(const std::string& condition, const Command& command) {
+  std::cout << "complete -c talutil -n " << condition << " -f -a " << command.words.substr(command.words.rfind(' ') + 1)
+            << " -d " << in_quotes(command.help) << '\n';
+}
+
+void print_fish_option(const std::string& condition, const CLI::Option& option) {
+  std::cout << "complete -c talutil -n " << condition;
+  for (const std::string& name : option.get_snames()) std::cout << " -s " << name;
+  for (const std::string& name : option.get_lnames()) std::cout << " -l " << name;
+  if (option.get_items_expected_max() > 0) std::cout << " -r";  // A value follows.
+  std::cout << " -d " << in_quotes(option.get_description()) << '\n';
+}
+
 void print_fish(const std::vector<Command>& commands) {
   std::cout << "# Completion of talutil for fish: talutil completion fish | source\n";
   for (const Command& command : commands) {
+    if (command.words.empty()) continue;
     const std::size_t blank = command.words.find(' ');
-    const std::string parent = blank == std::string::npos ? "" : command.words.substr(0, blank);
-    const std::string name = command.words.substr(blank == std::string::npos ? 0 : blank + 1);
-    if (command.words.empty()) {
-      for (const std::string& below : command.below) {
-        std::cout << "complete -c talutil -n __fish_use_subcommand -f -a " << below << '\n';
-      }
-      continue;
+    const std::string parent = command.words.substr(0, blank);
+    std::string condition = "'__fish_seen_subcommand_from " + parent;
+    if (blank == std::string::npos) {
+      print_fish_subcommand("__fish_use_subcommand", command);
+    } else {
+      print_fish_subcommand(condition + "'", command);
+      condition += "; and __fish_seen_subcommand_from " + command.words.substr(blank + 1);
     }
-    const std::string condition =
-        parent.empty() ? "'__fish_seen_subcommand_from " + name + "'"
-                       : "'__fish_seen_subcommand_from " + parent + "; and __fish_seen_subcommand_from " + name + "'";
-    for (const std::string& below : command.below) {
-      std::cout << "complete -c talutil -n " << condition << " -f -a " << below << '\n';
-    }
+    condition += '\'';
     if (command.takes_members) std::cout << "complete -c talutil -n " << condition << " -a '" << members() << "'\n";
-    for (const CLI::Option* const option : command.options) {
-      std::cout << "complete -c talutil -n " << condition;
-      for (const std::string& short_name : option->get_snames()) std::cout << " -s " << short_name;
-      for (const std::string& long_name : option->get_lnames()) std::cout << " -l " << long_name;
-      if (option->get_type_size() != 0) std::cout << " -r";
-      std::cout << " -d " << in_quotes(option->get_description()) << '\n';
-    }
+    for (const CLI::Option* const option : command.options) print_fish_option(condition, *option);
   }
 }
 

@@ -162,6 +162,10 @@ verdict 'completion for bash' 0 $?
 complete_line() { (. <("$talutil" completion bash); COMP_WORDS=("$@") COMP_CWORD=$(($# - 1)); _talutil; echo "${COMPREPLY[*]}"); }
 verdict 'completion of a subcommand, an option, a member' 'clean unset --group GetDaysInPeriod' \
   "$(complete_line talutil cle) $(complete_line talutil config uns) $(complete_line talutil config get --gr) $(complete_line talutil call GetDaysInP)"
+fish_line() { fish --no-config -c 'source (cat $argv[1] | psub); complete -C $argv[2]' <("$talutil" completion fish) "$1" | cut -f1; }
+verdict 'completion for fish' 'clean unset --group --json GetDaysInPeriod' \
+  "$(echo $(fish_line 'talutil cle') $(fish_line 'talutil config uns') $(fish_line 'talutil config get --gr') $(fish_line 'talutil list --json --js') $(fish_line 'talutil call GetDaysInP'))"
+verdict 'completion for zsh' 0 "$(zsh -n <("$talutil" completion zsh); echo $?)"
 verdict '-V' "$("$talutil" --version)" "$("$talutil" -V)"
 verdict 'each name once' '' "$("$talutil" list | cut -c10- | sed 's/[( ].*//' | sort | uniq -d)"
 expect_part 'help: default' 0 'sDelimiter  the delimiter, one character (String; "," when left out)' \
