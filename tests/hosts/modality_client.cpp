@@ -3,6 +3,7 @@
 // scale.
 #include <filesystem>
 
+#include "../process.hpp"
 #include "windows.hpp"
 
 using namespace talutil::hosts;
@@ -30,35 +31,6 @@ HWND make_host_window() {
   return CreateWindowW(L"ModalityHost", L"The host", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 300, 200, 500, 300, nullptr,
                        nullptr, nullptr, nullptr);
 }
-
-/// Another program, whose window comes to the front, until it is ended.
-class OtherProgram {
- public:
-  OtherProgram() {
-    std::wstring line = L"notepad.exe";
-    STARTUPINFOW start{};
-    start.cb = sizeof start;
-    check(
-        CreateProcessW(nullptr, line.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &start, &process_) != FALSE,
-        "another program");
-    const auto is_in_front = [this] {
-      DWORD process = 0;
-      GetWindowThreadProcessId(GetForegroundWindow(), &process);
-      return process == process_.dwProcessId;
-    };
-    check(wait_until(is_in_front), "its window");
-  }
-  OtherProgram(const OtherProgram&) = delete;
-  OtherProgram& operator=(const OtherProgram&) = delete;
-  ~OtherProgram() {
-    TerminateProcess(process_.hProcess, 0);
-    CloseHandle(process_.hProcess);
-    CloseHandle(process_.hThread);
-  }
-
- private:
-  PROCESS_INFORMATION process_{};
-};
 
 struct Shown {
   const char* name;
@@ -181,7 +153,10 @@ int wmain(int, wchar_t** arguments) {
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();
     const HWND host = make_host_window();
-    const OtherProgram other;
+    const talutil::testing::Process other({"notepad.exe"});
+    const auto is_in_front = [&](HWND window) { return GetForegroundWindow() == window; };
+    check(wait_until([&] { return std::ranges::any_of(windows_of(other.number()), is_in_front); }),
+          "another program is in front");
     const auto form = [](const std::function<HRESULT()>& open) {
       return [open](const User& user) { show(form_class, open, user); };
     };

@@ -24,16 +24,22 @@ inline BOOL CALLBACK collect(HWND window, LPARAM list) {
   return TRUE;
 }
 
-/// The windows of this process without a parent that have a class and can be seen, or not.
-inline std::vector<HWND> top_windows(const std::wstring& class_name, bool is_visible = true) {
+/// The windows of a process without a parent that can be seen, or not.
+inline std::vector<HWND> windows_of(DWORD process, bool is_visible = true) {
   std::vector<HWND> windows;
   EnumWindows(&collect, reinterpret_cast<LPARAM>(&windows));
   std::erase_if(windows, [&](HWND window) {
-    DWORD process = 0;
-    GetWindowThreadProcessId(window, &process);
-    return process != GetCurrentProcessId() || class_of(window) != class_name ||
-           (IsWindowVisible(window) != FALSE) != is_visible;
+    DWORD owner = 0;
+    GetWindowThreadProcessId(window, &owner);
+    return owner != process || (IsWindowVisible(window) != FALSE) != is_visible;
   });
+  return windows;
+}
+
+/// Those of this process that have a class.
+inline std::vector<HWND> top_windows(const std::wstring& class_name, bool is_visible = true) {
+  std::vector<HWND> windows = windows_of(GetCurrentProcessId(), is_visible);
+  std::erase_if(windows, [&](HWND window) { return class_of(window) != class_name; });
   return windows;
 }
 

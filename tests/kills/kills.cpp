@@ -14,24 +14,28 @@
 #include <fstream>
 #include <iterator>
 #include <map>
-#include <memory>
 #include <optional>
 #include <random>
 #include <set>
 #include <span>
 #include <stdexcept>
 #include <thread>
+#include <utility>
+#include <vector>
 
 #include "archives/packing.hpp"
 #include "archives/unpacking.hpp"
 #include "automation/run_time_error.hpp"
-#include "tests/kills/process.hpp"
+#include "tests/process.hpp"
 #include "tests/real_host.hpp"
 
 namespace talutil::testing {
 namespace {
 
 namespace fs = std::filesystem;
+
+/// How this program was called.
+std::string this_program;
 
 constexpr int workers = 8;
 constexpr std::uintmax_t keys = 5;  ///< Each worker writes so many items in turn.
@@ -275,88 +279,67 @@ std::uintmax_t total_of(const Kind& kind, const fs::path& folder) {
 }
 
 using Clock = std::chrono::steady_clock;
+using Random = std::mt19937;
 
-/// A process, and after how many operations it is killed.
+std::uintmax_t up_to(std::uintmax_t highest, Random& random) {
+  return std::uniform_int_distribution<std::uintmax_t>(0, highest)(random);
+}
+
+/// A process, which is to be killed after some operations.
 struct Victim {
-  Victim(const Kind& work_kind, int worker, const fs::path& folder, std::uintmax_t life)
-      : kind(&work_kind),
-        process({"--work", kind->name, std::to_string(worker), folder.string()}),
-        goal(acknowledged(folder, kind->name, worker) + life) {}
+  Victim(const Kind& kind, int number, const fs::path& where, Random& random)
+      : name(kind.name),
+        worker(number),
+        folder(where),
+        goal(acknowledged(folder, name, worker) + up_to(4, random)),
+        process({this_program, "--work", name, std::to_string(worker), folder.string()}) {}
 
-  const Kind* kind;
-  Process process;
+  /// Once it has reached its goal, at any moment of the operation that follows.
+  bool is_due(Random& random) {
+    const auto now = Clock::now();
+    if (!end && acknowledged(folder, name, worker) >= goal) {
+      const auto lived = std::chrono::duration_cast<std::chrono::microseconds>(now - start).count();
+      end = now + std::chrono::microseconds(up_to(static_cast<std::uintmax_t>(lived) + 2000, random));
+    }
+    return end && now >= *end;
+  }
+
+  std::string name;
+  int worker;
+  fs::path folder;
   std::uintmax_t goal;
+  Process process;
   Clock::time_point start = Clock::now();
   std::optional<Clock::time_point> end;
 };
 
-class Driver {
- public:
-  Driver(fs::path folder, std::uintmax_t operations, unsigned seed)
-      : folder_(std::move(folder)), operations_(operations), random_(seed) {}
-
-  /// Returns how many it has killed.
-  int run() {
-    std::array<std::unique_ptr<Victim>, workers> victims;
-    auto last_progress = Clock::now();
-    std::uintmax_t total_before = 0;
-    for (;;) {
-      for (int worker = 0; worker < workers; ++worker) {
-        auto& victim = victims[static_cast<std::size_t>(worker)];
-        if (victim && !victim->process.runs()) return fault("a worker has ended by itself"), kills_;
-        if (victim && !is_due(*victim, worker)) continue;
-        if (victim) {
-          victim.reset();
-          ++kills_;
-        }
-        const Kind* const kind = next_kind();
-        if (kind == nullptr) return kills_;
-        victim = std::make_unique<Victim>(*kind, worker, folder_, up_to(2 * average_life));
-      }
-      const std::uintmax_t total = total_of_all();
-      const auto now = Clock::now();
-      if (total != total_before) last_progress = now;
-      total_before = total;
-      if (now - last_progress > std::chrono::seconds(60)) return fault("no progress for a minute"), kills_;
-      std::this_thread::sleep_for(std::chrono::milliseconds(1));
-    }
-  }
-
- private:
-  static constexpr unsigned average_life = 2;  ///< Operations.
-
-  /// Once it has reached its goal, at any moment of the operation that follows.
-  bool is_due(Victim& victim, int worker) {
-    const auto now = Clock::now();
-    if (!victim.end && acknowledged(folder_, victim.kind->name, worker) >= victim.goal) {
-      const auto lived = std::chrono::duration_cast<std::chrono::microseconds>(now - victim.start).count();
-      victim.end = now + std::chrono::microseconds(up_to(static_cast<unsigned>(lived + 2000)));
-    }
-    return victim.end && now >= *victim.end;
-  }
-
-  std::uintmax_t up_to(unsigned highest) { return std::uniform_int_distribution<unsigned>(0, highest)(random_); }
-
-  /// Any kind of which not enough has been done yet.
-  const Kind* next_kind() {
+/// Lets processes work until enough of each kind is done. Returns how many it has killed.
+int kill_at_random(const fs::path& folder, std::uintmax_t operations, unsigned seed) {
+  Random random(seed);
+  std::array<std::optional<Victim>, workers> victims;
+  auto last_progress = Clock::now();
+  std::uintmax_t total_before = 0;
+  for (int kills = 0;; std::this_thread::sleep_for(std::chrono::milliseconds(1))) {
+    std::uintmax_t total = 0;
     std::vector<const Kind*> open;
     for (const Kind& kind : kinds) {
-      if (total_of(kind, folder_) < operations_) open.push_back(&kind);
+      const std::uintmax_t done = total_of(kind, folder);
+      total += done;
+      if (done < operations) open.push_back(&kind);
     }
-    return open.empty() ? nullptr : open[up_to(static_cast<unsigned>(open.size() - 1))];
+    if (open.empty()) return kills;
+    if (total != std::exchange(total_before, total)) last_progress = Clock::now();
+    if (Clock::now() - last_progress > std::chrono::minutes(1)) return fault("no progress for a minute"), kills;
+    for (int worker = 0; worker < workers; ++worker) {
+      auto& victim = victims[static_cast<std::size_t>(worker)];
+      if (victim && !victim->process.runs()) return fault("a worker has ended by itself"), kills;
+      if (victim && !victim->is_due(random)) continue;
+      kills += victim ? 1 : 0;
+      victim.reset();
+      victim.emplace(*open[up_to(open.size() - 1, random)], worker, folder, random);
+    }
   }
-
-  [[nodiscard]] std::uintmax_t total_of_all() const {
-    std::uintmax_t total = 0;
-    for (const Kind& kind : kinds) total += total_of(kind, folder_);
-    return total;
-  }
-
-  fs::path folder_;
-  std::uintmax_t operations_;
-  std::mt19937 random_;
-  int kills_ = 0;
-};
+}
 
 std::vector<fs::path> temporaries(const fs::path& folder) {
   std::vector<fs::path> found;
@@ -380,7 +363,7 @@ void write_again(Host& host) {
 
 int drive(std::uintmax_t operations, const fs::path& folder, unsigned seed) {
   fs::create_directories(folder / "sources");
-  const int kills = Driver(folder, operations, seed).run();
+  const int kills = kill_at_random(folder, operations, seed);
   Host host(folder);
   for (const Kind& kind : kinds) kind.check(host);
   const auto left = temporaries(folder);
@@ -409,6 +392,7 @@ int drive(std::uintmax_t operations, const fs::path& folder, unsigned seed) {
 
 int main(int count, char** arguments) {
   using namespace talutil::testing;
+  this_program = arguments[0];
   if (count == 5 && std::strcmp(arguments[1], "--work") == 0) {
     const auto kind = std::ranges::find_if(kinds, [&](const Kind& each) { return arguments[2] == each.name; });
     return kind == kinds.end() ? 2 : work(*kind, std::atoi(arguments[3]), arguments[4]);

@@ -13,61 +13,50 @@
 #include <unistd.h>
 #endif
 
-/// Processes of this very program.
 namespace talutil::testing {
 
-#ifdef _WIN32
-
+/// A process of a program, found by its path or as the system finds it, and its arguments. It ends with the object.
 class Process {
  public:
-  explicit Process(const std::vector<std::string>& arguments) {
-    std::wstring path(MAX_PATH, L'\0');
-    path.resize(GetModuleFileNameW(nullptr, path.data(), MAX_PATH));
-    std::wstring line = L'"' + path + L'"';
-    for (const std::string& argument : arguments) line += L" \"" + std::filesystem::path(argument).wstring() + L'"';
+  explicit Process(std::vector<std::string> words) {
+#ifdef _WIN32
+    std::wstring line;
+    for (const std::string& word : words) line += L'"' + std::filesystem::path(word).wstring() + L"\" ";
     STARTUPINFOW startup{};
     startup.cb = sizeof startup;
     PROCESS_INFORMATION made{};
-    if (CreateProcessW(path.c_str(), line.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &startup, &made) == 0) {
-      return;
-    }
+    if (CreateProcessW(nullptr, line.data(), nullptr, nullptr, TRUE, 0, nullptr, nullptr, &startup, &made) == 0) return;
     CloseHandle(made.hThread);
     handle_ = made.hProcess;
+#else
+    std::vector<char*> arguments;
+    for (std::string& word : words) arguments.push_back(word.data());
+    arguments.push_back(nullptr);
+    if (posix_spawnp(&number_, arguments[0], nullptr, nullptr, arguments.data(), environ) != 0) number_ = 0;
+#endif
   }
   Process(const Process&) = delete;
   Process& operator=(const Process&) = delete;
   ~Process() {
+#ifdef _WIN32
     if (handle_ == nullptr) return;
     TerminateProcess(handle_, 1);
     WaitForSingleObject(handle_, INFINITE);
     CloseHandle(handle_);
+#else
+    if (number_ == 0) return;
+    kill(number_, SIGKILL);
+    waitpid(number_, nullptr, 0);
+#endif
   }
 
+#ifdef _WIN32
+  [[nodiscard]] DWORD number() const { return GetProcessId(handle_); }
   [[nodiscard]] bool runs() const { return handle_ != nullptr && WaitForSingleObject(handle_, 0) == WAIT_TIMEOUT; }
 
  private:
   HANDLE handle_ = nullptr;
-};
-
 #else
-
-class Process {
- public:
-  explicit Process(const std::vector<std::string>& arguments) {
-    static std::string path = std::filesystem::read_symlink("/proc/self/exe").string();
-    std::vector<char*> words{path.data()};
-    for (const std::string& argument : arguments) words.push_back(const_cast<char*>(argument.c_str()));
-    words.push_back(nullptr);
-    if (posix_spawn(&number_, path.c_str(), nullptr, nullptr, words.data(), environ) != 0) number_ = 0;
-  }
-  Process(const Process&) = delete;
-  Process& operator=(const Process&) = delete;
-  ~Process() {
-    if (number_ == 0) return;
-    kill(number_, SIGKILL);
-    waitpid(number_, nullptr, 0);
-  }
-
   /// Does not wait for it, so that the number stays that of this process until the end.
   [[nodiscard]] bool runs() const {
     siginfo_t information{};
@@ -77,8 +66,7 @@ class Process {
 
  private:
   pid_t number_ = 0;
-};
-
 #endif
+};
 
 }  // namespace talutil::testing
