@@ -1,8 +1,5 @@
 // A client whose user answers the boxes of the system: confirmations, dialogs for files and folders, passwords,
 // messages; and what can be seen of the components window.
-#include <fstream>
-#include <sstream>
-
 #include "host_grid.hpp"
 #include "windows.hpp"
 
@@ -31,25 +28,14 @@ std::vector<std::wstring> boxes_of(const std::vector<Answer>& answers, const std
   return seen;
 }
 
+/// The answers that confirm are in the examples.
 void confirmations_ask_twice(_ORVUtils* u) {
   VARIANT_BOOL answer = 7;
-  auto seen = boxes_of(
-      {{L"YES", IDOK}}, [&] { u->CheckDeleteRecord(&answer); }, L"input_box");
-  check_equal(VARIANT_TRUE, answer, "YES confirms");
-  const std::wstring question =
-      L"Confirm Delete|Type YES in uppercase characters to confirm deletion of this record|OK|Cancel";
-  check(seen == std::vector{question}, "the input box");
   // Yes asks again; No ends it.
-  seen = boxes_of({{L"yes", IDOK}, {L"", IDYES}, {L"", IDCANCEL}, {L"", IDNO}},
-                  [&] { u->CheckModifyDatabase(Text(L"Rename"), &answer); });
+  const auto seen = boxes_of({{L"yes", IDOK}, {L"", IDYES}, {L"", IDCANCEL}, {L"", IDNO}},
+                             [&] { u->CheckModifyDatabase(Text(L"Rename"), &answer); });
   check(answer == VARIANT_FALSE && seen.size() == 4 && seen[1].starts_with(L"Warning|Yes|No|"), "no confirmation");
-}
-
-std::string bytes_of(const std::wstring& path) {
-  std::ifstream file(path.c_str(), std::ios::binary);
-  std::ostringstream bytes;
-  if (file) bytes << file.rdbuf();
-  return file ? bytes.str() : "(no file)";
+  check_equal(L"Rename|Type YES in uppercase characters to confirm|OK|Cancel", seen[0], "the input box");
 }
 
 /// Exports a table, the user saving to what the dialog proposes, or not.
@@ -90,10 +76,9 @@ void folders_are_picked(_ORVUtils* u) {
   GetWindowsDirectoryA(folder.data(), static_cast<UINT>(folder.size()));
   const std::string name = folder.data();
   for (const int button : {IDOK, IDCANCEL}) {
-    Text chosen;
+    std::wstring chosen;
     const int seen = with_user(
-        dialog_class,
-        [&] { check_equal(S_OK, u->BrowseForFolder(Text(L"Where are the reports?"), chosen), "BrowseForFolder"); },
+        dialog_class, [&] { chosen = text(u, &_ORVUtils::BrowseForFolder, Text(L"Where are the reports?")); },
         [&](HWND dialog) {
           check(words_of(dialog).find(L"|Where are the reports?") != std::wstring::npos, narrow(words_of(dialog)));
           check(GetWindow(dialog, GW_OWNER) == components_windows().at(0), "it is owned by the components window");
@@ -102,7 +87,7 @@ void folders_are_picked(_ORVUtils* u) {
           PostMessageW(dialog, WM_COMMAND, static_cast<WPARAM>(button), 0);
         });
     check_equal(1, seen, "dialogs");
-    check_equal(button == IDOK ? std::wstring(name.begin(), name.end()) : std::wstring(), chosen.view(), "the folder");
+    check_equal(button == IDOK ? std::wstring(name.begin(), name.end()) : std::wstring(), chosen, "the folder");
   }
 }
 

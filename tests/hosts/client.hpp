@@ -6,6 +6,7 @@
 #include <cstdio>
 #include <cstring>
 #include <exception>
+#include <fstream>
 #include <functional>
 #include <source_location>
 #include <span>
@@ -201,6 +202,19 @@ Pointer<Interface> create_object(const CLSID& id = CLSID_ORVUtils, const IID& in
   Pointer<Interface> object;
   require(CoCreateInstance(id, nullptr, CLSCTX_INPROC_SERVER, interface_id, object.receive_untyped()), "creating");
   return object;
+}
+
+/// What a member that gives a text gives for these arguments: `text(u, &_ORVUtils::StripNulls, Text(L"a"))`.
+template <class Member, class... Given>
+std::wstring text(_ORVUtils* u, Member member, Given&&... given) {
+  Text result;
+  check_equal(S_OK, (u->*member)(given..., result), "a member that gives a text");
+  return std::wstring(result.view());
+}
+
+inline std::string bytes_of(const std::wstring& path) {
+  std::ifstream file(path.c_str(), std::ios::binary);
+  return file ? std::string(std::istreambuf_iterator<char>(file), {}) : "(no file)";
 }
 
 /// A window of the client's, 10 pixels from the corner of its parent or of the screen.

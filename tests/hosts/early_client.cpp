@@ -26,12 +26,10 @@ void settings_survive_their_object(U* u) {
   LONG session = 0;
   u->get_lLoginSessionID(&session);
   check_equal(-70000, session, "lLoginSessionID after the release of the object that put it");
-  Text computer;
-  u->get_ComputerName(computer);
   std::array<wchar_t, MAX_COMPUTERNAME_LENGTH + 1> name{};
   auto length = static_cast<DWORD>(name.size());
   GetComputerNameW(name.data(), &length);
-  check_equal(std::wstring_view(name.data(), length), computer.view(), "ComputerName");
+  check_equal(std::wstring_view(name.data(), length), text(u, &U::get_ComputerName), "ComputerName");
 }
 
 int timer_ticks = 0;
@@ -133,12 +131,9 @@ void unmasked_exceptions_do_no_harm(U* u) {
 
 void short_precision_changes_no_digit(U* u) {
   constexpr std::uint16_t single_precision = 0x007F;
-  Text digits;
-  {
-    const Settings settings(single_precision, 0x1F80);
-    u->VerifyIntData(Short{0}, Value(L"123456789012345"), digits);
-  }
-  check_equal(L"123456789012345", digits.view(), "a number with 24 bits of precision");
+  const Settings settings(single_precision, 0x1F80);
+  const std::wstring digits = text(u, &U::VerifyIntData, Short{0}, Value(L"123456789012345"));
+  check_equal(L"123456789012345", digits, "a number with 24 bits of precision");
 }
 
 auto second_object() { return create_object<_cControlPosition>(CLSID_cControlPosition, IID__cControlPosition); }

@@ -123,11 +123,7 @@ bool is_elevated() {
 }
 
 void controls_are_replaced(Factory& factory) {
-  const auto computer_name = [](_ORVUtils* u) {
-    Text name;
-    u->get_ComputerName(name);
-    return std::wstring(name.view());
-  };
+  const auto computer_name = [](_ORVUtils* u) { return text(u, &_ORVUtils::get_ComputerName); };
   Registry::set(HKEY_LOCAL_MACHINE, controls_key, information_control, missing_class_text);
   creation_fails({missing_class_text, controls_key, information_control});
   // A control that creates the library in its turn, while the library starts.
@@ -194,9 +190,7 @@ void threads_see_whole_texts(COINIT apartment, LONG wanted) {
         check(there.calls >= 2000 && here.calls > 0, "both threads have called, " + name);
         // An object of this thread's, which the library asks from the other apartment.
         HostObject value({}, [](const Use& use) { return use.answer(L"12"); });
-        Text asked;
-        check_equal(S_OK, there.object->VerifyTextData(Short{}, Short{}, Value(&value), asked), name);
-        check_equal(L"12", asked.view(), name);
+        check_equal(L"12", text(there.object.get(), &_ORVUtils::VerifyTextData, Short{}, Short{}, Value(&value)), name);
         // The number of an error comes through; its text does on Windows, not in Wine.
         check_equal(run_time_error(5), there.object->StringReplace(Text(L"a"), Text(), Text(), Text()), name);
       },
