@@ -10,7 +10,10 @@ class HostGrid final : public HostObject {
   HostGrid(LONG rows, LONG columns)
       : HostObject({L"Rows", L"Cols", L"FixedRows", L"ColDataType", L"ColHidden", L"RowHidden", L"TextMatrix", L"Cell",
                     L"Row", L"RowSel"},
-                   {}),
+                   [this](const Use& use) {
+                     const HRESULT status = before ? before(use) : S_OK;
+                     return status == S_OK ? answer(use) : status;
+                   }),
         rows_(rows),
         columns_(columns),
         cells_(static_cast<std::size_t>(rows * columns)) {}
@@ -22,16 +25,12 @@ class HostGrid final : public HostObject {
   [[nodiscard]] std::wstring& text(LONG row, LONG column) {
     return cells_[static_cast<std::size_t>(row * columns_ + column)];
   }
-  [[nodiscard]] LONG rows() const noexcept { return rows_; }
-  [[nodiscard]] LONG columns() const noexcept { return columns_; }
 
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID id, REFIID, LCID, WORD flags, DISPPARAMS* parameters, VARIANT* result,
-                                   EXCEPINFO* exception, UINT*) override {
-    const Use use{id, flags, *parameters, result, exception};
-    if (const HRESULT status = before ? before(use) : S_OK; status != S_OK) return status;
-    if (use.is_put() ? id != TextMatrix : (flags & DISPATCH_PROPERTYGET) == 0) return DISP_E_MEMBERNOTFOUND;
+ private:
+  HRESULT answer(const Use& use) {
     const auto number = [&](UINT index) { return V_I4(&use.argument(index)); };
-    switch (id) {
+    if (use.is_put() && use.member != TextMatrix) return DISP_E_MEMBERNOTFOUND;
+    switch (use.member) {
       case Rows:
         return use.answer(rows_);
       case Cols:
@@ -60,7 +59,6 @@ class HostGrid final : public HostObject {
     }
   }
 
- private:
   LONG rows_;
   LONG columns_;
   std::vector<std::wstring> cells_;

@@ -26,8 +26,14 @@
 #include "archives/packing.hpp"
 #include "archives/unpacking.hpp"
 #include "automation/run_time_error.hpp"
+#include "library/library.hpp"
+#include "library/orv_utils.hpp"
 #include "tests/process.hpp"
-#include "tests/real_host.hpp"
+#ifdef _WIN32
+#include "platform/win32/win32_platform.hpp"
+#else
+#include "platform/posix/posix_platform.hpp"
+#endif
 
 namespace talutil::testing {
 namespace {
@@ -40,6 +46,33 @@ std::string this_program;
 constexpr int workers = 8;
 constexpr std::uintmax_t keys = 5;  ///< Each worker writes so many items in turn.
 constexpr TextView application = u"TALUtil kills";
+
+struct NoControls final : ControlMakers {
+  ObjectRef create(TextView /*class_name*/) override { return nullptr; }
+};
+
+/// The library on the real platform.
+struct Host {
+  explicit Host(fs::path place) : native(std::move(place)) {
+    utils.settings().EventLog = 1;
+    utils.settings().sORVPath = folder.substr(0, folder.size() - 1);
+  }
+
+  fs::path native;
+#ifdef _WIN32
+  Text folder = Text(native.u16string()) + u"\\";
+  NoControls controls;
+  HRESULT apartment = CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
+  win32::Win32Platform platform{controls};
+#else
+  Text folder = u"Z:" + from_utf8(native.string()) + u"/";
+  // The platform looks for its settings when it is made.
+  int hive = setenv("TALUTIL_HIVE", (native / "hive.db").c_str(), 1);
+  posix::PosixPlatform platform;
+#endif
+  Library library{platform.platform()};
+  ORVUtils utils{library};
+};
 
 std::string key_of(int worker, std::uintmax_t number) {
   return std::to_string(worker) + "-" + std::to_string(number % keys);
