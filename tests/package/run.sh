@@ -214,9 +214,7 @@ setup with /force."
 
 failing_upgrade() {
   snapshot before
-  setup failing_upgrade 1.2.0 2 "failed; 1.1.0 stays installed: $folder\\$bits\\TALUtil.dll could not be registered: \
-C:\\windows\\system32\\regsvr32.exe ended with code 5. Run it on a copy of the file to see its message, or install for the \
-user alone (/CurrentUser)."
+  setup failing_upgrade 1.2.0 2 "failed; 1.1.0 stays installed: $unregistered"
   unchanged "a failed upgrade" before
   library_works "after a failed upgrade" 1.1.0
 }
@@ -234,9 +232,7 @@ removing() {
 }
 
 failing_installations() {
-  setup failing_install 1.2.0 2 "failed and taken back: $folder\\$bits\\TALUtil.dll could not be registered: \
-C:\\windows\\system32\\regsvr32.exe ended with code 5. Run it on a copy of the file to see its message, or install for the \
-user alone (/CurrentUser)."
+  setup failing_install 1.2.0 2 "failed and taken back: $unregistered"
   unchanged "a failed installation" clean
   mkdir -p "$installed"
   echo "in the way" >"$installed/$bits"
@@ -286,6 +282,8 @@ test_setup() {
   [ $bits = 32 ] || use_wine64
   folder='C:\Program Files\TALUtil'
   root=HKLM
+  unregistered="$folder\\$bits\\TALUtil.dll could not be registered: C:\\windows\\system32\\regsvr32.exe ended with code 5. \
+Run it on a copy of the file to see its message, or install for the user alone (/CurrentUser)."
   wine_server -k
   rm -rf "$(wine_prefix)"
   start_wine
