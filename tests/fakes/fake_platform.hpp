@@ -102,11 +102,12 @@ struct FakePlatform : MessageBoxes,
   WesternCodePage code_page;
 
   // What the library gets; a test may put real parts there before it has its library.
-  TimeConversions* used_time_conversions = this;
+  TimeConversions* used_times = this;
   Files* used_files = &files;
   Folders* used_folders = this;
+  Profiles* used_profiles = &profiles;
+  SettingsStore* used_settings = &settings_store;
   Registry* used_registry = &registry;
-  Network* used_network = &network;
   CodePage* used_code_page = &code_page;
 
   FakePlatform() = default;
@@ -114,11 +115,10 @@ struct FakePlatform : MessageBoxes,
   FakePlatform& operator=(const FakePlatform&) = delete;
 
   [[nodiscard]] Platform platform() {
-    return {*this,         *this,          *this,         *this,         *this,          *this,
-            *this,         *this,          *cryptography, profiles,      settings_store, *used_time_conversions,
-            *used_files,   folder_picker,  guids,         *used_folders, *this,          *used_registry,
-            *used_network, *this,          *this,         *this,         *this,          *this,
-            *this,         *used_code_page};
+    return {*this, *this,         *this,          *this,          *this,          *this,       *this,
+            *this, *cryptography, *used_profiles, *used_settings, *used_times,    *used_files, folder_picker,
+            guids, *used_folders, *this,          *used_registry, network,        *this,       *this,
+            *this, *this,         *this,          *this,          *used_code_page};
   }
 
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override {

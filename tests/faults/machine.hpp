@@ -5,11 +5,7 @@
 #include <memory>
 #include <string>
 
-#include "platform/code_page.hpp"
-#include "platform/files.hpp"
-#include "platform/folders.hpp"
-#include "platform/registry.hpp"
-#include "platform/settings.hpp"
+#include "tests/platform/native_platform.hpp"
 
 /// What the tests in which something goes wrong need from the platform.
 namespace talutil::testing {
@@ -22,22 +18,14 @@ using Contents = std::map<std::string, std::string>;  ///< Contents by path from
 /// Makes a folder hold exactly these files, all of one time.
 void write_tree(const std::filesystem::path& root, const Contents& files);
 
-/// The platform's own parts for files and settings, which lie in one folder as far as the platform allows.
-struct RealParts {
-  virtual ~RealParts() = default;
-  [[nodiscard]] virtual Text folder() const = 0;  ///< As a library calls it, with a separator at its end.
-  [[nodiscard]] virtual Files& files() = 0;
-  [[nodiscard]] virtual Folders& folders() = 0;
-  [[nodiscard]] virtual Profiles& profiles() = 0;
-  [[nodiscard]] virtual SettingsStore& settings_store() = 0;
-  [[nodiscard]] virtual Registry& registry() = 0;
-  [[nodiscard]] virtual CodePage& code_page() = 0;
-};
-
 /// A new folder for files, empty.
 [[nodiscard]] std::filesystem::path make_root();
 
-[[nodiscard]] std::unique_ptr<RealParts> real_parts(const std::filesystem::path& root);
+/// This machine, with its files and settings in a folder as far as the platform allows.
+[[nodiscard]] std::unique_ptr<NativePlatform> native_platform(const std::filesystem::path& root);
+
+/// That folder as a library calls it, with a separator at its end.
+[[nodiscard]] Text library_path(const std::filesystem::path& root);
 
 /// Whether settings and the registry lie in the folder, so that they can be put back.
 [[nodiscard]] bool has_own_settings() noexcept;

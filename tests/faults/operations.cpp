@@ -6,15 +6,14 @@ namespace talutil::testing {
 
 namespace {
 
-Platform on_this_machine(FakePlatform& fake, RealParts& real) {
-  const Platform made_up = fake.platform();
-  return {made_up.message_boxes, made_up.screen,          made_up.computer,      made_up.clock,
-          made_up.form_windows,  made_up.control_makers,  made_up.message_pump,  made_up.random_source,
-          made_up.cryptography,  real.profiles(),         real.settings_store(), made_up.time_conversions,
-          real.files(),          made_up.folder_picker,   made_up.guids,         real.folders(),
-          made_up.input_boxes,   real.registry(),         made_up.network,       made_up.file_dialogs,
-          made_up.drawing,       made_up.window_printing, made_up.font_files,    made_up.printers,
-          made_up.machine,       real.code_page()};
+Platform on_this_machine(FakePlatform& fake, NativePlatform& real) {
+  fake.used_files = &real.files;
+  fake.used_folders = &real.folders;
+  fake.used_profiles = &real.profiles;
+  fake.used_settings = &real.settings_store;
+  fake.used_registry = &real.registry;
+  fake.used_code_page = &real.platform().code_page;
+  return fake.platform();
 }
 
 Text long_text(std::size_t size, char16_t filling) {
@@ -75,7 +74,8 @@ void nothing(Host& /*host*/) {}
 
 }  // namespace
 
-Host::Host(const std::filesystem::path& root) : real(real_parts(root)), library(on_this_machine(fake, *real)) {}
+Host::Host(const std::filesystem::path& root)
+    : folder(library_path(root)), real(native_platform(root)), library(on_this_machine(fake, *real)) {}
 
 const std::vector<Operation>& operations() {
   static const std::vector<Operation> all = [] {

@@ -18,10 +18,11 @@ class Host {
  public:
   explicit Host(const std::filesystem::path& root);
 
-  [[nodiscard]] Text path(TextView name) const { return real->folder() + Text(name); }
+  [[nodiscard]] Text path(TextView name) const { return folder + Text(name); }
 
+  Text folder;
   FakePlatform fake;
-  std::unique_ptr<RealParts> real;
+  std::unique_ptr<NativePlatform> real;
   Library library;
   ORVUtils utils{library};
 };

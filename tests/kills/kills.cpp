@@ -28,12 +28,8 @@
 #include "automation/run_time_error.hpp"
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
+#include "tests/platform/native_platform.hpp"
 #include "tests/process.hpp"
-#ifdef _WIN32
-#include "platform/win32/win32_platform.hpp"
-#else
-#include "platform/posix/posix_platform.hpp"
-#endif
 
 namespace talutil::testing {
 namespace {
@@ -47,11 +43,7 @@ constexpr int workers = 8;
 constexpr std::uintmax_t keys = 5;  ///< Each worker writes so many items in turn.
 constexpr TextView application = u"TALUtil kills";
 
-struct NoControls final : ControlMakers {
-  ObjectRef create(TextView /*class_name*/) override { return nullptr; }
-};
-
-/// The library on the real platform.
+/// The library on the native platform.
 struct Host {
   explicit Host(fs::path place) : native(std::move(place)) {
     utils.settings().EventLog = 1;
@@ -61,15 +53,12 @@ struct Host {
   fs::path native;
 #ifdef _WIN32
   Text folder = Text(native.u16string()) + u"\\";
-  NoControls controls;
-  HRESULT apartment = CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
-  win32::Win32Platform platform{controls};
 #else
   Text folder = u"Z:" + from_utf8(native.string()) + u"/";
   // The platform looks for its settings when it is made.
   int hive = setenv("TALUTIL_HIVE", (native / "hive.db").c_str(), 1);
-  posix::PosixPlatform platform;
 #endif
+  NativePlatform platform;
   Library library{platform.platform()};
   ORVUtils utils{library};
 };

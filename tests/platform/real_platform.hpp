@@ -5,24 +5,15 @@
 #include <vector>
 
 #include "automation/numbers.hpp"
-#include "platform/code_page.hpp"
-#include "platform/files.hpp"
-#include "platform/folders.hpp"
-#include "platform/network.hpp"
-#include "platform/registry.hpp"
-#include "platform/settings.hpp"
-#include "platform/time_conversions.hpp"
+#include "tests/platform/native_platform.hpp"
 
 /// The platform's own parts, for the tests that hold for both platforms.
 namespace talutil::testing {
 
-[[nodiscard]] Files* real_files();
-[[nodiscard]] Folders* real_folders();
+[[nodiscard]] NativePlatform& real_platform();
+[[nodiscard]] inline Files* real_files() { return &real_platform().files; }
+[[nodiscard]] inline Folders* real_folders() { return &real_platform().folders; }
 [[nodiscard]] CodePage* real_code_page(std::uint32_t number);
-[[nodiscard]] Profiles* real_profiles();
-[[nodiscard]] SettingsStore* real_settings_store();
-[[nodiscard]] TimeConversions* real_time_conversions();
-[[nodiscard]] Network* real_network();
 
 /// Without the user's key "Software\TALUtil\Test".
 [[nodiscard]] Registry* real_registry();

@@ -49,7 +49,7 @@ constexpr int file_count = 100;
 
 TEST(Profiles, AreReadAndChangedAsTheDocumentIs) {
   const Text folder = scratch_folder();
-  const auto profiles = real_profiles();
+  Profiles* const profiles = &real_platform().profiles;
   ProfileGenerator generator;
   // A file of its own for each step, since the platform keeps what it has read of one.
   int count = 0;
@@ -91,7 +91,7 @@ TEST(Profiles, AreReadAndChangedAsTheDocumentIs) {
 }
 
 TEST(Profiles, HoldTextsOfTheCodePage) {
-  const auto profiles = real_profiles();
+  Profiles* const profiles = &real_platform().profiles;
   const Text path = scratch_folder() + u"a.ini";
   EXPECT_EQ(profiles->value(path, u"S", u"k"), u"");
   profiles->put(path, u"S", u"k", u"\u20AC\u0100\u0416");
@@ -103,7 +103,7 @@ TEST(Profiles, HoldTextsOfTheCodePage) {
 }
 
 TEST(SettingsStore, KeepsTextsByNamesWithoutCase) {
-  const auto store = real_settings_store();
+  SettingsStore* const store = &real_platform().settings_store;
   const Text application = u"Test " + scratch_folder().substr(3);
   const auto value = [&](const Text& below, const Text& section, const Text& key) {
     return store->value(application + below, section, key);
@@ -172,7 +172,7 @@ TEST(Network, WritesTheAddressesOfTheMachineWhereTheyFit) {
   const std::size_t size = 4 + 24 * expected.size();
   for (const std::size_t room : {std::size_t{0}, size - 1, size, size + 1}) {
     std::vector<std::uint8_t> table(room, 0xEE);
-    real_network()->read_address_table(table);
+    real_platform().network.read_address_table(table);
     if (room < size) {
       EXPECT_EQ(table, std::vector<std::uint8_t>(room, 0xEE)) << room;
       continue;

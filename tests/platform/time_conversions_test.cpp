@@ -10,8 +10,8 @@ namespace {
 using namespace std::chrono;
 
 struct TimeConversionsTest : UtilsTest {
-  TimeConversionsTest() : UtilsTest([](auto& fake) { fake.used_time_conversions = real_time_conversions(); }) {}
-  TimeConversions* conversions = platform.used_time_conversions;
+  TimeConversionsTest() : UtilsTest([](auto& fake) { fake.used_times = &real_platform().time_conversions; }) {}
+  TimeConversions* conversions = platform.used_times;
   Generator generator;
   std::int16_t part(int first, int last) { return static_cast<std::int16_t>(generator.whole(first, last)); }
 };

@@ -2,36 +2,7 @@
 
 #include <stdlib.h>
 
-#include "platform/posix/posix_platform.hpp"
-
 namespace talutil::testing {
-
-namespace {
-
-/// The folder is this machine's drives, of which C: has the files.
-class PosixParts final : public RealParts {
- public:
-  explicit PosixParts(const std::filesystem::path& root) : real_(make(root)) {}
-  [[nodiscard]] Text folder() const override { return u"C:\\"; }
-  [[nodiscard]] Files& files() override { return real_->files; }
-  [[nodiscard]] Folders& folders() override { return real_->folders; }
-  [[nodiscard]] Profiles& profiles() override { return real_->profiles; }
-  [[nodiscard]] SettingsStore& settings_store() override { return real_->settings_store; }
-  [[nodiscard]] Registry& registry() override { return real_->registry; }
-  [[nodiscard]] CodePage& code_page() override { return *real_->code_page; }
-
- private:
-  static std::unique_ptr<posix::PosixPlatform> make(const std::filesystem::path& root) {
-    setenv("TALUTIL_DRIVES", root.c_str(), 1);
-    setenv("TALUTIL_HIVE", (root / "c/hive.db").c_str(), 1);
-    setenv("TMPDIR", (root / "tmp").c_str(), 1);
-    return std::make_unique<posix::PosixPlatform>(1252);
-  }
-
-  std::unique_ptr<posix::PosixPlatform> real_;
-};
-
-}  // namespace
 
 std::filesystem::path make_root() {
   static const std::filesystem::path folder = std::filesystem::temp_directory_path();
@@ -42,7 +13,15 @@ std::filesystem::path make_root() {
   return root;
 }
 
-std::unique_ptr<RealParts> real_parts(const std::filesystem::path& root) { return std::make_unique<PosixParts>(root); }
+// The folder is this machine's drives, of which C: has the files.
+std::unique_ptr<NativePlatform> native_platform(const std::filesystem::path& root) {
+  setenv("TALUTIL_DRIVES", root.c_str(), 1);
+  setenv("TALUTIL_HIVE", (root / "c/hive.db").c_str(), 1);
+  setenv("TMPDIR", (root / "tmp").c_str(), 1);
+  return std::make_unique<NativePlatform>(1252);
+}
+
+Text library_path(const std::filesystem::path& /*root*/) { return u"C:\\"; }
 
 bool has_own_settings() noexcept { return true; }
 

@@ -1,39 +1,10 @@
 #include "tests/faults/machine.hpp"
 
 #include "platform/win32/stored_files.hpp"
-#include "platform/win32/win32_platform.hpp"
 
 namespace talutil::testing {
 
-namespace {
-
-class Win32Parts final : public RealParts {
- public:
-  explicit Win32Parts(const std::filesystem::path& root) : folder_(root.u16string() + u"\\") {}
-  [[nodiscard]] Text folder() const override { return folder_; }
-  [[nodiscard]] Files& files() override { return files_; }
-  [[nodiscard]] Folders& folders() override { return folders_; }
-  [[nodiscard]] Profiles& profiles() override { return profiles_; }
-  [[nodiscard]] SettingsStore& settings_store() override { return settings_store_; }
-  [[nodiscard]] Registry& registry() override { return registry_; }
-  [[nodiscard]] CodePage& code_page() override { return code_page_; }
-
- private:
-  Text folder_;
-  win32::Win32Files files_;
-  win32::Win32Folders folders_;
-  win32::Win32Profiles profiles_;
-  win32::Win32SettingsStore settings_store_;
-  win32::Win32Registry registry_;
-  win32::Win32CodePage code_page_;
-};
-
-}  // namespace
-
 std::filesystem::path make_root() {
-  // Deleting is done by an automation object.
-  static const HRESULT apartment = CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
-  static_cast<void>(apartment);
   static int count = 0;
   const std::filesystem::path root =
       std::filesystem::temp_directory_path() /
@@ -42,7 +13,11 @@ std::filesystem::path make_root() {
   return root;
 }
 
-std::unique_ptr<RealParts> real_parts(const std::filesystem::path& root) { return std::make_unique<Win32Parts>(root); }
+std::unique_ptr<NativePlatform> native_platform(const std::filesystem::path& /*root*/) {
+  return std::make_unique<NativePlatform>();
+}
+
+Text library_path(const std::filesystem::path& root) { return root.u16string() + u"\\"; }
 
 bool has_own_settings() noexcept { return false; }
 

@@ -65,7 +65,7 @@ TEST_F(SettingsFiles, ADamagedStoreIsNamed) {
 }
 
 TEST_F(SettingsFiles, ProfilesAreReplacedWhole) {
-  const auto profiles = testing::real_profiles();
+  Profiles* const profiles = &testing::real_platform().profiles;
   const std::string path = folder / "a.ini";
   profiles->put(from_utf8(path), u"S", u"k", u"1");
   chmod(path.c_str(), 0640);

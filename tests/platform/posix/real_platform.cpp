@@ -17,7 +17,6 @@
 #include <set>
 
 #include "platform/posix/descriptor.hpp"
-#include "platform/posix/posix_platform.hpp"
 
 namespace talutil::testing {
 
@@ -41,21 +40,15 @@ struct TemporaryDrives {
 
 std::string native(const Text& path) { return posix::DrivePaths().native(path); }
 
-posix::PosixPlatform& parts() {
+}  // namespace
+
+NativePlatform& real_platform() {
   static const TemporaryDrives drives;
-  static posix::PosixPlatform platform(1252);
+  static NativePlatform platform(1252);
   return platform;
 }
 
-}  // namespace
-
-Files* real_files() { return &parts().files; }
-Folders* real_folders() { return &parts().folders; }
-Profiles* real_profiles() { return &parts().profiles; }
-SettingsStore* real_settings_store() { return &parts().settings_store; }
-TimeConversions* real_time_conversions() { return &parts().time_conversions; }
-Registry* real_registry() { return &parts().registry; }
-Network* real_network() { return &parts().network; }
+Registry* real_registry() { return &real_platform().registry; }
 
 CodePage* real_code_page(std::uint32_t number) {
   static std::map<std::uint32_t, std::unique_ptr<CodePage>> pages;

@@ -1,47 +1,19 @@
 #include "tests/platform/real_platform.hpp"
 
-#include <gtest/gtest.h>
-
 #include <array>
 #include <map>
 
-#include "platform/win32/handle.hpp"
-#include "platform/win32/win32_code_page.hpp"
-#include "platform/win32/win32_files.hpp"
-#include "platform/win32/win32_folders.hpp"
-#include "platform/win32/win32_registry.hpp"
-#include "platform/win32/win32_settings.hpp"
-#include "platform/win32/win32_time_conversions.hpp"
-
 namespace talutil::testing {
 
-namespace {
-
-template <class Part>
-Part* only() {
-  static Part part;
-  return &part;
+NativePlatform& real_platform() {
+  static NativePlatform platform;
+  return platform;
 }
-
-}  // namespace
-
-Files* real_files() {
-  // Deleting is done by an automation object.
-  static const HRESULT apartment = CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED);
-  EXPECT_TRUE(SUCCEEDED(apartment));
-  return only<win32::Win32Files>();
-}
-
-Folders* real_folders() { return only<win32::Win32Folders>(); }
-Profiles* real_profiles() { return only<win32::Win32Profiles>(); }
-SettingsStore* real_settings_store() { return only<win32::Win32SettingsStore>(); }
-TimeConversions* real_time_conversions() { return only<win32::Win32TimeConversions>(); }
-Network* real_network() { return only<win32::Win32Network>(); }
 
 Registry* real_registry() {
   RegDeleteKeyW(HKEY_CURRENT_USER, L"Software\\TALUtil\\Test\\Below");
   RegDeleteKeyW(HKEY_CURRENT_USER, L"Software\\TALUtil\\Test");
-  return only<win32::Win32Registry>();
+  return &real_platform().registry;
 }
 
 CodePage* real_code_page(std::uint32_t number) {
