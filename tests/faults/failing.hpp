@@ -1,21 +1,40 @@
 #pragma once
 
+#include <cstddef>
 #include <initializer_list>
-
-#include "tests/faults/machine.hpp"
+#include <string>
 
 namespace talutil::testing {
 
-/// What the present FailingCall asks for, and how far that is.
-struct Failing {
+/// What the folders of a test's files allow.
+enum class Allowed { everything, no_replacing, no_new_files };
+
+/// Lets one of this program's system calls on files fail, in a way in which the system may let that call fail. The
+/// calls are watched below the platform's code; natively those of the databases and the standard library are, too.
+struct FailingCall {
+  const std::size_t number;  ///< Counted from 0.
+  const std::size_t way;     ///< One of the call's possible failures, counted from 0.
+  bool goes_on;              ///< Whether every later call fails as well, as with a disk that is gone.
+  const Allowed allowed;
   std::size_t calls = 0;
-  std::size_t number = 0;
-  std::size_t way = 0;
-  bool goes_on = false;
-  Allowed allowed = Allowed::everything;
-  std::string what;
+  std::string what = {};  ///< The name of the function that failed and how; empty if it has no such way of failing.
+
+  static inline constinit FailingCall* present = nullptr;
+
+  FailingCall(std::size_t call, std::size_t failure, bool all_fail, Allowed is_allowed)
+      : number(call), way(failure), goes_on(all_fail), allowed(is_allowed) {
+    present = this;
+  }
+  FailingCall(const FailingCall&) = delete;
+  FailingCall& operator=(const FailingCall&) = delete;
+  ~FailingCall() { present = nullptr; }
+
+  /// Whether there was a call with that number.
+  [[nodiscard]] bool is_reached() const noexcept { return calls > number; }
+
+  /// Whether a call is refused whenever it is made.
+  [[nodiscard]] static bool refuses(Allowed kind) noexcept { return present != nullptr && present->allowed == kind; }
 };
-inline constinit Failing* failing = nullptr;
 
 /// The code that this call is to fail with; 0 if it is to be made.
 /// @param codes those of its possible failures. Codes that are not true, such as that of a missing file, are not among
@@ -24,6 +43,7 @@ inline constinit Failing* failing = nullptr;
 /// @param describe gives the text for a code
 template <class Code, class Describe>
 Code failure(std::initializer_list<Code> codes, Code later, Describe describe) {
+  FailingCall* const failing = FailingCall::present;
   if (failing == nullptr) return {};
   const std::size_t call = failing->calls++;
   if (call < failing->number || (call > failing->number && !failing->goes_on)) return {};

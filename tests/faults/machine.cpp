@@ -3,8 +3,6 @@
 #include <fstream>
 #include <sstream>
 
-#include "tests/faults/failing.hpp"
-
 namespace talutil::testing {
 
 Contents read_tree(const std::filesystem::path& root) {
@@ -37,17 +35,5 @@ void write_tree(const std::filesystem::path& root, const Contents& files) {
     set_time(entry.path());
   }
 }
-
-FailingCall::FailingCall(std::size_t number, std::size_t way, bool goes_on, Allowed allowed) {
-  static Failing state;
-  state = {0, number, way, goes_on, allowed, {}};
-  failing = &state;
-}
-
-FailingCall::~FailingCall() { failing = nullptr; }
-
-bool FailingCall::is_reached() noexcept { return failing->calls > failing->number; }
-
-std::string FailingCall::what() { return failing->what; }
 
 }  // namespace talutil::testing

@@ -45,29 +45,4 @@ void set_time(const std::filesystem::path& path);
 /// How many files and the like this process has open.
 [[nodiscard]] std::size_t open_handles();
 
-/// What the folders of a test's files allow.
-enum class Allowed { everything, no_replacing, no_new_files };
-
-/// Lets one of this program's system calls on files fail, in a way in which the system may let that call fail. The
-/// calls are watched below the platform's code; natively those of the databases and the standard library are, too.
-class FailingCall {
- public:
-  /// @param number counted from 0
-  /// @param way one of the call's possible failures, counted from 0
-  /// @param goes_on whether every later call fails as well, as with a disk that is gone
-  FailingCall(std::size_t number, std::size_t way, bool goes_on, Allowed allowed);
-  FailingCall(const FailingCall&) = delete;
-  FailingCall& operator=(const FailingCall&) = delete;
-  ~FailingCall();
-
-  /// Whether there was a call with that number.
-  [[nodiscard]] static bool is_reached() noexcept;
-
-  /// The name of the function that failed and how; empty if it has no such way of failing.
-  [[nodiscard]] static std::string what();
-};
-
-/// Whether what failed removes files, so that they cannot but be left.
-[[nodiscard]] bool is_removal(std::string_view what) noexcept;
-
 }  // namespace talutil::testing

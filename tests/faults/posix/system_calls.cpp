@@ -44,9 +44,6 @@ auto unless_failing(const char* name, std::initializer_list<int> codes, Call cal
   return call();
 }
 
-/// Whether a call is refused whenever it is made.
-bool is_refused(Allowed refusing) { return failing != nullptr && failing->allowed == refusing; }
-
 /// The same for a number of bytes, of which only half may be handled.
 template <class Call>
 ssize_t for_bytes(const char* name, std::size_t count, std::initializer_list<int> codes, Call call) {
@@ -78,8 +75,9 @@ using Kind = Step::Kind;
 
 int opened(const char* name, int folder, const char* path, int flags, mode_t mode) {
   return unless_failing(name, {EACCES, EMFILE, EIO}, [&] {
-    static const auto real = next<int(int, const char*, int, ...)>("openat");
-    if (is_refused(Allowed::no_new_files) && (flags & O_CREAT) != 0 && folder != AT_FDCWD) return errno = EACCES, -1;
+    static const auto real = next<decltype(::openat)>("openat");
+    if (FailingCall::refuses(Allowed::no_new_files) && (flags & O_CREAT) != 0 && folder != AT_FDCWD)
+      return errno = EACCES, -1;
     if (disk == nullptr) return real(folder, path, flags, mode);
     RecordedDisk* const watching = std::exchange(disk, nullptr);
     const std::string whole = path_of(folder, path);
@@ -139,8 +137,6 @@ std::string parent_of(const std::string& path) { return std::filesystem::path(pa
 
 }  // namespace
 
-bool is_removal(std::string_view what) noexcept { return what.starts_with("unlink"); }
-
 RecordedDisk::RecordedDisk(std::string root) : root_(std::move(root)), before_(read_tree(root_)) {
   for (const auto& [path, bytes] : before_) {
     if (!path.ends_with('/')) named_before_[path] = number_of(inode_of(root_ + path));
@@ -199,8 +195,7 @@ Contents RecordedDisk::after_cut(std::size_t end, Lost lost, unsigned seed) cons
         break;
       case Kind::rename:
         names[step.to] = step.file;
-        if (const auto old = names.find(step.path); old != names.end() && old->second == step.file) names.erase(old);
-        break;
+        [[fallthrough]];
       case Kind::remove:
         if (const auto old = names.find(step.path); old != names.end() && old->second == step.file) names.erase(old);
         break;
@@ -230,46 +225,43 @@ Contents RecordedDisk::after_cut(std::size_t end, Lost lost, unsigned seed) cons
 
 using namespace talutil::testing;
 
+/// A function that makes or opens a file, with a mode behind its parameters if it makes one.
+#define OPENING(name, parameters, folder)                                \
+  int name parameters {                                                  \
+    va_list rest;                                                        \
+    va_start(rest, flags);                                               \
+    const auto mode = (flags & O_CREAT) != 0 ? va_arg(rest, mode_t) : 0; \
+    va_end(rest);                                                        \
+    return opened(#name, folder, path, flags, mode);                     \
+  }
+
+/// A function that fails with one of these codes, or does what the C library's does.
+#define FAILING(name, parameters, arguments, ...)                                \
+  int name parameters noexcept {                                                 \
+    static const auto real = next<decltype(name)>(#name);                        \
+    return unless_failing(#name, {__VA_ARGS__}, [&] { return real arguments; }); \
+  }
+
 extern "C" {
 
-int openat(int folder, const char* path, int flags, ...) {
-  va_list rest;
-  va_start(rest, flags);
-  const auto mode = (flags & O_CREAT) != 0 ? va_arg(rest, mode_t) : 0;
-  va_end(rest);
-  return opened("openat", folder, path, flags, mode);
-}
-
-int open(const char* path, int flags, ...) {
-  va_list rest;
-  va_start(rest, flags);
-  const auto mode = (flags & O_CREAT) != 0 ? va_arg(rest, mode_t) : 0;
-  va_end(rest);
-  return opened("open", AT_FDCWD, path, flags, mode);
-}
-
-int open64(const char* path, int flags, ...) {
-  va_list rest;
-  va_start(rest, flags);
-  const auto mode = (flags & O_CREAT) != 0 ? va_arg(rest, mode_t) : 0;
-  va_end(rest);
-  return opened("open64", AT_FDCWD, path, flags, mode);
-}
+OPENING(openat, (int folder, const char* path, int flags, ...), folder)
+OPENING(open, (const char* path, int flags, ...), AT_FDCWD)
+OPENING(open64, (const char* path, int flags, ...), AT_FDCWD)
 
 ssize_t read(int file, void* bytes, std::size_t count) {
-  static const auto real = next<ssize_t(int, void*, std::size_t)>("read");
+  static const auto real = next<decltype(read)>("read");
   return for_bytes("read", count, {EIO, EINTR, half}, [&](std::size_t part) { return real(file, bytes, part); });
 }
 
 ssize_t pread(int file, void* bytes, std::size_t count, off_t offset) {
-  static const auto real = next<ssize_t(int, void*, std::size_t, off_t)>("pread");
+  static const auto real = next<decltype(pread)>("pread");
   return for_bytes("pread", count, {EIO, EINTR, half},
                    [&](std::size_t part) { return real(file, bytes, part, offset); });
 }
 ssize_t pread64(int file, void* bytes, std::size_t count, off_t offset) { return pread(file, bytes, count, offset); }
 
 ssize_t write(int file, const void* bytes, std::size_t count) {
-  static const auto real = next<ssize_t(int, const void*, std::size_t)>("write");
+  static const auto real = next<decltype(write)>("write");
   return for_bytes("write", count, {ENOSPC, EIO, EINTR, half}, [&](std::size_t part) {
     const ssize_t written = real(file, bytes, part);
     if (disk == nullptr || written <= 0) return written;
@@ -281,7 +273,7 @@ ssize_t write(int file, const void* bytes, std::size_t count) {
 }
 
 ssize_t pwrite(int file, const void* bytes, std::size_t count, off_t offset) {
-  static const auto real = next<ssize_t(int, const void*, std::size_t, off_t)>("pwrite");
+  static const auto real = next<decltype(pwrite)>("pwrite");
   return for_bytes("pwrite", count, {ENOSPC, EIO, EINTR, half}, [&](std::size_t part) {
     const ssize_t written = real(file, bytes, part, offset);
     if (disk != nullptr && written > 0) {
@@ -304,7 +296,7 @@ int fsync(int file) {
 int fdatasync(int file) { return fsync(file); }
 
 int ftruncate(int file, off_t length) noexcept {
-  static const auto real = next<int(int, off_t)>("ftruncate");
+  static const auto real = next<decltype(ftruncate)>("ftruncate");
   return unless_failing("ftruncate", {EIO}, [&] {
     const int result = real(file, length);
     if (result == 0) record(file, Kind::truncate, static_cast<std::size_t>(length));
@@ -314,72 +306,49 @@ int ftruncate(int file, off_t length) noexcept {
 int ftruncate64(int file, off_t length) noexcept { return ftruncate(file, length); }
 
 int renameat(int folder, const char* path, int to_folder, const char* to) noexcept {
-  static const auto real = next<int(int, const char*, int, const char*)>("renameat");
+  static const auto real = next<decltype(renameat)>("renameat");
   return named("renameat", {EPERM, EIO, ENOSPC}, Kind::rename, folder, path, to_folder, to, [&] {
-    return is_refused(Allowed::no_replacing) ? (errno = EPERM, -1) : real(folder, path, to_folder, to);
+    return FailingCall::refuses(Allowed::no_replacing) ? (errno = EPERM, -1) : real(folder, path, to_folder, to);
   });
 }
 
 int unlinkat(int folder, const char* path, int flags) noexcept {
-  static const auto real = next<int(int, const char*, int)>("unlinkat");
+  static const auto real = next<decltype(unlinkat)>("unlinkat");
   return named("unlinkat", {EPERM, EIO}, Kind::remove, folder, path, 0, nullptr,
                [&] { return real(folder, path, flags); });
 }
 int unlink(const char* path) noexcept {
-  static const auto real = next<int(const char*)>("unlink");
+  static const auto real = next<decltype(unlink)>("unlink");
   return named("unlink", {EPERM, EIO}, Kind::remove, AT_FDCWD, path, 0, nullptr, [&] { return real(path); });
 }
 
 int mkdirat(int folder, const char* path, mode_t mode) noexcept {
-  static const auto real = next<int(int, const char*, mode_t)>("mkdirat");
+  static const auto real = next<decltype(mkdirat)>("mkdirat");
   return named("mkdirat", {ENOSPC, EACCES}, Kind::make_folder, folder, path, 0, nullptr,
                [&] { return real(folder, path, mode); });
 }
 int mkdir(const char* path, mode_t mode) noexcept {
-  static const auto real = next<int(const char*, mode_t)>("mkdir");
+  static const auto real = next<decltype(mkdir)>("mkdir");
   return named("mkdir", {ENOSPC, EACCES}, Kind::make_folder, AT_FDCWD, path, 0, nullptr,
                [&] { return real(path, mode); });
 }
 
-int flock(int file, int operation) noexcept {
-  static const auto real = next<int(int, int)>("flock");
-  return unless_failing("flock", {ENOLCK, EINTR, EWOULDBLOCK}, [&] { return real(file, operation); });
-}
-
-int fstat(int file, struct stat* status) noexcept {
-  static const auto real = next<int(int, struct stat*)>("fstat");
-  return unless_failing("fstat", {EIO}, [&] { return real(file, status); });
-}
-int fstat64(int file, struct stat64* status) noexcept {
-  static const auto real = next<int(int, struct stat64*)>("fstat64");
-  return unless_failing("fstat64", {EIO}, [&] { return real(file, status); });
-}
-int fstatat(int folder, const char* path, struct stat* status, int flags) noexcept {
-  static const auto real = next<int(int, const char*, struct stat*, int)>("fstatat");
-  return unless_failing("fstatat", {EIO}, [&] { return real(folder, path, status, flags); });
-}
-int stat(const char* path, struct stat* status) noexcept {
-  static const auto real = next<int(const char*, struct stat*)>("stat");
-  return unless_failing("stat", {EIO}, [&] { return real(path, status); });
-}
-
-int futimens(int file, const struct timespec times[2]) noexcept {
-  static const auto real = next<int(int, const struct timespec*)>("futimens");
-  return unless_failing("futimens", {EPERM}, [&] { return real(file, times); });
-}
-int fchmod(int file, mode_t mode) noexcept {
-  static const auto real = next<int(int, mode_t)>("fchmod");
-  return unless_failing("fchmod", {EPERM}, [&] { return real(file, mode); });
-}
+FAILING(flock, (int file, int operation), (file, operation), ENOLCK, EINTR, EWOULDBLOCK)
+FAILING(fstat, (int file, struct stat* status), (file, status), EIO)
+FAILING(fstat64, (int file, struct stat64* status), (file, status), EIO)
+FAILING(fstatat, (int folder, const char* path, struct stat* status, int flags), (folder, path, status, flags), EIO)
+FAILING(stat, (const char* path, struct stat* status), (path, status), EIO)
+FAILING(futimens, (int file, const struct timespec times[2]), (file, times), EPERM)
+FAILING(fchmod, (int file, mode_t mode), (file, mode), EPERM)
 
 DIR* opendir(const char* path) {
-  static const auto real = next<DIR*(const char*)>("opendir");
+  static const auto real = next<decltype(opendir)>("opendir");
   const int code = failure("opendir", {EMFILE, EACCES});
   errno = code;
   return code == 0 ? real(path) : nullptr;
 }
 dirent* readdir(DIR* folder) {
-  static const auto real = next<dirent*(DIR*)>("readdir");
+  static const auto real = next<decltype(readdir)>("readdir");
   const int code = failure("readdir", {EIO});
   if (code == 0) return real(folder);
   errno = code;

@@ -54,12 +54,10 @@ Function* real(const char* name) {
 /// Whether a call is refused whenever it is made.
 template <class... Arguments>
 bool is_refused(std::string_view name, const Arguments&... arguments) {
-  if (failing == nullptr) return false;
-  if (failing->allowed == Allowed::no_replacing) return name == "MoveFileExW";
   if constexpr (sizeof...(Arguments) == 7) {  // CreateFileW.
-    return failing->allowed == Allowed::no_new_files && std::get<4>(std::tie(arguments...)) == CREATE_NEW;
+    return FailingCall::refuses(Allowed::no_new_files) && std::get<4>(std::tie(arguments...)) == CREATE_NEW;
   }
-  return false;
+  return FailingCall::refuses(Allowed::no_replacing) && name == "MoveFileExW";
 }
 
 template <class Function, std::size_t number>
@@ -139,8 +137,6 @@ std::string ScriptedCalls::log() const {
   }
   return log;
 }
-
-bool is_removal(std::string_view what) noexcept { return what.starts_with("DeleteFileW"); }
 
 }  // namespace talutil::testing
 
