@@ -2,17 +2,13 @@
 
 #include <fcntl.h>
 #include <gtest/gtest.h>
-#include <sys/mount.h>
 #include <sys/stat.h>
-#include <sys/wait.h>
 #include <sys/xattr.h>
 #include <unistd.h>
 
 #include <filesystem>
 #include <fstream>
-#include <future>
 
-#include "platform/posix/replacement.hpp"
 #include "tests/fakes/error_of.hpp"
 #include "tests/fakes/rows.hpp"
 #include "tests/platform/real_platform.hpp"
@@ -74,59 +70,12 @@ TEST_F(PosixFilesTest, LinksAndDevices) {
   EXPECT_EQ(read_bytes(folder + u"real.txt"), "new");
 }
 
-/// Writes a new version of a file, by what is in the one before.
-void add_to(const std::string& folder, const std::string& name, std::string_view bytes) {
-  posix::Replacement version(posix::Descriptor(open(folder.c_str(), O_PATH | O_DIRECTORY)), name, O_RDWR);
-  std::array<char, 100> old{};
-  const ssize_t size = version.target().get() < 0 ? 0 : pread(version.target().get(), old.data(), old.size(), 0);
-  posix::write_all(version.file(), std::string(old.data(), static_cast<std::size_t>(size)) + std::string(bytes));
-  version.keep_rights();
-  version.take_name();
-}
-
-TEST_F(PosixFilesTest, WritersOfOneFileTakeTurns) {
-  for (const TextView name : {u"a.txt", u"b.txt", u"c.txt", u"d.txt", u"e.txt"}) {
-    const auto write = [&] {
-      for (int i = 0; i < 5; ++i) add_to(native, to_utf8(name), "x");
-    };
-    const auto other = std::async(std::launch::async, write);
-    write();
-    other.wait();
-    EXPECT_EQ(read_bytes(folder + Text(name)), std::string(10, 'x')) << "no writer loses what another wrote";
-  }
-}
-
-TEST_F(PosixFilesTest, WhatAKilledWriterLeftIsUsedAgain) {
-  const auto entries = [&] { return std::distance(std::filesystem::directory_iterator(native), {}); };
-  const pid_t child = fork();
-  if (child == 0) {
-    const auto file = files.open_output(folder + u"a.txt");
-    file->write("a longer beginning");
-    _exit(0);
-  }
-  waitpid(child, nullptr, 0);
-  EXPECT_EQ(entries(), 1);
-  add_to(native, "a.txt", "new");
-  EXPECT_EQ(read_bytes(folder + u"a.txt"), "new");
-  EXPECT_EQ(entries(), 1);
-}
-
 TEST_F(PosixFilesTest, StoredAttributes) {
   write_bytes(folder + u"a.txt", "");
   if (setxattr((native + "/a.txt").c_str(), "user.DOSATTRIB", "0x6", 3, 0) != 0) {
     GTEST_SKIP() << "the temporary folder's file system stores no attributes";
   }
   EXPECT_EQ(files.attributes(folder + u"a.txt"), file_attribute::hidden | file_attribute::system);
-}
-
-TEST_F(PosixFilesTest, AFullDiskLeavesTheOldFile) {
-  if (mount("none", native.c_str(), "tmpfs", 0, "size=64k") != 0) GTEST_SKIP() << "mounting is not allowed here";
-  write_bytes(folder + u"a.txt", "old");
-  EXPECT_EQ(error_of([&] { write_bytes(folder + u"a.txt", std::string(100000, 'x')); }), 61);
-  EXPECT_EQ(read_bytes(folder + u"a.txt"), "old");
-  EXPECT_EQ(error_of([&] { files.append(folder + u"a.txt", std::string(100000, 'x')); }), 61);
-  EXPECT_EQ(read_bytes(folder + u"a.txt"), "old");
-  umount(native.c_str());
 }
 
 TEST_F(PosixFilesTest, ProgressIsTold) {
