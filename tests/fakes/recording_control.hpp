@@ -36,8 +36,8 @@ inline std::string shown(const Variant& value) {
 }
 
 /// A control of a host: it answers with the values it is given and notes how it is used. A member is there when it has
-/// a value, "Name" or "Name(1&)" with indexes, or is among the methods, which answer with nothing; it is used as what
-/// host_members declares it to be, or not at all.
+/// a value, "Name" or "Name(1&)" with indexes, or is among the methods, which answer with nothing; it is used as
+/// `uses_of` says, or not at all.
 class RecordingControl : public Object {
  public:
   std::map<std::string, Variant> values;
@@ -60,7 +60,7 @@ class RecordingControl : public Object {
     if (found != names_.end()) return static_cast<std::int32_t>(found - names_.begin()) + 1;
     const auto is_named = [&](const auto& entry) { return entry.first.substr(0, entry.first.find('(')) == member; };
     const bool is_there = std::ranges::any_of(values, is_named) || std::ranges::find(methods, member) != methods.end();
-    if (!is_there || uses_of(member) == 0) raise(ErrorNumber::member_not_supported);
+    if (!is_there) raise(ErrorNumber::member_not_supported);
     names_.push_back(member);
     return static_cast<std::int32_t>(names_.size());
   }
