@@ -111,28 +111,6 @@ TEST_F(Builders, DatesStandInTheHeader) {
   EXPECT_EQ(error_of([&] { header_of(u"x", from); }), 13);
 }
 
-TEST_F(Preview, UnattendedRunsWriteThreeReports) {
-  library.settings().AutomatedEndOfMonth = Boolean(true);
-  library.settings().EventLog = 1;
-  library.settings().sORVPath = u"C:";
-  const auto grid = std::make_shared<RecordingControl>();
-  grid->values["hwnd"] = 1;
-  const Variant holder{ObjectRef(grid)};
-  for (const TextView caption : {u"SalesReport", u"BankSummaryReport", u"BadDebtsReport", u"salesreport"}) {
-    utils.GridPrintPreview(100, 1, u"Report", u"", holder, Variant(), Variant(), Text(caption));
-    EXPECT_EQ(platform.preview.windows, 0) << "unloaded";
-  }
-  const Text folder = u"C:\\TAL\\ORV3\\DATA\\MONTHLYREPORTS\\";
-  for (const TextView name : {u"SalesReport", u"BankSummaryReport", u"BadDebtsReport"}) {
-    EXPECT_THAT(platform.files.bytes(folder + Text(name) + u".pdf"), ::testing::StartsWith("%PDF-1."));
-  }
-  EXPECT_EQ(platform.files.files.size(), 4U) << "three reports and the event log";
-  EXPECT_THAT(platform.preview.uses, ::testing::Not(::testing::Contains("show")));
-  EXPECT_THAT(platform.files.bytes(u"C:\\EventLog.txt"), HasSubstr(":FormQueryUnLoad:frmPrintPreview"));
-  platform.files.failures = {{u"write", ErrorNumber::disk_full}};
-  utils.GridPrintPreview(100, 1, u"Report", u"", holder, Variant(), Variant(), u"SalesReport");
-}
-
 TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
   const auto source = std::make_shared<RecordingControl>();
   Text text;
@@ -275,6 +253,18 @@ struct Meanwhile : Preview {
   FrmPrintPreview& form = library.part<FrmPrintPreview>();
 };
 
+TEST_F(Meanwhile, UnattendedRunsWriteThreeReports) {
+  const Text reports[] = {u"SalesReport", u"BankSummaryReport", u"BadDebtsReport"};
+  for (const Text& caption : reports) EXPECT_EQ(write(caption), 0);
+  EXPECT_EQ(write(u"salesreport"), 0);
+  EXPECT_TRUE(std::ranges::all_of(reports, [&](const Text& report) { return is_written(report); }));
+  EXPECT_EQ(platform.files.files.size(), 3U);
+  EXPECT_THAT(platform.preview.uses, ::testing::Not(::testing::Contains("show")));
+  EXPECT_EQ(platform.preview.windows, 0) << "unloaded";
+  platform.files.failures = {{u"write", ErrorNumber::disk_full}};
+  EXPECT_EQ(write(u"SalesReport"), 0);
+}
+
 TEST_F(Meanwhile, AReportThatIsBeingBuiltOrShownIsNotTouched) {
   std::vector<std::int32_t> errors;
   const auto interfere = [&](const std::string& /*use*/) {
@@ -337,10 +327,14 @@ TEST_F(Meanwhile, AMonthEndTakesThePlaceOfTheReportShown) {
     EXPECT_EQ(platform.files.files.size(), 3U) << "and the log, but no month end under the name chosen for another";
     EXPECT_EQ(platform.preview.windows, 0);
     const std::string log = platform.files.bytes(u"C:\\EventLog.txt");
-    const std::string loaded = ":FormLoad:frmPrintPreview";
-    std::size_t loads = 0;
-    for (std::size_t at = log.find(loaded); at != std::string::npos; at = log.find(loaded, at + 1)) ++loads;
-    EXPECT_EQ(loads, 3U) << "the first report is built in the window shown, and each later one loads its own";
+    const auto count = [&](const std::string& event) {
+      std::size_t found = 0;
+      for (std::size_t at = log.find(event); at != std::string::npos; at = log.find(event, at + 1)) ++found;
+      return found;
+    };
+    EXPECT_EQ(count(":FormLoad:frmPrintPreview"), 3U)
+        << "the first is built in the window shown, later ones load theirs";
+    EXPECT_EQ(count(":FormQueryUnLoad:frmPrintPreview"), 3U);
   });
   platform.preview.user = [&](PreviewEvents& /*events*/) {
     EXPECT_THAT(month_end(), ElementsAre(0, 0, 0));
@@ -558,9 +552,8 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
 /// The texts of a page that are at a height, from the left, without the space between them.
 std::string line_at(const Page& page, std::int32_t top) {
   std::string line;
-  for (const PageItem& item : page.items) {
-    const auto* const run = std::get_if<TextRun>(&item);
-    if (run != nullptr && run->top == top) line += (line.empty() ? "" : "|") + to_utf8(run->text);
+  for (const TextRun& run : texts_of(page)) {
+    if (run.top == top) line += (line.empty() ? "" : "|") + to_utf8(run.text);
   }
   return line;
 }
@@ -578,15 +571,14 @@ TEST_F(Pages, HeadersKeepTheirNameAndDates) {
     Text shown;
     std::size_t runs = 0;
     const Document& document = document_of(u"text");
-    for (const PageItem& item : document.pages[0].items) {
-      const auto* const run = std::get_if<TextRun>(&item);
-      if (run == nullptr || run->top >= 1134) continue;
+    for (const TextRun& run : texts_of(document.pages[0])) {
+      if (run.top >= 1134) continue;
       ++runs;
-      shown += run->text;
-      EXPECT_GE(run->top, 360);
-      EXPECT_LE(run->top + line_height(run->font), 1134 - 240);
-      EXPECT_LE(run->left + run->width, 11906 - 1134);
-      EXPECT_GE(run->font.points, 6);
+      shown += run.text;
+      EXPECT_GE(run.top, 360);
+      EXPECT_LE(run.top + line_height(run.font), 1134 - 240);
+      EXPECT_LE(run.left + run.width, 11906 - 1134);
+      EXPECT_GE(run.font.points, 6);
     }
     std::erase(shown, u' ');
     Text whole = name + u"01/03/2009To31/03/2009";
@@ -632,13 +624,8 @@ TEST_F(Pages, PartsOfAWideGridSayWhatTheyShow) {
   }
   grid->put_ColWidth(23, 20000);
   print->Header = u"Wide";
-  struct Expected {
-    std::size_t page;
-    const char* first_row;
-    const char* note;
-  };
   // 9638 twips of room, of which the fixed column takes 1000; 57 rows on a page.
-  const Expected pages[] = {
+  const std::tuple<std::size_t, const char*, const char*> pages[] = {
       {0, "0/0|0/1|0/2|0/3|0/4|0/5|0/6|0/7|0/8", "Part 1 of 4: columns 2 to 9 of 24"},
       {1, "57/0|57/1|57/2|57/3|57/4|57/5|57/6|57/7|57/8", "Part 1 of 4: columns 2 to 9 of 24"},
       {5, "57/0|57/17|57/18|57/19|57/20|57/21|57/22", "Part 3 of 4: columns 18 to 23 of 24"},
