@@ -55,48 +55,45 @@ TEST_F(Configuration, WritesToAFile) {
 TEST_F(Configuration, GroupsOfTheStore) {
   const Text previous = u"PreviousDatabaseSettings";
   const Text code = u"CodeCount";
-  // By their first letters: the user's, the database's, of the previous database, of the code counter.
-  std::map<char, Text> groups = {{'u', u"ORV3\\Main_anne_UserSettings|S|k"},
-                                 {'d', u"ORV3\\Main_DatabaseSettings|S|k"},
-                                 {'p', u"ORV3\\PreviousDatabaseSettings|S|k"},
-                                 {'c', u"ORV3\\Programmer\\CodeCount|S|k"},
-                                 {'n', u"ORV3\\Main__UserSettings|S|k"}};
-  const Rows<Text, Text, Text, Text, char, std::string> rows = {
-      {"the user's", u"anne", u"mine", u"data", u"mine", 'u', "ud"},
-      {"the database's", u"anne", u"mine", u"data", u"data", 'd', "ud"},
-      {"previous", u"anne", u"mine", u"data", previous, 'p', "p"},
-      {"code", u"anne", u"mine", u"data", code, 'c', "c"},
-      {"case counts", u"anne", u"mine", u"data", u"codecount", 'u', "ud"},
-      {"unknown", u"anne", u"mine", u"data", u"C:\\a.ini", 'u', "ud"},
-      {"no user: the database's", u"", u"mine", u"data", u"mine", 'd', "nd"},
-      {"no user: previous all the same", u"", u"mine", u"data", previous, 'p', "p"},
-      {"no user: not code, which is written", u"", u"mine", u"data", code, 'd', "c"},
-      {"an empty selector is not the host's own", u"anne", u"", u"data", u"", 'u', "ud"},
-      {"but can be the database's", u"anne", u"", u"", u"", 'd', "ud"},
-      {"the host's comes first", u"anne", code, previous, code, 'u', "ud"},
-      {"the database's before previous", u"anne", u"x", previous, previous, 'd', "ud"},
-  };
-  check_rows(rows, [&](const Text& user, const Text& own, const Text& data, const Text& selector, char read,
-                       const std::string& written) {
-    settings.sUserName = user;
-    settings.sNatNameD = own;
-    settings.sORVDataName = data;
-    platform.settings_store.values.clear();
-    accesses.clear();
-    // A missing value is saved where it was looked for, whatever the default; that of the code counter is not.
-    std::vector<Text> expected = {groups[read]};
-    if (read != 'c') expected.push_back(groups[read] + u"=NoDefaultData");
-    EXPECT_EQ(utils.GetCfgFileData(u"S", u"k", u"NoDefaultData", selector, Boolean(false)),
-              read == 'c' ? u"" : u"NoDefaultData");
-    EXPECT_EQ(accesses, expected);
-    accesses.clear();
-    expected.clear();
-    Text output = u"\\v";
-    utils.SaveCfgFileData(u"S", u"k", output, selector, Boolean(false));
-    for (const char group : written) expected.push_back(groups[group] + u"=\\v");
-    EXPECT_EQ(accesses, expected);
-    EXPECT_EQ(output, u"\\v");
-  });
+  const Text names[] = {u"", u"mine", u"C:\\a.ini", u"codecount", previous, code};
+  for (const Text& user : {Text(), Text(u"anne")}) {
+    // By their first letters: the user's, the database's, of the previous database, of the code counter.
+    std::map<char, Text> groups = {{'u', u"ORV3\\Main_" + user + u"_UserSettings|S|k"},
+                                   {'d', u"ORV3\\Main_DatabaseSettings|S|k"},
+                                   {'p', u"ORV3\\PreviousDatabaseSettings|S|k"},
+                                   {'c', u"ORV3\\Programmer\\CodeCount|S|k"}};
+    for (std::size_t i = 0; i < 216; ++i) {
+      const Text& selector = names[i % 6];
+      settings.sUserName = user;
+      settings.sNatNameD = names[i / 6 % 6];
+      settings.sORVDataName = names[i / 36];
+      SCOPED_TRACE(to_utf8(user + u'|' + settings.sNatNameD + u'|' + settings.sORVDataName + u'|' + selector));
+      // The host's own name comes first, unless it is empty.
+      const bool is_own = !selector.empty() && selector == settings.sNatNameD;
+      const char kind = is_own                              ? 'u'
+                        : selector == settings.sORVDataName ? 'd'
+                        : selector == previous              ? 'p'
+                        : selector == code                  ? 'c'
+                                                            : 'u';
+      platform.settings_store.values.clear();
+      accesses.clear();
+      // A missing value is saved where it was looked for, whatever the default; that of the code counter is not.
+      const char read = user.empty() && selector != previous ? 'd' : kind;
+      std::vector<Text> expected = {groups[read]};
+      if (read != 'c') expected.push_back(groups[read] + u"=NoDefaultData");
+      EXPECT_EQ(utils.GetCfgFileData(u"S", u"k", u"NoDefaultData", selector, Boolean(false)),
+                read == 'c' ? u"" : u"NoDefaultData");
+      EXPECT_EQ(accesses, expected);
+      accesses.clear();
+      expected.clear();
+      Text output = u"\\v";
+      utils.SaveCfgFileData(u"S", u"k", output, selector, Boolean(false));
+      const bool is_alone = kind == 'p' || kind == 'c';
+      for (const char group : is_alone ? std::string(1, kind) : "ud") expected.push_back(groups[group] + u"=\\v");
+      EXPECT_EQ(accesses, expected);
+      EXPECT_EQ(output, u"\\v");
+    }
+  }
   platform.settings_store.fails = true;
   check(
       {{u"GetCfgFileData", {{u"S|k|d|x|False", "error 57"}}}, {u"SaveCfgFileData", {{u"S|k|d|x|False", "error 57"}}}});
