@@ -207,13 +207,5 @@ TEST(Numbers, CheckedArithmetic) {
   EXPECT_EQ(outcome([] { return checked_cast<std::int16_t>(std::int64_t{-32768}); }), "-32768");
 }
 
-TEST(RunTimeError, CarriesNumberAndText) {
-  const RunTimeError standard(ErrorNumber::subscript_out_of_range);
-  EXPECT_EQ(standard.number(), 9);
-  EXPECT_EQ(standard.description(), u"Subscript out of range");
-  EXPECT_STREQ(RunTimeError(9, u"caf\u00E9").what(), "caf\xC3\xA9");
-  EXPECT_EQ(standard_description(12345), "Application-defined or object-defined error");
-}
-
 }  // namespace
 }  // namespace talutil

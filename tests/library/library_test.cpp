@@ -1,7 +1,5 @@
 #include <gmock/gmock.h>
 
-#include <algorithm>
-
 #include "automation/control.hpp"
 #include "controls/control_factory.hpp"
 #include "infoforms/frm_components.hpp"
@@ -57,15 +55,6 @@ TEST_F(LibraryTest, TerminateUnloadsTheWindowAndSpeaksOnlyInDebugMode1) {
   EXPECT_EQ(platform.open_windows, 1);
 }
 
-TEST_F(LibraryTest, ObjectsShareOneBlockOfSettings) {
-  ORVUtils other(library);
-  late(u"sUserName", Access::put, {Variant(u"anne")});
-  EXPECT_EQ(other.settings().sUserName, u"anne");
-  EXPECT_EQ(late(u"WriteServerPerformanceFile", Access::get), Variant(Boolean(false)));
-  EXPECT_EQ(late(u"BookingScreenDate", Access::get), Variant(Date{0}));
-  EXPECT_EQ(error_of([&] { late(u"ComputerName", Access::put, {Variant(u"x")}); }), 438);
-}
-
 TEST_F(LibraryTest, ObjectPropertiesKeepObjectsOfTheirKindUntilTheNextPut) {
   using talutil::testing::RecordingControl;
   const auto form = std::make_shared<RecordingControl>();
@@ -115,24 +104,6 @@ TEST_F(LibraryTest, DatabaseErrorReport) {
   EXPECT_EQ(platform.messages[1].text, u"TData Error:-5 - what  where  help.hlp");
   EXPECT_EQ(platform.messages[2].text, u"TData Error:0 -     ");
   EXPECT_EQ(form.last_database_error(), 0);
-}
-
-// Hosts that are bound early have these positions in their programs. Slots count from 0 after the first seven.
-TEST(InterfaceTable, SlotsStandWhereHostsWereBound) {
-  using enum Access;
-  // clang-format off
-  const testing::Rows<std::size_t, Access> rows = {
-      {"AutomatedEndOfMonth", 0, get}, {"BookingScreenDate", 17, put}, {"VersionMajor", 21, put},
-      {"VersionMajor", 24, get}, {"bNewZealand", 39, put}, {"ComputerName", 43, get}, {"Terminate", 90, Access::call},
-      {"StringReplaceWord", 203, Access::call}, {"WriteServerPerformanceFile", 204, get},
-      {"GetIpAddrTable", 214, Access::call}, {"VerifyMemField", 215, Access::call}};
-  // clang-format on
-  const auto& members = described<ORVUtils>;
-  ASSERT_EQ(members.size(), 216U);
-  for (const auto& [name, slot, access] : rows) {
-    EXPECT_EQ(members[slot].name, std::string_view(name)) << slot;
-    EXPECT_EQ(members[slot].access, access) << name;
-  }
 }
 
 }  // namespace
