@@ -33,28 +33,23 @@ inline std::string shown_late(const Variant& value) {
   return value.is(Variant::Kind::date) ? "#" + text + "#" : text;
 }
 
-/// What a call answers with the arguments of a row ("@none" is without any), shown by a function.
-template <class Show, class Call>
-std::string late_answer(TextView written, Show show, Call call) {
-  std::vector<Argument> arguments;
-  for (std::size_t start = 0; start <= written.size() && written != u"@none";) {
-    const std::size_t end = std::min(written.find(u'|', start), written.size());
-    arguments.emplace_back(late_value(written.substr(start, end - start)));
-    start = end + 1;
-  }
-  std::string answer;
-  const std::int32_t error = error_of([&] { answer = show(call(std::span(arguments))); });
-  if (error != 0) answer = "error " + std::to_string(error);
-  for (const Argument& argument : arguments) {
-    if (argument.is_changed) answer += " | " + show(argument.value);
-  }
-  return answer;
-}
-
 class LateMembers : public UtilsTest {
  protected:
-  std::string call(TextView member, TextView written) {
-    return late_answer(written, &shown_late, [&](auto arguments) { return call(member, Access::call, arguments); });
+  /// What a member answers to the arguments of a row ("@none" is without any).
+  std::string call(TextView member, TextView written, Access access = Access::call) {
+    std::vector<Argument> arguments;
+    for (std::size_t start = 0; start <= written.size() && written != u"@none";) {
+      const std::size_t end = std::min(written.find(u'|', start), written.size());
+      arguments.emplace_back(late_value(written.substr(start, end - start)));
+      start = end + 1;
+    }
+    std::string answer;
+    const std::int32_t error = error_of([&] { answer = shown_late(call(member, access, arguments)); });
+    if (error != 0) answer = "error " + std::to_string(error);
+    for (const Argument& argument : arguments) {
+      if (argument.is_changed) answer += " | " + shown_late(argument.value);
+    }
+    return answer;
   }
 
   Variant call(TextView member, Access access, std::span<Argument> arguments) {

@@ -55,6 +55,23 @@ TEST_F(LibraryTest, TerminateUnloadsTheWindowAndSpeaksOnlyInDebugMode1) {
   EXPECT_EQ(platform.open_windows, 1);
 }
 
+TEST_F(LibraryTest, LateCallsCoerceTheirArgumentsAndWriteBackWhatHasChanged) {
+  check({{u"stringREPLACE", {{u"=5.5|5|x", "x.x"}}},
+         {u"RemoveStringsFromNumber", {{u"2|A B|@empty", "AB |  "}, {u"2|A B|B", "A "}}},
+         // With a default in play the arguments travel through places of the call's own, and come back.
+         {u"ExtractFilename", {{u"\"C:\\a.b\"", "a.b | C:\\a.b"}, {u"\"C:\\a.b\"|@missing", "a.b | C:\\a.b"}}},
+         {u"WeekYearToDate", {{u"60|10000|0", "error 13 | 52"}}},
+         // A variable that stands for an argument which its own caller left out is a value where one is required.
+         {u"MyPos", {{u"a", "error 449"}, {u"@missing|b|1", "error 13"}, {u"@null|b|1", "error 94"}}},
+         {u"StripNulls", {{u"a|b", "error 450"}}},
+         {u"IndexInList", {{u"no array|a", "error 13"}}},
+         {u"Nothing", {{u"@none", "error 438"}}}});
+  EXPECT_EQ(call(u"StripNulls", u"a", Access::get), "a") << "a method's answer";
+  EXPECT_EQ(call(u"lLoginSessionID", u" 12 ", Access::put), "Empty");
+  for (const Access read : {Access::get, Access::call}) EXPECT_EQ(call(u"LLOGINsessionid", u"@none", read), "12");
+  EXPECT_EQ(call(u"ComputerName", u"x", Access::put), "error 438");
+}
+
 TEST_F(LibraryTest, ObjectPropertiesKeepObjectsOfTheirKindUntilTheNextPut) {
   using talutil::testing::RecordingControl;
   const auto form = std::make_shared<RecordingControl>();
