@@ -195,17 +195,5 @@ TEST(Numbers, Rounding) {
   });
 }
 
-TEST(Numbers, CheckedArithmetic) {
-  constexpr std::int16_t highest = std::numeric_limits<std::int16_t>::max();
-  constexpr std::int16_t one = 1;
-  EXPECT_EQ(checked_add<std::int16_t>(highest, -1), highest - 1);
-  EXPECT_EQ(outcome([] { return checked_add(highest, one); }), "error 6");
-  EXPECT_EQ(outcome([] { return checked_subtract<std::int32_t>(std::numeric_limits<std::int32_t>::min(), 1); }),
-            "error 6");
-  EXPECT_EQ(outcome([] { return checked_multiply<std::int32_t>(65536, 32768); }), "error 6");
-  EXPECT_EQ(outcome([] { return checked_cast<std::int16_t>(32768U); }), "error 6");
-  EXPECT_EQ(outcome([] { return checked_cast<std::int16_t>(std::int64_t{-32768}); }), "-32768");
-}
-
 }  // namespace
 }  // namespace talutil

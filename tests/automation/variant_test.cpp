@@ -106,31 +106,13 @@ TEST(Variant, Questions) {
   EXPECT_EQ(outcome([] { return Boolean(Variant(ObjectRef()).is_null()); }), "error 91");
 }
 
-TEST(Variant, TextArrayBounds) {
-  const TextArray array{{u"a", u"b"}, -1, true};
-  EXPECT_EQ(array.upper_bound(), 0);
-  EXPECT_EQ(array.at(-1), u"a");
-  for (const std::int32_t index : {-2, 1}) EXPECT_EQ(outcome([&] { return array.at(index); }), "error 9") << index;
-  EXPECT_EQ((TextArray{{}, 3, true}).upper_bound(), 2);
-  EXPECT_EQ(outcome([] { return TextArray{}.upper_bound(); }), "error 9");
-  EXPECT_EQ(outcome([] { return TextArray{}.at(0); }), "error 9");
-}
-
-TEST(Control, UsesMembersByNameAndIdentifier) {
+TEST(Control, UsesTheDefaultMember) {
   const auto object = std::make_shared<testing::RecordingControl>();
-  object->values = {{"Text", u"2.5"}, {"#0", u"2.5"}, {"Text(1&, \"x\")", u"9"}};
-  object->methods = {"Move"};
+  object->values = {{"#0", u"2.5"}};
   const Control control(Variant(ObjectRef(object)), plain_numbers);
-  EXPECT_EQ(control.get<std::int32_t>(u"Text"), 2);
   EXPECT_EQ(control.get<double>(default_member), 2.5);
-  EXPECT_EQ(control.get<Text>(u"Text", {1, u"x"}), u"9");
-  control.put(u"Text", {1}, 9);
   control.put(default_member, 8);
   EXPECT_EQ(control.get(default_member), Variant(8));
-  control.call(u"Move", {3});
-  EXPECT_EQ(object->uses, (std::vector<std::string>{"Text", "#0", "Text(1&, \"x\")", "put Text(1&) = 9&", "put #0 = 8&",
-                                                    "#0", "call Move(3&)"}));
-  EXPECT_EQ(outcome([&] { return control.get(u"Other"); }), "error 438");
   EXPECT_EQ(outcome([] { return Control(Variant(5), plain_numbers).get(0); }), "error 424");
   EXPECT_EQ(outcome([] { return Control(Variant(ObjectRef()), plain_numbers).get(0); }), "error 91");
 }

@@ -1,5 +1,6 @@
 #include <gmock/gmock.h>
 
+#include <ranges>
 #include <set>
 
 #include "forms/frm_input_box.hpp"
@@ -130,10 +131,9 @@ TEST(ShortcutKeys, AreToldOnceAScreen) {
       keys.clear();
       screen = section.heading;
     }
-    for (std::size_t at = 0; at < section.entries.size();) {
-      const std::size_t end = std::min(section.entries.find(u'\n', at), section.entries.size());
-      const TextView entry = section.entries.substr(at, end - at);
-      at = end + 1;
+    for (const auto line : std::views::split(section.entries, u'\n')) {
+      const TextView entry(line.begin(), line.end());
+      if (entry.empty()) continue;
       ++entries;
       const std::size_t sign = entry.find(u" = ");
       const TextView key = sign == Text::npos ? entry.substr(entry.rfind(u' ') + 1) : entry.substr(sign + 3);

@@ -1,4 +1,5 @@
 #include <limits>
+#include <ranges>
 
 #include "tests/fakes/late_members.hpp"
 #include "tests/fakes/recording_control.hpp"
@@ -24,12 +25,10 @@ Text lines(const std::vector<Text>& all) {
   return text;
 }
 
-std::vector<Text> split(Text text) {
+std::vector<Text> split(TextView text) {
   std::vector<Text> all;
-  for (std::size_t end = 0; (end = text.find(u"\r\n")) != Text::npos; text.erase(0, end + 2)) {
-    all.push_back(text.substr(0, end));
-  }
-  return all.push_back(text), all;
+  for (const auto line : std::views::split(text, TextView(u"\r\n"))) all.emplace_back(line.begin(), line.end());
+  return all;
 }
 
 /// The cleaning, character by character.
@@ -124,25 +123,19 @@ TEST_F(Sanitising, VerifyTextDataKeepsLinesByTheirLengths) {
 
 // An override of a member sees every inner call, in this order.
 TEST_F(Sanitising, ToolkitIsCalledInOrder) {
-  const auto check_calls = [&](const Text& start, std::initializer_list<TextView> changes, const Text& last) {
-    std::vector<Text> expected = {start};
-    for (const TextView change : changes) expected.push_back(u"StringReplace" + Text(change));
-    expected.push_back(last);
-    EXPECT_EQ(utils.calls, expected);
-    utils.calls.clear();
-  };
   (void)utils.VerifyTextData(1, 3, u" a,b ");
-  check_calls(u"StripNulls|a,b",
-              {u"|a,b|&|and", u"|a,b|\"|", u"|a,b|'|\u00B4", u"|a,b|\t|", u"|a,b|#|", u"|a,b|>|", u"|a,b|<|",
-               u"|a,b|?|", u"|a,b|,|"},
-              u"StringReplace|ab| |");
+  const Text replacing = u"StringReplace|a,b|";
+  EXPECT_EQ(std::exchange(utils.calls, {}),
+            (std::vector<Text>{u"StripNulls|a,b", replacing + u"&|and", replacing + u"\"|", replacing + u"'|\u00B4",
+                               replacing + u"\t|", replacing + u"#|", replacing + u">|", replacing + u"<|",
+                               replacing + u"?|", replacing + u",|", u"StringReplace|ab| |"}));
   (void)utils.VerifyTextData(0, 3, Null{});
   EXPECT_TRUE(utils.calls.empty());
   (void)utils.VerifyMemField(u"x");
-  check_calls(u"StringReplace|x|\n| ",
-              {u"Word|x|  | ", u"Word|x|   | ", u"Word|x|    | ", u"Word|x|\r\n\r\n|\r\n", u"Word|x|\r\n\r\n\r\n|\r\n",
-               u"Word|x|\r\r|\r", u"Word|x|\r\r\r|\r"},
-              u"StringReplaceWord|x|\r\r\r\r|\r");
+  const Text word = u"StringReplaceWord|x|";
+  EXPECT_EQ(utils.calls, (std::vector<Text>{u"StringReplace|x|\n| ", word + u"  | ", word + u"   | ", word + u"    | ",
+                                            word + u"\r\n\r\n|\r\n", word + u"\r\n\r\n\r\n|\r\n", word + u"\r\r|\r",
+                                            word + u"\r\r\r|\r", word + u"\r\r\r\r|\r"}));
 }
 
 TEST_F(Sanitising, CallsAreCountedBeforeTheValueIsLookedAtAndAFullCounterEndsThem) {
