@@ -11,31 +11,10 @@ namespace {
 
 constinit ScriptedCalls* script = nullptr;
 
-struct Call {
-  const char* name;
-  std::initializer_list<DWORD> codes;  ///< What it can fail with, as documented.
-};
-
-constexpr Call calls[] = {
-    {"CreateFileW", {ERROR_ACCESS_DENIED, ERROR_TOO_MANY_OPEN_FILES, ERROR_SHARING_VIOLATION}},
-    {"ReadFile", {ERROR_CRC, ERROR_LOCK_VIOLATION}},
-    {"WriteFile", {ERROR_DISK_FULL, ERROR_WRITE_FAULT}},
-    {"FlushFileBuffers", {ERROR_DISK_FULL, ERROR_IO_DEVICE}},
-    {"MoveFileExW", {ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION, ERROR_IO_DEVICE}},
-    {"DeleteFileW", {ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION}},
-    {"CreateDirectoryW", {ERROR_ACCESS_DENIED, ERROR_DISK_FULL}},
-    {"GetFileSizeEx", {ERROR_IO_DEVICE}},
-    {"SetFilePointerEx", {ERROR_IO_DEVICE}},
-    {"SetEndOfFile", {ERROR_DISK_FULL}},
-    {"SetFileTime", {ERROR_ACCESS_DENIED}},
-    {"FindFirstFileW", {ERROR_ACCESS_DENIED, ERROR_NOT_READY}},
-    {"FindNextFileW", {ERROR_IO_DEVICE}},
-    {"LockFileEx", {ERROR_LOCK_VIOLATION, ERROR_NOT_SUPPORTED}},
-};
-
-DWORD failure(const Call& call) {
+template <class Call>
+DWORD failure() {
   return talutil::testing::failure<DWORD>(
-      call.codes, ERROR_IO_DEVICE, [&](DWORD code) { return call.name + std::string(": ") + std::to_string(code); });
+      Call::codes, ERROR_IO_DEVICE, [](DWORD code) { return Call::name + std::string(": ") + std::to_string(code); });
 }
 
 template <class Result>
@@ -60,15 +39,15 @@ bool is_refused(std::string_view name, const Arguments&... arguments) {
   return FailingCall::refuses(Allowed::no_replacing) && name == "MoveFileExW";
 }
 
-template <class Function, std::size_t number>
+template <class Function, class Call>
 struct Watched;
 
-template <class Result, class... Arguments, std::size_t number>
-struct Watched<Result(Arguments...), number> {
+template <class Result, class... Arguments, class Call>
+struct Watched<Result(Arguments...), Call> {
   static Result call(Arguments... arguments) {
-    static auto* const actual = real<Result(Arguments...)>(calls[number].name);
-    const std::string_view name = calls[number].name;
-    DWORD code = failure(calls[number]);
+    static auto* const actual = real<Result(Arguments...)>(Call::name);
+    const std::string_view name = Call::name;
+    DWORD code = failure<Call>();
     if (code == 0 && is_refused(name, arguments...)) code = ERROR_ACCESS_DENIED;
     if (script != nullptr) code = follow_script(name, arguments...);
     if (code != 0) {
@@ -144,21 +123,27 @@ std::string ScriptedCalls::log() const {
 #define IMPORTED_AS(name, pointer)                                                             \
   __attribute__((used)) auto* watched_##name asm("__imp_" #name) = &talutil::testing::pointer; \
   asm(".text\n.globl " #name "\n" #name ": jmp *__imp_" #name "(%rip)\n")
-#define WATCHED(name, number) IMPORTED_AS(name, Watched<decltype(name) COMMA number>::call)
+/// A function, and the codes that it can fail with, as documented.
+#define WATCHED(function, ...)                                           \
+  struct Watched##function {                                             \
+    static constexpr const char* name = #function;                       \
+    static constexpr std::initializer_list<DWORD> codes = {__VA_ARGS__}; \
+  };                                                                     \
+  IMPORTED_AS(function, Watched<decltype(function) COMMA Watched##function>::call)
 #define COMMA ,
 
-WATCHED(CreateFileW, 0);
-WATCHED(ReadFile, 1);
-WATCHED(WriteFile, 2);
-WATCHED(FlushFileBuffers, 3);
-WATCHED(MoveFileExW, 4);
-WATCHED(DeleteFileW, 5);
-WATCHED(CreateDirectoryW, 6);
-WATCHED(GetFileSizeEx, 7);
-WATCHED(SetFilePointerEx, 8);
-WATCHED(SetEndOfFile, 9);
-WATCHED(SetFileTime, 10);
-WATCHED(FindFirstFileW, 11);
-WATCHED(FindNextFileW, 12);
-WATCHED(LockFileEx, 13);
+WATCHED(CreateFileW, ERROR_ACCESS_DENIED, ERROR_TOO_MANY_OPEN_FILES, ERROR_SHARING_VIOLATION);
+WATCHED(ReadFile, ERROR_CRC, ERROR_LOCK_VIOLATION);
+WATCHED(WriteFile, ERROR_DISK_FULL, ERROR_WRITE_FAULT);
+WATCHED(FlushFileBuffers, ERROR_DISK_FULL, ERROR_IO_DEVICE);
+WATCHED(MoveFileExW, ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION, ERROR_IO_DEVICE);
+WATCHED(DeleteFileW, ERROR_ACCESS_DENIED, ERROR_SHARING_VIOLATION);
+WATCHED(CreateDirectoryW, ERROR_ACCESS_DENIED, ERROR_DISK_FULL);
+WATCHED(GetFileSizeEx, ERROR_IO_DEVICE);
+WATCHED(SetFilePointerEx, ERROR_IO_DEVICE);
+WATCHED(SetEndOfFile, ERROR_DISK_FULL);
+WATCHED(SetFileTime, ERROR_ACCESS_DENIED);
+WATCHED(FindFirstFileW, ERROR_ACCESS_DENIED, ERROR_NOT_READY);
+WATCHED(FindNextFileW, ERROR_IO_DEVICE);
+WATCHED(LockFileEx, ERROR_LOCK_VIOLATION, ERROR_NOT_SUPPORTED);
 IMPORTED_AS(Sleep, no_sleep);
