@@ -17,20 +17,25 @@ struct FailingCall {
   bool goes_on;              ///< Whether every later call fails as well, as with a disk that is gone.
   const Allowed allowed;
   std::size_t calls = 0;
-  std::string what = {};  ///< The name of the function that failed and how; empty if it has no such way of failing.
 
   static inline constinit FailingCall* present = nullptr;
 
   FailingCall(std::size_t call, std::size_t failure, bool all_fail, Allowed is_allowed)
       : number(call), way(failure), goes_on(all_fail), allowed(is_allowed) {
     present = this;
+    failed.clear();
   }
   FailingCall(const FailingCall&) = delete;
   FailingCall& operator=(const FailingCall&) = delete;
-  ~FailingCall() { present = nullptr; }
+  ~FailingCall() {
+    present = nullptr;
+    was_reached = calls > number;
+  }
 
-  /// Whether there was a call with that number.
-  [[nodiscard]] bool is_reached() const noexcept { return calls > number; }
+  /// Of the last one: whether there was a call with its number, and the name of the function that failed and how, which
+  /// is empty if that has no such way of failing.
+  static inline bool was_reached = false;
+  static inline std::string failed;
 
   /// Whether a call is refused whenever it is made.
   [[nodiscard]] static bool refuses(Allowed kind) noexcept { return present != nullptr && present->allowed == kind; }
@@ -53,7 +58,7 @@ Code failure(std::initializer_list<Code> codes, Code later, Describe describe) {
     return {};
   }
   const Code code = codes.begin()[failing->way];
-  failing->what = describe(code);
+  FailingCall::failed = describe(code);
   return code;
 }
 
