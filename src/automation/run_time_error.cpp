@@ -1,5 +1,7 @@
 #include "automation/run_time_error.hpp"
 
+#include <atomic>
+#include <memory>
 #include <new>
 #include <stdexcept>
 
@@ -65,8 +67,14 @@ RunTimeError::RunTimeError(std::int32_t number, Text description, std::optional<
 void raise(ErrorNumber number) { throw RunTimeError(number); }
 
 const RunTimeError& out_of_memory_error() {
-  static const RunTimeError error(ErrorNumber::out_of_memory);
-  return error;
+  // No static object: the run time's guard for one costs a tenth of the time in which the library starts. Two threads
+  // may both create it; one of the two is kept, and never released.
+  static std::atomic<const RunTimeError*> kept = nullptr;
+  const RunTimeError* error = kept.load(std::memory_order_acquire);
+  if (error != nullptr) return *error;
+  auto made = std::make_unique<RunTimeError>(ErrorNumber::out_of_memory);
+  if (kept.compare_exchange_strong(error, made.get(), std::memory_order_acq_rel)) error = made.release();
+  return *error;
 }
 
 RunTimeError current_error() noexcept {

@@ -7,20 +7,24 @@ namespace talutil::com {
 
 namespace {
 
-constexpr DWORD longest_path = 32768;
+/// Both ask for the size first, because there is usually nothing to read, and every start of the library looks.
+std::wstring file_in_environment() {
+  constexpr const wchar_t* name = L"TALUTIL_RECORD";
+  const DWORD size = GetEnvironmentVariableW(name, nullptr, 0);
+  std::wstring path(size, L'\0');
+  if (size != 0) path.resize(GetEnvironmentVariableW(name, path.data(), size));
+  return path;
+}
 
-/// The file's name in the environment, or else in the registry; empty if there is none.
-std::wstring chosen_file() {
-  std::wstring path(longest_path, L'\0');
-  const DWORD size = GetEnvironmentVariableW(L"TALUTIL_RECORD", path.data(), longest_path);
-  if (size != 0 && size < longest_path) {
-    path.resize(size);
-    return path;
-  }
-  DWORD bytes = longest_path * sizeof(wchar_t);
-  const LSTATUS status =
-      RegGetValueW(HKEY_CURRENT_USER, L"Software\\TALUtil", L"Record", RRF_RT_REG_SZ, nullptr, path.data(), &bytes);
-  path.resize(status == ERROR_SUCCESS && bytes >= sizeof(wchar_t) ? bytes / sizeof(wchar_t) - 1 : 0);
+std::wstring file_in_registry() {
+  DWORD bytes = 0;
+  const auto read = [&bytes](wchar_t* text) {
+    return RegGetValueW(HKEY_CURRENT_USER, L"Software\\TALUtil", L"Record", RRF_RT_REG_SZ, nullptr, text, &bytes);
+  };
+  if (read(nullptr) != ERROR_SUCCESS) return {};
+  std::wstring path(bytes / sizeof(wchar_t), L'\0');
+  const bool is_read = read(path.data()) == ERROR_SUCCESS && bytes >= sizeof(wchar_t);
+  path.resize(is_read ? bytes / sizeof(wchar_t) - 1 : 0);
   return path;
 }
 
@@ -28,7 +32,8 @@ std::wstring chosen_file() {
 
 std::unique_ptr<Recorder> Recorder::start() noexcept {
   try {
-    const std::wstring path = chosen_file();
+    std::wstring path = file_in_environment();
+    if (path.empty()) path = file_in_registry();
     if (path.empty()) return nullptr;
     // With this right alone, the system puts every write at the end, whichever process makes it.
     const HANDLE file =

@@ -35,9 +35,19 @@ bool is_elevated() noexcept {
 
 }  // namespace
 
+bool RegisteredControls::may_have_any() {
+  for (const HKEY root : {HKEY_CURRENT_USER, HKEY_LOCAL_MACHINE}) {
+    win32::Owned<win32::kind::RegistryKey> key;
+    // One that exists but cannot be opened is left to the look for each control.
+    if (RegOpenKeyExW(root, key_name, 0, KEY_QUERY_VALUE, key.receive()) != ERROR_FILE_NOT_FOUND) return true;
+  }
+  return false;
+}
+
 ObjectRef RegisteredControls::create(TextView class_name) {
   const Text name(class_name);
-  Text replacement = is_elevated() ? Text() : registered_class(HKEY_CURRENT_USER, name);
+  Text replacement = registered_class(HKEY_CURRENT_USER, name);
+  if (!replacement.empty() && is_elevated()) replacement.clear();
   if (replacement.empty()) replacement = registered_class(HKEY_LOCAL_MACHINE, name);
   if (replacement.empty()) return {};
 

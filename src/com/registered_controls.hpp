@@ -9,6 +9,7 @@ namespace talutil::com {
 /// program uses only the machine's key. Nothing else is ever created in place of our own controls.
 class RegisteredControls final : public ControlMakers {
  public:
+  bool may_have_any() override;
   ObjectRef create(TextView class_name) override;
 };
 

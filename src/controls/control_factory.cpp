@@ -40,6 +40,10 @@ constexpr struct {
 
 ObjectRef ControlFactory::create(TextView class_name) const {
   if (ObjectRef theirs = platform_.control_makers.create(class_name)) return theirs;
+  return create_own(class_name);
+}
+
+ObjectRef ControlFactory::create_own(TextView class_name) const {
   const auto* const own = std::ranges::find(makers, class_name, [](const auto& maker) { return maker.class_name; });
   if (own == std::end(makers)) raise(ErrorNumber::cannot_create_object);
   return own->make(platform_);

@@ -13,6 +13,9 @@ class ControlFactory {
   /// Creates a control. Raises 429 for an unknown class name.
   [[nodiscard]] ObjectRef create(TextView class_name) const;
 
+  /// Creates one of ours, whatever is registered in its place.
+  [[nodiscard]] ObjectRef create_own(TextView class_name) const;
+
  private:
   const Platform& platform_;
 };

@@ -35,9 +35,12 @@ void FrmComponents::load() {
   // next use tries again.
   auto window = platform_.form_windows.make_hidden(caption);
   Controls controls;
-  std::ranges::transform(places, controls.begin(),
-                         [this](const Place& place) { return factory_.create(place.class_name); });
-  const Locale locale = platform_.computer.locale();
+  const bool are_ours = !platform_.control_makers.may_have_any();
+  std::ranges::transform(places, controls.begin(), [&](const Place& place) {
+    return are_ours ? factory_.create_own(place.class_name) : factory_.create(place.class_name);
+  });
+  // Ours answer with texts, so that the user's separators need not be read yet.
+  const Locale locale = are_ours ? Locale{} : platform_.computer.locale();
   const Control dialog(controls[place_of(u"dlgSave2")], locale);
   dialog.put(u"DialogTitle", u"Save Data to File");
   dialog.put(u"Filter", u"Comma Delim Text File *.txt|*.txt|TAB Delim CSV|*.csv");

@@ -131,6 +131,10 @@ class ControlMakers {
  public:
   virtual ~ControlMakers() = default;
 
+  /// Whether the user may have registered third-party controls. Asked once before several are created, because most
+  /// users have none and looking for each takes time.
+  [[nodiscard]] virtual bool may_have_any() { return true; }
+
   /// Creates the third-party control that the user has registered for a class name; null if there is none. Raises 429
   /// if one is registered but cannot be created.
   [[nodiscard]] virtual ObjectRef create(TextView class_name) = 0;

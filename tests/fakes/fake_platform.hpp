@@ -56,6 +56,8 @@ struct FakePlatform : MessageBoxes,
   std::int32_t waits = 0;
   std::int32_t hourglasses = 0;  ///< Shown now.
 
+  bool has_registered_controls = true;
+
   // What is answered. A box without a scripted answer is one that the user closed.
   std::deque<MessageAnswer> answers;
   float twips_x = 15;
@@ -219,6 +221,7 @@ struct FakePlatform : MessageBoxes,
     for (std::uint8_t& byte : bytes) byte = static_cast<std::uint8_t>(random());
   }
 
+  bool may_have_any() override { return has_registered_controls; }
   ObjectRef create(TextView class_name) override {
     controls_asked_for.emplace_back(class_name);
     const auto found = controls.find(Text(class_name));

@@ -34,6 +34,20 @@ TEST_F(LibraryTest, StartUpLoadsTheComponentsWindowAndReadsTheScreen) {
   EXPECT_EQ(platform.controls_asked_for, in_order);
 }
 
+TEST_F(LibraryTest, StartUpLooksForNoControlsWhereNoneAreRegistered) {
+  platform.has_registered_controls = false;
+  library.start();
+  EXPECT_EQ(platform.controls_asked_for, std::vector<Text>{});
+  EXPECT_NE(library.components().control(u"ZipCtrl"), nullptr);
+  EXPECT_EQ(library.settings().ComputerName, u"FAKEPC");
+
+  // Registered since: the next load finds it.
+  platform.has_registered_controls = true;
+  utils.Terminate();
+  EXPECT_NE(library.components().control(u"ZipCtrl"), nullptr);
+  EXPECT_EQ(platform.controls_asked_for.size(), 7U);
+}
+
 TEST_F(LibraryTest, TerminateUnloadsTheWindowAndSpeaksOnlyInDebugMode1) {
   library.start();
   library.settings().DebugMode = -1;

@@ -15,6 +15,13 @@ Function user_function(const char* name) {
 
 }  // namespace
 
+int system_dots() noexcept {
+  // Loaded already, because windows need it; and no static variable, whose guard costs more than the look.
+  const auto of_system = reinterpret_cast<UINT(WINAPI*)()>(
+      reinterpret_cast<void*>(GetProcAddress(GetModuleHandleW(L"user32.dll"), "GetDpiForSystem")));
+  return of_system == nullptr ? 0 : static_cast<int>(of_system());
+}
+
 int dots_per_inch(HWND window) {
   static const auto of_window = user_function<UINT(WINAPI*)(HWND)>("GetDpiForWindow");
   if (of_window != nullptr) {

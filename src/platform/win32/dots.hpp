@@ -10,6 +10,10 @@ namespace talutil::win32 {
 
 constexpr UINT wm_dpi_changed = 0x02E0;  ///< WM_DPICHANGED, which the tool chain's headers have for later systems only.
 
+/// The system's dots per inch (GetDpiForSystem, from version 1607 of Windows 10 on) without a device context; 0 on
+/// earlier systems.
+[[nodiscard]] int system_dots() noexcept;
+
 /// The dots per inch of a window (GetDpiForWindow), or of the system.
 [[nodiscard]] int dots_per_inch(HWND window);
 

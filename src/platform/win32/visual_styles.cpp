@@ -6,7 +6,7 @@ namespace talutil::win32 {
 
 namespace {
 
-constexpr ULONG_PTR manifest_resource = 2;  // ISOLATIONAWARE_MANIFEST_RESOURCE_ID
+constexpr ULONG_PTR manifest_resource = 101;  // As in talutil.rc.
 
 /// One for the whole process and never released, since windows that were made in it may outlive any owner.
 HANDLE context() noexcept {

@@ -3,6 +3,7 @@
 #include <array>
 
 #include "automation/run_time_error.hpp"
+#include "platform/win32/dots.hpp"
 #include "platform/win32/handle.hpp"
 #include "platform/win32/module_path.hpp"
 #include "platform/win32/visual_styles.hpp"
@@ -21,7 +22,10 @@ Text host_title() {
 
 constexpr float twips_per_inch = 1440;
 
+/// Asks for the system's dots first: a device context connects the thread to the screen, which most scripts never need.
+/// The two agree, because the system scales both directions alike since it has that function.
 float twips_per_pixel(int capability) {
+  if (const int dots = system_dots(); dots != 0) return twips_per_inch / static_cast<float>(dots);
   const Owned<kind::WindowDevice> screen = device_of(nullptr);
   if (!screen) raise(ErrorNumber::internal_error);
   return twips_per_inch / static_cast<float>(GetDeviceCaps(screen.get(), capability));
