@@ -20,8 +20,8 @@ class FloatingPointSettings {
   FloatingPointSettings& operator=(const FloatingPointSettings&) = delete;
   ~FloatingPointSettings() {
     if (control_ != standard_control) {
-      // Otherwise exceptions raised while masked would be reported at the caller's next instruction.
-      __asm__ volatile("fnclex");
+      // Otherwise exceptions raised while masked would be reported at the next instruction of a caller that wants them.
+      if ((control_ & exception_masks) != exception_masks) __asm__ volatile("fnclex");
       set_control(control_);
     }
     if ((sse_control_ & ~sse_flags) != standard_sse_control) _mm_setcsr(sse_control_);
@@ -30,6 +30,7 @@ class FloatingPointSettings {
  private:
   // The values with which the system starts every thread.
   static constexpr std::uint16_t standard_control = 0x027F;
+  static constexpr std::uint16_t exception_masks = 0x3F;
   static constexpr std::uint32_t standard_sse_control = 0x1F80;
   static constexpr std::uint32_t sse_flags = 0x3F;  ///< Status flags rather than settings.
 

@@ -4,6 +4,7 @@
 #include <array>
 #include <optional>
 
+#include "com/argument_list.hpp"
 #include "com/boundary.hpp"
 #include "com/module.hpp"
 #include "com/recorder.hpp"
@@ -65,24 +66,27 @@ class Call {
     for (std::size_t i = 0; i < placement.count; ++i) {
       const int at = placement.argument[i];
       if (at < 0) {
-        arguments_[i].value = missing_argument;
+        arguments_.add([] { return missing_argument; });
         continue;
       }
       if (invocation.bad_argument != nullptr) *invocation.bad_argument = static_cast<UINT>(at);
-      arguments_[i].value = argument_value(member.parameters()[i], invocation.parameters->rgvarg[at], locale);
-      arguments_[i].same_variable_as = earlier_place_of(i, member);
+      Argument& added = arguments_.add(
+          [&] { return argument_value(member.parameters()[i], invocation.parameters->rgvarg[at], locale); });
+      added.same_variable_as = earlier_place_of(i, member);
     }
   }
 
-  [[nodiscard]] std::span<Argument> arguments() noexcept { return std::span(arguments_).first(placement_.count); }
+  [[nodiscard]] std::span<Argument> arguments() noexcept { return arguments_.all(); }
 
   void write_back() {
+    const std::span<Argument> all = arguments();
+    if (std::ranges::none_of(all, &Argument::is_changed)) return;
     std::array<std::optional<WriteBack>, most_parameters> changes;
-    for (std::size_t i = 0; i < placement_.count; ++i) {
-      if (!arguments_[i].is_changed || placement_.argument[i] < 0 || arguments_[i].same_variable_as >= 0) continue;
+    for (std::size_t i = 0; i < all.size(); ++i) {
+      if (!all[i].is_changed || placement_.argument[i] < 0 || all[i].same_variable_as >= 0) continue;
       const VARIANT& target = invocation_.parameters->rgvarg[placement_.argument[i]];
       const bool is_written = (V_VT(&target) & VT_BYREF) != 0 || system_time_of(target) != nullptr;
-      if (is_written) changes[i].emplace(target, arguments_[i].value, locale_);
+      if (is_written) changes[i].emplace(target, all[i].value, locale_);
     }
     for (auto& change : changes) {
       if (change) change->store();
@@ -108,7 +112,7 @@ class Call {
   const Invocation& invocation_;
   const Placement& placement_;
   const Locale& locale_;
-  std::array<Argument, most_parameters> arguments_;
+  ArgumentList arguments_;
 };
 
 HRESULT check_required(const Member& member, const Invocation& invocation, const Placement& placement) {

@@ -68,6 +68,9 @@ class Clock {
 
   /// The current local date and time, to the second.
   [[nodiscard]] virtual Date now() = 0;
+
+  /// The current local year, which every call of a member needs.
+  [[nodiscard]] virtual std::int32_t year() { return parts_of(now()).year; }
 };
 
 /// A window that is never shown. The destructor closes it.

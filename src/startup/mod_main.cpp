@@ -27,7 +27,7 @@ void Library::start() {
 
 Locale Library::locale() const {
   Locale locale = platform_.computer.locale();
-  locale.current_year = parts_of(platform_.clock.now()).year;
+  locale.current_year = platform_.clock.year();
   return locale;
 }
 

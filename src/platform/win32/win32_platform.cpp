@@ -120,6 +120,22 @@ Date Win32Clock::now() {
   return date_from_parts({now.wYear, now.wMonth, now.wDay, now.wHour, now.wMinute, now.wSecond}).value_or(Date{});
 }
 
+std::int32_t Win32Clock::year() {
+  // Found anew every second: the system takes longer to find the local time than a short member runs, while its counter
+  // is only a look into memory.
+  constexpr std::uint64_t milliseconds = 1000;
+  constexpr int year_bits = 16;
+  const std::uint64_t second = GetTickCount64() / milliseconds + 1;
+  std::uint64_t known = known_year_.load(std::memory_order_relaxed);
+  if (known >> year_bits != second) {
+    SYSTEMTIME now;
+    GetLocalTime(&now);
+    known = second << year_bits | now.wYear;
+    known_year_.store(known, std::memory_order_relaxed);
+  }
+  return static_cast<std::uint16_t>(known);
+}
+
 std::unique_ptr<HiddenWindow> Win32FormWindows::make_hidden(TextView caption) {
   return std::make_unique<DialogOwner>(caption);
 }

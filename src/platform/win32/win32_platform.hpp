@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <optional>
 
 #include "platform/platform.hpp"
@@ -44,6 +45,10 @@ class Win32Computer final : public Computer {
 class Win32Clock final : public Clock {
  public:
   Date now() override;
+  std::int32_t year() override;
+
+ private:
+  std::atomic<std::uint64_t> known_year_ = 0;  ///< The second in which it was found, and in the last 16 bits the year.
 };
 
 class Win32FormWindows final : public FormWindows {
