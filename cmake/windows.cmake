@@ -83,7 +83,8 @@ talutil_resources(TALUtil "TALUtil common toolkit" "#include \"${CMAKE_SOURCE_DI
 talutil_resources(printhelper "TALUtil print helper")
 set_source_files_properties(${generated}/TALUtil.rc PROPERTIES
                             OBJECT_DEPENDS "${generated}/TALUtil.tlb;${CMAKE_SOURCE_DIR}/src/com/talutil.rc")
-talutil_layer(com BELOW calling win32 FAST dispatch_object.cpp invoke.cpp variant_bridge.cpp write_back.cpp)
+talutil_layer(com BELOW calling win32
+              FAST dispatch_object.cpp early_call.cpp invoke.cpp variant_bridge.cpp write_back.cpp)
 add_library(TALUtil SHARED src/com/talutil.def ${generated}/TALUtil.rc ${generated}/talutil.h)
 set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
 target_link_libraries(TALUtil PRIVATE layer_com talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)

@@ -130,9 +130,4 @@ void RecordedCall::write(std::chrono::steady_clock::duration time) {
   recorder_.write(std::move(*record_).line(std::chrono::duration_cast<std::chrono::microseconds>(time).count()));
 }
 
-Variant recorded_use(Recorder& recorder, const void* identity, const Member& member,
-                     FunctionReference<std::vector<Argument>> arguments, FunctionReference<Variant> use) {
-  return recorded(&recorder, identity, member, arguments, use);
-}
-
 }  // namespace talutil::com

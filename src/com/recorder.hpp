@@ -98,21 +98,6 @@ class RecordedCall {
   std::chrono::steady_clock::time_point start_;
 };
 
-/// A function that somebody else owns. Unlike std::function, it takes no memory.
-template <class Result>
-class FunctionReference {
- public:
-  template <class Function>
-  FunctionReference(const Function& function) noexcept
-      : function_(&function), call_([](const void* held) { return Result((*static_cast<const Function*>(held))()); }) {}
-
-  Result operator()() const { return call_(function_); }
-
- private:
-  const void* function_;
-  Result (*call_)(const void* function);
-};
-
 /// Makes a call of one of our objects, recorded or not. `arguments` gives the arguments, before and after it.
 template <class Arguments, class Use>
 auto recorded(Recorder* recorder, const void* identity, const Member& member, const Arguments& arguments,
@@ -134,9 +119,5 @@ auto recorded(Recorder* recorder, const void* identity, const Member& member, co
     throw;
   }
 }
-
-/// Makes a recorded call: one function for all slots of the vtables.
-Variant recorded_use(Recorder& recorder, const void* identity, const Member& member,
-                     FunctionReference<std::vector<Argument>> arguments, FunctionReference<Variant> use);
 
 }  // namespace talutil::com
