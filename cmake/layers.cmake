@@ -57,7 +57,12 @@ talutil_layer(preview BELOW library)
 set(families text dates services forms preview)
 talutil_layer(infoforms BELOW forms)
 talutil_layer(startup BELOW ${families} infoforms)
-talutil_layer(calling BELOW startup FAST ALL)
+# The command answers millions of calls, the DLL only writes down those of a user who asked for it.
+if(WIN32)
+  talutil_layer(calling BELOW startup)
+else()
+  talutil_layer(calling BELOW startup FAST ALL)
+endif()
 
 add_library(talutil_core STATIC)
 target_link_libraries(talutil_core
