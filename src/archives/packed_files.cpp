@@ -7,11 +7,40 @@
 
 namespace talutil::archives {
 
-PackedFiles::PackedFiles(Collection& collection, std::int32_t level, Fault& fault, Progress& progress)
-    : collection_(collection), fault_(fault), progress_(progress) {
-  if (level == 0) return;
-  compressor_.reset(libdeflate_alloc_compressor(level));
-  if (!compressor_) throw std::bad_alloc();
+std::size_t Compressors::deflate(std::string_view bytes, std::span<char> output) {
+  Compressor compressor = take();
+  const std::size_t length =
+      libdeflate_deflate_compress(compressor.get(), bytes.data(), bytes.size(), output.data(), output.size());
+  const std::lock_guard lock(mutex_);
+  free_.push_back(std::move(compressor));
+  return length;
+}
+
+Compressors::Compressor Compressors::take() {
+  const std::lock_guard lock(mutex_);
+  if (free_.empty()) {
+    Compressor made(libdeflate_alloc_compressor(level_));
+    if (!made) throw std::bad_alloc();
+    return made;
+  }
+  Compressor compressor = std::move(free_.back());
+  free_.pop_back();
+  return compressor;
+}
+
+PackedFiles::PackedFiles(Collection& collection, std::int32_t level, Tasks& tasks, Fault& fault, Progress& progress)
+    : collection_(collection),
+      compresses_(level != 0),
+      compressors_(level),
+      tasks_(tasks),
+      fault_(fault),
+      progress_(progress) {}
+
+PackedFiles::~PackedFiles() {
+  is_over_ = true;
+  for (const Source& source : sources_) {
+    if (source.whole && source.whole->done.valid()) source.whole->done.wait();
+  }
 }
 
 time_t PackedFiles::storable_time(std::int64_t modified) noexcept {
@@ -22,14 +51,12 @@ time_t PackedFiles::storable_time(std::int64_t modified) noexcept {
 }
 
 zip_source_t* PackedFiles::source_of(const Item& item, zip_t* archive) {
-  Source& source = sources_.emplace_back(Source{.files = this, .item = &item, .error = {}});
+  Source& source = sources_.emplace_back(Source{.files = this, .item = &item, .number = sources_.size()});
   zip_error_init(&source.error);
   return zip_source_function(archive, &serve, &source);
 }
 
-bool PackedFiles::fits(const Item& item) const noexcept {
-  return compressor_ != nullptr && item.facts.size <= longest_in_memory;
-}
+bool PackedFiles::fits(const Item& item) const noexcept { return compresses_ && item.facts.size <= longest_in_memory; }
 
 zip_int64_t PackedFiles::serve(void* self, void* data, zip_uint64_t length, zip_source_cmd_t command) {
   auto* const source = static_cast<Source*>(self);
@@ -47,7 +74,7 @@ zip_int64_t PackedFiles::serve(Source& source, void* data, zip_uint64_t length, 
         return read(source, {static_cast<char*>(data), static_cast<std::size_t>(length)});
       });
     case ZIP_SOURCE_CLOSE:
-      close();
+      close(source);
       return 0;
     case ZIP_SOURCE_STAT:
       tell(source, *static_cast<zip_stat_t*>(data));
@@ -67,35 +94,80 @@ zip_int64_t PackedFiles::serve(Source& source, void* data, zip_uint64_t length, 
 void PackedFiles::open(Source& source) {
   place_ = 0;
   entry_ = from_utf8(source.item->entry);
-  file_ = collection_.folder_of(*source.item).open(source.item->name);
-  if (!fits(*source.item)) return;
-  // A file that is growing is packed up to the size it had when it was found.
-  bytes_.resize(static_cast<std::size_t>(source.item->facts.size));
-  bytes_.resize(file_->read_at(0, bytes_));
-  file_.reset();
+  if (!fits(*source.item)) {
+    file_ = collection_.folder_of(*source.item).open(source.item->name);
+    return;
+  }
+  next_ = std::max(next_, source.number);
+  begin_next();
+  if (!source.whole) begin(source);
+  Whole& whole = *source.whole;
+  whole.done.get();
   source.was_read = true;
-  source.size = bytes_.size();
-  source.checksum = libdeflate_crc32(0, bytes_.data(), bytes_.size());
-  packed_.resize(bytes_.size());
-  const std::size_t length =
-      libdeflate_deflate_compress(compressor_.get(), bytes_.data(), bytes_.size(), packed_.data(), packed_.size());
-  // Data that does not get smaller is stored.
-  source.is_packed = length > 0 && length < bytes_.size();
-  if (source.is_packed)
-    packed_.resize(length);
-  else
-    packed_.swap(bytes_);
+  source.size = whole.size;
+  source.checksum = whole.checksum;
+  source.is_packed = whole.is_packed;
 }
 
-void PackedFiles::close() noexcept {
+void PackedFiles::close(Source& source) noexcept {
   file_.reset();
-  bytes_.clear();
-  packed_.clear();
+  if (!source.whole) return;
+  source.whole.reset();
+  --begun_;
+  begun_bytes_ -= source.item->facts.size;
+}
+
+/// Begins as many of the next files as may be in memory and open at the same time.
+void PackedFiles::begin_next() {
+  constexpr std::size_t most_files = 64;
+  constexpr std::uint64_t most_bytes = 2 * longest_in_memory;
+  const std::size_t most = tasks_.at_once() == 1 ? 1 : std::min(most_files, 8 * tasks_.at_once());
+  for (; next_ < sources_.size() && begun_ < most; ++next_) {
+    Source& source = sources_[next_];
+    if (!fits(*source.item)) continue;
+    if (begun_ > 0 && begun_bytes_ + source.item->facts.size > most_bytes) return;
+    begin(source);
+  }
+}
+
+void PackedFiles::begin(Source& source) {
+  source.whole = std::make_unique<Whole>();
+  Whole& whole = *source.whole;
+  ++begun_;
+  begun_bytes_ += source.item->facts.size;
+  // Not this file but an earlier one is being written: what fails is reported when it is this one's turn.
+  try {
+    whole.file = collection_.folder_of(*source.item).open(source.item->name);
+    whole.done = tasks_.start([this, &whole, size = source.item->facts.size] { pack(whole, size); });
+  } catch (...) {
+    std::promise<void> failure;
+    failure.set_exception(std::current_exception());
+    whole.done = failure.get_future();
+  }
+}
+
+void PackedFiles::pack(Whole& whole, std::uint64_t size) {
+  if (is_over_) return;
+  // A file that is growing is packed up to the size it had when it was found.
+  whole.bytes.resize(static_cast<std::size_t>(size));
+  whole.bytes.resize(whole.file->read_at(0, whole.bytes));
+  whole.file.reset();
+  whole.size = whole.bytes.size();
+  whole.checksum = libdeflate_crc32(0, whole.bytes.data(), whole.bytes.size());
+  whole.packed.resize(whole.bytes.size());
+  const std::size_t length = compressors_.deflate(whole.bytes, whole.packed);
+  // Data that does not get smaller is stored.
+  whole.is_packed = length > 0 && length < whole.bytes.size();
+  if (whole.is_packed)
+    whole.packed.resize(length);
+  else
+    whole.packed.swap(whole.bytes);
+  whole.bytes = {};
 }
 
 zip_int64_t PackedFiles::read(Source& source, std::span<char> buffer) {
   if (source.was_read) {
-    const std::size_t count = packed_.copy(buffer.data(), buffer.size(), static_cast<std::size_t>(place_));
+    const std::size_t count = source.whole->packed.copy(buffer.data(), buffer.size(), static_cast<std::size_t>(place_));
     place_ += count;
     if (count == 0) progress_.advance(source.size, entry_);
     return static_cast<zip_int64_t>(count);

@@ -178,7 +178,9 @@ void pack(const Text& archive, TextView items, const PackingOptions& options, Fo
   progress.start(bytes_of(collection.items()));
   {
     Fault fault(Code::internal);
-    PackedFiles files(collection, options.level, fault, progress);
+    SerialTasks serial;
+    Tasks& tasks = options.tasks == nullptr ? serial : *options.tasks;
+    PackedFiles files(collection, options.level, tasks, fault, progress);
     Container container(*output, fault, progress);
     Packer(container, files, options).add_all(collection.items());
     if (!comment.empty() &&

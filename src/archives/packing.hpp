@@ -4,6 +4,7 @@
 
 #include "archives/progress.hpp"
 #include "platform/folders.hpp"
+#include "platform/tasks.hpp"
 
 namespace talutil::archives {
 
@@ -16,6 +17,7 @@ struct PackingOptions {
   Text comment{};                              ///< The archive's comment, as UTF-8.
   bool needs_every_item = false;               ///< Packs nothing if an item matches nothing.
   std::optional<std::uint64_t> volume_size{};  ///< Makes a split set.
+  Tasks* tasks = nullptr;                      ///< Compresses files; null for one after another, on this thread.
 };
 
 /// Packs the items of a list into an archive, creating it or adding to it: entries of the same name (ignoring case) are

@@ -13,6 +13,7 @@
 #include "cli/options.hpp"
 #include "cli/progress.hpp"
 #include "platform/posix/posix_platform.hpp"
+#include "platform/posix/thread_tasks.hpp"
 
 namespace talutil::cli {
 
@@ -222,6 +223,8 @@ int pack_archive(const ZipOptions& options) {
       entries = archive.count();
       changed = report_changed_names(archive, {}, true);
     };
+    posix::ThreadTasks tasks;
+    packing.tasks = &tasks;
     try {
       ProgressBar bar("packing");
       Progress progress = bar.progress();

@@ -1,0 +1,44 @@
+#include "platform/posix/thread_tasks.hpp"
+
+#include <algorithm>
+#include <utility>
+
+namespace talutil::posix {
+
+ThreadTasks::ThreadTasks(std::size_t count)
+    : count_(count != 0 ? count : std::max<std::size_t>(1, std::thread::hardware_concurrency())) {}
+
+ThreadTasks::~ThreadTasks() {
+  {
+    const std::lock_guard lock(mutex_);
+    is_over_ = true;
+  }
+  has_work_.notify_all();
+  for (std::thread& thread : threads_) thread.join();
+}
+
+std::future<void> ThreadTasks::start(std::function<void()> task) {
+  while (threads_.size() < count_) threads_.emplace_back([this] { run_all(); });
+  std::packaged_task<void()> work(std::move(task));
+  std::future<void> done = work.get_future();
+  {
+    const std::lock_guard lock(mutex_);
+    waiting_.push_back(std::move(work));
+  }
+  has_work_.notify_one();
+  return done;
+}
+
+void ThreadTasks::run_all() {
+  for (;;) {
+    std::unique_lock lock(mutex_);
+    has_work_.wait(lock, [this] { return is_over_ || !waiting_.empty(); });
+    if (waiting_.empty()) return;
+    std::packaged_task<void()> work = std::move(waiting_.front());
+    waiting_.pop_front();
+    lock.unlock();
+    work();
+  }
+}
+
+}  // namespace talutil::posix
