@@ -1,7 +1,6 @@
 #include "archives/destination.hpp"
 
 #include <algorithm>
-#include <span>
 
 #include "archives/file_errors.hpp"
 
@@ -90,6 +89,13 @@ Destination::Answer Destination::create(const std::vector<Text>& parts, bool ove
     file = open(*place).create(known.name);
     return Answer::made;
   });
+}
+
+bool Destination::has_written(const std::vector<Text>& parts) const {
+  const auto place = places_.find(folder_of(parts));
+  if (place == places_.end()) return false;
+  const auto known = place->second.entries.find(key_of(parts.back()));
+  return known != place->second.entries.end() && !known->second.written_as.empty();
 }
 
 bool Destination::make_folder(const std::vector<Text>& parts, const FileFacts& facts) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <span>
 #include <unordered_map>
 #include <vector>
 
@@ -20,6 +21,14 @@ class Destination {
   /// way, or a file that this run has written under a name that differs in case. Of several entries of one name the
   /// last one remains.
   [[nodiscard]] Answer create(const std::vector<Text>& parts, bool overwrite, std::unique_ptr<NewFile>& file);
+
+  /// Whether this run has created the file already. Writers of one file take turns, so it must have its name by then.
+  [[nodiscard]] bool has_written(const std::vector<Text>& parts) const;
+
+  /// The folder of a file as a key: the same for all files in it.
+  [[nodiscard]] Text folder_of(const std::vector<Text>& parts) const {
+    return key_of(std::span(parts).first(parts.size() - 1));
+  }
 
   /// Creates a folder and its parents. Returns false if a file or a link is in the way.
   bool make_folder(const std::vector<Text>& parts, const FileFacts& facts);

@@ -5,6 +5,12 @@
 
 namespace talutil::archives {
 
+/// Whether the failure of one entry leaves hope for those after it.
+[[nodiscard]] constexpr bool concerns_one_entry(Code code) noexcept {
+  return code == Code::bad_structure || code == Code::unexpected_end || code == Code::cannot_create ||
+         code == Code::incomplete;
+}
+
 /// Collects what an operation had to leave out while it went on with everything else, to report it at the end.
 class PassedOver {
  public:

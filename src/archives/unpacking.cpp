@@ -1,7 +1,5 @@
 #include "archives/unpacking.hpp"
 
-#include <libdeflate.h>
-
 #include <algorithm>
 #include <array>
 #include <limits>
@@ -16,6 +14,7 @@
 #include "archives/packed_files.hpp"
 #include "archives/passed_over.hpp"
 #include "archives/split_set.hpp"
+#include "archives/unpacked_files.hpp"
 #include "platform/file_names.hpp"
 
 namespace talutil::archives {
@@ -43,10 +42,6 @@ using Sink = std::function<void(std::string_view bytes)>;
 struct CloseEntry {
   void operator()(zip_file_t* file) const noexcept { zip_fclose(file); }
 };
-struct FreeDecompressor {
-  void operator()(libdeflate_decompressor* decompressor) const noexcept { libdeflate_free_decompressor(decompressor); }
-};
-
 /// Either the password was wrong or the entry is damaged: the traditional encryption cannot distinguish the two.
 struct WrongPassword {};
 
@@ -85,19 +80,20 @@ class Archive::Reader {
   /// Passes the bytes of an entry to a sink; throws if they are not the ones that were packed.
   void unpack(std::uint64_t index, const std::string& password, const Sink& sink) {
     const zip_stat_t status = status_of(index);
-    // Check this first: the container library leaks memory over an encryption that it does not know.
-    if (zip_encryption_method_supported(status.encryption_method, 0) == 0 ||
-        zip_compression_method_supported(status.comp_method, 0) == 0) {
-      throw Error(Code::incomplete, "its method of compression or encryption is not supported");
-    }
-    const bool in_memory = status.size <= PackedFiles::longest_in_memory &&
-                           status.comp_size <= PackedFiles::longest_in_memory && status.comp_method == ZIP_CM_DEFLATE &&
-                           status.size > 0;
+    require_known_methods(status);
+    const bool in_memory = fits(status);
     const Opened file = open(index, in_memory ? ZIP_FL_COMPRESSED : 0, password);
     if (in_memory)
-      unpack_whole(*file, status, sink);
+      inflaters_.inflate(read_whole(*file, status), sink);
     else
       unpack_by_pieces(*file, status, sink);
+  }
+
+  /// An entry that can be inflated as a whole and is not encrypted; nothing for another one.
+  [[nodiscard]] std::optional<Deflated> deflated(std::uint64_t index) {
+    const zip_stat_t status = status_of(index);
+    if (status.encryption_method != ZIP_EM_NONE || !fits(status)) return std::nullopt;
+    return read_whole(*open(index, ZIP_FL_COMPRESSED, {}), status);
   }
 
  private:
@@ -166,21 +162,28 @@ class Archive::Reader {
     return static_cast<std::size_t>(count);
   }
 
-  void unpack_whole(zip_file_t& file, const zip_stat_t& status, const Sink& sink) {
-    packed_.resize(static_cast<std::size_t>(status.comp_size) + 1);
-    std::size_t length = 0;
-    while (const std::size_t count = read(file, std::span(packed_).subspan(length))) length += count;
-    bytes_.resize(static_cast<std::size_t>(status.size));
-    if (!decompressor_) decompressor_.reset(libdeflate_alloc_decompressor());
-    if (!decompressor_) throw std::bad_alloc();
-    std::size_t made = 0;
-    const libdeflate_result result =
-        libdeflate_deflate_decompress(decompressor_.get(), packed_.data(), length, bytes_.data(), bytes_.size(), &made);
-    if (result != LIBDEFLATE_SUCCESS || made != bytes_.size()) throw Error(Code::bad_structure, "an entry is damaged");
-    if ((status.valid & ZIP_STAT_CRC) != 0 && libdeflate_crc32(0, bytes_.data(), bytes_.size()) != status.crc) {
-      throw Error(Code::bad_structure, "a checksum is wrong");
+  static void require_known_methods(const zip_stat_t& status) {
+    // Check this first: the container library leaks memory over an encryption that it does not know.
+    if (zip_encryption_method_supported(status.encryption_method, 0) == 0 ||
+        zip_compression_method_supported(status.comp_method, 0) == 0) {
+      throw Error(Code::incomplete, "its method of compression or encryption is not supported");
     }
-    sink(bytes_);
+  }
+
+  [[nodiscard]] static bool fits(const zip_stat_t& status) noexcept {
+    return status.size <= PackedFiles::longest_in_memory && status.comp_size <= PackedFiles::longest_in_memory &&
+           status.comp_method == ZIP_CM_DEFLATE && status.size > 0;
+  }
+
+  [[nodiscard]] Deflated read_whole(zip_file_t& file, const zip_stat_t& status) {
+    Deflated entry{.size = status.size};
+    if ((status.valid & ZIP_STAT_CRC) != 0) entry.checksum = status.crc;
+    // One byte more, to notice the end of the entry.
+    entry.bytes.resize(static_cast<std::size_t>(status.comp_size) + 1);
+    std::size_t length = 0;
+    while (const std::size_t count = read(file, std::span(entry.bytes).subspan(length))) length += count;
+    entry.bytes.resize(length);
+    return entry;
   }
 
   void unpack_by_pieces(zip_file_t& file, const zip_stat_t& status, const Sink& sink) {
@@ -198,8 +201,7 @@ class Archive::Reader {
   std::vector<bool> name_has_nul_;
   Fault fault_{Code::bad_structure};
   Container container_;
-  std::unique_ptr<libdeflate_decompressor, FreeDecompressor> decompressor_;
-  std::string packed_;
+  Inflaters inflaters_;
   std::string bytes_;
 };
 
@@ -254,12 +256,6 @@ void require_modest_size(std::uint64_t total, std::uint64_t archive_size, const 
   if (is_too_large || is_bomb) throw Error(Code::incomplete, "the archive would unpack to more than is allowed");
 }
 
-/// Whether a failure leaves hope for the entries after it.
-bool concerns_one_entry(Code code) noexcept {
-  return code == Code::bad_structure || code == Code::unexpected_end || code == Code::cannot_create ||
-         code == Code::incomplete;
-}
-
 /// Visits the selected entries, after checking that their total size is acceptable.
 template <class Visit>
 void for_each_entry(const Archive& archive, std::uint64_t archive_size, const UnpackingOptions& options,
@@ -298,54 +294,100 @@ Text Archive::comment() const {
   return comment == nullptr ? Text() : from_utf8(std::string_view(comment, static_cast<std::size_t>(length)));
 }
 
-void Archive::extract(const Text& destination, const UnpackingOptions& options, Folders& folders, Files& files,
-                      const PasswordQuestion& ask, Progress& progress) {
-  if (destination.empty()) throw Error(Code::bad_parameters, "there is no folder to unpack below");
-  Destination target(folders, files, destination);
-  Password password(options.password, ask);
-  PassedOver passed_over;
-  const auto pass_over = [&](const Text& name, const char* reason, Code code = Code::incomplete) {
-    passed_over.add(name, code, reason);
-    if (options.notice) options.notice(name, Fate::left_out, reason);
-  };
-  for_each_entry(*this, reader_->size(), options, progress, [&](std::uint64_t index, const Entry& entry) {
+/// One run of `extract`.
+class Archive::Extraction {
+ public:
+  Extraction(Archive& archive, const Text& destination, const UnpackingOptions& options, Folders& folders, Files& files,
+             const PasswordQuestion& ask, Progress& progress)
+      : archive_(archive),
+        reader_(*archive.reader_),
+        options_(options),
+        progress_(progress),
+        target_(folders, files, destination),
+        password_(options.password, ask),
+        written_(options.tasks == nullptr ? serial_ : *options.tasks, progress,
+                 [this](const Text& entry, const Error& error) { pass_over(entry, error.what(), error.code()); }) {}
+
+  void run() {
+    try {
+      for_each_entry(archive_, reader_.size(), options_, progress_,
+                     [this](std::uint64_t index, const Entry& entry) { unpack(index, entry); });
+    } catch (...) {
+      written_.settle();
+      throw;
+    }
+    written_.settle();
+    target_.finish_folders();
+    passed_over_.throw_if_any();
+  }
+
+ private:
+  void unpack(std::uint64_t index, const Entry& entry) {
     if (is_destination(entry.name)) return;
     auto parts = safe_parts(entry.name);
-    if (!parts) return pass_over(entry.name, "no file here can have this name");
-    if (entry.facts.kind == FileKind::link) return pass_over(entry.name, "links are not unpacked");
+    if (!parts) return pass_over_now(entry.name, "no file here can have this name");
+    if (entry.facts.kind == FileKind::link) return pass_over_now(entry.name, "links are not unpacked");
     // One bad entry is no reason to lose the others.
     try {
       if (entry.facts.kind == FileKind::folder) {
-        if (options.keep_folders && !target.make_folder(*parts, entry.facts)) {
-          pass_over(entry.name, "a file or a link is in its place");
+        if (options_.keep_folders && !target_.make_folder(*parts, entry.facts)) {
+          pass_over_now(entry.name, "a file or a link is in its place");
         }
         return;
       }
-      if (!options.keep_folders) parts->erase(parts->begin(), parts->end() - 1);
-      std::unique_ptr<NewFile> file;
-      const auto answer = target.create(*parts, options.overwrite, file);
-      if (answer == Destination::Answer::refused) pass_over(entry.name, "something else is in its place");
-      if (answer == Destination::Answer::kept && options.notice) options.notice(entry.name, Fate::kept, {});
-      if (answer != Destination::Answer::made) return;
-      password.with(entry, [&](const std::string& bytes) {
-        std::uint64_t place = 0;
-        reader_->unpack(index, bytes, [&](std::string_view piece) {
-          with_code(Code::cannot_write, [&] { file->write_at(place, piece); });
-          place += piece.size();
-          progress.advance(piece.size(), entry.name);
-        });
-      });
-      with_code(Code::cannot_create, [&] {
-        file->finish(&entry.facts);
-        file->take_name();
-      });
+      if (!options_.keep_folders) parts->erase(parts->begin(), parts->end() - 1);
+      unpack_file(index, entry, *parts);
     } catch (const Error& error) {
       if (!concerns_one_entry(error.code())) throw;
-      pass_over(entry.name, error.what(), error.code());
+      pass_over_now(entry.name, error.what(), error.code());
     }
-  });
-  target.finish_folders();
-  passed_over.throw_if_any();
+  }
+
+  void unpack_file(std::uint64_t index, const Entry& entry, const std::vector<Text>& parts) {
+    if (target_.has_written(parts)) written_.settle();
+    UnpackedFiles::File file{.entry = entry.name, .facts = entry.facts, .folder = target_.folder_of(parts)};
+    const auto answer = target_.create(parts, options_.overwrite, file.file);
+    if (answer == Destination::Answer::refused) pass_over_now(entry.name, "something else is in its place");
+    if (answer == Destination::Answer::kept && options_.notice) options_.notice(entry.name, Fate::kept, {});
+    if (answer != Destination::Answer::made) return;
+    if (auto deflated = reader_.deflated(index)) return written_.add(std::move(file), std::move(*deflated));
+    password_.with(entry, [&](const std::string& bytes) {
+      std::uint64_t place = 0;
+      reader_.unpack(index, bytes, [&](std::string_view piece) {
+        with_code(Code::cannot_write, [&] { file.file->write_at(place, piece); });
+        place += piece.size();
+        progress_.advance(piece.size(), entry.name);
+      });
+    });
+    written_.add(std::move(file));
+  }
+
+  void pass_over(const Text& name, const char* reason, Code code) {
+    passed_over_.add(name, code, reason);
+    if (options_.notice) options_.notice(name, Fate::left_out, reason);
+  }
+
+  /// Reports an entry after those before it.
+  void pass_over_now(const Text& name, const char* reason, Code code = Code::incomplete) {
+    written_.settle();
+    pass_over(name, reason, code);
+  }
+
+  Archive& archive_;
+  Reader& reader_;
+  const UnpackingOptions& options_;
+  Progress& progress_;
+  Destination target_;
+  Password password_;
+  PassedOver passed_over_;
+  SerialTasks serial_;
+  UnpackedFiles written_;
+};
+
+void Archive::extract(const Text& destination, const UnpackingOptions& options, Folders& folders, Files& files,
+                      const PasswordQuestion& ask, Progress& progress) {
+  if (destination.empty()) throw Error(Code::bad_parameters, "there is no folder to unpack below");
+  Extraction(*this, destination, options, folders, files, ask, progress).run();
 }
 
 void Archive::test(const UnpackingOptions& options, const PasswordQuestion& ask, Progress& progress) {

@@ -5,6 +5,7 @@
 
 #include "archives/progress.hpp"
 #include "platform/folders.hpp"
+#include "platform/tasks.hpp"
 
 namespace talutil::archives {
 
@@ -28,6 +29,7 @@ struct UnpackingOptions {
   std::uint64_t largest_total = 0;
   std::uint32_t largest_ratio = 1100;
   UnpackingNotice notice{};
+  Tasks* tasks = nullptr;  ///< Unpacks files; null for one after another, on this thread.
 };
 
 /// An archive, or a split set (given by its last volume), open for reading. Throws Error.
@@ -63,6 +65,7 @@ class Archive {
 
  private:
   class Reader;
+  class Extraction;
   std::unique_ptr<Reader> reader_;
 };
 

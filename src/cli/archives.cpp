@@ -265,6 +265,8 @@ void extract(const UnzipOptions& options, archives::Archive& archive, posix::Pos
     if (filter.matches(archives::parts_of(archive.entry(i).name))) ++remainder.chosen;
   }
   remainder.renamed = report_changed_names(archive, unpacking.items, unpacking.keep_folders);
+  posix::ThreadTasks tasks;
+  unpacking.tasks = &tasks;
   ProgressBar bar("unpacking");
   Progress progress = bar.progress();
   archive.extract(text_of(options.destination), unpacking, platform.folders, platform.files,

@@ -47,6 +47,7 @@ class NewFile : public StoredFile {
   /// The existing file to be replaced, open and locked against other writers; null if there is none.
   [[nodiscard]] virtual StoredFile* replaced() noexcept = 0;
 
+  /// May be called on another thread, but not at the same time as another function of the file.
   virtual void write_at(std::uint64_t offset, std::string_view bytes) = 0;
 
   /// Ends writing and reading. Sets the file's time, attributes and rights if facts are given.
@@ -56,6 +57,15 @@ class NewFile : public StoredFile {
   /// the existing file of that name cannot be replaced.
   virtual void take_name(TextView other_name) = 0;
   void take_name() { take_name({}); }
+
+  /// `take_name` in steps, so that those of many files can be done together, which the disk has less work with:
+  /// flushing the contents, taking the original name, and flushing the names of the folder. Until the last one, which
+  /// holds for all files of the folder, a power cut may undo the one before. Flushing may begin early, on any thread,
+  /// like writing.
+  virtual void begin_flush() noexcept = 0;
+  virtual void flush_contents() = 0;
+  virtual void take_name_unflushed() = 0;
+  virtual void flush_names() noexcept = 0;
 };
 
 /// An open folder. Names are exact and refer to direct entries of this folder only. Opening raises the same errors as

@@ -1,5 +1,6 @@
 #include "tests/faults/operations.hpp"
 
+#include "archives/unpacking.hpp"
 #include "controls/grid.hpp"
 
 namespace talutil::testing {
@@ -70,6 +71,25 @@ void write_report(Host& host) {
   host.utils.GridPrintPreview(100, 1, u"Sales", u"", ObjectRef(grid), {}, {}, u"SalesReport");
 }
 
+/// Runs tasks as one thread does, but lets files be finished together, as with threads.
+struct WideTasks final : Tasks {
+  [[nodiscard]] std::size_t at_once() const noexcept override { return 4; }
+  [[nodiscard]] std::future<void> start(std::function<void()> task) override { return serial.start(std::move(task)); }
+  SerialTasks serial;
+};
+
+void unpack_together(Host& host) {
+  WideTasks tasks;
+  archives::Progress progress;
+  try {
+    archives::Archive archive(host.path(u"a.zip"), host.real->folders());
+    archive.extract(host.path(u"out"), {.overwrite = true, .tasks = &tasks}, host.real->folders(), host.real->files(),
+                    {}, progress);
+  } catch (const archives::Error& error) {
+    throw RunTimeError(ErrorNumber::device_io_error, from_utf8(error.what()));
+  }
+}
+
 void nothing(Host& /*host*/) {}
 
 }  // namespace
@@ -115,6 +135,14 @@ const std::vector<Operation>& operations() {
            save(host, host.path(u"out\\one.txt"), u"old");
          },
          [](Host& host) { host.utils.CallUnZIPFiles(host.path(u"a.zip"), host.path(u"out\\"), u"", Boolean(true)); }},
+        {"Unpacking several files together", Promise::whole,
+         [](Host& host) {
+           make_data(host);
+           zip(host, host.path(u"data\\*.*"));
+           host.utils.VerifyFilePath(host.path(u"out\\"));
+           save(host, host.path(u"out\\one.txt"), u"old");
+         },
+         &unpack_together},
         {"ExportGridData", Promise::silent, [](Host& host) { report(host, u"old"); },
          [](Host& host) { report(host, u"new"); }},
         {"VerifyFilePath", Promise::silent, nothing,

@@ -112,6 +112,10 @@ class PosixNewFile final : public NewFile {
     else
       replacement_.take_name(to_utf8(other_name));
   }
+  void begin_flush() noexcept override { replacement_.begin_flush(); }
+  void flush_contents() override { replacement_.flush_contents(); }
+  void take_name_unflushed() override { replacement_.take_name_unflushed(); }
+  void flush_names() noexcept override { replacement_.flush_names(); }
 
  private:
   Replacement replacement_;

@@ -120,15 +120,33 @@ void Replacement::keep_rights() const {
 }
 
 void Replacement::take_name(const std::string& name) {
+  flush_contents();
+  rename(name);
+  flush_names();
+}
+
+void Replacement::begin_flush() const noexcept {
+  static_cast<void>(sync_file_range(file_.get(), 0, 0, SYNC_FILE_RANGE_WRITE));
+}
+
+void Replacement::flush_contents() const {
+  // What is written in place is flushed there.
+  if (!is_elsewhere_) flush(file_);
+}
+
+void Replacement::rename(const std::string& name) {
   if (is_elsewhere_) return overwrite_target();
-  flush(file_);
   if (renameat(folder_.get(), temporary_.c_str(), folder_.get(), name.c_str()) != 0) {
     if (!is_forbidden(errno) || target_.get() < 0 || name != name_) raise_for(errno, {});
     return overwrite_target();
   }
   temporary_.clear();
+  is_renamed_ = true;
+}
+
+void Replacement::flush_names() const noexcept {
   // Without this, a power cut could undo the renaming.
-  flush_folder(folder_);
+  if (is_renamed_) flush_folder(folder_);
 }
 
 /// The one step that is not atomic: for targets that this user may write, in folders where files cannot be replaced. If

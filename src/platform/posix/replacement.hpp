@@ -38,11 +38,20 @@ class Replacement {
   void take_name(const std::string& name);
   void take_name() { take_name(name_); }
 
+  /// Begins to write the new version to the disk, without waiting for it.
+  void begin_flush() const noexcept;
+
+  /// The three steps of take_name; see NewFile.
+  void flush_contents() const;
+  void take_name_unflushed() { rename(name_); }
+  void flush_names() const noexcept;
+
   /// Removes the temporary file unless it has got its name.
   void discard() noexcept;
 
  private:
   [[nodiscard]] int open_temporary();
+  void rename(const std::string& name);
   void open_target(int access);
   void overwrite_target();
   void copy_to_target() const;
@@ -51,6 +60,7 @@ class Replacement {
   std::string name_;
   std::string temporary_;      ///< Empty once it has got its name.
   bool is_elsewhere_ = false;  ///< Whether the temporary file is in another folder; its name is a full path then.
+  bool is_renamed_ = false;
   Descriptor file_;
   Descriptor target_;
 };

@@ -85,6 +85,11 @@ class Win32NewFile final : public NewFile {
     replacement_.take_name(other_name.empty() ? name_ : Text(other_name), attributes_, replaces,
                            Replacement::Keep::nothing);
   }
+  // The system renames through to the disk, and only what is closed.
+  void begin_flush() noexcept override {}
+  void flush_contents() override {}
+  void take_name_unflushed() override { take_name({}); }
+  void flush_names() noexcept override {}
 
  private:
   /// Writers of one file take turns, from before they open the old version until the new one has its name: in between,
