@@ -1,9 +1,11 @@
 #!/usr/bin/env bash
-# Compares archives with zip and unzip: bench/archives.sh PATH_TO_TALUTIL [large]
+# Compares archives with other programs: bench/archives.sh PATH_TO_TALUTIL [large | lines]
 # Packs and unpacks 200 MB of mixed files from this machine, three times each, alternating, and prints the ratios of the
-# best times, the sizes and the peak memory. With "large", also does so for 70,000 files and for one of 5 GB.
+# best times, the sizes and the peak memory: against zip and unzip, and against 7z with all processors. With "large", also
+# does so for 70,000 files and for one of 5 GB. With "lines", prints instead, for archives of 10 to 100,000 entries, lines
+# of NAME, SIZE and SECONDS with tabs between them.
 set -euo pipefail
-[ -x "${1:-}" ] || { echo "usage: bench/archives.sh PATH_TO_TALUTIL [large]" >&2; exit 2; }
+[ -x "${1:-}" ] || { echo "usage: bench/archives.sh PATH_TO_TALUTIL [large | lines]" >&2; exit 2; }
 talutil=$(realpath "$1")
 work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
@@ -22,38 +24,78 @@ make_tree() {
 measure() { /usr/bin/env python3 - "$@" <<'P'
 import os, resource, subprocess, sys, time
 begin = time.monotonic()
-subprocess.run(sys.argv[1:], check=True, stdout=subprocess.DEVNULL)
-print(f"{time.monotonic() - begin:.2f} {resource.getrusage(resource.RUSAGE_CHILDREN).ru_maxrss}")
+subprocess.run(sys.argv[1:], check=True, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
+print(f"{time.monotonic() - begin:.3f} {resource.getrusage(resource.RUSAGE_CHILDREN).ru_maxrss}")
 P
 }
 
 least() { sort -n | head -1; }
 
-compare() {  # WORD, ours, theirs: files of measurements
+# Cost against size, the best of three times.
+print_lines() {
+  local count
+  for count in 10 100 1000 10000 100000; do
+    mkdir many
+    (cd many && awk -v count="$count" 'BEGIN {
+      for (i = 1; i <= count; ++i) {
+        name = sprintf("f%06d", i)
+        for (line = 0; line < 20; ++line) print "line", line, "of", name, i * line >name
+        close(name)
+      }
+    }')
+    for _ in 1 2 3; do
+      rm -rf many.zip out
+      measure "$talutil" zip many.zip many >>pack.times
+      measure "$talutil" zip --test many.zip many >>test.times
+      measure "$talutil" unzip many.zip --to out >>unpack.times
+    done
+    for name in pack test unpack; do
+      printf '%s\t%s\t%s\n' "$name" "$count" "$(least <$name.times | cut -d' ' -f1)"
+    done
+    rm -rf many ./*.times
+  done
+}
+
+if [ "${2:-}" = lines ]; then
+  print_lines
+  exit 0
+fi
+
+compare() {  # WHAT, GOAL, ours, theirs: files of measurements
   local ours theirs
-  ours=$(least <"$2")
-  theirs=$(least <"$3")
-  printf '%s: %s s, theirs %s s, ratio %s; peak memory %s KB\n' "$1" "${ours% *}" "${theirs% *}" \
-    "$(awk "BEGIN { printf \"%.2f\", ${ours% *} / ${theirs% *} }")" "${ours#* }"
+  ours=$(least <"$3")
+  theirs=$(least <"$4")
+  printf '%s: %s s, theirs %s s, ratio %s (goal: at most %s); peak memory %s KB\n' "$1" "${ours% *}" "${theirs% *}" \
+    "$(awk "BEGIN { printf \"%.2f\", ${ours% *} / ${theirs% *} }")" "$2" "${ours#* }"
+}
+
+compare_sizes() {  # WHAT, ours, theirs
+  printf '%s: %s bytes, theirs %s, ratio %s\n' "$1" "$(stat -c %s "$2")" "$(stat -c %s "$3")" \
+    "$(awk "BEGIN { printf \"%.3f\", $(stat -c %s "$2") / $(stat -c %s "$3") }")"
 }
 
 make_tree
-printf 'tree: %s files, %s MB\n' "$(find tree -type f | wc -l)" "$(du -sm --apparent-size tree | cut -f1)"
+printf 'tree: %s files, %s MB; %s processors\n' "$(find tree -type f | wc -l)" "$(du -sm --apparent-size tree | cut -f1)" \
+  "$(nproc)"
 for _ in 1 2 3; do
-  rm -rf ours.zip theirs.zip ours theirs
+  rm -rf ./*.zip ours theirs seven
   measure zip -6 -q -r theirs.zip tree >>zip.times
   measure "$talutil" zip ours.zip tree >>pack.times
+  measure 7z a -tzip -mx=1 seven.zip tree >>7z-a.times
   measure unzip -q theirs.zip -d theirs >>unzip.times
   measure "$talutil" unzip ours.zip --to ours >>unpack.times
+  measure 7z x -oseven ours.zip >>7z-x.times
 done
-compare "packing" pack.times zip.times
-compare "unpacking" unpack.times unzip.times
-printf 'size: %s bytes, theirs %s, ratio %s\n' "$(stat -c %s ours.zip)" "$(stat -c %s theirs.zip)" \
-  "$(awk "BEGIN { printf \"%.3f\", $(stat -c %s ours.zip) / $(stat -c %s theirs.zip) }")"
+compare "packing, against zip -6" 1.0 pack.times zip.times
+compare "packing, against 7z -mx=1" 1.0 pack.times 7z-a.times
+compare "unpacking, against unzip" 0.35 unpack.times unzip.times
+compare "unpacking, against 7z" 1.0 unpack.times 7z-x.times
+compare_sizes "size, against zip -6" ours.zip theirs.zip
+compare_sizes "size, against 7z -mx=1" ours.zip seven.zip
 diff -r tree ours/tree && echo "unpacked as it was"
 [ "${2:-}" = large ] || exit 0
 
-rm -rf tree ours theirs ./*.zip
+rm -rf tree ours theirs seven ./*.zip
 mkdir -p many
 (cd many && seq -f 'f%06.0f' 1 70000 | xargs touch)
 printf '70,000 files: packed in %s (seconds, KB)' "$(measure "$talutil" zip many.zip many)"
