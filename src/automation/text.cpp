@@ -1,5 +1,7 @@
 #include "automation/text.hpp"
 
+#include <algorithm>
+
 namespace talutil {
 
 namespace {
@@ -9,7 +11,20 @@ constexpr char32_t replacement = 0xFFFD;
 constexpr bool is_high_surrogate(char32_t unit) noexcept { return unit >= 0xD800 && unit <= 0xDBFF; }
 constexpr bool is_low_surrogate(char32_t unit) noexcept { return unit >= 0xDC00 && unit <= 0xDFFF; }
 
-void append_utf8(std::string& out, char32_t code) {
+/// How many characters below 128 a text begins with. The inner loop is vectorised.
+std::size_t ascii_length(TextView text) noexcept {
+  constexpr std::size_t block_length = 16;
+  std::size_t at = 0;
+  for (; at + block_length <= text.size(); at += block_length) {
+    char16_t all = 0;
+    for (std::size_t i = 0; i < block_length; ++i) all |= text[at + i];
+    if (all >= 0x80) break;
+  }
+  while (at < text.size() && text[at] < 0x80) ++at;
+  return at;
+}
+
+void append_code_point(std::string& out, char32_t code) {
   const auto continuation = [code](int shift) { return static_cast<char>(0x80 | ((code >> shift) & 0x3F)); };
   if (code < 0x80) {
     out += static_cast<char>(code);
@@ -28,7 +43,7 @@ void append_utf8(std::string& out, char32_t code) {
   }
 }
 
-void append_utf16(Text& out, char32_t code) {
+void append_code_point(Text& out, char32_t code) {
   if (code < 0x10000) {
     out += static_cast<char16_t>(code);
     return;
@@ -70,7 +85,20 @@ char32_t next_code(std::string_view bytes, std::size_t& at) noexcept {
 
 }  // namespace
 
-TextView up_to_nul(TextView text) noexcept { return text.substr(0, text.find(u'\0')); }
+std::size_t find_unit(TextView text, char16_t wanted, std::size_t from) noexcept {
+  // Most blocks do not have it. The compiler vectorises the loop over a block, whose length it knows.
+  constexpr std::size_t block_length = 32;
+  for (; from + block_length <= text.size(); from += block_length) {
+    const char16_t* const block = text.data() + from;
+    char16_t matches = 0;
+    for (std::size_t i = 0; i < block_length; ++i) matches |= static_cast<char16_t>(block[i] == wanted ? 1 : 0);
+    if (matches != 0) break;
+  }
+  while (from < text.size() && text[from] != wanted) ++from;
+  return std::min(from, text.size());
+}
+
+TextView up_to_nul(TextView text) noexcept { return text.substr(0, find_unit(text, u'\0')); }
 
 TextView trim_blanks(TextView text) noexcept {
   const std::size_t first = text.find_first_not_of(u' ');
@@ -84,25 +112,35 @@ bool is_white_space(char16_t unit) noexcept {
   return unit == 0x85 || (unit >= 0x2000 && unit <= 0x200A) || others.find(unit) != TextView::npos;
 }
 
-std::string to_utf8(TextView text) {
-  std::string out;
-  out.reserve(text.size());
+void append_utf8(std::string& bytes, TextView text) {
   for (std::size_t i = 0; i < text.size(); ++i) {
+    const std::size_t run = ascii_length(text.substr(i));
+    const std::size_t start = bytes.size();
+    bytes.resize(start + run);
+    for (std::size_t k = 0; k < run; ++k) bytes[start + k] = static_cast<char>(text[i + k]);
+    i += run;
+    if (i == text.size()) return;
     char32_t code = text[i];
     if (is_high_surrogate(code) && i + 1 < text.size() && is_low_surrogate(text[i + 1])) {
       code = 0x10000 + ((code - 0xD800) << 10) + (text[++i] - 0xDC00U);
     } else if (is_high_surrogate(code) || is_low_surrogate(code)) {
       code = replacement;
     }
-    append_utf8(out, code);
+    append_code_point(bytes, code);
   }
-  return out;
+}
+
+std::string to_utf8(TextView text) {
+  std::string bytes;
+  bytes.reserve(text.size());
+  append_utf8(bytes, text);
+  return bytes;
 }
 
 Text from_utf8(std::string_view bytes) {
   Text out;
   out.reserve(bytes.size());
-  for (std::size_t at = 0; at < bytes.size();) append_utf16(out, next_code(bytes, at));
+  for (std::size_t at = 0; at < bytes.size();) append_code_point(out, next_code(bytes, at));
   return out;
 }
 

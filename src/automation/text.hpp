@@ -16,6 +16,10 @@ using TextView = std::u16string_view;
 /// The text before its first NUL, as a C string of the platform would hold it.
 [[nodiscard]] TextView up_to_nul(TextView text) noexcept;
 
+/// The index of a code unit at or after `from`; the text's size if there is none. In long texts, many times as fast as
+/// the standard library's search.
+[[nodiscard]] std::size_t find_unit(TextView text, char16_t wanted, std::size_t from = 0) noexcept;
+
 /// Blanks, tabs, line breaks and similar characters beyond ASCII, which conversions from text skip at both ends.
 [[nodiscard]] bool is_white_space(char16_t unit) noexcept;
 
@@ -52,6 +56,7 @@ void append_ansi(Text& text, std::string_view bytes);
 
 /// UTF-8 for our command line, logs and messages. Lone surrogates and invalid bytes become U+FFFD.
 [[nodiscard]] std::string to_utf8(TextView text);
+void append_utf8(std::string& bytes, TextView text);
 [[nodiscard]] Text from_utf8(std::string_view bytes);
 
 /// Conversion of code units to bytes, low byte first, and back; an odd byte at the end is ignored.
