@@ -1,11 +1,15 @@
+#include <algorithm>
 #include <cstdint>
-#include <utility>
+#include <optional>
+#include <typeinfo>
 #include <vector>
 
 #include "automation/checked.hpp"
 #include "automation/text.hpp"
+#include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "text/characters.hpp"
+#include "text/forbidden_characters.hpp"
 
 namespace talutil {
 
@@ -17,17 +21,6 @@ constexpr TextView drop_mark = u"$*$";  ///< The hosts' mark for lines that are 
 constexpr std::size_t most_lines = 3;
 constexpr std::size_t joinable_length = 40;
 constexpr std::size_t joined_length = 73;
-
-struct Replacement {
-  TextView from;
-  TextView to;
-};
-
-/// Characters that would end a quoted database text, or that hosts use as separators. The order matters: each step
-/// works on the result of the previous one.
-constexpr Replacement forbidden[] = {
-    {u"&", u"and"}, {u"\"", u""}, {u"'", u"\u00B4"}, {u"\t", u""}, {u"#", u""}, {u">", u""}, {u"<", u""}, {u"?", u""},
-};
 
 /// Single passes, not repeated: four blanks end up as two, five as one. Line feeds have already been replaced, so the
 /// rows with line breaks find nothing; they are kept because hosts that override a member see these calls.
@@ -58,62 +51,113 @@ Text drop_marked_lines(TextView text) {
   return result;
 }
 
-/// Joins line `last` with the one before it if both are short enough, and empties the latter.
-Text join_short_lines(std::vector<TextView>& lines, std::size_t last) {
-  const TextView line = lines[last];
-  if (last == 0 || line.size() >= joinable_length) return Text(line);
-  TextView& before = lines[last - 1];
-  if (before.empty() || line.size() + before.size() >= joined_length) return Text(line);
-  Text joined = Text(before).append(u" - ").append(line);
-  before = {};
-  return joined;
+/// The lines of a text from the last to the first, trimmed; marked ones are empty.
+class LinesFromEnd {
+ public:
+  explicit LinesFromEnd(TextView text) noexcept : rest_(text) {}
+
+  /// Nothing if there are no more.
+  std::optional<TextView> next() noexcept {
+    if (is_over_) return std::nullopt;
+    const std::size_t end = rest_.rfind(line_break);
+    is_over_ = end == TextView::npos;
+    const TextView line = is_over_ ? rest_ : rest_.substr(end + line_break.size());
+    if (!is_over_) rest_ = rest_.substr(0, end);
+    return is_marked(line) ? TextView() : trim_blanks(line);
+  }
+
+ private:
+  TextView rest_;
+  bool is_over_ = false;
+};
+
+constexpr bool can_join(TextView before, TextView line) noexcept {
+  return !before.empty() && line.size() < joinable_length && line.size() + before.size() < joined_length;
 }
 
 /// Keeps the last three non-empty lines, after joining short neighbours, starting at the end.
 Text compress_lines(TextView text) {
-  std::vector<TextView> lines = split_lines(text);
-  for (TextView& line : lines) line = is_marked(line) ? TextView() : trim_blanks(line);
-
-  std::vector<Text> kept_from_last;
-  for (std::size_t i = lines.size(); i-- > 0 && kept_from_last.size() < most_lines;) {
-    if (!lines[i].empty()) kept_from_last.push_back(join_short_lines(lines, i));
-  }
-
+  LinesFromEnd lines(text);
   Text result;
-  for (auto line = kept_from_last.rbegin(); line != kept_from_last.rend(); ++line) {
-    result.append(*line).append(line_break);
+  std::size_t kept = 0;
+  for (auto line = lines.next(); line && kept < most_lines;) {
+    auto before = lines.next();
+    if (!line->empty()) {
+      Text whole = Text(*line).append(line_break);
+      if (before && can_join(*before, *line)) {
+        whole = Text(*before).append(u" - ").append(whole);
+        before = TextView();
+      }
+      result.insert(0, whole);
+      ++kept;
+    }
+    line = before;
   }
   return result;
 }
 
-/// A value as text, trimmed. Avoids another copy of a text, which can be long.
-Text trimmed_text(Variant value, const Locale& locale) {
-  Text* const held = value.get_if<Text>();
-  Text text = held != nullptr ? std::move(*held) : value.to_text(locale);
-  const TextView trimmed = trim_blanks(text);
-  return trimmed.size() == text.size() ? text : Text(trimmed);
+/// A value to be cleaned, or that of an object's default member. Refers to a text, which can be long, where it is.
+class GivenValue {
+ public:
+  explicit GivenValue(const Variant& given) : is_object_(given.is(Variant::Kind::object)), given_(given) {
+    if (is_object_) value_ = given.value();
+  }
+
+  [[nodiscard]] bool is_null() const { return held().is(Variant::Kind::null); }
+
+  /// Raises 13 if the value has no text form.
+  [[nodiscard]] const Text& text(const ORVUtils& utils) {
+    if (const Text* const text = held().get_if<Text>()) return *text;
+    text_ = held().to_text(utils.locale());
+    return text_;
+  }
+
+ private:
+  [[nodiscard]] const Variant& held() const { return is_object_ ? value_ : given_; }
+
+  bool is_object_;
+  const Variant& given_;
+  Variant value_;
+  Text text_;
+};
+
+/// Only a derived class can override a member and so see which others a member calls.
+bool may_see_calls(const ORVUtils& utils) noexcept { return typeid(utils) != typeid(ORVUtils); }
+
+constexpr bool drops_commas(std::int16_t extras) noexcept { return extras == 1 || extras == 3; }
+constexpr bool drops_blanks(std::int16_t extras) noexcept { return extras == 2 || extras == 3; }
+
+/// The same as `without_forbidden`, by calling other members.
+Text replaced_by_members(ORVUtils& utils, TextView text, std::int16_t extras) {
+  Text s = utils.StripNulls(Text(text));
+  const auto apply = [&](const Replacement& step) { s = utils.StringReplace(s, Text(step.from), Text(step.to)); };
+  for (const Replacement& step : forbidden) apply(step);
+  if (drops_commas(extras)) apply(comma_removal);
+  if (drops_blanks(extras)) apply(blank_removal);
+  return s;
 }
 
-/// The additional cleaning that a field asks for.
-Text clean_extras(ORVUtils& utils, Text s, std::int16_t extras) {
-  if (extras == 1 || extras == 3) s = utils.StringReplace(s, u",", u"");
-  if (extras == 2 || extras == 3) s = utils.StringReplace(s, u" ", u"");
-  if (extras == 4) return compress_lines(s);
-  if (extras == 5) return drop_marked_lines(s);
-  return s;
+/// Two blanks or two carriage returns: what every run begins with in a text without line feeds.
+bool has_run(TextView text) noexcept {
+  const auto is_start = [](char16_t a, char16_t b) { return a == b && (a == u' ' || a == u'\r'); };
+  return std::ranges::adjacent_find(text, is_start) != text.end();
 }
 
 }  // namespace
 
 Text ORVUtils::VerifyTextData(const std::int16_t& iMaxTextLength, const std::int16_t& iExtras, const Variant& vData) {
   settings().CounterVerifyText = checked_add(settings().CounterVerifyText, 1);
-  Variant value = vData.value();
-  const Locale here = locale();
-  if (value.is_null() || value.equals_text(u"", here)) return {};
+  GivenValue value(vData);
+  if (value.is_null()) return {};
+  const Text& given = value.text(*this);
+  if (given.empty()) return {};
 
-  Text s = StripNulls(trimmed_text(std::move(value), here));
-  for (const Replacement& step : forbidden) s = StringReplace(s, Text(step.from), Text(step.to));
-  s = clean_extras(*this, std::move(s), iExtras);
+  const TextView trimmed = trim_blanks(given);
+  Text s = may_see_calls(*this) ? replaced_by_members(*this, trimmed, iExtras)
+                                : without_forbidden(library_.platform().code_page, up_to_nul(trimmed),
+                                                    drops_commas(iExtras), drops_blanks(iExtras));
+  if (iExtras == 4) s = compress_lines(s);
+  if (iExtras == 5) s = drop_marked_lines(s);
 
   // This may cut a line break or a joined line in half; fields have always been cut this way.
   if (iMaxTextLength > 0 && s.size() > static_cast<std::size_t>(iMaxTextLength)) {
@@ -124,14 +168,15 @@ Text ORVUtils::VerifyTextData(const std::int16_t& iMaxTextLength, const std::int
 
 Text ORVUtils::VerifyIntData(const std::int16_t& iFlag, const Variant& vData) {
   settings().CounterVerifyInt = checked_add(settings().CounterVerifyInt, 1);
-  const Variant value = vData.value();
+  GivenValue value(vData);
   if (value.is_null()) return iFlag == 1 ? u"0" : u"";
-  const Locale here = locale();
-  return number_to_text(leading_number(value.to_text(here)), here);
+  // Only the separators count, not the date, which would have to be asked for.
+  return number_to_text(leading_number(value.text(*this)), library_.platform().computer.locale());
 }
 
 Text ORVUtils::VerifyMemField(const Text& sMemData) {
   Text s = StringReplace(sMemData, u"\n", u" ");
+  if (!may_see_calls(*this) && !has_run(s)) return s;
   for (const Replacement& run : memo_runs) s = StringReplaceWord(s, Text(run.from), Text(run.to));
   return s;
 }

@@ -94,5 +94,22 @@ TEST(CodePages, StringReplaceAgreesWithThePageOnEveryCharacter) {
   }
 }
 
+// An object whose members may be overridden calls them one after the other; others clean a text in one pass.
+TEST(CodePages, OnePassCleansAsTheCallsOfMembers) {
+  Text text;
+  for (std::uint32_t unit = 1; unit <= 0xFFFF; ++unit) {
+    text += static_cast<char16_t>(unit);
+    if (unit % 500 == 0) text += u" '&'\u00B4,'\" ?";
+  }
+  for (const std::uint32_t number : {1252, 1251, 932, 65001}) {
+    Toolkit toolkit(number);
+    RecordingUtils by_calls(toolkit.library);
+    for (std::int16_t extras = 0; extras <= 3; ++extras) {
+      EXPECT_EQ(toolkit.utils.VerifyTextData(0, extras, text), by_calls.VerifyTextData(0, extras, text))
+          << number << " " << extras;
+    }
+  }
+}
+
 }  // namespace
 }  // namespace talutil::testing

@@ -8,7 +8,17 @@ namespace talutil::testing {
 namespace {
 
 using namespace std::string_view_literals;
-using Sanitising = LateMembers;
+
+struct Sanitising : LateMembers {
+  /// The same from an object without overridden members, which does all work at once.
+  Text verified(std::int16_t width, std::int16_t extras, const Variant& data) {
+    const Text result = utils.VerifyTextData(width, extras, data);
+    EXPECT_EQ(plain.VerifyTextData(width, extras, data), result);
+    return result;
+  }
+
+  ORVUtils plain{library};
+};
 
 constexpr std::int32_t counter_maximum = std::numeric_limits<std::int32_t>::max();
 
@@ -57,7 +67,7 @@ TEST_F(Sanitising, VerifyTextDataCleansAndCuts) {
     const auto extras = static_cast<std::int16_t>(generator.whole(-1, 3));
     const auto width = static_cast<std::int16_t>(generator.whole(-3, 9));
     const Text whole = cleaned(text, extras);
-    EXPECT_EQ(utils.VerifyTextData(width, extras, text), width > 0 ? whole.substr(0, std::size_t(width)) : whole)
+    EXPECT_EQ(verified(width, extras, text), width > 0 ? whole.substr(0, std::size_t(width)) : whole)
         << to_utf8(text) << ", extras " << extras << ", width " << width;
   }
   const Rows<std::int16_t, Variant, Text> rows = {
@@ -67,9 +77,9 @@ TEST_F(Sanitising, VerifyTextDataCleansAndCuts) {
       {"object that holds Null", 0, holder_of(Null{}), u""},
   };
   check_rows(rows, [&](std::int16_t extras, const Variant& data, const Text& expected) {
-    EXPECT_EQ(utils.VerifyTextData(0, extras, data), expected);
+    EXPECT_EQ(verified(0, extras, data), expected);
   });
-  EXPECT_EQ(utils.settings().CounterVerifyText, calls + static_cast<std::int32_t>(rows.size()));
+  EXPECT_EQ(utils.settings().CounterVerifyText, 2 * (calls + static_cast<std::int32_t>(rows.size())));
   // clang-format off
   check({{u"VerifyTextData", {{u"0|0|@null", ""}, {u"0|5|", ""}, {u"0|6|1, 2", "1, 2"}, {u"0|0|=12.5", "12.5"},
           // A line break at the end makes one more line; a lone carriage return or line feed breaks nothing.
@@ -105,7 +115,7 @@ TEST_F(Sanitising, VerifyTextDataKeepsLinesByTheirLengths) {
       left.push_back(is_marked ? u"" : Text(trim_blanks(line)));
       if (!is_marked) unmarked += left.back() + u"\r\n";
     }
-    EXPECT_EQ(utils.VerifyTextData(0, 5, text), unmarked) << to_utf8(text);
+    EXPECT_EQ(verified(0, 5, text), unmarked) << to_utf8(text);
     std::vector<Text> kept;
     for (; !left.empty() && kept.size() < 3; left.pop_back()) {
       Text line = left.back();
@@ -117,7 +127,7 @@ TEST_F(Sanitising, VerifyTextDataKeepsLinesByTheirLengths) {
       }
       kept.insert(kept.begin(), line);
     }
-    EXPECT_EQ(utils.VerifyTextData(0, 4, text), lines(kept)) << to_utf8(text);
+    EXPECT_EQ(verified(0, 4, text), lines(kept)) << to_utf8(text);
   }
 }
 
@@ -178,11 +188,17 @@ TEST_F(Sanitising, VerifyIntData) {
 }
 
 TEST_F(Sanitising, VerifyMemField) {
-  EXPECT_EQ(utils.VerifyMemField(u"\t\"'A\n\nB\r\n\r\nC"), u"\t\"'A B\r \r C");
+  const auto verified_memo = [&](const Text& text) {
+    const Text result = utils.VerifyMemField(text);
+    EXPECT_EQ(plain.VerifyMemField(text), result);
+    return result;
+  };
+  EXPECT_EQ(verified_memo(u"\t\"'A\n\nB\r\n\r\nC"), u"\t\"'A B\r \r C");
+  EXPECT_EQ(verified_memo(u"A \rB\nC"), u"A \rB C");
   // How many blanks, and how many carriage returns, are left of a run.
   for (const auto& [before, after] : {std::pair(1, 1), {2, 1}, {3, 2}, {4, 2}, {5, 1}, {9, 3}, {16, 1}}) {
     for (const char16_t unit : {u' ', u'\r'}) {
-      EXPECT_EQ(utils.VerifyMemField(Text(std::size_t(before), unit)), Text(std::size_t(after), unit)) << before;
+      EXPECT_EQ(verified_memo(Text(std::size_t(before), unit)), Text(std::size_t(after), unit)) << before;
     }
   }
 }
