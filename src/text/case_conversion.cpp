@@ -1,3 +1,5 @@
+#include <algorithm>
+
 #include "automation/control.hpp"
 #include "controls/control_factory.hpp"
 #include "controls/name_case_converter.hpp"
@@ -20,15 +22,21 @@ Text in_name_case(const ORVUtils& utils, const Text& text) {
   return converter.call(u"NameCase", {text}).to_text(converter.locale());
 }
 
-bool names_machinery(const Variant& value, const Locale& locale) {
+bool has_machinery(TextView text) noexcept {
+  constexpr TextView machinery = u"MACHINERY";
+  return !std::ranges::search(text, machinery, {}, [](char16_t unit) { return upper_case(unit); }).empty();
+}
+
+bool names_machinery(const ORVUtils& utils, const Variant& value) {
+  if (const auto* const text = value.get_if<Text>()) return has_machinery(*text);
   const Variant plain = value.value();
-  return !plain.is_null() && upper_case(plain.to_text(locale)).find(u"MACHINERY") != Text::npos;
+  return !plain.is_null() && has_machinery(plain.to_text(utils.locale()));
 }
 
 }  // namespace
 
 Variant ORVUtils::ConvertCase(const std::int16_t& iFlag, const Variant& vStr) {
-  if (names_machinery(vStr, locale())) return vStr;
+  if (names_machinery(*this, vStr)) return vStr;
   const std::int16_t style = settings().iCharactercase;
   if (style <= style_none) return vStr;
   const Text s = VerifyTextData(0, 0, vStr);

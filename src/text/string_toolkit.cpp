@@ -1,6 +1,7 @@
 #include <algorithm>
 #include <cstdint>
 #include <iterator>
+#include <utility>
 #include <vector>
 
 #include "automation/checked.hpp"
@@ -32,6 +33,16 @@ std::vector<std::uint32_t> borders_of(TextView word) {
     borders[i] = matched;
   }
   return borders;
+}
+
+Text replace_short_word(TextView text, TextView word, TextView replacement) {
+  Text result;
+  std::size_t copied = 0;
+  for (std::size_t found = 0; (found = text.find(word, copied)) != TextView::npos; copied = found + word.size()) {
+    if (copied == 0) result.reserve(text.size());
+    result.append(text, copied, found - copied).append(replacement);
+  }
+  return copied == 0 ? Text(text) : std::move(result.append(text, copied));
 }
 
 /// Only goes back in the word, never in the text, so that repetitive texts take no longer than others.
@@ -137,6 +148,9 @@ Text ORVUtils::ReverseString(const Text& sSource) {
 
 Text ORVUtils::StringReplaceWord(const Text& sSource, const Text& sChangeFrom, const Text& sChangeTo) {
   if (sChangeFrom.empty() || sChangeFrom.size() > sSource.size()) return sSource;
+  // Such a word can be compared at every position, however repetitive the text is.
+  constexpr std::size_t short_length = 8;
+  if (sChangeFrom.size() <= short_length) return replace_short_word(sSource, sChangeFrom, sChangeTo);
   return replace_word(sSource, sChangeFrom, sChangeTo);
 }
 
