@@ -37,10 +37,24 @@ constexpr std::int64_t append_to_exponent(std::int64_t exponent, char16_t digit)
   return std::min(exponent * 10 + (digit - u'0'), largest_exponent);
 }
 
+/// A number with so few digits that both its digits and the power of ten are exact, and a single division rounds.
+std::optional<double> short_number(const Decimal& decimal) {
+  constexpr std::size_t most_digits = 15;
+  constexpr std::array<double, most_digits + 1> powers_of_10{1,   1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                                             1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+  const auto count = static_cast<std::int64_t>(decimal.digits.size());
+  const std::int64_t places = count - decimal.point;
+  if (decimal.digits.size() > most_digits || decimal.point < 0 || places < 0) return std::nullopt;
+  std::int64_t whole = 0;
+  for (const char digit : decimal.digits) whole = whole * 10 + (digit - '0');
+  return static_cast<double>(whole) / powers_of_10[static_cast<std::size_t>(places)];
+}
+
 double to_double(const Decimal& decimal) {
   constexpr std::int64_t surely_too_large = 400;
   constexpr std::int64_t surely_zero = -400;
   if (decimal.digits.empty() || decimal.point < surely_zero) return 0;
+  if (const auto number = short_number(decimal)) return decimal.is_negative ? -*number : *number;
   if (decimal.point > surely_too_large) raise(ErrorNumber::overflow);
   const std::string text = "0." + decimal.digits + "e" + std::to_string(decimal.point);
   double value = 0;

@@ -33,8 +33,20 @@ std::string plain_or_scientific(const DecimalDigits& number, int most_digits) {
          (size.size() < 2 ? "0" : "") + size;
 }
 
+constexpr std::array<double, 16> powers_of_10{1,   1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                              1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+
+Text whole_number_to_text(std::int64_t value) {
+  std::array<char, 20> buffer;  // NOLINT(cppcoreguidelines-pro-type-member-init): written before it is read.
+  const auto written = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value);
+  return Text(buffer.data(), written.ptr);
+}
+
 Text to_significant_digits(double value, int most_digits, const Locale& locale) {
-  if (value == 0) return u"0";  // Drops the sign of a negative zero.
+  // Also drops the sign of a negative zero.
+  if (std::abs(value) < powers_of_10[static_cast<std::size_t>(most_digits)] && std::trunc(value) == value) {
+    return whole_number_to_text(static_cast<std::int64_t>(value));
+  }
   Text text(std::signbit(value) ? u"-" : u"");
   if (std::isnan(value)) return text + u"NAN";
   if (std::isinf(value)) return text + u"INF";
@@ -50,11 +62,7 @@ Text number_to_text(double value, const Locale& locale) { return to_significant_
 
 Text number_to_text(float value, const Locale& locale) { return to_significant_digits(value, 7, locale); }
 
-Text number_to_text(std::int32_t value) {
-  std::array<char, 12> buffer;
-  const auto written = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value);
-  return Text(buffer.data(), written.ptr);
-}
+Text number_to_text(std::int32_t value) { return whole_number_to_text(value); }
 
 Text number_to_text(Currency value, const Locale& locale) {
   const bool is_negative = value.ten_thousandths < 0;
