@@ -43,7 +43,8 @@ std::size_t CsvReader::lines_between(std::size_t begin, std::size_t end) const {
 void CsvReader::finish_row(std::size_t end, std::size_t next) {
   row_start_ = start_;
   row_length_ = end - start_;
-  line_ += lines_between(start_, next);
+  // Only in quotes can there be line feeds before the end.
+  line_ += has_quotes_ ? lines_between(start_, next) : lines_between(end, next);
   start_ = next;
 }
 
@@ -55,10 +56,21 @@ void CsvReader::pass_over(std::size_t from) {
   finish_row(has_return ? end - 1 : end, std::min(end + 1, text.size()));
 }
 
+/// The end of a field without quotes.
+std::size_t CsvReader::unquoted_end(std::size_t at) const noexcept {
+  const TextView text = pieces_.text();
+  for (; at < text.size(); ++at) {
+    const char16_t unit = text[at];
+    if (unit == u',' || unit == u'\n' || (unit == u'\r' && line_end_at(at) != 0)) break;
+  }
+  return at;
+}
+
 /// Reads the row at `start_`, which is incomplete if the text ends before it and more can follow.
 CsvReader::Outcome CsvReader::parse(std::vector<Text>& row) {
   const Text& text = pieces_.text();
   std::size_t count = 0;
+  has_quotes_ = false;
   for (std::size_t at = start_;; ++at) {
     if (count == row.size()) row.emplace_back();
     Text& field = row[count++];
@@ -66,7 +78,7 @@ CsvReader::Outcome CsvReader::parse(std::vector<Text>& row) {
       if (quoted_field(field, at) == Outcome::incomplete) return Outcome::incomplete;
     } else {
       const std::size_t begin = at;
-      while (at < text.size() && text[at] != u',' && line_end_at(at) == 0) ++at;
+      at = unquoted_end(at);
       field.assign(text, begin, at - begin);
     }
     if (at == text.size() && !pieces_.has_ended()) return Outcome::incomplete;
@@ -81,10 +93,11 @@ CsvReader::Outcome CsvReader::quoted_field(Text& field, std::size_t& at) {
   const Text& text = pieces_.text();
   const bool may_continue = !pieces_.has_ended();
   field.clear();
+  has_quotes_ = true;
   for (;;) {
     const std::size_t begin = at + 1;
-    const std::size_t quote = text.find(u'"', begin);
-    if (quote == Text::npos) {
+    const std::size_t quote = find_unit(text, u'"', begin);
+    if (quote == text.size()) {
       if (may_continue) return Outcome::incomplete;
       pass_over(start_);
       throw run_time_failure("line " + std::to_string(row_line_) +

@@ -24,6 +24,7 @@ class CsvReader final : public RowReader {
   bool fetch();
   Outcome parse(std::vector<Text>& row);
   Outcome quoted_field(Text& field, std::size_t& at);
+  [[nodiscard]] std::size_t unquoted_end(std::size_t at) const noexcept;
   [[nodiscard]] std::size_t line_end_at(std::size_t at) const noexcept;
   [[nodiscard]] std::size_t lines_between(std::size_t begin, std::size_t end) const;
   void finish_row(std::size_t end, std::size_t next);
@@ -35,6 +36,7 @@ class CsvReader final : public RowReader {
   std::size_t row_length_ = 0;
   std::size_t line_ = 1;
   std::size_t row_line_ = 0;
+  bool has_quotes_ = false;  ///< The row that is being read.
 };
 
 }  // namespace talutil::cli

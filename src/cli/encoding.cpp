@@ -246,10 +246,8 @@ void Encoder::append(std::string& bytes, TextView text) {
     default:
       break;
   }
-  if (is_ascii(text)) {
-    bytes.append(text.begin(), text.end());
-  } else if (!page_) {
-    bytes += to_utf8(text);
+  if (!page_ || is_ascii(text)) {
+    append_utf8(bytes, text);
   } else {
     for (const char16_t unit : text) append_code(bytes, unit);
   }

@@ -1,6 +1,9 @@
 #include "controls/delimited_text.hpp"
 
 #include <algorithm>
+#include <array>
+#include <bit>
+#include <cstring>
 
 #include "automation/run_time_error.hpp"
 
@@ -10,7 +13,25 @@ namespace {
 
 constexpr std::string_view byte_order_mark = "\xEF\xBB\xBF";
 
-bool is_line_break(char16_t unit) noexcept { return unit == u'\r' || unit == u'\n'; }
+/// Whether a cell needs quotes. Blocks of eight, of which the last may overlap the one before.
+bool is_special(TextView cell, char16_t separator) noexcept {
+  using Units [[gnu::vector_size(16)]] = char16_t;
+  constexpr std::size_t step = sizeof(Units) / sizeof(char16_t);
+  const auto is_special_unit = [separator](auto unit) {
+    return (unit == separator) | (unit == u'"') | (unit == u'\r') | (unit == u'\n');
+  };
+  if (cell.size() < step) return std::ranges::any_of(cell, is_special_unit);
+  decltype(is_special_unit(Units{})) special{};
+  const auto look_at = [&](std::size_t at) {
+    Units units;
+    std::memcpy(&units, cell.data() + at, sizeof units);
+    special |= is_special_unit(units);
+  };
+  for (std::size_t at = 0; at + step < cell.size(); at += step) look_at(at);
+  look_at(cell.size() - step);
+  const auto halves = std::bit_cast<std::array<std::uint64_t, 2>>(special);
+  return (halves[0] | halves[1]) != 0;
+}
 
 /// The position after a line end.
 std::size_t after_line_end(TextView text, std::size_t at) noexcept {
@@ -87,16 +108,16 @@ Text read_table_file(Files& files, CodePage& code_page, const Text& path) {
 }
 
 void append_delimited(Text& line, TextView cell, char16_t separator) {
-  bool is_special = false;
-  for (const char16_t unit : cell) is_special |= unit == separator || unit == u'"' || is_line_break(unit);
-  if (!is_special) {
+  if (!is_special(cell, separator)) {
     line += cell;
     return;
   }
   line += u'"';
-  for (const char16_t unit : cell) {
-    if (unit == u'"') line += u'"';
-    line += unit;
+  for (std::size_t at = 0; at < cell.size();) {
+    const std::size_t quote = find_unit(cell, u'"', at);
+    line += cell.substr(at, quote - at);
+    if (quote < cell.size()) line += u"\"\"";
+    at = quote + 1;
   }
   line += u'"';
 }
