@@ -198,10 +198,12 @@ int rows_of(HWND window) {
 void switches_are_explained(HWND window) {
   check_equal(9, rows_of(window), "rows below the heading");
   follow(window, "{picture command-line-help}{CTRL+A}{CTRL+C}");
-  const std::wstring copied = clipboard();
-  check(copied.starts_with(L"RM\tStarts ORV with no booking screen\r\n") &&
-            copied.find(L"\r\n\t  Preload the requested time out time if specified\r\n") != std::wstring::npos,
-        "copied rows: " + narrow(copied.substr(0, 60)));
+  const auto is_copied = [] {
+    const std::wstring copied = clipboard();
+    return copied.starts_with(L"RM\tStarts ORV with no booking screen\r\n") &&
+           copied.find(L"\r\n\t  Preload the requested time out time if specified\r\n") != std::wstring::npos;
+  };
+  check(wait_until(is_copied), "copied rows: " + narrow(clipboard().substr(0, 60)));
   press(VK_ESCAPE);
 }
 
@@ -209,7 +211,8 @@ void system_is_described(HWND window) {
   follow(window,
          "{picture system-drives}{CTRL+TAB}{picture system-memory}{CTRL+TAB}{picture system-processor}{CTRL+TAB}"
          "{picture system-operating-system}{click &Copy as text}");
-  check(clipboard().starts_with(L"Drives\r\n  Drive  Kind"), "what was copied: " + narrow(clipboard().substr(0, 60)));
+  check(wait_until([] { return clipboard().starts_with(L"Drives\r\n  Drive  Kind"); }),
+        "what was copied: " + narrow(clipboard().substr(0, 60)));
   follow(window, "{CTRL+TAB}{ALT+F}c{SHIFT+;}\\windows");
   check_equal(0, rows_of(window), "no details yet");
   press(VK_RETURN);
