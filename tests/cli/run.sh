@@ -80,13 +80,9 @@ expect 'number' 0 1.5 call VerifyIntData 0 @num:1.5
 expect 'date, day first' 0 31/03/2009 call VerifyTextData 0 0 @date:31/3/2009
 expect_part 'the example in the help' 0 'talutil call IncMonth 31/03/2009 -1' call --help
 expect 'a date result and what is written back' 0 "31/12/2009${nl}iWeek = 52" call WeekYearToDate 60 2009 2
-expect 'JSON of dates' 0 \
-  '{"result": "4:0", "arguments": {"vStDate": "10/03/2024", "vEnDate": "11/03/2024", "vStTime": "22:00", "vEnTime": "02:00"}}' \
-  call GetTimeDifference 10/3/2024 11/3/2024 22:00 2:00 --json
 expect 'no date where one is due' 1 \
   'talutil: LocalTimeToUTC: the_date: "31/2/2009" is not a date; write DD/MM/YYYY, DD/MM/YYYY HH:MM or HH:MM' \
   call LocalTimeToUTC 31/2/2009
-TZ=Australia/Brisbane expect 'local time by the zone' 0 '05/03/2009 03:45:30' call LocalTimeToUTC '5/3/2009 13:45:30'
 expect 'list' 0 1 call IndexInList @list:Apple,Banana ban
 expect 'list with a comma in an element' 0 1 call IndexInList '@list:"a,b",Banana' ban
 printf 'Apple\r\nBanana\n' >"$work/lines"
