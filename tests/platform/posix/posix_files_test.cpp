@@ -1,10 +1,8 @@
 #include "platform/posix/posix_files.hpp"
 
-#include <fcntl.h>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 #include <sys/xattr.h>
-#include <unistd.h>
 
 #include <filesystem>
 #include <fstream>
