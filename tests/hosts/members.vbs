@@ -72,9 +72,9 @@ Set u.FolderBrowseForm = Nothing
 u.BookingScreenDate = DateSerial(2009, 7, 1)
 Check "a date as a property", DateSerial(2009, 7, 1), u.BookingScreenDate
 Check "types", "IntegerLongBooleanSingleDateDateEmptyStringNull", TypeName(u.GetYear(0)) & _
-  TypeName(u.MyPos("", "", 0)) & TypeName(u.VerifyEmail("")) & TypeName(u.ConvertDurationToNumber("1")) & TypeName(u.VerifyNullDate(0, Empty)) & _
-  TypeName(u.BookingScreenDate) & TypeName(u.WeekYearToDate(1, 2009, 7)) & TypeName(u.AddZeros(7, 3, 1)) & _
-  TypeName(u.ConvertCase(0, Null))
+  TypeName(u.MyPos("", "", 0)) & TypeName(u.VerifyEmail("")) & TypeName(u.ConvertDurationToNumber("1")) & _
+  TypeName(u.VerifyNullDate(0, Empty)) & TypeName(u.BookingScreenDate) & TypeName(u.WeekYearToDate(1, 2009, 7)) & _
+  TypeName(u.AddZeros(7, 3, 1)) & TypeName(u.ConvertCase(0, Null))
 Check "values", "12.5u0", u.VerifyTextData(0, 0, 12.5) & _
   u.VerifyTextData(0, 0, New ValueHolder) & u.VerifyIntData(0, Empty)
 Check "identifiers", "38 True", Len(u.GetNewGuid) & " " & (u.GetNewGuid <> u.GetNewGuid)
