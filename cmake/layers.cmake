@@ -44,7 +44,7 @@ add_custom_command(OUTPUT ${member_texts}
 # is above two others, neither of these knows the other.
 talutil_layer(automation FAST ALL)
 talutil_layer(platform BELOW automation)
-talutil_layer(documents BELOW platform LIBRARIES documents::pdf FAST ALL)
+talutil_layer(documents BELOW platform LIBRARIES documents::pdf archives::deflate FAST ALL)
 talutil_layer(archives BELOW platform LIBRARIES archives::zip archives::deflate)
 talutil_layer(controls BELOW documents archives FAST crypto.cpp delimited_text.cpp grid.cpp name_case.cpp)
 talutil_layer(texts GENERATED ${member_texts})

@@ -166,7 +166,8 @@ void name_font(posix::PosixFontFiles& files, const ReportOptions& options, const
   files.name_font({bytes.begin(), bytes.end()});
 }
 
-void add_table(PrintControl& print, const Platform& platform, const ReportOptions& options, const TableRows& rows) {
+/// @param rows released before the report is laid out, which takes more memory than the table
+void add_table(PrintControl& print, const Platform& platform, const ReportOptions& options, TableRows& rows) {
   const auto grid = std::make_shared<Grid>(platform);
   fill_grid(*grid, rows);
   if (grid->Rows() > 0) grid->put_FixedRows(1);
@@ -176,6 +177,7 @@ void add_table(PrintControl& print, const Platform& platform, const ReportOption
   // Only pages with the other columns need to say whose they are.
   if (!fits) grid->put_FixedCols(std::min(options.keys, grid->Cols()));
   grid->WordWrap = Boolean(true);
+  rows = {};
   print.RenderObject = ObjectRef(grid);
   print.put_RenderControl(0);
 }
@@ -209,7 +211,7 @@ void report(const ReportOptions& options) {
   const std::string output = pdf_of(options);
   require_other_file(options, output);
   const std::int32_t paper = paper_code(options.paper);
-  const Contents contents = read_contents(options, platform.computer.locale());
+  Contents contents = read_contents(options, platform.computer.locale());
   name_font(posix_platform.font_files, options, contents);
 
   const auto print = std::make_shared<PrintControl>(platform);
@@ -218,6 +220,7 @@ void report(const ReportOptions& options) {
   use_fonts(*print, options);
   print->Header = contents.header;
   print->StartDoc();
+  const auto missing = missing_characters(contents, print->metrics(), {family_of(print->FontName), false, 8});
   on_file(shown_input(options.file), [&] {
     if (contents.is_table)
       add_table(*print, platform, options, contents.rows);
@@ -225,7 +228,7 @@ void report(const ReportOptions& options) {
       print->put_Text(contents.text);
   });
   print->EndDoc();
-  warn_of(missing_characters(contents, print->metrics(), {family_of(print->FontName), false, 8}));
+  warn_of(missing);
   PdfExport pdf(platform);
   pdf.Author = utf8_text(options.author, "--author");
   pdf.Subject = utf8_text(options.subject, "--subject");

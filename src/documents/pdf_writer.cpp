@@ -1,10 +1,15 @@
 #include "documents/pdf_writer.hpp"
 
+#include <libdeflate.h>
+
 #include <algorithm>
-#include <array>
+#include <exception>
+#include <memory>
+#include <new>
 
 #include "automation/run_time_error.hpp"
 #include "documents/font_metrics.hpp"
+#include "documents/page_operators.hpp"
 #include "documents/pdf_fonts.hpp"
 
 namespace talutil {
@@ -56,6 +61,57 @@ void add_bookmarks(PdfDocument& pdf, const Document& document, const std::vector
   if (document.bookmarks.size() > 1) HPDF_SetPageMode(pdf.get(), HPDF_PAGE_MODE_USE_OUTLINE);
 }
 
+struct FreeCompressor {
+  void operator()(libdeflate_compressor* compressor) const noexcept { libdeflate_free_compressor(compressor); }
+};
+
+/// Deflates the contents of pages.
+class ContentsCompressor {
+ public:
+  ContentsCompressor() : compressor_(libdeflate_alloc_compressor(level)) {
+    if (!compressor_) throw std::bad_alloc();
+  }
+
+  /// Replaces what has been written for a page by its deflated form. The PDF library would keep it as it is until the
+  /// document is saved, which takes many times the memory.
+  void compress(PdfDocument& pdf, HPDF_Page page) {
+    auto* const attributes = static_cast<HPDF_PageAttr>(page->attr);
+    read(attributes->stream);
+    packed_.resize(libdeflate_zlib_compress_bound(compressor_.get(), bytes_.size()));
+    packed_.resize(
+        libdeflate_zlib_compress(compressor_.get(), bytes_.data(), bytes_.size(), packed_.data(), packed_.size()));
+    const HPDF_Stream packed = HPDF_MemStream_New(pdf.get()->mmgr, static_cast<HPDF_UINT>(packed_.size()));
+    if (packed == nullptr) return pdf.check();
+    HPDF_Stream_Write(packed, reinterpret_cast<const HPDF_BYTE*>(packed_.data()),
+                      static_cast<HPDF_UINT>(packed_.size()));
+    HPDF_Stream_Free(attributes->stream);
+    attributes->stream = packed;
+    attributes->contents->stream = packed;
+    attributes->contents->filter = HPDF_STREAM_FILTER_NONE;
+    attributes->contents->write_fn = &write_filter;
+  }
+
+ private:
+  static constexpr int level = 6;
+
+  /// Says in the file how the contents are packed; the PDF library says so only of what it packs itself.
+  static HPDF_STATUS write_filter(HPDF_Dict /*contents*/, HPDF_Stream file) {
+    return HPDF_Stream_WriteStr(file, "/Filter /FlateDecode\n");
+  }
+
+  void read(HPDF_Stream stream) {
+    bytes_.resize(HPDF_Stream_Size(stream));
+    auto size = static_cast<HPDF_UINT>(bytes_.size());
+    HPDF_Stream_Seek(stream, 0, HPDF_SEEK_SET);
+    HPDF_Stream_Read(stream, reinterpret_cast<HPDF_BYTE*>(bytes_.data()), &size);
+    bytes_.resize(size);
+  }
+
+  std::unique_ptr<libdeflate_compressor, FreeCompressor> compressor_;
+  std::string bytes_;
+  std::string packed_;
+};
+
 /// Draws the items of one page, skipping those entirely outside it.
 class PageWriter {
  public:
@@ -66,6 +122,7 @@ class PageWriter {
 
   void write() {
     for (const PageItem& item : page_.items) std::visit([this](const auto& held) { draw(held); }, item);
+    flush();
   }
 
   [[nodiscard]] HPDF_Page target() const noexcept { return target_; }
@@ -76,48 +133,47 @@ class PageWriter {
   }
   [[nodiscard]] float y_of(std::int32_t top) const noexcept { return points(page_.height - top); }
 
+  /// Passes our own operators to the PDF library, before it adds some.
+  void flush() {
+    const std::string operators = operators_.take();
+    if (operators.empty()) return;
+    HPDF_Stream_Write(static_cast<HPDF_PageAttr>(target_->attr)->stream,
+                      reinterpret_cast<const HPDF_BYTE*>(operators.data()), static_cast<HPDF_UINT>(operators.size()));
+  }
+
   void draw(const TextRun& run) {
     if (is_outside(run.left, run.top)) return;
-    HPDF_Font font = nullptr;
-    if (run.is_wide) font = pdf_.wide_font(wide_font_of(run));
-    const bool is_wide = font != nullptr;
-    if (!is_wide) font = pdf_.standard_font(run.font.family, run.font.is_bold);
+    if (run.is_wide) {
+      if (const HPDF_Font font = pdf_.wide_font(wide_font_of(run)); font != nullptr) return draw_wide(run, font);
+    }
+    const char* const font = HPDF_Page_GetLocalFontName(target_, pdf_.standard_font(run.font.family, run.font.is_bold));
+    if (font == nullptr) return pdf_.check();
+    operators_.text(font, run.font.points, run.colour, run.left, page_.height - run.top - baseline(run.font),
+                    to_ansi(run.text));
+  }
+
+  void draw_wide(const TextRun& run, HPDF_Font font) {
+    flush();
     const Rgb colour = rgb_of(run.colour);
     HPDF_Page_SetRGBFill(target_, colour.red, colour.green, colour.blue);
     HPDF_Page_BeginText(target_);
     HPDF_Page_SetFontAndSize(target_, font, run.font.points);
     // The embedded font has one weight: strokes along its outlines make it bold.
-    const bool is_stroked = is_wide && run.font.is_bold;
-    if (is_stroked) {
+    if (run.font.is_bold) {
       HPDF_Page_SetRGBStroke(target_, colour.red, colour.green, colour.blue);
       HPDF_Page_SetLineWidth(target_, run.font.points / 30);
     }
-    HPDF_Page_SetTextRenderingMode(target_, is_stroked ? HPDF_FILL_THEN_STROKE : HPDF_FILL);
-    const std::string bytes = is_wide ? to_utf8(run.text) : to_ansi(run.text);
-    HPDF_Page_TextOut(target_, points(run.left), y_of(run.top + baseline(run.font)), bytes.c_str());
+    HPDF_Page_SetTextRenderingMode(target_, run.font.is_bold ? HPDF_FILL_THEN_STROKE : HPDF_FILL);
+    HPDF_Page_TextOut(target_, points(run.left), y_of(run.top + baseline(run.font)), to_utf8(run.text).c_str());
     HPDF_Page_EndText(target_);
   }
 
   void draw(const Box& box) {
     const TwipsRectangle& place = box.place;
     if (is_outside(place.left, place.top)) return;
-    const auto outline = [&] {
-      HPDF_Page_Rectangle(target_, points(place.left), y_of(place.top + place.height), points(place.width),
-                          points(place.height));
-    };
-    if (box.fill) {
-      const Rgb colour = rgb_of(*box.fill);
-      HPDF_Page_SetRGBFill(target_, colour.red, colour.green, colour.blue);
-      outline();
-      HPDF_Page_Fill(target_);
-    }
-    if (box.line_width > 0) {
-      const Rgb colour = rgb_of(box.line_colour);
-      HPDF_Page_SetRGBStroke(target_, colour.red, colour.green, colour.blue);
-      HPDF_Page_SetLineWidth(target_, points(box.line_width));
-      outline();
-      HPDF_Page_Stroke(target_);
-    }
+    const std::int32_t bottom = page_.height - place.top - place.height;
+    if (box.fill) operators_.filled(place, bottom, *box.fill);
+    if (box.line_width > 0) operators_.framed(place, bottom, box.line_width, box.line_colour);
   }
 
   void draw(const Picture& picture) {
@@ -126,6 +182,7 @@ class PageWriter {
         HPDF_LoadRawImageFromMem(pdf_.get(), picture.pixels->data(), static_cast<HPDF_UINT>(picture.width),
                                  static_cast<HPDF_UINT>(picture.height), HPDF_CS_DEVICE_RGB, 8);
     if (image == nullptr) return pdf_.check();
+    flush();
     const TwipsRectangle& place = picture.place;
     HPDF_Page_DrawImage(target_, image, points(place.left), y_of(place.top + place.height), points(place.width),
                         points(place.height));
@@ -134,22 +191,43 @@ class PageWriter {
   PdfDocument& pdf_;
   const Page& page_;
   HPDF_Page target_;
+  PageOperators operators_;
 };
 
-void save(PdfDocument& pdf, OutputFile& file) {
-  HPDF_SaveToStream(pdf.get());
-  pdf.check();
-  HPDF_ResetStream(pdf.get());
-  std::array<HPDF_BYTE, 65536> buffer;  // NOLINT(cppcoreguidelines-pro-type-member-init): filled before it is read.
-  while (true) {
-    auto size = static_cast<HPDF_UINT32>(buffer.size());
-    const HPDF_STATUS status = HPDF_ReadFromStream(pdf.get(), buffer.data(), &size);
-    if (size > 0) file.write({reinterpret_cast<const char*>(buffer.data()), size});
-    if (status == HPDF_STREAM_EOF || size == 0) break;
-    if (status != HPDF_OK) pdf.check();
+/// Receives the document from the PDF library in small pieces. Exceptions must not pass through C.
+class FileStream {
+ public:
+  explicit FileStream(OutputFile& file) : file_(file) {}
+
+  /// Saves a document into the file, without a copy of it in memory.
+  void save(PdfDocument& pdf) {
+    pdf.get()->stream = HPDF_CallbackWriter_New(pdf.get()->mmgr, &write, this);
+    HPDF_SaveToStream(pdf.get());
+    if (reason_) std::rethrow_exception(reason_);
+    pdf.check();
+    file_.write(waiting_);
   }
-  HPDF_ResetError(pdf.get());
-}
+
+ private:
+  static HPDF_STATUS write(HPDF_Stream stream, const HPDF_BYTE* bytes, HPDF_UINT size) noexcept {
+    auto& self = *static_cast<FileStream*>(stream->attr);
+    try {
+      self.waiting_.append(reinterpret_cast<const char*>(bytes), size);
+      constexpr std::size_t enough = 1U << 16U;
+      if (self.waiting_.size() < enough) return HPDF_OK;
+      self.file_.write(self.waiting_);
+      self.waiting_.clear();
+      return HPDF_OK;
+    } catch (...) {
+      self.reason_ = std::current_exception();
+      return HPDF_FILE_IO_ERROR;
+    }
+  }
+
+  OutputFile& file_;
+  std::string waiting_;
+  std::exception_ptr reason_;
+};
 
 }  // namespace
 
@@ -169,16 +247,18 @@ void write_pdf(const Document& document, const PdfInformation& information, Font
   inform(HPDF_INFO_CREATOR, information.creator);
 
   std::vector<HPDF_Page> pages;
+  ContentsCompressor compressor;
   for (const Page& page : document.pages) {
     if (is_given_up && is_given_up()) raise(ErrorNumber::cancelled);
     PageWriter writer(pdf, page);
     writer.write();
+    compressor.compress(pdf, writer.target());
     pages.push_back(writer.target());
     pdf.check();
   }
   if (pages.empty()) HPDF_AddPage(pdf.get());
   add_bookmarks(pdf, document, pages);
-  save(pdf, *file);
+  FileStream(*file).save(pdf);
   file->close();
 }
 

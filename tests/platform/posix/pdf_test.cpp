@@ -121,6 +121,22 @@ TEST_F(PdfTest, BoxesHaveTheirColours) {
   EXPECT_EQ(output_of("pdftoppm -r 3 " + path + " | tail -c 9 | od -An -tx1"), " ff 00 00 00 ff 00 00 00 ff\n");
 }
 
+// Characters with a meaning in the format, and what is set for an embedded font but not for the text after it.
+TEST_F(PdfTest, TextsAreWrittenAsTheyAre) {
+  Document document;
+  Page& page = document.pages.emplace_back(Page{4320, 1440, {}});
+  const FontStyle font{FontFamily::helvetica, false, 10.5F};
+  const FontStyle bold{FontFamily::helvetica, true, 10.5F};
+  page.items.emplace_back(TextRun{20, 0, 400, font, false, 0, u"(a\\b) 50% <c> \u20AC\u00E9"});
+  page.items.emplace_back(TextRun{20, 400, 400, bold, true, 0x0000FF, u"\u041F\u0440\u0438"});
+  page.items.emplace_back(TextRun{20, 800, 400, font, false, 0, u"((after"});
+  write(document);
+  EXPECT_EQ(output_of("qpdf --check " + path + " 2>&1 | grep -c 'No syntax or stream encoding errors'"), "1\n");
+  EXPECT_EQ(output_of("pdftotext " + path + " - | grep -v '^$'"), "(a\\b) 50% <c> €é\nПри\n((after\n\f\n");
+  EXPECT_EQ(output_of("qpdf --qdf --object-streams=disable " + path + " - | grep -a -A1 ' Tr$' | tail -2"),
+            "0 Tr\n1 22.55 Td\n");
+}
+
 TEST_F(PdfTest, AnEmptyDocumentHasAPage) {
   write({});
   EXPECT_EQ(output_of("pdfinfo " + path + " | grep Pages"), "Pages:           1\n");
