@@ -95,6 +95,8 @@ TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
     }
   }
   EXPECT_GT(compared, 18U);
+  const auto width = [&](FontFamily family) { return metrics.width(u'\u0416', {family, false, 10}); };
+  EXPECT_NE(width(FontFamily::courier), width(FontFamily::helvetica)) << "each family has a wide font of its own";
 }
 
 // In the embedded font, the letter is made of others, and the accented one is made of it.
