@@ -40,11 +40,23 @@ add_custom_command(OUTPUT ${member_texts}
   DEPENDS tools/member_texts.py ${text_headers}
   COMMENT "Reading the texts of the members")
 
+# The directions and forms of characters, from the distribution's copy of the Unicode Character Database.
+set(unicode_data /usr/share/unicode)
+if(NOT EXISTS ${unicode_data}/UnicodeData.txt)
+  message(FATAL_ERROR "${unicode_data} has no Unicode Character Database: install the package unicode-data")
+endif()
+set(character_tables ${CMAKE_BINARY_DIR}/character_tables.cpp)
+add_custom_command(OUTPUT ${character_tables}
+  COMMAND ${python} ${CMAKE_SOURCE_DIR}/tools/character_tables.py ${unicode_data} ${character_tables}
+  DEPENDS tools/character_tables.py ${unicode_data}/UnicodeData.txt
+  COMMENT "Writing the tables of characters"
+  VERBATIM)
+
 # From bottom to top: values, the seam to the platform, what is built on that, and the families of members. If a layer
 # is above two others, neither of these knows the other.
 talutil_layer(automation FAST ALL)
 talutil_layer(platform BELOW automation)
-talutil_layer(documents BELOW platform LIBRARIES documents::pdf archives::deflate FAST ALL)
+talutil_layer(documents BELOW platform LIBRARIES documents::pdf archives::deflate GENERATED ${character_tables} FAST ALL)
 talutil_layer(archives BELOW platform LIBRARIES archives::zip archives::deflate)
 talutil_layer(controls BELOW documents archives FAST crypto.cpp delimited_text.cpp grid.cpp name_case.cpp)
 talutil_layer(texts GENERATED ${member_texts})

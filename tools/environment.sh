@@ -10,7 +10,7 @@ talutil_cache=${XDG_CACHE_HOME:-$HOME/.cache}/talutil
 memory_folder=/tmp
 [ ! -w /dev/shm ] || memory_folder=/dev/shm
 
-native_packages="build-essential python3 zlib1g-dev cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata"
+native_packages="build-essential python3 zlib1g-dev cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata unicode-data"
 exchange_packages="zip unzip p7zip-full libarchive-tools advancecomp python3 poppler-utils qpdf fonts-dejavu-core pkg-config fish zsh"
 fuzz_packages="clang"
 bench_packages="mawk"
