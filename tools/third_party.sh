@@ -98,6 +98,7 @@ build_libharu() {
   local source
   apply libharu libharu-memory-font.patch
   apply libharu libharu-nested-glyphs.patch
+  apply libharu libharu-marks.patch
   printf '#define LIBHPDF_HAVE_LIBZ\n#define LIBHPDF_HAVE_NOPNGLIB\n' >"$work/libharu/include/hpdf_config.h"
   # Its errors leave through our handler, which throws.
   (cd "$work/libharu/src" && for source in *.c; do

@@ -14,6 +14,8 @@
 #include "cli/report_table.hpp"
 #include "controls/grid.hpp"
 #include "controls/print_control.hpp"
+#include "documents/arabic_joining.hpp"
+#include "documents/text_direction.hpp"
 #include "platform/posix/posix_platform.hpp"
 
 namespace talutil::cli {
@@ -106,11 +108,12 @@ Contents read_contents(const ReportOptions& options, const Locale& locale) {
 /// The characters that no font has.
 std::set<Text> missing_characters(const Contents& contents, FontMetrics& metrics, const FontStyle& font) {
   std::set<Text> missing;
-  const auto look_at = [&](TextView text) {
+  const auto look_at = [&](TextView read) {
+    const Text text = joined(read);
     for (std::size_t i = 0; i < text.size(); ++i) {
-      if (!FontMetrics::is_wide(text[i]) || !metrics.wide(text[i], font).is_missing) continue;
+      if (!FontMetrics::is_wide(text[i]) || is_invisible(text[i]) || !metrics.wide(text[i], font).is_missing) continue;
       const bool is_pair = (text[i] & 0xFC00) == 0xD800 && i + 1 < text.size();
-      missing.insert(Text(text.substr(i, is_pair ? 2 : 1)));
+      missing.insert(text.substr(i, is_pair ? 2 : 1));
       if (is_pair) ++i;
     }
   };

@@ -7,6 +7,8 @@
 
 #include "automation/numbers.hpp"
 #include "cli/failure.hpp"
+#include "documents/arabic_joining.hpp"
+#include "documents/text_direction.hpp"
 
 namespace talutil::cli {
 
@@ -67,13 +69,28 @@ bool is_number_column(const TableRows& rows, std::size_t column, const Locale& l
   return has_number;
 }
 
+/// Whether most of a column's texts run from right to left.
+bool is_right_to_left_column(const TableRows& rows, std::size_t column, const Locale& locale) {
+  std::ptrdiff_t excess = 0;
+  for (std::size_t r = 1; r < rows.size(); ++r) {
+    if (column >= rows[r].size()) continue;
+    const TextView value = trim_blanks(rows[r][column]);
+    if (is_right_to_left(value))
+      ++excess;
+    else if (!value.empty() && !text_to_number(value, locale))
+      --excess;
+  }
+  return excess > 0;
+}
+
 /// What a column needs: for its longest line, and for its longest word.
 struct Need {
   double line = 0;
   double word = 0;
 
-  void add(TextView text, FontMetrics& metrics, const FontStyle& font) {
-    while (!text.empty()) {
+  void add(TextView shown, FontMetrics& metrics, const FontStyle& font) {
+    const Text letters = joined(shown);
+    for (TextView text = letters; !text.empty();) {
       const TextView one = text.substr(0, text.find_first_of(u"\r\n"));
       text.remove_prefix(std::min(one.size() + 1, text.size()));
       line = std::max(line, metrics.width(one, font));
@@ -168,7 +185,8 @@ bool lay_out(Grid& grid, const TableRows& rows, FontMetrics& metrics, const Font
     const auto column = static_cast<std::int32_t>(c);
     const double width = std::min(needs[c].line, std::max(needs[c].word, limit == 0 ? widest : limit));
     grid.put_ColWidth(column, static_cast<std::int32_t>(width));
-    grid.put_ColAlignment(column, is_number_column(rows, c, locale) ? right : left);
+    const bool is_right = is_number_column(rows, c, locale) || is_right_to_left_column(rows, c, locale);
+    grid.put_ColAlignment(column, is_right ? right : left);
   }
   return limit > 0;
 }

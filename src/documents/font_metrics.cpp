@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "documents/pdf_fonts.hpp"
+#include "documents/text_direction.hpp"
 
 namespace talutil {
 
@@ -30,7 +31,7 @@ std::int32_t FontMetrics::width(char16_t unit, const FontStyle& font) {
     }
     return widths[ansi_code(unit)];
   }
-  return wide(unit, font).width;
+  return is_invisible(unit) ? 0 : wide(unit, font).width;
 }
 
 const FontMetrics::Wide& FontMetrics::wide(char16_t unit, const FontStyle& font) {
@@ -39,8 +40,9 @@ const FontMetrics::Wide& FontMetrics::wide(char16_t unit, const FontStyle& font)
   if (const auto found = known.find(unit); found != known.end()) return found->second;
   if (!library_) library_ = std::make_unique<Library>(files_);
   PdfDocument& document = library_->document;
-  Wide wide{.family = font.family};
-  const bool is_fixed = font.family == FontFamily::courier;
+  // The fixed-width font's marks have a place of their own, instead of standing on the letter before them.
+  const bool is_fixed = font.family == FontFamily::courier && !is_mark(unit);
+  Wide wide{.family = is_fixed || font.family != FontFamily::courier ? font.family : FontFamily::helvetica};
   const WideFont first = is_fixed ? WideFont::fixed : WideFont::proportional;
   const WideFont second = is_fixed ? WideFont::proportional : WideFont::fixed;
   WideFont which = first;

@@ -4,6 +4,7 @@
 #include <array>
 
 #include "automation/run_time_error.hpp"
+#include "documents/arabic_joining.hpp"
 #include "documents/visible_text.hpp"
 
 namespace talutil {
@@ -167,7 +168,7 @@ void GridContents::read_rows(const Control& grid) {
       } else {
         text->set(1, column.index);
         const TextView answer = text->run_text(grid.locale());
-        cell.text = wraps ? visible_text(answer) : visible_line(answer);
+        cell.text = joined(wraps ? visible_text(answer) : visible_line(answer));
       }
       CellLook look = is_heading(rows.size() - 1, c) ? heading : body;
       look.alignment = column.alignment;

@@ -35,7 +35,7 @@ class GridContents {
     bool merges = false;      ///< Equal headings next to each other are one.
   };
   struct Cell {
-    Text text;  ///< Without control characters, except for line feeds if the grid wraps texts.
+    Text text;  ///< Without control characters, except for line feeds if the grid wraps texts; Arabic letters joined.
     bool is_ticked = false;
     std::uint32_t look = 0;
   };

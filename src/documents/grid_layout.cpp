@@ -4,6 +4,7 @@
 
 #include "documents/grid_contents.hpp"
 #include "documents/report_composer.hpp"
+#include "documents/text_direction.hpp"
 
 namespace talutil {
 
@@ -86,10 +87,11 @@ void ReportComposer::add_cell(const GridLayout& layout, std::size_t row, std::si
   }
   const FontStyle font = grid.font_of(cell);
   if (grid.is_check_box(row, column)) return add_check_box(cell.is_ticked, place, font);
+  const bool is_reversed = is_right_to_left(cell.text);
   Alignment alignment = look.alignment;
   if (alignment == Alignment::general) {
     const bool is_number = row >= grid.heading_rows && text_to_number(cell.text).has_value();
-    alignment = is_number ? Alignment::right : Alignment::left;
+    alignment = is_number || is_reversed ? Alignment::right : Alignment::left;
   }
   const std::int32_t room = place.width - 2 * cell_padding;
   const std::int32_t height = line_height(font);
@@ -103,7 +105,7 @@ void ReportComposer::add_cell(const GridLayout& layout, std::size_t row, std::si
     std::int32_t x = place.left + cell_padding;
     if (alignment == Alignment::centre) x += spare / 2;
     if (alignment == Alignment::right) x += spare;
-    add_runs(line, x, top, font, look.letters);
+    add_runs(line, x, top, font, {look.letters, is_reversed});
     top += height;
   }
 }

@@ -1,8 +1,20 @@
 #include "documents/pdf_fonts.hpp"
 
 #include "automation/run_time_error.hpp"
+#include "documents/unicode_map.hpp"
 
 namespace talutil {
+
+namespace {
+
+/// The PDF library's own map of a font leads from codes to shapes, not to characters.
+void replace_unicode_map(HPDF_Font font) {
+  const HPDF_Stream stream = static_cast<HPDF_FontAttr>(font->attr)->cmap_stream->stream;
+  HPDF_MemStream_FreeData(stream);
+  HPDF_Stream_WriteStr(stream, unicode_map().c_str());
+}
+
+}  // namespace
 
 PdfDocument::PdfDocument(FontFiles& files) : files_(files), document_(HPDF_New(nullptr, nullptr)) {
   if (document_ == nullptr) raise(ErrorNumber::out_of_memory);
@@ -29,7 +41,10 @@ HPDF_Font PdfDocument::wide_font(WideFont which) {
       HPDF_LoadTTFontFromMem(document_, bytes.data(), static_cast<HPDF_UINT>(bytes.size()), HPDF_TRUE);
   if (name != nullptr) wide.font = HPDF_GetFont(document_, name, "UTF-8");
   // Treat a font that is unusable, or already loaded under that name, as missing.
-  if (wide.font == nullptr) HPDF_ResetError(document_);
+  if (wide.font == nullptr)
+    HPDF_ResetError(document_);
+  else
+    replace_unicode_map(wide.font);
   return wide.font;
 }
 

@@ -11,6 +11,7 @@
 #include "documents/font_metrics.hpp"
 #include "documents/page_operators.hpp"
 #include "documents/pdf_fonts.hpp"
+#include "documents/text_direction.hpp"
 
 namespace talutil {
 
@@ -33,6 +34,9 @@ WideFont wide_font_of(const TextRun& run) noexcept {
   if (run.is_named_font) return WideFont::named;
   return run.font.family == FontFamily::courier ? WideFont::fixed : WideFont::proportional;
 }
+
+/// The text of a run as it is drawn from left to right.
+Text drawn(const TextRun& run) { return run.is_right_to_left ? drawn_from_left(run.text) : run.text; }
 
 /// What every report is written in, whatever its data.
 constexpr const char* language = "en-GB";
@@ -149,7 +153,7 @@ class PageWriter {
     const char* const font = HPDF_Page_GetLocalFontName(target_, pdf_.standard_font(run.font.family, run.font.is_bold));
     if (font == nullptr) return pdf_.check();
     operators_.text(font, run.font.points, run.colour, run.left, page_.height - run.top - baseline(run.font),
-                    to_ansi(run.text));
+                    to_ansi(drawn(run)));
   }
 
   void draw_wide(const TextRun& run, HPDF_Font font) {
@@ -164,7 +168,7 @@ class PageWriter {
       HPDF_Page_SetLineWidth(target_, run.font.points / 30);
     }
     HPDF_Page_SetTextRenderingMode(target_, run.font.is_bold ? HPDF_FILL_THEN_STROKE : HPDF_FILL);
-    HPDF_Page_TextOut(target_, points(run.left), y_of(run.top + baseline(run.font)), to_utf8(run.text).c_str());
+    HPDF_Page_TextOut(target_, points(run.left), y_of(run.top + baseline(run.font)), to_utf8(drawn(run)).c_str());
     HPDF_Page_EndText(target_);
   }
 

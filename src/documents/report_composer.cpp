@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "documents/arabic_joining.hpp"
+#include "documents/text_direction.hpp"
 #include "documents/visible_text.hpp"
 
 namespace talutil {
@@ -16,6 +18,11 @@ std::int32_t rounded(double value) { return static_cast<std::int32_t>(std::lroun
 
 Box rule(std::int32_t left, std::int32_t top, std::int32_t width) {
   return {.place = {left, top, width, 0}, .fill = {}, .line_width = hair_line, .line_colour = black};
+}
+
+/// Whether a text can be shown as it is.
+bool is_plain(TextView text) {
+  return std::ranges::none_of(text, [](char16_t unit) { return is_control(unit) || is_joining(unit); });
 }
 
 /// Shows control characters in flowing text, but keeps tabs, which have stops of their own there.
@@ -63,29 +70,60 @@ void ReportComposer::begin_page() {
 }
 
 std::int32_t ReportComposer::add_runs(TextView text, std::int32_t left, std::int32_t top, const FontStyle& font,
-                                      std::uint32_t colour) {
+                                      const LineLook& look) {
+  if (!look.is_right_to_left && is_seen_as_read(text)) return rounded(add_part(text, left, top, font, look.colour));
   double x = left;
-  for (std::size_t start = 0; start < text.size();) {
-    const bool is_wide = FontMetrics::is_wide(text[start]);
-    const auto first = is_wide ? metrics_.wide(text[start], font) : FontMetrics::Wide{.family = font.family};
-    const auto continues = [&](char16_t unit) {
-      if (FontMetrics::is_wide(unit) != is_wide) return false;
-      if (!is_wide) return true;
-      const auto& next = metrics_.wide(unit, font);
-      return next.family == first.family && next.is_named_font == first.is_named_font;
-    };
-    std::size_t end = start + 1;
-    while (end < text.size() && continues(text[end])) ++end;
-    const TextView run = text.substr(start, end - start);
-    const double width = metrics_.width(run, font);
-    FontStyle style = font;
-    style.family = first.family;
-    page().items.emplace_back(
-        TextRun{rounded(x), top, rounded(width), style, is_wide, colour, Text(run), first.is_named_font});
-    x += width;
-    start = end;
+  for (const DirectedText& part : in_visual_order(text, look.is_right_to_left)) {
+    x = part.is_right_to_left ? add_reversed_part(part.text, x, top, font, look.colour)
+                              : add_part(part.text, x, top, font, look.colour);
   }
   return rounded(x);
+}
+
+/// The characters at the start of a text that are drawn in one font.
+ReportComposer::FontRun ReportComposer::first_font_run(TextView text, const FontStyle& font) {
+  const bool is_wide = FontMetrics::is_wide(text.front());
+  const auto first = is_wide ? metrics_.wide(text.front(), font) : FontMetrics::Wide{.family = font.family};
+  const auto continues = [&](char16_t unit) {
+    if (FontMetrics::is_wide(unit) != is_wide) return false;
+    if (!is_wide) return true;
+    const auto& next = metrics_.wide(unit, font);
+    return next.family == first.family && next.is_named_font == first.is_named_font;
+  };
+  std::size_t end = 1;
+  while (end < text.size() && continues(text[end])) ++end;
+  FontStyle style = font;
+  style.family = first.family;
+  return {text.substr(0, end), style, is_wide, first.is_named_font};
+}
+
+double ReportComposer::add_part(TextView text, double x, std::int32_t top, const FontStyle& font,
+                                std::uint32_t colour) {
+  while (!text.empty()) {
+    const FontRun run = first_font_run(text, font);
+    const double width = metrics_.width(run.text, font);
+    page().items.emplace_back(TextRun{rounded(x), top, rounded(width), run.style, run.is_wide, colour, Text(run.text),
+                                      run.is_named_font, false});
+    x += width;
+    text.remove_prefix(run.text.size());
+  }
+  return x;
+}
+
+/// Adds a part that runs from right to left, beginning at its right end.
+double ReportComposer::add_reversed_part(TextView text, double left, std::int32_t top, const FontStyle& font,
+                                         std::uint32_t colour) {
+  const double right = left + metrics_.width(text, font);
+  double x = right;
+  while (!text.empty()) {
+    const FontRun run = first_font_run(text, font);
+    const double width = metrics_.width(run.text, font);
+    x -= width;
+    page().items.emplace_back(TextRun{rounded(x), top, rounded(width), run.style, run.is_wide, colour, Text(run.text),
+                                      run.is_named_font, true});
+    text.remove_prefix(run.text.size());
+  }
+  return right;
 }
 
 double ReportComposer::after_tab(double x, const FontStyle& font) {
@@ -94,15 +132,19 @@ double ReportComposer::after_tab(double x, const FontStyle& font) {
   return (std::floor(x / distance) + 1) * distance;
 }
 
-void ReportComposer::add_line(TextView line, const FontStyle& font) {
+/// From right to left, a line begins at the right margin, and so do its tab stops.
+void ReportComposer::add_line(TextView line, const FontStyle& font, bool is_right_to_left) {
   const std::int32_t height = line_height(font);
   if (y_ + height > setup_.bottom() && y_ > setup_.margin_top) begin_page();
+  if (is_right_to_left) line = line.substr(0, line.find_last_not_of(u' ') + 1);
   double x = 0;
   for (std::size_t start = 0; start < line.size();) {
     const std::size_t end = std::min(line.find(u'\t', start), line.size());
-    const std::int32_t left = setup_.margin_left + rounded(x);
-    x = add_runs(line.substr(start, end - start), left, y_, font) - setup_.margin_left;
-    if (end == start) x = left - setup_.margin_left;
+    const TextView words = line.substr(start, end - start);
+    const double width = metrics_.width(words, font);
+    const double left = is_right_to_left ? setup_.room() - x - width : x;
+    add_runs(words, setup_.margin_left + rounded(left), y_, font, {.is_right_to_left = is_right_to_left});
+    x += width;
     start = end;
     for (; start < line.size() && line[start] == u'\t'; ++start) x = after_tab(x, font);
   }
@@ -111,6 +153,7 @@ void ReportComposer::add_line(TextView line, const FontStyle& font) {
 
 void ReportComposer::add_paragraph(TextView text, const FontStyle& font) {
   const double room = setup_.room();
+  const bool is_reversed = is_right_to_left(text);
   std::size_t line_start = 0;
   std::size_t word_start = 0;  // After the last position at which the line may be broken.
   double x = 0;
@@ -122,7 +165,7 @@ void ReportComposer::add_paragraph(TextView text, const FontStyle& font) {
     if (!is_blank && x + width > room && i > line_start) {
       const bool breaks_word = word_start == line_start || !setup_.wraps_words;
       const std::size_t end = breaks_word ? i : word_start;
-      add_line(text.substr(line_start, end - line_start), font);
+      add_line(text.substr(line_start, end - line_start), font, is_reversed);
       line_start = end;
       x = breaks_word ? 0 : word_width;
       if (breaks_word) word_width = 0;
@@ -135,7 +178,7 @@ void ReportComposer::add_paragraph(TextView text, const FontStyle& font) {
       word_width = 0;
     }
   }
-  add_line(text.substr(line_start), font);
+  add_line(text.substr(line_start), font, is_reversed);
 }
 
 void ReportComposer::add_text(TextView text, const FontStyle& font) {
@@ -145,10 +188,10 @@ void ReportComposer::add_text(TextView text, const FontStyle& font) {
     const bool ends_page = end < text.size() && text[end] == u'\f';
     // A form feed on a line of its own adds no empty line.
     if (!paragraph.empty() || !ends_page) {
-      if (std::ranges::any_of(paragraph, is_control))
-        add_paragraph(with_visible_controls(paragraph), font);
-      else
+      if (is_plain(paragraph))
         add_paragraph(paragraph, font);
+      else
+        add_paragraph(joined(with_visible_controls(paragraph)), font);
     }
     if (ends_page) begin_page();
     at = text.substr(end).starts_with(u"\r\n") ? end + 2 : end + 1;
@@ -184,11 +227,12 @@ TextView ReportComposer::take_line(TextView& text, double room, const FontStyle&
 
 void ReportComposer::add_text_box(TextView text, const TwipsRectangle& place, const FontStyle& font) {
   const std::int32_t height = line_height(font);
-  const Text shown = visible_text(text);
+  const Text shown = joined(visible_text(text));
+  const LineLook look{.is_right_to_left = is_right_to_left(shown)};
   TextView rest = shown;
   for (std::int32_t top = place.top; !rest.empty() && top + height <= place.top + std::max(place.height, height);
        top += height) {
-    add_runs(take_line(rest, place.width, font), place.left, top, font);
+    add_runs(take_line(rest, place.width, font), place.left, top, font, look);
   }
 }
 
@@ -218,9 +262,9 @@ std::vector<Text> ReportComposer::lines_of(TextView text, const FontStyle& font)
 ReportComposer::HeaderLines ReportComposer::header_lines() {
   constexpr float smallest = 6;
   constexpr std::int32_t edge = 360;  // Printers leave a quarter of an inch unprinted at the most.
-  const Text text = visible_text(setup_.header);
+  const Text text = joined(visible_text(setup_.header));
   const std::int32_t room = setup_.margin_top - line_height(setup_.header_font) - edge;
-  HeaderLines header{setup_.header_font, lines_of(text, setup_.header_font)};
+  HeaderLines header{setup_.header_font, lines_of(text, setup_.header_font), is_right_to_left(text)};
   for (std::size_t kept = text.size();;) {
     const auto most = static_cast<std::size_t>(std::max(1, room / line_height(header.font)));
     if (header.lines.size() <= most) return header;
@@ -240,7 +284,9 @@ void ReportComposer::add_header(const HeaderLines& header) {
   const std::int32_t bottom = setup_.margin_top - line_height(setup_.header_font);
   std::int32_t top = bottom - height * static_cast<std::int32_t>(header.lines.size());
   for (const Text& line : header.lines) {
-    add_runs(line, setup_.margin_left, top, header.font);
+    const std::int32_t spare = setup_.room() - rounded(metrics_.width(line, header.font));
+    const std::int32_t left = setup_.margin_left + (header.is_right_to_left ? std::max(0, spare) : 0);
+    add_runs(line, left, top, header.font, {.is_right_to_left = header.is_right_to_left});
     top += height;
   }
   if (setup_.has_rule && !document_.title.empty()) {
@@ -251,17 +297,19 @@ void ReportComposer::add_header(const HeaderLines& header) {
 void ReportComposer::add_footer(std::size_t page_index) {
   const FontStyle font = setup_.footer_font.value_or(setup_.header_font);
   const std::int32_t top = setup_.bottom() + line_height(font);
-  const std::int32_t date_end = add_runs(setup_.footer, setup_.margin_left, top, font);
+  const Text footer = joined(setup_.footer);
+  const LineLook look{.is_right_to_left = is_right_to_left(footer)};
+  const std::int32_t date_end = add_runs(footer, setup_.margin_left, top, font, look);
   const Text number = u"Page " + number_to_text(static_cast<std::int32_t>(page_index + 1)) + u" of " +
                       number_to_text(static_cast<std::int32_t>(document_.pages.size()));
   const std::int32_t number_left = setup_.width - setup_.margin_right - rounded(metrics_.width(number, font));
-  add_runs(number, number_left, top, font);
+  add_runs(number, number_left, top, font, {});
   const Text& note = notes_[page_index];
   const std::int32_t width = rounded(metrics_.width(note, font));
   const std::int32_t left = setup_.margin_left + (setup_.room() - width) / 2;
   const std::int32_t gap = line_height(font);
   const bool fits = left > date_end + gap && left + width < number_left - gap;
-  add_runs(note, left, fits ? top : top + line_height(font), font);
+  add_runs(note, left, fits ? top : top + line_height(font), font, {});
 }
 
 Document ReportComposer::finish() {

@@ -72,14 +72,28 @@ class ReportComposer {
   struct HeaderLines {
     FontStyle font;
     std::vector<Text> lines;
+    bool is_right_to_left = false;
+  };
+  struct LineLook {
+    std::uint32_t colour = 0;
+    bool is_right_to_left = false;  ///< As the paragraph is.
+  };
+  struct FontRun {
+    TextView text;
+    FontStyle style;
+    bool is_wide = false;
+    bool is_named_font = false;
   };
 
   Page& page() { return document_.pages.back(); }
   void begin_page();
   void begin_part(const GridLayout& layout, std::size_t part);
-  void add_line(TextView line, const FontStyle& font);
+  void add_line(TextView line, const FontStyle& font, bool is_right_to_left);
   std::int32_t add_runs(TextView text, std::int32_t left, std::int32_t top, const FontStyle& font,
-                        std::uint32_t colour = 0);
+                        const LineLook& look);
+  [[nodiscard]] FontRun first_font_run(TextView text, const FontStyle& font);
+  double add_part(TextView text, double x, std::int32_t top, const FontStyle& font, std::uint32_t colour);
+  double add_reversed_part(TextView text, double left, std::int32_t top, const FontStyle& font, std::uint32_t colour);
   void add_paragraph(TextView text, const FontStyle& font);
   [[nodiscard]] double after_tab(double x, const FontStyle& font);
   [[nodiscard]] TextView fitting(TextView text, double room, const FontStyle& font);

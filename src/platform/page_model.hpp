@@ -54,8 +54,9 @@ struct TextRun {
   FontStyle font;
   bool is_wide = false;  ///< Has characters that code page 1252 lacks, drawn in another font.
   std::uint32_t colour = 0;
-  Text text;
-  bool is_named_font = false;  ///< A wide run in the font that was named for it; see FontFiles.
+  Text text;  ///< In the order in which it is read; Arabic letters are in the forms in which they join.
+  bool is_named_font = false;     ///< A wide run in the font that was named for it; see FontFiles.
+  bool is_right_to_left = false;  ///< All of it.
 };
 
 /// A filled area, a frame, or both; with zero height or width, a rule.

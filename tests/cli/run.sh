@@ -315,6 +315,11 @@ verdict 'the words of the report' "Anne 1 Cork, IE" "$(pdftotext -layout sales.p
 expect_part 'report: a text' 0 '1 page' report shown.txt
 words() { "$talutil" report "$@" --pdf - 2>report.log | pdftotext -layout - - | tr -s ' ' | sed 's/^ //' | grep -v '^$'; }
 printf 'Name,Sum,Ölpreis\nZoë Ольга,"1,200.50",x\nTrần,3,😀\n' >sums.csv
+printf 'N,T\n1,\u05d0\u05d1 \u05d2\n2,\u0628\u0628 \u0643\u0650\u062a\n' >hebrew.csv
+verdict 'report: Hebrew and Arabic are found as they are read' '\u05d0\u05d1 \u05d2,\u0628\u0628 \u0643\u0650\u062a' \
+  "$("$talutil" report hebrew.csv --columns T --pdf - 2>report.log | pdftotext - - | python3 -c '
+import sys
+print(",".join(ascii(line.strip("\u202b\u202c"))[1:-1] for line in sys.stdin.read().split("\n") if "\u202b" in line))')"
 verdict 'report: columns, total, period' 'April 2009,Sum Name,1,200.50 Zoë Ольга,3 Trần,1,203.50 Total' \
   "$(words sums.csv --columns Sum,1 --total sum --period 'April 2009' | sed -n 2,6p | paste -sd,)"
 verdict 'report: what no font has' 'talutil: 1 characters are in no font and are shown as boxes: 😀; --font-file names a TrueType font that has them' \

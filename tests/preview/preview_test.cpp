@@ -549,6 +549,33 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   EXPECT_EQ(picture->place, (TwipsRectangle{1134, 1134, 30, 15}));
 }
 
+TEST_F(Pages, LinesFromRightToLeftBeginAtTheRight) {
+  print->MarginRight = print->PageWidth() - print->MarginLeft - 1200;  // Ten letters of Courier, up to 2334.
+  const auto lines = [&](const Text& text) {
+    const std::string runs = runs_of(document_of(text).pages[0]);
+    return runs.substr(0, runs.find("1134,15944"));
+  };
+  // Wrapped in the order of reading; then each line is put into order.
+  EXPECT_EQ(lines(u"\u05D0\u05D1 ab \u05D2\u05D3\u05D4\u05D5\u05D6"),
+            "1734,1134 ab\n2094,1134 \u05D0\u05D1\n1974,1134  \n1734,1374 \u05D2\u05D3\u05D4\u05D5\u05D6\n")
+      << "with a blank between, but none at the end";
+  EXPECT_EQ(lines(u"a\u05D0\u05D1 1"), "1134,1134 a\n1254,1134 1\n1494,1134 \u05D0\u05D1\n1374,1134  \n")
+      << "a number behind Hebrew is on its left";
+  // Tab stops count from there as well.
+  EXPECT_EQ(lines(u"\u05D0\tb"), "2214,1134 \u05D0\n1254,1134 b\n");
+
+  const auto grid = std::make_shared<Grid>(library.platform());
+  grid->put_Cols(2);
+  grid->AddItem(u"\u05D0 1\t\u05D0", -1);
+  grid->AddItem(u"b \u05D0\t7", -1);
+  grid->put_ColAlignment(1, 1);
+  print->MarginRight = 1134;
+  // Courier of 8 points: 96 twips a letter; columns of 1000 with 60 on either side.
+  EXPECT_THAT(runs_of(document_of(grid).pages[0]),
+              ::testing::StartsWith("1786,1164 1\n1978,1164 \u05D0\n1882,1164  \n2194,1164 \u05D0\n"
+                                    "1194,1416 b \n1386,1416 \u05D0\n2194,1416 7\n"));
+}
+
 /// The texts of a page that are at a height, from the left, without the space between them.
 std::string line_at(const Page& page, std::int32_t top) {
   std::string line;

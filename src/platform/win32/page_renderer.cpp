@@ -69,7 +69,9 @@ class Drawer {
       end = here - before;
       before = here;
     }
-    ExtTextOutW(device_, x_of(run.left), y_of(run.top + baseline(run.font)), 0, nullptr, wide(run.text),
+    // The platform orders and mirrors what runs from right to left.
+    const UINT options = run.is_right_to_left ? ETO_RTLREADING : 0;
+    ExtTextOutW(device_, x_of(run.left), y_of(run.top + baseline(run.font)), options, nullptr, wide(run.text),
                 static_cast<UINT>(length), ends.data());
   }
 
