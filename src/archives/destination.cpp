@@ -34,10 +34,10 @@ Destination::Destination(Folders& folders, Files& files, const Text& path) : ign
 
 Text Destination::key_of(const Text& name) const { return ignores_case_ ? upper_case(name) : name; }
 
-/// The key under which a folder is cached; no part contains a separator.
+/// The key under which a folder is cached; no part contains a slash.
 Text Destination::key_of(std::span<const Text> parts) const {
   Text key;
-  for (const Text& part : parts) key += key_of(part) + u"\\";
+  for (const Text& part : parts) key += key_of(part) + u"/";
   return key;
 }
 

@@ -29,17 +29,33 @@ TextView without_drive(TextView name) {
   return has_drive ? name.substr(2) : name;
 }
 
+bool has_refused_form(TextView name) noexcept {
+  return name.find(u'\0') != TextView::npos || name.size() > longest_path;
+}
+
+/// Whether parts lead to a place below the destination that is not too deep.
+bool are_below(const std::vector<Text>& parts) {
+  return !parts.empty() && parts.size() <= most_parts &&
+         std::ranges::none_of(parts, [](const Text& part) { return part == u".." || part.size() > longest_part; });
+}
+
 }  // namespace
 
 std::optional<std::vector<Text>> safe_parts(TextView name) {
-  if (name.find(u'\0') != TextView::npos || name.size() > longest_path) return std::nullopt;
+  if (has_refused_form(name)) return std::nullopt;
   std::vector<Text> parts = parts_of(without_drive(name));
-  if (parts.empty() || parts.size() > most_parts) return std::nullopt;
+  if (!are_below(parts)) return std::nullopt;
   for (Text& part : parts) {
-    if (part == u".." || part.size() > longest_part) return std::nullopt;
     part = made_safe(std::move(part));
     if (part.size() > longest_part) return std::nullopt;
   }
+  return parts;
+}
+
+std::optional<std::vector<Text>> own_parts(TextView name) {
+  if (has_refused_form(name)) return std::nullopt;
+  std::vector<Text> parts = parts_of(name, u"/");
+  if (!are_below(parts)) return std::nullopt;
   return parts;
 }
 

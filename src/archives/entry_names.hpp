@@ -16,6 +16,10 @@ namespace talutil::archives {
 /// folders.
 [[nodiscard]] std::optional<std::vector<Text>> safe_parts(TextView name);
 
+/// The same for a system that allows every character but "/": the names are the entry's own, and only what would lead
+/// out of the destination is removed or refused. A backslash and a drive's colon are part of a name.
+[[nodiscard]] std::optional<std::vector<Text>> own_parts(TextView name);
+
 /// Whether a name, such as "./", refers to the destination folder itself.
 [[nodiscard]] bool is_destination(TextView name);
 

@@ -37,10 +37,10 @@ std::vector<Text> read_item_list(TextView list) {
   return items;
 }
 
-std::vector<Text> parts_of(TextView path) {
+std::vector<Text> parts_of(TextView path, TextView between) {
   std::vector<Text> parts;
   while (!path.empty()) {
-    const std::size_t end = std::min(path.find_first_of(separators), path.size());
+    const std::size_t end = std::min(path.find_first_of(between), path.size());
     const TextView part = path.substr(0, end);
     path.remove_prefix(std::min(end + 1, path.size()));
     if (!part.empty() && part != u".") parts.emplace_back(part);

@@ -324,7 +324,7 @@ class Archive::Extraction {
  private:
   void unpack(std::uint64_t index, const Entry& entry) {
     if (is_destination(entry.name)) return;
-    auto parts = safe_parts(entry.name);
+    auto parts = options_.own_names ? own_parts(entry.name) : safe_parts(entry.name);
     if (!parts) return pass_over_now(entry.name, "no file here can have this name");
     if (entry.facts.kind == FileKind::link) return pass_over_now(entry.name, "links are not unpacked");
     // One bad entry is no reason to lose the others.

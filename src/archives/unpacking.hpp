@@ -24,6 +24,7 @@ struct UnpackingOptions {
   Text password{};
   bool overwrite = false;    ///< False keeps existing files.
   bool keep_folders = true;  ///< False removes the folders from the names of entries.
+  bool own_names = false;    ///< Keeps names that only Windows does not allow; see entry_names.hpp.
   /// Limits on the unpacked size: a total in bytes (0 for no limit) and, above one gibibyte, a multiple of the
   /// archive's own size. Deflate cannot exceed the usual multiple, so that only claims that are not true do.
   std::uint64_t largest_total = 0;

@@ -41,6 +41,7 @@ struct UnzipOptions {
   bool overwrite = false;
   bool keep = false;  ///< Keeping existing files is what is wanted.
   bool no_folders = false;
+  bool own_names = false;
   bool list = false;
   bool json = false;
 };
@@ -129,13 +130,14 @@ Text meant_name(TextView stored) {
   return name;
 }
 
-/// Warns of each entry that is unpacked under a name that is safe on every system, but not its own; returns how many.
-std::uint64_t report_changed_names(const archives::Archive& archive, const Text& items, bool keep_folders) {
+/// Warns of each entry that is unpacked under another name than its own; returns how many.
+std::uint64_t report_changed_names(const archives::Archive& archive, const Text& items, bool keep_folders,
+                                   bool own_names = false) {
   const archives::EntryFilter filter(items);
   std::uint64_t changed = 0;
   for (std::uint64_t i = 0; i < archive.count(); ++i) {
     const Text stored = archive.entry(i).name;
-    const auto parts = archives::safe_parts(stored);
+    const auto parts = own_names ? archives::own_parts(stored) : archives::safe_parts(stored);
     if (!parts || !filter.matches(archives::parts_of(stored))) continue;
     if (!keep_folders && stored.ends_with(u'/')) continue;
     Text meant = meant_name(stored);
@@ -253,6 +255,7 @@ void extract(const UnzipOptions& options, archives::Archive& archive, posix::Pos
   unpacking.password = read_password(options.password_file);
   unpacking.overwrite = options.overwrite;
   unpacking.keep_folders = !options.no_folders;
+  unpacking.own_names = options.own_names;
   unpacking.notice = [&](const Text& entry, archives::Fate fate, std::string_view reason) {
     if (fate == archives::Fate::kept) {
       ++remainder.kept;
@@ -264,7 +267,7 @@ void extract(const UnzipOptions& options, archives::Archive& archive, posix::Pos
   for (std::uint64_t i = 0; i < archive.count(); ++i) {
     if (filter.matches(archives::parts_of(archive.entry(i).name))) ++remainder.chosen;
   }
-  remainder.renamed = report_changed_names(archive, unpacking.items, unpacking.keep_folders);
+  remainder.renamed = report_changed_names(archive, unpacking.items, unpacking.keep_folders, unpacking.own_names);
   posix::ThreadTasks tasks;
   unpacking.tasks = &tasks;
   ProgressBar bar("unpacking");
@@ -335,6 +338,8 @@ void add_archives(CLI::App& app, Work& work) {
   unzip->add_flag("--keep", unpacking->keep, "Keep existing files without a warning and with exit code 0")
       ->excludes(overwrite);
   unzip->add_flag("--no-folders", unpacking->no_folders, "Write all files into one folder");
+  unzip->add_flag("--own-names", unpacking->own_names,
+                  "Keep names that Windows does not allow (\"aux.c\", \"a:b\") instead of changing them");
   unzip->add_flag("--list", unpacking->list, "List the entries instead: size, packed size, time (UTC), name");
   add_json(*unzip, unpacking->json, "Print what was done, or with --list one object per entry, as JSON");
   choose(*unzip, work, unpacking, &unpack_archive);

@@ -2,6 +2,7 @@
 
 #include "archives/entry_names.hpp"
 #include "archives/item_list.hpp"
+#include "tests/fakes/rows.hpp"
 
 namespace talutil::archives {
 namespace {
@@ -54,6 +55,24 @@ TEST(EntryNames, StayBelowTheFolder) {
   for (const Text& refused :
        {Text(u"../a"), Text(u"a/..\\b"), Text(), Text(u"C:"), Text(u"a\0b", 3), Text(256, u'x')}) {
     EXPECT_FALSE(safe_parts(refused)) << to_utf8(refused);
+  }
+}
+
+TEST(EntryNames, OfTheirOwnStayBelowTheFolderToo) {
+  const testing::Rows<Text, Text> rows = {
+      {"names that only Windows does not allow", u"a/aux.c/x:?. ", u"a|aux.c|x:?. "},
+      {"a backslash is a character", u"a\\..\\b", u"a\\..\\b"},
+      {"a drive is a name", u"C:/x", u"C:|x"},
+      {"control characters", u"a\nb", u"a\nb"},
+      {"from the root", u"/etc/passwd", u"etc|passwd"},
+      {"dots without a meaning", u"./a/.//b/", u"a|b"},
+      {"three dots are a name", u"...", u"..."},
+  };
+  testing::check_rows(rows,
+                      [](const Text& name, const Text& parts) { EXPECT_EQ(joined(own_parts(name).value()), parts); });
+  for (const Text& refused :
+       {Text(u"../a"), Text(u"a/../b"), Text(u".."), Text(u"/"), Text(u"a\0b", 3), Text(256, u'x')}) {
+    EXPECT_FALSE(own_parts(refused)) << to_utf8(refused);
   }
 }
 

@@ -296,6 +296,13 @@ mkdir odd && touch odd/aux.c odd/plain
 expect_part 'zip of a name that changes' 4 'talutil: "odd/aux.c" is unpacked as "odd/_aux.c"' zip odd.zip odd
 expect_part 'unzip of it' 4 'talutil: "odd/aux.c" is unpacked as "odd/_aux.c"' unzip odd.zip --to unpacked
 expect_part 'unzip of it alone' 4 'talutil: "odd/aux.c" is unpacked as "_aux.c"' unzip odd.zip aux.c --to unpacked --no-folders
+expect 'unzip under its own name' 0 'talutil: odd.zip: 1 entries unpacked' unzip odd.zip aux.c --to own --own-names
+verdict 'its own name' 'own/odd/aux.c' "$(find own -type f)"
+python3 -c 'import zipfile
+with zipfile.ZipFile("out.zip", "w") as archive:
+    for name in "../up", "/root", "a\\..\\b", "x/../../up": archive.writestr(name, "")'
+expect_part 'own names stay below the folder' 1 '"/root" is unpacked as "root"' unzip out.zip --to own/out --own-names
+verdict 'what is unpacked of them' 'a\..\b root' "$(cd own && find . -path './out*' -type f -printf '%f\n' | sort | paste -sd' '; ls -d up ../up 2>/dev/null)"
 expect_part 'unzip of another' 0 '1 entries unpacked' unzip odd.zip odd/plain --to unpacked --overwrite
 expect_part 'zip without items' 2 'name what is to be packed' zip a.zip
 expect_part 'AES without a password' 2 'give --encrypt or --password-file' zip a.zip archived --aes
