@@ -3,6 +3,7 @@
 #include <iostream>
 
 #include "cli/failure.hpp"
+#include "cli/help_json.hpp"
 #include "cli/help_text.hpp"
 #include "cli/near_names.hpp"
 #include "cli/options.hpp"
@@ -14,6 +15,7 @@ namespace {
 struct HelpOptions {
   std::vector<std::string> words;
   bool is_manual_page = false;
+  bool is_json = false;
 };
 
 const CLI::App* subcommand(const CLI::App& app, std::string_view name) {
@@ -27,8 +29,18 @@ std::string help_of(const CLI::App& app, const std::string& name) {
   return app.get_formatter()->make_help(&app, name, CLI::AppFormatMode::Normal);
 }
 
+/// Only classes and members are described in a form for programs.
+void print_json(const CLI::App& app, const std::vector<std::string>& words) {
+  const std::string name = words.empty() ? std::string() : words.front();
+  if (subcommand(app, name) != nullptr || !help_topic(name).empty() || words.size() > 1) {
+    throw usage_failure("help --json describes classes and members; \"talutil help " + name + "\" explains " + name);
+  }
+  help_json(name);
+}
+
 void print_help(const CLI::App& app, const HelpOptions& options) {
   if (options.is_manual_page) return man_page(app);
+  if (options.is_json) return print_json(app, options.words);
   const CLI::App* command = &app;
   std::string name = app.get_name();
   for (const std::string& word : options.words) {
@@ -80,7 +92,9 @@ void add_help(CLI::App& app, Work& work) {
   auto* const command = app.add_subcommand("help", "Explain a class, a member, a subcommand or a topic");
   command->add_option("NAME", options->words,
                       "A class or a member in any case, a subcommand, or one of: " + help_topics());
-  command->add_flag("--man", options->is_manual_page, "Print the manual page, talutil.1");
+  auto* const manual = command->add_flag("--man", options->is_manual_page, "Print the manual page, talutil.1");
+  add_json(*command, options->is_json, "Print the class or the member, or every member, one object a line, as JSON");
+  command->get_option("--json")->excludes(manual);
   choose(*command, work, options, [&app](const HelpOptions& chosen) { print_help(app, chosen); });
 }
 

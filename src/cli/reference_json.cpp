@@ -3,6 +3,7 @@
 
 #include "cli/classes.hpp"
 #include "cli/commands.hpp"
+#include "cli/help_json.hpp"
 #include "cli/json.hpp"
 
 namespace talutil::cli {
@@ -76,7 +77,24 @@ std::string class_json(const PublishedClass& owner) {
   return json::object(fields);
 }
 
+/// A member by itself, which has to say whose it is.
+std::string single_member_json(const PublishedClass& owner, const Entry& entry) {
+  return "{\"class\": " + json::text(owner.name()) + ", " + member_json(owner, entry).substr(1);
+}
+
 }  // namespace
+
+void help_json(const std::string& name) {
+  if (name.empty()) {
+    for (const PublishedClass& owner : published_classes()) {
+      for (const Entry& entry : entries_of(owner.members)) std::cout << single_member_json(owner, entry) << '\n';
+    }
+    return;
+  }
+  const Subject subject = find_subject(name);
+  std::cout << (subject.member ? single_member_json(subject.owner, *subject.member) : class_json(subject.owner))
+            << '\n';
+}
 
 void reference_json() {
   std::cout << json::object({{"families", list_json(texts::families(), text_json)},

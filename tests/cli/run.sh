@@ -167,6 +167,17 @@ verdict 'each name once' '' "$("$talutil" list | cut -c10- | sed 's/[( ].*//' | 
 expect_part 'help: default' 0 'sDelimiter  the delimiter, one character (String; "," when left out)' \
   help readcommadelimstrtolist
 expect_part 'help of an indexed property' 0 'Grid.TextMatrix(Row As Long, Col As Long) As String' help grid.textmatrix
+verdict 'help as JSON' 'ORVUtils GetData String sSrcStr,iSt,iEn True' "$("$talutil" help getdata --json | python3 -c '
+import json, sys
+member = json.load(sys.stdin)
+names = ",".join(parameter["name"] for parameter in member["parameters"])
+print(member["class"], member["name"], member["type"], names, bool(member["examples"][0]["code"] and member["summary"]))')"
+verdict 'help of every member as JSON' "$("$talutil" reference --json | python3 -c '
+import json, sys
+print(sum(len(each["members"]) for each in json.load(sys.stdin)["classes"]))')" "$("$talutil" help --json | python3 -c '
+import json, sys
+print(len({(member["class"], member["name"]) for member in map(json.loads, sys.stdin)}))')"
+expect_part 'help of a subcommand as JSON' 2 'help --json describes classes and members' help zip --json
 expect_part 'help of a class' 0 'Created by CreateObject("TALUtil.ZipControl").' help TALUtil.ZipControl
 expect 'help of a name that classes share' 2 \
   'talutil: "errorcode" is a member of several classes; write one of ZipControl.ErrorCode, UnzipControl.ErrorCode' \
