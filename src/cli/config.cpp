@@ -155,7 +155,11 @@ void config_set(const ConfigOptions& options) {
               << ": an empty value, and one that begins with a backslash, is read as a "
               << "missing one\n";
   }
-  // The platform does not report a file that cannot be written, so read the value back.
+  // Members do not report a file that cannot be written.
+  if (const auto& failure = session.platform().profiles.failure()) {
+    throw run_time_failure("cannot write " + place_of(options), *failure);
+  }
+  // A file in which the value cannot be found again has not been written either.
   ProfileDocument expected("");
   expected.put(section, item, from_ansi(to_ansi(written)));
   const Text read = session.platform().profiles.value(file, section, item);

@@ -386,7 +386,12 @@ expect 'a profile file' 0 '' config set --file a.ini S k ' v '
 verdict 'its value' 'v' "$("$talutil" config get --file a.ini s K)"
 expect_part 'what a profile cannot keep' 0 'is read as a missing one' config set --file a.ini S k '\\server'
 "$talutil" config set --file a.ini S k v && chmod 444 a.ini
-expect 'a read-only profile' 1 'talutil: cannot write k in [S] of a.ini' config set --file a.ini S k w
+expect 'a read-only profile' 1 'talutil: cannot write k in [S] of a.ini: error 75: Path/File access error' \
+  config set --file a.ini S k w
+expect 'a profile in no folder' 1 'talutil: cannot write k in [S] of nosuch/a.ini: error 76: Path not found' \
+  config set --file nosuch/a.ini S k w
+verdict 'a profile on a full disk' 'talutil: cannot write k in [S] of full.ini: error 61: Disk full' \
+  "$( (ulimit -f 0; trap '' XFSZ; "$talutil" config set --file full.ini S k v) 2>&1)"
 verdict 'list of a profile by a Windows path' $'[S]\nk=v' "$("$talutil" config list --file "Z:${work//\//\\}\\A.INI")"
 expect 'through the member' 0 d call GetCfgFileData S none d a.ini True
 echo 'not a database, but a file long enough to be taken for something else' >bad.db

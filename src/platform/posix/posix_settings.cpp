@@ -1,5 +1,6 @@
 #include "platform/posix/posix_settings.hpp"
 
+#include <errno.h>
 #include <fcntl.h>
 #include <sys/file.h>
 
@@ -76,24 +77,29 @@ Text PosixProfiles::item_names(const Text& file, const Text& section) {
 }
 
 void PosixProfiles::put(const Text& file, const Text& section, const Text& item, const Text& value) {
+  failure_.reset();
   try {
-    // The file itself gets replaced, so the folder is locked instead.
-    const std::string folder = std::filesystem::path(files_.native(file)).parent_path();
-    const Descriptor folder_lock(open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    if (folder_lock.get() < 0) return;
-    lock(folder_lock, LOCK_EX);
-    const std::string before = read_for_change(files_, file);
-    ProfileDocument document(before);
-    document.put(section, item, value);
-    const std::string after = document.bytes();
-    if (after == before) return;
-    const auto output = files_.open_output(file);
-    output->write(after);
-    output->close();
-  } catch (const RunTimeError&) {
-    // As on Windows, this is not reported.
-    return;
+    write(file, section, item, value);
+  } catch (const RunTimeError& error) {
+    // As on Windows, hosts do not learn of it.
+    failure_ = error;
   }
+}
+
+void PosixProfiles::write(const Text& file, const Text& section, const Text& item, const Text& value) {
+  // The file itself gets replaced, so the folder is locked instead.
+  const std::string folder = std::filesystem::path(files_.native(file)).parent_path();
+  const Descriptor folder_lock(open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+  if (folder_lock.get() < 0) raise_for(errno == ENOENT ? ENOTDIR : errno, folder);
+  lock(folder_lock, LOCK_EX);
+  const std::string before = read_for_change(files_, file);
+  ProfileDocument document(before);
+  document.put(section, item, value);
+  const std::string after = document.bytes();
+  if (after == before) return;
+  const auto output = files_.open_output(file);
+  output->write(after);
+  output->close();
 }
 
 bool PosixSettingsStore::remove(const Text& application, const Text& section, const Text& key) {

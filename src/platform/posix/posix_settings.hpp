@@ -1,7 +1,9 @@
 #pragma once
 
+#include <optional>
 #include <vector>
 
+#include "automation/run_time_error.hpp"
 #include "platform/posix/hive.hpp"
 #include "platform/posix/posix_files.hpp"
 #include "platform/settings.hpp"
@@ -18,8 +20,14 @@ class PosixProfiles final : public Profiles {
   Text item_names(const Text& file, const Text& section) override;
   void put(const Text& file, const Text& section, const Text& item, const Text& value) override;
 
+  /// Why the last write failed, which `put` does not report; nothing if it was done.
+  [[nodiscard]] const std::optional<RunTimeError>& failure() const noexcept { return failure_; }
+
  private:
+  void write(const Text& file, const Text& section, const Text& item, const Text& value);
+
   PosixFiles& files_;
+  std::optional<RunTimeError> failure_;
 };
 
 /// The settings, kept in the hive under the same key as in a real registry.
