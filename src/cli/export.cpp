@@ -70,7 +70,7 @@ void export_table(const ExportOptions& options) {
   on_file(options.output, [&] {
     const Control grid(source, platform.computer.locale());
     const Control scratch(std::make_shared<Grid>(platform.platform()), platform.computer.locale());
-    GridExport work(grid, scratch);
+    GridExport work(platform.platform(), grid, scratch);
     if (options.rows.empty())
       work.copy_all_rows(0);
     else

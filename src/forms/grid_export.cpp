@@ -4,18 +4,19 @@
 
 #include "automation/checked.hpp"
 #include "automation/control.hpp"
+#include "automation/run_time_error.hpp"
+#include "controls/delimited_text.hpp"
 #include "controls/grid.hpp"
 
 namespace talutil {
 
-GridExport::GridExport(const Control& grid, const Control& table)
-    : grid_(grid), table_(table), own_table_(dynamic_cast<Grid*>(table.object().get())) {
+GridExport::GridExport(const Platform& platform, const Control& grid, const Control& table)
+    : platform_(platform), grid_(grid), table_(table), own_table_(dynamic_cast<Grid*>(table.object().get())) {
   table_.put(u"Rows", std::int32_t{0});
   table_.put(u"Cols", std::int32_t{0});
   const auto columns = grid_.get<std::int32_t>(u"Cols");
-  std::int32_t shown = 0;
   for (std::int32_t c = 0; c < columns; ++c) {
-    if (!grid_.get<Boolean>(u"ColHidden", {c})) table_.put(u"Cols", ++shown);
+    if (!grid_.get<Boolean>(u"ColHidden", {c})) table_.put(u"Cols", ++columns_);
   }
 }
 
@@ -58,20 +59,47 @@ void GridExport::copy_rows(std::int32_t first, std::int32_t last) {
       RepeatedUse& cell = use(text, u"TextMatrix", {r, c});
       cell.set(0, r);
       cell.set(1, c);
-      const TextView shown = cell.run_text(grid_.locale());
-      if (own_table_ != nullptr)
-        own_table_->put_cell(copied_, k, shown);
-      else
-        table_.put(u"TextMatrix", {copied_, k}, shown);
+      add_cell(k, cell.run_text(grid_.locale()));
       ++k;
     }
+    end_row(k);
     ++copied_;
   }
 }
 
-void GridExport::save(const Text& file, bool with_fixed_cells) const {
+void GridExport::add_cell(std::int32_t column, TextView text) {
+  if (own_table_ == nullptr) return table_.put(u"TextMatrix", {copied_, column}, text);
+  if (column == columns_) raise(ErrorNumber::subscript_out_of_range);
+  if (column > 0) block_ += u',';
+  append_delimited(block_, text, u',');
+}
+
+/// A grid may hide more columns while it is read; these are empty cells.
+void GridExport::end_row(std::int32_t cells) {
+  constexpr std::size_t block_length = 1U << 16U;
+  if (own_table_ == nullptr) return;
+  for (std::int32_t c = std::max(cells, 1); c < columns_; ++c) block_ += u',';
+  block_ += u"\r\n";
+  if (block_.size() >= block_length) end_block();
+}
+
+void GridExport::end_block() {
+  is_wide_ = is_wide_ || !platform_.code_page.holds(block_);
+  blocks_.push_back(block_);
+  block_.clear();
+}
+
+void GridExport::save(const Text& file, bool with_fixed_cells) {
   constexpr std::int16_t comma_text = 3;
+  if (own_table_ != nullptr) return save_blocks(file);
   table_.call(u"SaveGrid", {file, comma_text, Boolean(with_fixed_cells)});
+}
+
+void GridExport::save_blocks(const Text& file) {
+  end_block();
+  TableFile output(platform_.files, platform_.code_page, file, is_wide_);
+  for (const Text& block : blocks_) output.write(block);
+  output.close();
 }
 
 }  // namespace talutil

@@ -94,7 +94,7 @@ void ORVUtils::ExportGridData(const Variant& m_Grid1, const std::int16_t& iDontS
 
     const Control grid(m_Grid1, locale());
     const Control scratch(library_.components().borrow_scratch_grid(), locale());
-    GridExport grid_export(grid, scratch);
+    GridExport grid_export(library_.platform(), grid, scratch);
     // Hosts rely on this meaning: True is every row, starting at row iDontSaveHeader.
     if (bSelection.is_exactly_true())
       grid_export.copy_all_rows(iDontSaveHeader);
