@@ -6,6 +6,7 @@ namespace talutil {
 
 namespace {
 
+// Small enough to stay in the processor's cache, also as text.
 constexpr std::size_t buffer_size = 1U << 18U;
 constexpr char end_of_file_mark = 26;
 
@@ -69,10 +70,23 @@ void SequentialInput::break_off(Text& text) {
   carried_.clear();
 }
 
+/// Appends what is pending if it is ASCII, as most files are.
+bool SequentialInput::append_ascii(Text& text) {
+  const std::size_t start = text.size();
+  text.resize(start + pending().size());
+  const bool is_ascii = widen_ascii(pending(), text.data() + start);
+  if (is_ascii)
+    begin_ = end_;
+  else
+    text.resize(start);
+  return is_ascii;
+}
+
 Text SequentialInput::read_rest() {
   Text text;
   text.reserve(static_cast<std::size_t>(file_->size()));
   while (!at_end()) {
+    if (carried_.empty() && append_ascii(text)) continue;
     const std::size_t length = pending().rfind('\n') + 1;
     carried_ += pending().substr(0, length);
     if (length > 0) break_off(text);

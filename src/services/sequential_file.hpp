@@ -32,6 +32,7 @@ class SequentialInput {
   /// Makes a line of its bytes.
   void convert(std::string_view bytes, Text& line);
   void break_off(Text& text);
+  [[nodiscard]] bool append_ascii(Text& text);
 
   CodePage& code_page_;
   std::unique_ptr<InputFile> file_;
