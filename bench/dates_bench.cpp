@@ -1,6 +1,13 @@
 #include <benchmark/benchmark.h>
 
 #include <chrono>
+#include <sstream>
+#include <string>
+#include <vector>
+
+#ifdef TALUTIL_BENCH_DATE
+#include <date/date.h>
+#endif
 
 #include "bench/toolkit.hpp"
 
@@ -20,6 +27,55 @@ void format_date(benchmark::State& state, TextView pattern) {
 }
 BENCHMARK_CAPTURE(format_date, day, u"DD/MM/YYYY");
 BENCHMARK_CAPTURE(format_date, day_and_time, u"DD/MM/YYYY HH:MM");
+
+// ---- a million texts: read and written, by us and by the reference implementation of the standard's calendar
+
+constexpr std::int32_t date_count = 1'000'000;
+
+/// Days of two centuries in an order without a pattern.
+template <class String>
+std::vector<String> day_texts() {
+  std::vector<String> texts;
+  std::uint32_t random = 42;
+  for (std::int32_t i = 0; i < date_count; ++i) {
+    random = random * 1664525 + 1013904223;
+    const Date day{static_cast<double>(1 + (random >> 8U) % 73000)};
+    const Text text = talutil::format_date(day, u"DD/MM/YYYY");
+    texts.emplace_back(text.begin(), text.end());
+  }
+  return texts;
+}
+
+void million_texts(benchmark::State& state) {
+  const auto texts = day_texts<Text>();
+  for (auto _ : state) {
+    for (const Text& text : texts) {
+      if (talutil::format_date(*talutil::text_to_date(text, 2009), u"DD/MM/YYYY") != text)
+        state.SkipWithError("another date");
+    }
+  }
+}
+BENCHMARK(million_texts)->Unit(benchmark::kMillisecond);
+
+#ifdef TALUTIL_BENCH_DATE
+void million_texts_by_date_library(benchmark::State& state) {
+  const auto texts = day_texts<std::string>();
+  std::istringstream in;
+  std::ostringstream out;
+  for (auto _ : state) {
+    for (const std::string& text : texts) {
+      date::sys_days day;
+      in.clear();
+      in.str(text);
+      date::from_stream(in, "%d/%m/%Y", day);
+      out.str({});
+      date::to_stream(out, "%d/%m/%Y", day);
+      if (out.str() != text) state.SkipWithError("another date");
+    }
+  }
+}
+BENCHMARK(million_texts_by_date_library)->Unit(benchmark::kMillisecond);
+#endif
 
 template <class Call>
 void member(benchmark::State& state, Call call) {

@@ -3,6 +3,7 @@
 #include <benchmark/benchmark.h>
 #include <malloc.h>
 
+#include "bench/quick_grid.hpp"
 #include "bench/toolkit.hpp"
 #include "controls/grid.hpp"
 
@@ -10,29 +11,10 @@ namespace talutil {
 
 namespace {
 
-/// A grid that responds at once: every cell has the same text.
-class QuickGrid final : public Object {
- public:
-  static constexpr std::int32_t rows = 10000;
-  static constexpr std::int32_t columns = 20;
-
-  std::int32_t ticks = 0;
-
-  std::int32_t member_id(TextView name) override {
-    constexpr TextView names[] = {u"Rows",      u"Cols",      u"FixedRows", u"ColDataType",
-                                  u"ColHidden", u"RowHidden", u"TextMatrix"};
-    return static_cast<std::int32_t>(std::ranges::find(names, name) - std::begin(names));
-  }
-
-  Variant invoke(std::int32_t member, Access access, std::span<const Variant> /*arguments*/) override {
-    if (access == Access::put) return ++ticks, Variant();
-    const Variant answers[] = {rows, columns, 0, 11, Boolean(false), Boolean(false)};
-    return member < 6 ? answers[member] : Variant(u"cell 1234 12");
-  }
-};
+constexpr std::int32_t rows = 10000;
 
 struct GridToolkit : Toolkit {
-  std::shared_ptr<QuickGrid> grid = std::make_shared<QuickGrid>();
+  std::shared_ptr<QuickGrid> grid = std::make_shared<QuickGrid>(rows);
 };
 
 void SelectGridRows(benchmark::State& state) {
@@ -45,9 +27,9 @@ void SelectRowsBare(benchmark::State& state) {
   GridToolkit toolkit;
   Object& grid = *toolkit.grid;
   for (auto _ : state) {
-    for (std::int32_t r = 0; r < QuickGrid::rows; ++r) {
+    for (std::int32_t r = 0; r < rows; ++r) {
       const Variant arguments[] = {r, 0, Boolean(true)};
-      grid.invoke(6, Access::put, arguments);
+      grid.invoke(QuickGrid::text_matrix, Access::put, arguments);
     }
   }
 }
@@ -67,14 +49,14 @@ void ExportBare(benchmark::State& state) {
   Object& grid = *toolkit.grid;
   for (auto _ : state) {
     std::string text;
-    for (std::int32_t r = 0; r < QuickGrid::rows; ++r) {
+    for (std::int32_t r = 0; r < rows; ++r) {
       const Variant row = r;
-      if (grid.invoke(5, Access::get, {&row, 1}).to_boolean(plain_numbers)) continue;
+      if (grid.invoke(QuickGrid::row_hidden, Access::get, {&row, 1}).to_boolean(plain_numbers)) continue;
       for (std::int32_t c = 0; c < QuickGrid::columns; ++c) {
         const Variant cell[] = {r, c};
-        if (grid.invoke(4, Access::get, {cell + 1, 1}).to_boolean(plain_numbers)) continue;
+        if (grid.invoke(QuickGrid::column_hidden, Access::get, {cell + 1, 1}).to_boolean(plain_numbers)) continue;
         if (c > 0) text += ',';
-        text += to_ansi(grid.invoke(6, Access::get, cell).to_text(plain_numbers));
+        text += to_ansi(grid.invoke(QuickGrid::text_matrix, Access::get, cell).to_text(plain_numbers));
       }
       text += "\r\n";
     }
@@ -85,7 +67,7 @@ BENCHMARK(ExportBare)->Unit(benchmark::kMillisecond);
 
 /// A million cells of 12 characters.
 void MemoryOfGrid(benchmark::State& state) {
-  constexpr std::int32_t rows = 50000;
+  constexpr std::int32_t filled_rows = 50000;
   constexpr std::int32_t columns = 20;
   GridToolkit toolkit;
   const auto in_use = [] {
@@ -96,11 +78,11 @@ void MemoryOfGrid(benchmark::State& state) {
     const double before = in_use();
     Grid grid(toolkit.library.platform());
     grid.put_Cols(columns);
-    for (std::int32_t r = 0; r < rows; ++r) {
+    for (std::int32_t r = 0; r < filled_rows; ++r) {
       grid.put_Rows(r + 1);
       for (std::int32_t c = 0; c < columns; ++c) grid.put_cell(r, c, u"cell 1234 12");
     }
-    state.counters["bytes_a_cell"] = (in_use() - before) / (static_cast<double>(rows) * columns);
+    state.counters["bytes_a_cell"] = (in_use() - before) / (static_cast<double>(filled_rows) * columns);
   }
 }
 BENCHMARK(MemoryOfGrid)->Unit(benchmark::kMillisecond);
