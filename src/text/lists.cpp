@@ -7,6 +7,7 @@
 #include "library/library.hpp"
 #include "library/orv_utils.hpp"
 #include "text/characters.hpp"
+#include "text/overriding.hpp"
 
 namespace talutil {
 
@@ -87,12 +88,20 @@ std::int16_t ORVUtils::StringPosition(const Text& sSource, const std::int16_t& i
   const auto length = static_cast<std::int64_t>(s.size());
   const auto is_digit = by_code(library_.platform().code_page, is_digit_code);
   const std::int32_t blanks = SubStrCount(u" ", s);
+  std::int64_t blank = 0;
+  std::int64_t digit = 0;  // No digit is between the blank and this position, which is itself one if it exists.
   for (std::int32_t k = 1; k <= blanks; ++k) {
-    const std::int32_t blank = MyPos(u" ", s, k);
+    if (may_see_calls(*this)) {
+      blank = MyPos(u" ", s, k);
+      digit = 0;
+    } else {
+      // The same without a search from the start, which would be too much work for a text of many blanks.
+      blank = static_cast<std::int64_t>(s.find(u' ', static_cast<std::size_t>(blank))) + 1;
+    }
+    while (digit <= length && (digit <= blank || !is_digit(s[static_cast<std::size_t>(digit - 1)]))) ++digit;
     // The window ends at the length minus the blank's position, not at the length, because hosts have stored addresses
     // that were split that way.
-    const TextView window = between(s, std::int64_t{blank} + 1, length - blank);
-    if (std::ranges::none_of(window, is_digit)) return checked_cast<std::int16_t>(blank);
+    if (digit > length - blank) return checked_cast<std::int16_t>(blank);
   }
   return 0;
 }

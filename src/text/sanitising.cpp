@@ -1,7 +1,6 @@
 #include <algorithm>
 #include <cstdint>
 #include <optional>
-#include <typeinfo>
 #include <vector>
 
 #include "automation/checked.hpp"
@@ -10,6 +9,7 @@
 #include "library/orv_utils.hpp"
 #include "text/characters.hpp"
 #include "text/forbidden_characters.hpp"
+#include "text/overriding.hpp"
 
 namespace talutil {
 
@@ -120,9 +120,6 @@ class GivenValue {
   Variant value_;
   Text text_;
 };
-
-/// Only a derived class can override a member and so see which others a member calls.
-bool may_see_calls(const ORVUtils& utils) noexcept { return typeid(utils) != typeid(ORVUtils); }
 
 constexpr bool drops_commas(std::int16_t extras) noexcept { return extras == 1 || extras == 3; }
 constexpr bool drops_blanks(std::int16_t extras) noexcept { return extras == 2 || extras == 3; }

@@ -115,7 +115,8 @@ TEST_F(TextMembers, ReadListsFieldByField) {
 
 TEST_F(TextMembers, ReplaceWordsFromTheLeft) {
   for (int i = 0; i < 20'000; ++i) {
-    const Text word = generator.text_of(i % 2 == 0 ? u"ab" : u"ab\r", 8);
+    // Words of up to eight characters, and longer ones.
+    const Text word = generator.text_of(i % 2 == 0 ? u"ab" : u"ab\r", 12);
     const auto part = [&] {
       return static_cast<std::size_t>(generator.whole(0, static_cast<std::int32_t>(word.size())));
     };
@@ -222,6 +223,15 @@ TEST_F(TextMembers, CallOneAnotherInOrder) {
             (std::vector<Text>{u"MyPos|,|A,B,|1", u"MyPos|,|A,B,|2", u"MyPos|,|A,|1", u"MyPos|,|A|1", u"MyPos|,|A|2",
                                u"StringReplace|A\r\nB|\r|.", u"StringReplace|A.\nB|\n|.", u"SubStrCount| |1 2 X Y Z",
                                u"MyPos| |1 2 X Y Z|1", u"MyPos| |1 2 X Y Z|2"}));
+}
+
+// An object whose members may be overridden searches for each blank by a call of MyPos.
+TEST_F(TextMembers, StringPositionIsTheSameWhereNobodySeesItsCalls) {
+  ORVUtils plain(library);
+  for (int i = 0; i < 3000; ++i) {
+    const Text text = generator.text_of(u"ab  1", 14);
+    EXPECT_EQ(plain.StringPosition(text, 1), utils.StringPosition(text, 1)) << to_utf8(text);
+  }
 }
 
 }  // namespace
