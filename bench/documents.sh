@@ -1,9 +1,10 @@
 #!/usr/bin/env bash
-# Compares reports with other programs that create PDF: bench/documents.sh PATH_TO_TALUTIL
+# Compares reports with other programs that create PDF: bench/documents.sh PATH_TO_TALUTIL [lines]
 # Compares a table of 10,000 rows with LibreOffice, if that is installed, and a text of 100,000 lines with enscript and
-# ps2pdf; then measures the cost of more pages. The ratios are of the best of three times, alternating.
+# ps2pdf; then measures the cost of more pages. The ratios are of the best of three times, alternating. With "lines",
+# prints instead, for texts and tables of 10 to 10,000 pages, lines of NAME, PAGES and SECONDS with tabs between them.
 set -euo pipefail
-[ -x "${1:-}" ] || { echo "usage: bench/documents.sh PATH_TO_TALUTIL" >&2; exit 2; }
+[ -x "${1:-}" ] || { echo "usage: bench/documents.sh PATH_TO_TALUTIL [lines]" >&2; exit 2; }
 talutil=$(realpath "$1")
 work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
@@ -14,11 +15,31 @@ measure() { /usr/bin/env python3 - "$@" <<'P'
 import resource, subprocess, sys, time
 begin = time.monotonic()
 subprocess.run(sys.argv[1:], check=True, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
-print(f"{time.monotonic() - begin:.2f} {resource.getrusage(resource.RUSAGE_CHILDREN).ru_maxrss}")
+print(f"{time.monotonic() - begin:.3f} {resource.getrusage(resource.RUSAGE_CHILDREN).ru_maxrss}")
 P
 }
 
 least() { sort -n | head -1; }
+
+# Cost against size, the best of three times.
+print_lines() {
+  local pages name
+  for pages in 10 100 1000 10000; do
+    # As many as fit on a page.
+    awk -v lines=$((pages * 58)) 'BEGIN { for (i = 1; i <= lines; ++i) print "Line", i, "of a text with some words in it" }' >text.txt
+    awk -v rows=$((pages * 57)) 'BEGIN { print "Number,Name,Amount"
+      for (i = 1; i <= rows; ++i) printf "%d,Customer %d,%.2f\n", i, i * 7, i * 1.37 }' >table.csv
+    for name in text.txt table.csv; do
+      for _ in 1 2 3; do measure "$talutil" report $name --pdf out.pdf; done >times
+      printf '%s\t%s\t%s\n' "${name%.*}" "$(pdfinfo out.pdf | sed -n 's/^Pages: *//p')" "$(least <times | cut -d' ' -f1)"
+    done
+  done
+}
+
+if [ "${2:-}" = lines ]; then
+  print_lines
+  exit 0
+fi
 
 compare() {  # WHAT, GOAL, ours, theirs: files of measurements
   local ours theirs
