@@ -143,6 +143,7 @@ void UnpackedFiles::take_names(std::vector<File>& files) {
     for_each([](File& file) { file.file->flush_contents(); });
     for_each([](File& file) { file.file->take_name_unflushed(); });
   } catch (...) {
+    is_over_ = true;
     flush_names();
     throw;
   }
