@@ -13,7 +13,7 @@ memory_folder=/tmp
 native_packages="build-essential python3 zlib1g-dev cmake ninja-build ccache libgtest-dev googletest libbenchmark-dev libcli11-dev libssl-dev libsqlite3-dev tzdata unicode-data"
 exchange_packages="zip unzip p7zip-full libarchive-tools advancecomp python3 poppler-utils qpdf fonts-dejavu-core pkg-config fish zsh"
 fuzz_packages="clang"
-bench_packages="mawk"
+bench_packages="mawk libhowardhinnant-date-dev"
 windows_packages="binutils libz-mingw-w64-dev debootstrap debian-archive-keyring g++-mingw-w64-i686-posix mingw-w64-tools xvfb xauth"
 windows64_packages="libz-mingw-w64-dev g++-mingw-w64-x86-64-posix mingw-w64-tools wine64 xvfb xauth"
 
