@@ -39,7 +39,7 @@ class GridExport {
   void end_block();
   void save_blocks(const Text& file);
 
-  const Platform& platform_;
+  Platform platform_;
   const Control& grid_;
   const Control& table_;
   Grid* own_table_;           ///< The table if it is our own grid; otherwise null.
