@@ -83,8 +83,8 @@ void unpack_together(Host& host) {
   archives::Progress progress;
   try {
     archives::Archive archive(host.path(u"a.zip"), host.real->folders);
-    archive.extract(host.path(u"out"), {.overwrite = true, .tasks = &tasks}, host.real->folders, host.real->files,
-                    {}, progress);
+    archive.extract(host.path(u"out"), {.overwrite = true, .tasks = &tasks}, host.real->folders, host.real->files, {},
+                    progress);
   } catch (const archives::Error& error) {
     throw RunTimeError(ErrorNumber::device_io_error, from_utf8(error.what()));
   }
