@@ -24,7 +24,8 @@ Text in_name_case(const ORVUtils& utils, const Text& text) {
 
 bool has_machinery(TextView text) noexcept {
   constexpr TextView machinery = u"MACHINERY";
-  return !std::ranges::search(text, machinery, {}, [](char16_t unit) { return upper_case(unit); }).empty();
+  const auto is_letter = [](char16_t unit, char16_t letter) { return upper_case(unit) == letter; };
+  return std::search(text.begin(), text.end(), machinery.begin(), machinery.end(), is_letter) != text.end();
 }
 
 bool names_machinery(const ORVUtils& utils, const Variant& value) {
