@@ -11,6 +11,7 @@ seconds=$3
 mkdir -p "$fuzzers/corpus" "$fuzzers/broken"
 "$top/corpus.sh" "$2" "$fuzzers/corpus" >"$fuzzers/corpus.log" 2>&1 || { tail -5 "$fuzzers/corpus.log"; exit 1; }
 export UBSAN_OPTIONS=print_stacktrace=1
+cd "$fuzzers" || exit 1  # Some write files into the current folder.
 
 run() {
   local name=$1 longest=512
