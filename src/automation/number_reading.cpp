@@ -5,6 +5,7 @@
 #include <string>
 
 #include "automation/checked.hpp"
+#include "automation/decimal_digits.hpp"
 #include "automation/numbers.hpp"
 
 namespace talutil {
@@ -39,15 +40,13 @@ constexpr std::int64_t append_to_exponent(std::int64_t exponent, char16_t digit)
 
 /// A number with so few digits that both its digits and the power of ten are exact, and a single division rounds.
 std::optional<double> short_number(const Decimal& decimal) {
-  constexpr std::size_t most_digits = 15;
-  constexpr std::array<double, most_digits + 1> powers_of_10{1,   1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
-                                                             1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+  constexpr std::size_t most_digits = exact_powers_of_10.size() - 1;
   const auto count = static_cast<std::int64_t>(decimal.digits.size());
   const std::int64_t places = count - decimal.point;
   if (decimal.digits.size() > most_digits || decimal.point < 0 || places < 0) return std::nullopt;
   std::int64_t whole = 0;
   for (const char digit : decimal.digits) whole = whole * 10 + (digit - '0');
-  return static_cast<double>(whole) / powers_of_10[static_cast<std::size_t>(places)];
+  return static_cast<double>(whole) / exact_powers_of_10[static_cast<std::size_t>(places)];
 }
 
 double to_double(const Decimal& decimal) {

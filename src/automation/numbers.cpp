@@ -33,9 +33,6 @@ std::string plain_or_scientific(const DecimalDigits& number, int most_digits) {
          (size.size() < 2 ? "0" : "") + size;
 }
 
-constexpr std::array<double, 16> powers_of_10{1,   1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
-                                              1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
-
 Text whole_number_to_text(std::int64_t value) {
   std::array<char, 20> buffer;  // NOLINT(cppcoreguidelines-pro-type-member-init): written before it is read.
   const auto written = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value);
@@ -44,7 +41,7 @@ Text whole_number_to_text(std::int64_t value) {
 
 Text to_significant_digits(double value, int most_digits, const Locale& locale) {
   // Also drops the sign of a negative zero.
-  if (std::abs(value) < powers_of_10[static_cast<std::size_t>(most_digits)] && std::trunc(value) == value) {
+  if (std::abs(value) < exact_powers_of_10[static_cast<std::size_t>(most_digits)] && std::trunc(value) == value) {
     return whole_number_to_text(static_cast<std::int64_t>(value));
   }
   Text text(std::signbit(value) ? u"-" : u"");
