@@ -39,7 +39,7 @@ PackedFiles::PackedFiles(Collection& collection, std::int32_t level, Tasks& task
 PackedFiles::~PackedFiles() {
   is_over_ = true;
   for (const Source& source : sources_) {
-    if (source.whole && source.whole->done.valid()) source.whole->done.wait();
+    if (source.whole && source.whole->task) source.whole->task->wait();
   }
 }
 
@@ -102,7 +102,7 @@ void PackedFiles::open(Source& source) {
   begin_next();
   if (!source.whole) begin(source);
   Whole& whole = *source.whole;
-  whole.done.get();
+  whole.task->finish();
   source.was_read = true;
   source.size = whole.size;
   source.checksum = whole.checksum;
@@ -138,11 +138,9 @@ void PackedFiles::begin(Source& source) {
   // Not this file but an earlier one is being written: what fails is reported when it is this one's turn.
   try {
     whole.file = collection_.folder_of(*source.item).open(source.item->name);
-    whole.done = tasks_.start([this, &whole, size = source.item->facts.size] { pack(whole, size); });
+    whole.task = tasks_.start([this, &whole, size = source.item->facts.size] { pack(whole, size); });
   } catch (...) {
-    std::promise<void> failure;
-    failure.set_exception(std::current_exception());
-    whole.done = failure.get_future();
+    whole.task = std::make_unique<EndedTask>(std::current_exception());
   }
 }
 

@@ -63,7 +63,7 @@ class PackedFiles {
     std::uint64_t size = 0;
     std::uint32_t checksum = 0;
     bool is_packed = false;
-    std::future<void> done{};
+    std::unique_ptr<StartedTask> task{};
   };
   struct Source {
     PackedFiles* files;

@@ -45,7 +45,7 @@ UnpackedFiles::UnpackedFiles(Tasks& tasks, Progress& progress, PassOver pass_ove
 UnpackedFiles::~UnpackedFiles() {
   is_over_ = true;
   for (const auto& pending : pending_) {
-    if (pending->done.valid()) pending->done.wait();
+    if (pending->task) pending->task->wait();
   }
 }
 
@@ -69,7 +69,7 @@ void UnpackedFiles::begin(std::unique_ptr<Pending> pending) {
   pending_.push_back(std::move(pending));
   Pending& last = *pending_.back();
   try {
-    if (!last.is_written) last.done = tasks_.start([this, &last] { write(last); });
+    if (!last.is_written) last.task = tasks_.start([this, &last] { write(last); });
   } catch (...) {
     pending_.pop_back();
     throw;
@@ -111,7 +111,7 @@ void UnpackedFiles::settle(std::size_t count) {
       in_memory_ -= first->in_memory;
       const bool is_done = done_for(first->file.entry, [&] {
         if (first->is_written) return;
-        first->done.get();
+        first->task->finish();
         progress_.advance(first->file.facts.size, first->file.entry);
       });
       if (is_done) written.push_back(std::move(first->file));

@@ -79,7 +79,7 @@ class UnpackedFiles {
     Deflated entry{};
     std::uint64_t in_memory = 0;
     bool is_written = false;  ///< Not by a task.
-    std::future<void> done{};
+    std::unique_ptr<StartedTask> task{};
   };
 
   void begin(std::unique_ptr<Pending> pending);

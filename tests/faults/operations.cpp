@@ -74,7 +74,9 @@ void write_report(Host& host) {
 /// Runs tasks as one thread does, but lets files be finished together, as with threads.
 struct WideTasks final : Tasks {
   [[nodiscard]] std::size_t at_once() const noexcept override { return 4; }
-  [[nodiscard]] std::future<void> start(std::function<void()> task) override { return serial.start(std::move(task)); }
+  [[nodiscard]] std::unique_ptr<talutil::StartedTask> start(std::function<void()> task) override {
+    return serial.start(std::move(task));
+  }
   SerialTasks serial;
 };
 

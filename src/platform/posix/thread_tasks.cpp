@@ -5,6 +5,20 @@
 
 namespace talutil::posix {
 
+namespace {
+
+class ThreadTask final : public StartedTask {
+ public:
+  explicit ThreadTask(std::future<void> end) noexcept : end_(std::move(end)) {}
+  void wait() noexcept override { end_.wait(); }
+  void finish() override { end_.get(); }
+
+ private:
+  std::shared_future<void> end_;
+};
+
+}  // namespace
+
 ThreadTasks::ThreadTasks(std::size_t count)
     : count_(count != 0 ? count : std::max<std::size_t>(1, std::thread::hardware_concurrency())) {}
 
@@ -17,16 +31,16 @@ ThreadTasks::~ThreadTasks() {
   for (std::thread& thread : threads_) thread.join();
 }
 
-std::future<void> ThreadTasks::start(std::function<void()> task) {
+std::unique_ptr<StartedTask> ThreadTasks::start(std::function<void()> task) {
   while (threads_.size() < count_) threads_.emplace_back([this] { run_all(); });
   std::packaged_task<void()> work(std::move(task));
-  std::future<void> done = work.get_future();
+  auto started = std::make_unique<ThreadTask>(work.get_future());
   {
     const std::lock_guard lock(mutex_);
     waiting_.push_back(std::move(work));
   }
   has_work_.notify_one();
-  return done;
+  return started;
 }
 
 void ThreadTasks::run_all() {

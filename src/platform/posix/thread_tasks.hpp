@@ -2,6 +2,7 @@
 
 #include <condition_variable>
 #include <deque>
+#include <future>
 #include <mutex>
 #include <thread>
 #include <vector>
@@ -21,7 +22,7 @@ class ThreadTasks final : public Tasks {
   ~ThreadTasks() override;
 
   [[nodiscard]] std::size_t at_once() const noexcept override { return count_; }
-  [[nodiscard]] std::future<void> start(std::function<void()> task) override;
+  [[nodiscard]] std::unique_ptr<StartedTask> start(std::function<void()> task) override;
 
  private:
   void run_all();
