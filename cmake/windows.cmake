@@ -1,4 +1,5 @@
 # The Windows side: the platform, the type library generated from the interface table, and TALUtil.dll.
+add_link_options(-fno-lto)
 add_compile_definitions(UNICODE _UNICODE WINVER=0x0601 _WIN32_WINNT=0x0601)
 
 talutil_layer(win32 FOLDER platform/win32 BELOW platform FAST page_renderer.cpp stored_files.cpp win32_files.cpp)
@@ -64,6 +65,11 @@ add_custom_command(
   DEPENDS ${generated}/write_idl ${generated}/mend_typelib tools/base.idl
   COMMENT "Making the type library")
 
+# TALUtil.dll is optimised as a whole: the linker alone keeps every function that has unwind information, used or not. In
+# one part, because the compiler fails at some aliases between several; its sections are not those of single functions,
+# which would be padded to 16 bytes each.
+set(whole_link_options -flto -flto-partition=none -fwhole-program -fno-function-sections -fno-data-sections)
+
 # Loaded at any address, data never run as code. Nothing depends on the time: the same sources give the same bytes.
 set(dll_link_options -static -s -Wl,--gc-sections -Wl,--enable-stdcall-fixup -Wl,--no-insert-timestamp
     -Wl,--dynamicbase -Wl,--nxcompat)
@@ -89,7 +95,7 @@ add_library(TALUtil SHARED src/com/talutil.def ${generated}/TALUtil.rc ${generat
 set_target_properties(TALUtil PROPERTIES PREFIX "" RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR})
 target_link_libraries(TALUtil PRIVATE layer_com talutil_platform ole32 oleaut32 uuid advapi32 user32 gdi32)
 # Page-aligned sections are mapped; others are read and copied, which takes most of the loading time.
-target_link_options(TALUtil PRIVATE ${dll_link_options} -Wl,--file-alignment=4096)
+target_link_options(TALUtil PRIVATE ${dll_link_options} ${whole_link_options} -Wl,--file-alignment=4096)
 
 # For our own clients of the DLL: headers only, no code.
 add_library(client_headers INTERFACE)

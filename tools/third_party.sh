@@ -21,16 +21,18 @@ work=
 clean_up() { [ -z "$work" ] || rm -rf "$work"; }
 trap clean_up EXIT
 
-# The compiler and its flags; the Windows ones are those that our own files are built with.
+# The compiler and its flags; the Windows ones are those that our own files are built with. Besides its code, an object
+# for Windows holds what TALUtil.dll is optimised from as a whole, which leaves out what it does not use.
+whole="-flto -ffat-lto-objects"
 case $flavour in
   native) cc=cc ar=ar flags="-O2 -fPIC" ;;
   windows)
     cc=i686-w64-mingw32-gcc-posix ar=i686-w64-mingw32-ar toolchain=mingw32
-    flags="-O2 -msse2 -mfpmath=sse -mstackrealign -ffunction-sections -fdata-sections"
+    flags="-O2 -msse2 -mfpmath=sse -mstackrealign -ffunction-sections -fdata-sections $whole"
     ;;
   windows64)
     cc=x86_64-w64-mingw32-gcc-posix ar=x86_64-w64-mingw32-ar toolchain=mingw64
-    flags="-O2 -ffunction-sections -fdata-sections"
+    flags="-O2 -ffunction-sections -fdata-sections $whole"
     ;;
   fuzz) cc=clang ar=ar flags="-O1 -g1 -fPIC -fsanitize=address,fuzzer-no-link" ;;
   *) fail "usage: $0 [--where] native|windows|windows64|fuzz" ;;
@@ -99,6 +101,7 @@ build_libharu() {
   apply libharu libharu-memory-font.patch
   apply libharu libharu-nested-glyphs.patch
   apply libharu libharu-marks.patch
+  apply libharu libharu-fewer-tables.patch
   printf '#define LIBHPDF_HAVE_LIBZ\n#define LIBHPDF_HAVE_NOPNGLIB\n' >"$work/libharu/include/hpdf_config.h"
   # Its errors leave through our handler, which throws.
   (cd "$work/libharu/src" && for source in *.c; do

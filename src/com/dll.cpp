@@ -192,7 +192,8 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, void* /*reserve
   return TRUE;
 }
 
-STDAPI DllGetClassObject(REFCLSID class_id, REFIID id, void** out) {
+// What is exported is named in talutil.def; the optimiser of the whole library does not know that file.
+extern "C" [[gnu::externally_visible]] HRESULT WINAPI DllGetClassObject(REFCLSID class_id, REFIID id, void** out) {
   if (out == nullptr) return E_POINTER;
   *out = nullptr;
   for (std::size_t i = 0; i < std::size(class_objects); ++i) {
@@ -202,14 +203,20 @@ STDAPI DllGetClassObject(REFCLSID class_id, REFIID id, void** out) {
 }
 
 // The DLL stays in the process either way; this tells COM when it need not ask again.
-STDAPI DllCanUnloadNow() { return module_state.loaded == nullptr && module_state.references == 0 ? S_OK : S_FALSE; }
+extern "C" [[gnu::externally_visible]] HRESULT WINAPI DllCanUnloadNow() {
+  return module_state.loaded == nullptr && module_state.references == 0 ? S_OK : S_FALSE;
+}
 
-STDAPI DllRegisterServer() { return register_library(RegistrationScope::machine); }
+extern "C" [[gnu::externally_visible]] HRESULT WINAPI DllRegisterServer() {
+  return register_library(RegistrationScope::machine);
+}
 
-STDAPI DllUnregisterServer() { return unregister_library(RegistrationScope::machine); }
+extern "C" [[gnu::externally_visible]] HRESULT WINAPI DllUnregisterServer() {
+  return unregister_library(RegistrationScope::machine);
+}
 
 // "regsvr32 /n /i:user TALUtil.dll" registers for the current user only, without administrator rights.
-STDAPI DllInstall(BOOL install, LPCWSTR command_line) {
+extern "C" [[gnu::externally_visible]] HRESULT WINAPI DllInstall(BOOL install, LPCWSTR command_line) {
   const bool for_user = command_line != nullptr && lstrcmpiW(command_line, L"user") == 0;
   const auto scope = for_user ? RegistrationScope::user : RegistrationScope::machine;
   return install != FALSE ? register_library(scope) : unregister_library(scope);

@@ -81,9 +81,9 @@ void register_class(HKEY root, const identity::Class& entry, const std::wstring&
   server.remove(L"ThreadingModel");
   Key::create(root, key + L"\\ProgID").set(nullptr, program_id);
   Key::create(root, key + L"\\TypeLib").set(nullptr, text_of(guid_of(identity::type_library)));
-  Key::create(root, key + L"\\Version")
-      .set(nullptr,
-           std::to_wstring(identity::type_library_major) + L"." + std::to_wstring(identity::type_library_minor));
+  const std::string version =
+      std::to_string(identity::type_library_major) + "." + std::to_string(identity::type_library_minor);
+  Key::create(root, key + L"\\Version").set(nullptr, {version.begin(), version.end()});
   Key::create(root, key + L"\\Programmable").set(nullptr, L"");
 }
 
