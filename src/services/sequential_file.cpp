@@ -1,5 +1,11 @@
 #include "services/sequential_file.hpp"
 
+#include <algorithm>
+#include <array>
+#include <bit>
+#include <cstring>
+#include <span>
+
 #include "automation/run_time_error.hpp"
 
 namespace talutil {
@@ -7,8 +13,40 @@ namespace talutil {
 namespace {
 
 // Small enough to stay in the processor's cache, also as text.
-constexpr std::size_t buffer_size = 1U << 18U;
+constexpr std::size_t buffer_size = 1U << 16U;
 constexpr char end_of_file_mark = 26;
+constexpr char line_end = '\r';
+
+/// Writes a unit for each byte before the first line end and returns their number. Returns nothing if a byte before it
+/// is not ASCII, or if there is no line end in the room for units. (Not inline: the compiler, which would then know how
+/// short a line is, would copy it by an instruction that takes long to begin.)
+[[gnu::noinline]] std::optional<std::size_t> widen_line(std::string_view bytes, std::span<char16_t> units) noexcept {
+  using Bytes [[gnu::vector_size(8)]] = std::uint8_t;
+  using Units [[gnu::vector_size(16)]] = char16_t;
+  static_assert(std::endian::native == std::endian::little);
+  constexpr std::size_t step = sizeof(Bytes);
+  constexpr std::uint64_t not_ascii = 0x8080808080808080;
+  const std::size_t room = std::min(bytes.size(), units.size());
+  std::size_t at = 0;
+  for (; at + step <= room; at += step) {
+    Bytes block;
+    std::memcpy(&block, bytes.data() + at, step);
+    const Units wide = __builtin_convertvector(block, Units);
+    std::memcpy(units.data() + at, &wide, sizeof wide);
+    const auto ends = std::bit_cast<std::uint64_t>(static_cast<Bytes>(block == line_end));
+    const std::uint64_t special = ends | (std::bit_cast<std::uint64_t>(block) & not_ascii);
+    if (special == 0) continue;
+    at += static_cast<std::size_t>(std::countr_zero(special)) / 8;
+    return bytes[at] == line_end ? std::optional(at) : std::nullopt;
+  }
+  for (; at < room; ++at) {
+    const auto byte = static_cast<std::uint8_t>(bytes[at]);
+    if (byte == line_end) return at;
+    if (byte >= 0x80) return std::nullopt;
+    units[at] = byte;
+  }
+  return std::nullopt;
+}
 
 }  // namespace
 
@@ -33,8 +71,9 @@ bool SequentialInput::at_end() {
 
 void SequentialInput::read_line(Text& line) {
   if (at_end()) raise(ErrorNumber::input_past_end_of_file);
+  if (read_short_line(line)) return;
   while (!at_end()) {
-    const std::size_t length = pending().find('\r');
+    const std::size_t length = pending().find(line_end);
     // Only whole lines are converted, because a character may have several bytes.
     if (length == std::string_view::npos) {
       carried_ += pending();
@@ -48,13 +87,28 @@ void SequentialInput::read_line(Text& line) {
       convert(carried_, line);
       carried_.clear();
     }
-    begin_ += length + 1;
-    // The line feed may be the first byte of the next buffer.
-    if (!at_end() && pending().front() == '\n') ++begin_;
+    pass(length);
     return;
   }
   convert(carried_, line);
   carried_.clear();
+}
+
+/// Reads the next line if it is ASCII, as most are, and not long: its end is found while it is converted.
+bool SequentialInput::read_short_line(Text& line) {
+  constexpr std::size_t short_length = 1024;
+  std::array<char16_t, short_length> units;  // NOLINT(cppcoreguidelines-pro-type-member-init): filled first.
+  const auto length = widen_line(pending(), units);
+  if (!length) return false;
+  line.assign(units.data(), *length);
+  pass(*length);
+  return true;
+}
+
+/// Passes over a line and its end, of which the line feed may be the first byte of the next buffer.
+void SequentialInput::pass(std::size_t length) {
+  begin_ += length + 1;
+  if (!at_end() && pending().front() == '\n') ++begin_;
 }
 
 void SequentialInput::convert(std::string_view bytes, Text& line) {

@@ -28,6 +28,8 @@ class SequentialInput {
   /// Bytes that were read from the file but not consumed yet.
   [[nodiscard]] std::string_view pending() const noexcept { return {buffer_.data() + begin_, end_ - begin_}; }
   void fill();
+  [[nodiscard]] bool read_short_line(Text& line);
+  void pass(std::size_t length);
 
   /// Makes a line of its bytes.
   void convert(std::string_view bytes, Text& line);

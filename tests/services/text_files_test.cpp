@@ -9,11 +9,16 @@ struct TextFiles : LateMembers {
 
 TEST_F(TextFiles, AreReadByteByByte) {
   constexpr std::string_view bytes_of_files("ab\r\r\n\n\x1A\x80\xFC\0", 10);
-  constexpr std::int32_t buffer = 1 << 18;
+  constexpr std::int32_t buffer = 1 << 16;
+  constexpr std::int32_t short_line = 1024;
   Generator generator;
   for (int i = 0; i < 240; ++i) {
-    // One file in ten reaches across the end of a buffer, in the middle of a line or of its end.
-    std::string bytes(i % 10 == 0 ? static_cast<std::size_t>(generator.whole(buffer - 5, buffer + 1)) : 0, 'x');
+    // One file in ten reaches across the end of a buffer, or of what counts as a short line, in the middle of a line or
+    // of its end.
+    const std::int32_t first_length = i % 10 == 0   ? generator.whole(buffer - 5, buffer + 1)
+                                      : i % 10 == 5 ? generator.whole(short_line - 9, short_line + 1)
+                                                    : generator.whole(0, 20);
+    std::string bytes(static_cast<std::size_t>(first_length), 'x');
     if (i % 20 == 0) bytes += '\x1A';
     for (int left = generator.whole(0, 12); left > 0; --left) bytes += generator.one_of(bytes_of_files);
     const std::string all = bytes.substr(0, bytes.find('\x1A'));
@@ -85,7 +90,7 @@ TEST_F(TextFiles, Writing) {
     EXPECT_EQ(platform.files.bytes(path), expected);
   });
   // What just fills the buffer, one byte less and one more, and the line behind it.
-  for (const std::size_t length : {262141U, 262142U, 262143U}) {
+  for (const std::size_t length : {65533U, 65534U, 65535U}) {
     utils.SaveBigFile(array_of({Text(length, u'x'), u"y"}), path);
     EXPECT_TRUE(platform.files.bytes(path) == std::string(length, 'x') + "\r\ny\r\n") << length;
   }
