@@ -20,24 +20,19 @@ struct CallerTest : testing::UtilsTest {
   bool is_request = false;
 };
 
-TEST_F(CallerTest, AnswersCallsInOrder) {
+TEST_F(CallerTest, AnswersCallsInOrderAndKeepsObjectsByNumber) {
   const Rows<std::string_view, std::string_view> rows{
-      {"a method", R"({"call": "GetData", "args": ["A,B,", 0, 1], "id": 7})", R"({"id": 7, "result": "A"})"},
       {"any case, any order, any identifier", R"( {"args":["A,B,",0,1],"id":{"a":[1]},"call":"getDATA"} )",
        R"({"id": {"a":[1]}, "result": "A"})"},
       {"set first", R"({"set": {"iCharacterCaseSuburbs": 3}, "call": "ConvertCaseSuburbs", "args": ["carlton"]})",
        R"({"result": "CARLTON"})"},
-      {"set alone", R"({"set": {"GSTValue": 0.1}})", R"({"result": {"empty": true}})"},
-      {"a declared Single is a number", R"({"call": "GSTValue"})", R"({"result": 0.1})"},
+      {"a declared Single is a number", R"({"set": {"GSTValue": 0.1}, "call": "GSTValue"})", R"({"result": 0.1})"},
       {"written back though unchanged", R"({"call": "RemoveStringsFromNumber", "args": [2, "AxA", "x"]})",
        R"({"result": "AA", "arguments": {"sCharacter": "x"}})"},
       {"written back before an error", R"({"call": "GetWeekInDateRange", "args": ["1/1/2009", "x", 60, 2009]})",
        R"({"error": {"number": 13, "description": "Type mismatch", "source": "TALUtil.ORVUtils"}, "arguments": {"iWeek": 52}})"},
       {"one variable twice", R"({"call": "GetTimeDifference", "args": ["1/1/2009", {"same": 0}, "9:00", "10:30"]})",
        R"({"result": "1:30", "arguments": {"vStDate": "01/01/2009", "vEnDate": "01/01/2009", "vStTime": "09:00", "vEnTime": "10:30"}})"},
-      {"optional, left out and marked",
-       R"({"call": "ReadCommaDelimStrToList", "args": ["a,b,", [], {"missing": true}]})",
-       R"({"result": 2, "arguments": {"sFList": ["a", "b"]}})"},
       {"a property that cannot be read", R"({"call": "SplashForm", "id": null})",
        R"({"id": null, "error": {"number": 438, "description": "Object doesn't support this property or method", "source": "TALUtil.ORVUtils"}})"},
       {"a record",
@@ -45,6 +40,13 @@ TEST_F(CallerTest, AnswersCallsInOrder) {
        R"({"result": {"empty": true}, "arguments": {"system_time": {"system_time": {"wYear": 2009, "wMonth": 3, "wDayOfWeek": 3, "wDay": 31, "wHour": 0, "wMinute": 0, "wSecond": 0, "wMilliseconds": 0}}}})"},
       {"an element that is no text", R"({"call": "IndexInList", "args": [[1.5, null], "1"]})",
        R"({"error": {"number": 94, "description": "Invalid use of Null", "source": "TALUtil.ORVUtils"}})"},
+      {"a control", R"({"create": "TALUtil.Grid", "set": {"Rows": 2, "Cols": 2}})", R"({"result": {"object": 1}})"},
+      {"an interface", R"({"create": "ccontrolposition"})", R"({"result": {"object": 2}})"},
+      {"stored under the same number", R"({"create": "ZipControl", "set": {"OnProgress": {"object": 1}}})",
+       R"({"result": {"object": 3}})"},
+      {"and handed back", R"({"on": 3, "call": "OnProgress"})", R"({"result": {"object": 1}})"},
+      {"released", R"({"release": 1})", R"({"result": {"empty": true}})"},
+      {"a number is not used again", R"({"create": "Grid"})", R"({"result": {"object": 4}})"},
   };
   check_rows(rows, [&](std::string_view line, std::string_view expected) {
     EXPECT_EQ(expected, answer(line));
@@ -52,49 +54,24 @@ TEST_F(CallerTest, AnswersCallsInOrder) {
   });
 }
 
-TEST_F(CallerTest, KeepsObjectsByNumber) {
-  const Rows<std::string_view, std::string_view> rows{
-      {"a control", R"({"create": "TALUtil.Grid", "set": {"Rows": 2, "Cols": 2}})", R"({"result": {"object": 1}})"},
-      {"an interface", R"({"create": "ccontrolposition"})", R"({"result": {"object": 2}})"},
-      {"as an argument", R"({"call": "SaveGridWidths", "args": [{"object": 1}, "S", 0]})",
-       R"({"result": {"empty": true}})"},
-      {"stored under the same number", R"({"create": "ZipControl", "set": {"OnProgress": {"object": 1}}})",
-       R"({"result": {"object": 3}})"},
-      {"and handed back", R"({"on": 3, "call": "OnProgress"})", R"({"result": {"object": 1}})"},
-      {"released", R"({"release": 1})", R"({"result": {"empty": true}})"},
-      {"a number is not used again", R"({"create": "Grid"})", R"({"result": {"object": 4}})"},
-      {"a second toolkit has the same settings", R"({"create": "ORVUtils", "set": {"sUserName": "anne"}})",
-       R"({"result": {"object": 5}})"},
-      {"seen by the first", R"({"call": "sUserName"})", R"({"result": "anne"})"},
-  };
-  check_rows(rows, [&](std::string_view line, std::string_view expected) { EXPECT_EQ(expected, answer(line)); });
-}
-
 TEST_F(CallerTest, RefusesWhatIsNoCallAndGoesOn) {
   const Rows<std::string_view, std::string_view> rows{
       {"no JSON", "GetData", "byte 1: expected an object"},
       {"no object", "[1]", "byte 1: expected an object"},
       {"cut off", R"({"call": "GetDa)", "byte 16: expected a closing quote, but the line ends"},
-      {"more after it", R"({"call": "Terminate"} x)", "byte 23: expected the end of the line"},
       {"a comma too many", R"({"call": "MyPos", "args": ["a",]})",
        "byte 32: expected a value: an object, an array, a text in quotes, a number, true, false or null"},
       {"two actions", R"({"call": "Terminate", "create": "Grid"})",
        R"(a line needs exactly one of \"call\", \"create\" and \"release\", or \"set\")"},
-      {"none", "{}", R"(a line needs exactly one of \"call\", \"create\" and \"release\", or \"set\")"},
-      {"an unknown key", R"({"cal": "Terminate"})",
-       R"(byte 8: expected a key of a call before this: \"cal\" is none; there are call, args, id, on, set, create, release)"},
       {"no member", R"({"call": "GetDta"})",
        R"(the object has no member \"GetDta\"; \"talutil list\" lists those of the toolkit)"},
       {"no class", R"({"create": "Gird"})",
        R"(there is no class \"Gird\"; there are ORVUtils, cControlPosition, Grid, CommonDialog, ZipControl, UnzipControl)"},
       {"no object to call", R"({"on": 9, "call": "Top"})",
        R"(there is no object 9; \"create\" makes one and answers its number)"},
-      {"no object to pass", R"({"call": "StripNulls", "args": [{"object": 9}]})",
-       "byte 45: expected the number of an object before this: there is no object 9"},
       {"a bare NUL", std::string_view("{\"call\": \"Get\0\"}", 16),
        R"(byte 14: expected no bare control character in a text; write \\u followed by its four hexadecimal digits)"},
       {"not UTF-8", "{\"call\": \"\xC0\x80\"}", "byte 11: expected UTF-8"},
-      {"a surrogate in UTF-8", "{\"call\": \"\xED\xA0\x80\"}", "byte 11: expected UTF-8"},
   };
   check_rows(rows, [&](std::string_view line, std::string_view message) {
     const std::string answered = answer(line);
@@ -112,17 +89,12 @@ TEST(ValueForms, ReadBackAsTheyWere) {
   objects.append(number, object);
   const Rows<Variant, std::string_view> rows{
       {"Empty", {}, R"({"empty": true})"},
-      {"Null", Null{}, "null"},
-      {"True", Boolean(true), "true"},
       {"other bits", Boolean::from_bits(5), R"({"boolean": 5})"},
       {"Byte", std::uint8_t{255}, R"({"byte": 255})"},
       {"Integer", std::int16_t{-32768}, R"({"integer": -32768})"},
       {"Long", std::int32_t{-2147483647 - 1}, "-2147483648"},
-      {"Single", 0.1F, R"({"single": 0.1})"},
       {"Single without end", std::numeric_limits<float>::infinity(), R"({"single": "inf"})"},
-      {"Double", 0.1, "0.1"},
       {"a whole Double", 3.0, "3.0"},
-      {"a large Double", -1e300, "-1e+300"},
       {"the smallest", 5e-324, "5e-324"},
       {"minus zero", -0.0, "-0.0"},
       {"Double without end", -std::numeric_limits<double>::infinity(), R"({"double": "-inf"})"},
@@ -140,7 +112,6 @@ TEST(ValueForms, ReadBackAsTheyWere) {
        R"({"system_time": {"wYear": 2009, "wMonth": 3, "wDayOfWeek": 2, "wDay": 31, "wHour": 10, "wMinute": 20, "wSecond": 30, "wMilliseconds": 999}})"},
       {"a list", testing::array_of({u"a", u""}), R"(["a", ""])"},
       {"from 1", testing::array_of({u"a"}, 1), R"({"list": ["a"], "from": 1})"},
-      {"of nothing", testing::array_of({}), "[]"},
       {"never allocated", TextArray(), R"({"list": null})"},
       {"other elements", ForeignArray(), R"({"array": true})"},
       {"an object", object, R"({"object": 1})"},
@@ -184,14 +155,9 @@ TEST(ValueForms, ReadOtherWays) {
       {"beyond a double", "1e999"},
       {"two keys", R"({"byte": 1, "integer": 2})"},
       {"no form", R"({"text": "a"})"},
-      {"no key", "{}"},
       {"a false flag", R"({"empty": false})"},
       {"a list in a list", "[[]]"},
       {"a zero first", "01"},
-      {"a plus", "+1"},
-      {"no digits", "1."},
-      {"half an escape", R"("\u12")"},
-      {"a word", "nul"},
       {"beyond a currency", R"({"currency": "1e20"})"},
       {"same, which is for arguments", R"({"same": 0})"},
   };
