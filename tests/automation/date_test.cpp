@@ -10,20 +10,11 @@
 namespace talutil {
 namespace {
 
-using testing::check_rows;
 using testing::outcome;
 
-TEST(Date, DaysAndParts) {
-  const testing::Rows<double, DateParts> rows = {
-      {"first", -657434, {100, 1, 1, 0, 0, 0}},
-      {"last of the first day", -657434.99998842592, {100, 1, 1, 23, 59, 59}},
-      {"last", 2958465.99998842592, {9999, 12, 31, 23, 59, 59}},
-  };
-  check_rows(rows, [](double days, const DateParts& parts) {
-    EXPECT_EQ(parts_of({days}), parts);
-    EXPECT_NEAR(date_from_parts(parts).value().days, days, 1e-9);
-  });
-  EXPECT_EQ(parts_of({-0.25}), (DateParts{1899, 12, 30, 6, 0, 0}));
+TEST(Date, PartsBetweenSecondsAndAtTheEnds) {
+  EXPECT_EQ(parts_of({-657434.99998842592}), (DateParts{100, 1, 1, 23, 59, 59}));
+  EXPECT_EQ(parts_of({2958465.99998842592}), (DateParts{9999, 12, 31, 23, 59, 59}));
   EXPECT_EQ(parts_of({39876.999999}), (DateParts{2009, 3, 5, 0, 0, 0}));
   EXPECT_EQ(parts_of({-1.999999}), (DateParts{1899, 12, 30, 0, 0, 0}));
 }
@@ -76,21 +67,11 @@ TEST(Date, OutOfRange) {
   }
 }
 
-// What docs/dates.md lists is read by tests/cli/run.sh.
-TEST(Date, TextToDate) {
-  constexpr std::int32_t current_year = 2011;
-  // clang-format off
-  const TextView no_dates[] = {
-      u"", u"  ", u"5", u"5,3", u"5,3/2009", u"-5", u"29/2", u"1/1/99999", u"1/1/02009", u"1/1/-5", u"1/2/3/4",
-      u"5/3/2009x", u"5/3/2009 x", u"x5/3/2009", u"Mar", u"Marc 5 2009", u"5 2009 Mar", u"Mar 2009 5", u"1:", u"1:30:",
-      u"PM", u"10000:00", u"5/3/2009 13", u"13:45 2009", u"13:45 14:45",
-      u"31 Feb", u"31/9/12", u"Mar 32", u"Mar 5 Mar", u"2009 5 Mar", u"5/3/2009, 13:45", u"5 Mar 2009/13:45", u"1:45a",
-      u"13:45 AM", u"1::30",
-  };
-  // clang-format on
-  for (const TextView text : no_dates) EXPECT_FALSE(text_to_date(text, current_year)) << to_utf8(text);
+// What docs/dates.md lists is read by tests/cli/run.sh; other texts are compared with the platform's reading.
+TEST(Date, TextWithoutAYear) {
   EXPECT_TRUE(text_to_date(u"29/2", 2012));
-  EXPECT_EQ(outcome([&] { return text_to_date(u"5/13", current_year); }), "13/05/2011");
+  EXPECT_FALSE(text_to_date(u"29/2", 2011));
+  EXPECT_EQ(outcome([&] { return text_to_date(u"5/13", 2011); }), "13/05/2011");
 }
 
 TEST(Date, Intervals) {
@@ -103,11 +84,12 @@ TEST(Date, Intervals) {
       {"a month's last day", month, 1, u"31/1/2008 13:45", "29/02/2008 13:45", u"1/3/2007", -10},
       {"years", year, -1, u"29/2/2008", "28/02/2007", u"1/1/1899", -109},
   };
-  check_rows(rows, [](auto interval, auto count, TextView start, const auto& added, TextView end, auto boundaries) {
-    const Date from = Variant(start).to_date(plain_numbers);
-    EXPECT_EQ(outcome([&] { return date_add(interval, count, from); }), added);
-    EXPECT_EQ(date_difference(interval, from, Variant(end).to_date(plain_numbers)), boundaries);
-  });
+  testing::check_rows(rows,
+                      [](auto interval, auto count, TextView start, const auto& added, TextView end, auto boundaries) {
+                        const Date from = Variant(start).to_date(plain_numbers);
+                        EXPECT_EQ(outcome([&] { return date_add(interval, count, from); }), added);
+                        EXPECT_EQ(date_difference(interval, from, Variant(end).to_date(plain_numbers)), boundaries);
+                      });
   EXPECT_EQ(outcome([] { return date_add(day, 1, Date{2958465}); }), "error 5");
   EXPECT_EQ(outcome([] { return date_add(month, -1, Date{-657434}); }), "error 5");
   EXPECT_EQ(outcome([] { return date_add(year, 2147483647, Date{}); }), "error 5");
@@ -125,7 +107,6 @@ TEST(Date, Patterns) {
 TEST(Date, ToText) {
   EXPECT_EQ(date_to_text({-0.25}), u"06:00");
   EXPECT_EQ(date_to_text({39876.999999}), u"05/03/2009");  // A second after rounding.
-  EXPECT_EQ(date_to_text({-657434}), u"01/01/0100");
   EXPECT_EQ(outcome([] { return date_to_text({3e6}); }), "error 6");
 }
 
