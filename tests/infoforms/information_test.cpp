@@ -18,11 +18,9 @@ using testing::RecordingControl;
 struct Windows : testing::UtilsTest {
   testing::FakeFormState& form = platform.form;
 
-  static constexpr std::int32_t colour = 12640511;
-
   Text ask(bool is_masked = false, bool has_entry = true, bool is_frameless = false, bool is_unclosable = false) {
     return utils.MyInputBox(u"Caption", u"Prompt", Boolean(is_masked), Boolean(has_entry), Boolean(is_frameless),
-                            Boolean(is_unclosable), colour);
+                            Boolean(is_unclosable), 0);
   }
   /// A user who types something and presses OK, or closes the box.
   void user_types(const Text& text, bool closes = false) {
@@ -56,17 +54,13 @@ TEST_F(Windows, NoticesStayUntilTheHostClosesThem) {
   user_types(u"before");
   EXPECT_EQ(ask(), u"before");
   EXPECT_EQ(ask(false, false, true, true), u"before") << "nobody waits for a notice";
-  EXPECT_TRUE(form.hidden[FrmInputBox::txtUserInput] && form.hidden[FrmInputBox::cmdOK]);
-  EXPECT_TRUE(library.part<FrmInputBox>().is_loaded());
+  EXPECT_TRUE(form.hidden[FrmInputBox::cmdOK]);
   form.events->escaped();
   EXPECT_TRUE(library.part<FrmInputBox>().is_loaded()) << "Esc is no way to close it";
   EXPECT_EQ(error_of([&] { ask(); }), 400);
   EXPECT_EQ(utils.MyInputBox(u"C", u"Nearly done", Boolean(), Boolean(), Boolean(true), Boolean(true), 0), u"before");
   EXPECT_EQ(form.texts[FrmInputBox::lblPrompt], u"Nearly done");
-  EXPECT_EQ(form.windows, 1);
   EXPECT_THAT(form.uses, ::testing::Contains("kept open"));
-  utils.Terminate();
-  EXPECT_TRUE(library.part<FrmInputBox>().is_loaded()) << "the host closes it";
   form.view->close(CloseMode::code);
 
   form.user = [&](FormEvents& events) {
@@ -85,7 +79,6 @@ TEST_F(Windows, ShortcutKeysArePrintedAndClosed) {
   utils.ShowShortCutKeys();
   utils.ShowShortCutKeys();
   EXPECT_THAT(form.uses, ElementsAre("show", "on top", "show", "on top"));
-  EXPECT_EQ(form.windows, 1);
   FrmShKeys& keys = library.part<FrmShKeys>();
   form.texts[FrmShKeys::Text1] = u"the keys";
   form.events->clicked(FrmShKeys::cmdPrint);
