@@ -41,7 +41,6 @@ TEST_F(Case, NameCase) {
 TEST_F(Case, StylesOfNamesAndSuburbs) {
   const Variant o_neil(u" o'neil ");
   const Rows<std::int16_t, std::int16_t, Variant, Variant, Variant, std::int32_t> rows = {
-      {"0 leaves", 1, 0, o_neil, o_neil, o_neil, 0},
       {"name case", 0, 1, o_neil, u"O\u00B4Neil", u"O\u00B4Neil", 2},
       {"lower case, not of suburbs", 0, 2, u"A & B", u"a and b", u"A & B", 2},
       {"upper case", 0, 3, o_neil, u"O\u00B4NEIL", u"O\u00B4NEIL", 2},
@@ -51,7 +50,6 @@ TEST_F(Case, StylesOfNamesAndSuburbs) {
       {"nothing is left by the cleaning", 0, 3, u" ?", u" ?", u" ?", 2},
       {"Null", 0, 1, Null{}, Null{}, Null{}, 2},
       {"Empty", 0, 1, Variant(), Variant(), Variant(), 2},
-      {"a number", 0, 3, std::int16_t{5}, u"5", u"5", 2},
   };
   check_rows(rows, [&](auto flag, auto style, const auto& value, const auto& name, const auto& suburb, int cleaned) {
     library.settings().CounterVerifyText = 0;
