@@ -8,24 +8,12 @@ namespace {
 using Names = std::vector<Text>;
 using testing::check_rows;
 
+// How lines of all kinds are read is compared with the platform in settings_test.cpp.
 TEST(ProfileDocument, Reads) {
   const testing::Rows<std::string_view, Text, Text, std::optional<Text>> rows = {
-      {"blanks and case do not count", "[ Ab ]\r\n x y\t=\t1 \r\n", u"aB", u" X Y ", u"1"},
-      {"the first section and item of a name", "[a]\nx=1\nx=2\n[a]\ny=3", u"a", u"x", u"1"},
-      {"a second section of the name", "[a]\nx=1\n[a]\ny=3", u"a", u"y", std::nullopt},
-      {"CR alone ends a line", "[a]\rx=1\ry=2", u"a", u"y", u"2"},
-      {"up to the last bracket", "[a]b]c\nx=1", u"a]b", u"x", u"1"},
-      {"a header without its end", "[a]\n[b\nx=1", u"a", u"x", u"1"},
       {"no equals sign", "[a]\nx\n", u"a", u"x", std::nullopt},
       {"a comment", "[a]\n ;x=1\nx=2", u"a", u";x", std::nullopt},
-      {"single quotes, one pair", "[a]\nx=''y''\n", u"a", u"x", u"'y'"},
-      {"one quote", "[a]\nx=\"\n", u"a", u"x", u"\""},
-      {"the end-of-file mark is a blank",
-       "[a]\nx=\032"
-       "1\032\n",
-       u"a", u"x", u"1"},
       {"a NUL ends a value", std::string_view("[a]\nx=1\0y\nz=2", 13), u"a", u"x", u"1"},
-      {"code page 1252", "[a]\n\xE9=\x80", u"a", u"\u00C9", u"\u20AC"},
       {"UTF-8 with its mark", "\xEF\xBB\xBF[a]\nx=\xC5\x82", u"a", u"x", u"\u0142"},
       {"UTF-16 with its mark", std::string_view("\xFF\xFE[\0a\0]\0\n\0x\0=\0B\x01", 16), u"a", u"x", u"\u0142"},
   };
@@ -43,11 +31,9 @@ TEST(ProfileDocument, ChangesOneLine) {
   const testing::Rows<std::string_view, Text, Text, Text, std::string_view> rows = {
       {"in place, spelling and blanks kept", "; head\r\n[A]\r\n\r\nx = 1 ; c\r\ny=2", u"a", u"X", u"9",
        "; head\r\n[A]\r\n\r\nx = 9\r\ny=2"},
-      {"an item without a value", "[a]\nx\ny=1", u"a", u"x", u"2", "[a]\nx=2\ny=1"},
       {"after the last line of the section", "[a]\nx=1\n\n\n[b]\n", u"a", u"y", u" v ", "[a]\nx=1\r\ny=v \n\n\n[b]\n"},
       {"into an empty section", "[a]", u"a", u"y", u"", "[a]\r\ny="},
       {"a new section", "[a]\nx=1", u" b ", u" y ", u"2", "[a]\nx=1\r\n[b]\r\ny=2\r\n"},
-      {"a new file", "", u"a", u"x", u"1", "[a]\r\nx=1\r\n"},
       {"before all sections", "[a]\n", u"", u"x", u"1", "x=1\r\n[a]\n"},
       {"UTF-8 stays", "\xEF\xBB\xBF[a]\nx=1", u"a", u"x", u"\u0142", "\xEF\xBB\xBF[a]\nx=\xC5\x82"},
   };
