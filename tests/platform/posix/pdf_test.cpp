@@ -137,6 +137,8 @@ TEST_F(PdfTest, TextsAreWrittenAsTheyAre) {
   EXPECT_EQ(output_of("pdftotext " + path + " - | grep -v '^$'"), "(a\\b) 50% <c> €é\nПри\n((after\n\f\n");
   EXPECT_EQ(output_of("qpdf --qdf --object-streams=disable " + path + " - | grep -a -A1 ' Tr$' | tail -2"),
             "0 Tr\n1 22.55 Td\n");
+  EXPECT_EQ(output_of("qpdf --qdf --object-streams=disable " + path + " - | grep -a -c -E '^1 0 0 (rg|RG)$'"), "2\n")
+      << "the letters of the embedded font are red, and the strokes that make them bold";
 }
 
 TEST_F(PdfTest, AnEmptyDocumentHasAPage) {
