@@ -90,18 +90,6 @@ TEST(Profiles, AreReadAndChangedAsTheDocumentIs) {
   }
 }
 
-TEST(Profiles, HoldTextsOfTheCodePage) {
-  Profiles* const profiles = &real_platform().profiles;
-  const Text path = scratch_folder() + u"a.ini";
-  EXPECT_EQ(profiles->value(path, u"S", u"k"), u"");
-  profiles->put(path, u"S", u"k", u"\u20AC\u0100\u0416");
-  EXPECT_EQ(profiles->value(path, u"s", u"K"), Text(u"\u20AC") + u"A?");
-  profiles->put(path, u"S", u"l", Text(1500, u'x'));
-  EXPECT_EQ(profiles->value(path, u"S", u"l"), Text(1023, u'x'));
-  EXPECT_EQ(profiles->item_names(path, u"S"), Text(u"k\0l\0", 4));
-  profiles->put(u"Q:\\none\\a.ini", u"S", u"k", u"v");  // A failure is not reported.
-}
-
 TEST(SettingsStore, KeepsTextsByNamesWithoutCase) {
   SettingsStore* const store = &real_platform().settings_store;
   const Text application = u"Test " + scratch_folder().substr(3);

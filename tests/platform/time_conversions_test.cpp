@@ -37,23 +37,6 @@ TEST_F(TimeConversionsTest, EveryDayIsCounted) {
   }
 }
 
-TEST_F(TimeConversionsTest, WhatIsNoTimeIsLeftAlone) {
-  for (int i = 0; i < 10'000; ++i) {
-    // Some platforms take 29 February of any year for a day.
-    const SystemTime time{part(1590, 1612), part(0, 13),  part(0, 9),  i % 10 == 0 ? std::int16_t{32} : part(0, 28),
-                          part(-1, 24),     part(-1, 60), part(-1, 60)};
-    const bool is_time = time.wYear >= 1601 && time.wMonth >= 1 && time.wMonth <= 12 && time.wDay >= 1 &&
-                         time.wDay <= 28 && time.wHour >= 0 && time.wHour < 24 && time.wMinute >= 0 &&
-                         time.wMinute < 60 && time.wSecond >= 0 && time.wSecond < 60;
-    FileTime file = 77;
-    conversions->system_to_file(time, file);
-    EXPECT_EQ(file != 77, is_time) << time.wYear << '/' << time.wMonth << '/' << time.wDay << ' ' << time.wHour;
-  }
-  SystemTime untouched{.wYear = 77};
-  conversions->file_to_system(-1, untouched);
-  EXPECT_EQ(untouched, SystemTime{.wYear = 77});
-}
-
 TEST_F(TimeConversionsTest, TodaysOffsetCountsForEveryDate) {
   for_each_zone([&](std::int64_t offset) {
     for (int i = 0; i < 200; ++i) {

@@ -141,11 +141,6 @@ TEST_F(PdfTest, TextsAreWrittenAsTheyAre) {
       << "the letters of the embedded font are red, and the strokes that make them bold";
 }
 
-TEST_F(PdfTest, AnEmptyDocumentHasAPage) {
-  write({});
-  EXPECT_EQ(output_of("pdfinfo " + path + " | grep Pages"), "Pages:           1\n");
-}
-
 }  // namespace
 
 }  // namespace talutil
