@@ -10,7 +10,7 @@
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 . "$talutil_top/tests/verdict.sh"
-. "$talutil_top/tests/hosts/pascal.sh"
+. "$talutil_top/tests/guides/pascal.sh"
 cd "$talutil_top"
 
 folder=${1:-native}

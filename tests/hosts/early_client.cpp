@@ -32,6 +32,17 @@ void settings_survive_their_object(U* u) {
   check_equal(std::wstring_view(name.data(), length), text(u, &U::get_ComputerName), "ComputerName");
 }
 
+/// The fields that dates lack stay.
+void records_are_written_in_place(U* u) {
+  SYSTEMTIME time{1, 2, 77, 3, 4, 5, 6, 88};
+  const short expected[] = {2024, 3, 77, 11, 22, 0, 0, 88};
+  DATE date = 45362.0 + 22.0 / 24;
+  check_equal(S_OK, u->DateToSystemTime(date, &time), "DateToSystemTime");
+  check(std::memcmp(expected, &time, sizeof time) == 0, "the record that was written");
+  check_equal(S_OK, u->SystemTimeToDate(&time, &(date = 0)), "SystemTimeToDate");
+  check(date == 45362.0 + 22.0 / 24, "its date");
+}
+
 int timer_ticks = 0;
 int quitting_tick = 0;
 
@@ -169,8 +180,8 @@ int wmain(int, wchar_t**) {
     const Pointer<U> object = create_object();
     U* const u = object.get();
     for (const auto check_part :
-         {first_error_is_caught, settings_survive_their_object, passwords_let_messages_in, interfaces_are_one_object,
-          unmasked_exceptions_do_no_harm, short_precision_changes_no_digit})
+         {first_error_is_caught, settings_survive_their_object, records_are_written_in_place, passwords_let_messages_in,
+          interfaces_are_one_object, unmasked_exceptions_do_no_harm, short_precision_changes_no_digit})
       check_part(u);
     objects_outlive_their_calls();
     check_equal(S_OK, u->Terminate(), "Terminate");

@@ -5,7 +5,6 @@ set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 . "$talutil_top/tests/verdict.sh"
 . "$talutil_top/tests/hosts/screen.sh"
-. "$talutil_top/tests/hosts/pascal.sh"
 . "$talutil_top/tests/examples/through_dll.sh"
 
 folder=${1:-windows}
@@ -92,22 +91,10 @@ no_screen='445 There is no screen to show the window on. '
 DISPLAY='' elsewhere "$no_screen$no_screen$no_screen" no_screen
 restart_wine
 
-# Third-party clients: script hosts, and a compiler with an importer of type libraries of its own.
-# Nothing that an earlier run has left may look like this one's work.
-rm -rf "$(wine_prefix)/drive_c/clients"
-wine reg.exe delete 'HKCU\Software\TALUtil\Settings' /f >/dev/null 2>&1 || true
+# Script hosts; the guides have clients in JScript and Pascal.
 hosts='Z:\checkout\tests\hosts'
 run vbscript wine cscript.exe //nologo "$hosts\\members.vbs"
-run script_control wine cscript.exe //nologo "$hosts\\clients\\script_control.vbs" "$hosts\\members.vbs"
-run jscript wine cscript.exe //nologo "$hosts\\clients\\client.js"
-if [ "${TALUTIL_WITHOUT_PASCAL:-}" = 1 ]; then
-  echo "left out: the Free Pascal client, since TALUTIL_WITHOUT_PASCAL is 1"
-else
-  rm -rf "$talutil_build/$folder-pascal"
-  { prepare_pascal "$folder" "$folder-pascal" && compile_pascal "$talutil_top/tests/hosts/clients/client.pas"; } \
-    >"$talutil_build/$folder-pascal.log" 2>&1 || tail -5 "$talutil_build/$folder-pascal.log"
-  run pascal wine "Z:\\build\\$folder-pascal\\client.exe"
-fi
+run script_control wine cscript.exe //nologo "$hosts\\script_control.vbs" "$hosts\\members.vbs"
 
 # The system's code page is that of the locale in which Wine's server begins; a manifest makes it UTF-8.
 mkdir -p "$talutil_build/$folder/locales"

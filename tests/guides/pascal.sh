@@ -6,7 +6,7 @@ prepare_pascal() {
   pascal=$("$talutil_top/tools/pascal.sh" "$1") || return 1
   pascal_folder=$talutil_build/$2
   mkdir -p "$pascal_folder"
-  compile_pascal "$talutil_top/tests/hosts/clients/import_unit.pas" &&
+  compile_pascal "$talutil_top/tests/guides/import_unit.pas" &&
     wine "Z:\\build\\$2\\import_unit.exe" "Z:\\build\\$1\\TALUtil.dll" "Z:\\build\\$2\\"
 }
 
