@@ -71,6 +71,14 @@ void write_report(Host& host) {
   host.utils.GridPrintPreview(100, 1, u"Sales", u"", ObjectRef(grid), {}, {}, u"SalesReport");
 }
 
+/// An archive, and in the folder that it is unpacked into, an older file.
+void make_archive(Host& host) {
+  make_data(host);
+  zip(host, host.path(u"data\\*.*"));
+  host.utils.VerifyFilePath(host.path(u"out\\"));
+  save(host, host.path(u"out\\one.txt"), u"old");
+}
+
 /// Runs tasks as one thread does, but lets files be finished together, as with threads.
 struct WideTasks final : Tasks {
   [[nodiscard]] std::size_t at_once() const noexcept override { return 4; }
@@ -129,22 +137,9 @@ const std::vector<Operation>& operations() {
            zip(host, host.path(u"data\\*.*"));
          },
          [](Host& host) { zip(host, host.path(u"three.txt")); }},
-        {"CallUnZIPFiles", Promise::whole,
-         [](Host& host) {
-           make_data(host);
-           zip(host, host.path(u"data\\*.*"));
-           host.utils.VerifyFilePath(host.path(u"out\\"));
-           save(host, host.path(u"out\\one.txt"), u"old");
-         },
+        {"CallUnZIPFiles", Promise::whole, make_archive,
          [](Host& host) { host.utils.CallUnZIPFiles(host.path(u"a.zip"), host.path(u"out\\"), u"", Boolean(true)); }},
-        {"Unpacking several files together", Promise::whole,
-         [](Host& host) {
-           make_data(host);
-           zip(host, host.path(u"data\\*.*"));
-           host.utils.VerifyFilePath(host.path(u"out\\"));
-           save(host, host.path(u"out\\one.txt"), u"old");
-         },
-         &unpack_together},
+        {"Unpacking several files together", Promise::whole, make_archive, unpack_together},
         {"ExportGridData", Promise::silent, [](Host& host) { report(host, u"old"); },
          [](Host& host) { report(host, u"new"); }},
         {"VerifyFilePath", Promise::silent, nothing,
