@@ -13,11 +13,11 @@
 #include <cstdlib>
 #include <cstring>
 #include <fstream>
-#include <functional>
 #include <iterator>
 #include <optional>
 #include <random>
 #include <set>
+#include <sstream>
 #include <stdexcept>
 #include <thread>
 #include <utility>
@@ -68,9 +68,9 @@ struct Host {
 
 std::uintmax_t key_of(std::uintmax_t number) { return number / kinds % keys; }
 
-std::string name_of(int worker, std::uintmax_t key) { return std::to_string(worker) + "-" + std::to_string(key); }
-
-Text item_of(int worker, std::uintmax_t number) { return from_utf8(name_of(worker, key_of(number))); }
+Text item_of(int worker, std::uintmax_t number) {
+  return from_utf8(std::to_string(worker) + "-" + std::to_string(key_of(number)));
+}
 
 /// What an operation writes: its numbers and as many more characters as these say.
 std::string content(int worker, std::uintmax_t number) {
@@ -79,18 +79,15 @@ std::string content(int worker, std::uintmax_t number) {
          std::string(length, static_cast<char>('a' + number % 26)) + ".";
 }
 
-struct Written {
-  int worker = 0;
-  std::uintmax_t number = 0;
-};
+/// The worker and the number of an operation.
+using Operation = std::pair<int, std::uintmax_t>;
 
 /// Which operation a whole content is of.
-std::optional<Written> written_by(const std::string& text) {
-  Written written;
+std::optional<Operation> written_by(const std::string& text) {
+  int worker = 0;
   unsigned long long number = 0;
-  if (std::sscanf(text.c_str(), "%d.%llu.", &written.worker, &number) != 2) return std::nullopt;
-  written.number = number;
-  return text == content(written.worker, written.number) ? std::optional(written) : std::nullopt;
+  if (std::sscanf(text.c_str(), "%d.%llu.", &worker, &number) != 2) return std::nullopt;
+  return text == content(worker, number) ? std::optional(Operation(worker, number)) : std::nullopt;
 }
 
 std::string read_bytes(const fs::path& path) {
@@ -114,63 +111,28 @@ void fault(const std::string& what) {
   if (++faults <= 20) std::printf("FAILED: %s\n", what.c_str());
 }
 
-using Found = std::optional<std::string>;
-using Read = std::function<Found(const std::string& name)>;
+// ---- The kinds. Each writes what one operation does, and finds what all of them have left.
 
-/// Checks each item of a kind: the last acknowledged operation on it, or the one that the kill came upon.
-void check_items(const Host& host, std::uintmax_t kind, const std::string& kind_name, const Read& read) {
-  for (int worker = 0; worker < workers; ++worker) {
-    const std::uintmax_t last = acknowledged(host.native, worker);
-    for (std::uintmax_t key = 0; key < keys; ++key) {
-      const auto is_on_it = [&](std::uintmax_t number) { return number % kinds == kind && key_of(number) == key; };
-      std::uintmax_t least = last;
-      while (least > 0 && !is_on_it(least)) --least;
-      const Found found = read(name_of(worker, key));
-      const std::string what = kind_name + " " + name_of(worker, key);
-      if (!found) {
-        if (least > 0) fault(what + ": lost");
-        continue;
-      }
-      const auto written = written_by(*found);
-      if (!written || written->worker != worker || !is_on_it(written->number)) {
-        fault(what + ": torn: " + *found);
-      } else if (written->number != least && written->number != last + 1) {
-        fault(what + ": number " + std::to_string(written->number) + " in place of " + std::to_string(least));
-      }
-    }
-  }
-}
-
-// ---- The kinds. Each writes what one operation does, and checks what all have left.
+using Contents = std::vector<std::string>;
 
 void write_log(Host& host, int worker, std::uintmax_t number) {
   host.utils.AppendEventLog(from_utf8(content(worker, number)), u"kills");
 }
 
-void check_log(Host& host, std::uintmax_t kind) {
-  std::array<std::set<std::uintmax_t>, workers> seen;
-  const std::string log = read_bytes(host.native / "EventLog.txt");
-  for (std::size_t at = 0; at < log.size();) {
-    const std::size_t end = log.find("\r\n", at);
-    const std::string line = log.substr(at, end - at);
-    at = end == std::string::npos ? log.size() : end + 2;
-    // User, time, event and form.
-    const std::size_t event = line.find(':', 1) + 1;
-    const std::size_t form = line.rfind(':');
-    const auto written = form > event ? written_by(line.substr(event, form - event)) : std::nullopt;
-    if (!written || line.substr(form) != ":kills" || end == std::string::npos) {
-      fault("log: torn: " + line);
-    } else {
-      seen[static_cast<std::size_t>(written->worker)].insert(written->number);
-    }
+/// What stands in the lines of a file between a mark and their end; of a line that has another end, all of it.
+Contents contents_of_lines(const fs::path& path, char mark, const std::string& end) {
+  Contents found;
+  std::istringstream lines(read_bytes(path));
+  for (std::string line; std::getline(lines, line);) {
+    if (line == "[a]\r") continue;
+    const std::size_t begin = line.find(mark, 1) + 1;
+    found.push_back(line.ends_with(end) ? line.substr(begin, line.size() - begin - end.size()) : line);
   }
-  for (int worker = 0; worker < workers; ++worker) {
-    for (std::uintmax_t number = acknowledged(host.native, worker); number > 0; --number) {
-      const bool is_seen = seen[static_cast<std::size_t>(worker)].contains(number);
-      if (number % kinds == kind && !is_seen) fault("log: lost: " + content(worker, number));
-    }
-  }
+  return found;
 }
+
+/// User, time, event and form.
+Contents contents_of_log(Host& host) { return contents_of_lines(host.native / "EventLog.txt", ':', ":kills\r"); }
 
 void write_archive(Host& host, int worker, std::uintmax_t number) {
   const Text name = u"sources/e" + item_of(worker, number) + u".txt";
@@ -180,7 +142,8 @@ void write_archive(Host& host, int worker, std::uintmax_t number) {
                  host.platform.folders, progress);
 }
 
-Read archive_reader(Host& host) {
+Contents contents_of_archive(Host& host) {
+  const fs::path out = host.native / "unpacked";
   try {
     archives::Progress progress;
     archives::Archive archive(host.folder + u"a.zip", host.platform.folders);
@@ -188,10 +151,9 @@ Read archive_reader(Host& host) {
   } catch (const archives::Error& error) {
     fault("archive: code " + std::to_string(static_cast<int>(error.code())) + ": " + error.what());
   }
-  return [&](const std::string& name) -> Found {
-    const fs::path path = host.native / "unpacked" / ("e" + name + ".txt");
-    return fs::exists(path) ? Found(read_bytes(path)) : std::nullopt;
-  };
+  Contents found;
+  for (const auto& entry : fs::directory_iterator(out)) found.push_back(read_bytes(entry.path()));
+  return found;
 }
 
 /// All in one file. That a value could not be written, for the wait for others took too long, is not reported, so it is
@@ -205,24 +167,43 @@ void write_profile(Host& host, int worker, std::uintmax_t number) {
   }
 }
 
-Read profile_reader(Host& host) {
-  return [&](const std::string& name) -> Found {
-    const Text value = host.platform.profiles.value(host.folder + u"p.ini", u"a", from_utf8(name));
-    return value.empty() ? std::nullopt : Found(to_utf8(value));
-  };
-}
+Contents contents_of_profile(Host& host) { return contents_of_lines(host.native / "p.ini", '=', "\r"); }
 
 struct Kind {
   const char* name;
   void (*write)(Host& host, int worker, std::uintmax_t number);
-  Read (*reader)(Host& host);  ///< Null for the log, which is not a set of items.
+  Contents (*contents)(Host& host);
+  std::uintmax_t kept;  ///< How many of a worker's last operations are still to be found.
 };
 
 constexpr std::array all_kinds = {
-    Kind{"log", &write_log, nullptr},
-    Kind{"archive", &write_archive, &archive_reader},
-    Kind{"profile", &write_profile, &profile_reader},
+    Kind{"log", &write_log, &contents_of_log, UINTMAX_MAX},
+    Kind{"archive", &write_archive, &contents_of_archive, keys},
+    Kind{"profile", &write_profile, &contents_of_profile, keys},
 };
+
+/// What was acknowledged is there, but for what the operation that the kill came upon has replaced; nothing is torn.
+void check(Host& host, std::uintmax_t number_of_kind) {
+  const Kind& kind = all_kinds.at(number_of_kind);
+  std::set<Operation> found;
+  for (const std::string& text : kind.contents(host)) {
+    const auto written = written_by(text);
+    if (!written) fault(std::string(kind.name) + ": torn: " + text);
+    if (written) found.insert(*written);
+  }
+  for (int worker = 0; worker < workers; ++worker) {
+    const std::uintmax_t last = acknowledged(host.native, worker);
+    const bool has_next = found.contains({worker, last + 1});
+    std::uintmax_t kept = kind.kept;
+    for (std::uintmax_t number = last; number > 0 && kept > 0; --number) {
+      if (number % kinds != number_of_kind) continue;
+      --kept;
+      const bool is_replaced = has_next && kind.kept == keys && key_of(number) == key_of(last + 1);
+      if (found.contains({worker, number}) || is_replaced) continue;
+      fault(std::string(kind.name) + ": lost: " + content(worker, number));
+    }
+  }
+}
 
 /// Does an operation until it succeeds: that another has locked the file is no fault, but cannot last.
 bool write(Host& host, int worker, std::uintmax_t number) {
@@ -342,10 +323,7 @@ int drive(std::uintmax_t operations, const fs::path& folder, unsigned seed) {
   const int kills = kill_at_random(folder, operations * kinds, seed);
   const std::uintmax_t done = total(folder);
   Host host(folder);
-  check_log(host, 0);
-  for (std::uintmax_t kind = 1; kind < kinds; ++kind) {
-    check_items(host, kind, all_kinds.at(kind).name, all_kinds.at(kind).reader(host));
-  }
+  for (std::uintmax_t kind = 0; kind < kinds; ++kind) check(host, kind);
   const std::size_t left = temporaries(folder).size();
   expect_nothing_left(host);
   std::printf("%ju operations, %d processes killed, %zu temporary files left by them\n", done, kills, left);
