@@ -1,6 +1,5 @@
 // A client whose user answers the boxes of the system: confirmations, dialogs for files and folders, passwords,
 // messages; and what can be seen of the components window.
-#include "host_grid.hpp"
 #include "windows.hpp"
 
 using namespace talutil::hosts;
@@ -29,10 +28,12 @@ void confirmations_ask_twice(_ORVUtils* u) {
 
 /// Exports a table, the user saving to what the dialog proposes, or not.
 void grids_are_exported(_ORVUtils* u, const std::wstring& folder) {
-  HostGrid table(2, 2);
-  table.text(0, 0) = L"a,b";
-  table.text(1, 1) = L"\u20AC";
-  Value grid(&table);
+  CLSID grid_class{};
+  require(CLSIDFromProgID(L"TALUtil.Grid", &grid_class), "CLSIDFromProgID");
+  const auto table = create_object<IDispatch>(grid_class, IID_IDispatch);
+  put(table.get(), L"Cols", 2L);
+  for (const wchar_t* const row : {L"a,b", L"\t\u20AC"}) use(table.get(), L"AddItem", row);
+  Value grid(table.get());
   u->put_sReportsDir(*Text(folder + L"\\"));
   const std::wstring path = folder + L"\\Sales\\Sales.txt";
   for (const auto& [button, expected] : {std::pair(IDOK, "\"a,b\",\r\n,\x80\r\n"), {IDCANCEL, "(no file)"}}) {

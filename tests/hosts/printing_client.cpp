@@ -128,13 +128,6 @@ void preview_is_printed(_ORVUtils* u) {
   with_dialog([&] { preview(u, L"The first page\fThe second page", print); });
 }
 
-void keys_are_printed(_ORVUtils* u) {
-  check_equal(S_OK, u->ShowShortCutKeys(), "ShowShortCutKeys");
-  const HWND window = top_windows(L"TALUtilForm").at(0);
-  with_dialog([&] { SendMessageW(button(window, L"Print"), BM_CLICK, 0, 0); });
-  close(window);
-}
-
 }  // namespace
 
 int wmain(int, wchar_t** arguments) {
@@ -145,8 +138,6 @@ int wmain(int, wchar_t** arguments) {
     forms_are_printed(object.get(), arguments[1], arguments[2]);
     print_into(arguments[2] + std::wstring(L"/printed_report.ps"));
     preview_is_printed(object.get());
-    print_into(arguments[2] + std::wstring(L"/printed_keys.ps"));
-    keys_are_printed(object.get());
     remove_printer();
   });
 }
