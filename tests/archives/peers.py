@@ -200,7 +200,8 @@ def by_programs(work, talutil):
     with_password = f"{talutil} zip OUT data --password-file password"
     commands += [
         ("talutil", f"{talutil} zip OUT data"), ("talutil, encrypted", with_password),
-        ("talutil, AES", with_password + " --aes"), ("zip -fz", "zip -qr -fz OUT data"), ("zip, a pipe", "zip -qr - data | cat >OUT"),
+        ("talutil, AES", with_password + " --aes"),
+        ("zip -fz", "zip -qr -fz OUT data"), ("zip, a pipe", "zip -qr - data | cat >OUT"),
         ("zip -fz, a pipe", "zip -qr -fz - data | cat >OUT"), ("zip -X", "zip -qrX OUT data"),
         ("zip -D", "zip -qrD OUT data"), ("zip -A", "zip -qr OUT data && zip -qA OUT"),
         ("zip, comment", "echo comment | zip -qrz OUT data"), ("zip -Z bzip2", "zip -qr -Z bzip2 OUT data"),
@@ -352,7 +353,7 @@ EXPLANATIONS = [
     ("end record:", ["bad"], "the end record and the directory disagree"),
     ("entries overlap", ["bad"], "refused, as small archives that unpack to terabytes are made so"),
     ("extra field broken", ["good"], "such fields are passed over"),
-    ("flipped", ["good", "bad"], "found where it makes a difference to the data: not in dates or fields that count twice"),
+    ("flipped", ["good", "bad"], "found where it matters to the data: not in dates, nor in fields that stand twice"),
     ("folder by attribute", ["good"], "the attribute of MS-DOS makes a folder, as on Windows"),
     ("(less|more) data than is said|zip64 without its field", ["bad"], "damage"),
     ("link", ["bad"], "links are passed over, code 17, since they can lead out of the folder"),
@@ -397,8 +398,8 @@ def main():
                 if words[0] in allowed and not is_outside:
                     passed += 1
                 else:
-                    failures.append(f"{kind}: {dict(zip(PROGRAMS, words))}" + (f"; expected, {why}" if why else "") +
-                                    (", outside" if is_outside else ""))
+                    known = f"; expected {' or '.join(allowed)}: {why}" if why else ""
+                    failures.append(f"{kind}: {dict(zip(PROGRAMS, words))}{known}{', outside' if is_outside else ''}")
     for failure in failures[:40]:
         print("FAILED:", failure)
     print(f"{passed} passed, {len(failures)} failed")

@@ -100,7 +100,6 @@ FUNCTIONS = {
     "array": lambda *values: list(values),
     "chr": chr,
     "len": lambda value: len(text_of(value)),
-    "isnull": lambda value: value is None,
     "isempty": lambda value: value == EMPTY,
     "typename": type_name,
     "ubound": lambda value: len(value) - 1,

@@ -279,6 +279,14 @@ void let_go_of_objects(IDispatch* u) {
     put(u, name, Value::nothing());
 }
 
+/// A combo box of entries with keys.
+HWND combo_box(std::initializer_list<LPARAM> keys) {
+  const HWND box = window(L"ComboBox", CBS_DROPDOWN, 100, 100);
+  for (const LPARAM key : keys)
+    SendMessageW(box, CB_SETITEMDATA, static_cast<WPARAM>(SendMessageW(box, CB_ADDSTRING, 0, LPARAM(L"entry"))), key);
+  return box;
+}
+
 /// The same calls twice: what the system loads once and keeps (fonts, libraries) is there after the first time.
 /// Settings of other lengths make some difference; a byte lost with each call would make a larger one.
 void both_ways_agree(IDispatch* u, unsigned seed, long wanted) {

@@ -222,14 +222,6 @@ inline HWND window(const wchar_t* window_class, DWORD style, int width, int heig
   return CreateWindowW(window_class, L"A window", style, 10, 10, width, height, parent, nullptr, nullptr, nullptr);
 }
 
-/// A combo box of entries with keys.
-inline HWND combo_box(std::initializer_list<LPARAM> keys) {
-  const HWND box = window(L"ComboBox", CBS_DROPDOWN, 100, 100);
-  for (const LPARAM key : keys)
-    SendMessageW(box, CB_SETITEMDATA, static_cast<WPARAM>(SendMessageW(box, CB_ADDSTRING, 0, LPARAM(L"entry"))), key);
-  return box;
-}
-
 /// Handles the messages that wait for this thread, calls from other apartments among them.
 inline void handle_messages() {
   MSG message;

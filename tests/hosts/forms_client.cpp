@@ -62,6 +62,12 @@ void boxes_take_texts(_ORVUtils* u) {
   }
 }
 
+/// Whether the thread was asked to quit; takes the request away.
+bool is_asked_to_quit(WPARAM code) {
+  MSG message{};
+  return PeekMessageW(&message, nullptr, WM_QUIT, WM_QUIT, PM_REMOVE) != FALSE && message.wParam == code;
+}
+
 /// Asks for the end once a window is there.
 void CALLBACK quit(HWND, UINT, UINT_PTR timer, DWORD) {
   if (top_windows(form_class).empty() && top_windows(preview_class).empty()) return;

@@ -252,10 +252,4 @@ inline void preview(_ORVUtils* u, std::wstring_view text, const User& user) {
   check(top_windows(preview_class).empty(), "the window is gone");
 }
 
-/// Whether the thread was asked to quit; takes the request away.
-inline bool is_asked_to_quit(WPARAM code) {
-  MSG message{};
-  return PeekMessageW(&message, nullptr, WM_QUIT, WM_QUIT, PM_REMOVE) != FALSE && message.wParam == code;
-}
-
 }  // namespace talutil::hosts
