@@ -6,8 +6,8 @@
   compare.py compare TALUTIL FOLDER DRIVE   compares what both have written
 
 There is one file of each kind that the library writes. The bytes have to be the same, but for dates in the document and,
-in the archive, the order of the folder's files and their rights. Archives that chance makes different each time are
-unpacked by the other side. The last line is "N passed, N failed".
+in the archive, the order of the folder's files and their rights. Archives and cipher texts that chance makes different
+each time are opened by the other side. The last line is "N passed, N failed".
 """
 import os
 import pathlib
@@ -23,7 +23,10 @@ import run
 
 PLACE = "C:\\EXAMPLES\\Equality"
 REPORT = "TAL/ORV3/DATA/MONTHLYREPORTS/SalesReport.pdf"
-ARCHIVES = """
+SECRET = "three \u20ac"
+LOCKED = f"""
+text = u.CryptoEncryptString("{SECRET}")
+u.SaveCfgFileData "Secrets", "Text", text, folder & "\\locked.ini", True
 Set zip = CreateObject("TALUtil.ZipControl")
 zip.ItemList = folder & "\\in"
 zip.RecurseSubdirectories = True
@@ -33,14 +36,16 @@ zip.ZIPFile = folder & "\\plain.zip"
 zip.Action = 4
 zip.Encrypt = True
 zip.StrongEncryption = True
-zip.Password = "three \u20ac"
+zip.Password = "{SECRET}"
 zip.ZIPFile = folder & "\\locked.zip"
 zip.Action = 4
 """
-UNPACKING = """
+OPENING = f"""
+text = u.GetCfgFileData("Secrets", "Text", "", folder & "\\foreign.ini", True)
+u.SaveTextBox u.CryptoDecryptString(text), folder & "\\opened.txt"
 Set unzip = CreateObject("TALUtil.UnzipControl")
 unzip.ZIPFile = folder & "\\foreign.zip"
-unzip.Password = "three \u20ac"
+unzip.Password = "{SECRET}"
 unzip.Destination = folder & "\\out"
 unzip.Action = 8
 """
@@ -57,7 +62,7 @@ def writing():
         for item in ("Paper", "Caf\u00e9 \u2013 5 \u20ac", "Empty", "Paper"):
             yield f'text = "{section} = {item};"' if item != "Empty" else 'text = ""'
             yield f'u.SaveCfgFileData "{section}", "{item}", text, folder & "\\settings.ini", True'
-    yield ARCHIVES + 'Set grid = CreateObject("TALUtil.Grid")\ngrid.Cols = 4'
+    yield LOCKED + 'Set grid = CreateObject("TALUtil.Grid")\ngrid.Cols = 4'
     for row in range(120):
         yield "grid.AddItem " + " & vbTab & ".join(f'"Cell {row * 7919 + i}, 5 \u20ac"' for i in range(4))
     yield REPORT_OF_GRID
@@ -107,24 +112,31 @@ def run_natively(talutil, classes, folder, code):
     batch.close()
 
 
+def hand_over(maker, opener):
+    for kind in ("zip", "ini"):
+        shutil.copy(maker / f"locked.{kind}", opener / f"foreign.{kind}")
+
+
 def write(talutil, classes, folder, drive):
     native, other = prepare(folder / "drives/c"), prepare(drive)
     code = "\n".join(writing())
     run_natively(talutil, classes, folder, code)
-    shutil.copy(native / "locked.zip", other / "foreign.zip")
-    opening = f'Set u = CreateObject("TALUtil.ORVUtils")\nfolder = "{PLACE}"\n'
-    (folder / "script.vbs").write_text(opening + code + UNPACKING, encoding="cp1252")
+    hand_over(native, other)
+    beginning = f'Set u = CreateObject("TALUtil.ORVUtils")\nfolder = "{PLACE}"\n'
+    (folder / "script.vbs").write_text(beginning + code + OPENING, encoding="cp1252")
 
 
 def compare(talutil, classes, folder, drive):
     native, other = (place / "EXAMPLES/Equality" for place in (folder / "drives/c", drive))
-    shutil.copy(other / "locked.zip", native / "foreign.zip")
-    run_natively(talutil, classes, folder, UNPACKING)
+    hand_over(other, native)
+    run_natively(talutil, classes, folder, OPENING)
     verdicts = run.Verdicts()
     verdicts.check("settings.ini", (native / "settings.ini").read_bytes() == (other / "settings.ini").read_bytes())
     verdicts.check("plain.zip", entries(native / "plain.zip") == entries(other / "plain.zip"))
     verdicts.check("the report", without_dates(folder / "drives/c" / REPORT) == without_dates(drive / REPORT))
     for side in (native, other):
+        opened = (side / "opened.txt").read_text(encoding="cp1252")
+        verdicts.check(f"the cipher text in {side}", opened == SECRET + "\n")
         verdicts.check(f"what was unpacked in {side}", tree(side / "in") == tree(side / "out/in"))
     return verdicts.close()
 
