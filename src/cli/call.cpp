@@ -76,6 +76,9 @@ int test_status(const Member& member, const Variant& result) {
 
 int call(const CallOptions& options) {
   Session session(options.code_page);
+  // Unlike a batch or an archive's password, nothing but the answers to the member's boxes is read from there. After an
+  // argument that was (@-), nothing is left.
+  session.platform().terminal.take_piped_answers();
   const Entry entry = find_entry(Session::members().members, options.member);
   const Member& member = slot_for(entry, options.arguments.size());
   check_count(member, options.arguments.size());
@@ -115,6 +118,9 @@ void add_call(CLI::App& app, Work& work, const std::vector<std::string>& verbati
       "as the library would print it (5, -1.5, but not 007) is a number. For values without a text form:\n" +
       written_forms_help() +
       "\n\"--\" ends the options: whatever follows is an argument, even --json.\n"
+      "Boxes that the member shows are answered at the terminal or by the lines of\n"
+      "standard input, and are closed at its end:\n"
+      "  echo YES | talutil call CheckDeleteRecord\n"
       "Dates are typed and printed day first: talutil call IncMonth 31/03/2009 -1");
   choose(*command, work, options, [command, &verbatim](CallOptions& chosen) {
     chosen.arguments = command->remaining();

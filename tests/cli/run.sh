@@ -126,6 +126,12 @@ expect 'the same as JSON' 1 '{"error": {"status": 1, "message": "IncMonth: error
   call IncMonth x 1 --json
 expect 'a window without a screen' 1 'talutil: ShowSysInfo: error 445: There is no screen to show the window on' call ShowSysInfo
 expect_part 'an input box on the terminal' 0 'Name: Who are you?' call MyInputBox Name 'Who are you?'
+# The second box shows a warning, is asked for again and reads no further than its answer.
+verdict 'an answer by a pipe' "True${nl}rest" "$(printf 'yes\r\nmaybe\ny\nYES\nrest' |
+  { "$talutil" call CheckDeleteRecord 2>log; cat; })"
+verdict 'an answer that ends' False "$(printf yes | "$talutil" call CheckDeleteRecord 2>log)"
+verdict 'requests are no answers' '{"result": false}x' \
+  "$(printf '{"call": "CheckDeleteRecord"}\nYES\n' | "$talutil" batch 2>log | sed 's/{"error.*/x/' | paste -sd '')"
 expect 'not a whole number' 1 \
   'talutil: GetData: iSt: "x" is not a whole number; write -2147483648 to 2147483647' call GetData A, x 2
 expect_part 'too many, with optional' 2 'takes 2 to 3 arguments (sTemp, sFList, sDelimiter), not 4' \

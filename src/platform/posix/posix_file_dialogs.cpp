@@ -4,7 +4,6 @@
 
 #include "automation/run_time_error.hpp"
 #include "platform/posix/posix_files.hpp"
-#include "platform/posix/terminal.hpp"
 
 namespace talutil::posix {
 
@@ -33,14 +32,14 @@ Text path_of(const FileDialog& dialog, const Text& name) {
 }
 
 /// Whether the dialog's flags allow this file.
-bool is_accepted(const FileDialog& dialog, const Text& path) {
+bool is_accepted(const FileDialog& dialog, const Text& path, const Terminal& terminal) {
   if (dialog.purpose == FileDialog::Purpose::open) {
     if ((dialog.flags & file_dialog_flag::file_must_exist) == 0 || exists(path)) return true;
     std::cerr << '"' << to_utf8(path) << "\" does not exist\n";
     return false;
   }
   if ((dialog.flags & file_dialog_flag::overwrite_prompt) == 0 || !exists(path)) return true;
-  const auto answer = ask_terminal('"' + to_utf8(path) + "\" exists. Replace it? [y/n] ");
+  const auto answer = terminal.ask('"' + to_utf8(path) + "\" exists. Replace it? [y/n] ");
   return answer && (answer->starts_with('y') || answer->starts_with('Y'));
 }
 
@@ -52,10 +51,10 @@ std::optional<ChosenFile> PosixFileDialogs::choose(const FileDialog& dialog) {
   const std::string what = dialog.title.empty() ? "File" : to_utf8(dialog.title);
   const std::string hint = has_name ? " [a file, Enter for " + to_utf8(suggested) + ", Ctrl+D to cancel] "
                                     : " [a file, or Enter to cancel] ";
-  while (const auto line = ask_terminal(what + hint)) {
+  while (const auto line = terminal_.ask(what + hint)) {
     if (line->empty() && !has_name) break;
     Text path = line->empty() ? suggested : path_of(dialog, from_utf8(*line));
-    if (is_accepted(dialog, path)) return ChosenFile{std::move(path), dialog.filter_index};
+    if (is_accepted(dialog, path, terminal_)) return ChosenFile{std::move(path), dialog.filter_index};
   }
   return std::nullopt;
 }

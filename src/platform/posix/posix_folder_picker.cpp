@@ -4,7 +4,6 @@
 
 #include "automation/run_time_error.hpp"
 #include "platform/posix/posix_files.hpp"
-#include "platform/posix/terminal.hpp"
 
 namespace talutil::posix {
 
@@ -22,7 +21,7 @@ bool is_folder(const Text& path) {
 
 std::optional<Text> PosixFolderPicker::choose(TextView title, std::intptr_t /*owner*/) {
   const std::string prompt = to_utf8(title) + (title.empty() ? "" : " ") + "[a folder, or Enter to cancel] ";
-  while (const auto line = ask_terminal(prompt)) {
+  while (const auto line = terminal_.ask(prompt)) {
     if (line->empty()) break;
     const Text folder = from_utf8(*line);
     if (is_folder(folder)) return folder;

@@ -6,7 +6,6 @@
 #include "automation/run_time_error.hpp"
 #include "platform/form_view.hpp"
 #include "platform/posix/posix_platform.hpp"
-#include "platform/posix/terminal.hpp"
 
 namespace talutil::posix {
 
@@ -14,7 +13,8 @@ namespace {
 
 class TerminalForm final : public FormView {
  public:
-  TerminalForm(FormEvents& events, const FormDescription& description) : events_(events), description_(description) {}
+  TerminalForm(FormEvents& events, const FormDescription& description, const Terminal& terminal)
+      : events_(events), description_(description), terminal_(terminal) {}
 
   void set_caption(TextView caption) override { caption_ = caption; }
   void set_text(std::uint8_t part, TextView text) override { texts_[part] = text; }
@@ -46,10 +46,10 @@ class TerminalForm final : public FormView {
     std::optional<Text> answer;
     if (entry != nullptr) {
       std::cerr << '\n';
-      answer = PosixInputBoxes().ask(u">", {}, masked_[entry->id] ? Entry::masked : Entry::shown);
+      answer = PosixInputBoxes(terminal_).ask(u">", {}, masked_[entry->id] ? Entry::masked : Entry::shown);
       if (answer) texts_[entry->id] = *answer;
     } else {
-      answer = ask_terminal(" [Enter] ") ? std::optional(Text()) : std::nullopt;
+      answer = terminal_.ask(" [Enter] ") ? std::optional(Text()) : std::nullopt;
     }
     if (answer && button != nullptr) events_.clicked(button->id);
     close(CloseMode::control_menu);
@@ -80,6 +80,7 @@ class TerminalForm final : public FormView {
 
   FormEvents& events_;
   const FormDescription& description_;
+  const Terminal& terminal_;
   Text caption_;
   std::map<std::uint8_t, Text> texts_;
   std::map<std::uint8_t, bool> hidden_;
@@ -96,7 +97,7 @@ std::unique_ptr<FormView> PosixFormWindows::make_form(FormEvents& events, const 
   if (!is_box) {
     throw RunTimeError(ErrorNumber::action_not_supported, Text(no_screen_for_windows));
   }
-  return std::make_unique<TerminalForm>(events, description);
+  return std::make_unique<TerminalForm>(events, description, terminal_);
 }
 
 }  // namespace talutil::posix

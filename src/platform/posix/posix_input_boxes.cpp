@@ -5,8 +5,6 @@
 
 #include <iostream>
 
-#include "platform/posix/terminal.hpp"
-
 namespace talutil::posix {
 
 namespace {
@@ -39,7 +37,7 @@ class Silence {
 std::optional<Text> PosixInputBoxes::ask(TextView prompt, TextView title, Entry entry) {
   std::optional<Silence> silence;
   if (entry == Entry::masked) silence.emplace();
-  const auto line = ask_terminal((title.empty() ? "" : to_utf8(title) + ": ") + to_utf8(prompt) + " ");
+  const auto line = terminal_.ask((title.empty() ? "" : to_utf8(title) + ": ") + to_utf8(prompt) + " ");
   return line ? std::optional(from_utf8(*line)) : std::nullopt;
 }
 

@@ -13,19 +13,21 @@
 #include <type_traits>
 
 #include "automation/run_time_error.hpp"
-#include "platform/posix/terminal.hpp"
 
 namespace talutil::posix {
 
 namespace {
 
-MessageAnswer ask_ok() { return ask_terminal("[Enter] ") ? MessageAnswer::ok : MessageAnswer::cancel; }
+MessageAnswer ask_ok(const Terminal& terminal) {
+  return terminal.ask("[Enter] ") ? MessageAnswer::ok : MessageAnswer::cancel;
+}
 
-MessageAnswer ask_yes_no() {
-  while (const auto line = ask_terminal("Yes or no? [y/n] ")) {
+MessageAnswer ask_yes_no(const Terminal& terminal) {
+  while (const auto line = terminal.ask("Yes or no? [y/n] ")) {
     const char first = line->empty() ? ' ' : line->front();
     if (first == 'y' || first == 'Y') return MessageAnswer::yes;
     if (first == 'n' || first == 'N') return MessageAnswer::no;
+    std::cerr << '"' << *line << "\" is neither yes nor no\n";
   }
   return MessageAnswer::no;
 }
@@ -73,7 +75,7 @@ MessageAnswer PosixMessageBoxes::show(TextView text, MessageButtons buttons, Tex
   // Flush what the program has printed so far, so that it precedes the box.
   std::cout.flush();
   std::cerr << caption << ": " << to_utf8(text) << '\n';
-  return buttons == MessageButtons::ok ? ask_ok() : ask_yes_no();
+  return buttons == MessageButtons::ok ? ask_ok(terminal_) : ask_yes_no(terminal_);
 }
 
 Text PosixComputer::name() {

@@ -16,13 +16,19 @@
 #include "platform/posix/posix_registry.hpp"
 #include "platform/posix/posix_settings.hpp"
 #include "platform/posix/posix_time_conversions.hpp"
+#include "platform/posix/terminal.hpp"
 
 namespace talutil::posix {
 
 /// Message boxes on the terminal: the text goes to standard error, the answer comes from standard input.
 class PosixMessageBoxes final : public MessageBoxes {
  public:
+  explicit PosixMessageBoxes(const Terminal& terminal) noexcept : terminal_(terminal) {}
+
   MessageAnswer show(TextView text, MessageButtons buttons, TextView title) override;
+
+ private:
+  const Terminal& terminal_;
 };
 
 /// There is no screen to ask; 96 dpi is what documents and forms are designed for.
@@ -56,6 +62,8 @@ class PosixClock final : public Clock {
 /// Windows that are never shown need no window system: they are objects without a handle.
 class PosixFormWindows final : public FormWindows {
  public:
+  explicit PosixFormWindows(const Terminal& terminal) noexcept : terminal_(terminal) {}
+
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override;
 
   /// A window that has a size and a state but cannot be shown.
@@ -64,6 +72,9 @@ class PosixFormWindows final : public FormWindows {
 
   /// Nothing is shown; at a terminal, Ctrl+C ends the whole program.
   std::unique_ptr<Waiting> show_hourglass() override;
+
+ private:
+  const Terminal& terminal_;
 };
 
 /// Third-party controls exist on Windows only.
@@ -114,26 +125,27 @@ struct PosixPlatform {
   explicit PosixPlatform(std::uint32_t code_page_number) : code_page(make_code_page(code_page_number)) {}
 
   std::unique_ptr<CodePage> code_page;
-  PosixMessageBoxes message_boxes;
+  Terminal terminal;
+  PosixMessageBoxes message_boxes{terminal};
   PosixScreen screen;
   PosixComputer computer;
   PosixClock clock;
-  PosixFormWindows form_windows;
+  PosixFormWindows form_windows{terminal};
   PosixControlMakers control_makers;
   PosixMessagePump message_pump;
   PosixRandomSource random_source;
   PosixCryptography cryptography;
   PosixFiles files;
-  PosixFolderPicker folder_picker;
+  PosixFolderPicker folder_picker{terminal};
   PosixGuids guids;
   PosixFolders folders;
-  PosixInputBoxes input_boxes;
+  PosixInputBoxes input_boxes{terminal};
   PosixProfiles profiles{files};
   Hive hive{Hive::default_path()};
   PosixSettingsStore settings_store{hive};
   PosixRegistry registry{hive, *code_page};
   PosixNetwork network;
-  PosixFileDialogs file_dialogs;
+  PosixFileDialogs file_dialogs{terminal};
   PosixDrawing drawing;
   PosixWindowPrinting window_printing;
   PosixFontFiles font_files;
