@@ -70,6 +70,9 @@ wait "$waiting_PID"
 verdict 'batch answers at once' '{"result": "A"}' "$first"
 verdict 'batch in another code page' '{"result": "Ольга"}' \
   "$(echo '{"call": "VerifyTextData", "args": [0, 0, "Ольга?"]}' | batch --code-page 1251)"
+printf '{"process": 1, "call": "GetData", "args": ["A,B,", 0, 1], "result": "A"}\n{"process": 1, "call": "Get' >full.jsonl
+expect 'the recording of a full disk' 1 "line 2: no record: byte 28: expected a closing quote, but the line ends
+1 calls compared, 0 different${nl}talutil: full.jsonl: 1 lines are no records" batch --compare full.jsonl
 
 # ---- call: written forms
 expect 'Null' 0 0 call VerifyIntData 1 @null

@@ -86,7 +86,11 @@ restart_wine
 
 # Script hosts; the guides have clients in JScript and Pascal.
 hosts='Z:\checkout\tests\hosts'
-run vbscript wine cscript.exe //nologo "$hosts\\members.vbs"
+# The first of them is recorded into a file that cannot grow, which it must not notice; a debugger would.
+ln -sfn /dev/full "$talutil_build/full"
+TALUTIL_RECORD='Z:\build\full' WINEDEBUG=warn+seh run vbscript wine cscript.exe //nologo "$hosts\\members.vbs"
+succeeds "the recording ended because the disk was full" \
+  grep -q 'cannot record any more calls: writing the file failed' "$talutil_build/$folder-vbscript.log"
 run script_control wine cscript.exe //nologo "$hosts\\script_control.vbs" "$hosts\\members.vbs"
 
 # The system's code page is that of the locale in which Wine's server begins; a manifest makes it UTF-8.
