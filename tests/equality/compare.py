@@ -49,6 +49,10 @@ unzip.Password = "{SECRET}"
 unzip.Destination = folder & "\\out"
 unzip.Action = 8
 """
+# What the script's code page lacks, by the names of its variables.
+TEXTS = {"hebrew": "\u05e9\u05dc\u05d5\u05dd (\u05d0\u05b8\u05d1) 12.50 abc",
+         "arabic": "\u0645\u0631\u062d\u0628\u0627 50%",
+         "mixed": "No 7 \u0627\u0644\u0633\u0644\u0627\u0645, \u05d0!"}
 REPORT_OF_GRID = """
 grid.FixedRows = 1
 u.AutomatedEndOfMonth = True
@@ -65,6 +69,7 @@ def writing():
     yield LOCKED + 'Set grid = CreateObject("TALUtil.Grid")\ngrid.Cols = 4'
     for row in range(120):
         yield "grid.AddItem " + " & vbTab & ".join(f'"Cell {row * 7919 + i}, 5 \u20ac"' for i in range(4))
+    yield "grid.AddItem " + " & vbTab & ".join(TEXTS)
     yield REPORT_OF_GRID
 
 
@@ -108,7 +113,7 @@ def tree(folder):
 
 def run_natively(talutil, classes, folder, code):
     batch = run.Batch(talutil, classes, folder)
-    language.Interpreter(batch, {"u": {"object": 0}, "folder": PLACE}).run(language.read(code))
+    language.Interpreter(batch, {"u": {"object": 0}, "folder": PLACE, **TEXTS}).run(language.read(code))
     batch.close()
 
 
@@ -122,7 +127,11 @@ def write(talutil, classes, folder, drive):
     code = "\n".join(writing())
     run_natively(talutil, classes, folder, code)
     hand_over(native, other)
+    (other / "texts.txt").write_text("\n".join(TEXTS.values()), encoding="utf-16")
     beginning = f'Set u = CreateObject("TALUtil.ORVUtils")\nfolder = "{PLACE}"\n'
+    beginning += 'Set files = CreateObject("Scripting.FileSystemObject")\n'
+    beginning += 'Set texts = files.OpenTextFile(folder & "\\texts.txt", 1, False, -1)\n'
+    beginning += "".join(f"{name} = texts.ReadLine\n" for name in TEXTS)
     (folder / "script.vbs").write_text(beginning + code + OPENING, encoding="cp1252")
 
 

@@ -245,8 +245,9 @@ int wmain(int count, wchar_t** arguments) {
         form_class, [u] { return u->ShowSysInfo(); }, system_is_described);
     keys_are_listed(u);
     if (count < 3) {
-      std::wstring pages;
-      for (int i = 1; i <= 150; ++i)
+      std::wstring pages =
+          L"\u05E9\u05DC\u05D5\u05DD (\u05D0\u05B8\u05D1) abc 12.50!\r\n\u0645\u0631\u062D\u0628\u0627 50% a\r\n";
+      for (int i = 3; i <= 150; ++i)
         pages +=
             L"Line " + std::to_wstring(i) + L": caf\u00E9, \u041F\u0440\u0438\u0432\u0435\u0442, 12.50\t\u20AC\r\n";
       preview(u, pages, pages_are_shown);

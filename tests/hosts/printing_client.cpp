@@ -125,7 +125,12 @@ void preview_is_printed(_ORVUtils* u) {
     SendMessageW(window, WM_KEYDOWN, VK_F9, 0);
     close(window);
   };
-  with_dialog([&] { preview(u, L"The first page\fThe second page", print); });
+  with_dialog([&] {
+    preview(u,
+            L"The first page\r\n\u05E9\u05DC\u05D5\u05DD (abc) 12.50\r\n\u0645\u0631\u062D\u0628\u0627 50%\fThe second "
+            L"page",
+            print);
+  });
 }
 
 }  // namespace

@@ -69,13 +69,19 @@ run forms-144 wine "Z:\\build\\$folder\\tests\\hosts\\forms_client.exe" "Z:\\bui
 dots 96
 run examples run_examples "$folder" "$talutil_build/asan/talutil"
 rm -f "$talutil_build/$folder"/printed_*.ps
+# The fonts that the native command has too, with Hebrew and Arabic letters.
+replacements='HKCU\Software\Wine\Fonts\Replacements'
+for names in "Arial:DejaVu Sans" "Courier New:DejaVu Sans Mono"; do
+  wine reg.exe add "$replacements" /v "${names%:*}" /d "${names#*:}" /f >/dev/null 2>&1
+done
 client printing "$(build_below_wine)/$folder"
 printed() {  # what, the pattern of its words
   local words
   words=$(gs -q -sDEVICE=txtwrite -o - "$talutil_build/$folder/printed_$1.ps" 2>&1 | sed 's/\xc2\xa0/ /g' | tr -s '[:space:]' ' ')
   succeeds "the words of the printed $1, which begin: ${words:0:100}" test "${words#$2}" != "$words"
 }
-printed report '*Notes The first page*Page 1 of 2*Notes The second page*Page 2 of 2'
+# The page has the letters from left to right.
+printed report '*Notes The first page 12.50 (abc) םולש *Page 1 of 2*Notes The second page*Page 2 of 2'
 succeeds "a printed window is a page" test "$(gs -q -sDEVICE=bbox -o - "$talutil_build/$folder/printed_window.ps" 2>&1 | grep -c %%BoundingBox)" = 1
 kill $pictures_pid || true
 restart_wine
@@ -87,8 +93,8 @@ restart_wine
 # Script hosts; the guides have clients in JScript and Pascal.
 hosts='Z:\checkout\tests\hosts'
 # The first of them is recorded into a file that cannot grow, which it must not notice; a debugger would.
-ln -sfn /dev/full "$talutil_build/full"
-TALUTIL_RECORD='Z:\build\full' WINEDEBUG=warn+seh run vbscript wine cscript.exe //nologo "$hosts\\members.vbs"
+ln -sfn /dev/full "$talutil_build/$folder/full"
+TALUTIL_RECORD="Z:\\build\\$folder\\full" WINEDEBUG=warn+seh run vbscript wine cscript.exe //nologo "$hosts\\members.vbs"
 succeeds "the recording ended because the disk was full" \
   grep -q 'cannot record any more calls: writing the file failed' "$talutil_build/$folder-vbscript.log"
 run script_control wine cscript.exe //nologo "$hosts\\script_control.vbs" "$hosts\\members.vbs"
@@ -120,6 +126,7 @@ rm -rf "$talutil_build/equality-$folder"
 succeeds "writing natively" artifacts write
 succeeds "writing by $dll" wine cscript.exe //nologo "Z:\\build\\equality-$folder\\script.vbs"
 run equality artifacts compare
+wine reg.exe delete "$replacements" /f >/dev/null 2>&1
 succeeds "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"
 
 close_counts

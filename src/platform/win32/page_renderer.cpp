@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <map>
+#include <numeric>
 
 #include "platform/win32/handle.hpp"
 
@@ -42,6 +43,13 @@ class Fonts {
   Owned<kind::Selection> before_;
 };
 
+/// Whether a character belongs to the one before it: a mark, or the second half of a pair.
+bool continues_letter(char16_t unit) {
+  WORD kind = 0;
+  GetStringTypeW(CT_CTYPE3, wide(&unit), 1, &kind);
+  return (kind & C3_NONSPACING) != 0 || (unit & 0xFC00U) == 0xDC00U;
+}
+
 class Drawer {
  public:
   Drawer(HDC device, const PagePlacement& placement)
@@ -57,22 +65,10 @@ class Drawer {
     if (is_unseen({run.left, run.top, run.width, line_height(run.font)})) return;
     fonts_.select(run.font);
     SetTextColor(device_, run.colour);
-    const auto length = static_cast<int>(run.text.size());
-    // The end of each character in the device's font, scaled to the width that was laid out.
-    std::vector<int> ends(run.text.size());
-    SIZE natural{};
-    GetTextExtentExPointW(device_, wide(run.text), length, 0, nullptr, ends.data(), &natural);
-    const double stretch = natural.cx == 0 ? 1 : run.width * placement_.scale_x / natural.cx;
-    int before = 0;
-    for (int& end : ends) {
-      const int here = rounded(end * stretch);
-      end = here - before;
-      before = here;
-    }
-    // The platform orders and mirrors what runs from right to left.
-    const UINT options = run.is_right_to_left ? ETO_RTLREADING : 0;
-    ExtTextOutW(device_, x_of(run.left), y_of(run.top + baseline(run.font)), options, nullptr, wide(run.text),
-                static_cast<UINT>(length), ends.data());
+    std::vector<int> ends = ends_of(run.text, run.width);
+    if (run.is_right_to_left) return draw_letters(run, ends);
+    std::adjacent_difference(ends.begin(), ends.end(), ends.begin());
+    text_out(run, x_of(run.left), 0, run.text, ends.data());
   }
 
   void draw(const Box& box) {
@@ -117,6 +113,34 @@ class Drawer {
   }
 
  private:
+  /// Where each character ends, in pixels: in the device's font, scaled to the width that was laid out.
+  [[nodiscard]] std::vector<int> ends_of(TextView text, std::int32_t width) const {
+    std::vector<int> ends(text.size());
+    SIZE natural{};
+    GetTextExtentExPointW(device_, wide(text.data()), static_cast<int>(text.size()), 0, nullptr, ends.data(), &natural);
+    const double stretch = natural.cx == 0 ? 1 : width * placement_.scale_x / natural.cx;
+    for (int& end : ends) end = rounded(end * stretch);
+    return ends;
+  }
+
+  void text_out(const TextRun& run, int x, UINT options, TextView text, const int* advances) {
+    ExtTextOutW(device_, x, y_of(run.top + baseline(run.font)), options, nullptr, wide(text.data()),
+                static_cast<UINT>(text.size()), advances);
+  }
+
+  /// Draws a run that begins at its right end, each letter with its marks by itself: Wine puts such a text into order,
+  /// but not the widths given with it. A bracket by itself is still mirrored.
+  void draw_letters(const TextRun& run, const std::vector<int>& ends) {
+    if (ends.empty()) return;
+    const int right = x_of(run.left) + ends.back();
+    const TextView text = run.text;
+    for (std::size_t start = 0, end = 0; start < text.size(); start = end) {
+      end = start + 1;
+      while (end < text.size() && continues_letter(text[end])) ++end;
+      text_out(run, right - ends[end - 1], ETO_RTLREADING, text.substr(start, end - start), nullptr);
+    }
+  }
+
   [[nodiscard]] int x_of(std::int32_t twips) const { return placement_.left + rounded(twips * placement_.scale_x); }
   [[nodiscard]] int y_of(std::int32_t twips) const { return placement_.top + rounded(twips * placement_.scale_y); }
   [[nodiscard]] RECT rectangle_of(const TwipsRectangle& place) const {

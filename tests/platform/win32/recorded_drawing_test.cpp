@@ -111,5 +111,21 @@ TEST(RecordedDrawing, TextsOfPagesLieWhereTheyWereLaidOut) {
   }
 }
 
+TEST(RecordedDrawing, LettersFromRightToLeftLieSideBySide) {
+  Page page{11906, 16838, {}};
+  page.items.emplace_back(TextRun{300, 600, 3000, {}, true, 0, u"\u05E9(\u05D5\u05B8\u05DD", false, true});
+  const Recording recording = recorded([&](HDC recorder) { draw_page(recorder, page, {7, 9, 0.1, 0.1}); });
+  // From the right, in the proportions of the font.
+  double natural = 0;
+  for (const auto& [text, drawn] : recording.texts) natural += drawn.width;
+  double right = 7 + 330;
+  for (const TextView letter : {u"\u05E9", u"(", u"\u05D5\u05B8", u"\u05DD"}) {
+    const auto found = recording.texts.find(Text(letter));
+    ASSERT_NE(found, recording.texts.end()) << to_utf8(letter);
+    right -= found->second.width * 300 / natural;
+    EXPECT_LE(std::abs(found->second.at.x - right), 1) << to_utf8(letter);
+  }
+}
+
 }  // namespace
 }  // namespace talutil::win32
