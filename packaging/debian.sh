@@ -47,6 +47,9 @@ Description: common toolkit for booking and job scheduling
  archives and reports: as a command, a library for C, and a Python package.
 X
 printf 'activate-noawait ldconfig\n' >"$root/DEBIAN/triggers"
+# What Python compiles for root lies beside its package and would be left behind.
+printf '%s\n' '#!/bin/sh' 'rm -rf /usr/lib/python3/dist-packages/talutil/__pycache__' >"$root/DEBIAN/prerm"
+chmod 755 "$root/DEBIAN/prerm"
 (cd "$root" && find usr -type f -printf '%P\n' | LC_ALL=C sort | sed 's|^|usr/|' | xargs -d '\n' md5sum) >"$root/DEBIAN/md5sums"
 find "$root" -exec touch --no-dereference --date="@$SOURCE_DATE_EPOCH" {} +
 
