@@ -8,6 +8,7 @@ set -euo pipefail
 cd "$talutil_top"
 folder=${1:-$talutil_build/package}
 need_packages $native_packages python3 dpkg-dev
+say "building the command and the libraries (minutes the first time)" >&2
 build native >&2
 
 version=$(sed -n 's/.*version_text = "\([0-9.]*\)".*/\1/p' src/library/version.hpp)

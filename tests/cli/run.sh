@@ -129,7 +129,7 @@ expect 'the same as JSON' 1 '{"error": {"status": 1, "message": "IncMonth: error
   call IncMonth x 1 --json
 expect 'a window without a screen' 1 'talutil: ShowSysInfo: error 445: There is no screen to show the window on' call ShowSysInfo
 expect_part 'an input box on the terminal' 0 'Name: Who are you?' call MyInputBox Name 'Who are you?'
-# The second box shows a warning, is asked for again and reads no further than its answer.
+# A wrong answer brings a warning, which takes only yes or no; what follows the right one is left.
 verdict 'an answer by a pipe' "True${nl}rest" "$(printf 'yes\r\nmaybe\ny\nYES\nrest' |
   { "$talutil" call CheckDeleteRecord 2>log; cat; })"
 verdict 'an answer that ends' False "$(printf yes | "$talutil" call CheckDeleteRecord 2>log)"

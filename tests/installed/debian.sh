@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# Makes the Debian package twice and uses it in a clean Debian, which debootstrap makes once in build/clean-root:
-# tests/installed/debian.sh. Where that is not possible, the package is only unpacked. The last line is "N passed, N
-# failed".
+# Makes the Debian package twice and uses it in a clean Debian, which debootstrap makes once in the build
+# folder: tests/installed/debian.sh. Where that is not possible, the package is only unpacked. The last line is "N
+# passed, N failed".
 set -uo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
 here=$talutil_top/tests/installed
@@ -10,7 +10,7 @@ trap 'rm -rf "$work"' EXIT
 . "$talutil_top/tests/verdict.sh"
 
 clean_suite=$wine_root_suite
-clean_root=$talutil_build/clean-root
+clean_root=$talutil_build/clean-$clean_suite
 
 # Makes the clean Debian. Its package lists stay as they are, and what apt has fetched is kept beside it, so that later
 # runs need no network.
@@ -53,6 +53,8 @@ use_unpacked() {
   library=$(dirname "$(find "$work/root/usr" -name libtalutil.so.1)")
   verdict 'its Python package' B "$(LD_LIBRARY_PATH=$library PYTHONPATH=$work/root/usr/lib/python3/dist-packages \
     python3 -c 'import talutil; print(talutil.ORVUtils().GetData("A,B,C,", 1, 2))')"
+  verdict 'its dependencies are installed here' "" "$(dpkg-deb -f "$package" Depends | tr ',' '\n' |
+    sed 's/ *(.*//; s/^ *//' | while read -r name; do dpkg-query -W "$name" >/dev/null 2>&1 || echo "$name"; done)"
 }
 
 package=$("$talutil_top/packaging/debian.sh" "$work/first" | tail -1)
