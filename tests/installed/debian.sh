@@ -16,7 +16,7 @@ clean_root=$talutil_build/clean-$clean_suite
 # runs need no network.
 make_clean_root() {
   local mirror unfinished=$clean_root.$$
-  [ "$(id -u)" = 0 ] && unshare --mount true || { echo "making a root folder needs the rights of root"; return 1; }
+  [ "$(id -u)" = 0 ] && unshare --mount true || { echo "it needs the rights of root, and to mount"; return 1; }
   [ ! -d "$clean_root" ] || return 0
   mirror=$(debian_mirror "$clean_suite")
   [ -n "$mirror" ] || { echo "apt has no mirror for $clean_suite"; return 1; }
