@@ -5,7 +5,8 @@
 #   run.sh native TALUTIL      compares all pages, and runs what runs here, with this command
 #   run.sh windows|windows64   runs what uses TALUtil.dll, which has to be built by that preset
 #
-# A page shows a file in the code block below "<!-- FILE -->", and what it prints below "<!-- output of FILE -->". Each
+# A page shows a file in the code block below "<!-- FILE -->", and what it prints below "<!-- output of FILE -->". The
+# blocks below "<!-- transcript -->" are one session in a shell: lines with $, continued by >, and what they print. Each
 # check that fails is a line; the last line is "N passed, N failed".
 set -euo pipefail
 . "$(dirname "${BASH_SOURCE[0]}")/../../tools/environment.sh"
@@ -54,6 +55,30 @@ in_empty_folder() (
   PATH=$work/bin:$PATH TALUTIL_HIVE=$work/hive.db "$@"
 )
 
+# Types the lines of a transcript, as a shell shows them.
+type_in() {
+  local line command=
+  while IFS= read -r line <&3; do
+    case $line in
+      '$ '*) eval "$command" </dev/null || true; command=${line#'$ '} ;;
+      '> '*) command+=$'\n'${line#'> '} ;;
+      *) continue ;;
+    esac
+    printf '%s\n' "$line"
+  done
+  eval "$command" </dev/null || true
+}
+
+run_transcript() {
+  local page=docs/guides/first-steps.md
+  awk '/^<!-- transcript -->$/ { found = 1 }
+    found && /^```/ { found = inside = !inside; next }
+    inside' "$page" >"$work/said"
+  in_empty_folder type_in 3<"$work/said" >"$work/printed" 2>&1
+  sed -i 's/\r$//' "$work/printed"
+  same_files "what appears in $page" "$work/said" "$work/printed"
+}
+
 run_native() {
   local file
   compare_pages
@@ -62,6 +87,7 @@ run_native() {
   done
   file=examples/guides/python_command.py
   prints_as_said "$file" in_empty_folder python3 "$talutil_top/$file"
+  run_transcript
 }
 
 run_pascal() {
