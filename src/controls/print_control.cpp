@@ -5,7 +5,6 @@
 
 #include "automation/checked.hpp"
 #include "automation/control.hpp"
-#include "documents/grid_contents.hpp"
 #include "documents/pdf_writer.hpp"
 
 namespace talutil {
@@ -52,11 +51,10 @@ std::int32_t PrintControl::PageCount() const noexcept {
 }
 
 void PrintControl::put_CurrentPage(std::int32_t page) {
-  current_page_ = std::clamp(page, std::min(1, PageCount()), PageCount());
-}
-
-const Page* PrintControl::shown_page() const {
-  return current_page_ < 1 ? nullptr : &document_->pages[static_cast<std::size_t>(current_page_) - 1];
+  page = std::clamp(page, std::min(1, PageCount()), PageCount());
+  // Composed now rather than when it is drawn, so that whoever asks for the page gets the error if it fails.
+  if (page > 0) shown_page_ = document_->pages[static_cast<std::size_t>(page) - 1];
+  current_page_ = page;
 }
 
 std::optional<TwipsRectangle> PrintControl::guides() const {
@@ -117,8 +115,8 @@ void PrintControl::put_RenderControl(std::int32_t window) {
     const Control grid(*object, locale());
     if (grid.answers(u"Rows") && grid.answers(u"Cols") && grid.answers(u"TextMatrix")) {
       // Read before the composer is used: the host may start another document meanwhile.
-      const GridContents contents(grid, {family_of(FontName), false, 8});
-      return composer().add_grid(contents);
+      GridContents contents(grid, {family_of(FontName), false, 8});
+      return composer().add_grid(std::move(contents));
     }
   }
   WindowImage image = platform_.drawing.image_of(window);
@@ -140,6 +138,7 @@ void PrintControl::EndDoc() {
 
 void PrintControl::discard() noexcept {
   document_.reset();
+  shown_page_ = {};
   current_page_ = 0;
 }
 

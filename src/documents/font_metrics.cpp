@@ -18,7 +18,7 @@ FontMetrics::~FontMetrics() = default;
 
 bool FontMetrics::is_wide(char16_t unit) noexcept { return unit >= 0x80 && chr(ansi_code(unit)).front() != unit; }
 
-std::int32_t FontMetrics::width(char16_t unit, const FontStyle& font) {
+std::int32_t FontMetrics::find_width(char16_t unit, const FontStyle& font) {
   if (!library_) library_ = std::make_unique<Library>(files_);
   if (unit < 0x80 || !is_wide(unit)) {
     auto& widths = widths_[font_index(font.family, font.is_bold)];

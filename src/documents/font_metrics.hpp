@@ -9,6 +9,11 @@
 
 namespace talutil {
 
+/// The index of a family and weight among the six standard fonts.
+[[nodiscard]] constexpr std::size_t font_index(FontFamily family, bool is_bold) noexcept {
+  return static_cast<std::size_t>(family) * 2 + (is_bold ? 1 : 0);
+}
+
 /// The widths of characters, the same for every renderer: those of PDF's standard fonts for code page 1252 (from the
 /// PDF library's tables), and those of an embedded font for all other characters.
 class FontMetrics {
@@ -19,7 +24,14 @@ class FontMetrics {
   ~FontMetrics();
 
   /// The width of a character, in thousandths of the font's size.
-  [[nodiscard]] std::int32_t width(char16_t unit, const FontStyle& font);
+  [[nodiscard]] std::int32_t width(char16_t unit, const FontStyle& font) {
+    // Most characters are these, and every one of a document is measured several times.
+    if (unit < 0x80) {
+      const std::uint16_t known = widths_[font_index(font.family, font.is_bold)][unit];
+      if (known != 0) return known;
+    }
+    return find_width(unit, font);
+  }
 
   /// The width of a text on one line, in twips.
   [[nodiscard]] double width(TextView text, const FontStyle& font);
@@ -39,6 +51,8 @@ class FontMetrics {
 
  private:
   struct Library;
+
+  [[nodiscard]] std::int32_t find_width(char16_t unit, const FontStyle& font);
 
   FontFiles& files_;
   std::unique_ptr<Library> library_;

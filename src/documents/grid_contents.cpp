@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <limits>
 
 #include "automation/run_time_error.hpp"
 #include "documents/arabic_joining.hpp"
@@ -130,12 +131,63 @@ void GridContents::read_columns(const Control& grid) {
   }
 }
 
-std::uint32_t GridContents::place_of(const CellLook& look) {
-  // Neighbouring cells look alike, so the look is most often among the last.
-  const auto found = std::find(looks_.rbegin(), looks_.rend(), look);
-  if (found != looks_.rend()) return static_cast<std::uint32_t>(looks_.rend() - found - 1);
-  looks_.push_back(look);
-  return static_cast<std::uint32_t>(looks_.size() - 1);
+GridContents::Cell GridContents::cell(std::size_t row, std::size_t column) const {
+  const StoredRow& stored = stored_rows_[row];
+  const std::size_t place = row * columns.size() + column;
+  const std::uint32_t start = column == 0 ? 0 : ends_[place - 1];
+  const TextView kept(stored.units + start, ends_[place] - start);
+  const bool has_box = is_check_box(row, column);
+  return {has_box ? TextView() : kept, has_box && !kept.empty(),
+          stored.looks == usual_looks ? usual_look(row, column) : looks_[row_looks_[stored.looks + column]]};
+}
+
+void GridContents::set_usual_looks(const Control& grid) {
+  const CellLook body{
+      font.is_bold, colour_or(grid, u"ForeColor", black), fill_of(colour_or(grid, u"BackColor", white)), {}};
+  const CellLook heading{font.is_bold,
+                         colour_or(grid, u"ForeColorFixed", black),
+                         colour_or(grid, u"BackColorFixed", usual_heading_colour),
+                         {}};
+  for (const Column& column : columns) {
+    for (const CellLook& look : {body, heading}) usual_looks_.emplace_back(look).alignment = column.alignment;
+  }
+}
+
+/// Keeps the looks of the cells of the last row.
+void GridContents::keep_looks(const std::vector<CellLook>& looks) {
+  stored_rows_.back().looks = row_looks_.size();
+  for (const CellLook& look : looks) {
+    const auto [known, is_new] = known_looks_.try_emplace(look, static_cast<std::uint32_t>(looks_.size()));
+    if (is_new) looks_.push_back(look);
+    row_looks_.push_back(known->second);
+  }
+}
+
+/// Reads the cells of the last row.
+/// @param row in the grid
+void GridContents::read_cells(const Control& grid, RepeatedUse& text, std::int32_t row, CellLooks& looks) {
+  Text units;
+  std::vector<CellLook> shown;
+  bool has_own_looks = false;
+  text.set(0, row);
+  for (std::size_t c = 0; c < columns.size(); ++c) {
+    const Column& column = columns[c];
+    if (is_check_box(rows.size() - 1, c)) {
+      const bool is_ticked = grid.get(u"Cell", {check_box_setting, row, column.index}).equals_number(1, grid.locale());
+      if (is_ticked) units += u'x';
+    } else {
+      text.set(1, column.index);
+      const TextView answer = text.run_text(grid.locale());
+      units += joined(wraps ? visible_text(answer) : visible_line(answer));
+    }
+    if (units.size() > std::numeric_limits<std::uint32_t>::max()) raise(ErrorNumber::out_of_memory);
+    ends_.push_back(static_cast<std::uint32_t>(units.size()));
+    CellLook& look = shown.emplace_back(usual_look(rows.size() - 1, c));
+    looks.apply(row, column.index, look);
+    has_own_looks = has_own_looks || look != usual_look(rows.size() - 1, c);
+  }
+  stored_rows_.back().units = texts_.keep(units).data();
+  if (has_own_looks) keep_looks(shown);
 }
 
 void GridContents::read_rows(const Control& grid) {
@@ -144,39 +196,20 @@ void GridContents::read_rows(const Control& grid) {
   const bool hides = grid.answers(u"RowHidden");
   const bool has_heights = grid.answers(u"RowHeight");
   const bool merges = answer_or<std::int32_t>(grid, u"MergeCells", 0) != 0;
-  const CellLook body{
-      font.is_bold, colour_or(grid, u"ForeColor", black), fill_of(colour_or(grid, u"BackColor", white)), {}};
-  const CellLook heading{font.is_bold,
-                         colour_or(grid, u"ForeColorFixed", black),
-                         colour_or(grid, u"BackColorFixed", usual_heading_colour),
-                         {}};
+  set_usual_looks(grid);
   const auto text = grid.repeated_get(u"TextMatrix", {0, 0});
-  CellLooks own_looks(grid);
+  CellLooks looks(grid);
   for (std::int32_t r = 0; r < count; ++r) {
     if (hides && grid.get<Boolean>(u"RowHidden", {r})) continue;
     const bool is_heading_row = r < fixed;
     if (is_heading_row) ++heading_rows;
     Row& row = rows.emplace_back();
+    stored_rows_.emplace_back();
     if (has_heights) row.height = std::max(0, grid.get<std::int32_t>(u"RowHeight", {r}));
     row.merges = merges && is_heading_row && bool(answer_or<Boolean>(grid, u"MergeRow", Boolean(false), {r}));
-    text->set(0, r);
-    for (std::size_t c = 0; c < columns.size(); ++c) {
-      const Column& column = columns[c];
-      Cell cell;
-      if (is_check_box(rows.size() - 1, c)) {
-        cell.is_ticked = grid.get(u"Cell", {check_box_setting, r, column.index}).equals_number(1, grid.locale());
-      } else {
-        text->set(1, column.index);
-        const TextView answer = text->run_text(grid.locale());
-        cell.text = joined(wraps ? visible_text(answer) : visible_line(answer));
-      }
-      CellLook look = is_heading(rows.size() - 1, c) ? heading : body;
-      look.alignment = column.alignment;
-      own_looks.apply(r, column.index, look);
-      cell.look = place_of(look);
-      cells_.push_back(std::move(cell));
-    }
+    read_cells(grid, *text, r, looks);
   }
+  known_looks_.clear();
 }
 
 }  // namespace talutil

@@ -1,6 +1,7 @@
 #include "documents/pdf_fonts.hpp"
 
 #include "automation/run_time_error.hpp"
+#include "documents/font_metrics.hpp"
 #include "documents/unicode_map.hpp"
 
 namespace talutil {

@@ -47,9 +47,4 @@ class PdfDocument {
   std::array<Embedded, 3> wide_;
 };
 
-/// The index of a family and weight among the six standard fonts.
-[[nodiscard]] constexpr std::size_t font_index(FontFamily family, bool is_bold) noexcept {
-  return static_cast<std::size_t>(family) * 2 + (is_bold ? 1 : 0);
-}
-
 }  // namespace talutil

@@ -252,8 +252,9 @@ void write_pdf(const Document& document, const PdfInformation& information, Font
 
   std::vector<HPDF_Page> pages;
   ContentsCompressor compressor;
-  for (const Page& page : document.pages) {
+  for (std::size_t i = 0; i < document.pages.size(); ++i) {
     if (is_given_up && is_given_up()) raise(ErrorNumber::cancelled);
+    const Page page = document.pages[i];
     PageWriter writer(pdf, page);
     writer.write();
     compressor.compress(pdf, writer.target());

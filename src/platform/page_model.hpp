@@ -3,13 +3,15 @@
 #include <cstdint>
 #include <memory>
 #include <optional>
+#include <utility>
 #include <variant>
 #include <vector>
 
 #include "automation/text.hpp"
 
 /// Documents as pages: laid out once, then drawn on the screen, on a printer and into PDF by renderers that have only
-/// this model in common. All lengths are in twips (1/1440 inch) from the top left corner of the paper; colours are
+/// this model in common. A page is composed when it is drawn, so that a document takes little more memory than what it
+/// shows. All lengths are in twips (1/1440 inch) from the top left corner of the paper; colours are
 /// 0x00BBGGRR.
 namespace talutil {
 
@@ -82,6 +84,28 @@ struct Page {
   std::vector<PageItem> items;  ///< Later items are drawn over earlier ones.
 };
 
+/// Composes the pages of a document.
+class PageSource {
+ public:
+  virtual ~PageSource() = default;
+  [[nodiscard]] virtual std::size_t count() const noexcept = 0;
+  [[nodiscard]] virtual Page compose(std::size_t index) const = 0;
+};
+
+/// The pages of a document, counted from 0. Each is composed anew whenever it is asked for.
+class PageList {
+ public:
+  PageList() = default;
+  explicit PageList(std::unique_ptr<const PageSource> source) noexcept : source_(std::move(source)) {}
+
+  [[nodiscard]] std::size_t size() const noexcept { return source_ ? source_->count() : 0; }
+  [[nodiscard]] bool empty() const noexcept { return size() == 0; }
+  [[nodiscard]] Page operator[](std::size_t index) const { return source_->compose(index); }
+
+ private:
+  std::unique_ptr<const PageSource> source_;
+};
+
 /// The start of a report or of a part of it.
 struct Bookmark {
   Text title;
@@ -91,7 +115,7 @@ struct Bookmark {
 
 struct Document {
   Text title;
-  std::vector<Page> pages;
+  PageList pages;
   std::vector<Bookmark> bookmarks;
 };
 

@@ -442,9 +442,11 @@ TEST_F(Pages, RowsFillEveryPageToItsEnd) {
       expected.back() += "r" + std::to_string(row) + ' ';
     }
     std::vector<std::string> shown;
-    for (const Page& page : document_of(grid).pages) {
+    const PageList& pages = document_of(grid).pages;
+    for (std::size_t i = 0; i < pages.size(); ++i) {
       shown.emplace_back();
-      for (const TextRun& run : texts_of(page)) shown.back() += run.left == 1134 + 60 ? to_utf8(run.text) + ' ' : "";
+      for (const TextRun& run : texts_of(pages[i]))
+        shown.back() += run.left == 1134 + 60 ? to_utf8(run.text) + ' ' : "";
     }
     EXPECT_EQ(shown, expected);
   }
@@ -499,7 +501,7 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   small->FontName = u"Times New Roman";
   small->FontSize = 20;
   small->GridLines = 0;
-  const Page& without_lines = document_of(small).pages[0];
+  const Page without_lines = document_of(small).pages[0];
   ASSERT_EQ(texts_of(without_lines).size(), without_lines.items.size());
   EXPECT_EQ(texts_of(without_lines)[0].font, (FontStyle{FontFamily::times, false, 20}));
 
@@ -517,7 +519,8 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   // What answers for nothing but its window is a picture.
   const Document& drawn = made_by([&] { print->put_RenderControl(42); });
   EXPECT_THAT(platform.drawn, ElementsAre("image of 42"));
-  const auto* const picture = std::get_if<Picture>(&drawn.pages[0].items[0]);
+  const Page only = drawn.pages[0];
+  const auto* const picture = std::get_if<Picture>(&only.items[0]);
   ASSERT_NE(picture, nullptr);
   EXPECT_EQ(picture->place, (TwipsRectangle{1134, 1134, 30, 15}));
 }

@@ -24,6 +24,16 @@ std::string output_of(const std::string& command) {
   return output;
 }
 
+class SinglePage final : public PageSource {
+ public:
+  explicit SinglePage(Page page) : page_(std::move(page)) {}
+  [[nodiscard]] std::size_t count() const noexcept override { return 1; }
+  [[nodiscard]] Page compose(std::size_t /*index*/) const override { return page_; }
+
+ private:
+  Page page_;
+};
+
 struct PdfTest : ::testing::Test {
   posix::PosixFontFiles fonts;
   posix::PosixFiles files;
@@ -34,6 +44,13 @@ struct PdfTest : ::testing::Test {
   void write(const Document& document) {
     write_pdf(document, {u"Title \u041F\u0440\u0438 \u20AC", u"Author", u"Subject", u"Creator"}, fonts, files,
               from_utf8(path));
+  }
+
+  /// A document of a single page.
+  void write_page(const Page& page) {
+    Document document;
+    document.pages = PageList(std::make_unique<SinglePage>(page));
+    write(document);
   }
 };
 
@@ -81,8 +98,8 @@ TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
     found.push_back(word);
   }
   std::size_t compared = 0;
-  for (const Page& page : document.pages) {
-    for (const PageItem& item : page.items) {
+  for (std::size_t i = 0; i < document.pages.size(); ++i) {
+    for (const PageItem& item : document.pages[i].items) {
       const auto* const run = std::get_if<TextRun>(&item);
       if (run == nullptr || run->text.find(u' ') != Text::npos) continue;
       const std::string text = to_utf8(run->text);
@@ -102,37 +119,34 @@ TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
 // In the embedded font, the letter is made of others, and the accented one is made of it.
 TEST_F(PdfTest, LettersMadeOfOthersAreWhole) {
   const auto second_letter = [&](const Text& first) {
-    Document document;
-    Page& page = document.pages.emplace_back(Page{1440, 720, {}});
+    Page page{1440, 720, {}};
     page.items.emplace_back(TextRun{0, 0, 400, {FontFamily::courier, false, 20}, true, 0, first});
     page.items.emplace_back(TextRun{720, 0, 400, {FontFamily::courier, false, 20}, true, 0, u"\u03B5"});
-    write(document);
+    write_page(page);
     return output_of("pdftoppm -r 72 -gray -x 36 -y 0 -W 36 -H 36 " + path + " | od -An -tx1");
   };
   EXPECT_EQ(second_letter(u"\u03AD"), second_letter(u"\u03B5"));
 }
 
 TEST_F(PdfTest, BoxesHaveTheirColours) {
-  Document document;
-  Page& page = document.pages.emplace_back(Page{1440, 480, {}});
+  Page page{1440, 480, {}};
   constexpr std::uint32_t colours[] = {0x000000FF, 0x0000FF00, 0x00FF0000};
   for (std::int32_t i = 0; i < 3; ++i)
     page.items.emplace_back(Box{.place = {480 * i, 0, 480, 480}, .fill = colours[i]});
-  write(document);
+  write_page(page);
   // One pixel a box: the three bytes of each, red first.
   EXPECT_EQ(output_of("pdftoppm -r 3 " + path + " | tail -c 9 | od -An -tx1"), " ff 00 00 00 ff 00 00 00 ff\n");
 }
 
 // Characters with a meaning in the format, and what is set for an embedded font but not for the text after it.
 TEST_F(PdfTest, TextsAreWrittenAsTheyAre) {
-  Document document;
-  Page& page = document.pages.emplace_back(Page{4320, 1440, {}});
+  Page page{4320, 1440, {}};
   const FontStyle font{FontFamily::helvetica, false, 10.5F};
   const FontStyle bold{FontFamily::helvetica, true, 10.5F};
   page.items.emplace_back(TextRun{20, 0, 400, font, false, 0, u"(a\\b) 50% <c> \u20AC\u00E9"});
   page.items.emplace_back(TextRun{20, 400, 400, bold, true, 0x0000FF, u"\u041F\u0440\u0438"});
   page.items.emplace_back(TextRun{20, 800, 400, font, false, 0, u"((after"});
-  write(document);
+  write_page(page);
   EXPECT_EQ(output_of("qpdf --check " + path + " 2>&1 | grep -c 'No syntax or stream encoding errors'"), "1\n");
   EXPECT_EQ(output_of("pdftotext " + path + " - | grep -v '^$'"), "(a\\b) 50% <c> €é\nПри\n((after\n\f\n");
   EXPECT_EQ(output_of("qpdf --qdf --object-streams=disable " + path + " - | grep -a -A1 ' Tr$' | tail -2"),
