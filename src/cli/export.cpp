@@ -63,7 +63,7 @@ void export_table(const ExportOptions& options) {
   posix::PosixPlatform platform;
   platform.files.allow_streams();
   const auto source = std::make_shared<Grid>(platform.platform());
-  fill_grid(*source, read_table(options.table, options.encoding));
+  read_table(options.table, options.encoding, *source);
   hide_columns(*source, options);
   if (!options.rows.empty()) select_rows(*source, options);
 

@@ -6,6 +6,7 @@
 #include <iostream>
 #include <set>
 #include <sstream>
+#include <utility>
 
 #include "cli/failure.hpp"
 #include "cli/files.hpp"
@@ -84,20 +85,22 @@ Text header_of(const ReportOptions& options) {
 
 /// What the report shows.
 struct Contents {
-  TableRows rows;
+  std::shared_ptr<Grid> table;  ///< Null for a text.
   Text text;
   Text header;
-  bool is_table = false;
 };
 
-Contents read_contents(const ReportOptions& options, const Locale& locale) {
+Contents read_contents(const ReportOptions& options, const Platform& platform) {
   Contents contents;
   contents.header = header_of(options);
-  contents.is_table = is_table(options);
-  if (contents.is_table) {
-    contents.rows = read_table(options.file, options.encoding);
-    choose_columns(contents.rows, options.columns);
-    add_totals(contents.rows, options.totals, locale);
+  if (is_table(options)) {
+    contents.table = std::make_shared<Grid>(platform);
+    ColumnChoice choose;
+    if (!options.columns.empty()) {
+      choose = [&](const std::vector<Text>& headings) { return columns_of(headings, options.columns, "--columns"); };
+    }
+    const std::size_t headings = read_table(options.file, options.encoding, *contents.table, choose);
+    add_totals(*contents.table, headings, options.totals, platform.computer.locale());
   } else {
     contents.text = read_text(options.file, options.encoding);
     require_text(contents.text, options.file);
@@ -109,6 +112,7 @@ Contents read_contents(const ReportOptions& options, const Locale& locale) {
 std::set<Text> missing_characters(const Contents& contents, FontMetrics& metrics, const FontStyle& font) {
   std::set<Text> missing;
   const auto look_at = [&](TextView read) {
+    if (std::ranges::none_of(read, FontMetrics::is_wide)) return;
     const Text text = joined(read);
     for (std::size_t i = 0; i < text.size(); ++i) {
       if (!FontMetrics::is_wide(text[i]) || is_invisible(text[i]) || !metrics.wide(text[i], font).is_missing) continue;
@@ -119,8 +123,8 @@ std::set<Text> missing_characters(const Contents& contents, FontMetrics& metrics
   };
   look_at(contents.header);
   look_at(contents.text);
-  for (const auto& row : contents.rows) {
-    for (const Text& text : row) look_at(text);
+  for (std::int32_t r = 0; contents.table && r < contents.table->Rows(); ++r) {
+    for (std::int32_t c = 0; c < contents.table->Cols(); ++c) look_at(contents.table->cell_view(r, c));
   }
   return missing;
 }
@@ -169,19 +173,17 @@ void name_font(posix::PosixFontFiles& files, const ReportOptions& options, const
   files.name_font({bytes.begin(), bytes.end()});
 }
 
-/// @param rows released before the report is laid out, which takes more memory than the table
-void add_table(PrintControl& print, const Platform& platform, const ReportOptions& options, TableRows& rows) {
-  const auto grid = std::make_shared<Grid>(platform);
-  fill_grid(*grid, rows);
+/// @param grid released before the report is written, which has a copy of its contents
+void add_table(PrintControl& print, const Platform& platform, const ReportOptions& options,
+               std::shared_ptr<Grid> grid) {
   if (grid->Rows() > 0) grid->put_FixedRows(1);
   const FontStyle font{family_of(print.FontName), false, 8};
   const std::int32_t room = print.PageWidth() - print.MarginLeft - print.MarginRight;
-  const bool fits = lay_out(*grid, rows, print.metrics(), font, room, platform.computer.locale());
+  const bool fits = lay_out(*grid, print.metrics(), font, room, platform.computer.locale());
   // Only pages with the other columns need to say whose they are.
   if (!fits) grid->put_FixedCols(std::min(options.keys, grid->Cols()));
   grid->WordWrap = Boolean(true);
-  rows = {};
-  print.RenderObject = ObjectRef(grid);
+  print.RenderObject = ObjectRef(std::move(grid));
   print.put_RenderControl(0);
 }
 
@@ -214,7 +216,7 @@ void report(const ReportOptions& options) {
   const std::string output = pdf_of(options);
   require_other_file(options, output);
   const std::int32_t paper = paper_code(options.paper);
-  Contents contents = read_contents(options, platform.computer.locale());
+  Contents contents = read_contents(options, platform);
   name_font(posix_platform.font_files, options, contents);
 
   const auto print = std::make_shared<PrintControl>(platform);
@@ -225,10 +227,10 @@ void report(const ReportOptions& options) {
   print->StartDoc();
   const auto missing = missing_characters(contents, print->metrics(), {family_of(print->FontName), false, 8});
   on_file(shown_input(options.file), [&] {
-    if (contents.is_table)
-      add_table(*print, platform, options, contents.rows);
+    if (contents.table)
+      add_table(*print, platform, options, std::exchange(contents.table, nullptr));
     else
-      print->put_Text(contents.text);
+      print->put_Text(std::exchange(contents.text, {}));
   });
   print->EndDoc();
   warn_of(missing);

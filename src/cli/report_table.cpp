@@ -15,8 +15,7 @@ namespace talutil::cli {
 namespace {
 
 /// The index of a column by its heading or number.
-std::size_t column_of(const TableRows& rows, const std::string& name, const std::string& option) {
-  const std::vector<Text>& headings = rows.front();
+std::size_t column_of(const std::vector<Text>& headings, const std::string& name, const std::string& option) {
   const Text text = utf8_text(name, option);
   for (std::size_t c = 0; c < headings.size(); ++c) {
     if (equals_without_case(trim_blanks(headings[c]), text)) return c;
@@ -59,48 +58,87 @@ struct NumberStyle {
   }
 };
 
-bool is_number_column(const TableRows& rows, std::size_t column, const Locale& locale) {
-  bool has_number = false;
-  for (std::size_t r = 1; r < rows.size(); ++r) {
-    if (column >= rows[r].size() || trim_blanks(rows[r][column]).empty()) continue;
-    if (!text_to_number(rows[r][column], locale)) return false;
-    has_number = true;
+/// What the cells of a column say about it.
+class ColumnFacts {
+ public:
+  void add_heading(TextView text, FontMetrics& metrics, const FontStyle& font) { add_lines(text, metrics, font); }
+
+  void add(TextView text, FontMetrics& metrics, const FontStyle& font, const Locale& locale) {
+    add_lines(text, metrics, font);
+    if (are_numbers_ && !trim_blanks(text).empty()) {
+      are_numbers_ = text_to_number(text, locale).has_value();
+      has_number_ = true;
+    }
+    if (!is_seen_as_read(text) && is_right_to_left(trim_blanks(text))) ++right_to_left_;
   }
-  return has_number;
+
+  [[nodiscard]] bool is_number_column() const noexcept { return are_numbers_ && has_number_; }
+
+  /// How many of its texts run from right to left.
+  [[nodiscard]] std::size_t right_to_left() const noexcept { return right_to_left_; }
+
+  /// What the column needs, in twips: for its longest line, and for its longest word.
+  [[nodiscard]] double line(const FontStyle& font) const noexcept { return to_twips(line_, font); }
+  [[nodiscard]] double word(const FontStyle& font) const noexcept { return to_twips(word_, font); }
+
+ private:
+  void add_lines(TextView text, FontMetrics& metrics, const FontStyle& font) {
+    if (std::ranges::any_of(text, is_joining)) return add_joined_lines(joined(text), metrics, font);
+    add_joined_lines(text, metrics, font);
+  }
+
+  void add_joined_lines(TextView text, FontMetrics& metrics, const FontStyle& font) {
+    double line = 0;
+    double word = 0;
+    for (const char16_t unit : text) {
+      if (unit == u'\r' || unit == u'\n') {
+        line = word = 0;
+        continue;
+      }
+      const std::int32_t width = metrics.width(unit, font);
+      line += width;
+      word = unit == u' ' ? 0 : word + width;
+      line_ = std::max(line_, line);
+      word_ = std::max(word_, word);
+    }
+  }
+
+  double line_ = 0;  ///< In thousandths of the font's size, like the next.
+  double word_ = 0;
+  bool are_numbers_ = true;
+  bool has_number_ = false;
+  std::size_t right_to_left_ = 0;
+};
+
+std::vector<ColumnFacts> facts_of(const Grid& grid, FontMetrics& metrics, const FontStyle& font, const Locale& locale) {
+  std::vector<ColumnFacts> facts(static_cast<std::size_t>(grid.Cols()));
+  for (std::int32_t r = 0; r < grid.Rows(); ++r) {
+    for (std::size_t c = 0; c < facts.size(); ++c) {
+      const TextView text = grid.cell_view(r, static_cast<std::int32_t>(c));
+      if (r == 0)
+        facts[c].add_heading(text, metrics, font);
+      else
+        facts[c].add(text, metrics, font, locale);
+    }
+  }
+  return facts;
 }
 
 /// Whether most of a column's texts run from right to left.
-bool is_right_to_left_column(const TableRows& rows, std::size_t column, const Locale& locale) {
-  std::ptrdiff_t excess = 0;
-  for (std::size_t r = 1; r < rows.size(); ++r) {
-    if (column >= rows[r].size()) continue;
-    const TextView value = trim_blanks(rows[r][column]);
-    if (is_right_to_left(value))
-      ++excess;
-    else if (!value.empty() && !text_to_number(value, locale))
-      --excess;
+/// @param right_to_left how many do
+bool is_right_to_left_column(const Grid& grid, std::int32_t column, std::size_t right_to_left, const Locale& locale) {
+  std::size_t others = 0;
+  for (std::int32_t r = 1; r < grid.Rows() && others < right_to_left; ++r) {
+    const TextView value = trim_blanks(grid.cell_view(r, column));
+    if (!value.empty() && !is_right_to_left(value) && !text_to_number(value, locale)) ++others;
   }
-  return excess > 0;
+  return others < right_to_left;
 }
 
-/// What a column needs: for its longest line, and for its longest word.
+/// The room that a column is given: for its longest line, and at least for its longest word.
 struct Need {
   double line = 0;
   double word = 0;
-
-  void add(TextView shown, FontMetrics& metrics, const FontStyle& font) {
-    const Text letters = joined(shown);
-    for (TextView text = letters; !text.empty();) {
-      const TextView one = text.substr(0, text.find_first_of(u"\r\n"));
-      text.remove_prefix(std::min(one.size() + 1, text.size()));
-      line = std::max(line, metrics.width(one, font));
-      for (std::size_t at = 0; at < one.size();) {
-        const std::size_t end = std::min(one.find(u' ', at), one.size());
-        word = std::max(word, metrics.width(one.substr(at, end - at), font));
-        at = end + 1;
-      }
-    }
-  }
 };
 
 /// The widest that columns may be so that all fit into the room, none narrower than its longest word; the longest need
@@ -125,27 +163,26 @@ double common_limit(const std::vector<Need>& needs, double room) {
 
 }  // namespace
 
-void choose_columns(TableRows& rows, const std::vector<std::string>& names) {
-  if (names.empty() || rows.empty()) return;
-  std::vector<std::size_t> chosen;
-  for (const std::string& name : names) chosen.push_back(column_of(rows, name, "--columns"));
-  for (std::vector<Text>& row : rows) {
-    std::vector<Text> kept;
-    for (const std::size_t c : chosen) kept.push_back(c < row.size() ? row[c] : Text());
-    row = std::move(kept);
-  }
+std::vector<std::size_t> columns_of(const std::vector<Text>& headings, const std::vector<std::string>& names,
+                                    const std::string& option) {
+  std::vector<std::size_t> columns;
+  for (const std::string& name : names) columns.push_back(column_of(headings, name, option));
+  return columns;
 }
 
-void add_totals(TableRows& rows, const std::vector<std::string>& names, const Locale& locale) {
-  if (names.empty() || rows.empty()) return;
-  std::vector<Text> totals(rows.front().size());
+void add_totals(Grid& grid, std::size_t headings, const std::vector<std::string>& names, const Locale& locale) {
+  if (names.empty() || grid.Rows() == 0) return;
+  std::vector<Text> names_of_columns;
+  for (std::size_t c = 0; c < headings; ++c)
+    names_of_columns.push_back(grid.TextMatrix(0, static_cast<std::int32_t>(c)));
+  std::vector<Text> totals(headings);
   for (const std::string& name : names) {
-    const std::size_t column = column_of(rows, name, "--total");
+    const std::size_t column = column_of(names_of_columns, name, "--total");
     double sum = 0;
     std::size_t others = 0;
     NumberStyle style;
-    for (std::size_t r = 1; r < rows.size(); ++r) {
-      const TextView written = column < rows[r].size() ? trim_blanks(rows[r][column]) : TextView();
+    for (std::int32_t r = 1; r < grid.Rows(); ++r) {
+      const TextView written = trim_blanks(grid.cell_view(r, static_cast<std::int32_t>(column)));
       const auto number = text_to_number(written, locale);
       if (number) {
         sum += *number;
@@ -161,31 +198,31 @@ void add_totals(TableRows& rows, const std::vector<std::string>& names, const Lo
   }
   const auto label = std::ranges::find(totals, Text());
   if (label != totals.end()) *label = u"Total";
-  rows.push_back(std::move(totals));
+  grid.put_Rows(grid.Rows() + 1);
+  for (std::size_t c = 0; c < totals.size(); ++c) {
+    grid.put_cell(grid.Rows() - 1, static_cast<std::int32_t>(c), totals[c]);
+  }
 }
 
-bool lay_out(Grid& grid, const TableRows& rows, FontMetrics& metrics, const FontStyle& font, std::int32_t room,
-             const Locale& locale) {
+bool lay_out(Grid& grid, FontMetrics& metrics, const FontStyle& font, std::int32_t room, const Locale& locale) {
   constexpr std::int16_t left = 0;
   constexpr std::int16_t right = 6;
   constexpr std::int32_t padding = 160;
   constexpr std::int32_t least = 400;
   constexpr double widest = 5000;  // Of a column of a table that does not fit on a page.
-  const auto count = static_cast<std::size_t>(grid.Cols());
-  std::vector<Need> needs(count);
-  for (const auto& row : rows) {
-    for (std::size_t c = 0; c < row.size(); ++c) needs[c].add(row[c], metrics, font);
-  }
-  for (Need& need : needs) {
-    need.line = std::max<double>(need.line + padding, least);
-    need.word = std::min(std::max<double>(need.word + padding, least), widest);
+  const std::vector<ColumnFacts> facts = facts_of(grid, metrics, font, locale);
+  std::vector<Need> needs;
+  for (const ColumnFacts& column : facts) {
+    needs.push_back({std::max<double>(column.line(font) + padding, least),
+                     std::min(std::max<double>(column.word(font) + padding, least), widest)});
   }
   const double limit = common_limit(needs, room);
-  for (std::size_t c = 0; c < count; ++c) {
+  for (std::size_t c = 0; c < facts.size(); ++c) {
     const auto column = static_cast<std::int32_t>(c);
     const double width = std::min(needs[c].line, std::max(needs[c].word, limit == 0 ? widest : limit));
     grid.put_ColWidth(column, static_cast<std::int32_t>(width));
-    const bool is_right = is_number_column(rows, c, locale) || is_right_to_left_column(rows, c, locale);
+    const bool is_right =
+        facts[c].is_number_column() || is_right_to_left_column(grid, column, facts[c].right_to_left(), locale);
     grid.put_ColAlignment(column, is_right ? right : left);
   }
   return limit > 0;

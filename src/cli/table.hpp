@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -8,12 +9,15 @@
 
 namespace talutil::cli {
 
-using TableRows = std::vector<std::vector<Text>>;
+/// Says which cells of each row to keep, in which order, by the cells of the first row.
+using ColumnChoice = std::function<std::vector<std::size_t>(const std::vector<Text>& headings)>;
 
-/// The rows of a comma-separated input. Fails for an input that is no text, and for more than a grid can hold.
-[[nodiscard]] TableRows read_table(const std::string& path, const InputEncoding& encoding);
-
-void fill_grid(Grid& grid, const TableRows& rows);
+/// Reads a comma-separated input into an empty grid. Fails for an input that is no text, and for more than a grid can
+/// hold.
+/// @param choose if null, all cells are kept
+/// @returns how many cells the first row has, which may be fewer than the grid has columns
+std::size_t read_table(const std::string& path, const InputEncoding& encoding, Grid& grid,
+                       const ColumnChoice& choose = nullptr);
 
 /// Fails if a text looks like a program or a picture.
 void require_text(TextView text, const std::string& path);

@@ -122,14 +122,20 @@ void append_delimited(Text& line, TextView cell, char16_t separator) {
   line += u'"';
 }
 
-std::vector<std::vector<Text>> read_delimited(TextView text, char16_t separator) {
-  std::vector<std::vector<Text>> rows;
+void each_delimited_row(TextView text, char16_t separator, const std::function<void(std::vector<Text>& row)>& use) {
+  std::vector<Text> row;
   for (std::size_t at = 0; at < text.size();) {
-    std::vector<Text>& row = rows.emplace_back();
+    row.clear();
     row.push_back(delimited_cell(text, at, separator));
     while (at < text.size() && text[at] == separator) row.push_back(delimited_cell(text, ++at, separator));
     if (at < text.size()) at = after_line_end(text, at);
+    use(row);
   }
+}
+
+std::vector<std::vector<Text>> read_delimited(TextView text, char16_t separator) {
+  std::vector<std::vector<Text>> rows;
+  each_delimited_row(text, separator, [&](std::vector<Text>& row) { rows.push_back(std::move(row)); });
   return rows;
 }
 

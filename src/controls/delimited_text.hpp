@@ -38,6 +38,9 @@ class TableFile {
 /// Appends a cell. It is quoted, with its quotes doubled, if it contains a separator, a quote or a line break.
 void append_delimited(Text& line, TextView cell, char16_t separator);
 
+/// Calls a function with each row of a text with separators; see read_delimited.
+void each_delimited_row(TextView text, char16_t separator, const std::function<void(std::vector<Text>& row)>& use);
+
 /// The rows of a text with separators; any line end ends a row. A quoted cell extends to its closing quote; text
 /// between that and the separator is part of it. An unclosed quote takes the rest of the text.
 [[nodiscard]] std::vector<std::vector<Text>> read_delimited(TextView text, char16_t separator);

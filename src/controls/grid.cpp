@@ -122,9 +122,11 @@ void Grid::put_FixedRows(std::int32_t rows) { fixed_rows_ = checked_fixed(rows, 
 
 void Grid::put_FixedCols(std::int32_t columns) { fixed_columns_ = checked_fixed(columns, Cols()); }
 
-Text Grid::TextMatrix(std::int32_t row, std::int32_t column) const {
-  return Text(rows_[index_in(rows_, row)].text.cell(index_in(columns_, column)));
+TextView Grid::cell_view(std::int32_t row, std::int32_t column) const {
+  return rows_[index_in(rows_, row)].text.cell(index_in(columns_, column));
 }
+
+Text Grid::TextMatrix(std::int32_t row, std::int32_t column) const { return Text(cell_view(row, column)); }
 
 void Grid::put_cell(std::int32_t row, std::int32_t column, TextView text) {
   rows_[index_in(rows_, row)].text.set(index_in(columns_, column), text, columns_.size());

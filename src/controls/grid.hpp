@@ -137,6 +137,9 @@ class Grid final : public TableObject<Grid>, public TableSource {
   void put_TextMatrix(std::int32_t row, std::int32_t column, const Text& value) { put_cell(row, column, value); }
   void put_cell(std::int32_t row, std::int32_t column, TextView text);
 
+  /// The text of a cell until the grid changes. Raises 9 if there is no such cell.
+  [[nodiscard]] TextView cell_view(std::int32_t row, std::int32_t column) const;
+
   /// A setting of a cell: 0 its text, 5 the state of its check box. A cell has a check box if its column has the type
   /// 11 (ColDataType). Putting a state stores the text "True" or "False".
   /// @param Setting 0 the text; 5 the check box: 1 ticked (the text is "True" or a number other than 0), 2 not ticked,
