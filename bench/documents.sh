@@ -1,8 +1,9 @@
 #!/usr/bin/env bash
 # Compares reports with other programs that create PDF: bench/documents.sh PATH_TO_TALUTIL [lines]
 # Compares a table of 10,000 rows with LibreOffice, if that is installed, and a text of 100,000 lines with enscript and
-# ps2pdf; then measures the cost of more pages. The ratios are of the best of three times, alternating. With "lines",
-# prints instead, for texts and tables of 10 to 10,000 pages, lines of NAME, PAGES and SECONDS with tabs between them.
+# ps2pdf; then measures the cost of more pages, and of a large table, also against a program that does nothing but write
+# the same cells (bare_pdf). The ratios are of the best of three times, alternating. With "lines", prints instead, for
+# texts and tables of 10 to 10,000 pages, lines of NAME, PAGES and SECONDS with tabs between them.
 set -euo pipefail
 [ -x "${1:-}" ] || { echo "usage: bench/documents.sh PATH_TO_TALUTIL [lines]" >&2; exit 2; }
 talutil=$(realpath "$1")
@@ -81,5 +82,17 @@ for lines in 1000 10000 100000; do
     "$(($(stat -c %s part.txt) / 1024))" "${figures% *}" "$(awk "BEGIN { printf \"%.0f\", $pages / (${figures% *} + 0.001) }")" "${figures#* }"
 done
 awk 'BEGIN { for (r = 0; r <= 10000; ++r) { for (c = 0; c < 200; ++c) printf c ? ",c%d.%d" : "r%d", r, c; print "" } }' >wide.csv
-measure "$talutil" report wide.csv --pdf wide.pdf >wide
-printf 'a table of 10,000 rows and 200 columns: %s s, %s KB, %s pages\n' $(cat wide) "$(pdfinfo wide.pdf | sed -n 's/^Pages: *//p')"
+# As many pages as the report has.
+bare=$(dirname "$talutil")/bench/bare_pdf
+for _ in 1 2 3; do
+  measure "$talutil" report wide.csv --pdf wide.pdf >>wide-ours
+  [ ! -x "$bare" ] || measure "$bare" wide.csv bare.pdf 56 22 >>wide-bare
+done
+printf '10,000 x 200 cells, seconds: %s s, %s pages\n' "$(least <wide-ours | cut -d' ' -f1)" \
+  "$(pdfinfo wide.pdf | sed -n 's/^Pages: *//p')"
+printf '10,000 x 200 cells, memory: %s MB\n' "$(least <wide-ours | awk '{ printf "%.1f", $2 / 1024 }')"
+if [ -x "$bare" ]; then
+  compare "10,000 x 200 cells, against a bare writer" 2 wide-ours wide-bare
+else
+  echo "10,000 x 200 cells, against a bare writer: not measured, $bare is not built"
+fi
