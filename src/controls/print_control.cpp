@@ -21,7 +21,7 @@ std::int32_t checked_code(std::int32_t code, std::int32_t most) {
 }  // namespace
 
 PrintControl::PrintControl(const Platform& platform)
-    : TableObject(platform), platform_(platform), metrics_(platform.font_files) {}
+    : TableObject(platform), platform_(platform), metrics_(std::make_shared<FontMetrics>(platform.font_files)) {}
 
 void PrintControl::put_Zoom(float percent) {
   zoom_ = std::isnan(percent) ? zoom_ : std::clamp(percent, smallest_zoom, largest_zoom);

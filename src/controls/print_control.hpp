@@ -91,7 +91,7 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   void discard() noexcept;
 
   /// Null before the first document and after it is discarded. Whoever uses it while messages are processed must hold
-  /// it, because a host may begin the next document meanwhile. Its pages need the control's font metrics.
+  /// it, because a host may begin the next document meanwhile.
   [[nodiscard]] const std::shared_ptr<const Document>& document() const noexcept { return document_; }
 
   /// The size and weight of the next document's header; footers have 10 points or less.
@@ -101,7 +101,7 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   }
 
   /// The widths of characters that its documents are laid out with.
-  [[nodiscard]] FontMetrics& metrics() noexcept { return metrics_; }
+  [[nodiscard]] FontMetrics& metrics() noexcept { return *metrics_; }
 
   [[nodiscard]] const Page* shown_page() const override { return current_page_ < 1 ? nullptr : &shown_page_; }
   [[nodiscard]] float zoom_percent() const override { return zoom_; }
@@ -112,7 +112,7 @@ class PrintControl final : public TableObject<PrintControl>, public PreviewPages
   [[nodiscard]] FontStyle text_font() const;
 
   const Platform& platform_;
-  FontMetrics metrics_;
+  std::shared_ptr<FontMetrics> metrics_;  ///< Documents hold it, too.
   std::optional<ReportComposer> composer_;
   std::shared_ptr<const Document> document_;
   Page shown_page_;

@@ -35,8 +35,8 @@ PlacedLine placed(TextView kept, const FontStyle& font) {
 
 }  // namespace
 
-ReportComposer::ReportComposer(FontMetrics& metrics, PageSetup setup)
-    : metrics_(metrics), pages_(std::make_unique<ReportPages>(metrics, std::move(setup))) {
+ReportComposer::ReportComposer(std::shared_ptr<FontMetrics> metrics, PageSetup setup)
+    : metrics_(*metrics), pages_(std::make_unique<ReportPages>(std::move(metrics), std::move(setup))) {
   const Text header = visible_line(pages_->setup().header);
   document_.title = trim_blanks(header);
   begin_page();

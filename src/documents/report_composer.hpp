@@ -10,7 +10,7 @@ namespace talutil {
 class ReportComposer {
  public:
   /// @param metrics must outlive the composer and its document
-  ReportComposer(FontMetrics& metrics, PageSetup setup);
+  ReportComposer(std::shared_ptr<FontMetrics> metrics, PageSetup setup);
 
   /// Adds flowing text, in paragraphs. Lines are broken between words (or within a word that is longer than a line).
   /// Tab stops are eight characters apart; a form feed begins a new page; other control characters are shown as "^A".

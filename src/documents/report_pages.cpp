@@ -21,8 +21,8 @@ Box rule(std::int32_t left, std::int32_t top, std::int32_t width) {
 
 }  // namespace
 
-ReportPages::ReportPages(FontMetrics& metrics, PageSetup setup)
-    : metrics_(metrics),
+ReportPages::ReportPages(std::shared_ptr<FontMetrics> metrics, PageSetup setup)
+    : metrics_(std::move(metrics)),
       setup_(std::move(setup)),
       header_(fitting_header()),
       has_title_(!trim_blanks(visible_line(setup_.header)).empty()),
@@ -57,7 +57,7 @@ Page ReportPages::compose(std::size_t index) const {
 
 /// A line of flowing text from right to left begins at the right margin, and so do its tab stops.
 void ReportPages::draw(Page& page, const PlacedLine& placed) const {
-  LineWriter lines(metrics_, page);
+  LineWriter lines(*metrics_, page);
   const TextView line(placed.units, placed.length);
   const LineLook look{.is_right_to_left = placed.is_right_to_left};
   if (!placed.flows) {
@@ -68,12 +68,12 @@ void ReportPages::draw(Page& page, const PlacedLine& placed) const {
   for (std::size_t start = 0; start < line.size();) {
     const std::size_t end = std::min(line.find(u'\t', start), line.size());
     const TextView words = line.substr(start, end - start);
-    const double width = metrics_.width(words, placed.font);
+    const double width = metrics_->width(words, placed.font);
     const double left = placed.is_right_to_left ? setup_.room() - x - width : x;
     lines.add(words, setup_.margin_left + rounded(left), placed.top, placed.font, look);
     x += width;
     start = end;
-    for (; start < line.size() && line[start] == u'\t'; ++start) x = after_tab(x, placed.font, metrics_);
+    for (; start < line.size() && line[start] == u'\t'; ++start) x = after_tab(x, placed.font, *metrics_);
   }
 }
 
@@ -82,7 +82,7 @@ void ReportPages::draw(Page& page, const PlacedRows& rows) const {
   std::int32_t top = rows.top;
   const auto draw_rows = [&](std::size_t first, std::size_t end) {
     for (std::size_t row = first; row < end; ++row) {
-      layout.draw_row(page, row, rows.part, setup_.margin_left, top, metrics_);
+      layout.draw_row(page, row, rows.part, setup_.margin_left, top, *metrics_);
       top += layout.height(row);
     }
   };
@@ -94,10 +94,10 @@ void ReportPages::draw(Page& page, const PlacedRows& rows) const {
 std::vector<Text> ReportPages::lines_of(TextView text, const FontStyle& font) const {
   constexpr std::size_t most_blanks = 8;
   const Text indent(std::min({text.find_first_not_of(u' '), text.size(), most_blanks}), u' ');
-  const double room = setup_.room() - metrics_.width(indent, font);
+  const double room = setup_.room() - metrics_->width(indent, font);
   std::vector<Text> lines;
   text.remove_prefix(indent.size());
-  while (!text.empty()) lines.push_back(indent + Text(take_line(text, room, font, metrics_)));
+  while (!text.empty()) lines.push_back(indent + Text(take_line(text, room, font, *metrics_)));
   return lines;
 }
 
@@ -122,12 +122,12 @@ ReportPages::Header ReportPages::fitting_header() const {
 }
 
 void ReportPages::draw_header(Page& page) const {
-  LineWriter lines(metrics_, page);
+  LineWriter lines(*metrics_, page);
   const std::int32_t height = line_height(header_.font);
   const std::int32_t bottom = setup_.margin_top - line_height(setup_.header_font);
   std::int32_t top = bottom - height * static_cast<std::int32_t>(header_.lines.size());
   for (const Text& line : header_.lines) {
-    const std::int32_t spare = setup_.room() - rounded(metrics_.width(line, header_.font));
+    const std::int32_t spare = setup_.room() - rounded(metrics_->width(line, header_.font));
     const std::int32_t left = setup_.margin_left + (header_.is_right_to_left ? std::max(0, spare) : 0);
     lines.add(line, left, top, header_.font, {.is_right_to_left = header_.is_right_to_left});
     top += height;
@@ -138,7 +138,7 @@ void ReportPages::draw_header(Page& page) const {
 }
 
 void ReportPages::draw_footer(Page& page, std::size_t index) const {
-  LineWriter lines(metrics_, page);
+  LineWriter lines(*metrics_, page);
   const FontStyle font = setup_.footer_font.value_or(setup_.header_font);
   const std::int32_t top = setup_.bottom() + line_height(font);
   const Text footer = joined(setup_.footer);
@@ -146,10 +146,10 @@ void ReportPages::draw_footer(Page& page, std::size_t index) const {
   const std::int32_t date_end = lines.add(footer, setup_.margin_left, top, font, look);
   const Text number = u"Page " + number_to_text(static_cast<std::int32_t>(index + 1)) + u" of " +
                       number_to_text(static_cast<std::int32_t>(starts_.size()));
-  const std::int32_t number_left = setup_.width - setup_.margin_right - rounded(metrics_.width(number, font));
+  const std::int32_t number_left = setup_.width - setup_.margin_right - rounded(metrics_->width(number, font));
   lines.add(number, number_left, top, font, {});
   const Text& note = notes_[starts_[index].note];
-  const std::int32_t width = rounded(metrics_.width(note, font));
+  const std::int32_t width = rounded(metrics_->width(note, font));
   const std::int32_t left = setup_.margin_left + (setup_.room() - width) / 2;
   const std::int32_t gap = line_height(font);
   const bool fits = left > date_end + gap && left + width < number_left - gap;

@@ -38,8 +38,7 @@ class ReportPages final : public PageSource {
  public:
   using Piece = std::variant<PlacedLine, PlacedRows, PlacedPicture>;
 
-  /// @param metrics must outlive the pages
-  ReportPages(FontMetrics& metrics, PageSetup setup);
+  ReportPages(std::shared_ptr<FontMetrics> metrics, PageSetup setup);
 
   [[nodiscard]] std::size_t count() const noexcept override { return starts_.size(); }
   [[nodiscard]] Page compose(std::size_t index) const override;
@@ -83,7 +82,7 @@ class ReportPages final : public PageSource {
   void draw_header(Page& page) const;
   void draw_footer(Page& page, std::size_t index) const;
 
-  FontMetrics& metrics_;
+  std::shared_ptr<FontMetrics> metrics_;
   PageSetup setup_;
   Header header_;
   bool has_title_ = false;

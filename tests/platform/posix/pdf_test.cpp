@@ -55,7 +55,7 @@ struct PdfTest : ::testing::Test {
 };
 
 TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
-  FontMetrics metrics(fonts);
+  const auto metrics = std::make_shared<FontMetrics>(fonts);
   PageSetup setup;
   setup.width = 11906;
   setup.height = 16838;
@@ -112,7 +112,7 @@ TEST_F(PdfTest, WordsLieWhereTheyWereLaidOut) {
     }
   }
   EXPECT_GT(compared, 18U);
-  const auto width = [&](FontFamily family) { return metrics.width(u'\u0416', {family, false, 10}); };
+  const auto width = [&](FontFamily family) { return metrics->width(u'\u0416', {family, false, 10}); };
   EXPECT_NE(width(FontFamily::courier), width(FontFamily::helvetica)) << "each family has a wide font of its own";
 }
 

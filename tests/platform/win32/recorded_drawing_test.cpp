@@ -77,7 +77,7 @@ TEST(RecordedDrawing, TextsHaveTheirColours) {
 
 TEST(RecordedDrawing, TextsOfPagesLieWhereTheyWereLaidOut) {
   NoFontFiles fonts;
-  FontMetrics metrics(fonts);
+  const auto metrics = std::make_shared<FontMetrics>(fonts);
   PageSetup setup;
   setup.width = 11906;
   setup.height = 16838;
