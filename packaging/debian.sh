@@ -40,7 +40,7 @@ Architecture: $architecture
 Maintainer: TALUtil developers <talutil@localhost>
 Installed-Size: $(find "$root/usr" -type f -printf '%s\n' | awk '{ sum += int(($1 + 1023) / 1024) } END { print sum }')
 Depends: $depends
-Recommends: python3
+Recommends: python3, fonts-dejavu-core
 Section: utils
 Priority: optional
 Description: common toolkit for booking and job scheduling
