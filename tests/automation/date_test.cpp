@@ -10,6 +10,7 @@
 namespace talutil {
 namespace {
 
+using testing::check_rows;
 using testing::outcome;
 
 TEST(Date, PartsBetweenSecondsAndAtTheEnds) {
@@ -84,12 +85,11 @@ TEST(Date, Intervals) {
       {"a month's last day", month, 1, u"31/1/2008 13:45", "29/02/2008 13:45", u"1/3/2007", -10},
       {"years", year, -1, u"29/2/2008", "28/02/2007", u"1/1/1899", -109},
   };
-  testing::check_rows(rows,
-                      [](auto interval, auto count, TextView start, const auto& added, TextView end, auto boundaries) {
-                        const Date from = Variant(start).to_date(plain_numbers);
-                        EXPECT_EQ(outcome([&] { return date_add(interval, count, from); }), added);
-                        EXPECT_EQ(date_difference(interval, from, Variant(end).to_date(plain_numbers)), boundaries);
-                      });
+  check_rows(rows, [](auto interval, auto count, TextView start, const auto& added, TextView end, auto boundaries) {
+    const Date from = Variant(start).to_date(plain_numbers);
+    EXPECT_EQ(outcome([&] { return date_add(interval, count, from); }), added);
+    EXPECT_EQ(date_difference(interval, from, Variant(end).to_date(plain_numbers)), boundaries);
+  });
   EXPECT_EQ(outcome([] { return date_add(day, 1, Date{2958465}); }), "error 5");
   EXPECT_EQ(outcome([] { return date_add(month, -1, Date{-657434}); }), "error 5");
   EXPECT_EQ(outcome([] { return date_add(year, 2147483647, Date{}); }), "error 5");
