@@ -38,8 +38,8 @@ class GridContents {
     bool merges = false;      ///< Equal headings next to each other are one.
   };
   struct Cell {
-    TextView
-        text;  ///< Without control characters, except for line feeds if the grid wraps texts; Arabic letters joined.
+    /// Without control characters, except for line feeds if the grid wraps texts; Arabic letters joined.
+    TextView text;
     bool is_ticked = false;
     const CellLook& look;
   };
