@@ -134,13 +134,7 @@ struct FakeFiles final : Files {
 };
 
 struct FakeFolderPicker final : FolderPicker {
-  std::optional<Text> answer;
-  std::vector<std::pair<Text, std::intptr_t>> asked;  ///< Title and owner.
-
-  std::optional<Text> choose(TextView title, std::intptr_t owner) override {
-    asked.emplace_back(title, owner);
-    return answer;
-  }
+  std::optional<Text> choose(TextView /*title*/, std::intptr_t /*owner*/) override { return std::nullopt; }
 };
 
 struct FakeGuids final : Guids {

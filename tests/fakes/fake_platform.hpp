@@ -14,10 +14,8 @@
 #include "platform/page_model.hpp"
 #include "platform/platform.hpp"
 #include "tests/fakes/fake_files.hpp"
-#include "tests/fakes/fake_form.hpp"
-#include "tests/fakes/fake_preview.hpp"
-#include "tests/fakes/fake_registry.hpp"
-#include "tests/fakes/fake_settings.hpp"
+#include "tests/fakes/fake_stores.hpp"
+#include "tests/fakes/fake_windows.hpp"
 
 namespace talutil::testing {
 
@@ -173,8 +171,8 @@ struct FakePlatform : MessageBoxes,
     drawn.push_back(line.str());
   }
 
-  void configure_printer(std::int32_t window) override { drawn.push_back("configure " + std::to_string(window)); }
-  void send_to_printer(std::int32_t window) override { drawn.push_back("send " + std::to_string(window)); }
+  void configure_printer(std::int32_t /*window*/) override {}
+  void send_to_printer(std::int32_t /*window*/) override {}
   void reset_pointer() override { ++pointer_resets; }
   WindowImage image_of(std::intptr_t window) override {
     drawn.push_back("image of " + std::to_string(window));
