@@ -100,16 +100,17 @@ struct FakeFiles final : Files {
 
  private:
   struct Input final : InputFile {
-    Input(FakeFiles& files, std::string bytes) : owner(files), rest(std::move(bytes)) {}
-    [[nodiscard]] std::uint64_t size() const noexcept override { return rest.size(); }
+    Input(FakeFiles& files, std::string all) : owner(files), bytes(std::move(all)) {}
+    [[nodiscard]] std::uint64_t size() const noexcept override { return bytes.size(); }
     std::size_t read(std::span<char> buffer) override {
       owner.fail_if_told(u"read");
-      const std::size_t count = rest.copy(buffer.data(), buffer.size());
-      rest.erase(0, count);
+      const std::size_t count = bytes.copy(buffer.data(), buffer.size(), place);
+      place += count;
       return count;
     }
     FakeFiles& owner;
-    std::string rest;
+    std::string bytes;
+    std::size_t place = 0;
   };
   struct Output final : OutputFile {
     Output(FakeFiles& files, const Text& path) : owner(files), name(path) {}
