@@ -11,7 +11,6 @@ namespace talutil {
 namespace {
 
 constexpr std::int32_t cell_padding = 60;
-constexpr std::int32_t hair_line = 10;
 
 std::int32_t height_of_lines(const GridContents& grid, std::int32_t lines) noexcept {
   return lines * line_height(grid.font) + cell_padding;

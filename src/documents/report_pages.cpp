@@ -12,7 +12,6 @@ namespace talutil {
 
 namespace {
 
-constexpr std::int32_t hair_line = 10;  // Half a point.
 constexpr std::uint32_t black = 0;
 
 Box rule(std::int32_t left, std::int32_t top, std::int32_t width) {

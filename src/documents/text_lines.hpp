@@ -2,8 +2,11 @@
 
 #include "documents/font_metrics.hpp"
 
-/// Lines of text: how much of a text one line holds, and how a line is drawn.
+/// Lines of text, and those drawn around them: how much of a text one line holds, and how a line is drawn.
 namespace talutil {
+
+/// The width of rules and of the lines around cells, in twips: half a point.
+inline constexpr std::int32_t hair_line = 10;
 
 /// The start of a text that fits into a width.
 [[nodiscard]] TextView fitting(TextView text, double room, const FontStyle& font, FontMetrics& metrics);
