@@ -25,7 +25,8 @@ seed json_fuzz request '{"create": "Grid", "set": {"Rows": 2}, "id": [true, null
 seed tables_fuzz utf8 '\0\0\0\xEF\xBB\xBFa,"b ""c""",\xC5\x82\r\n'
 seed code_pages_fuzz utf8 '\0a\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80\xED\xA0\x80\xC0\x80'
 seed code_pages_fuzz double '\0\x82\xA0\x81\x40\xC4\xE3\xB0\xA1\xFF'
-seed files_fuzz lines 'a\r\nb\rc\n\r\n..\\CON.txt \x1Ad'
+seed text_files_fuzz lines '\x03\x02\0a\r\nb\rc\n\r\n\x1Ad'
+seed files_fuzz names '..\\CON.txt'
 
 mkdir -p "$work/data/sub" archives_fuzz
 seq 1 200 >"$work/data/numbers.txt"

@@ -1,6 +1,8 @@
-// Checks what must hold for any text that is read as a date or duration: dates_fuzz -max_len=40 -runs=10000000
+// Checks what must hold for any date, and any text that is read as one or as a duration: dates_fuzz -max_len=64
+// -runs=10000000
 
 #include <algorithm>
+#include <chrono>
 #include <cmath>
 
 #include "automation/date.hpp"
@@ -12,6 +14,8 @@ namespace talutil {
 namespace {
 
 constexpr std::int32_t current_year = 2009;
+constexpr std::int32_t first_day = -657434;
+constexpr std::int32_t last_day = 2958465;
 
 using fuzz::require;
 
@@ -84,6 +88,87 @@ void check_durations(const Text& text) {
   }
 }
 
+constexpr std::chrono::sys_days day_0 = std::chrono::year(1899) / std::chrono::December / 30;
+
+/// A day and a second of it as a number; before day 0 the time counts away from it.
+double serial_of(std::int32_t day, std::int32_t second) { return day + (day < 0 ? -second : second) / 86400.0; }
+
+/// Any day there is; one in eight lies near the first or the last.
+std::int32_t any_day(fuzz::Input& input) {
+  const std::int32_t kind = input.whole(0, 15);
+  return input.whole(kind == 1 ? last_day - 800 : first_day, kind == 0 ? first_day + 800 : last_day);
+}
+
+void check_parts(fuzz::Input& input) {
+  using namespace std::chrono;
+  const std::int32_t day = any_day(input);
+  const std::int32_t second = input.whole(0, 86399);
+  const year_month_day date(day_0 + days(day));
+  const DateParts parts{int(date.year()),          int(unsigned(date.month())),
+                        int(unsigned(date.day())), second / 3600,
+                        second / 60 % 60,          second % 60};
+  require(parts_of({serial_of(day, second)}) == parts, "the parts of a date");
+  require(std::abs(date_from_parts(parts).value().days - serial_of(day, second)) < 1e-9, "the date of its parts");
+  // Parts beyond their ranges count on.
+  const std::int32_t more_months = input.whole(-40, 40);
+  const std::int32_t more_days = input.whole(-500, 500);
+  const std::int32_t more_seconds = input.whole(0, 200'000);
+  const sys_days first = date.year() / date.month() / 1 + months(more_months);
+  const sys_seconds moved = first + days(parts.day - 1 + more_days) + seconds(second + more_seconds);
+  const auto count = static_cast<std::int32_t>((floor<days>(moved) - day_0).count());
+  const auto rest = static_cast<std::int32_t>((moved - floor<days>(moved)).count());
+  const auto date_of_parts = answer_of([&] {
+    return date_from_serial(parts.year, parts.month + more_months, parts.day + more_days, second + more_seconds);
+  });
+  require(date_of_parts.has_value() == (count >= first_day && count <= last_day), "parts within the calendar");
+  require(
+      !date_of_parts || date_to_text(date_of_parts->to_date(plain_numbers)) == date_to_text({serial_of(count, rest)}),
+      "parts beyond their ranges");
+}
+
+/// Days and months in a period, compared with differences.
+void check_period(fuzz::Input& input) {
+  static fuzz::Host host;
+  const Date a{static_cast<double>(any_day(input))};
+  const Date b{a.days + (input.whole(0, 9) == 0 ? input.whole(-3000, 3000) : input.whole(-70, 70))};
+  if (!is_in_date_range(b.days)) return;
+  const auto months_of = [](Date date) { return parts_of(date).year * 12 + parts_of(date).month; };
+  // The day behind the last one is looked at too, unless there is but one.
+  const bool is_refused = a != b && std::max(a.days, b.days) == last_day;
+  const auto expected = [&](double count) {
+    return is_refused ? std::nullopt
+                      : std::optional<Variant>(static_cast<std::int32_t>(a == b ? count : std::abs(count)));
+  };
+  require(answer_of([&] { return host.utils().GetDaysInPeriod(a, b); }) == expected(b.days - a.days), "days");
+  const auto months = answer_of([&] { return host.utils().GetMonthsInPeriod(a, b); });
+  require(months == expected(a == b ? -1 : months_of(b) - months_of(a)), "months");
+}
+
+Text text_of(const std::chrono::year_month_day& date) {
+  const Text text = number_to_text(int(unsigned(date.day()))) + u"/" + number_to_text(int(unsigned(date.month()))) +
+                    u"/" + number_to_text(int(date.year()));
+  const auto known = text_to_date(text, current_year);
+  return known ? date_to_text(*known) : text;
+}
+
+/// Days and months later, compared with the calendar.
+void check_steps(fuzz::Input& input) {
+  using namespace std::chrono;
+  static fuzz::Host host;
+  const std::int32_t start = any_day(input);
+  const std::int32_t most = input.whole(0, 99) == 0 ? 32767 : 1200;
+  const auto count = static_cast<std::int16_t>(input.whole(-most, most));
+  const Date from{static_cast<double>(start)};
+  const year_month_day date(day_0 + days(start));
+  const Text later = host.utils().IncDay(from, count).to_text(plain_numbers);
+  require(later == text_of(day_0 + days(start + count)), "days later");
+  const year_month month = date.year() / date.month() + months(count);
+  // In the year 0 every month has 28 days.
+  const auto last_day_of_month = int(month.year()) == 0 ? std::chrono::day(28) : (month / last).day();
+  const Text months_later = host.utils().IncMonth(from, count).to_text(plain_numbers);
+  require(months_later == text_of(month / std::min(date.day(), last_day_of_month)), "months later");
+}
+
 }  // namespace
 }  // namespace talutil
 
@@ -91,5 +176,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   const talutil::Text text = talutil::text_of(data, size);
   talutil::check(text);
   talutil::check_durations(text);
+  talutil::fuzz::Input input(data, size, u"");
+  talutil::check_parts(input);
+  talutil::check_period(input);
+  talutil::check_steps(input);
   return 0;
 }

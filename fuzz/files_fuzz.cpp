@@ -1,12 +1,10 @@
-// Checks what must hold for any bytes of a text file, any pattern and any name: files_fuzz -max_len=512 -runs=1000000
+// Checks what must hold for any pattern and any name: files_fuzz -max_len=512 -runs=1000000
 
-#include <algorithm>
 #include <filesystem>
 
 #include "archives/entry_names.hpp"
 #include "archives/item_list.hpp"
 #include "automation/run_time_error.hpp"
-#include "fuzz/host.hpp"
 #include "fuzz/input.hpp"
 #include "platform/file_names.hpp"
 #include "platform/posix/drive_paths.hpp"
@@ -16,19 +14,6 @@ namespace {
 
 using fuzz::require;
 
-/// Splits lines by a naive implementation of the rule.
-std::vector<Text> naive_lines(std::string bytes) {
-  bytes = bytes.substr(0, bytes.find('\x1A'));
-  std::vector<Text> lines;
-  for (std::size_t at = 0; at < bytes.size();) {
-    const std::size_t end = std::min(bytes.find('\r', at), bytes.size());
-    lines.push_back(from_ansi(bytes.substr(at, end - at)));
-    at = end + 1;
-    if (at < bytes.size() && bytes[at] == '\n') ++at;
-  }
-  return lines;
-}
-
 /// Matches by trying everything, for patterns without the special rules for dots.
 bool naive_match(TextView name, TextView pattern) {
   if (pattern.empty()) return name.empty();
@@ -36,22 +21,6 @@ bool naive_match(TextView name, TextView pattern) {
     return naive_match(name, pattern.substr(1)) || (!name.empty() && naive_match(name.substr(1), pattern));
   return !name.empty() && upper_case(name[0]) == upper_case(pattern[0]) &&
          naive_match(name.substr(1), pattern.substr(1));
-}
-
-void check_lines(const std::string& bytes) {
-  static fuzz::Host host;
-  ORVUtils& utils = host.utils();
-  const Text path = u"C:\\a.txt";
-  host.put_file(path, bytes);
-  TextArray list;
-  const auto count = static_cast<std::size_t>(utils.OpenFile(path, list, 0));
-  const std::vector<Text> expected = naive_lines(bytes);
-  require(count == expected.size() && list.items == expected, "lines");
-  require(utils.LoadTextBox(path) == from_ansi(bytes.substr(0, bytes.find('\x1A'))), "the whole text");
-  if (count == 0) return;
-  utils.SaveBigFile(list, path);
-  TextArray again;
-  require(utils.OpenFile(path, again, 0) == static_cast<std::int32_t>(count) && again == list, "lines come back");
 }
 
 void check_pattern(const std::string& bytes) {
@@ -101,7 +70,6 @@ void check_names(const Text& text) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   const std::string bytes(reinterpret_cast<const char*>(data), size);
-  talutil::check_lines(bytes);
   talutil::check_pattern(bytes);
   talutil::check_names(talutil::from_utf8(bytes));
   return 0;

@@ -16,7 +16,7 @@ cd "$fuzzers" || exit 1  # Some write files into the current folder.
 run() {
   local name=$1 longest=512
   case $name in
-    dates_fuzz | numbers_fuzz) longest=40 ;;
+    dates_fuzz | numbers_fuzz) longest=64 ;;
     archives_fuzz) longest=4096 ;;
   esac
   mkdir -p "$fuzzers/corpus/$name"

@@ -1,8 +1,9 @@
-// Checks what must hold for any text, compared with naive references. Build with clang and run:
+// Checks members on any text against naive models of them. Build with clang and run:
 //   text_fuzz -max_len=512 -max_total_time=60
 
 #include <algorithm>
 #include <cstdint>
+#include <optional>
 #include <vector>
 
 #include "automation/run_time_error.hpp"
@@ -12,99 +13,240 @@
 namespace talutil {
 namespace {
 
+using fuzz::Input;
 using fuzz::require;
+using namespace std::string_view_literals;
 
-Text naive_replace_word(const Text& text, const Text& from, const Text& to) {
+/// An object of whose class the library knows nothing: its members call one another where others work in one pass.
+struct Overridden final : ORVUtils {
+  using ORVUtils::ORVUtils;
+};
+
+bool is_digit(int code) { return code >= '0' && code <= '9'; }
+
+template <class Predicate>
+bool any_code(TextView text, Predicate is_wanted) {
+  return std::any_of(text.begin(), text.end(), [&](char16_t unit) { return is_wanted(ansi_code(unit)); });
+}
+
+/// The characters whose code answers yes.
+template <class Predicate>
+Text kept(Text text, Predicate keep) {
+  std::erase_if(text, [&](char16_t unit) { return !keep(ansi_code(unit)); });
+  return text;
+}
+
+Text replaced(TextView text, char16_t from, TextView to) {
   Text result;
-  for (std::size_t at = 0; at < text.size();) {
-    const bool here = !from.empty() && text.compare(at, from.size(), from) == 0;
-    result += here ? to : text.substr(at, 1);
-    at += here ? from.size() : 1;
+  for (const char16_t unit : text) {
+    if (ansi_code(unit) == ansi_code(from))
+      result += to;
+    else
+      result += unit;
   }
   return result;
 }
 
-Text naive_replace(const Text& text, char16_t from, const Text& to) {
-  Text result;
-  for (const char16_t unit : text) result += ansi_code(unit) == ansi_code(from) ? to : Text(1, unit);
-  return result;
+/// Each kind of character that a member tells from others, at its edges, and others that count as one of them.
+constexpr TextView edges =
+    u"/09:@AZ[`az{ ,.-'\"\t\r\n&#<>?\u00B4\u20AC\u2032\uFF03\u2003\u2085\uFF21\u0100\u0416\u4E2D\0"sv;
+
+void check_characters(ORVUtils& utils, Input& input) {
+  const char16_t one = input.one_of(edges);
+  const Text to = input.word(edges, 2);
+  Text text = input.byte() % 2 == 0 ? input.text(70) : input.word(u"0123456789ABC.Z", 12);
+  // Long texts are searched in blocks.
+  const std::int32_t repeats = input.whole(0, 16);
+  for (Text once = text; text.size() < once.size() * static_cast<std::size_t>(repeats);) text += once;
+
+  require(utils.StringReplace(text, Text(1, one) + to, to) == replaced(text, one, to), "StringReplace");
+  require(utils.CRLFStringReplace(text, u"-") == replaced(replaced(text, u'\r', u"-"), u'\n', u"-"), "line breaks");
+  require(utils.StripNulls(text) == text.substr(0, text.find(u'\0')), "StripNulls");
+  require(utils.RemoveNumberFromString(text) == kept(text, [](int code) { return code >= 'A'; }), "letters");
+  Text character;
+  const auto without = [&](std::int16_t kind) { return utils.RemoveStringsFromNumber(kind, text, character); };
+  require(without(0) == kept(text, is_digit), "digits");
+  require(without(1) == kept(text, [](int code) { return is_digit(code) || code == ' '; }), "digits and blanks");
+  require(without(3) == kept(text, [](int code) { return is_digit(code) || code == '.'; }), "digits and dots");
+  character = one;
+  Text others = text;
+  std::erase(others, one);
+  require(without(2) == others, "without a character");
+  require(utils.ReverseString(text) == Text(text.rbegin(), text.rend()), "ReverseString");
+  require(bool(utils.NumbersInString(text)) == any_code(text, is_digit), "NumbersInString");
+  const auto is_not_of_a_number = [](int code) { return !is_digit(code) && code != '.'; };
+  require(bool(utils.IsValueNumber(text)) == (!text.empty() && !any_code(text, is_not_of_a_number)), "IsValueNumber");
+  const auto is_not_of_a_password = [](int code) { return !is_digit(code) && (code < 'A' || code > 'Z'); };
+  require(bool(utils.VerifyPasswordText(text)) == !any_code(text, is_not_of_a_password), "VerifyPasswordText");
 }
 
-void check_verified_text(ORVUtils& utils, const Text& text, std::int16_t width, std::int16_t extras) {
-  const Text verified = utils.VerifyTextData(width, extras, text);
-  constexpr TextView forbidden = u"\"'\t#><?&";
-  const auto is_forbidden = [&](char16_t unit) { return forbidden.find(ansi_code(unit)) != TextView::npos; };
-  require(std::ranges::none_of(verified, is_forbidden), "nothing forbidden is left");
-  require(verified.find(u'\0') == Text::npos, "no NUL is left");
-  require(width <= 0 || verified.size() <= static_cast<std::size_t>(width), "the width is kept");
-  if (extras == 4 || extras == 5) return;
-  // Removing a character can leave a blank at an end, which only a second call trims.
-  require(utils.VerifyTextData(width, extras, verified) == trim_blanks(verified), "a second call only trims");
-}
-
-void check_line_handling(ORVUtils& utils, const Text& text) {
-  for (const std::int16_t extras : {std::int16_t{4}, std::int16_t{5}}) {
-    const Text verified = utils.VerifyTextData(0, extras, text);
-    require(verified.empty() || verified.ends_with(u"\r\n"), "every line kept ends with a line break");
-    require(verified.find(u"$*$") == Text::npos, "no marked line is left");
-    const auto breaks = naive_replace_word(verified, u"\r\n", u"").size();
-    require(extras == 5 || verified.size() - breaks <= 6, "at most three lines are left");
+void check_words(ORVUtils& utils, Input& input) {
+  const Text word = input.word(input.byte() % 2 == 0 ? u"ab" : u"ab\r", 12);
+  const auto part = [&] { return static_cast<std::size_t>(input.whole(0, static_cast<std::int32_t>(word.size()))); };
+  // Half of the texts nearly have the word, where a search must fall back to a shorter beginning of it.
+  const Text text = input.byte() % 2 == 0 ? word.substr(0, part()) + word.substr(part()) + word + input.text(70)
+                                          : input.word(u"ab\r", 16);
+  const Text to = input.word(u"abA", 3);
+  Text expected = text;
+  for (std::size_t at = 0; !word.empty() && (at = expected.find(word, at)) != Text::npos; at += to.size()) {
+    expected.replace(at, word.size(), to);
   }
+  require(utils.StringReplaceWord(text, word, to) == expected, "StringReplaceWord");
+
+  // A marker stands for a line break, and the character after it for nothing; one at the end stays behind it.
+  Text restored;
+  for (std::size_t at = 0; at < text.size(); ++at) {
+    restored += text[at] == u'a' ? u"\r\n" : Text(1, text[at]);
+    if (text[at] == u'a' && ++at == text.size()) restored += u'a';
+  }
+  require(utils.StringRestoreCRLF(text, u"a") == restored, "StringRestoreCRLF");
 }
 
-void check_line_break_markers(ORVUtils& utils, const Text& text, char16_t marker) {
-  // Only whole line breaks and no marker, as in texts that hosts store.
-  Text lines = naive_replace(naive_replace(text, u'\r', u""), marker, u"");
-  lines = naive_replace(lines, u'\n', u"\r\n");
-  if (ansi_code(marker) == u'\r' || ansi_code(marker) == u'\n') return;
-  const Text stored = utils.CRLFStringReplace(lines, Text(1, marker));
-  require(utils.StringRestoreCRLF(stored, Text(1, marker)) == lines, "line breaks come back");
-}
+/// A list taken apart: where each delimiter is, and the fields that they close; what comes after the last is none.
+struct Fields {
+  Fields(TextView list, char16_t delimiter) {
+    for (std::size_t start = 0, at = 0; (at = list.find(delimiter, start)) != TextView::npos; start = at + 1) {
+      positions.push_back(static_cast<std::int32_t>(at) + 1);
+      texts.emplace_back(list.substr(start, at - start));
+    }
+  }
+  std::vector<std::int32_t> positions;
+  std::vector<Text> texts;
+};
 
-void check_list(ORVUtils& utils, const Text& text) {
-  TextArray list;
-  const std::int32_t count = utils.ReadCommaDelimStrToList(text, list, u",");
-  require(list.allocated == (count > 0), "an array is made for elements only");
-  require(list.items.size() == static_cast<std::size_t>(count), "the count is the array's");
-  require(utils.SubStrCount(u",", text) == count, "a delimiter an element");
+void check_list(ORVUtils& utils, Input& input) {
+  const Text list = input.byte() % 2 == 0 ? input.text(255) : input.word(u"Aa,,;", 12);
+  const char16_t separator = input.one_of(u",;"sv);
+  const Text delimiter(1, separator);
+  const Text wanted = input.word(u"Aa", 2);
+  const Fields fields(list, separator);
+  const auto count = static_cast<std::int32_t>(fields.texts.size());
+  require(utils.SubStrCount(delimiter, list) == count, "SubStrCount");
+  for (std::int32_t n = 1; n <= count + 1; ++n) {
+    const std::int32_t place = n <= count ? fields.positions[static_cast<std::size_t>(n - 1)] : 0;
+    require(utils.MyPos(delimiter, list, n) == place, "MyPos");
+  }
+  const bool is_there = std::find(fields.texts.begin(), fields.texts.end(), wanted) != fields.texts.end();
+  require(bool(utils.MyInstrDelim(wanted, list, delimiter)) == is_there, "MyInstrDelim");
+
+  const TextArray before = input.byte() % 2 == 0 ? TextArray{} : TextArray{{u"1", u"2", u"3"}, 0, true};
+  TextArray read = before;
+  require(utils.ReadCommaDelimStrToList(list, read, delimiter) == count, "the count of ReadCommaDelimStrToList");
+  require(read == (count == 0 ? before : TextArray{fields.texts, 0, true}), "ReadCommaDelimStrToList");
+  const auto found = std::find_if(fields.texts.begin(), fields.texts.end(), [&](TextView field) {
+    return upper_case(field).starts_with(upper_case(TextView(wanted)));
+  });
+  const auto index = found == fields.texts.end() ? -1 : found - fields.texts.begin();
+  require(count == 0 || utils.IndexInList(read, wanted) == index, "IndexInList");
+  if (separator != u',') return;
   Text joined;
-  for (std::int32_t i = 0; i < count; ++i) {
-    joined.append(list.at(i)).append(u",");
-    require(utils.GetData(text, i, i + 1) == list.at(i), "GetData agrees");
-    require(bool(utils.MyInstrDelim(list.at(i), text, u",")), "MyInstrDelim finds every element");
+  const std::int32_t first = input.whole(0, count);
+  for (std::int32_t end = first + 1; end <= count; ++end) {
+    joined += fields.texts[static_cast<std::size_t>(end - 1)];
+    require(utils.GetData(list, first, end) == joined, "GetData");
+    joined += u',';
   }
-  require(text.starts_with(joined) && text.find(u',', joined.size()) == Text::npos, "joined again, it is the text");
+  require(utils.GetData(list, first, count + 1).empty(), "after the last comma there is nothing");
 }
 
-void check(fuzz::Input input) {
-  static fuzz::Host host;
-  ORVUtils& utils = host.utils();
+void require_verified(ORVUtils& utils, std::int16_t width, std::int16_t extras, const Text& text, TextView expected) {
+  require(utils.VerifyTextData(width, extras, text) == expected, "VerifyTextData");
+  require(Overridden(utils.library()).VerifyTextData(width, extras, text) == expected, "VerifyTextData of calls");
+}
 
-  const auto extras = static_cast<std::int16_t>(input.byte() % 6);
-  const auto width = static_cast<std::int16_t>(input.byte() % 64 - 16);
-  const auto marker = static_cast<char16_t>(input.byte());
-  const auto repeats = static_cast<std::size_t>(input.byte());
-  const Text from = input.text(8);
-  const Text to = input.text(8);
-  Text text = input.text(255);
+/// The cleaning, character by character.
+Text cleaned(TextView text, std::int16_t extras) {
+  Text result;
+  for (const char16_t unit : trim_blanks(text)) {
+    const int code = ansi_code(unit);
+    if (unit == 0) break;
+    if (code == '&')
+      result += u"and";
+    else if (code == '\'')
+      result += u'\u00B4';
+    else if (u"\"\t#><?"sv.find(static_cast<char16_t>(code)) == TextView::npos &&
+             !(code == ',' && (extras == 1 || extras == 3)) && !(code == ' ' && (extras == 2 || extras == 3)))
+      result += unit;
+  }
+  return result;
+}
 
-  check_verified_text(utils, text, width, extras);
-  check_line_handling(utils, text);
-  check_line_break_markers(utils, text, marker);
-  check_list(utils, text);
-  require(utils.ReverseString(utils.ReverseString(text)) == text, "twice reversed is not reversed");
-
-  // Long texts take other code paths than short ones.
-  for (std::size_t i = 0, once = text.size(); i < repeats && i < 16; ++i) text.append(text, 0, once);
-  require(utils.StringReplaceWord(text, from, to) == naive_replace_word(text, from, to), "StringReplaceWord");
-  if (!from.empty()) require(utils.StringReplace(text, from, to) == naive_replace(text, from[0], to), "StringReplace");
-  (void)utils.VerifyMemField(text);
-  (void)utils.StringPosition(text, 1);
+void check_cleaning(ORVUtils& utils, Input& input) {
+  const auto extras = static_cast<std::int16_t>(input.whole(-1, 3));
+  const auto width = static_cast<std::int16_t>(input.whole(-3, 9));
+  const Text text = input.byte() % 2 == 0 ? input.text(255) : input.word(edges, 12);
+  const Text whole = cleaned(text, extras);
+  require_verified(utils, width, extras, text, width > 0 ? whole.substr(0, static_cast<std::size_t>(width)) : whole);
+  Overridden calling(utils.library());
+  require(utils.VerifyMemField(text) == calling.VerifyMemField(text), "VerifyMemField of calls");
+  const Text address = input.word(u"ab  1", 14);
+  require(utils.StringPosition(address, 1) == calling.StringPosition(address, 1), "StringPosition of calls");
   try {
     (void)utils.VerifyIntData(0, text);
   } catch (const RunTimeError& error) {
     require(error.number() == 6, "a text with a number too large is an overflow");
   }
+}
+
+/// Marked lines are dropped, the last three others kept; one below 40 is joined to the one before it where both are
+/// below 73 together.
+std::vector<Text> kept_lines(std::vector<Text> lines) {
+  std::vector<Text> kept;
+  for (; !lines.empty() && kept.size() < 3; lines.pop_back()) {
+    Text line = lines.back();
+    if (line.empty()) continue;
+    if (lines.size() > 1 && line.size() < 40) {
+      Text& before = lines[lines.size() - 2];
+      if (!before.empty() && line.size() + before.size() < 73) {
+        line = before + u" - " + line;
+        before.clear();
+      }
+    }
+    kept.insert(kept.begin(), line);
+  }
+  return kept;
+}
+
+Text in_lines(const std::vector<Text>& lines) {
+  Text text;
+  for (const Text& line : lines) text += line + u"\r\n";
+  return text;
+}
+
+/// Lines of lengths near those that decide, some marked, some with blanks around.
+Text text_of_lines(Input& input) {
+  constexpr std::size_t lengths[] = {0, 0, 1, 31, 32, 33, 34, 38, 39, 40, 41, 71, 72};
+  Text text;
+  for (char16_t letter = u'a'; letter <= u'g'; ++letter) {
+    const Text line(input.one_of(lengths), letter);
+    text += (input.whole(0, 3) == 0 ? u" " + line + u"  " : line) + (input.whole(0, 7) == 0 ? u"$*$ " : u"");
+    if (input.whole(0, 7) == 0) break;
+    text += u"\r\n";
+  }
+  return text;
+}
+
+void check_lines(ORVUtils& utils, Input& input) {
+  const Text text = input.byte() % 4 == 0 ? input.text(255) : text_of_lines(input);
+  if (trim_blanks(text).empty()) return;
+  std::vector<Text> unmarked;
+  std::vector<Text> candidates;
+  const Text rest = cleaned(text, 0) + u"\r\n";
+  for (std::size_t start = 0, end = 0; (end = rest.find(u"\r\n", start)) != Text::npos; start = end + 2) {
+    const Text line = rest.substr(start, end - start);
+    const bool is_marked = line.find(u"$*$") != Text::npos;
+    candidates.emplace_back(is_marked ? u"" : trim_blanks(line));
+    if (!is_marked) unmarked.push_back(candidates.back());
+  }
+  require_verified(utils, 0, 5, text, in_lines(unmarked));
+  require_verified(utils, 0, 4, text, in_lines(kept_lines(candidates)));
+}
+
+void check(Input input) {
+  static fuzz::Host host;
+  constexpr void (*checks[])(ORVUtils&, Input&) = {&check_characters, &check_words, &check_list, &check_cleaning,
+                                                   &check_lines};
+  input.one_of(checks)(host.utils(), input);
 }
 
 }  // namespace

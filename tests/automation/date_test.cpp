@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <chrono>
-
 #include "tests/fakes/error_of.hpp"
 #include "tests/fakes/rows.hpp"
 
@@ -18,40 +16,6 @@ TEST(Date, PartsBetweenSecondsAndAtTheEnds) {
   EXPECT_EQ(parts_of({2958465.99998842592}), (DateParts{9999, 12, 31, 23, 59, 59}));
   EXPECT_EQ(parts_of({39876.999999}), (DateParts{2009, 3, 5, 0, 0, 0}));
   EXPECT_EQ(parts_of({-1.999999}), (DateParts{1899, 12, 30, 0, 0, 0}));
-}
-
-TEST(Date, PartsAreThoseOfTheCalendar) {
-  using namespace std::chrono;
-  constexpr sys_days day_0 = 1899y / December / 30;
-  testing::Generator generator;
-  const auto serial_of = [](std::int32_t days, std::int32_t second) {
-    return days < 0 ? days - second / 86400.0 : days + second / 86400.0;
-  };
-  for (int i = 0; i < 50'000; ++i) {
-    const std::int32_t day = generator.whole(-657434, 2958465);
-    const std::int32_t second = generator.whole(0, 86399);
-    const year_month_day date(day_0 + days(day));
-    const DateParts parts{int(date.year()),          int(unsigned(date.month())),
-                          int(unsigned(date.day())), second / 3600,
-                          second / 60 % 60,          second % 60};
-    EXPECT_EQ(parts_of({serial_of(day, second)}), parts) << day << ' ' << second;
-    EXPECT_DOUBLE_EQ(date_from_parts(parts).value().days, serial_of(day, second));
-    // Parts beyond their ranges count on.
-    const std::int32_t more_months = generator.whole(-40, 40);
-    const std::int32_t more_days = generator.whole(-500, 500);
-    const std::int32_t more_seconds = generator.whole(0, 200'000);
-    const sys_days first = date.year() / date.month() / 1 + months(more_months);
-    const sys_seconds moved = first + days(parts.day - 1 + more_days) + seconds(second + more_seconds);
-    const auto count = static_cast<std::int32_t>((floor<days>(moved) - day_0).count());
-    const auto rest = static_cast<std::int32_t>((moved - floor<days>(moved)).count());
-    const bool is_there = count >= -657434 && count <= 2958465;
-    EXPECT_EQ(outcome([&] {
-                return date_from_serial(parts.year, parts.month + more_months, parts.day + more_days,
-                                        second + more_seconds);
-              }),
-              is_there ? outcome([&] { return Date{serial_of(count, rest)}; }) : "error 5")
-        << day << ' ' << more_months << ' ' << more_days << ' ' << more_seconds;
-  }
 }
 
 TEST(Date, OutOfRange) {

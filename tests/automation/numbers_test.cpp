@@ -2,14 +2,9 @@
 
 #include <gtest/gtest.h>
 
-#include <array>
-#include <cmath>
-#include <cstdio>
-#include <cstdlib>
 #include <limits>
 
 #include "automation/checked.hpp"
-#include "automation/decimal_digits.hpp"
 #include "tests/fakes/error_of.hpp"
 #include "tests/fakes/rows.hpp"
 
@@ -20,79 +15,6 @@ using testing::check_rows;
 using testing::outcome;
 
 constexpr Locale comma_locale{.decimal_separator = u',', .thousands_separator = u'.', .currency_symbol = {u'\u20AC'}};
-
-// Without blanks, other bases and separators a number is what the C library takes for one.
-TEST(Numbers, AreReadAsTheCLibraryReadsThem) {
-  constexpr TextView pieces[] = {u"0", u"1", u"25", u"007", u"9999", u".", u"-", u"+", u"e", u"E+", u"e-", u"y"};
-  testing::Generator generator;
-  for (int i = 0; i < 20'000; ++i) {
-    Text text;
-    for (int left = generator.whole(0, 7); left > 0; --left) text += generator.one_of(pieces);
-    const std::string bytes = to_utf8(text);
-    char* end = nullptr;
-    const double number = std::strtod(bytes.c_str(), &end);
-    const std::string expected = std::isfinite(number) ? outcome([&] { return number; }) : "error 6";
-    EXPECT_EQ(outcome([&] { return leading_number(text); }), expected) << bytes;
-    // Whole texts may have one sign of each kind, behind the number too.
-    if (text.find(u"+-") != Text::npos || text.find(u"-+") != Text::npos || text.find_last_of(u"+-") + 1 == text.size())
-      continue;
-    const bool is_whole = !bytes.empty() && *end == 0;
-    EXPECT_EQ(outcome([&] { return text_to_number(text); }), is_whole ? expected : "none") << bytes;
-  }
-}
-
-// Numbers of every size, near powers of ten and half-way between two, have the digits that the C library writes.
-TEST(Numbers, AreRoundedAsTheCLibraryRoundsThem) {
-  testing::Generator generator;
-  for (int i = 0; i < 50'000; ++i) {
-    const std::int64_t whole = generator.whole(1, 99'999'999);
-    const double numbers[] = {std::ldexp(static_cast<double>(whole), static_cast<int>(generator.whole(-1070, 990))),
-                              static_cast<double>(whole) / 1000, static_cast<double>(whole) / 4096,
-                              std::nextafter(std::pow(10.0, static_cast<double>(generator.whole(-14, 17))), i % 2)};
-    const double number = generator.one_of(numbers);
-    const int count = i % 3 == 0 ? 15 : static_cast<int>(generator.whole(1, 17));
-    std::array<char, 40> expected{};
-    std::snprintf(expected.data(), expected.size(), "%.*e", count - 1, number);
-    const DecimalDigits digits = decimal_digits(number, count);
-    std::string written = digits.digits + std::string(static_cast<std::size_t>(count) - digits.digits.size(), '0');
-    if (count > 1) written.insert(1, ".");
-    std::array<char, 40> got{};
-    std::snprintf(got.data(), got.size(), "%se%+03d", written.c_str(), digits.exponent);
-    EXPECT_STREQ(got.data(), expected.data());
-  }
-}
-
-// The nearest whole number to a quotient, the even one of two.
-std::int64_t rounded(std::int64_t number, std::int64_t divisor) {
-  const std::int64_t rest = ((number % divisor) + divisor) % divisor;
-  const std::int64_t below = (number - rest) / divisor;
-  return rest * 2 > divisor || (rest * 2 == divisor && below % 2 != 0) ? below + 1 : below;
-}
-
-TEST(Numbers, TextsAreRoundedExactly) {
-  constexpr std::int64_t powers[] = {1, 10, 100, 1000, 10'000, 100'000, 1'000'000};
-  constexpr std::int64_t edges[] = {0, 0, 32767, -32768, 2147483647, -2147483648};
-  testing::Generator generator;
-  for (int i = 0; i < 20'000; ++i) {
-    // Around halves of whole numbers and of ten-thousandths, at the ends of types and elsewhere.
-    const std::size_t places = static_cast<std::size_t>(generator.whole(1, 6));
-    const std::int64_t scale = powers[places];
-    const std::int64_t halves[] = {0, scale / 2, places > 4 ? powers[places - 4] / 2 : 0, generator.whole(0, 999'999)};
-    const std::int64_t number = (generator.one_of(edges) + generator.whole(-3, 3)) * scale + generator.one_of(halves) +
-                                generator.whole(-1, 1) + (i % 2) * generator.whole(-1000, 1000) * powers[5];
-    const std::string digits = std::to_string(std::abs(number) % scale + scale).substr(1);
-    const Text text = from_utf8((number < 0 ? "-" : "") + std::to_string(std::abs(number) / scale) + "." + digits);
-    const std::int64_t whole = rounded(number, scale);
-    EXPECT_EQ(outcome([&] { return text_to_integer<std::int16_t>(text); }),
-              outcome([&] { return checked_cast<std::int16_t>(whole); }))
-        << to_utf8(text);
-    EXPECT_EQ(outcome([&] { return text_to_integer<std::int32_t>(text); }),
-              outcome([&] { return checked_cast<std::int32_t>(whole); }))
-        << to_utf8(text);
-    const std::int64_t money = places > 4 ? rounded(number, powers[places - 4]) : number * powers[4 - places];
-    EXPECT_EQ(text_to_currency(text), Currency{money}) << to_utf8(text);
-  }
-}
 
 TEST(Numbers, LeadingNumber) {
   const testing::Rows<TextView, std::string> rows = {

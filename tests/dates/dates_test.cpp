@@ -180,6 +180,24 @@ TEST_F(DateMembers, ObjectsStandForRecords) {
   EXPECT_EQ(error_of([&] { use(u"DateToSystemTime", {Variant(u"6/4/2010"), Variant(ObjectRef(timeless))}); }), 438);
 }
 
+/// A calendar in which every month has twenty days.
+class ShortMonths final : public ORVUtils {
+ public:
+  using ORVUtils::ORVUtils;
+  std::int16_t GetDaysThisMonth(const std::int16_t& /*iMonth*/, const std::int16_t& /*iYear*/) override { return 20; }
+};
+
+TEST_F(DateMembers, StepsGoByTheObjectsOwnMonths) {
+  ShortMonths object(library);
+  EXPECT_EQ(object.IncDay(u"19/01/2009", 2), Variant(u"01/02/2009"));
+  EXPECT_EQ(object.IncDay(u"25/01/2009", 21), Variant(u"01/03/2009"));
+  EXPECT_EQ(object.IncDay(u"01/03/2009", -21), Variant(u"20/01/2009"));
+  EXPECT_EQ(object.IncMonth(u"31/01/2009", 1), Variant(u"20/02/2009"));
+  // The week goes on to day 28 without asking.
+  EXPECT_EQ(object.IncWeek(u"19/01/2009", 1), Variant(u"26/01/2009"));
+  EXPECT_EQ(object.IncWeek(u"26/01/2009", 1), Variant(u"05/02/2009"));
+}
+
 TEST_F(DateMembers, SystemTimes) {
   SystemTime time{.wDayOfWeek = 77, .wMilliseconds = 88};
   utils.DateToSystemTime({39877.5732638889}, time);

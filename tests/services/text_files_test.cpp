@@ -7,42 +7,7 @@ struct TextFiles : LateMembers {
   const Text path = u"C:\\a.txt";
 };
 
-TEST_F(TextFiles, AreReadByteByByte) {
-  constexpr std::string_view bytes_of_files("ab\r\r\n\n\x1A\x80\xFC\0", 10);
-  constexpr std::int32_t buffer = 1 << 16;
-  constexpr std::int32_t short_line = 1024;
-  Generator generator;
-  for (int i = 0; i < 240; ++i) {
-    // One file in ten reaches across the end of a buffer, or of what counts as a short line, in the middle of a line or
-    // of its end.
-    const std::int32_t first_length = i % 10 == 0   ? generator.whole(buffer - 5, buffer + 1)
-                                      : i % 10 == 5 ? generator.whole(short_line - 9, short_line + 1)
-                                                    : generator.whole(0, 20);
-    std::string bytes(static_cast<std::size_t>(first_length), 'x');
-    if (i % 20 == 0) bytes += '\x1A';
-    for (int left = generator.whole(0, 12); left > 0; --left) bytes += generator.one_of(bytes_of_files);
-    const std::string all = bytes.substr(0, bytes.find('\x1A'));
-    std::vector<Text> expected;
-    std::string line;
-    for (std::size_t at = 0; at < all.size(); ++at) {
-      if (all[at] != '\r') line += all[at];
-      if (all[at] != '\r' && at + 1 < all.size()) continue;
-      if (all[at] == '\r' && at + 1 < all.size() && all[at + 1] == '\n') ++at;
-      expected.push_back(from_ansi(line));
-      line.clear();
-    }
-    platform.files.put(path, bytes);
-    EXPECT_TRUE(utils.LoadTextBox(path) == from_ansi(all)) << bytes.size();
-    for (const std::int32_t limit : {-1, 0, 1, 2, static_cast<std::int32_t>(expected.size())}) {
-      std::vector<Text> first = expected;
-      if (limit > 0 && limit < static_cast<std::int32_t>(first.size())) first.resize(static_cast<std::size_t>(limit));
-      TextArray list = array_of({u"o", u"l", u"d"});
-      EXPECT_EQ(utils.OpenFile(path, list, limit), static_cast<std::int32_t>(first.size())) << limit;
-      EXPECT_TRUE(expected.empty() || list == array_of(first)) << limit << " lines of " << bytes.size();
-    }
-  }
-}
-
+// How lines are read of any bytes is compared with a model in fuzz/text_files_fuzz.cpp.
 TEST_F(TextFiles, BlankLinesAndMissingFiles) {
   const std::string blank_between = "a\r\n \r\nb\r\n";
   const std::string blank_last = "a\r\n>x<\r\n?\r\n";

@@ -1,13 +1,10 @@
 #include <limits>
-#include <ranges>
 
 #include "tests/fakes/late_members.hpp"
 #include "tests/fakes/recording_control.hpp"
 
 namespace talutil::testing {
 namespace {
-
-using namespace std::string_view_literals;
 
 struct Sanitising : LateMembers {
   /// The same from an object without overridden members, which does all work at once.
@@ -29,47 +26,8 @@ Variant holder_of(std::optional<Variant> value) {
   return ObjectRef(object);
 }
 
-Text lines(const std::vector<Text>& all) {
-  Text text;
-  for (const Text& line : all) text.append(line).append(u"\r\n");
-  return text;
-}
-
-std::vector<Text> split(TextView text) {
-  std::vector<Text> all;
-  for (const auto line : std::views::split(text, TextView(u"\r\n"))) all.emplace_back(line.begin(), line.end());
-  return all;
-}
-
-/// The cleaning, character by character.
-Text cleaned(TextView text, std::int16_t extras = 0) {
-  Text result;
-  for (const char16_t unit : trim_blanks(text)) {
-    const auto code = static_cast<char>(ansi_code(unit));
-    if (unit == 0) break;
-    if (code == '&')
-      result += u"and";
-    else if (code == '\'')
-      result += u'\u00B4';
-    else if (std::string_view("\"\t#><?").find(code) == std::string_view::npos &&
-             !(code == ',' && (extras == 1 || extras == 3)) && !(code == ' ' && (extras == 2 || extras == 3)))
-      result += unit;
-  }
-  return result;
-}
-
-TEST_F(Sanitising, VerifyTextDataCleansAndCuts) {
-  constexpr TextView characters = u"ab  ,,&\"'\t#><?\u2032\uFF03\u3008\u2003\u0416\u20AC\u0100\0"sv;
-  Generator generator;
-  std::int32_t calls = 0;
-  for (; calls < 3000; ++calls) {
-    const Text text = generator.text_of(characters, 12);
-    const auto extras = static_cast<std::int16_t>(generator.whole(-1, 3));
-    const auto width = static_cast<std::int16_t>(generator.whole(-3, 9));
-    const Text whole = cleaned(text, extras);
-    EXPECT_EQ(verified(width, extras, text), width > 0 ? whole.substr(0, std::size_t(width)) : whole)
-        << to_utf8(text) << ", extras " << extras << ", width " << width;
-  }
+// Any text of the rest is compared with a model in fuzz/text_fuzz.cpp.
+TEST_F(Sanitising, VerifyTextData) {
   const Rows<std::int16_t, Variant, Text> rows = {
       {"Empty, whose lines are not looked at", 5, Variant(), u""},
       {"trimmed before the end at NUL", 0, Text(u" ab \0 cd", 8), u"ab "},
@@ -79,7 +37,7 @@ TEST_F(Sanitising, VerifyTextDataCleansAndCuts) {
   check_rows(rows, [&](std::int16_t extras, const Variant& data, const Text& expected) {
     EXPECT_EQ(verified(0, extras, data), expected);
   });
-  EXPECT_EQ(utils.settings().CounterVerifyText, 2 * (calls + static_cast<std::int32_t>(rows.size())));
+  EXPECT_EQ(utils.settings().CounterVerifyText, 2 * static_cast<std::int32_t>(rows.size()));
   // clang-format off
   check({{u"VerifyTextData", {{u"0|0|@null", ""}, {u"0|5|", ""}, {u"0|6|1, 2", "1, 2"}, {u"0|0|=12.5", "12.5"},
           // A line break at the end makes one more line; a lone carriage return or line feed breaks nothing.
@@ -90,45 +48,6 @@ TEST_F(Sanitising, VerifyTextDataCleansAndCuts) {
           {u"0|4|Unit 5\r\nMain Rd", "Unit 5 - Main Rd\r\n"}, {u"0|4|a\r\nb\r\nc", "a\r\nb - c\r\n"},
           {u"0|4|a\r\nb\r\nc\r\nd\r\ne\r\nf\r\ng", "b - c\r\nd - e\r\nf - g\r\n"}}}});
   // clang-format on
-}
-
-// Marked lines are dropped, the last three others kept; one below 40 is joined to the one before it where both are
-// below 73 together.
-TEST_F(Sanitising, VerifyTextDataKeepsLinesByTheirLengths) {
-  constexpr std::size_t lengths[] = {0, 0, 1, 31, 32, 33, 34, 38, 39, 40, 41, 71, 72};
-  Generator generator;
-  for (int i = 0; i < 5000; ++i) {
-    std::vector<Text> given(static_cast<std::size_t>(generator.whole(1, 7)));
-    for (Text& line : given) {
-      line = Text(generator.one_of(lengths), static_cast<char16_t>(u'a' + (&line - given.data())));
-      if (generator.whole(0, 3) == 0) line = u" " + line + u"  ";
-      if (generator.whole(0, 7) == 0) line += u"$*$ ";
-    }
-    Text text = lines(given);
-    text.erase(text.size() - 2);
-    text = trim_blanks(text);
-    if (text.empty()) continue;
-    Text unmarked;
-    std::vector<Text> left;
-    for (const Text& line : split(text)) {
-      const bool is_marked = line.find(u"$*$") != Text::npos;
-      left.push_back(is_marked ? u"" : Text(trim_blanks(line)));
-      if (!is_marked) unmarked += left.back() + u"\r\n";
-    }
-    EXPECT_EQ(verified(0, 5, text), unmarked) << to_utf8(text);
-    std::vector<Text> kept;
-    for (; !left.empty() && kept.size() < 3; left.pop_back()) {
-      Text line = left.back();
-      if (line.empty()) continue;
-      Text& before = left[left.size() < 2 ? 0 : left.size() - 2];
-      if (left.size() > 1 && !before.empty() && line.size() < 40 && line.size() + before.size() < 73) {
-        line = before + u" - " + line;
-        before.clear();
-      }
-      kept.insert(kept.begin(), line);
-    }
-    EXPECT_EQ(verified(0, 4, text), lines(kept)) << to_utf8(text);
-  }
 }
 
 // An override of a member sees every inner call, in this order.
