@@ -162,8 +162,8 @@ void compare_with_bare(const char* what, double goal, Ours ours, Bare bare) {
               median(our_times) / 1000, median(bare_times) / 1000, median(ratios), goal);
 }
 
-/// A file dialog that replaces ours and returns at once, so that exports are timed without a dialog. It is its own
-/// class object.
+/// A file dialog that replaces the system's and returns at once, so that exports are timed without a dialog. It is its
+/// own class object.
 class AnsweredDialog final : public IClassFactory {
  public:
   static constexpr CLSID class_id = {0x61C0A9F4, 0x2F0E, 0x4F6D, {0x8A, 0x11, 0x0D, 0x5C, 0x7E, 0x39, 0xB2, 0x48}};

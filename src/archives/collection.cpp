@@ -61,7 +61,7 @@ void Collection::add_entry(std::size_t folder, TextView name, const FileFacts& f
                            bool recurse, bool keep_folders) {
   const bool has_control_character = std::ranges::any_of(name, [](char16_t unit) { return unit < u' '; });
   if (facts.kind == FileKind::unnameable || has_control_character) return left_out_.add(from_utf8(prefix) + Text(name));
-  // What a run of ours that was killed has left.
+  // Left by a run of the library that was killed.
   if (name.starts_with(temporary_prefix)) return;
   if (facts.kind == FileKind::file) {
     items_.push_back({folder, Text(name), prefix + to_utf8(name), facts});

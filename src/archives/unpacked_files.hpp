@@ -69,8 +69,8 @@ class UnpackedFiles {
   /// Adds a file that has been written.
   void add(File file);
 
-  /// Gives all of them their names, or fails for the first for which there is no hope: those before it get theirs, and
-  /// those after it do not any more.
+  /// Gives all of them their names, or fails for the first for which there is no hope: those before it are named, and
+  /// those after it are not.
   void settle() { settle(pending_.size()); }
 
  private:

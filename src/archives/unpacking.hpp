@@ -16,7 +16,7 @@ using PasswordQuestion = std::function<std::optional<Text>(const Text& entry, bo
 /// What became of an entry that was not unpacked.
 enum class Fate : std::uint8_t { kept, left_out };
 
-/// Is told of each entry that is not unpacked: because a file of its name is kept, or for the given reason.
+/// Called for each entry that is not unpacked: because a file of its name is kept, or for the given reason.
 using UnpackingNotice = std::function<void(const Text& entry, Fate fate, std::string_view reason)>;
 
 struct UnpackingOptions {

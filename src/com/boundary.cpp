@@ -65,7 +65,8 @@ BSTR description_of(const RunTimeError& error) noexcept {
   return SysAllocStringLen(win32::wide(error.description()), static_cast<UINT>(error.description().size()));
 }
 
-/// An error of the host's control keeps its original source, even if that is empty: the error is still not ours.
+/// An error of the host's control keeps its original source, even if that is empty: the error still does not come from
+/// the library.
 const wchar_t* source_of(const RunTimeError& error) noexcept {
   return error.origin() ? win32::wide(error.origin()->source) : source_name;
 }

@@ -36,8 +36,8 @@ struct LoadedLibrary {
 struct Module {
   HINSTANCE handle = nullptr;
   std::atomic<long> references = 0;  ///< Class objects and locks; counted before the library exists.
-  // Recursive, because starting the library may lead back here on the same thread: a control registered in place of
-  // ours may create one of our classes.
+  // Recursive, because starting the library may lead back here on the same thread: a third-party control may create one
+  // of our classes.
   std::recursive_mutex starting;
   bool is_starting = false;
   // Neither is ever released: objects that hosts have put into the settings must not be released under the loader lock.

@@ -5,7 +5,7 @@
 #include "automation/variant.hpp"
 #include "platform/win32/windows.hpp"
 
-/// Conversion of values between automation's types and ours.
+/// Conversion of values between automation's types and the library's.
 namespace talutil::com {
 
 /// An automation string, owned until it is passed to the caller.

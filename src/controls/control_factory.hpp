@@ -13,7 +13,7 @@ class ControlFactory {
   /// Creates a control. Raises 429 for an unknown class name.
   [[nodiscard]] ObjectRef create(TextView class_name) const;
 
-  /// Creates one of ours, whatever is registered in its place.
+  /// Creates our own control, whatever is registered in its place.
   [[nodiscard]] ObjectRef create_own(TextView class_name) const;
 
  private:

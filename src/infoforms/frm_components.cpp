@@ -39,7 +39,7 @@ void FrmComponents::load() {
   std::ranges::transform(places, controls.begin(), [&](const Place& place) {
     return are_ours ? factory_.create_own(place.class_name) : factory_.create(place.class_name);
   });
-  // Ours answer with texts, so that the user's separators need not be read yet.
+  // Our own controls answer with texts, so that the user's separators need not be read yet.
   const Locale locale = are_ours ? Locale{} : platform_.computer.locale();
   const Control dialog(controls[place_of(u"dlgSave2")], locale);
   dialog.put(u"DialogTitle", u"Save Data to File");

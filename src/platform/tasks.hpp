@@ -34,7 +34,7 @@ class EndedTask final : public StartedTask {
   std::exception_ptr failure_;
 };
 
-/// Runs tasks, which may be on other threads. What members do on a host's thread stays there; only programs of ours
+/// Runs tasks, which may be on other threads. What members do on a host's thread stays there; only our own programs
 /// may have threads, and give members nothing but this to use them.
 class Tasks {
  public:

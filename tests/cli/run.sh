@@ -281,7 +281,7 @@ bad_plan 'plan: no result' 'Terminate gives no value back; use a member that doe
 # ---- secrets
 verdict 'encrypted and decrypted, the line break of echo apart' $'sécret' "$(echo 'sécret' | "$talutil" encrypt | "$talutil" decrypt)"
 verdict 'to the byte' ' 20 61 0a 0a' "$(printf ' a\n\n' | "$talutil" encrypt --exact | "$talutil" decrypt --exact | od -An -tx1)"
-verdict 'a cipher text of another maker' '1: talutil: standard input: error 5: This is not a cipher text of this library, or it was changed' \
+verdict 'a foreign cipher text' '1: talutil: standard input: error 5: This is not a cipher text of this library, or it was changed' \
   "$(echo QUJD | answer "$talutil" decrypt)"
 [[ $("$talutil" password --length 12 --mix hex --count 2) =~ ^[0-9A-F]{12}$'\n'[0-9A-F]{12}$ ]]
 verdict 'passwords' 0 $?

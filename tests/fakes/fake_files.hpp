@@ -12,7 +12,7 @@
 namespace talutil::testing {
 
 /// Files in memory, found by their full path in any case, and folders that are there because something lies in them
-/// or because they were made. Drive C: is the only one. Any operation can be told to fail.
+/// or because they were made. Drive C: is the only one. Any operation can be made to fail.
 struct FakeFiles final : Files {
   struct File {
     std::string bytes;

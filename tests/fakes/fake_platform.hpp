@@ -20,7 +20,7 @@
 namespace talutil::testing {
 
 /// A platform without a machine: it records what the library asks for and answers as the test says. Fields
-/// can be set at any time; the clock moves only when told. It must outlive the library that uses it.
+/// can be set at any time; the clock moves only when it is set. It must outlive the library that uses it.
 struct FakePlatform : MessageBoxes,
                       Screen,
                       Computer,

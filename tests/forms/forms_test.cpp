@@ -116,7 +116,7 @@ TEST_F(Forms, TicksAreSetAndCounted) {
   EXPECT_EQ(uses(), "ColDataType(3&)|Rows|FixedRows|Cell(5%, 1&, 3&)|Cell(5%, 2&, 3&)|Cell(5%, 3&, 3&)");
   EXPECT_EQ(utils.CountGridSelectedRows(0, holder), 0);
 
-  // Errors are told, and what was counted before is the result.
+  // Errors are reported, and what was counted before is the result.
   control->before = [](const std::string& use) {
     if (use == "Cell(5%, 2&, 3&)" || use == "put TextMatrix(2&, 3&) = True") throw RunTimeError(1234, u"It broke.");
   };

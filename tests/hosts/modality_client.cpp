@@ -11,7 +11,7 @@ namespace {
 
 constexpr UINT dpi_changed = 0x02E0;
 
-std::vector<std::string> events;  ///< What the host's window was told, in order.
+std::vector<std::string> events;  ///< What the host's window heard, in order.
 
 LRESULT CALLBACK note(HWND window, UINT message, WPARAM what, LPARAM value) {
   if (message == WM_ENABLE) events.emplace_back(what != 0 ? "enabled" : "disabled");
@@ -68,7 +68,7 @@ void nobody_else_comes_to_the_front(const Shown& shown, HWND host) {
   handle_messages();
   std::string all;
   for (const std::string& event : events) all += event + ' ';
-  check_equal("disabled inactive enabled active ", all, std::string(shown.name) + ": what the host was told");
+  check_equal("disabled inactive enabled active ", all, std::string(shown.name) + ": what the host heard");
   check(GetForegroundWindow() == host, std::string(shown.name) + ": the host is in front again");
 }
 

@@ -20,7 +20,7 @@ struct ZipFilesTest : testing::UtilsTest {
           fake.used_folders = testing::real_folders();
         }) {}
 
-  /// A third-party control in the place of ours, whose result is 0.
+  /// A third-party control, whose result is 0.
   std::shared_ptr<RecordingControl> replace(const Text& class_name, const char* result) {
     auto control = std::make_shared<RecordingControl>();
     control->values[result] = std::int16_t{0};

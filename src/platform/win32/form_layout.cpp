@@ -89,11 +89,13 @@ void FormLayout::stack() {
 }
 
 void FormLayout::follow() const {
-  if (!description_.is_resizable || IsIconic(window_) != FALSE) return;
+  const bool moves_parts = description_.is_resizable && IsIconic(window_) == FALSE;
   RECT inside{};
   GetClientRect(window_, &inside);
   for (const PlacedPart& placed : parts_) {
-    move(placed, static_cast<int>(inside.right - inner_.cx), static_cast<int>(inside.bottom - inner_.cy));
+    if (moves_parts)
+      move(placed, static_cast<int>(inside.right - inner_.cx), static_cast<int>(inside.bottom - inner_.cy));
+    if (placed.table) placed.table->fill_width();
   }
 }
 

@@ -17,7 +17,7 @@ class FormLayout {
   /// and everything on it is scaled.
   void set_dots(int dots, const RECT& place);
 
-  /// After the window was resized: parts follow its edges.
+  /// After the window was resized: parts follow its edges, and the columns of tables fill them.
   void follow() const;
 
   /// Moves the window to the middle of the screen's work area.

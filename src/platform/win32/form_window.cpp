@@ -148,9 +148,6 @@ class FormWindow final : public TopWindow, public FormView {
       }
       case WM_SIZE:
         layout_->follow();
-        for (const PlacedPart& placed : *parts_) {
-          if (placed.table) placed.table->fill_width();
-        }
         return 0;
       case wm_dpi_changed:
         layout_->set_dots(LOWORD(what), *reinterpret_cast<const RECT*>(value));

@@ -30,7 +30,8 @@ WaitingWindows::WaitingWindows(HWND window) : window_(window), owner_(GetActiveW
   std::erase(others_, window);
   for (const HWND other : others_) EnableWindow(other, FALSE);
   if (window == nullptr) return;
-  // GWLP_HWNDPARENT is the owner of a top-level window: ours stays above it, and both have one button on the task bar.
+  // GWLP_HWNDPARENT is the owner of a top-level window: our window stays above it, and both share a button on the task
+  // bar.
   SetWindowLongPtrW(window, GWLP_HWNDPARENT, reinterpret_cast<LONG_PTR>(owner_));
   // Not behind a window that is always on top and cannot be moved now.
   if (std::ranges::any_of(others_, &is_topmost)) {
@@ -45,7 +46,7 @@ WaitingWindows::~WaitingWindows() {
     if (IsWindow(other) != FALSE) EnableWindow(other, TRUE);
   }
   const bool is_there = IsWindow(owner_) != FALSE;
-  // The owner is activated before ours is hidden, so that there is never a moment without an active window.
+  // The owner is activated before our window is hidden, so that there is never a moment without an active window.
   if (is_there)
     was_in_front ? static_cast<void>(SetForegroundWindow(owner_)) : static_cast<void>(SetActiveWindow(owner_));
   if (window_ != nullptr && IsWindow(window_) != FALSE) ShowWindow(window_, SW_HIDE);

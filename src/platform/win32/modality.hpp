@@ -14,8 +14,8 @@ void show_window(HWND window, int command) noexcept;
 /// Keeps the other windows of this thread disabled while a window, or a dialog of the system's, is waited for.
 ///
 /// The windows are enabled again before the one that was waited for is hidden. In the other order the system would have
-/// to activate a window of another program, because all of ours are disabled (documented at EnableWindow: "must enable
-/// the owner before destroying the dialog").
+/// to activate a window of another program, because all of our windows are disabled (documented at EnableWindow: "must
+/// enable the owner before destroying the dialog").
 class WaitingWindows {
  public:
   /// @param window the window to be shown; null for a dialog of the system's, which hides itself
