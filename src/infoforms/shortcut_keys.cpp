@@ -6,6 +6,13 @@ namespace talutil {
 
 namespace {
 
+// A heading of the list of shortcut keys with its entries, one per line: an action, " = " (missing in a few) and keys.
+struct ShortcutSection {
+  TextView heading;
+  bool is_menu = false;  ///< A menu of the screen above, rather than a screen.
+  TextView entries;
+};
+
 // The host application's users know these texts, including the blank after F12.
 constexpr ShortcutSection sections[] = {
     {u"GENERAL", false,
@@ -297,8 +304,6 @@ void append_escaped(Text& rich, TextView text) {
 }
 
 }  // namespace
-
-std::span<const ShortcutSection> shortcut_sections() noexcept { return sections; }
 
 Text shortcut_keys_rich_text() {
   Text rich = u"{\\rtf1\\ansi\\deff0{\\fonttbl{\\f0\\fmodern Courier New;}}\r\n\\pard\\f0 ";
