@@ -157,7 +157,7 @@ wine_environment() {
 # (Z:\build). The mounts are in a separate namespace and end with the command.
 in_wine_root() {
   mkdir -p "$talutil_build"
-  local limit=${WINE_TIMEOUT:-120} variables
+  local limit=${WINE_TIMEOUT:-300} variables
   mapfile -t variables < <(wine_environment)
   # shellcheck disable=SC2016
   timeout --kill-after=5 "$limit" unshare --mount bash -euc '
@@ -174,7 +174,7 @@ in_wine_root() {
 
 # The current folder must be on a drive, because programs look for it there.
 in_wine64() (
-  local limit=${WINE_TIMEOUT:-120} variables
+  local limit=${WINE_TIMEOUT:-300} variables
   mapfile -t variables < <(wine_environment)
   mkdir -p "$talutil_build/wine64-drive"
   cd "$talutil_build/wine64-drive" && timeout --kill-after=5 "$limit" env -i HOME="$talutil_build" WINEARCH=win64 WINEPREFIX="$(wine_prefix)" \

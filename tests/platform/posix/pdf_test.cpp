@@ -1,6 +1,7 @@
 // What other programs read from the PDF files.
 #include <gtest/gtest.h>
 #include <stdlib.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <cmath>
@@ -37,7 +38,7 @@ class SinglePage final : public PageSource {
 struct PdfTest : ::testing::Test {
   posix::PosixFontFiles fonts;
   posix::PosixFiles files;
-  std::string path = ::testing::TempDir() + "talutil_pdf_test.pdf";
+  std::string path = ::testing::TempDir() + "talutil-" + std::to_string(getpid()) + ".pdf";
 
   ~PdfTest() override { remove(path.c_str()); }
 
