@@ -124,6 +124,8 @@ run_windows() {
   for file in examples/guides/*.{vbs,js}; do
     prints_as_said "$file" wine cscript.exe //nologo "Z:\\checkout\\${file//\//\\}"
   done
+  file=examples/guides/vbscript.vbs
+  prints_as_said "$file" wine cscript.exe //nologo 'Z:\checkout\tests\guides\script_control.vbs' "Z:\\checkout\\${file//\//\\}"
   run_pascal
   run_cpp
   wine regsvr32.exe /s /u "$dll" || true

@@ -43,7 +43,11 @@ client registration
 succeeds "regsvr32, for the machine and for the user" wine regsvr32.exe /s /i:user "$dll"
 client type_library
 client start
-client early
+# Recorded into a file that cannot grow, which a host must not notice; a debugger would.
+ln -sfn /dev/full "$talutil_build/$folder/full"
+TALUTIL_RECORD="Z:\\build\\$folder\\full" WINEDEBUG=warn+seh client early
+succeeds "the recording ended because the disk was full" \
+  grep -q 'cannot record any more calls: writing the file failed' "$talutil_build/$folder-early.log"
 client late
 client objects
 client agreement
@@ -89,15 +93,6 @@ no_screen='445 There is no screen to show the window on. '
 answers=$(DISPLAY='' wine cscript.exe //nologo 'Z:\checkout\tests\hosts\no_screen.vbs' 2>/dev/null | tr -d '\r')
 succeeds "windows without a screen, which answered: $answers" test "$answers" = "$no_screen$no_screen$no_screen"
 restart_wine
-
-# Script hosts; the guides have clients in JScript and Pascal.
-hosts='Z:\checkout\tests\hosts'
-# The first of them is recorded into a file that cannot grow, which it must not notice; a debugger would.
-ln -sfn /dev/full "$talutil_build/$folder/full"
-TALUTIL_RECORD="Z:\\build\\$folder\\full" WINEDEBUG=warn+seh run vbscript wine cscript.exe //nologo "$hosts\\members.vbs"
-succeeds "the recording ended because the disk was full" \
-  grep -q 'cannot record any more calls: writing the file failed' "$talutil_build/$folder-vbscript.log"
-run script_control wine cscript.exe //nologo "$hosts\\script_control.vbs" "$hosts\\members.vbs"
 
 # The system's code page is that of the locale in which Wine's server begins; a manifest makes it UTF-8.
 mkdir -p "$talutil_build/$folder/locales"

@@ -1,4 +1,4 @@
-' A host that embeds scripts: hands its own object to a script control, which runs the script of members.vbs.
+' A host that embeds scripts: hands its own object to a script control, which runs the script of a file.
 '
 '   cscript //nologo script_control.vbs FILE
 Option Explicit
