@@ -154,5 +154,3 @@ if __name__ == "__main__":
     action, command, *folders = sys.argv[1:]
     actions = {"write": write, "compare": compare}
     sys.exit(actions[action](command, run.read_reference(command), *map(pathlib.Path, folders)))
-if __name__ == "__main__":
-    sys.exit(main(*sys.argv[1:]))

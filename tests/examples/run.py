@@ -2,9 +2,9 @@
 """Runs the examples in the members' texts and compares what they print with the comments below each Print.
 
   run.py native TALUTIL                 runs them by `talutil batch`
-  run.py script TALUTIL FILE.vbs        writes a script that runs them through the DLL, but for those with windows
-  run.py windows TALUTIL FOLDER         writes a script for each example with a window, and prints a line for it: its
-                                        name and, for each window, the keys of its user, blanks in between
+  run.py scripts TALUTIL FOLDER         writes scripts that run them through the DLL: all.vbs and one for each example
+                                        with a window, for which it prints a line: its name and, for each window, the
+                                        keys of its user, blanks in between
   run.py compare TALUTIL OUTPUT...      compares what scripts have printed
 
 Whatever fails is a line; the last line is "N passed, N failed".
@@ -178,24 +178,14 @@ def script_of(example, classes):
             "Err.Clear", *restored_settings(classes, example), "NewHostObjects", ""]
 
 
-def prologue():
-    with open(os.path.join(HERE, "host_objects.vbs"), encoding="utf-8") as source:
-        return source.read()
-
-
 def write_script(path, examples, classes):
-    lines = [prologue()]
+    with open(os.path.join(HERE, "host_objects.vbs"), encoding="utf-8") as source:
+        lines = [source.read()]
     for example in examples:
         lines += script_of(example, classes)
     lines += ['WScript.Echo "== end"']
     with open(path, "w", encoding="cp1252", newline="\r\n") as output:
         output.write("\n".join(lines))
-
-
-def script(talutil, path):
-    classes = read_reference(talutil)
-    write_script(path, [example for example in examples_of(classes) if not example.has_window], classes)
-    return 0
 
 
 def keys_of(what, text):
@@ -205,18 +195,18 @@ def keys_of(what, text):
     return "".join(f"{{SHIFT+{letter}}}" if letter.isupper() else letter for letter in text) + "{ENTER}"
 
 
-def windows(talutil, folder):
+def scripts(talutil, folder):
     classes = read_reference(talutil)
-    for example in examples_of(classes):
-        if not example.has_window:
-            continue
+    examples = examples_of(classes)
+    write_script(os.path.join(folder, "all.vbs"), [each for each in examples if not each.has_window], classes)
+    for example in [each for each in examples if each.has_window]:
         name = f"example_{example.number}.vbs"
         write_script(os.path.join(folder, name), [example], classes)
         print(name, *(keys_of(what, text.strip()) for what, text in KEYS.findall(example.code)))
     return 0
 
 
-def compare(talutil, paths):
+def compare(talutil, *paths):
     classes, verdicts = read_reference(talutil), Verdicts()
     examples = {example.number: example for example in examples_of(classes)}
     for path in paths:
@@ -232,13 +222,11 @@ def compare(talutil, paths):
 
 
 def main(arguments):
-    actions = {"native": (native, 1), "script": (script, 2), "windows": (windows, 2)}
-    if len(arguments) > 2 and arguments[0] == "compare":
-        return compare(arguments[1], arguments[2:])
-    if not arguments or arguments[0] not in actions or len(arguments) - 1 != actions[arguments[0]][1]:
+    actions = {"native": native, "scripts": scripts, "compare": compare}
+    if len(arguments) < 2 or arguments[0] not in actions:
         print(__doc__, file=sys.stderr)
         return 2
-    return actions[arguments[0]][0](*arguments[1:])
+    return actions[arguments[0]](*arguments[1:])
 
 
 if __name__ == "__main__":

@@ -8,9 +8,8 @@ run_examples() {  # the preset, the command
   # Which the test of printing has put beside the library.
   rm -f "$talutil_build/$1/printhelper.dll"
   wine reg.exe delete 'HKCU\Software\TALUtil\Settings' /f >/dev/null 2>&1 || true
-  "$talutil_top/tests/examples/run.py" script "$2" "$made/all.vbs"
+  "$talutil_top/tests/examples/run.py" scripts "$2" "$made" >"$made/windows.txt"
   WINE_TIMEOUT=300 wine cscript.exe //nologo "Z:\\build\\$1-examples\\all.vbs" >"$made/all.out"
-  "$talutil_top/tests/examples/run.py" windows "$2" "$made" >"$made/windows.txt"
   while read -r name keys; do
     read -ra keys <<<"$keys"
     wine "Z:\\build\\$1\\tests\\hosts\\user_client.exe" "Z:\\build\\$1-examples\\$name" "${keys[@]}" \
