@@ -21,11 +21,7 @@ void first_error_is_caught(U* u) {
   check_equal(L"(no error information)", early_outcome(S_OK).text, "information on it");
 }
 
-void settings_survive_their_object(U* u) {
-  create_object()->put_lLoginSessionID(-70000);
-  LONG session = 0;
-  u->get_lLoginSessionID(&session);
-  check_equal(-70000, session, "lLoginSessionID after the release of the object that put it");
+void the_computer_has_its_name(U* u) {
   std::array<wchar_t, MAX_COMPUTERNAME_LENGTH + 1> name{};
   auto length = static_cast<DWORD>(name.size());
   GetComputerNameW(name.data(), &length);
@@ -180,7 +176,7 @@ int wmain(int, wchar_t**) {
     const Pointer<U> object = create_object();
     U* const u = object.get();
     for (const auto check_part :
-         {first_error_is_caught, settings_survive_their_object, records_are_written_in_place, passwords_let_messages_in,
+         {first_error_is_caught, the_computer_has_its_name, records_are_written_in_place, passwords_let_messages_in,
           interfaces_are_one_object, unmasked_exceptions_do_no_harm, short_precision_changes_no_digit})
       check_part(u);
     objects_outlive_their_calls();
