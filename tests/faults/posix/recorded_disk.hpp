@@ -24,11 +24,9 @@ class RecordedDisk {
   void stop();
   [[nodiscard]] std::size_t steps() const noexcept { return steps_.size(); }
 
-  /// Which steps that were not flushed have reached the disk.
-  enum class Lost { everything, contents, names, nothing, at_random };
-
-  /// What is found after a power cut before a step.
-  [[nodiscard]] Contents after_cut(std::size_t step, Lost lost, unsigned seed) const;
+  /// What is found after a power cut before a step. Of the changes that were not flushed, the disk has none (0), those
+  /// of contents (1), those of names (2), all (3), or some by chance, others for each higher number.
+  [[nodiscard]] Contents after_cut(std::size_t step, unsigned kept) const;
 
   struct Step {
     enum class Kind { create, make_folder, rename, remove, write, truncate, flush_file, flush_folder };

@@ -133,6 +133,15 @@ int named(const char* name, std::initializer_list<int> codes, Kind kind, int fol
   });
 }
 
+/// Records what was written, at an offset or, if that is negative, where the file is now.
+ssize_t written(int file, const void* bytes, ssize_t count, off_t offset) {
+  if (disk == nullptr || count <= 0) return count;
+  const auto size = static_cast<std::size_t>(count);
+  const auto start = static_cast<std::size_t>(offset < 0 ? lseek(file, 0, SEEK_CUR) - count : offset);
+  record(file, Kind::write, start, std::string(static_cast<const char*>(bytes), size));
+  return count;
+}
+
 std::string parent_of(const std::string& path) { return std::filesystem::path(path).parent_path(); }
 
 }  // namespace
@@ -168,8 +177,8 @@ bool RecordedDisk::is_flushed(std::size_t step, std::size_t end) const {
   return false;
 }
 
-Contents RecordedDisk::after_cut(std::size_t end, Lost lost, unsigned seed) const {
-  std::mt19937 random(seed);
+Contents RecordedDisk::after_cut(std::size_t end, unsigned kept) const {
+  std::mt19937 random(kept);
   std::map<std::string, std::size_t> names;
   std::map<std::size_t, std::string> contents;
   Contents found;
@@ -182,8 +191,7 @@ Contents RecordedDisk::after_cut(std::size_t end, Lost lost, unsigned seed) cons
   for (std::size_t i = 0; i < end; ++i) {
     const Step& step = steps_[i];
     const bool is_content = step.kind == Kind::write || step.kind == Kind::truncate;
-    const bool is_lucky = lost == Lost::nothing || (lost == Lost::contents && !is_content) ||
-                          (lost == Lost::names && is_content) || (lost == Lost::at_random && random() % 2 == 0);
+    const bool is_lucky = kept > 3 ? random() % 2 == 0 : (kept & (is_content ? 1U : 2U)) != 0;
     if (!is_lucky && !is_flushed(i, end)) continue;
     std::string& bytes = contents[step.file];
     switch (step.kind) {
@@ -262,26 +270,14 @@ ssize_t pread64(int file, void* bytes, std::size_t count, off_t offset) { return
 
 ssize_t write(int file, const void* bytes, std::size_t count) {
   static const auto real = next<decltype(write)>("write");
-  return for_bytes("write", count, {ENOSPC, EIO, EINTR, half}, [&](std::size_t part) {
-    const ssize_t written = real(file, bytes, part);
-    if (disk == nullptr || written <= 0) return written;
-    const auto size = static_cast<std::size_t>(written);
-    record(file, Kind::write, static_cast<std::size_t>(lseek(file, 0, SEEK_CUR)) - size,
-           std::string(static_cast<const char*>(bytes), size));
-    return written;
-  });
+  return for_bytes("write", count, {ENOSPC, EIO, EINTR, half},
+                   [&](std::size_t part) { return written(file, bytes, real(file, bytes, part), -1); });
 }
 
 ssize_t pwrite(int file, const void* bytes, std::size_t count, off_t offset) {
   static const auto real = next<decltype(pwrite)>("pwrite");
-  return for_bytes("pwrite", count, {ENOSPC, EIO, EINTR, half}, [&](std::size_t part) {
-    const ssize_t written = real(file, bytes, part, offset);
-    if (disk != nullptr && written > 0) {
-      record(file, Kind::write, static_cast<std::size_t>(offset),
-             std::string(static_cast<const char*>(bytes), static_cast<std::size_t>(written)));
-    }
-    return written;
-  });
+  return for_bytes("pwrite", count, {ENOSPC, EIO, EINTR, half},
+                   [&](std::size_t part) { return written(file, bytes, real(file, bytes, part, offset), offset); });
 }
 ssize_t pwrite64(int file, const void* bytes, std::size_t count, off_t offset) {
   return pwrite(file, bytes, count, offset);
@@ -317,21 +313,14 @@ int unlinkat(int folder, const char* path, int flags) noexcept {
   return named("unlinkat", {EPERM, EIO}, Kind::remove, folder, path, 0, nullptr,
                [&] { return real(folder, path, flags); });
 }
-int unlink(const char* path) noexcept {
-  static const auto real = next<decltype(unlink)>("unlink");
-  return named("unlink", {EPERM, EIO}, Kind::remove, AT_FDCWD, path, 0, nullptr, [&] { return real(path); });
-}
+int unlink(const char* path) noexcept { return unlinkat(AT_FDCWD, path, 0); }
 
 int mkdirat(int folder, const char* path, mode_t mode) noexcept {
   static const auto real = next<decltype(mkdirat)>("mkdirat");
   return named("mkdirat", {ENOSPC, EACCES}, Kind::make_folder, folder, path, 0, nullptr,
                [&] { return real(folder, path, mode); });
 }
-int mkdir(const char* path, mode_t mode) noexcept {
-  static const auto real = next<decltype(mkdir)>("mkdir");
-  return named("mkdir", {ENOSPC, EACCES}, Kind::make_folder, AT_FDCWD, path, 0, nullptr,
-               [&] { return real(path, mode); });
-}
+int mkdir(const char* path, mode_t mode) noexcept { return mkdirat(AT_FDCWD, path, mode); }
 
 FAILING(flock, (int file, int operation), (file, operation), ENOLCK, EINTR, EWOULDBLOCK)
 FAILING(fstat, (int file, struct stat* status), (file, status), EIO)

@@ -20,8 +20,7 @@ class ScriptedCalls {
   ScriptedCalls& operator=(const ScriptedCalls&) = delete;
   ~ScriptedCalls();
 
-  /// The calls of FlushFileBuffers, of MoveFileExW with its flags, and of Sleep, each with "!" if it
-  /// failed; like ones in a row are counted.
+  /// The calls of FlushFileBuffers, of MoveFileExW with its flags, and of Sleep, each with "!" if it failed.
   [[nodiscard]] std::string log() const;
 
   /// Where files were created that did not exist.

@@ -109,11 +109,7 @@ DWORD ScriptedCalls::next_code(const std::string& name) {
 
 std::string ScriptedCalls::log() const {
   std::string log;
-  for (std::size_t i = 0; i < calls_.size(); ++i) {
-    std::size_t count = 1;
-    while (i + 1 < calls_.size() && calls_[i + 1] == calls_[i]) ++i, ++count;
-    log += (log.empty() ? "" : " ") + calls_[i] + (count == 1 ? "" : "x" + std::to_string(count));
-  }
+  for (const std::string& call : calls_) log += (log.empty() ? "" : " ") + call;
   return log;
 }
 
