@@ -113,16 +113,12 @@ def by_hand():
             yield f"name: {kind}", build(Part("first.txt"), Part(name, b"x", 0), Part("last.txt"))
     yield "name: no UTF-8, though said", build(Part("first.txt"), Part(b"a\xff", flags=0x800))
     yield "name: control character", build(Part("first.txt"), Part("a\1b"), Part("a\x7fb"))
-    yield "twins", build(Part("a", b"old"), Part("a", b"new"))
     yield "twins", build(Part("d/a", b"old"), Part("b"), Part("d/a", b"new"))
     yield "twins by case", build(Part("readme", b"1"), Part("README", b"2"))
     yield "file in the way of a folder", build(Part("a", b"1"), Part("a/b", b"2"))
     yield "folder in the way of a file", build(Part("a/b", b"1"), Part("a", b"2"))
     yield "empty archive", build()
-    yield "empty archive", build(comment=b"nothing in here")
-    yield "no archive", b""
-    yield "no archive", b"plain text"
-    yield "no archive", TEXT * 40
+    yield from (("no archive", data) for data in (b"", b"plain text", TEXT * 40))
     for length in (1, 22, 1000, 65535):
         yield "comment", build(Part("a"), comment=b"c" * length)
     yield "comment like an end record", build(Part("a"), comment=build())
@@ -136,7 +132,6 @@ def by_hand():
     for field, value in dict(crc=1, packed=5, size=5, method=0, time=0, date=0, version=63, flags=0x800).items():
         yield f"local {field} differs", build(Part("a", local={field: value}), Part("b"))
         yield f"directory's {field} differs", build(Part("a", central={field: value}), Part("b"))
-    yield "local name differs", build(Part("a", local={"name": b"b"}), Part("c"))
     yield "local name differs", build(Part("a", local={"name": b"longer"}), Part("c"))
     for method in (1, 6, 9, 10, 12, 14, 93, 95, 97, 98, 99, 255):
         yield "unknown method", build(Part("a", method=method), Part("b"))
@@ -202,15 +197,12 @@ def by_programs(work, talutil):
         ("talutil", f"{talutil} zip OUT data"), ("talutil, encrypted", with_password),
         ("talutil, AES", with_password + " --aes"),
         ("zip -fz", "zip -qr -fz OUT data"), ("zip, a pipe", "zip -qr - data | cat >OUT"),
-        ("zip -fz, a pipe", "zip -qr -fz - data | cat >OUT"), ("zip -X", "zip -qrX OUT data"),
-        ("zip -D", "zip -qrD OUT data"), ("zip -A", "zip -qr OUT data && zip -qA OUT"),
+        ("zip -fz, a pipe", "zip -qr -fz - data | cat >OUT"), ("zip -D", "zip -qrD OUT data"),
         ("zip, comment", "echo comment | zip -qrz OUT data"), ("zip -Z bzip2", "zip -qr -Z bzip2 OUT data"),
         ("zip, added to", "zip -q OUT data/empty && zip -qr OUT data"), ("zip -ll", "zip -qr -0 -fd OUT data"),
         ("zip, behind a program", "zip -qr X.zip data && cat /bin/true X.zip >OUT && zip -qA OUT"),
-        ("advzip", "zip -qr OUT data && advzip -q -z -2 OUT"), ("advzip -4", "zip -qr OUT data && advzip -q -z -4 OUT"),
-        ("advzip -0", "zip -qr OUT data && advzip -q -z -0 OUT"), ("advzip -a", "advzip -q -a -1 OUT data"),
+        ("advzip", "zip -qr OUT data && advzip -q -z -4 OUT"), ("advzip -a", "advzip -q -a -1 OUT data"),
         ("bsdtar", "bsdtar --format=zip -cf OUT data"), ("bsdtar, a pipe", "bsdtar --format=zip -cf - data >OUT"),
-        ("bsdtar, stored", "bsdtar --format=zip --options zip:compression=store -cf OUT data"),
         ("bsdtar, stored, a pipe", "bsdtar --format=zip --options zip:compression=store -cf - data | cat >OUT"),
         ("bsdtar of .", "cd data && bsdtar --format=zip -cf OUT ."),
         ("bsdtar -P AES", f"bsdtar --format=zip --options zip:encryption=aes256 --passphrase {PASSWORD} -cf OUT data"),
@@ -236,8 +228,8 @@ def by_programs(work, talutil):
 # ---- Damage
 
 def by_damage(work):
-    """Pairs of a class and an archive: a bit flipped in every fifth byte, and cut off at some. Which fields have to
-    agree is shown by hand."""
+    """Pairs of a class and an archive: a bit flipped in every fifth byte. Which fields have to agree is shown by hand,
+    and archives that are cut off by tests/archives/unpacking_test.cpp."""
     encrypted = work / "encrypted.zip"
     subprocess.run(["zip", "-qjP", PASSWORD, encrypted, work / "data/text.txt"], check=True)
     wholes = [build(Part("a.txt"), Part("b/c.txt", b"stored", 0)), build(described_part("a.txt"), Part("b.txt")),
@@ -247,8 +239,6 @@ def by_damage(work):
             damaged = bytearray(whole)
             damaged[at] ^= 1 << at % 8
             yield "flipped", bytes(damaged)
-    for at in range(0, len(wholes[0]), 9):
-        yield "cut off", wholes[0][:at]
 
 
 # ---- The programs
@@ -346,7 +336,6 @@ EXPLANATIONS = [
     ("bytes before, not counted", ["good"], "positions are moved by the bytes before"),
     ("bytes behind, too many", ["bad"], "an end record is looked for as far back as a comment can reach"),
     ("comment like an end record", ["good"], "the end record that reaches to the end counts"),
-    ("cut off", ["bad"], "an archive without its whole directory is refused; bsdtar reads what is left"),
     ("device file", ["good"], "becomes an empty file; bsdtar makes the device"),
     ("directory's", ["bad"], "the directory and the data disagree"),
     ("directory's version", ["good"], "the version that is needed is not compared, as the method tells the same"),
