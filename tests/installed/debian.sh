@@ -46,17 +46,6 @@ in_clean_root() {
   ' in_clean_root "$clean_root" "$clean_root-archives" "$work/shown" "$work/memory" "$@"
 }
 
-use_unpacked() {
-  local library
-  dpkg -x "$package" "$work/root"
-  verdict 'its command' B "$("$work/root/usr/bin/talutil" call GetData A,B,C, 1 2)"
-  library=$(dirname "$(find "$work/root/usr" -name libtalutil.so.1)")
-  verdict 'its Python package' B "$(LD_LIBRARY_PATH=$library PYTHONPATH=$work/root/usr/lib/python3/dist-packages \
-    python3 -c 'import talutil; print(talutil.ORVUtils().GetData("A,B,C,", 1, 2))')"
-  verdict 'its dependencies are installed here' "" "$(dpkg-deb -f "$package" Depends | tr ',' '\n' |
-    sed 's/ *(.*//; s/^ *//' | while read -r name; do dpkg-query -W "$name" >/dev/null 2>&1 || echo "$name"; done)"
-}
-
 package=$("$talutil_top/packaging/debian.sh" "$work/first" | tail -1)
 again=$("$talutil_top/packaging/debian.sh" "$work/second" | tail -1)
 verdict 'the same bytes twice' same "$(cmp "$package" "$again" && echo same)"
@@ -71,7 +60,9 @@ if make_clean_root >"$clean_root.log" 2>&1 && in_clean_root true >>"$clean_root.
   counts 'the package in a clean Debian' "$talutil_build/debian-clean.log" in_clean_root bash /mnt/debian_clean.sh
 else
   echo "left out: the package in a clean Debian, because: $(tail -1 "$clean_root.log")"
-  use_unpacked
+  verdict 'its command' B "$("$work/check/usr/bin/talutil" call GetData A,B,C, 1 2)"
+  verdict 'its dependencies are installed here' "" "$(dpkg-deb -f "$package" Depends | tr ',' '\n' |
+    sed 's/ *(.*//; s/^ *//' | while read -r name; do dpkg-query -W "$name" >/dev/null 2>&1 || echo "$name"; done)"
 fi
 
 close_counts
