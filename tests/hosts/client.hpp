@@ -231,10 +231,9 @@ inline void handle_messages() {
   }
 }
 
-/// Does the work on a thread with an apartment of its own, while this thread handles the calls that come from there and
-/// whatever else it is given.
-template <class Work, class Meanwhile = void (*)()>
-void on_another_thread(COINIT apartment, Work work, Meanwhile meanwhile = &handle_messages) {
+/// Does the work on a thread with an apartment of its own, while this thread handles the calls that come from there.
+template <class Work>
+void on_another_thread(COINIT apartment, Work work) {
   std::atomic<bool> is_done = false;
   std::thread thread([&] {
     CoInitializeEx(nullptr, apartment);
@@ -248,7 +247,7 @@ void on_another_thread(COINIT apartment, Work work, Meanwhile meanwhile = &handl
   });
   while (!is_done) {
     MsgWaitForMultipleObjects(0, nullptr, FALSE, 1, QS_ALLINPUT);
-    meanwhile();
+    handle_messages();
   }
   thread.join();
 }

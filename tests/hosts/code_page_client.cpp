@@ -20,8 +20,6 @@ void texts_stay(U* u, const std::wstring& name, const std::wstring& other) {
   Value value(L" " + name + L" #5? ");
   check_equal(name + L" 5", text(u, &U::VerifyTextData, Short{}, Short{}, value), "VerifyTextData");
   check_equal(other, text(u, &U::RemoveNumberFromString, Text(other + L" 5?")), "RemoveNumberFromString");
-  check_equal(name + L"-" + other, text(u, &U::StringReplace, Text(name + L"?" + other), Text(L"?"), Text(L"-")),
-              "StringReplace");
 }
 
 void files_stay(U* u, const std::wstring& name, const std::wstring& other) {
