@@ -10,12 +10,17 @@ class HostGrid final : public HostObject {
   HostGrid(LONG rows, LONG columns)
       : HostObject({L"Rows", L"Cols", L"FixedRows", L"ColDataType", L"ColHidden", L"RowHidden", L"TextMatrix", L"Cell",
                     L"Row", L"RowSel"},
-                   [this](const Use& use) { return answer(use); }),
+                   [this](const Use& use) {
+                     const HRESULT status = before ? before(use) : S_OK;
+                     return status == S_OK ? answer(use) : status;
+                   }),
         rows_(rows),
         columns_(columns),
         cells_(static_cast<std::size_t>(rows * columns)) {}
 
   enum Member : DISPID { Rows = 1, Cols, FixedRows, ColDataType, ColHidden, RowHidden, TextMatrix, Cell, Row, RowSel };
+
+  std::function<HRESULT(const Use&)> before;  ///< May end a use by another answer than S_OK.
 
   [[nodiscard]] LONG rows() const noexcept { return rows_; }
   [[nodiscard]] LONG columns() const noexcept { return columns_; }

@@ -1,5 +1,6 @@
 // A client with objects of its own, of third parties and of the example's windows, which answer a use only as what the
 // member is; and what the library makes of objects that fail.
+#include "bench/hosts/host_grid.hpp"
 #include "examples/host/window_objects.hpp"
 #include "hostile_values.hpp"
 
@@ -57,34 +58,6 @@ void search_texts_are_put(_ORVUtils* u) {
   }
 }
 
-/// A grid of one column of Booleans, as a third-party one would be. What is asked before a use may end it.
-class HostGrid final : public HostObject {
- public:
-  enum Member : DISPID { Rows = 1, Cols, FixedRows, ColDataType, TextMatrix, Cell };
-
-  explicit HostGrid(LONG rows)
-      : HostObject({L"Rows", L"Cols", L"FixedRows", L"ColDataType", L"TextMatrix", L"Cell"},
-                   [this](const Use& use) {
-                     const HRESULT status = before ? before(use) : S_OK;
-                     return status == S_OK ? answer(use) : status;
-                   }),
-        ticks(static_cast<std::size_t>(rows)) {}
-
-  std::function<HRESULT(const Use&)> before;
-  std::vector<bool> ticks;
-
- private:
-  HRESULT answer(const Use& use) {
-    const auto rows = static_cast<LONG>(ticks.size());
-    const LONG numbers[] = {rows, 1, 0, VT_BOOL};
-    if (use.member < TextMatrix) return use.is_put() ? DISP_E_MEMBERNOTFOUND : use.answer(numbers[use.member - 1]);
-    const bool is_text = use.member == TextMatrix;
-    auto tick = ticks[static_cast<std::size_t>(V_I4(&use.argument(is_text ? 0 : 1)))];
-    if (use.is_put()) return tick = V_BOOL(&use.argument(2)) != 0, S_OK;
-    return is_text ? use.answer(tick ? L"True" : L"False") : use.answer(tick ? 1L : 2L);
-  }
-};
-
 Outcome save_widths(_ORVUtils* u, Value& grid, bool is_early) {
   if (!is_early) return use(u, L"SaveGridWidths", grid, L"Grid", short{0});
   return early_outcome(u->SaveGridWidths(grid, Text(L"Grid"), Short{0}));
@@ -135,7 +108,7 @@ void errors_of_objects_reach_the_caller(_ORVUtils* u) {
       {answer<DISP_E_NOTACOLLECTION>, run_time_error(451),
        L"TALUtil.ORVUtils: Property let procedure not defined and property get procedure did not return an object"},
   };
-  HostGrid table(3);
+  HostGrid table(3, 1);
   Value grid(&table);
   for (const auto& row : rows) {
     table.before = row.fails;
@@ -162,14 +135,14 @@ void errors_of_objects_reach_the_caller(_ORVUtils* u) {
 }
 
 void grids_are_driven(_ORVUtils* u) {
-  HostGrid table(10000);
+  HostGrid table(10000, 1);
   // A variable of a script within a variable: the object is found behind both.
   Value inner(&table);
   Value outer(&inner.get());
   Value outermost(&outer.get());
   Long count;
   u->SelectGridRows(Long{0}, outermost, Short{1});
-  check(table.ticks[9999], "the last row is ticked");
+  check_equal(L"True", table.text(9999, 0), "the last row is ticked");
   u->CountGridSelectedRows(Long{0}, outermost, count);
   check_equal(10000, count.value, "the ticked rows");
   check_equal(2, std::ranges::max(table.look_ups), "a member is looked up once a call");
@@ -182,7 +155,7 @@ void grids_are_driven(_ORVUtils* u) {
     return u->GetMaxPages(Long{4}, Long{14}, pages);
   };
   u->SelectGridRows(Long{0}, outermost, Short{0});
-  check(!table.ticks[9999], "the grid is kept for as long as the call");
+  check_equal(L"False", table.text(9999, 0), "the grid is kept for as long as the call");
   check_equal(4, pages.value, "a call within a call");
   check_equal(1U, table.references, "references that are left");
 }
