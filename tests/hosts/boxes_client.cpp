@@ -73,7 +73,6 @@ void folders_are_picked(_ORVUtils* u) {
           check(words_of(dialog).find(L"|Where are the reports?") != std::wstring::npos, narrow(words_of(dialog)));
           check(GetWindow(dialog, GW_OWNER) == components_windows().at(0), "it is owned by the components window");
           SendMessageW(dialog, set_selection, TRUE, reinterpret_cast<LPARAM>(name.c_str()));
-          if (button == IDOK) take_picture(L"folder_picker");
           PostMessageW(dialog, WM_COMMAND, static_cast<WPARAM>(button), 0);
         });
     check_equal(1, seen, "dialogs");
@@ -101,7 +100,6 @@ void passwords_are_asked_for(_ORVUtils* u) {
         const HWND entry = controls(box, L"Edit").at(0);
         check(has_style(entry, GWL_STYLE, ES_PASSWORD), "what is typed is masked");
         SendMessageW(entry, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(L"key"));
-        take_picture(L"password_box");
         PostMessageW(box, WM_COMMAND, IDOK, 0);
       });
   check_equal(1, seen, "password boxes");
@@ -125,7 +123,6 @@ void components_window_is_hidden(_ORVUtils* u) {
 int wmain(int, wchar_t** arguments) {
   enter_desktop();
   const std::wstring folder = arguments[1];
-  pictures = folder + L"\\screenshots\\";
   return run_checks([&] {
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();

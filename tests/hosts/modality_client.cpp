@@ -1,4 +1,4 @@
-// A host whose windows stand beside those of another program: modality_client FOLDER. While it waits for one of the
+// A host whose windows stand beside those of another program. While it waits for one of the
 // library's windows, and when that is closed, nobody else comes to the front. It has no manifest and does not scale.
 #include <filesystem>
 
@@ -92,7 +92,6 @@ void windows_follow_dots(HWND window) {
   SendMessageW(window, dpi_changed, MAKEWPARAM(144, 144), reinterpret_cast<LPARAM>(&suggested));
   check(width_of(window) > width * 5 / 4, "wider at 144 dots");
   check(height_of(part) >= height_of_part, "its parts as well");
-  take_picture(L"moved-system");
 }
 
 void looks_are_those_of_the_system(_ORVUtils* u) {
@@ -103,8 +102,6 @@ void looks_are_those_of_the_system(_ORVUtils* u) {
       check(module.find(L"common-controls") != std::wstring::npos, "the later controls, from " + narrow(module));
     }
     windows_follow_dots(window);
-    ShowWindow(window, SW_MAXIMIZE);
-    take_picture(L"maximised-system");
     PostMessageW(window, WM_CLOSE, 0, 0);
   };
   show(
@@ -159,10 +156,9 @@ void opening_holds_nothing(const Shown& shown) {
 
 }  // namespace
 
-int wmain(int, wchar_t** arguments) {
+int wmain(int, wchar_t**) {
   enter_desktop();
-  return run_checks([&] {
-    pictures = arguments[1] + std::wstring(L"\\screenshots\\");
+  return run_checks([] {
     const Pointer<_ORVUtils> object = create_object();
     _ORVUtils* const u = object.get();
     const HWND host = make_host_window();
