@@ -14,14 +14,12 @@ HEADER = "src/library/orv_utils.hpp"
 # What is replaced in the header, by what, and the complaint.
 ROWS = [
     ("no parameter", "  /// @param s the text\n", "", 'the @param of StripNulls are (); the table has (s)'),
-    ("another parameter", "@param s the text", "@param t the text", 'are (t); the table has (s)'),
     ("a parameter without a meaning", "@param s the text", "@param s", '@param s does not say what it means'),
     ("an unknown tag", "  /// @param s the text\n", "  /// @param s the text\n  /// @returns a text\n",
      'there is no tag "@returns"'),
     ("no number of an error", "@raises 5 if sChr", "@raises Five if sChr", '@raises begins with "Five"'),
     ("an unknown family", "/// @family strings", "/// @family string", 'there is no family "string"'),
     ("a member that is none", "@see RemoveStringsFromNumber,", "@see Remove,", '"@see Remove" leads nowhere'),
-    ("a setting that is none", "@reads DebugMode", "@reads Debug", '"@reads Debug" leads nowhere'),
     ("no example", "  /// @example\n  ///     u.Terminate\n", "", "Terminate has no @example"),
     ("an example that is not indented", "  ///     u.Terminate\n", "  /// u.Terminate\n", "is not indented"),
     ("a backslash at the end", "  ///     u.Terminate\n", "  ///     u.Terminate \\\n", "ends with a backslash"),

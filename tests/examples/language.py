@@ -92,7 +92,7 @@ FUNCTIONS = {
     "chr": chr,
     "len": lambda value: len(text_of(value)),
     "isempty": lambda value: value == EMPTY,
-    "typename": lambda value: {str: "String", bool: "Boolean"}.get(type(value), "of each host's own"),
+    "typename": lambda value: {str: "String", bool: "Boolean"}.get(type(value), "(depends on the host)"),
     "ubound": lambda value: len(value) - 1,
     "dateserial": lambda y, m, d: {"date": f"{y:04}-{m:02}-{d:02}T00:00:00"},
     "timeserial": lambda h, m, s: {"date": f"1899-12-30T{h:02}:{m:02}:{s:02}"},

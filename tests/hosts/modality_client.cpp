@@ -1,5 +1,5 @@
-// A host whose windows stand beside those of another program. While it waits for one of the
-// library's windows, and when that is closed, nobody else comes to the front. It has no manifest and does not scale.
+// A host whose windows stand beside those of another program. While it waits for one of the library's windows, and when
+// that is closed, nobody else comes to the front. It has no manifest and does not scale.
 #include <filesystem>
 
 #include "../process.hpp"
