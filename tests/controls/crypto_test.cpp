@@ -1,8 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "automation/control.hpp"
 #include "controls/cipher_text.hpp"
-#include "infoforms/frm_components.hpp"
 #include "tests/fakes/utils_test.hpp"
 
 namespace talutil::testing {
@@ -23,8 +21,6 @@ const Vector vectors[] = {
      u"ARAREhMUFRYXGBkaG0JX5dKm8k7O7CBW0r5jr37F+7FmbowgTbgeaA8gbD9EsmFg20fgICLldWLP7//FDcsjrJSkRBK4a9r6mg5aB0S/"
      u"LfxNGKS7lWuBNIZTcQ=="},
 };
-const Text lone_surrogate{u'\xD83D', u'A'};
-constexpr TextView lone_surrogate_cipher = u"AQAAAAAAAAAAAAAAAA3eQxzWshiVMcK8SGvKN5rQ4acn";
 
 using Encryption = UtilsTest;
 
@@ -37,7 +33,7 @@ TEST_F(Encryption, VectorsInBothDirections) {
     EXPECT_EQ(cipher_text::encode(sealed), vector.cipher);
     EXPECT_EQ(utils.CryptoDecryptString(vector.cipher), vector.plain);
   }
-  EXPECT_EQ(utils.CryptoDecryptString(Text(lone_surrogate_cipher)), lone_surrogate);
+  EXPECT_EQ(utils.CryptoDecryptString(u"AQAAAAAAAAAAAAAAAA3eQxzWshiVMcK8SGvKN5rQ4acn"), Text({u'\xD83D', u'A'}));
 }
 
 // What comes back, and that a changed text does not, is for the fuzzer.
@@ -57,31 +53,6 @@ TEST_F(Encryption, WhatIsNoCipherTextIsRejected) {
         Text(u"\u0410\u0410\u0410\u0410"), Text(60, u'A'), good + u" "}) {
     EXPECT_EQ(error_of([&] { (void)utils.CryptoDecryptString(cipher); }), 5) << to_utf8(cipher);
   }
-}
-
-TEST_F(Encryption, TheControlKnowsItsCodesAndNoOthers) {
-  const Control crypto(library.components().control(u"Crypto1"), plain_numbers);
-  const Control key(crypto.call(u"CreateKey", {u"pass", 256, 1}), plain_numbers);
-  const Control data(crypto.call(u"CreateData", {u"text", 3}), plain_numbers);
-  const Variant input(data.object());
-  const auto encrypt = [&](std::int32_t algorithm, const Variant& given, bool final) {
-    return error_of([&] { key.call(u"Encrypt", {algorithm, given, Boolean(final)}); });
-  };
-  EXPECT_EQ(encrypt(9, input, true), 5) << "before the options are set";
-  key.put(u"Mode", 1);
-  key.put(u"Padding", 2);
-  EXPECT_EQ(encrypt(9, input, true), 0);
-  EXPECT_EQ(encrypt(8, input, true), 5);
-  EXPECT_EQ(encrypt(9, input, false), 5);
-  EXPECT_EQ(encrypt(9, u"text", true), 13);
-  EXPECT_EQ(encrypt(9, key.object(), true), 13);
-  EXPECT_EQ(error_of([&] { crypto.call(u"CreateKey", {u"pass", 128, 1}); }), 5);
-  EXPECT_EQ(error_of([&] { crypto.call(u"CreateKey", {u"pass", 256, 0}); }), 5);
-  EXPECT_EQ(error_of([&] { crypto.call(u"CreateData", {u"text", 2}); }), 5);
-  EXPECT_EQ(error_of([&] { data.call(u"Read", {2}); }), 5);
-  // The key of one pass phrase does not open what that of another has closed.
-  const Control mine(crypto.call(u"CreateData", {vectors[0].cipher, 1}), plain_numbers);
-  EXPECT_EQ(error_of([&] { key.call(u"Decrypt", {9, mine.object(), Boolean(true)}); }), 5);
 }
 
 }  // namespace
