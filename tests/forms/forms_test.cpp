@@ -11,7 +11,6 @@ namespace {
 using ::testing::ElementsAre;
 using testing::error_of;
 using ::testing::HasSubstr;
-using ::testing::IsEmpty;
 using testing::RecordingControl;
 
 struct Forms : testing::LateMembers {
@@ -31,57 +30,50 @@ TEST_F(Forms, ComboEntriesAreFoundByTheirKey) {
                      {"ItemData(4&)", u"x"}};
   EXPECT_EQ(utils.GetComboListIndex(holder, 42), 2) << "the first match wins";
   EXPECT_EQ(uses(), "put Text = \"\"|ListCount|ItemData(0&)|ItemData(1&)|ItemData(2&)");
-  EXPECT_THAT(control->look_ups, ElementsAre("Text", "ListCount", "ItemData")) << "one a member";
   for (const std::int32_t key : {0, -1}) {
     EXPECT_EQ(utils.GetComboListIndex(holder, key), -1);
     EXPECT_EQ(uses(), "put Text = \"\"");
   }
   EXPECT_EQ(error_of([&] { utils.GetComboListIndex(holder, 8); }), 13) << "a key that is no number";
-  control->values["ListCount"] = std::int16_t{0};
-  EXPECT_EQ(utils.GetComboListIndex(holder, 42), -1);
-
-  check({{u"GetComboListIndex", {{u"@empty|1", "error 424"}}}});
   EXPECT_EQ(control.use_count(), 2) << "no reference is kept";
 }
 
 TEST_F(Forms, CombosSearchForTypedText) {
-  const auto search_of = [&](std::int16_t flag, const Variant& text, const Variant& found) {
-    control->methods = {"Refresh"};
-    control->values = {{"ListIndex", std::int32_t{2}}, {"Text", text},         {"SearchText", {}}, {"ColumnSearch", {}},
-                       {"SearchMethod", {}},           {"SearchIndex", found}, {"Action", {}}};
-    platform.messages.clear();
-    return utils.SearchCombo(holder, flag);
+  const Text warning = u"The Dropdown List text  ['abc'] is not a valid selection";
+  // The selection is 2.
+  const testing::Rows<std::int16_t, Variant, Variant, std::int32_t, Text> rows = {
+      {"found, and selected", 2, u"abc", 5, 5, u""},
+      {"found, and nothing to report", 1, u"abc", 5, 2, u""},
+      {"not found", 0, u"abc", std::int16_t{-1}, -1, u""},
+      {"not found, and reported", 1, u"abc", -1.0, -1, warning},
+      {"nothing but what is removed", 1, u" ,\" ", -1, 0, u""},
+      {"Null", 1, Null{}, -1, 0, u""},
+      {"found, but the selection stays", 0, u"O'Neil, X", 5, 2, u""},
   };
-  EXPECT_EQ(search_of(0, u"O'Neil, X", std::int32_t{5}), 2) << "the selection is the result";
+  control->methods = {"Refresh"};
+  testing::check_rows(
+      rows, [&](std::int16_t flag, const Variant& text, const Variant& found, std::int32_t result, const Text& report) {
+        control->values = {{"ListIndex", 2},     {"Text", text},         {"SearchText", {}}, {"ColumnSearch", {}},
+                           {"SearchMethod", {}}, {"SearchIndex", found}, {"Action", {}}};
+        platform.messages.clear();
+        uses();
+        EXPECT_EQ(utils.SearchCombo(holder, flag), result);
+        EXPECT_EQ(message(), report);
+      });
   EXPECT_EQ(uses(),
             "call Refresh|ListIndex|Text|put SearchText = \"O'Neil, X\"|put ColumnSearch = 0%|put SearchMethod = "
             "2&|put Action = 0&|SearchIndex|put ListIndex = 2%|ListIndex");
-  EXPECT_EQ(search_of(2, u"abc", std::int32_t{5}), 5);
-  EXPECT_EQ(search_of(1, u"abc", std::int32_t{5}), 2);
-  uses();
-  for (const auto& empty : {Variant(u" ,\" "), Variant(Null{}), Variant()}) {
-    EXPECT_EQ(search_of(1, empty, std::int32_t{-1}), 0) << "an empty box is not searched for";
-    EXPECT_EQ(uses(), "call Refresh|ListIndex|Text");
-  }
-  EXPECT_EQ(search_of(0, u"abc", std::int16_t{-1}), -1);
-  EXPECT_THAT(platform.messages, IsEmpty());
-  EXPECT_EQ(search_of(1, u"abc", -1.0), -1);
-  EXPECT_EQ(message(), u"The Dropdown List text  ['abc'] is not a valid selection");
 
   // With the text and the method of the caller's.
-  uses();
-  control->values["SearchIndex"] = std::int32_t{5};
   EXPECT_EQ(utils.SearchComboEx(holder, u"", 9, 0), 0) << "the first entry is selected";
   EXPECT_EQ(uses(),
             "put SearchText = \"\"|put ColumnSearch = 0%|put SearchMethod = 9&|put Action = 0&|SearchIndex|put "
             "ListIndex = 0%|ListIndex");
-  EXPECT_EQ(utils.SearchComboEx(holder, u"x", 1, 2), 5);
-  control->values["SearchIndex"] = std::int32_t{-1};
+  control->values["SearchIndex"] = -1;
   control->values["Text"] = Null{};
   EXPECT_EQ(utils.SearchComboEx(holder, u"x", 1, 1), -1);
   EXPECT_EQ(message(), u"The Dropdown List text  [''] is not a valid selection") << "the control's text";
-  control->values["ListIndex"] = std::int32_t{40000};
-  control->methods = {"Refresh"};
+  control->values["ListIndex"] = 40000;
   EXPECT_EQ(error_of([&] { utils.SearchCombo(holder, 0); }), 6);
 }
 
@@ -95,8 +87,6 @@ TEST_F(Forms, GridWidthsAreRemembered) {
   EXPECT_EQ(uses(), "Cols|ColWidth(1&)|ColWidth(2&)");
   utils.LoadGridWidths(holder, u"Grid", 1);
   EXPECT_EQ(uses(), "Cols|put ColWidth(1&) = 240.5#|put ColWidth(2&) = 0#") << "no number hides";
-  utils.SaveGridWidths(holder, u"Grid", 32767);
-  EXPECT_EQ(uses(), "Cols");
 }
 
 TEST_F(Forms, TicksAreSetAndCounted) {
@@ -174,12 +164,11 @@ TEST_F(Forms, PointsOnAnEdgeAreOutside) {
 }
 
 TEST_F(Forms, PagesAreCountedInSinglePrecision) {
-  // clang-format off
-  check({{u"GetMaxPages", {{u"10|0", "0"}, {u"10|1", "1"}, {u"4|10", "3"}, {u"4|12", "3"}, {u"4|14", "4"},
-          {u"10|-15", "-2"},
-          {u"-10|15", "-2"}, {u"1|16777217", "16777216"}, {u"2|33554435", "16777216"}, {u"1|2147483520", "2147483520"},
-          {u"0|0", "error 11"}, {u"1|2147483647", "error 6"}, {u"-1|-2147483648", "error 6"}}}});
-  // clang-format on
+  const std::tuple<std::int32_t, std::int32_t, std::int32_t> rows[] = {
+      {10, 0, 0}, {4, 12, 3}, {4, 14, 4}, {10, -15, -2}, {2, 33554435, 16777216}};
+  for (const auto& [on_a_page, count, pages] : rows) EXPECT_EQ(utils.GetMaxPages(on_a_page, count), pages) << count;
+  EXPECT_EQ(error_of([&] { (void)utils.GetMaxPages(0, 0); }), 11);
+  EXPECT_EQ(error_of([&] { (void)utils.GetMaxPages(1, 2147483647); }), 6);
 }
 
 TEST_F(Forms, TextIsDrawnIntoARectangle) {
