@@ -6,8 +6,6 @@
 #include "automation/run_time_error.hpp"
 #include "platform/file_names.hpp"
 #include "platform/files.hpp"
-#include "platform/folder_picker.hpp"
-#include "platform/guids.hpp"
 
 namespace talutil::testing {
 
@@ -132,15 +130,6 @@ struct FakeFiles final : Files {
   void fail_if_told(TextView operation) const {
     if (const auto found = failures.find(Text(operation)); found != failures.end()) raise(found->second);
   }
-};
-
-struct FakeFolderPicker final : FolderPicker {
-  std::optional<Text> choose(TextView /*title*/, std::intptr_t /*owner*/) override { return std::nullopt; }
-};
-
-struct FakeGuids final : Guids {
-  Text make() override { return u"{00000000-0000-4000-8000-00000000000" + Text(1, next++) + u"}"; }
-  char16_t next = u'1';
 };
 
 }  // namespace talutil::testing

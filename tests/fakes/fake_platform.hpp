@@ -32,6 +32,8 @@ struct FakePlatform : MessageBoxes,
                       Folders,
                       InputBoxes,
                       FileDialogs,
+                      FolderPicker,
+                      Guids,
                       Drawing,
                       WindowPrinting,
                       FontFiles,
@@ -60,11 +62,8 @@ struct FakePlatform : MessageBoxes,
   std::deque<MessageAnswer> answers;
   float twips_x = 15;
   float twips_y = 15;
-  Text computer_name = u"FAKEPC";
   Locale separators;
-  Date current_time{40000.5};  ///< 6 July 2009, 12:00
-  std::int64_t utc_offset_minutes = 600;
-  std::intptr_t window_handle = 0x1234;
+  Date current_time{40000.5};          ///< 6 July 2009, 12:00
   std::map<Text, ObjectRef> controls;  ///< Third-party controls by class name; a null one fails with 429.
 
   std::int32_t quits_after_waits = 1;  ///< The wait that ends with the thread being asked to quit.
@@ -82,10 +81,8 @@ struct FakePlatform : MessageBoxes,
   std::function<void()> during_dialogs;  ///< What a host's timer does while a file or printer dialog is open.
   std::vector<std::string> drawn;        ///< What was drawn and printed, in words.
   std::int32_t pointer_resets = 0;
-  FakePreviewState preview;  ///< What the preview window shows, and what its user does.
-  FakeFormState form;        ///< What the other windows show.
-  std::vector<DriveFacts> drive_facts{{u"C:", u"Fixed", u"SYSTEM", u"NTFS", 1000ULL << 30, 250ULL << 30},
-                                      {u"D:", u"CD-ROM", u"", u"", 0, 0}};
+  FakePreviewState preview;         ///< What the preview window shows, and what its user does.
+  FakeFormState form;               ///< What the other windows show.
   std::map<Text, ItemFacts> items;  ///< Files and folders that there are details of.
   std::vector<PrintSettings> print_jobs;
   bool prints = true;  ///< Whether the printer dialog is answered with OK.
@@ -96,8 +93,6 @@ struct FakePlatform : MessageBoxes,
   FakeSettingsStore settings_store;
 
   FakeFiles files;
-  FakeFolderPicker folder_picker;
-  FakeGuids guids;
 
   WesternCodePage code_page;
 
@@ -116,8 +111,8 @@ struct FakePlatform : MessageBoxes,
 
   [[nodiscard]] Platform platform() {
     return {*this, *this,         *this,          *this,          *this,          *this,       *this,
-            *this, *cryptography, *used_profiles, *used_settings, *used_times,    *used_files, folder_picker,
-            guids, *used_folders, *this,          *used_registry, network,        *this,       *this,
+            *this, *cryptography, *used_profiles, *used_settings, *used_times,    *used_files, *this,
+            *this, *used_folders, *this,          *used_registry, network,        *this,       *this,
             *this, *this,         *this,          *this,          *used_code_page};
   }
 
@@ -128,10 +123,10 @@ struct FakePlatform : MessageBoxes,
 
   float twips_per_pixel_x() override { return twips_x; }
   float twips_per_pixel_y() override { return twips_y; }
-  Text name() override { return computer_name; }
+  Text name() override { return u"FAKEPC"; }
   Locale locale() override { return separators; }
   Date now() override { return current_time; }
-  std::int64_t utc_offset_seconds() override { return utc_offset_minutes * 60; }
+  std::int64_t utc_offset_seconds() override { return 600 * 60; }
 
   std::unique_ptr<HiddenWindow> make_hidden(TextView caption) override {
     window_captions.emplace_back(caption);
@@ -156,6 +151,8 @@ struct FakePlatform : MessageBoxes,
     return next_of(inputs);
   }
 
+  std::optional<Text> choose(TextView /*title*/, std::intptr_t /*owner*/) override { return std::nullopt; }
+  Text make() override { return u"{00000000-0000-4000-8000-000000000001}"; }
   std::optional<ChosenFile> choose(const FileDialog& dialog) override {
     file_dialogs.push_back(dialog);
     if (during_dialogs) during_dialogs();
@@ -186,10 +183,12 @@ struct FakePlatform : MessageBoxes,
     return prints && !document.pages.empty();
   }
 
-  std::vector<DriveFacts> drives() override { return drive_facts; }
+  std::vector<DriveFacts> drives() override {
+    return {{u"C:", u"Fixed", u"SYSTEM", u"NTFS", 1000ULL << 30, 250ULL << 30}, {u"D:", u"CD-ROM", u"", u"", 0, 0}};
+  }
   MemoryFacts memory() override { return {8ULL << 30, 2ULL << 30, 0, 0}; }
   ProcessorFacts processor() override { return {u"A processor", u"x86", 4, 2400}; }
-  OperatingSystemFacts operating_system() override { return {u"A system", u"10.0", computer_name, u"me", u"", 93784}; }
+  OperatingSystemFacts operating_system() override { return {u"A system", u"10.0", name(), u"me", u"", 93784}; }
   ItemFacts item(const Text& path) override {
     const auto found = items.find(path);
     if (found == items.end()) raise(ErrorNumber::file_not_found);
@@ -242,7 +241,7 @@ struct FakePlatform : MessageBoxes,
     Window(const Window&) = delete;
     Window& operator=(const Window&) = delete;
     ~Window() override { --owner_.open_windows; }
-    [[nodiscard]] std::intptr_t handle() override { return owner_.window_handle; }
+    [[nodiscard]] std::intptr_t handle() override { return 0x1234; }
 
    private:
     FakePlatform& owner_;

@@ -2,7 +2,7 @@
 
 #include <functional>
 #include <map>
-#include <set>
+#include <sstream>
 #include <string>
 #include <utility>
 #include <vector>
@@ -80,15 +80,10 @@ class FakeForm final : public FormView {
 
 /// A preview window without a screen: what it shows and how it is used stay here when it is gone.
 struct FakePreviewState {
-  std::vector<Text> captions;
-  std::set<PreviewMenu> checked;
-  std::vector<std::string> uses;  ///< "check mnu25 off" and so on for what has an order.
+  std::vector<std::string> uses;  ///< In words: "check 11", and a caption as it is.
   std::int32_t state = 0;
   float width = 12000;
   float height = 9000;
-  float frame = 300;  ///< What the frame takes of both.
-  float pages_width = 0;
-  float pages_height = 0;
   std::int32_t windows = 0;
   std::function<void(PreviewEvents&)> user;  ///< What is done while the window is shown.
 };
@@ -103,25 +98,22 @@ class FakePreview final : public PreviewView {
   FakePreview& operator=(const FakePreview&) = delete;
   ~FakePreview() override { --state_.windows; }
 
-  void set_caption(TextView caption) override { state_.captions.emplace_back(caption); }
+  void set_caption(TextView caption) override { state_.uses.push_back(to_utf8(caption)); }
   [[nodiscard]] std::int32_t window_state() const override { return state_.state; }
   void set_window_state(std::int32_t state) override { state_.state = state; }
   [[nodiscard]] float width() const override { return state_.width; }
   void set_width(float width) override { state_.width = width; }
   [[nodiscard]] float height() const override { return state_.height; }
   void set_height(float height) override { state_.height = height; }
-  [[nodiscard]] float inner_width() const override { return state_.width - state_.frame; }
-  [[nodiscard]] float inner_height() const override { return state_.height - state_.frame; }
+  [[nodiscard]] float inner_width() const override { return state_.width - frame; }
+  [[nodiscard]] float inner_height() const override { return state_.height - frame; }
   void size_pages(float width, float height) override {
-    state_.pages_width = width;
-    state_.pages_height = height;
+    std::ostringstream use;
+    use << "pages " << width << " by " << height;
+    state_.uses.push_back(use.str());
   }
   void check(PreviewMenu item, bool is_checked) override {
     state_.uses.push_back((is_checked ? "check " : "uncheck ") + std::to_string(static_cast<int>(item)));
-    if (is_checked)
-      state_.checked.insert(item);
-    else
-      state_.checked.erase(item);
   }
   void show_page() override {}
   void show_modal() override {
@@ -135,6 +127,7 @@ class FakePreview final : public PreviewView {
   }
 
  private:
+  static constexpr float frame = 300;  ///< What the frame takes of both.
   FakePreviewState& state_;
   PreviewEvents& events_;
   bool is_closed_ = false;

@@ -15,24 +15,16 @@ namespace talutil::testing {
 
 /// A value with its type, as transcripts show it: "abc", 1% (16 bits), 1& (32), 1! (single), 1# (double), True.
 inline std::string shown(const Variant& value) {
-  if (value.is(Variant::Kind::null)) return "Null";
-  if (value.is(Variant::Kind::empty)) return "Empty";
-  if (value.is(Variant::Kind::object)) return "an object";
+  using Kind = Variant::Kind;
+  if (value.is(Kind::null)) return "Null";
+  if (value.is(Kind::empty)) return "Empty";
+  if (value.is(Kind::object)) return "an object";
   const std::string text = to_utf8(value.to_text(plain_numbers));
-  switch (value.kind()) {
-    case Variant::Kind::text:
-      return '"' + text + '"';
-    case Variant::Kind::int16:
-      return text + '%';
-    case Variant::Kind::int32:
-      return text + '&';
-    case Variant::Kind::single:
-      return text + '!';
-    case Variant::Kind::double_:
-      return text + '#';
-    default:
-      return text;
-  }
+  if (value.is(Kind::text)) return '"' + text + '"';
+  static const std::map<Kind, const char*> marks = {
+      {Kind::int16, "%"}, {Kind::int32, "&"}, {Kind::single, "!"}, {Kind::double_, "#"}};
+  const auto mark = marks.find(value.kind());
+  return mark == marks.end() ? text : text + mark->second;
 }
 
 /// A control of a host: it answers with the values it is given and notes how it is used. A member is there when it has
