@@ -45,11 +45,9 @@ TEST(CallRecord, MasksSecrets) {
   const auto put = static_cast<std::size_t>(*slot_for(zip, u"Password", 1));
   CallRecord record({7, 3}, zip.members[put], {&password, 1}, objects);
   record.succeed({}, {&password, 1});
-  EXPECT_EQ(
-      "{\"process\": 7, \"on\": 3, \"call\": \"Password\", \"args\": [{\"masked\": true}], \"result\": {\"masked\": "
-      "true}, "
-      "\"microseconds\": 5}\n",
-      std::move(record).line(5));
+  EXPECT_EQ(R"({"process": 7, "on": 3, "call": "Password", "args": [{"masked": true}], "result": {"masked": true}, )"
+            "\"microseconds\": 5}\n",
+            std::move(record).line(5));
 }
 
 struct ComparisonTest : testing::UtilsTest {
@@ -66,15 +64,9 @@ struct ComparisonTest : testing::UtilsTest {
 
 TEST_F(ComparisonTest, FindsDifferencesAndSkipsWhatSaysNothing) {
   const Rows<std::vector<std::string_view>, std::string_view> rows{
-      {"the same",
-       {R"({"process": 1, "call": "GetData", "args": ["A,B,", 0, 1], "result": "A", "microseconds": 1})"},
-       ""},
       {"laid out otherwise",
        {R"({"call":"WeekYearToDate","args":[60,2009,1],"result":{"date":"2009-12-24T00:00:00"},"arguments":{"iWeek":52}})"},
        ""},
-      {"another result",
-       {R"({"call": "GetData", "args": ["A,B,", 0, 1], "result": "B"})"},
-       R"(GetData["A,B,", 0, 1]: recorded "B", now "A")"},
       {"blanks within a text",
        {R"({"call": "StripNulls", "args": ["a b"], "result": "ab"})"},
        R"(StripNulls["a b"]: recorded "ab", now "a b")"},
