@@ -10,11 +10,6 @@ namespace {
 using testing::check_rows;
 using testing::Rows;
 
-const Member& member_named(TextView name, std::size_t arguments = 0) {
-  const LateInterface& members = late_interface<ORVUtils>();
-  return members.members[static_cast<std::size_t>(*slot_for(members, name, arguments))];
-}
-
 TEST(CallRecord, MasksSecrets) {
   using Arguments = std::vector<Argument>;
   const auto text = [](TextView value) { return Argument(Variant(value)); };
@@ -33,7 +28,9 @@ TEST(CallRecord, MasksSecrets) {
   };
   check_rows(rows, [](TextView name, const Arguments& arguments, bool shows_argument, bool shows_result) {
     NumberedObjects objects;
-    CallRecord record({7, 0}, member_named(name), arguments, objects);
+    const LateInterface& members = late_interface<ORVUtils>();
+    const auto slot = static_cast<std::size_t>(*slot_for(members, name, 0));
+    CallRecord record({7, 0}, members.members[slot], arguments, objects);
     record.succeed(u"answer", arguments);
     const std::string line = std::move(record).line(5);
     EXPECT_EQ(shows_argument, line.find("secret") != std::string::npos) << line;
