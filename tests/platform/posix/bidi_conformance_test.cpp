@@ -27,19 +27,14 @@ std::vector<std::string> fields_of(const std::string& line) {
   return fields;
 }
 
-/// "x" is a character without a level.
-std::vector<BidiLevel> levels_of(const std::string& text) {
-  std::vector<BidiLevel> levels;
+/// Levels or places; "x" is a character without a level.
+template <class Number>
+std::vector<Number> numbers_of(const std::string& text) {
+  std::vector<Number> numbers;
   for (const std::string& word : words_of(text)) {
-    levels.push_back(word == "x" ? no_level : static_cast<BidiLevel>(std::stoi(word)));
+    numbers.push_back(static_cast<Number>(word == "x" ? no_level : std::stoul(word)));
   }
-  return levels;
-}
-
-std::vector<std::size_t> order_of(const std::string& text) {
-  std::vector<std::size_t> order;
-  for (const std::string& word : words_of(text)) order.push_back(std::stoul(word));
-  return order;
+  return numbers;
 }
 
 /// Calls `check` with each line that is not empty or a comment; the number of those for which it was false.
@@ -70,8 +65,8 @@ TEST(BidiConformance, OrdersAllSequencesOfClasses) {
   std::vector<BidiLevel> levels;
   std::vector<std::size_t> order;
   const auto check = [&](const std::string& text) {
-    if (text.starts_with("@Levels:")) levels = levels_of(text.substr(8));
-    if (text.starts_with("@Reorder:")) order = order_of(text.substr(9));
+    if (text.starts_with("@Levels:")) levels = numbers_of<BidiLevel>(text.substr(8));
+    if (text.starts_with("@Reorder:")) order = numbers_of<std::size_t>(text.substr(9));
     if (text.front() == '@') return true;
     std::vector<BidiCharacter> line;
     const auto fields = fields_of(text);
@@ -96,7 +91,8 @@ TEST(BidiConformance, OrdersTextsWithBracketsAndIsolates) {
     }
     const int direction = std::stoi(fields[1]);
     const BidiLevel base = direction == 2 ? base_level(line) : static_cast<BidiLevel>(direction);
-    return base == std::stoi(fields[2]) && gives(line, base, levels_of(fields[3]), order_of(fields[4]));
+    return base == std::stoi(fields[2]) &&
+           gives(line, base, numbers_of<BidiLevel>(fields[3]), numbers_of<std::size_t>(fields[4]));
   };
   EXPECT_EQ(failures("BidiCharacterTest.txt", 91000, check), 0U);
 }
