@@ -5,23 +5,21 @@
 namespace talutil {
 namespace {
 
-using Names = std::vector<Text>;
 using testing::check_rows;
 
 // How lines of all kinds are read is compared with the platform in settings_test.cpp.
 TEST(ProfileDocument, Reads) {
-  const testing::Rows<std::string_view, Text, Text, std::optional<Text>> rows = {
+  const testing::Rows<std::string_view, Text, Text, Text> rows = {
       {"a NUL ends a value", std::string_view("[a]\nx=1\0y\nz=2", 13), u"a", u"x", u"1"},
       {"UTF-8 with its mark", "\xEF\xBB\xBF[a]\nx=\xC5\x82", u"a", u"x", u"\u0142"},
       {"UTF-16 with its mark", std::string_view("\xFF\xFE[\0a\0]\0\n\0x\0=\0B\x01", 16), u"a", u"x", u"\u0142"},
   };
-  check_rows(rows, [](std::string_view text, const Text& section, const Text& item, const std::optional<Text>& value) {
+  check_rows(rows, [](std::string_view text, const Text& section, const Text& item, const Text& value) {
     EXPECT_EQ(ProfileDocument(text).value(section, item), value);
   });
-  const ProfileDocument names("t=0\n[b]\nx=1\n;c=2\ny\nz=\n=5\n[]\n[b]\n");
-  EXPECT_EQ(names.item_names(u"B"), (Names{u"x", u"z", u""}));
+  const ProfileDocument document("t=0\n[b]\nx=1\n;c=2\ny\nz=\n=5\n[]\n[b]\n");
   using Entry = ProfileDocument::Entry;
-  EXPECT_EQ(names.entries(),
+  EXPECT_EQ(document.entries(),
             (std::vector<Entry>{{u"", u"t", u"0"}, {u"b", u"x", u"1"}, {u"b", u"z", u""}, {u"b", u"", u"5"}}));
 }
 
