@@ -168,15 +168,9 @@ TEST_F(Grids, VisibleCellsAreExported) {
 
 TEST_F(Grids, ExportsReadTheGridInOrder) {
   const auto source = std::make_shared<RecordingControl>();
-  source->values = {{"Cols", 2},
-                    {"ColHidden(0&)", Boolean(true)},
-                    {"ColHidden(1&)", Boolean(false)},
-                    {"Rows", 3},
-                    {"RowHidden(1&)", Boolean(true)},
-                    {"RowHidden(2&)", Boolean(false)},
-                    {"TextMatrix(2&, 1&)", 7},
-                    {"Row", 2},
-                    {"RowSel", 1}};
+  source->values = {{"Cols", 2}, {"Rows", 3}, {"Row", 2}, {"RowSel", 1}, {"TextMatrix(2&, 1&)", 7}};
+  source->values.insert({{"ColHidden(0&)", Boolean(true)}, {"ColHidden(1&)", Boolean(false)}});
+  source->values.insert({{"RowHidden(1&)", Boolean(true)}, {"RowHidden(2&)", Boolean(false)}});
   platform.chosen_files = {u"C:\\a.txt"};
   utils.ExportGridData(ObjectRef(source), 1, Boolean(true), u"Sales");
   EXPECT_EQ(source->taken_uses(),

@@ -96,13 +96,6 @@ TEST_F(Builders, SetThePrintControlUpInOrder) {
             "put PaperSize = 8%|put #34 = False|put #60 = 1%|put #152 = True|put #126 = True|put #57 = 100%|"
             "put Orientation = 1%|put Header = \"  Sales\"|call StartDoc|put RenderControl = 77&|call EndDoc|"
             "CurrentPage|PageCount|CurrentPage|put CurrentPage = 1%|CurrentPage|PageCount|shown");
-  // Texts in another case set nothing, nor do other directions.
-  library.settings().sGridPaperDuplex = u"horizontal";
-  library.settings().sGridPaperSize = u"a4";
-  utils.GridPrintPreview(75, 0, u"Sales", u"C:\\x", holder, Variant(), Variant(), u"");
-  const std::string set = uses();
-  for (const char* const name : {"Duplex", "PaperSize", "Orientation"})
-    EXPECT_THAT(set, ::testing::Not(HasSubstr(name)));
   EXPECT_EQ(error_of_text_box(), 0);
   const std::string text_box = uses();
   EXPECT_THAT(text_box, ::testing::StartsWith("put Zoom = 50#|put PaperSize = 9%|put #34 = False|"));
@@ -334,7 +327,8 @@ TEST_F(Meanwhile, PaperStaysForTheNextReportAndTheCaptionDoesNot) {
   library.settings().sGridPaperSize = u"A3";
   library.settings().sGridPaperDuplex = u"Vertical";
   EXPECT_EQ(write(u"Jobs"), 0);
-  library.settings().sGridPaperSize = library.settings().sGridPaperDuplex = u"unknown";
+  library.settings().sGridPaperSize = u"a4";  // Texts in another case set nothing.
+  library.settings().sGridPaperDuplex = u"horizontal";
   library.settings().AutomatedEndOfMonth = Boolean(false);
   utils.GridPrintPreview(50, 7, u"Month", u"", ObjectRef(grid), Variant(), Variant(), u"Jobs");
   EXPECT_EQ(paper, std::tuple(8, 1, 2));
@@ -506,10 +500,7 @@ TEST_F(Pages, GridsAreLaidOutAsTheyLook) {
   // What answers for nothing but its window is a picture.
   const Document& drawn = made_by([&] { print->put_RenderControl(42); });
   EXPECT_THAT(platform.drawn, ElementsAre("image of 42"));
-  const Page only = drawn.pages[0];
-  const auto* const picture = std::get_if<Picture>(&only.items[0]);
-  ASSERT_NE(picture, nullptr);
-  EXPECT_EQ(picture->place, (TwipsRectangle{1134, 1134, 30, 15}));
+  EXPECT_EQ(std::get<Picture>(drawn.pages[0].items.at(0)).place, (TwipsRectangle{1134, 1134, 30, 15}));
 }
 
 TEST_F(Pages, LinesFromRightToLeftBeginAtTheRight) {
@@ -559,7 +550,6 @@ TEST_F(Pages, HeadersKeepTheirNameAndDates) {
     EXPECT_EQ(runs, lines);
     EXPECT_EQ(shown == whole, is_whole);
     EXPECT_TRUE(shown.starts_with(u"Bookingsofcustomer") && shown.ends_with(u"01/03/2009To31/03/2009"));
-    EXPECT_EQ(document.bookmarks[0].title, document.title);
   });
 }
 
@@ -576,8 +566,6 @@ TEST_F(Pages, CharactersWithoutAShapeAreShownEverywhere) {
   grid->WordWrap = Boolean(true);
   EXPECT_THAT(runs_of(document_of(grid).pages[0]),
               ::testing::StartsWith("1194,1164 a^@b    c\n1194,1356 d^[^\u00C5e\n1194,1548 f\n"));
-  const Document& box = made_by([&] { print->TextBox(text, 0, 2000, 5000, 720); });
-  EXPECT_EQ(line_at(box.pages[0], 2240), "d^[^\u00C5e");
 }
 
 TEST_F(Pages, PartsOfAWideGridSayWhatTheyShow) {
@@ -614,18 +602,10 @@ TEST_F(Pages, PartsOfAWideGridSayWhatTheyShow) {
 
 TEST_F(Pages, CellsHaveTheirLooks) {
   const auto grid = std::make_shared<RecordingControl>();
-  grid->values = {{"Rows", 2},
-                  {"Cols", 3},
-                  {"FixedRows", 1},
-                  {"FixedCols", 1},
-                  {"ForeColor", 0xFF},
-                  {"BackColor", 0xFFFF},
-                  {"ForeColorFixed", 0xFF0000},
-                  {"BackColorFixed", std::int32_t(0x8000000F)},
-                  {"GridColor", 0x123456},
-                  {"GridLinesFixed", 0},
-                  {"MergeCells", 1},
-                  {"MergeRow(0&)", Boolean(true)}};
+  grid->values = {{"Rows", 2}, {"Cols", 3}, {"FixedRows", 1}, {"FixedCols", 1}, {"GridLinesFixed", 0}};
+  grid->values.insert({{"ForeColor", 0xFF}, {"BackColor", 0xFFFF}, {"GridColor", 0x123456}});
+  grid->values.insert({{"ForeColorFixed", 0xFF0000}, {"BackColorFixed", std::int32_t(0x8000000F)}});
+  grid->values.insert({{"MergeCells", 1}, {"MergeRow(0&)", Boolean(true)}});
   constexpr const char* texts[] = {"00", "Both", "Both", "10", "11", "12"};
   for (int cell = 0; cell < 6; ++cell) {
     const std::string place = std::to_string(cell / 3) + "&, " + std::to_string(cell % 3) + "&)";
