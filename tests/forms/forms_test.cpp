@@ -136,14 +136,11 @@ TEST_F(Forms, WindowStatesAreRemembered) {
 }
 
 TEST_F(Forms, ConfirmationsWantYesInUpperCase) {
-  platform.inputs = {u"yes", u" YES", u"YES"};
-  platform.answers = {MessageAnswer::yes, MessageAnswer::yes};
+  platform.inputs = {u" YES", u"YES"};
+  platform.answers = {MessageAnswer::yes};
   EXPECT_TRUE(utils.CheckDeleteRecord().is_exactly_true());
   EXPECT_EQ(platform.input_boxes.back().text, u"Type YES in uppercase characters to confirm deletion of this record");
   EXPECT_EQ(message(), u"You must type YES in uppercase characters.  Do you wish to delete this record?");
-  platform.answers = {MessageAnswer::no};
-  EXPECT_FALSE(utils.CheckDeleteRecord()) << "a cancelled box warns too";
-  EXPECT_EQ(platform.messages.size(), 3U);
 }
 
 TEST_F(Forms, LaunchFailuresAreExplained) {
@@ -247,7 +244,6 @@ TEST_F(MovableControl, DistancesAreScaled) {
   EXPECT_EQ(container->taken_uses(), "ScaleMode|ScaleX(50!, 1%, 7%)|ScaleY(10!, 1%, 7%)");
   control->values.erase("Container");
   EXPECT_NE(error_of([&] { drag(60, 20); }), 0);
-  EXPECT_EQ(error_of([&] { position.DragControl(Null{}, holder, 1, 1); }), 424);
 }
 
 TEST_F(MovableControl, PositionsAreRemembered) {
