@@ -21,9 +21,8 @@ TEST_F(LibraryTest, StartUpLoadsTheComponentsWindowAndReadsTheScreen) {
   library.start();
   EXPECT_EQ(platform.window_captions, std::vector<Text>{u"Form1"});
   const SharedSettings& settings = library.settings();
-  const auto twips = std::pair(settings.ScreenTwipsPerPixelX, settings.ScreenTwipsPerPixelY);
   EXPECT_EQ(settings.ComputerName, u"FAKEPC");
-  EXPECT_EQ(twips, std::pair(14, 16));
+  EXPECT_EQ(std::pair(settings.ScreenTwipsPerPixelX, settings.ScreenTwipsPerPixelY), std::pair(14, 16));
   const std::vector<Text> in_order = {
       u"PolarCryptoLibCtl.Crypto",   u"MSComDlg.CommonDialog",     u"MSComDlg.CommonDialog",  u"VSFlex8Ctl.VSFlexGrid",
       u"SystemInfoControl.MSysInfo", u"DUZACTXLibCtl.duzactxctrl", u"DZACTXLibCtl.dzactxctrl"};
