@@ -125,14 +125,10 @@ TEST(Registry, KeepsTypesAndAnswersByTheStatusOfThePlatform) {
   registry->close(key);
   // The key above exists by the one below, in any case and with a separator at its end.
   ASSERT_EQ(open(Registry::current_user, u"SOFTWARE\\talutil\\TEST\\", key), Registry::ok);
-  struct Value {
-    TextView name;
-    std::uint32_t type;
-    std::string bytes;
-  };
-  const Value values[] = {{u"text", Registry::text, std::string("\xE9t\xE9\0", 4)},
-                          {u"bytes", Registry::binary, std::string("a\0b", 3)},
-                          {u"number", Registry::number, std::string("\x2A\0\0\0", 4)}};
+  const std::tuple<TextView, std::uint32_t, std::string> values[] = {
+      {u"text", Registry::text, std::string("\xE9t\xE9\0", 4)},
+      {u"bytes", Registry::binary, std::string("a\0b", 3)},
+      {u"number", Registry::number, std::string("\x2A\0\0\0", 4)}};
   for (const auto& [name, type, bytes] : values) {
     EXPECT_EQ(registry->set(key, Text(name), type, bytes), Registry::ok);
     std::uint32_t found = 0;
