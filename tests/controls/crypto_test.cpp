@@ -1,6 +1,8 @@
 #include <gtest/gtest.h>
 
+#include "automation/control.hpp"
 #include "controls/cipher_text.hpp"
+#include "infoforms/frm_components.hpp"
 #include "tests/fakes/utils_test.hpp"
 
 namespace talutil::testing {
@@ -53,6 +55,31 @@ TEST_F(Encryption, WhatIsNoCipherTextIsRejected) {
         Text(u"\u0410\u0410\u0410\u0410"), Text(60, u'A'), good + u" "}) {
     EXPECT_EQ(error_of([&] { (void)utils.CryptoDecryptString(cipher); }), 5) << to_utf8(cipher);
   }
+}
+
+TEST_F(Encryption, TheControlKnowsItsCodesAndNoOthers) {
+  const Control crypto(library.components().control(u"Crypto1"), plain_numbers);
+  const Control key(crypto.call(u"CreateKey", {u"pass", 256, 1}), plain_numbers);
+  const Control data(crypto.call(u"CreateData", {u"text", 3}), plain_numbers);
+  const Variant input(data.object());
+  const auto encrypt = [&](std::int32_t algorithm, const Variant& given, bool final) {
+    return error_of([&] { key.call(u"Encrypt", {algorithm, given, Boolean(final)}); });
+  };
+  EXPECT_EQ(encrypt(9, input, true), 5) << "before the options are set";
+  key.put(u"Mode", 1);
+  key.put(u"Padding", 2);
+  EXPECT_EQ(encrypt(9, input, true), 0);
+  EXPECT_EQ(encrypt(8, input, true), 5);
+  EXPECT_EQ(encrypt(9, input, false), 5);
+  EXPECT_EQ(encrypt(9, u"text", true), 13);
+  EXPECT_EQ(encrypt(9, key.object(), true), 13);
+  EXPECT_EQ(error_of([&] { crypto.call(u"CreateKey", {u"pass", 128, 1}); }), 5);
+  EXPECT_EQ(error_of([&] { crypto.call(u"CreateKey", {u"pass", 256, 0}); }), 5);
+  EXPECT_EQ(error_of([&] { crypto.call(u"CreateData", {u"text", 2}); }), 5);
+  EXPECT_EQ(error_of([&] { data.call(u"Read", {2}); }), 5);
+  // The key of one pass phrase does not open what that of another has closed.
+  const Control mine(crypto.call(u"CreateData", {vectors[0].cipher, 1}), plain_numbers);
+  EXPECT_EQ(error_of([&] { key.call(u"Decrypt", {9, mine.object(), Boolean(true)}); }), 5);
 }
 
 }  // namespace
