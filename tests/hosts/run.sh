@@ -31,6 +31,12 @@ take_pictures() {
   done
 }
 
+# In Wine, reg.exe has failed once for no known reason: only a second failure counts.
+set_value() {  # key, name, type, data
+  wine reg.exe add "$1" /v "$2" /t "$3" /d "$4" /f >/dev/null 2>&1 ||
+    succeeds "setting $2" wine reg.exe add "$1" /v "$2" /t "$3" /d "$4" /f
+}
+
 client() { run "$1" wine "Z:\\build\\$folder\\tests\\hosts\\${1}_client.exe" "Z:\\build\\$folder" "${@:2}"; }
 
 # The server lends its screen, or that it has none, to later programs: for those with another, one is begun anew.
@@ -67,7 +73,7 @@ client boxes
 client forms
 client modality
 # The same windows on a screen with larger dots, for the looks.
-dots() { wine reg.exe add 'HKCU\Control Panel\Desktop' /v LogPixels /t REG_DWORD /d "$1" /f >/dev/null 2>&1; }
+dots() { set_value 'HKCU\Control Panel\Desktop' LogPixels REG_DWORD "$1"; }
 dots 144
 run forms-144 wine "Z:\\build\\$folder\\tests\\hosts\\forms_client.exe" "Z:\\build\\$folder" 144-
 dots 96
@@ -76,7 +82,7 @@ rm -f "$talutil_build/$folder"/printed_*.ps
 # The fonts that the native command has too, with Hebrew and Arabic letters.
 replacements='HKCU\Software\Wine\Fonts\Replacements'
 for names in "Arial:DejaVu Sans" "Courier New:DejaVu Sans Mono"; do
-  wine reg.exe add "$replacements" /v "${names%:*}" /d "${names#*:}" /f >/dev/null 2>&1
+  set_value "$replacements" "${names%:*}" REG_SZ "${names#*:}"
 done
 client printing "$(build_below_wine)/$folder"
 printed() {  # what, the pattern of its words
@@ -123,7 +129,7 @@ rm -rf "$talutil_build/equality-$folder"
 succeeds "writing natively" artifacts write
 succeeds "writing by $dll" wine cscript.exe //nologo "Z:\\build\\equality-$folder\\script.vbs"
 run equality artifacts compare
-wine reg.exe delete "$replacements" /f >/dev/null 2>&1
+succeeds "the fonts are as before" wine reg.exe delete "$replacements" /f
 succeeds "regsvr32 /u, for the machine and for the user" wine regsvr32.exe /s /u /i:user "$dll"
 
 close_counts
