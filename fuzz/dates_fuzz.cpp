@@ -48,7 +48,8 @@ void check(const Text& text) {
   require(text_to_date(date_to_text(*date), current_year) == date, "the plain text is read as the same date");
   require(text_to_date(format_date(*date, u"YYYY-MM-DD h:n:s"), current_year) == date, "and so is the ISO form");
 
-  require(compare_dates(*date, date_from_serial(parts.year, parts.month, parts.day, 0)) >= 0, "its day begins before");
+  const Date midnight = date_from_serial(parts.year, parts.month, parts.day, 0);
+  require(std::is_gteq(compare_dates(*date, midnight)), "its day begins before");
   require(date_difference(DateInterval::day, day_of(*date), *date) == 0, "its day is the same");
   require(day_of_year(*date) >= 28 * (parts.month - 1) + parts.day, "its day of the year");
 }

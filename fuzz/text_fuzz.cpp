@@ -198,7 +198,7 @@ std::vector<Text> kept_lines(std::vector<Text> lines) {
     if (lines.size() > 1 && line.size() < 40) {
       Text& before = lines[lines.size() - 2];
       if (!before.empty() && line.size() + before.size() < 73) {
-        line = before + u" - " + line;
+        line.insert(0, before + u" - ");
         before.clear();
       }
     }
@@ -209,7 +209,7 @@ std::vector<Text> kept_lines(std::vector<Text> lines) {
 
 Text in_lines(const std::vector<Text>& lines) {
   Text text;
-  for (const Text& line : lines) text += line + u"\r\n";
+  for (const Text& line : lines) text.append(line).append(u"\r\n");
   return text;
 }
 

@@ -363,7 +363,7 @@ struct Pages : Preview {
   }
   /// A grid of rows whose cells are parted by tabs.
   std::shared_ptr<Grid> grid_of(std::int32_t columns, const std::vector<Text>& rows = {}) {
-    const auto grid = std::make_shared<Grid>(library.platform());
+    auto grid = std::make_shared<Grid>(library.platform());
     grid->put_Cols(columns);
     for (const Text& row : rows) grid->AddItem(row, -1);
     return grid;
