@@ -59,6 +59,9 @@ TEST_F(Forms, CombosSearchForTypedText) {
         uses();
         EXPECT_EQ(utils.SearchCombo(holder, flag), result);
         EXPECT_EQ(message(), report);
+        if (result == 0) {
+          EXPECT_EQ(uses(), "call Refresh|ListIndex|Text") << "an empty box is not searched for";
+        }
       });
   EXPECT_EQ(uses(),
             "call Refresh|ListIndex|Text|put SearchText = \"O'Neil, X\"|put ColumnSearch = 0%|put SearchMethod = "
@@ -87,6 +90,8 @@ TEST_F(Forms, GridWidthsAreRemembered) {
   EXPECT_EQ(uses(), "Cols|ColWidth(1&)|ColWidth(2&)");
   utils.LoadGridWidths(holder, u"Grid", 1);
   EXPECT_EQ(uses(), "Cols|put ColWidth(1&) = 240.5#|put ColWidth(2&) = 0#") << "no number hides";
+  utils.SaveGridWidths(holder, u"Grid", 32767);
+  EXPECT_EQ(uses(), "Cols");
 }
 
 TEST_F(Forms, TicksAreSetAndCounted) {
@@ -100,7 +105,8 @@ TEST_F(Forms, TicksAreSetAndCounted) {
             "TextMatrix(3&, 3&) = True");
   EXPECT_EQ(control->look_ups.size(), 4) << "one a member";
   utils.SelectGridRows(3, holder, 2);
-  EXPECT_EQ(uses(), "Rows|FixedRows|ColDataType(3&)");
+  utils.SelectGridRows(0, holder, 1);
+  EXPECT_EQ(uses(), "Rows|FixedRows|ColDataType(3&)|Rows|FixedRows|ColDataType(0&)");
   EXPECT_EQ(utils.CountGridSelectedRows(3, holder), 2);
   EXPECT_EQ(uses(), "ColDataType(3&)|Rows|FixedRows|Cell(5%, 1&, 3&)|Cell(5%, 2&, 3&)|Cell(5%, 3&, 3&)");
   EXPECT_EQ(utils.CountGridSelectedRows(0, holder), 0);
@@ -136,8 +142,8 @@ TEST_F(Forms, WindowStatesAreRemembered) {
 }
 
 TEST_F(Forms, ConfirmationsWantYesInUpperCase) {
-  platform.inputs = {u" YES", u"YES"};
-  platform.answers = {MessageAnswer::yes};
+  platform.inputs = {u"yes", u" YES", u"YES"};
+  platform.answers = {MessageAnswer::yes, MessageAnswer::yes};
   EXPECT_TRUE(utils.CheckDeleteRecord().is_exactly_true());
   EXPECT_EQ(platform.input_boxes.back().text, u"Type YES in uppercase characters to confirm deletion of this record");
   EXPECT_EQ(message(), u"You must type YES in uppercase characters.  Do you wish to delete this record?");

@@ -105,6 +105,9 @@ void errors_of_objects_reach_the_caller(_ORVUtils* u) {
       {answer<unplugged>, unplugged, of_the_system},
       {answer<E_NOTIMPL>, run_time_error(445), L"TALUtil.ORVUtils: Object doesn't support this action"},
       {answer<E_ACCESSDENIED>, run_time_error(70), L"TALUtil.ORVUtils: Permission denied"},
+      {answer<E_NOINTERFACE>, run_time_error(430),
+       L"TALUtil.ORVUtils: Class does not support Automation or does not support expected interface"},
+      {answer<DISP_E_NONAMEDARGS>, run_time_error(446), L"TALUtil.ORVUtils: Object doesn't support named arguments"},
       {answer<DISP_E_NOTACOLLECTION>, run_time_error(451),
        L"TALUtil.ORVUtils: Property let procedure not defined and property get procedure did not return an object"},
   };

@@ -239,6 +239,8 @@ TEST_F(Meanwhile, UnattendedRunsShowNothing) {
   EXPECT_THAT(month_end(), ElementsAre(0, 0, 0));
   EXPECT_EQ(write(u"badDebtsReport"), 0);
   EXPECT_EQ(platform.files.files.size(), 2U) << "there are no reports of other names";
+  EXPECT_EQ(write(u"BadDebtsReport"), 0);
+  EXPECT_TRUE(is_written(u"BadDebtsReport"));
   platform.files.failures = {{u"write", ErrorNumber::disk_full}};
   EXPECT_EQ(write(u"SalesReport"), 0);
   EXPECT_THAT(platform.preview.uses, ::testing::IsEmpty());
@@ -637,6 +639,8 @@ TEST_F(Pages, CellsHaveTheirLooks) {
             "10 FF0000 on E8E8E8, line 000000, 1000 wide, at 748\n"
             "11 0000FF on FFFFFF, line 123456, 1000 wide, at 748\n"
             "12 00FF00 on 00FFFF, line 123456, 1000 wide, at 404\n");
+  EXPECT_EQ(std::ranges::count_if(grid->uses, [](const std::string& use) { return use.starts_with("Cell(13%"); }), 2)
+      << "what a grid does not answer is not asked again";
 }
 
 }  // namespace
