@@ -140,9 +140,10 @@ void check_period(fuzz::Input& input) {
     return is_refused ? std::nullopt
                       : std::optional<Variant>(static_cast<std::int32_t>(a == b ? count : std::abs(count)));
   };
-  require(answer_of([&] { return host.utils().GetDaysInPeriod(a, b); }) == expected(b.days - a.days), "days");
+  require(answer_of([&] { return host.utils().GetDaysInPeriod(a, b); }) == expected(b.days - a.days),
+          "GetDaysInPeriod");
   const auto months = answer_of([&] { return host.utils().GetMonthsInPeriod(a, b); });
-  require(months == expected(a == b ? -1 : months_of(b) - months_of(a)), "months");
+  require(months == expected(a == b ? -1 : months_of(b) - months_of(a)), "GetMonthsInPeriod");
 }
 
 Text text_of(const std::chrono::year_month_day& date) {
@@ -162,12 +163,12 @@ void check_steps(fuzz::Input& input) {
   const Date from{static_cast<double>(start)};
   const year_month_day date(day_0 + days(start));
   const Text later = host.utils().IncDay(from, count).to_text(plain_numbers);
-  require(later == text_of(day_0 + days(start + count)), "days later");
+  require(later == text_of(day_0 + days(start + count)), "IncDay");
   const year_month month = date.year() / date.month() + months(count);
   // In the year 0 every month has 28 days.
   const auto last_day_of_month = int(month.year()) == 0 ? std::chrono::day(28) : (month / last).day();
   const Text months_later = host.utils().IncMonth(from, count).to_text(plain_numbers);
-  require(months_later == text_of(month / std::min(date.day(), last_day_of_month)), "months later");
+  require(months_later == text_of(month / std::min(date.day(), last_day_of_month)), "IncMonth");
 }
 
 }  // namespace

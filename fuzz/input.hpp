@@ -23,7 +23,7 @@ class Input {
 
   std::uint8_t byte() { return at_ == end_ ? std::uint8_t{0} : *at_++; }
 
-  /// From first to last, of at most 32 bits.
+  /// A number from first to last; first when no bytes are left.
   std::int32_t whole(std::int32_t first, std::int32_t last) {
     std::uint32_t drawn = 0;
     for (auto range = static_cast<std::uint32_t>(last) - static_cast<std::uint32_t>(first); range > 0; range >>= 8)
@@ -37,7 +37,7 @@ class Input {
     return items[static_cast<std::size_t>(whole(0, static_cast<std::int32_t>(std::size(items)) - 1))];
   }
 
-  /// Up to so many characters. The lengths up to 255 take one byte.
+  /// Up to so many characters, at most 255.
   Text text(std::size_t longest) {
     Text text;
     for (std::size_t length = byte() % (longest + 1); length > 0 && at_ != end_; --length) {

@@ -38,6 +38,9 @@ template <class T>
 void require_whole(TextView text, const Locale& locale, const Outcome<double>& number) {
   const auto whole = outcome_of([&] { return text_to_integer<T>(text, locale); });
   require(whole.is_overflow || whole.value.has_value() == (number.value || number.is_overflow), "a number is one");
+  // Bits beyond the sign count for a whole number, so &HFFFF is -1.
+  if (!whole.value || !number.value || text.find(u'&') != TextView::npos) return;
+  require(std::abs(*whole.value - *number.value) <= 0.5, "a whole number is the nearest");
 }
 
 /// Without blanks, other bases and separators a number is what the C library takes for one.

@@ -3,7 +3,6 @@
 
 #include <algorithm>
 #include <cstdint>
-#include <optional>
 #include <vector>
 
 #include "automation/run_time_error.hpp"
@@ -60,18 +59,22 @@ void check_characters(ORVUtils& utils, Input& input) {
   for (Text once = text; text.size() < once.size() * static_cast<std::size_t>(repeats);) text += once;
 
   require(utils.StringReplace(text, Text(1, one) + to, to) == replaced(text, one, to), "StringReplace");
-  require(utils.CRLFStringReplace(text, u"-") == replaced(replaced(text, u'\r', u"-"), u'\n', u"-"), "line breaks");
+  require(utils.CRLFStringReplace(text, u"-") == replaced(replaced(text, u'\r', u"-"), u'\n', u"-"),
+          "CRLFStringReplace");
   require(utils.StripNulls(text) == text.substr(0, text.find(u'\0')), "StripNulls");
-  require(utils.RemoveNumberFromString(text) == kept(text, [](int code) { return code >= 'A'; }), "letters");
+  require(utils.RemoveNumberFromString(text) == kept(text, [](int code) { return code >= 'A'; }),
+          "RemoveNumberFromString");
   Text character;
   const auto without = [&](std::int16_t kind) { return utils.RemoveStringsFromNumber(kind, text, character); };
-  require(without(0) == kept(text, is_digit), "digits");
-  require(without(1) == kept(text, [](int code) { return is_digit(code) || code == ' '; }), "digits and blanks");
-  require(without(3) == kept(text, [](int code) { return is_digit(code) || code == '.'; }), "digits and dots");
+  require(without(0) == kept(text, is_digit), "RemoveStringsFromNumber 0");
+  require(without(1) == kept(text, [](int code) { return is_digit(code) || code == ' '; }),
+          "RemoveStringsFromNumber 1");
+  require(without(3) == kept(text, [](int code) { return is_digit(code) || code == '.'; }),
+          "RemoveStringsFromNumber 3");
   character = one;
   Text others = text;
   std::erase(others, one);
-  require(without(2) == others, "without a character");
+  require(without(2) == others, "RemoveStringsFromNumber 2");
   require(utils.ReverseString(text) == Text(text.rbegin(), text.rend()), "ReverseString");
   require(bool(utils.NumbersInString(text)) == any_code(text, is_digit), "NumbersInString");
   const auto is_not_of_a_number = [](int code) { return !is_digit(code) && code != '.'; };
@@ -146,7 +149,7 @@ void check_list(ORVUtils& utils, Input& input) {
     require(utils.GetData(list, first, end) == joined, "GetData");
     joined += u',';
   }
-  require(utils.GetData(list, first, count + 1).empty(), "after the last comma there is nothing");
+  require(utils.GetData(list, first, count + 1).empty(), "GetData behind the last comma");
 }
 
 void require_verified(ORVUtils& utils, std::int16_t width, std::int16_t extras, const Text& text, TextView expected) {
